@@ -1,0 +1,32 @@
+# Compiler settings shared by every target of this build.
+set(CMAKE_CXX_STANDARD 20)
+set(CMAKE_CXX_STANDARD_REQUIRED ON)
+set(CMAKE_CXX_EXTENSIONS OFF)
+set(CMAKE_CXX_VISIBILITY_PRESET hidden)
+set(CMAKE_VISIBILITY_INLINES_HIDDEN ON)
+set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/bin")
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/lib")
+# A translated resource library is looked up beside its module, so programs and libraries keep their real paths.
+set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+
+find_program(TVX_CCACHE ccache)
+if(TVX_CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
+  set(CMAKE_C_COMPILER_LAUNCHER "${TVX_CCACHE}")
+  set(CMAKE_CXX_COMPILER_LAUNCHER "${TVX_CCACHE}")
+endif()
+
+# Bitwise use of unsigned style constants and message parameters is everyday work here, so -Wconversion stays off.
+add_compile_options(-Wall -Wextra -Wpedantic -Wnon-virtual-dtor -Woverloaded-virtual=1 -Wno-unused-parameter)
+if(TVX_WARNINGS_AS_ERRORS)
+  add_compile_options(-Werror)
+endif()
+if(TVX_SANITIZE)
+  add_compile_options(-fsanitize=${TVX_SANITIZE} -fno-omit-frame-pointer -fno-sanitize-recover=all)
+  add_link_options(-fsanitize=${TVX_SANITIZE})
+endif()
+if(TVX_COVERAGE)
+  add_compile_options(--coverage)
+  add_link_options(--coverage)
+endif()

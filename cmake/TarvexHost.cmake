@@ -1,0 +1,1 @@
+# What a host application uses to build itself from its sources and its resource script.
