@@ -18,7 +18,7 @@ if(TVX_CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
 endif()
 
 # Bitwise use of unsigned style constants and message parameters is everyday work here, so -Wconversion stays off.
-add_compile_options(-Wall -Wextra -Wpedantic -Wnon-virtual-dtor -Woverloaded-virtual=1 -Wno-unused-parameter)
+add_compile_options(-Wall -Wextra -Wpedantic -Wnon-virtual-dtor -Wno-unused-parameter)
 if(TVX_WARNINGS_AS_ERRORS)
   add_compile_options(-Werror)
 endif()
