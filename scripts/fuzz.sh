@@ -1,0 +1,31 @@
+#!/usr/bin/env bash
+# Lets each fuzz target search for inputs that break it, starting from its committed corpus.
+#
+#   scripts/fuzz.sh [SECONDS] [TARGET...]      seconds for each target (20), all targets unless named
+#
+# A finding is left as build/fuzz/findings/TARGET-*; a fixed one belongs into tests/fuzz/corpus/TARGET/.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+
+seconds=${1:-20}
+shift || true
+scripts/setup.sh build test fuzz
+cmake --preset fuzz
+cmake --build --preset fuzz
+if [ $# -eq 0 ]; then
+    mapfile -t names < <(find tests/fuzz -maxdepth 1 -name '*.cpp' ! -name Replay.cpp -printf '%f\n' | sort)
+    set -- "${names[@]%.cpp}"
+fi
+
+mkdir -p build/fuzz/findings
+failed=0
+for target in "$@"; do
+    printf -- '--- %s, %s s\n' "$target" "$seconds"
+    corpus="build/fuzz/corpus/$target"
+    mkdir -p "$corpus"
+    # The first folder takes what is found, the second is only read.
+    scripts/test-env.sh fuzz "build/fuzz/bin/$target" -max_total_time="$seconds" -timeout=10 -rss_limit_mb=4096 \
+        -print_final_stats=1 -verbosity=0 -artifact_prefix="build/fuzz/findings/$target-" \
+        "$corpus" "tests/fuzz/corpus/$target" || failed=1
+done
+exit "$failed"
