@@ -95,6 +95,8 @@ DECLARE_HANDLE(HINSTANCE);
 using HMODULE = HINSTANCE;
 DECLARE_HANDLE(HRSRC);
 
+/// @{
+/// The halves of a number: of the low 32 bits those of 16 bits, of the low 16 bits those of 8 bits.
 constexpr WORD LOWORD(std::uintptr_t value) {
     return static_cast<WORD>(value & 0xFFFF);
 }
@@ -107,6 +109,8 @@ constexpr BYTE LOBYTE(std::uintptr_t value) {
 constexpr BYTE HIBYTE(std::uintptr_t value) {
     return static_cast<BYTE>((value >> 8) & 0xFF);
 }
+/// @}
+/// Two bytes packed into 16 bits, the first in the low half.
 constexpr WORD MAKEWORD(int low, int high) {
     return static_cast<WORD>((low & 0xFF) | ((high & 0xFF) << 8));
 }
@@ -114,6 +118,8 @@ constexpr WORD MAKEWORD(int low, int high) {
 constexpr LONG MAKELONG(int low, int high) {
     return static_cast<LONG>(static_cast<DWORD>(low & 0xFFFF) | (static_cast<DWORD>(high & 0xFFFF) << 16));
 }
+/// @{
+/// Two 16-bit numbers packed into a message parameter or result, the first in the low half.
 constexpr WPARAM MAKEWPARAM(int low, int high) {
     return static_cast<DWORD>(MAKELONG(low, high));
 }
@@ -123,9 +129,13 @@ constexpr LPARAM MAKELPARAM(int low, int high) {
 constexpr LRESULT MAKELRESULT(int low, int high) {
     return static_cast<DWORD>(MAKELONG(low, high));
 }
+/// @}
+/// A colour from its parts, each 0 to 255.
 constexpr COLORREF RGB(int red, int green, int blue) {
     return static_cast<COLORREF>((red & 0xFF) | ((green & 0xFF) << 8) | ((blue & 0xFF) << 16));
 }
+/// @{
+/// One part of a colour, 0 to 255.
 constexpr BYTE GetRValue(COLORREF color) {
     return static_cast<BYTE>(color & 0xFF);
 }
@@ -135,6 +145,7 @@ constexpr BYTE GetGValue(COLORREF color) {
 constexpr BYTE GetBValue(COLORREF color) {
     return static_cast<BYTE>((color >> 16) & 0xFF);
 }
+/// @}
 
 /// A resource named by number where a name is asked for. Numbers have 16 bits.
 #define MAKEINTRESOURCE(id) (reinterpret_cast<LPCSTR>(static_cast<std::uintptr_t>(static_cast<WORD>(id))))
