@@ -1,0 +1,53 @@
+#pragma once
+
+/// @file
+/// Modules: the application and every shared library that brought resources. A module's handle is valid from the
+/// moment its file is loaded until it is unloaded; nobody frees it.
+
+#include "platform/base/Export.h"
+#include "platform/base/Types.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <span>
+#include <string>
+
+/// The module whose file has this name; null asks for the application. `name` is a path or only its last part, with
+/// or without "lib" in front and an extension behind ("GuiUtilities" finds libGuiUtilities.so.1), in any case.
+/// Null with `ERROR_MOD_NOT_FOUND` when no such module registered itself.
+TVX_PLATFORM_API HMODULE GetModuleHandleA(LPCSTR name);
+
+/// Copies the full path of a module's file (links resolved) into `buffer` of `size` bytes, always ended by NUL.
+/// A null module is the application. The result is the length without the NUL; a path that does not fit is cut, the
+/// result is then `size` and the last error `ERROR_INSUFFICIENT_BUFFER`. 0 when the module is unknown.
+TVX_PLATFORM_API DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size);
+
+#define GetModuleHandle GetModuleHandleA
+#define GetModuleFileName GetModuleFileNameA
+
+namespace tvx {
+
+/// Bytes of a resource: a view into the module, never owned.
+using ResourceBytes = std::span<const std::uint8_t>;
+
+/// Hands a module's compiled resources to the layer. Called by the constructor that the build generates for each
+/// script, before `main` or while a shared object is being loaded; nothing is read or checked yet.
+/// @param anchor any address inside the module: it tells which file the resources belong to
+/// @param data   standard `.res` data, which stays in place until `unregisterResources`
+/// @param size   its length in bytes
+TVX_PLATFORM_API void registerResources(const void* anchor, const void* data, std::size_t size);
+
+/// Takes resources back before their module is unloaded. Handles into them are invalid afterwards.
+TVX_PLATFORM_API void unregisterResources(const void* data);
+
+/// The module that holds `address`, a function or a variable of it. Null when that file registered no resources.
+[[nodiscard]] TVX_PLATFORM_API HMODULE moduleFromAddress(const void* address);
+
+/// The full path of a module's file, links resolved, whatever its length. A null module is the application; empty
+/// when the module is unknown.
+[[nodiscard]] TVX_PLATFORM_API std::string moduleFileName(HMODULE module);
+
+/// The application's module. It exists even when the application has no resources.
+[[nodiscard]] TVX_PLATFORM_API HMODULE applicationModule();
+
+} // namespace tvx
