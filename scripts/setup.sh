@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Installs what this project needs from Debian 12's own packages, and only what is missing.
 #
-#   scripts/setup.sh GROUP...     groups: build, display, tour, test, check, fuzz
+#   scripts/setup.sh GROUP...     groups: build, display, tour, test, check, fuzz, coverage
 #
 # Runs as root or through sudo, and never asks. Installs nothing where nothing is missing.
 # TVX_SKIP_SETUP=1 skips it, for systems with other package names.
@@ -39,6 +39,7 @@ check    clang-format-14  the format check; other versions format differently
 check    clang-tidy-19    the lint check; older ones cannot parse the standard library's ranges
 fuzz     clang-19         compiles the fuzz targets; older ones cannot parse the standard library's ranges
 fuzz     libclang-rt-19-dev  the fuzzing and sanitizer run-time of that compiler
+coverage gcovr            tells which lines the tests ran
 LIST
 }
 
