@@ -20,12 +20,19 @@ fi
 mkdir -p build/fuzz/findings
 failed=0
 for target in "$@"; do
-    printf -- '--- %s, %s s\n' "$target" "$seconds"
     corpus="build/fuzz/corpus/$target"
+    log="build/fuzz/$target.log"
     mkdir -p "$corpus"
     # The first folder takes what is found, the second is only read.
-    scripts/test-env.sh fuzz "build/fuzz/bin/$target" -max_total_time="$seconds" -timeout=10 -rss_limit_mb=4096 \
-        -print_final_stats=1 -verbosity=0 -artifact_prefix="build/fuzz/findings/$target-" \
-        "$corpus" "tests/fuzz/corpus/$target" || failed=1
+    if scripts/test-env.sh fuzz "build/fuzz/bin/$target" -max_total_time="$seconds" -timeout=10 -rss_limit_mb=4096 \
+        -print_final_stats=1 -artifact_prefix="build/fuzz/findings/$target-" \
+        "$corpus" "tests/fuzz/corpus/$target" >"$log" 2>&1; then
+        printf 'OK    %s: %s inputs tried in %s s\n' "$target" \
+            "$(sed -n 's/^stat::number_of_executed_units: *//p' "$log")" "$seconds"
+    else
+        printf 'FAIL  %s, from %s:\n' "$target" "$log"
+        grep -v '# Uses:' "$log" | tail -n 60
+        failed=1
+    fi
 done
 exit "$failed"
