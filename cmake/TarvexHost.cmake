@@ -8,11 +8,14 @@ set(TVX_HOST_DIR "${CMAKE_CURRENT_LIST_DIR}" CACHE INTERNAL "Where the files of 
 find_program(TVX_LLVM_RC NAMES llvm-rc llvm-rc-19 llvm-rc-18 llvm-rc-17 llvm-rc-16 llvm-rc-15 llvm-rc-14
   DOC "Compiler of resource scripts (Debian: package llvm)" REQUIRED)
 
-# tvx_compile_resources(TARGET SCRIPT): compiles a resource script as it is into the program or shared library TARGET,
+# tvx_compile_resources(TARGET SCRIPT [KEEP_LINKED]): compiles a resource script as it is into the program or shared library TARGET,
 # whose resources it becomes when the file is loaded. Include folders and definitions are those of the target; a change
 # of any included file or picture compiles it again. To be called in the folder that makes TARGET. docs/resources.md
 # tells what scripts may contain.
+# KEEP_LINKED is for a shared library of which programs may call nothing: each program that links it gets a reference to
+# it, without which --as-needed drops it. (An undefined symbol on the linker's command line does not count.)
 function(tvx_compile_resources target script)
+  cmake_parse_arguments(PARSE_ARGV 2 ARG "KEEP_LINKED" "" "")
   cmake_path(ABSOLUTE_PATH script NORMALIZE)
   cmake_path(GET script STEM stem)
   string(MAKE_C_IDENTIFIER "tvx_resources_${target}_${stem}" TVX_RESOURCE_SYMBOL)
@@ -43,10 +46,10 @@ function(tvx_compile_resources target script)
   set_source_files_properties("${module}" PROPERTIES OBJECT_DEPENDS "${TVX_RESOURCE_DATA}" SKIP_LINTING ON)
   target_sources(${target} PRIVATE "${module}")
 
-  # --as-needed drops a library that is linked for its resources only, unless one of its symbols is asked for.
-  get_target_property(type ${target} TYPE)
-  if(type STREQUAL "SHARED_LIBRARY")
-    target_link_options(${target} INTERFACE "LINKER:--undefined=${TVX_RESOURCE_SYMBOL}")
+  if(ARG_KEEP_LINKED)
+    configure_file("${TVX_HOST_DIR}/ResourceReference.cpp.in" "${folder}/${stem}.reference.cpp" @ONLY)
+    set(is_program "$<STREQUAL:$<TARGET_PROPERTY:TYPE>,EXECUTABLE>")
+    target_sources(${target} INTERFACE "$<BUILD_INTERFACE:$<${is_program}:${folder}/${stem}.reference.cpp>>")
   endif()
 endfunction()
 

@@ -12,8 +12,8 @@
 #include <span>
 #include <string>
 
-/// The module whose file has this name; null asks for the application. `name` is a path or only its last part, with
-/// or without "lib" in front and an extension behind ("GuiUtilities" finds libGuiUtilities.so.1), in any case.
+/// The module whose file has this name; null asks for the application. Only the last part of a path counts, with or
+/// without "lib" in front and an extension behind ("GuiUtilities" finds libGuiUtilities.so.1), in any case.
 /// Null with `ERROR_MOD_NOT_FOUND` when no such module registered itself.
 TVX_PLATFORM_API HMODULE GetModuleHandleA(LPCSTR name);
 
@@ -22,8 +22,14 @@ TVX_PLATFORM_API HMODULE GetModuleHandleA(LPCSTR name);
 /// result is then `size` and the last error `ERROR_INSUFFICIENT_BUFFER`. 0 when the module is unknown.
 TVX_PLATFORM_API DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size);
 
-#define GetModuleHandle GetModuleHandleA
-#define GetModuleFileName GetModuleFileNameA
+/// @copydoc GetModuleHandleA
+inline HMODULE GetModuleHandle(LPCSTR name) {
+    return GetModuleHandleA(name);
+}
+/// @copydoc GetModuleFileNameA
+inline DWORD GetModuleFileName(HMODULE module, LPSTR buffer, DWORD size) {
+    return GetModuleFileNameA(module, buffer, size);
+}
 
 namespace tvx {
 

@@ -68,9 +68,20 @@ TVX_PLATFORM_API BOOL FreeResource(HGLOBAL data);
 /// With `size` 0 nothing is copied and the result is the length of the whole string.
 TVX_PLATFORM_API int LoadStringA(HINSTANCE module, UINT id, LPSTR buffer, int size);
 
-#define FindResource FindResourceA
-#define FindResourceEx FindResourceExA
-#define LoadString LoadStringA
+// The names without a letter behind them, as functions: macros would rename CString::LoadString too.
+
+/// @copydoc FindResourceA
+inline HRSRC FindResource(HMODULE module, LPCSTR name, LPCSTR type) {
+    return FindResourceA(module, name, type);
+}
+/// @copydoc FindResourceExA
+inline HRSRC FindResourceEx(HMODULE module, LPCSTR type, LPCSTR name, WORD language) {
+    return FindResourceExA(module, type, name, language);
+}
+/// @copydoc LoadStringA
+inline int LoadString(HINSTANCE module, UINT id, LPSTR buffer, int size) {
+    return LoadStringA(module, id, buffer, size);
+}
 
 namespace tvx {
 

@@ -1,5 +1,6 @@
 #include "tools/rc/Encoding.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdint>
 
@@ -83,6 +84,25 @@ bool isUtf8(std::string_view text) {
         at += length;
     }
     return true;
+}
+
+std::u16string utf8ToUtf16(std::string_view text) {
+    std::u16string result;
+    for (std::size_t at = 0; at < text.size();) {
+        const std::size_t length = std::max<std::size_t>(sequenceLength(text, at), 1);
+        char32_t c = static_cast<std::uint8_t>(text[at]);
+        if (length > 1)
+            c &= 0x7Fu >> length;
+        for (std::size_t i = 1; i < length; ++i)
+            c = c << 6 | (static_cast<std::uint8_t>(text[at + i]) & 0x3F);
+        at += length;
+        if (c >= 0x10000) {
+            result += static_cast<char16_t>(0xD800 + ((c - 0x10000) >> 10));
+            c = 0xDC00 + (c & 0x3FF);
+        }
+        result += static_cast<char16_t>(c);
+    }
+    return result;
 }
 
 std::string westernToUtf8(std::string_view text) {

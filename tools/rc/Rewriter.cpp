@@ -1,89 +1,54 @@
 #include "tools/rc/Rewriter.h"
 
+#include "tools/rc/StatementReader.h"
+
 #include <algorithm>
-#include <array>
-#include <functional>
 #include <map>
 
 namespace rc {
 
 namespace {
 
-// Memory flags of old scripts, without meaning for a long time.
-constexpr std::array<std::string_view, 8> memoryFlags = {"DISCARDABLE", "MOVEABLE", "PURE",       "FIXED",
-                                                         "IMPURE",      "PRELOAD",  "LOADONCALL", "NONDISCARDABLE"};
-
-// Reads a statement's words in order and complains with the place where something else was expected.
-class Reader {
+// Numbers of 16 bits on their way into a raw data statement.
+class RawData {
 public:
-    Reader(const Script& script, const Statement& statement) : m_script(script), m_tokens(statement.tokens) {}
-
-    [[nodiscard]] bool atEnd() const {
-        return m_at == m_tokens.size();
+    [[nodiscard]] std::size_t size() const {
+        return m_words.size();
     }
-    [[nodiscard]] bool ahead(std::string_view keyword) const {
-        return !atEnd() && m_tokens[m_at].is(keyword);
+    void word(std::uint16_t value) {
+        m_words.push_back(value);
     }
-    [[nodiscard]] bool blockEndAhead() const {
-        return !atEnd() && m_tokens[m_at].closesBlock();
+    void doubleWord(std::int64_t value) {
+        word(static_cast<std::uint16_t>(value & 0xFFFF));
+        word(static_cast<std::uint16_t>(value >> 16 & 0xFFFF));
     }
-    [[nodiscard]] bool memoryFlagAhead() const {
-        return std::ranges::any_of(memoryFlags, [&](std::string_view flag) { return ahead(flag); });
+    void text(const std::u16string& value) {
+        m_words.insert(m_words.end(), value.begin(), value.end());
+        word(0);
     }
-
-    const Token& next(std::string_view expected) {
-        if (atEnd())
-            throw Fault{m_script.placeOf(m_tokens.back()), "expected " + std::string(expected) + " behind this line"};
-        return m_tokens[m_at++];
+    void alignToDoubleWord() {
+        if (m_words.size() % 2 != 0)
+            word(0);
     }
-    bool accept(std::string_view keyword) {
-        const bool isThere = ahead(keyword);
-        m_at += isThere ? 1 : 0;
-        return isThere;
+    /// The bits `flags` are added to the word at `at`.
+    void mark(std::size_t at, std::uint16_t flags) {
+        m_words[at] = static_cast<std::uint16_t>(m_words[at] | flags);
     }
-    const Token& expect(std::string_view keyword) {
-        const Token& token = next(keyword);
-        if (!token.is(keyword))
-            fail(token, keyword);
-        return token;
-    }
-    void beginBlock() {
-        while (memoryFlagAhead())
-            ++m_at;
-        if (const Token& token = next("BEGIN"); !token.opensBlock())
-            fail(token, "BEGIN");
-    }
-    /// The words of a number's expression, up to a comma, a keyword of the caller's or a block's border.
-    std::string expression(const std::function<bool(const Token&)>& isEnd) {
-        std::string text;
-        while (!atEnd() && !m_tokens[m_at].is(",") && !m_tokens[m_at].opensBlock() && !m_tokens[m_at].closesBlock() &&
-               !isEnd(m_tokens[m_at]))
-            text += m_tokens[m_at++].text;
-        if (text.empty())
-            fail(next("a number"), "a number");
-        return text;
-    }
-    std::string expression() {
-        return expression([](const Token& token) { return memoryFlag(token); });
-    }
-
-    [[noreturn]] void fail(const Token& token, std::string_view expected) const {
-        throw Fault{m_script.placeOf(token), "expected " + std::string(expected) + ", got " + token.text};
+    [[nodiscard]] std::string statement(const std::string& name, int type) const {
+        std::string result = name + " " + std::to_string(type) + "\nBEGIN\n";
+        for (std::size_t i = 0; i < m_words.size(); ++i)
+            result += (i > 0 ? (i % 8 == 0 ? ",\n" : ", ") : "") + std::to_string(m_words[i]);
+        return result + "\nEND\n";
     }
 
 private:
-    static bool memoryFlag(const Token& token) {
-        return std::ranges::any_of(memoryFlags, [&](std::string_view flag) { return token.is(flag); });
-    }
-
-    const Script& m_script;
-    const std::vector<Token>& m_tokens;
-    std::size_t m_at = 0;
+    std::vector<std::uint16_t> m_words;
 };
 
-std::string rawData(const std::string& name, int type, const std::string& numbers) {
-    return name + " " + std::to_string(type) + "\nBEGIN\n" + numbers + "END\n";
-}
+constexpr int menuType = 4;
+constexpr int acceleratorType = 9;
+constexpr int dialogDataType = 240;
+constexpr int toolBarType = 241;
 
 std::string sourceText(const Script& script, const Statement& statement) {
     std::string text;
@@ -94,105 +59,161 @@ std::string sourceText(const Script& script, const Statement& statement) {
 
 // name TOOLBAR width, height BEGIN (BUTTON id | SEPARATOR)... END
 std::string rewriteToolBar(const Script& script, const Statement& statement) {
-    Reader reader(script, statement);
+    StatementReader reader(script, statement);
     const std::string name = reader.next("a name").text;
     reader.expect("TOOLBAR");
-    while (reader.memoryFlagAhead())
-        reader.next("a width");
-    const std::string width = reader.expression();
+    reader.skipMemoryFlags();
+    const std::uint16_t width = reader.word();
     reader.expect(",");
-    const std::string height = reader.expression();
+    const std::uint16_t height = reader.word();
     reader.beginBlock();
-    std::string commands;
-    int count = 0;
-    for (; !reader.blockEndAhead(); ++count) {
-        if (reader.accept("SEPARATOR")) {
-            commands += ", 0\n";
-            continue;
+    std::vector<std::uint16_t> commands;
+    while (!reader.blockEndAhead()) {
+        if (!reader.accept("SEPARATOR")) {
+            reader.expect("BUTTON");
+            commands.push_back(reader.word());
+        } else {
+            commands.push_back(0);
         }
-        const std::size_t line = reader.expect("BUTTON").line;
-        commands += ", " + reader.expression([&](const Token& token) {
-            return token.line != line || token.is("BUTTON") || token.is("SEPARATOR");
-        }) + "\n";
     }
-    return rawData(name, 241, "1, " + width + ", " + height + ", " + std::to_string(count) + "\n" + commands);
+    RawData data;
+    constexpr std::uint16_t version = 1;
+    for (const std::uint16_t word : {version, width, height, static_cast<std::uint16_t>(commands.size())})
+        data.word(word);
+    for (const std::uint16_t command : commands)
+        data.word(command);
+    return data.statement(name, toolBarType);
 }
 
-// name DLGINIT BEGIN numbers and texts END
-std::string rewriteDialogData(const Script& script, const Statement& statement) {
-    std::string text = statement.tokens.front().text + " 240\n";
+// name DLGINIT BEGIN numbers and texts END: raw data already, under a name where a number is wanted.
+std::string rewriteDialogData(const Script&, const Statement& statement) {
+    std::string text = statement.tokens.front().text + " " + std::to_string(dialogDataType);
     std::size_t line = statement.firstLine();
     for (auto token = statement.tokens.begin() + 2; token != statement.tokens.end(); ++token) {
-        text += token->line == line ? " " : "\n";
+        text += (token->line == line ? " " : "\n") + token->text;
         line = token->line;
-        text += token->text;
     }
     return text + "\n";
 }
 
 struct AcceleratorEntry {
-    std::string key;
-    std::string command;
-    int flags = 0;
+    std::uint16_t flags = 0;
+    std::uint16_t key = 0;
+    std::uint16_t command = 0;
 };
 
 constexpr int virtualKeyFlag = 0x01;
 constexpr int modifierFlags = 0x1C;
 constexpr int lastEntryFlag = 0x80;
 
-// "A" is a character, "^A" the control character of it.
-std::string keyOfText(const Reader& reader, const Token& token) {
-    const std::string text = token.text.substr(1, token.text.size() - 2);
+// A number, a character, or the control character of one: "^A".
+std::uint16_t readKey(StatementReader& reader) {
+    const Token* first = reader.peek();
+    if (first == nullptr || first->kind != Token::Kind::String)
+        return reader.word();
+    const std::u16string text = reader.text();
     if (text.size() == 1)
-        return std::to_string(static_cast<unsigned char>(text[0]));
-    if (text.size() == 2 && text[0] == '^')
-        return std::to_string(text[1] & 0x1F);
-    reader.fail(token, "one character");
+        return text[0];
+    if (text.size() == 2 && text[0] == u'^')
+        return text[1] & 0x1F;
+    reader.fail(*first, "one character");
 }
 
-AcceleratorEntry readAccelerator(Reader& reader) {
-    static constexpr std::pair<std::string_view, int> options[] = {{"VIRTKEY", virtualKeyFlag}, {"ASCII", 0},
-                                                                   {"NOINVERT", 0x02},          {"SHIFT", 0x04},
-                                                                   {"CONTROL", 0x08},           {"ALT", 0x10}};
+AcceleratorEntry readAccelerator(StatementReader& reader) {
+    static constexpr std::pair<std::string_view, std::uint16_t> options[] = {
+        {"VIRTKEY", virtualKeyFlag}, {"ASCII", 0}, {"NOINVERT", 0x02}, {"SHIFT", 0x04},
+        {"CONTROL", 0x08},           {"ALT", 0x10}};
     AcceleratorEntry entry;
-    const Token key = reader.next("a key");
-    entry.key = key.kind == Token::Kind::String ? keyOfText(reader, key) : key.text;
+    entry.key = readKey(reader);
     reader.expect(",");
-    // Nothing but the line's end may stand between a command and the next key.
-    entry.command = reader.expression([&](const Token& token) { return token.line != key.line; });
-    bool isMore = reader.accept(",");
-    while (isMore) {
-        const auto* option = std::ranges::find_if(options, [&](const auto& pair) { return reader.ahead(pair.first); });
+    entry.command = reader.word();
+    const auto isAhead = [&](const auto& option) { return reader.ahead(option.first); };
+    while (reader.accept(",") || std::ranges::any_of(options, isAhead)) {
+        const auto* option = std::ranges::find_if(options, isAhead);
         const Token& word = reader.next("an option");
         if (option == std::end(options))
             reader.fail(word, "an option such as VIRTKEY or ALT");
-        entry.flags |= option->second;
-        isMore = reader.accept(",") ||
-                 std::ranges::any_of(options, [&](const auto& pair) { return reader.ahead(pair.first); });
+        entry.flags = static_cast<std::uint16_t>(entry.flags | option->second);
     }
     return entry;
 }
 
+bool isModifiedCharacter(const AcceleratorEntry& entry) {
+    return (entry.flags & virtualKeyFlag) == 0 && (entry.flags & modifierFlags) != 0;
+}
+
 // name ACCELERATORS BEGIN key, command [, VIRTKEY | ASCII] [, NOINVERT] [, ALT] [, SHIFT] [, CONTROL] ... END
+// The compiler refuses modifiers of characters, and options that no comma separates.
 std::string rewriteAccelerators(const Script& script, const Statement& statement) {
-    Reader reader(script, statement);
+    StatementReader reader(script, statement);
     const std::string name = reader.next("a name").text;
     reader.expect("ACCELERATORS");
     reader.beginBlock();
     std::vector<AcceleratorEntry> entries;
     while (!reader.blockEndAhead())
         entries.push_back(readAccelerator(reader));
-    const bool hasModifiedCharacter = std::ranges::any_of(entries, [](const AcceleratorEntry& entry) {
-        return (entry.flags & virtualKeyFlag) == 0 && (entry.flags & modifierFlags) != 0;
-    });
-    if (!hasModifiedCharacter)
+    if (std::ranges::none_of(entries, isModifiedCharacter) || entries.empty())
         return sourceText(script, statement);
     entries.back().flags |= lastEntryFlag;
-    std::string numbers;
+    RawData data;
     for (const AcceleratorEntry& entry : entries)
-        numbers += (numbers.empty() ? "" : ", ") + std::to_string(entry.flags) + ", " + entry.key + ", " +
-                   entry.command + ", 0\n";
-    return rawData(name, 9, numbers);
+        for (const std::uint16_t word : {entry.flags, entry.key, entry.command, std::uint16_t{0}})
+            data.word(word);
+    return data.statement(name, acceleratorType);
+}
+
+// One of the numbers behind a text of an extended menu, each of which may be left out.
+std::int64_t optionalNumber(StatementReader& reader) {
+    if (!reader.accept(",") || reader.ahead(","))
+        return 0;
+    return reader.number();
+}
+
+// The lines of an extended menu up to its END.
+void readMenuItems(StatementReader& reader, RawData& data) {
+    constexpr std::uint16_t popupFlag = 0x01;
+    constexpr std::uint16_t lastFlag = 0x80;
+    std::size_t flagsAt = 0;
+    while (!reader.blockEndAhead()) {
+        const bool isPopup = reader.accept("POPUP");
+        if (!isPopup)
+            reader.expect("MENUITEM");
+        const std::u16string text = reader.text();
+        const std::int64_t id = optionalNumber(reader);
+        const std::int64_t type = optionalNumber(reader);
+        const std::int64_t state = optionalNumber(reader);
+        data.alignToDoubleWord();
+        data.doubleWord(type);
+        data.doubleWord(state);
+        data.doubleWord(id);
+        flagsAt = data.size();
+        data.word(isPopup ? popupFlag : std::uint16_t{0});
+        data.text(text);
+        if (isPopup) {
+            data.alignToDoubleWord();
+            data.doubleWord(optionalNumber(reader)); // help context
+            reader.beginBlock();
+            readMenuItems(reader, data);
+        }
+    }
+    if (flagsAt == 0)
+        reader.fail(reader.next("END"), "MENUITEM or POPUP");
+    data.mark(flagsAt, lastFlag);
+    reader.next("END");
+}
+
+// name MENUEX BEGIN (MENUITEM text [, id [, type [, state]]] | POPUP text [, id ... [, help]] BEGIN ... END)... END
+std::string rewriteExtendedMenu(const Script& script, const Statement& statement) {
+    StatementReader reader(script, statement);
+    const std::string name = reader.next("a name").text;
+    reader.expect("MENUEX");
+    reader.beginBlock();
+    RawData data;
+    data.word(1);       // version
+    data.word(4);       // from here to the first item
+    data.doubleWord(0); // help context
+    readMenuItems(reader, data);
+    return data.statement(name, menuType);
 }
 
 std::string withoutQuotes(const std::string& text) {
@@ -231,8 +252,10 @@ std::filesystem::path findFile(const std::filesystem::path& folder, std::string 
 
 std::string Rewriter::rewrite(const Script& script, const Statement& statement) {
     using Rewrite = std::string (*)(const Script&, const Statement&);
-    static const std::map<std::string, Rewrite, std::less<>> rewrites = {
-        {"TOOLBAR", rewriteToolBar}, {"DLGINIT", rewriteDialogData}, {"ACCELERATORS", rewriteAccelerators}};
+    static const std::map<std::string, Rewrite, std::less<>> rewrites = {{"TOOLBAR", rewriteToolBar},
+                                                                         {"DLGINIT", rewriteDialogData},
+                                                                         {"ACCELERATORS", rewriteAccelerators},
+                                                                         {"MENUEX", rewriteExtendedMenu}};
     const std::string type = statement.type();
     // What resource editors keep for themselves.
     if (type == "DESIGNINFO" || type == "TEXTINCLUDE")

@@ -9,7 +9,7 @@
 namespace rc {
 
 /// Turns statements that the resource compiler refuses into ones it takes, with the same meaning:
-/// tool bars, dialog data, extended menus and accelerators with ALT on a character become numbered raw data, the
+/// tool bars, dialog data, extended menus and accelerators with modifiers of characters become numbered raw data, the
 /// statements of resource editors are dropped, and files are named by the path that exists here.
 class Rewriter {
 public:

@@ -1,0 +1,214 @@
+#include "platform/win/Module.h"
+
+#include "platform/base/Text.h"
+#include "platform/win/Error.h"
+#include "platform/win/detail/ModuleTable.h"
+
+#include <dlfcn.h>
+#include <link.h>
+
+#include <algorithm>
+#include <cstring>
+#include <filesystem>
+
+namespace tvx::detail {
+
+namespace {
+
+// The loader's own entry tells files apart; their paths may be relative or lead over links.
+const void* loadBase(const void* address) {
+    Dl_info info{};
+    link_map* map = nullptr;
+    if (dladdr1(address, &info, reinterpret_cast<void**>(&map), RTLD_DL_LINKMAP) == 0)
+        return nullptr;
+    return map;
+}
+
+const void* applicationBase() {
+    static const void* const base = [] {
+        link_map* map = nullptr;
+        dlinfo(dlopen(nullptr, RTLD_LAZY), RTLD_DI_LINKMAP, &map);
+        return map;
+    }();
+    return base;
+}
+
+std::string pathOf(const void* base) {
+    const bool isApplication = base == applicationBase();
+    const std::filesystem::path file = isApplication ? "/proc/self/exe" : static_cast<const link_map*>(base)->l_name;
+    std::error_code error;
+    const auto resolved = std::filesystem::canonical(file, error);
+    return error ? file.string() : resolved.string();
+}
+
+// What a module is called, in lower case: "guiutilities" for /usr/lib/libGuiUtilities.so.1.
+std::string plainName(std::string_view path) {
+    if (const auto slash = path.find_last_of("/\\"); slash != std::string_view::npos)
+        path.remove_prefix(slash + 1);
+    std::string name = text::toLower(path);
+    if (const auto extension = name.find(".so"); extension != std::string::npos)
+        name.erase(extension);
+    if (path.size() > name.size() && name.starts_with("lib"))
+        name.erase(0, 3);
+    for (const std::string_view extension : {".dll", ".exe"})
+        if (name.ends_with(extension))
+            name.erase(name.size() - extension.size());
+    return name;
+}
+
+} // namespace
+
+const std::string& Module::path() {
+    if (m_path.empty())
+        m_path = pathOf(m_base);
+    return m_path;
+}
+
+void Module::add(ResourceBytes data) {
+    m_parts.push_back({data, nullptr});
+}
+
+void Module::remove(const void* data) {
+    std::erase_if(m_parts, [&](const Part& part) { return part.data.data() == data; });
+}
+
+std::vector<const ResourceIndex*> Module::indexes() {
+    std::vector<const ResourceIndex*> result;
+    for (Part& part : m_parts) {
+        if (!part.index)
+            part.index = std::make_unique<ResourceIndex>(part.data);
+        result.push_back(part.index.get());
+    }
+    return result;
+}
+
+ModuleTable& ModuleTable::instance() {
+    // Never destroyed: shared objects hand their resources back after this library's own objects are gone.
+    static ModuleTable* const table = new ModuleTable;
+    return *table;
+}
+
+void ModuleTable::add(const void* anchor, ResourceBytes data) {
+    const void* base = loadBase(anchor);
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byBase(base);
+    if (module == nullptr)
+        module = m_modules.emplace_back(std::make_unique<Module>(base)).get();
+    module->add(data);
+}
+
+void ModuleTable::remove(const void* data) {
+    const void* base = loadBase(data);
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byBase(base);
+    if (module == nullptr)
+        return;
+    module->remove(data);
+    if (module->isEmpty() && base != applicationBase())
+        std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+}
+
+HMODULE ModuleTable::application() {
+    const std::scoped_lock lock(m_mutex);
+    return applicationModule().handle();
+}
+
+HMODULE ModuleTable::fromAddress(const void* address) {
+    const void* base = loadBase(address);
+    const std::scoped_lock lock(m_mutex);
+    if (base != nullptr && base == applicationBase())
+        return applicationModule().handle();
+    Module* module = byBase(base);
+    return module ? module->handle() : nullptr;
+}
+
+HMODULE ModuleTable::fromName(std::string_view name) {
+    const std::string wanted = plainName(name);
+    const std::scoped_lock lock(m_mutex);
+    applicationModule();
+    for (const auto& module : m_modules)
+        if (wanted == plainName(module->path()))
+            return module->handle();
+    return nullptr;
+}
+
+std::string ModuleTable::path(HMODULE handle) {
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byHandle(handle);
+    return module ? module->path() : std::string();
+}
+
+std::vector<const ResourceIndex*> ModuleTable::indexes(HMODULE handle) {
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byHandle(handle);
+    return module ? module->indexes() : std::vector<const ResourceIndex*>();
+}
+
+Module& ModuleTable::applicationModule() {
+    if (Module* module = byBase(applicationBase()))
+        return *module;
+    return *m_modules.emplace_back(std::make_unique<Module>(applicationBase()));
+}
+
+Module* ModuleTable::byBase(const void* base) {
+    const auto found = std::ranges::find_if(m_modules, [&](const auto& owned) { return owned->base() == base; });
+    return found == m_modules.end() ? nullptr : found->get();
+}
+
+Module* ModuleTable::byHandle(HMODULE handle) {
+    if (handle == nullptr)
+        return &applicationModule();
+    const auto found = std::ranges::find_if(m_modules, [&](const auto& owned) { return owned->handle() == handle; });
+    return found == m_modules.end() ? nullptr : found->get();
+}
+
+} // namespace tvx::detail
+
+namespace tvx {
+
+using detail::ModuleTable;
+
+void registerResources(const void* anchor, const void* data, std::size_t size) {
+    ModuleTable::instance().add(anchor, {static_cast<const std::uint8_t*>(data), size});
+}
+
+void unregisterResources(const void* data) {
+    ModuleTable::instance().remove(data);
+}
+
+HMODULE moduleFromAddress(const void* address) {
+    return ModuleTable::instance().fromAddress(address);
+}
+
+std::string moduleFileName(HMODULE module) {
+    return ModuleTable::instance().path(module);
+}
+
+HMODULE applicationModule() {
+    return ModuleTable::instance().application();
+}
+
+} // namespace tvx
+
+HMODULE GetModuleHandleA(LPCSTR name) {
+    auto& table = tvx::detail::ModuleTable::instance();
+    const HMODULE module = name ? table.fromName(name) : table.application();
+    if (module == nullptr)
+        SetLastError(ERROR_MOD_NOT_FOUND);
+    return module;
+}
+
+DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size) {
+    const std::string path = tvx::moduleFileName(module);
+    if (path.empty() || buffer == nullptr || size == 0) {
+        SetLastError(path.empty() ? ERROR_MOD_NOT_FOUND : ERROR_INSUFFICIENT_BUFFER);
+        return 0;
+    }
+    const std::size_t length = std::min<std::size_t>(path.size(), size - 1);
+    std::memcpy(buffer, path.data(), length);
+    buffer[length] = '\0';
+    if (length == path.size())
+        return static_cast<DWORD>(length);
+    SetLastError(ERROR_INSUFFICIENT_BUFFER);
+    return size;
+}

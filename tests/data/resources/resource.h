@@ -1,0 +1,26 @@
+#pragma once
+
+#define IDR_MAINFRAME 128
+#define IDD_SAMPLE 130
+#define IDD_PLAIN 131
+#define IDR_EXTENDED 132
+#define IDB_STRIPES 140
+#define IDB_GRID 141
+#define IDI_SPOT 150
+#define IDC_POINTER 151
+#define IDD_SHARED 160
+
+#define IDC_NAME 1000
+#define IDC_COLOR 1001
+#define IDC_TREE 1002
+#define IDC_ITEMS 1003
+
+#define ID_THING_DRAW 32771
+#define ID_THING_FILL 32772
+
+#define IDS_GREETING 100
+#define IDS_MIXED 101
+#define IDS_LAST_OF_BLOCK 111
+#define IDS_SHADOWED 300
+#define IDS_EXTENSION_ONLY 301
+#define IDS_WESTERN 400
