@@ -1,0 +1,64 @@
+#pragma once
+
+#include <cstdint>
+
+/// @file
+/// Raster operations on pixels of 32 bits (0xffRRGGBB). A code is a truth table: bit `n` of it is the result for the
+/// inputs whose bits, written one behind the other, give the number `n`.
+
+namespace tvx::afx {
+
+using Pixel = std::uint32_t;
+constexpr Pixel kOpaque = 0xFF000000U;
+constexpr Pixel kBlackPixel = kOpaque;
+constexpr Pixel kWhitePixel = 0xFFFFFFFFU;
+
+/// A binary operation of pen (or brush) and destination: bit `pen * 2 + destination` of the table, 0..15.
+enum class Rop2 : std::uint8_t { black = 0, notDestination = 5, xorPen = 6, nop = 10, copy = 12, white = 15 };
+
+/// A ternary operation: bit `brush * 4 + source * 2 + destination` of the table, 0..255.
+using Rop3 = std::uint8_t;
+constexpr Rop3 kRop3Source = 0xCC;
+
+/// The operation of a code for the `SetROP2` call (1..16).
+constexpr Rop2 rop2FromCode(int code) {
+    return static_cast<Rop2>((code - 1) & 0xF);
+}
+
+/// The ternary operation of a code for the blit calls: its third byte.
+constexpr Rop3 rop3FromCode(std::uint32_t code) {
+    return static_cast<Rop3>((code >> 16) & 0xFF);
+}
+
+/// Whether the result depends on the source: else the call fills only.
+constexpr bool usesSource(Rop3 rop) {
+    return ((rop >> 2) & 0x33) != (rop & 0x33);
+}
+
+/// What a ternary operation without a source does with brush and destination.
+constexpr Rop2 rop2FromRop3(Rop3 rop) {
+    return static_cast<Rop2>((rop & 3) | ((rop >> 2) & 0xC));
+}
+
+constexpr Pixel combine(Rop2 rop, Pixel pen, Pixel destination) {
+    const auto table = static_cast<unsigned>(rop);
+    Pixel result = kOpaque;
+    if (table & 1)
+        result |= ~pen & ~destination;
+    if (table & 2)
+        result |= ~pen & destination;
+    if (table & 4)
+        result |= pen & ~destination;
+    if (table & 8)
+        result |= pen & destination;
+    return result;
+}
+
+constexpr Pixel combine(Rop3 rop, Pixel brush, Pixel source, Pixel destination) {
+    const Rop2 withoutBrush = static_cast<Rop2>(rop & 0xF);
+    const Rop2 withBrush = static_cast<Rop2>(rop >> 4);
+    return kOpaque | (~brush & combine(withoutBrush, source, destination)) |
+           (brush & combine(withBrush, source, destination));
+}
+
+} // namespace tvx::afx

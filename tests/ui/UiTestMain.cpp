@@ -1,0 +1,20 @@
+#include <QApplication>
+#include <QFont>
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+
+/// Pixels and metrics are compared, so display, style and font are the same on every machine.
+int main(int argc, char** argv) {
+    setenv("QT_QPA_PLATFORM", "offscreen", 1);
+    testing::InitGoogleTest(&argc, argv);
+    QApplication::setStyle(QStringLiteral("Fusion"));
+    const QApplication application(argc, argv);
+    QFont font(QStringLiteral("DejaVu Sans Condensed"));
+    font.setPixelSize(11);
+    font.setHintingPreference(QFont::PreferFullHinting);
+    font.setKerning(false);
+    QApplication::setFont(font);
+    return RUN_ALL_TESTS();
+}
