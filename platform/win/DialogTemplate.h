@@ -20,15 +20,15 @@ using ResourceName = std::variant<WORD, std::string>;
 
 /// A rectangle in dialog units: a quarter of the average character's width, an eighth of its height.
 struct DialogRect {
-    int x = 0;
-    int y = 0;
-    int width = 0;
-    int height = 0;
+    int x = 0;      ///< of the left edge
+    int y = 0;      ///< of the top edge
+    int width = 0;  ///< may be negative in careless templates
+    int height = 0; ///< of a combo box: with its list dropped
 };
 
 /// The font of a dialog that has DS_SETFONT.
 struct DialogFont {
-    int pointSize = 8;
+    int pointSize = 8;   ///< in points of 1/72 inch
     int weight = 400;    ///< 400 is normal, 700 bold
     bool italic = false; ///< weight, italic and character set come from DIALOGEX only
     BYTE charSet = 1;
@@ -37,11 +37,11 @@ struct DialogFont {
 
 /// One control of a dialog template.
 struct DialogItemTemplate {
-    DWORD style = 0;
-    DWORD extendedStyle = 0;
-    DWORD helpId = 0;
-    DialogRect rect; ///< from the dialog's client corner
-    DWORD id = 0;    ///< 0xFFFF for IDC_STATIC in both kinds of template
+    DWORD style = 0;         ///< WS_ styles and those of the control's class
+    DWORD extendedStyle = 0; ///< WS_EX_ styles
+    DWORD helpId = 0;        ///< help context, DIALOGEX only
+    DialogRect rect;         ///< from the dialog's client corner
+    DWORD id = 0;            ///< 0xFFFF for IDC_STATIC in both kinds of template
     /// Window class, in the spelling of the script. The six numbered classes are given by name:
     /// "Button", "Edit", "Static", "ListBox", "ScrollBar", "ComboBox".
     std::string className;
@@ -50,15 +50,15 @@ struct DialogItemTemplate {
 
 /// A dialog as its resource describes it.
 struct DialogTemplate {
-    bool extended = false; ///< DIALOGEX
-    DWORD style = 0;
-    DWORD extendedStyle = 0;
-    DWORD helpId = 0;
-    DialogRect rect;
-    ResourceName menu;      ///< number 0 when there is none
-    ResourceName className; ///< number 0 for an ordinary dialog
-    std::string title;
-    std::optional<DialogFont> font;
+    bool extended = false;                 ///< DIALOGEX
+    DWORD style = 0;                       ///< WS_ and DS_ styles
+    DWORD extendedStyle = 0;               ///< WS_EX_ styles
+    DWORD helpId = 0;                      ///< help context, DIALOGEX only
+    DialogRect rect;                       ///< width and height are those of the client area
+    ResourceName menu;                     ///< number 0 when there is none
+    ResourceName className;                ///< number 0 for an ordinary dialog
+    std::string title;                     ///< caption
+    std::optional<DialogFont> font;        ///< none: the system's font
     std::vector<DialogItemTemplate> items; ///< in tab order
 };
 
@@ -69,10 +69,10 @@ struct DialogTemplate {
 struct DialogDataEntry {
     /// What is done with the text. Messages of other controls are handed on with their number.
     enum class Kind { AddToListBox, AddToComboBox, Other };
-    WORD controlId = 0;
-    Kind kind = Kind::Other;
-    WORD message = 0;
-    std::string text; ///< UTF-8, converted from the western code page if it was written in it
+    WORD controlId = 0;      ///< whom the text is for
+    Kind kind = Kind::Other; ///< what to do with it
+    WORD message = 0;        ///< as the resource has it, for `Kind::Other`
+    std::string text;        ///< UTF-8, converted from the western code page if it was written in it
 };
 
 /// Reads the data of an RT_DLGINIT resource.

@@ -12,15 +12,15 @@ namespace tvx {
 
 /// One line of a menu: a command, a separator, or a popup with lines of its own.
 struct MenuItemTemplate {
+    /// What choosing the line does.
     enum class Kind { Command, Separator, Popup };
-    /// Placement asked for in the script: on the line as usual, in a new column (with a line before it), or pushed to
-    /// the right end of the menu bar.
+    /// Whether a new column (in a menu bar: a new line) begins here: with a bar before it, or without.
     enum class Break { None, Bar, Column };
 
-    Kind kind = Kind::Command;
-    Break breakBefore = Break::None;
-    bool grayed = false;   ///< GRAYED
-    bool inactive = false; ///< INACTIVE: disabled, but drawn as usual
+    Kind kind = Kind::Command;       ///< decides which of the other members matter
+    Break breakBefore = Break::None; ///< MENUBARBREAK or MENUBREAK
+    bool grayed = false;             ///< GRAYED
+    bool inactive = false;           ///< INACTIVE: disabled, but drawn as usual
     bool checked = false;
     bool help = false;                   ///< HELP: at the right end of a menu bar
     UINT id = 0;                         ///< command identifier; popups of extended menus may have one, others 0

@@ -12,8 +12,8 @@ namespace tvx {
 
 /// Pixels of a bitmap, an icon or a cursor, decoded.
 struct Picture {
-    int width = 0;
-    int height = 0;
+    int width = 0;         ///< in pixels, at least 1
+    int height = 0;        ///< in pixels, at least 1
     int bitsPerPixel = 32; ///< of the resource the pixels came from: 1 tells a monochrome bitmap
     /// `width * height` values 0xAARRGGBB, top row first, not premultiplied. Bitmaps are opaque (alpha 255) unless
     /// they have 32 bits and an alpha channel.
@@ -28,9 +28,9 @@ struct Picture {
 
 /// A picture for a pointer, with the pixel that points.
 struct CursorPicture {
-    Picture picture;
-    int hotX = 0;
-    int hotY = 0;
+    Picture picture; ///< what the pointer looks like
+    int hotX = 0;    ///< column of the pixel that points
+    int hotY = 0;    ///< row of it, from the top
 };
 
 /// Reads the data of an RT_BITMAP resource: uncompressed, with 1, 4, 8, 16, 24 or 32 bits a pixel.

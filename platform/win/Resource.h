@@ -34,6 +34,7 @@
 /// Tool bars.
 #define RT_TOOLBAR MAKEINTRESOURCE(241)
 
+/// A language identifier from a LANG_ and a SUBLANG_ number.
 constexpr WORD MAKELANGID(int primary, int sub) {
     return static_cast<WORD>((sub << 10) | primary);
 }

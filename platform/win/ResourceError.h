@@ -8,7 +8,7 @@ namespace tvx {
 
 /// Why resource data was refused: one English clause that names what is wrong and where, without a full stop.
 struct ResourceError {
-    std::string reason;
+    std::string reason; ///< e.g. "tool bar ends within its head"
 };
 
 /// The outcome of reading resource data: the value, or the reason why the data was refused.
@@ -20,9 +20,12 @@ struct ResourceError {
 template <class T>
 class [[nodiscard]] ResourceResult {
 public:
+    /// A success.
     ResourceResult(T value) : m_outcome(std::move(value)) {}
+    /// A refusal.
     ResourceResult(ResourceError error) : m_outcome(std::move(error)) {}
 
+    /// Whether there is a value.
     explicit operator bool() const {
         return std::holds_alternative<T>(m_outcome);
     }
