@@ -16,6 +16,9 @@
 #include "platform/base/Object.h"
 #include "platform/base/String.h"
 
+#include <new>
+#include <stdexcept>
+
 /// Base of the framework's exceptions. Made on the heap by the AfxThrow functions, or as a static object that survives
 /// Delete(), which is what the ones do that must be thrown when no memory is left.
 class TVX_PLATFORM_API CException : public CObject {
@@ -187,6 +190,19 @@ protected:
 [[noreturn]] TVX_PLATFORM_API void AfxThrowArchiveException(int cause, LPCSTR fileName = nullptr);
 
 namespace tvx {
+
+/// Calls a function that allocates; where the standard library reports an exhausted heap or an impossible size, the
+/// framework's memory exception is raised.
+template <typename Function>
+void allocating(Function function) {
+    try {
+        function();
+    } catch (const std::bad_alloc&) {
+        AfxThrowMemoryException();
+    } catch (const std::length_error&) {
+        AfxThrowMemoryException();
+    }
+}
 
 /// Shows an exception's text to the user: CException::ReportError calls it.
 /// @param text      the exception's description, empty when it has none

@@ -18,8 +18,9 @@ using INT = int;
 using UINT = unsigned int;
 using LONG = std::int32_t;
 using ULONG = std::uint32_t;
-using LONGLONG = std::int64_t;
-using ULONGLONG = std::uint64_t;
+// Not the fixed-width types, which are "long" here: hosts print these as "%lld", and archives hold a "long" in 32 bits.
+using LONGLONG = long long;
+using ULONGLONG = unsigned long long;
 using CHAR = char;
 using TCHAR = char;
 using WCHAR = wchar_t;

@@ -1,10 +1,14 @@
 #pragma once
 
 /// @file
-/// The framework's basics: text, run-time classes, exceptions, geometry.
+/// The framework's basics: text, run-time classes, exceptions, files, archives, geometry.
 
+#include "platform/base/Archive.h"
 #include "platform/base/Exception.h"
+#include "platform/base/File.h"
 #include "platform/base/Geometry.h"
+#include "platform/base/MemFile.h"
 #include "platform/base/Object.h"
+#include "platform/base/StdioFile.h"
 #include "platform/base/String.h"
 #include "platform/base/Types.h"

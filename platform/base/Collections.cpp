@@ -1,0 +1,15 @@
+#include "platform/base/Collections.h"
+
+IMPLEMENT_SERIAL(CStringArray, CObject, 0)
+IMPLEMENT_DYNAMIC(CPtrArray, CObject)
+IMPLEMENT_SERIAL(CObArray, CObject, 0)
+IMPLEMENT_SERIAL(CByteArray, CObject, 0)
+IMPLEMENT_SERIAL(CWordArray, CObject, 0)
+IMPLEMENT_SERIAL(CDWordArray, CObject, 0)
+IMPLEMENT_DYNAMIC(CUIntArray, CObject)
+IMPLEMENT_SERIAL(CStringList, CObject, 0)
+IMPLEMENT_DYNAMIC(CPtrList, CObject)
+IMPLEMENT_SERIAL(CObList, CObject, 0)
+IMPLEMENT_DYNAMIC(CMapPtrToWord, CObject)
+IMPLEMENT_DYNAMIC(CMapStringToPtr, CObject)
+IMPLEMENT_SERIAL(CMapStringToString, CObject, 0)

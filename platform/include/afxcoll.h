@@ -1,0 +1,7 @@
+#pragma once
+
+/// @file
+/// The framework's collections.
+
+#include "afx.h"
+#include "platform/base/Collections.h"
