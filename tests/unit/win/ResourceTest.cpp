@@ -5,9 +5,8 @@
 #include "platform/win/ExtensionModule.h"
 #include "tests/data/resources/resource.h"
 
+#include <afxres.h>
 #include <gtest/gtest.h>
-
-#include <dlfcn.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -108,6 +107,16 @@ TEST(ExtensionModule, SearchGoesFromTheApplicationToTheChain) {
     EXPECT_TRUE(text.LoadString(IDS_EXTENSION_ONLY));
     EXPECT_STREQ(text, "only in the library: Žluťoučký");
     EXPECT_FALSE(text.LoadString(9999));
+}
+
+TEST(ExtensionModule, FrameworksOwnResourcesComeLast) {
+    EXPECT_EQ(AfxFindStringResourceHandle(AFX_IDS_ALLFILTER), tvx::platformModule());
+    CString text;
+    EXPECT_TRUE(text.LoadString(AFX_IDS_ALLFILTER));
+    EXPECT_STREQ(text, "All Files (*.*)");
+    EXPECT_TRUE(text.LoadString(AFX_IDS_IDLEMESSAGE));
+    EXPECT_STREQ(text, "For help, press F1") << "the program has a string of its own for it";
+    EXPECT_EQ(AfxFindResourceHandle(MAKEINTRESOURCE(AFX_IDD_NEWTYPEDLG), RT_DIALOG), tvx::platformModule());
 }
 
 TEST(ExtensionModule, CurrentResourceModuleIsSearchedFirst) {
