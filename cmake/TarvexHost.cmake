@@ -43,7 +43,7 @@ function(tvx_compile_resources target script)
     COMMAND_EXPAND_LISTS
     VERBATIM)
   configure_file("${TVX_HOST_DIR}/ResourceModule.cpp.in" "${module}" @ONLY)
-  set_source_files_properties("${module}" PROPERTIES OBJECT_DEPENDS "${TVX_RESOURCE_DATA}" SKIP_LINTING ON)
+  set_source_files_properties("${module}" PROPERTIES OBJECT_DEPENDS "${TVX_RESOURCE_DATA}")
   target_sources(${target} PRIVATE "${module}")
 
   if(ARG_KEEP_LINKED)

@@ -122,6 +122,17 @@ std::string oneLine(std::string message) {
     throw Fault{place, oneLine(message)};
 }
 
+// The script itself may be in UTF-16, but what it includes is read by the preprocessor, which would see garbage.
+void refuseWideIncludes(const Options& options, const Script& script) {
+    for (const fs::path& file : script.files) {
+        char mark[2] = {};
+        std::ifstream(file, std::ios::binary).read(mark, sizeof mark);
+        const std::string_view bytes(mark, sizeof mark);
+        if (file != options.script && (bytes == "\xFF\xFE" || bytes == "\xFE\xFF"))
+            throw Fault{{file.string(), 1}, "an included file in UTF-16: save it as UTF-8"};
+    }
+}
+
 std::string escapedForMake(const fs::path& path) {
     std::string text;
     for (const char c : path.string()) {
@@ -146,6 +157,7 @@ void compile(const Options& options) {
     std::vector<fs::path> folders = {fs::absolute(options.script).parent_path()};
     folders.insert(folders.end(), options.includes.begin(), options.includes.end());
     const Script script = parseScript(preprocess(options, folders));
+    refuseWideIncludes(options, script);
     Rewriter rewriter(folders);
     std::vector<std::string> texts;
     std::string all;

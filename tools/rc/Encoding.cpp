@@ -1,18 +1,13 @@
 #include "tools/rc/Encoding.h"
 
+#include "platform/base/WesternCodePage.h"
+
 #include <algorithm>
-#include <array>
 #include <cstdint>
 
 namespace rc {
 
 namespace {
-
-// Code points of the bytes 0x80 to 0x9F; the five unassigned ones keep their value.
-constexpr std::array<char16_t, 32> western80 = {0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021,
-                                                0x02C6, 0x2030, 0x0160, 0x2039, 0x0152, 0x008D, 0x017D, 0x008F,
-                                                0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022, 0x2013, 0x2014,
-                                                0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
 
 void append(std::string& text, char32_t c) {
     const auto tail = [&](int shift) { text += static_cast<char>(0x80 | (c >> shift & 0x3F)); };
@@ -107,10 +102,8 @@ std::u16string utf8ToUtf16(std::string_view text) {
 
 std::string westernToUtf8(std::string_view text) {
     std::string result;
-    for (const char c : text) {
-        const auto byte = static_cast<std::uint8_t>(c);
-        append(result, byte >= 0x80 && byte < 0xA0 ? western80[byte - 0x80] : byte);
-    }
+    for (const char c : text)
+        append(result, tvx::text::westernCodePoint(static_cast<std::uint8_t>(c)));
     return result;
 }
 

@@ -82,6 +82,12 @@ TEST_F(CompilerTest, FaultsInIncludedFilesNameThose) {
     EXPECT_NE(faultIn("\n#include \"absent.h\"\n").find("host.rc:2"), std::string::npos);
 }
 
+TEST_F(CompilerTest, IncludedFilesInUtf16AreRefused) {
+    m_faultyFile = "wide.rc2";
+    write("wide.rc2", std::string("\xFF\xFE\x35\0\n\0", 6));
+    EXPECT_EQ(faultIn("#include \"wide.rc2\"\n"), "1: an included file in UTF-16: save it as UTF-8");
+}
+
 TEST_F(CompilerTest, FailureLeavesTheLastResult) {
     compile("5 RCDATA BEGIN \"first\" END\n");
     EXPECT_NE(faultIn("5 RCDATA BEGIN ? END\n"), "");
