@@ -1,0 +1,31 @@
+// What happens when the library is loaded.
+#include "platform/win/ExtensionModule.h"
+#include "platform/win/Module.h"
+
+#include <new>
+
+namespace {
+
+AFX_EXTENSION_MODULE s_state;
+
+/// Joins the host's search for resources, before the host's own objects are made.
+class LibraryModule {
+public:
+    LibraryModule() {
+        AfxInitExtensionModule(s_state, tvx::moduleFromAddress(&s_state));
+        try {
+            new CDynLinkLibrary(s_state); // the chain owns it
+        } catch (const std::bad_alloc&) {
+            // The library works without being in the chain.
+        }
+    }
+    ~LibraryModule() {
+        AfxTermExtensionModule(s_state);
+    }
+    LibraryModule(const LibraryModule&) = delete;
+    LibraryModule& operator=(const LibraryModule&) = delete;
+};
+
+const LibraryModule s_library;
+
+} // namespace
