@@ -34,11 +34,11 @@ std::vector<const ActiveFile*>& chain() {
     return files;
 }
 
-std::string chainText(const std::string& last) {
+std::string chainText() {
     std::string text;
     for (const ActiveFile* file : chain())
-        text += file->name + " -> ";
-    return text + last;
+        text += (text.empty() ? "" : " -> ") + file->name;
+    return text;
 }
 
 class Descriptor {
@@ -113,17 +113,17 @@ struct UT_CMDFILE::Impl {
         struct stat status {};
         m_file.name = name;
         if (file.number() < 0 || ::fstat(file.number(), &status) != 0)
-            return refuse("cannot be read", systemReason());
+            return refuseUnreadable(systemReason());
         m_file.device = status.st_dev;
         m_file.inode = status.st_ino;
         if (isBeingExpanded())
-            return refuse("is being expanded already", chainText(m_file.name));
+            return refuse("is being expanded already", chainText() + " -> " + m_file.name);
         if (chain().size() >= deepestNesting)
-            return refuse("is nested too deep", chainText(m_file.name));
+            return refuse("is nested too deep", chainText() + " -> " + m_file.name);
         std::string text;
         const std::string reason = readAll(file, text);
         if (!reason.empty())
-            return refuse("cannot be read", reason);
+            return refuseUnreadable(reason);
         chain().push_back(&m_file);
         addWords(text);
     }
@@ -140,6 +140,10 @@ struct UT_CMDFILE::Impl {
                        std::make_move_iterator(read.words.end()));
         for (const std::size_t line : read.unclosedLines)
             fail(tvx::text::format("Command file \"%s\", line %zu: a quote is not closed.", m_file.name.c_str(), line));
+    }
+
+    void refuseUnreadable(const std::string& reason) {
+        refuse("cannot be read", chain().empty() ? reason : reason + " (named in " + chainText() + ")");
     }
 
     void refuse(const char* what, const std::string& reason) {

@@ -141,6 +141,11 @@ TEST_F(CmdFile, NamesWhatCannotBeRead) {
     EXPECT_EQ(onlyError(), "Command file \"" + path("missing") + "\" cannot be read: No such file or directory.");
 
     m_messages.messages.clear();
+    const std::string outer = write("outer", "-f " + path("missing") + " x");
+    EXPECT_EQ(expand(outer), Words{"x"});
+    EXPECT_NE(onlyError().find("(named in " + outer + ")"), std::string::npos);
+
+    m_messages.messages.clear();
     fs::create_directory(path("folder"));
     EXPECT_EQ(expand(path("folder")), Words{});
     EXPECT_NE(onlyError().find("Is a directory"), std::string::npos);
