@@ -8,16 +8,15 @@ using namespace tvx::afx;
 
 namespace {
 
-/// Pixels of one direction from an edge to another: `mirrored` tells that they run downwards.
+/// A stretch of logical numbers as pixels: `start` is its lowest pixel, `mirrored` tells that it ran downwards.
 struct Extent {
     int start;
     int length;
     bool mirrored;
 };
 
-/// Pixel `from` is the first one in either direction.
 Extent extentOf(int from, int to) {
-    return to < from ? Extent{to + 1, from - to, true} : Extent{from, to - from, false};
+    return {std::min(from, to), std::abs(to - from), to < from};
 }
 
 /// A rectangle of a blit, with the direction in which its pixels are to be read.
