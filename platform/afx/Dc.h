@@ -223,7 +223,8 @@ public:
     /// context's text colour (black pixels) and background colour (white ones); on a monochrome target pixels in the
     /// source's background colour become white. When the mapping modes differ the picture is stretched.
     BOOL BitBlt(int x, int y, int width, int height, CDC* source, int sourceX, int sourceY, DWORD rop);
-    /// As `BitBlt`, stretched by the stretching mode. Sizes of different signs mirror the picture.
+    /// As `BitBlt`, stretched by the stretching mode. Sizes of different signs mirror the picture; one
+    /// below 0 runs down from the pixel given, that pixel included.
     BOOL StretchBlt(int x, int y, int width, int height, CDC* source, int sourceX, int sourceY, int sourceWidth,
                     int sourceHeight, DWORD rop);
 

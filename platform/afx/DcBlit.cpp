@@ -8,15 +8,16 @@ using namespace tvx::afx;
 
 namespace {
 
-/// A stretch of logical numbers as pixels: `start` is its lowest pixel, `mirrored` tells that it ran downwards.
+/// Pixels of one direction from an edge to another: `mirrored` tells that they run downwards.
 struct Extent {
     int start;
     int length;
     bool mirrored;
 };
 
+/// Pixel `from` is the first one in either direction.
 Extent extentOf(int from, int to) {
-    return {std::min(from, to), std::abs(to - from), to < from};
+    return to < from ? Extent{to + 1, from - to, true} : Extent{from, to - from, false};
 }
 
 /// A rectangle of a blit, with the direction in which its pixels are to be read.

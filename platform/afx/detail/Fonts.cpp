@@ -119,14 +119,16 @@ void setWidth(QFont& font, int width) {
         font.setStretch(std::clamp(scaled(std::abs(width), 100, natural), 1, 4000));
 }
 
-int styleStrategy(BYTE quality) {
-    // Subpixel rendering follows the desktop's settings; pixels are to be the same on every machine.
-    return quality == NONANTIALIASED_QUALITY ? QFont::NoAntialias : QFont::NoSubpixelAntialias;
+QFont::StyleStrategy styleStrategy(BYTE quality) {
+    // Subpixel rendering follows the desktop's settings; pixels are to be the same on every machine. Scripts that can
+    // do without shaping do without: a ligature is drawn otherwise than its characters one by one.
+    const int edges = quality == NONANTIALIASED_QUALITY ? QFont::NoAntialias : QFont::NoSubpixelAntialias;
+    return static_cast<QFont::StyleStrategy>(edges | QFont::PreferNoShaping);
 }
 
 QFont makeFont(const LOGFONTA& description) {
     QFont font(familyFor(faceName(description), description.lfPitchAndFamily));
-    font.setStyleStrategy(static_cast<QFont::StyleStrategy>(styleStrategy(description.lfQuality)));
+    font.setStyleStrategy(styleStrategy(description.lfQuality));
     font.setHintingPreference(QFont::PreferFullHinting);
     font.setKerning(false);
     font.setWeight(weightOf(description.lfWeight));

@@ -51,6 +51,6 @@ private:
 };
 
 /// `value * by / per`, rounded to the nearest integer (halves up) and kept inside the range of `int`. `per` is not 0.
-[[nodiscard]] int scaled(std::int64_t value, int by, int per);
+[[nodiscard]] TVX_PLATFORM_API int scaled(std::int64_t value, int by, int per);
 
 } // namespace tvx::afx

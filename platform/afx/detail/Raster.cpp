@@ -49,6 +49,8 @@ namespace {
 
 /// How many pixels each end of row `row` of an ellipse of `size` lies inside the box.
 int ellipseInset(QSize size, int row) {
+    if (row == (size.height() - 1) / 2 || row == size.height() / 2)
+        return 0; // the middle touches the box, however flat the ellipse is
     const double width = size.width();
     const double height = size.height();
     const double y = (2.0 * row + 1.0 - height) / height;

@@ -59,7 +59,7 @@ void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
     painter.setClipRegion(canvas.clip.translated(canvas.origin));
     QFont font = font_.font;
     if (canvas.format == PixelFormat::monochrome)
-        font.setStyleStrategy(QFont::NoAntialias);
+        font.setStyleStrategy(static_cast<QFont::StyleStrategy>(QFont::NoAntialias | QFont::PreferNoShaping));
     painter.setFont(font);
     painter.setPen(QColor::fromRgb(color));
     painter.translate(left + canvas.origin);

@@ -1,0 +1,37 @@
+#include "platform/port/MsgDispatcher.h"
+
+#include <algorithm>
+#include <ranges>
+#include <vector>
+
+namespace {
+
+/// The registered managers, the first to be asked last. Never destroyed: managers with static storage outlive `main`.
+std::vector<Port_MsgMan*>& registered() {
+    static auto& managers = *new std::vector<Port_MsgMan*>;
+    return managers;
+}
+
+Port_MsgMan& builtIn() {
+    static auto& manager = *new Port_MsgManDefault;
+    return manager;
+}
+
+} // namespace
+
+void Port_MsgDispatcher::addMsgMan(Port_MsgMan* manager) {
+    removeMsgMan(manager);
+    if (manager)
+        registered().push_back(manager);
+}
+
+void Port_MsgDispatcher::removeMsgMan(Port_MsgMan* manager) {
+    std::erase(registered(), manager);
+}
+
+void Port_MsgDispatcher::dispatch(const Port_Msg& msg) {
+    const auto backwards = registered() | std::views::reverse;
+    const auto ready = std::ranges::find_if(backwards, [](const Port_MsgMan* manager) { return manager->isReady(); });
+    Port_MsgMan& manager = ready != backwards.end() ? **ready : builtIn();
+    manager.take(msg);
+}
