@@ -56,7 +56,8 @@ std::string headerFault(const Header& header) {
     if (bits != 1 && bits != 4 && bits != 8 && bits != 16 && bits != 24 && bits != 32)
         return "bitmap with " + std::to_string(bits) + " bits a pixel";
     const bool mayHaveMasks = bits == 16 || bits == 32;
-    if (header.compression != Uncompressed && !(header.compression == BitFields && mayHaveMasks))
+    const bool hasMasks = header.compression == BitFields && mayHaveMasks;
+    if (header.compression != Uncompressed && !hasMasks)
         return "compressed bitmap (method " + std::to_string(header.compression) + ")";
     if (header.colorsUsed > 256 && bits <= 8)
         return "bitmap with a palette of " + std::to_string(header.colorsUsed) + " colours";

@@ -57,9 +57,9 @@ ResourceResult<std::vector<GroupEntry>> parseGroup(ResourceBytes data, GroupKind
 
 // Best first: the wanted size, larger ones from the smallest up, smaller ones from the largest down.
 void sortByFitness(std::vector<GroupEntry>& entries, int size) {
-    std::ranges::stable_sort(entries, {}, [size](const GroupEntry& entry) {
+    std::ranges::sort(entries, {}, [size](const GroupEntry& entry) {
         const bool isSmaller = entry.size < size;
-        return std::tuple(isSmaller, isSmaller ? size - entry.size : entry.size - size, -entry.bitsPerPixel);
+        return std::tuple(isSmaller, isSmaller ? size - entry.size : entry.size - size, -entry.bitsPerPixel, entry.id);
     });
 }
 

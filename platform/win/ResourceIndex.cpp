@@ -99,8 +99,11 @@ ResourceIndex::ResourceIndex(ResourceBytes data) {
         m_entries.clear();
         return;
     }
-    std::ranges::stable_sort(m_entries, {},
-                             [](const ResourceEntry& entry) { return std::tie(entry.type, entry.name); });
+    // Equal names, which differ in language, stay in the order of the file.
+    std::ranges::sort(m_entries, {}, [](const ResourceEntry& entry) {
+        return std::tuple<const std::string&, const std::string&, const void*>(entry.type, entry.name,
+                                                                               entry.data.data());
+    });
 }
 
 const ResourceEntry* ResourceIndex::find(const std::string& type, const std::string& name,
