@@ -155,6 +155,16 @@ Unsigned CArchive::get() {
     return value;
 }
 
+// Used by ArchiveObjects.cpp too, where only their declarations are seen.
+template CArchive& CArchive::put(BYTE);
+template CArchive& CArchive::put(WORD);
+template CArchive& CArchive::put(DWORD);
+template CArchive& CArchive::put(ULONGLONG);
+template BYTE CArchive::get();
+template WORD CArchive::get();
+template DWORD CArchive::get();
+template ULONGLONG CArchive::get();
+
 CArchive& CArchive::operator<<(char value) {
     return put(static_cast<BYTE>(value));
 }
