@@ -151,7 +151,7 @@ struct UT_CMDFILE::Impl {
     }
 
     void fail(const std::string& message) {
-        m_isError = true;
+        m_errors.push_back(message);
         if (m_reporting == Reporting::Issue)
             Port_MsgManData::createObject("Port", "platform/port/CmdFile", __LINE__, "")
                 .issueError("%s", message.c_str());
@@ -161,7 +161,7 @@ struct UT_CMDFILE::Impl {
     ActiveFile m_file{};
     std::vector<std::string> m_words;
     std::vector<char*> m_vector;
-    bool m_isError = false;
+    std::vector<std::string> m_errors;
 };
 
 UT_CMDFILE::UT_CMDFILE(int argc, const char* const* argv, Reporting reporting)
@@ -180,5 +180,9 @@ char** UT_CMDFILE::getargv() const {
 }
 
 bool UT_CMDFILE::iserror() const {
-    return m_impl->m_isError;
+    return !m_impl->m_errors.empty();
+}
+
+const std::vector<std::string>& UT_CMDFILE::geterrors() const {
+    return m_impl->m_errors;
 }

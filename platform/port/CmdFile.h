@@ -3,6 +3,8 @@
 #include "platform/base/Export.h"
 
 #include <memory>
+#include <string>
+#include <vector>
 
 /// An argument vector in which a command file has been replaced by the arguments it holds.
 ///
@@ -22,7 +24,7 @@
 class TVX_PLATFORM_API UT_CMDFILE {
 public:
     /// Whether what is wrong with a file is issued as error messages. Code that goes through one command line several
-    /// times reports in one of the passes only.
+    /// times, or before anybody takes messages, keeps what `geterrors` answers and issues it when it is time.
     enum class Reporting { Silent, Issue };
 
     /// @param argc the number of arguments.
@@ -38,6 +40,8 @@ public:
     char** getargv() const;
     /// Whether the file was refused or a quote in it is not closed.
     bool iserror() const;
+    /// What is wrong, a text for each message, issued or not.
+    const std::vector<std::string>& geterrors() const;
 
 private:
     struct Impl;

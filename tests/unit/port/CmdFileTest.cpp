@@ -169,6 +169,8 @@ TEST_F(CmdFile, SilentObjectsOnlyAnswer) {
     const char* vector[] = {"exe", "-f", "/nowhere/at/all"};
     const UT_CMDFILE file(3, vector, UT_CMDFILE::Reporting::Silent);
     EXPECT_TRUE(file.iserror());
+    ASSERT_EQ(file.geterrors().size(), 1u);
+    EXPECT_NE(file.geterrors()[0].find("/nowhere/at/all"), std::string::npos);
     EXPECT_EQ(file.getargc(), 1);
     EXPECT_TRUE(m_messages.messages.empty());
 }
