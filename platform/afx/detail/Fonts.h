@@ -11,8 +11,8 @@
 #include <string_view>
 
 /// @file
-/// Font descriptions made into fonts. All of them have full hinting, no kerning and no ligatures: advances are then whole pixels,
-/// text drawn piece by piece equals text drawn as a whole, and what is measured is what is drawn.
+/// Font descriptions made into fonts. All of them have full hinting, no kerning and no ligatures: advances are then
+/// whole pixels, text drawn piece by piece equals text drawn as a whole, and what is measured is what is drawn.
 
 namespace tvx::afx {
 
