@@ -32,6 +32,7 @@ class CDocument;
 /// @endcode
 class TVX_PLATFORM_API CArchive {
 public:
+    /// The direction, and how the archive ends.
     enum Mode : UINT {
         store = 0,
         load = 1,
@@ -47,8 +48,12 @@ public:
     CArchive(const CArchive&) = delete;
     CArchive& operator=(const CArchive&) = delete;
 
+    /// The direction.
+    /// @{
     BOOL IsLoading() const noexcept;
     BOOL IsStoring() const noexcept;
+    /// @}
+    /// The file; null after Close().
     CFile* GetFile() const noexcept;
     /// Writes what is in the buffer; when loading, moves the file back to what was really read.
     void Flush();
@@ -71,8 +76,11 @@ public:
     BOOL ReadString(CString& line);
     /// Writes a number of elements: 2 bytes; from 0xFFFF on 0xFFFF and 4 bytes, or 8 behind 0xFFFFFFFF.
     void WriteCount(DWORD_PTR count);
+    /// Reads what WriteCount wrote.
     DWORD_PTR ReadCount();
 
+    /// Store a value; raise CArchiveException (`readOnly`) in an archive that loads.
+    /// @{
     CArchive& operator<<(char value);
     CArchive& operator<<(BYTE value);
     CArchive& operator<<(short value);
@@ -96,7 +104,11 @@ public:
     CArchive& operator<<(SIZE size);
     CArchive& operator<<(POINT point);
     CArchive& operator<<(const RECT& rect);
+    /// @}
 
+    /// Load a value of the size that was stored; raise CArchiveException (`endOfFile`, or `writeOnly` in an archive
+    /// that stores).
+    /// @{
     CArchive& operator>>(char& value);
     CArchive& operator>>(BYTE& value);
     CArchive& operator>>(short& value);
@@ -116,6 +128,7 @@ public:
     CArchive& operator>>(SIZE& size);
     CArchive& operator>>(POINT& point);
     CArchive& operator>>(RECT& rect);
+    /// @}
 
     /// Stores an object, or the number of one stored before; null is fine. Raises CNotSupportedException for an object
     /// whose class lacks DECLARE_SERIAL.
@@ -136,6 +149,7 @@ public:
     /// The schema of the object that is being loaded; 0xFFFFFFFF when there is none. A second call for the same object
     /// gives 0xFFFFFFFF.
     UINT GetObjectSchema() noexcept;
+    /// Gives a Serialize function that reads another class's data the schema that it asks for.
     void SetObjectSchema(UINT schema) noexcept;
 
     /// The document that is being stored or loaded, for Serialize functions that need it; null when there is none.

@@ -150,13 +150,15 @@ void CArchive::writeTag(DWORD index, WORD smallMark, DWORD bigMark) {
 
 /// Reads a tag. The number of a class is checked here; an object's class is not known yet.
 CArchive::ClassTag CArchive::readTag() {
-    const WORD small = get<WORD>();
+    WORD small = 0;
+    *this >> small;
     if (small == newClassTag)
         return {ClassTag::newClass, 0};
     DWORD index = small & ~classMark;
     bool isClass = (small & classMark) != 0;
     if (small == bigTag) {
-        const DWORD big = get<DWORD>();
+        DWORD big = 0;
+        *this >> big;
         isClass = (big & bigClassMark) != 0;
         index = big & ~bigClassMark;
     }
@@ -166,8 +168,9 @@ CArchive::ClassTag CArchive::readTag() {
 }
 
 CRuntimeClass* CArchive::readNewClass() {
-    const WORD schema = get<WORD>();
-    const WORD length = get<WORD>();
+    WORD schema = 0;
+    WORD length = 0;
+    *this >> schema >> length;
     char name[longestClassName + 1] = {};
     if (length > longestClassName)
         fail(CArchiveException::badClass);

@@ -34,12 +34,16 @@ class CArray : public CObject {
 public:
     CArray() = default;
 
+    /// Number of elements.
+    /// @{
     INT_PTR GetSize() const noexcept {
         return static_cast<INT_PTR>(m_items.size());
     }
     INT_PTR GetCount() const noexcept {
         return GetSize();
     }
+    /// @}
+    /// Whether there are no elements.
     BOOL IsEmpty() const noexcept {
         return m_items.empty();
     }
@@ -57,19 +61,26 @@ public:
     void FreeExtra() {
         tvx::allocating([&] { m_items.shrink_to_fit(); });
     }
+    /// Removes all elements and gives their memory back.
     void RemoveAll() {
         std::vector<TYPE>().swap(m_items);
     }
 
+    /// The element with an index.
+    /// @{
     const TYPE& GetAt(INT_PTR index) const {
         return m_items[checked(index)];
     }
     TYPE& GetAt(INT_PTR index) {
         return m_items[checked(index)];
     }
+    /// @}
+    /// Replaces the element with an index.
     void SetAt(INT_PTR index, ARG_TYPE element) {
         m_items[checked(index)] = element;
     }
+    /// The element with an index, to be read or changed.
+    /// @{
     TYPE& ElementAt(INT_PTR index) {
         return m_items[checked(index)];
     }
@@ -82,6 +93,7 @@ public:
     const TYPE& operator[](INT_PTR index) const {
         return m_items[checked(index)];
     }
+    /// @}
     /// The first element, with the others behind it; null for an empty array.
     TYPE* GetData() noexcept {
         return m_items.empty() ? nullptr : m_items.data();

@@ -13,6 +13,8 @@
 template <typename BASE_CLASS, typename TYPE>
 class CTypedPtrArray : public BASE_CLASS {
 public:
+    /// As in the base class, with elements of the pointer's type.
+    /// @{
     TYPE GetAt(INT_PTR index) const {
         return static_cast<TYPE>(BASE_CLASS::GetAt(index));
     }
@@ -43,6 +45,7 @@ public:
     void InsertAt(INT_PTR index, const CTypedPtrArray* other) {
         BASE_CLASS::InsertAt(index, other);
     }
+    /// @}
 };
 
 /// A list of pointers that knows what they point to.
@@ -53,6 +56,8 @@ class CTypedPtrList : public BASE_CLASS {
 public:
     using BASE_CLASS::BASE_CLASS;
 
+    /// As in the base class, with elements of the pointer's type.
+    /// @{
     TYPE GetHead() const {
         return static_cast<TYPE>(BASE_CLASS::GetHead());
     }
@@ -98,4 +103,5 @@ public:
     POSITION Find(TYPE value, POSITION startAfter = nullptr) const {
         return BASE_CLASS::Find(value, startAfter);
     }
+    /// @}
 };

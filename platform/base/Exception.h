@@ -42,6 +42,7 @@ public:
     /// @return the button that was pressed
     virtual int ReportError(UINT type = 0, UINT fallback = 0);
 
+    /// Whether Delete() deletes the object.
     BOOL m_bAutoDelete = TRUE;
 
 protected:
@@ -55,6 +56,7 @@ class TVX_PLATFORM_API CSimpleException : public CException {
 
 public:
     CSimpleException() = default;
+    /// As CException's.
     explicit CSimpleException(BOOL autoDelete);
 };
 
@@ -144,6 +146,7 @@ public:
     /// Throws the exception that a system error number means.
     [[noreturn]] static void ThrowErrno(int error, LPCSTR fileName = nullptr);
 
+    /// One of Cause; the system's error number, -1 when there is none; the file, empty when it is not known.
     int m_cause;
     LONG m_lOsError;
     CString m_strFileName;
@@ -173,6 +176,7 @@ public:
     /// @param fileName  the archive's file, null when it is not known
     explicit CArchiveException(int cause = none, LPCSTR fileName = nullptr);
 
+    /// One of Cause; the archive's file, empty when it is not known.
     int m_cause;
     CString m_strFileName;
 
@@ -181,6 +185,7 @@ protected:
 };
 
 /// Throw the exception named. The memory, not-supported, resource, user and argument exceptions are static objects.
+/// @{
 [[noreturn]] TVX_PLATFORM_API void AfxThrowMemoryException();
 [[noreturn]] TVX_PLATFORM_API void AfxThrowNotSupportedException();
 [[noreturn]] TVX_PLATFORM_API void AfxThrowResourceException();
@@ -188,6 +193,7 @@ protected:
 [[noreturn]] TVX_PLATFORM_API void AfxThrowInvalidArgException();
 [[noreturn]] TVX_PLATFORM_API void AfxThrowFileException(int cause, LONG osError = -1, LPCSTR fileName = nullptr);
 [[noreturn]] TVX_PLATFORM_API void AfxThrowArchiveException(int cause, LPCSTR fileName = nullptr);
+/// @}
 
 namespace tvx {
 

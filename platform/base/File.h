@@ -97,9 +97,13 @@ public:
     /// @param from    one of SeekPosition
     /// @return the new position from the beginning
     virtual ULONGLONG Seek(LONGLONG offset, UINT from);
+    /// Moves to the end and returns the length.
     ULONGLONG SeekToEnd();
+    /// Moves to the beginning.
     void SeekToBegin();
+    /// Bytes from the beginning to where the next Read or Write takes place.
     virtual ULONGLONG GetPosition() const;
+    /// Size in bytes.
     virtual ULONGLONG GetLength() const;
     /// Cuts the file, or fills it up with zeros.
     virtual void SetLength(ULONGLONG length);

@@ -9,18 +9,21 @@
 
 /// A position.
 struct POINT {
+    /// Pixels or logical units to the right and downwards (upwards where the mapping mode says so).
     LONG x;
     LONG y;
 };
 
 /// Width and height.
 struct SIZE {
+    /// Width and height; both may be negative.
     LONG cx;
     LONG cy;
 };
 
 /// A rectangle; `right` and `bottom` are the first coordinates outside.
 struct RECT {
+    /// The edges.
     LONG left;
     LONG top;
     LONG right;
@@ -36,18 +39,22 @@ class CPoint;
 
 namespace tvx {
 
+/// Sum and difference modulo 2^32.
+/// @{
 constexpr LONG wrappingAdd(LONG left, LONG right) noexcept {
     return static_cast<LONG>(static_cast<ULONG>(left) + static_cast<ULONG>(right));
 }
 constexpr LONG wrappingSubtract(LONG left, LONG right) noexcept {
     return static_cast<LONG>(static_cast<ULONG>(left) - static_cast<ULONG>(right));
 }
+/// @}
 
 } // namespace tvx
 
 /// A size with operators.
 class CSize : public SIZE {
 public:
+    /// From nothing (0, 0), width and height, or another structure.
     constexpr CSize() noexcept : SIZE{0, 0} {}
     constexpr CSize(int width, int height) noexcept : SIZE{width, height} {}
     constexpr CSize(SIZE size) noexcept : SIZE(size) {}
@@ -55,11 +62,14 @@ public:
     /// Width in the low half of a packed number, height in the high half, both signed.
     constexpr explicit CSize(DWORD packed) noexcept
         : SIZE{static_cast<SHORT>(LOWORD(packed)), static_cast<SHORT>(HIWORD(packed))} {}
+    /// Sets both members.
     constexpr void SetSize(int width, int height) noexcept {
         cx = width;
         cy = height;
     }
 
+    /// Arithmetic member by member.
+    /// @{
     constexpr CSize& operator+=(SIZE size) noexcept {
         return *this = *this + size;
     }
@@ -75,6 +85,7 @@ public:
     friend constexpr CSize operator-(const CSize& left, SIZE right) noexcept {
         return {tvx::wrappingSubtract(left.cx, right.cx), tvx::wrappingSubtract(left.cy, right.cy)};
     }
+    /// @}
     friend constexpr bool operator==(const SIZE& left, const SIZE& right) noexcept {
         return left.cx == right.cx && left.cy == right.cy;
     }
@@ -86,6 +97,7 @@ public:
 /// A position with operators.
 class CPoint : public POINT {
 public:
+    /// From nothing (0, 0), coordinates, or another structure.
     constexpr CPoint() noexcept : POINT{0, 0} {}
     constexpr CPoint(int x, int y) noexcept : POINT{x, y} {}
     constexpr CPoint(POINT point) noexcept : POINT(point) {}
@@ -94,6 +106,7 @@ public:
     constexpr explicit CPoint(LPARAM packed) noexcept
         : POINT{static_cast<SHORT>(LOWORD(static_cast<DWORD>(packed))),
                 static_cast<SHORT>(HIWORD(static_cast<DWORD>(packed)))} {}
+    /// Sets both members.
     constexpr void SetPoint(int newX, int newY) noexcept {
         x = newX;
         y = newY;
@@ -110,6 +123,8 @@ public:
         Offset(size.cx, size.cy);
     }
 
+    /// Moving by a size or by the coordinates of a point.
+    /// @{
     constexpr CPoint& operator+=(SIZE size) noexcept {
         return *this = *this + size;
     }
@@ -139,6 +154,7 @@ public:
     friend constexpr CSize operator-(const CPoint& left, POINT right) noexcept {
         return {tvx::wrappingSubtract(left.x, right.x), tvx::wrappingSubtract(left.y, right.y)};
     }
+    /// @}
     friend constexpr bool operator==(const POINT& left, const POINT& right) noexcept {
         return left.x == right.x && left.y == right.y;
     }
@@ -147,6 +163,7 @@ public:
 /// A rectangle with operators. Most members count on a normalised one: left <= right and top <= bottom.
 class CRect : public RECT {
 public:
+    /// From nothing (all 0), the four edges, another rectangle, a corner and a size, or two corners.
     constexpr CRect() noexcept : RECT{0, 0, 0, 0} {}
     constexpr CRect(int left, int top, int right, int bottom) noexcept : RECT{left, top, right, bottom} {}
     constexpr CRect(const RECT& rect) noexcept : RECT(rect) {}
@@ -156,25 +173,33 @@ public:
     constexpr CRect(POINT topLeft, POINT bottomRight) noexcept
         : RECT{topLeft.x, topLeft.y, bottomRight.x, bottomRight.y} {}
 
+    /// right - left, and bottom - top: negative for a rectangle that is not normalised.
+    /// @{
     constexpr int Width() const noexcept {
         return tvx::wrappingSubtract(right, left);
     }
     constexpr int Height() const noexcept {
         return tvx::wrappingSubtract(bottom, top);
     }
+    /// @}
+    /// Width and height together.
     constexpr CSize Size() const noexcept {
         return {Width(), Height()};
     }
+    /// Copies of the corners.
+    /// @{
     constexpr CPoint TopLeft() const noexcept {
         return {left, top};
     }
     constexpr CPoint BottomRight() const noexcept {
         return {right, bottom};
     }
-    /// The corners themselves, to be changed.
+    /// @}
+    /// The upper left corner itself, to be changed.
     CPoint& TopLeft() noexcept {
         return *reinterpret_cast<CPoint*>(&left);
     }
+    /// The lower right corner itself, to be changed.
     CPoint& BottomRight() noexcept {
         return *reinterpret_cast<CPoint*>(&right);
     }
@@ -182,6 +207,7 @@ public:
     constexpr CPoint CenterPoint() const noexcept {
         return {static_cast<LONG>((LONGLONG{left} + right) / 2), static_cast<LONG>((LONGLONG{top} + bottom) / 2)};
     }
+    /// For calls that take a pointer.
     constexpr operator LPRECT() noexcept {
         return this;
     }
@@ -201,10 +227,13 @@ public:
     constexpr BOOL PtInRect(POINT point) const noexcept {
         return point.x >= left && point.x < right && point.y >= top && point.y < bottom;
     }
+    /// Whether all four edges are the same.
     constexpr BOOL EqualRect(LPCRECT rect) const noexcept {
         return left == rect->left && top == rect->top && right == rect->right && bottom == rect->bottom;
     }
 
+    /// Sets the edges, or all of them to 0.
+    /// @{
     constexpr void SetRect(int newLeft, int newTop, int newRight, int newBottom) noexcept {
         *this = CRect(newLeft, newTop, newRight, newBottom);
     }
@@ -214,6 +243,8 @@ public:
     constexpr void SetRectEmpty() noexcept {
         *this = CRect();
     }
+    /// @}
+    /// Becomes a copy.
     constexpr void CopyRect(LPCRECT rect) noexcept {
         *this = CRect(rect);
     }
@@ -251,6 +282,7 @@ public:
         *this = CRect(tvx::wrappingAdd(left, leftBy), tvx::wrappingAdd(top, topBy),
                       tvx::wrappingSubtract(right, rightBy), tvx::wrappingSubtract(bottom, bottomBy));
     }
+    /// Moves the rectangle; its size stays.
     constexpr void OffsetRect(int dx, int dy) noexcept {
         *this = CRect(tvx::wrappingAdd(left, dx), tvx::wrappingAdd(top, dy), tvx::wrappingAdd(right, dx),
                       tvx::wrappingAdd(bottom, dy));
@@ -265,9 +297,11 @@ public:
     constexpr void MoveToX(int x) noexcept {
         OffsetRect(tvx::wrappingSubtract(x, left), 0);
     }
+    /// Moves the rectangle so that its top edge lies at `y`.
     constexpr void MoveToY(int y) noexcept {
         OffsetRect(0, tvx::wrappingSubtract(y, top));
     }
+    /// Moves the rectangle so that its upper left corner lies there.
     constexpr void MoveToXY(int x, int y) noexcept {
         MoveToX(x);
         MoveToY(y);
@@ -319,6 +353,9 @@ public:
         return !IsRectEmpty();
     }
 
+    /// Moving by a point or size; moving the edges by those of a rectangle (+ outwards, - inwards); & is
+    /// IntersectRect, | is UnionRect.
+    /// @{
     constexpr CRect& operator+=(POINT point) noexcept {
         OffsetRect(point);
         return *this;
@@ -375,6 +412,7 @@ public:
     friend constexpr CRect operator|(const CRect& left, const RECT& right) noexcept {
         return CRect(left) |= right;
     }
+    /// @}
     friend constexpr bool operator==(const RECT& left, const RECT& right) noexcept {
         return CRect(left).EqualRect(&right);
     }

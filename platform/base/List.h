@@ -36,16 +36,22 @@ public:
         RemoveAll();
     }
 
+    /// Number of elements.
+    /// @{
     INT_PTR GetCount() const noexcept {
         return m_count;
     }
     INT_PTR GetSize() const noexcept {
         return m_count;
     }
+    /// @}
+    /// Whether there are no elements.
     BOOL IsEmpty() const noexcept {
         return m_count == 0;
     }
 
+    /// The first and the last element; the list must not be empty.
+    /// @{
     TYPE& GetHead() {
         return node(GetHeadPosition()).value;
     }
@@ -58,6 +64,7 @@ public:
     const TYPE& GetTail() const {
         return node(GetTailPosition()).value;
     }
+    /// @}
     /// Removes the first element and returns it.
     TYPE RemoveHead() {
         return take(GetHeadPosition());
@@ -66,9 +73,11 @@ public:
     TYPE RemoveTail() {
         return take(GetTailPosition());
     }
+    /// Adds an element before the first one, and returns its position.
     POSITION AddHead(ARG_TYPE element) {
         return link(element, nullptr, m_head);
     }
+    /// Adds an element behind the last one, and returns its position.
     POSITION AddTail(ARG_TYPE element) {
         return link(element, m_tail, nullptr);
     }
@@ -84,6 +93,7 @@ public:
         for (INT_PTR left = other->GetCount(); left > 0; --left)
             AddTail(other->GetNext(at));
     }
+    /// Removes all elements; all positions end.
     void RemoveAll() noexcept {
         while (m_head)
             delete std::exchange(m_head, m_head->next);
@@ -91,12 +101,15 @@ public:
         m_count = 0;
     }
 
+    /// The places of the first and last element; null for an empty list.
+    /// @{
     POSITION GetHeadPosition() const noexcept {
         return positionOf(m_head);
     }
     POSITION GetTailPosition() const noexcept {
         return positionOf(m_tail);
     }
+    /// @}
     /// The element at a position, which moves to the next one, null behind the last.
     TYPE& GetNext(POSITION& position) {
         Node& current = node(position);
@@ -115,15 +128,20 @@ public:
     const TYPE& GetPrev(POSITION& position) const {
         return const_cast<CList*>(this)->GetPrev(position);
     }
+    /// The element at a position.
+    /// @{
     TYPE& GetAt(POSITION position) {
         return node(position).value;
     }
     const TYPE& GetAt(POSITION position) const {
         return node(position).value;
     }
+    /// @}
+    /// Replaces the element at a position.
     void SetAt(POSITION position, ARG_TYPE element) {
         node(position).value = element;
     }
+    /// Removes the element at a position, which ends; others stay.
     void RemoveAt(POSITION position) {
         unlink(node(position));
     }

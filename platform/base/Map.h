@@ -44,12 +44,16 @@ public:
         UNREFERENCED_PARAMETER(blockSize);
     }
 
+    /// Number of elements.
+    /// @{
     INT_PTR GetCount() const noexcept {
         return static_cast<INT_PTR>(m_items.size());
     }
     INT_PTR GetSize() const noexcept {
         return GetCount();
     }
+    /// @}
+    /// Whether there are no elements.
     BOOL IsEmpty() const noexcept {
         return m_items.empty();
     }
@@ -84,6 +88,7 @@ public:
         m_items.erase(found);
         return TRUE;
     }
+    /// Removes all elements.
     void RemoveAll() noexcept {
         m_items.clear();
     }

@@ -54,6 +54,7 @@ struct TVX_PLATFORM_API CRuntimeClass {
 /// Keeps a class in the list of all classes. Made by the IMPLEMENT_ macros, one beside each class.
 class TVX_PLATFORM_API AFX_CLASSINIT {
 public:
+    /// Puts the class into the list; the destructor takes it out.
     explicit AFX_CLASSINIT(CRuntimeClass* newClass);
     ~AFX_CLASSINIT();
     AFX_CLASSINIT(const AFX_CLASSINIT&) = delete;
@@ -67,6 +68,7 @@ private:
 /// copied.
 class TVX_PLATFORM_API CObject {
 public:
+    /// The object's class.
     virtual CRuntimeClass* GetRuntimeClass() const;
     virtual ~CObject();
     /// Stores the object in an archive or loads it. The base does nothing; an override calls its base first.
@@ -80,6 +82,7 @@ public:
     BOOL IsKindOf(const CRuntimeClass* runtimeClass) const;
     /// Whether archives can hold the object.
     BOOL IsSerializable() const;
+    /// What RUNTIME_CLASS(CObject) gives.
     static CRuntimeClass* GetThisClass();
 
     CObject(const CObject&) = delete;
@@ -162,6 +165,7 @@ TVX_PLATFORM_API CObject* AfxStaticDownCast(CRuntimeClass* runtimeClass, CObject
 /// Where Dump writes: standard error, and only when the environment variable TVX_TRACE is set.
 class TVX_PLATFORM_API CDumpContext {
 public:
+    /// Writes a value as text.
     CDumpContext& operator<<(LPCSTR text);
     CDumpContext& operator<<(int number);
     CDumpContext& operator<<(unsigned int number);

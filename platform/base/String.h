@@ -37,12 +37,14 @@ class CStringT;
 template <>
 class TVX_PLATFORM_API CStringT<char> {
 public:
+    /// The character type and pointers to it, for code that is written over several string classes.
     using XCHAR = char;
     using PXSTR = char*;
     using PCXSTR = const char*;
 
     // Making and assigning
 
+    /// The empty text, or another string's text.
     CStringT() noexcept;
     CStringT(const CStringT& other);
     CStringT(CStringT&& other) noexcept;
@@ -60,6 +62,7 @@ public:
     CStringT(const wchar_t* text, int length);
     explicit CStringT(std::string_view text);
 
+    /// Becomes another text. A part of this text may be given.
     CStringT& operator=(const CStringT& other);
     CStringT& operator=(CStringT&& other) noexcept;
     CStringT& operator=(const char* text);
@@ -77,6 +80,7 @@ public:
     operator LPCSTR() const noexcept {
         return m_text;
     }
+    /// As the conversion, by name.
     LPCSTR GetString() const noexcept {
         return m_text;
     }
@@ -86,12 +90,15 @@ public:
     }
     /// Length in bytes.
     int GetLength() const noexcept;
+    /// Whether the length is 0.
     bool IsEmpty() const noexcept {
         return GetLength() == 0;
     }
     /// The byte at a position; the terminator at the length.
     char GetAt(int index) const;
+    /// As GetAt().
     char operator[](INT_PTR index) const;
+    /// Replaces a byte; the position must be inside the text.
     void SetAt(int index, char character);
     /// Becomes the empty text and gives its memory back.
     void Empty() noexcept;
@@ -117,8 +124,11 @@ public:
     CStringT Mid(int first) const;
     /// At most `count` bytes from `first`; a negative count counts as 0.
     CStringT Mid(int first, int count) const;
+    /// The first, or last, `count` bytes; the whole text when it is shorter.
+    /// @{
     CStringT Left(int count) const;
     CStringT Right(int count) const;
+    /// @}
     /// The longest beginning made only of characters of `set`.
     CStringT SpanIncluding(LPCSTR set) const;
     /// The longest beginning without any character of `set`.
@@ -129,15 +139,19 @@ public:
 
     // Finding: positions in bytes, -1 for not found
 
+    /// The first place at or behind `start`.
     int Find(char character, int start = 0) const noexcept;
     /// An empty text is found at `start`.
     int Find(LPCSTR text, int start = 0) const noexcept;
+    /// The last place.
     int ReverseFind(char character) const noexcept;
     /// The first character that belongs to `set`.
     int FindOneOf(LPCSTR set) const noexcept;
 
     // Changing
 
+    /// Appending: a text, its first `length` bytes, or one character. A part of this text may be appended.
+    /// @{
     CStringT& operator+=(const CStringT& text);
     CStringT& operator+=(LPCSTR text);
     CStringT& operator+=(char character);
@@ -145,8 +159,12 @@ public:
     void Append(LPCSTR text, int length);
     void Append(const CStringT& text);
     void AppendChar(char character);
+    /// @}
+    /// Changes letters one to one; other characters and broken bytes stay.
+    /// @{
     CStringT& MakeUpper();
     CStringT& MakeLower();
+    /// @}
     /// Reverses the characters.
     CStringT& MakeReverse();
     /// Removes white space (blank, tab, line ends) at both ends.
@@ -155,9 +173,11 @@ public:
     CStringT& Trim(char character);
     /// Removes the characters of a set at both ends.
     CStringT& Trim(LPCSTR set);
+    /// As Trim(), at the beginning only.
     CStringT& TrimLeft();
     CStringT& TrimLeft(char character);
     CStringT& TrimLeft(LPCSTR set);
+    /// As Trim(), at the end only.
     CStringT& TrimRight();
     CStringT& TrimRight(char character);
     CStringT& TrimRight(LPCSTR set);
@@ -181,12 +201,16 @@ public:
 
     // Formatting: as printf, in the C locale whatever the user's locale is. Arguments may point into this text.
 
+    /// Becomes the formatted text.
     void Format(LPCSTR format, ...) __attribute__((format(printf, 2, 3)));
     /// The format is a string of the resources; an unknown one raises CInvalidArgException.
     void Format(UINT formatId, ...);
+    /// As Format(), with the arguments in a list.
     void FormatV(LPCSTR format, std::va_list arguments) __attribute__((format(printf, 2, 0)));
+    /// Appends the formatted text.
     void AppendFormat(LPCSTR format, ...) __attribute__((format(printf, 2, 3)));
     void AppendFormat(UINT formatId, ...);
+    /// As AppendFormat(), with the arguments in a list.
     void AppendFormatV(LPCSTR format, std::va_list arguments) __attribute__((format(printf, 2, 0)));
 
     // Elsewhere
@@ -214,6 +238,7 @@ public:
     void ReleaseBufferSetLength(int length);
     /// As GetBuffer(), and copies of the string do not share this buffer until UnlockBuffer.
     char* LockBuffer();
+    /// Lets copies share the buffer again.
     void UnlockBuffer() noexcept;
     /// Gets room for `length` bytes, to append without new buffers.
     void Preallocate(int length);
@@ -270,6 +295,7 @@ using CStringA = CString;
 /// Strings as keys of the standard hash containers.
 template <>
 struct std::hash<CString> {
+    /// Of the whole text, embedded zeros included.
     std::size_t operator()(const CString& text) const noexcept {
         return std::hash<std::string_view>()(text.View());
     }

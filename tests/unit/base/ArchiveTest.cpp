@@ -2,6 +2,7 @@
 
 #include "platform/base/Collections.h"
 #include "platform/base/MemFile.h"
+#include "tests/unit/base/ExpectRaised.h"
 
 #include <gtest/gtest.h>
 
@@ -304,12 +305,12 @@ TEST(Archive, NestingWithoutEndIsRefused) {
 TEST(Archive, RefusesTheWrongDirection) {
     CMemFile file;
     CArchive loading(&file, CArchive::load);
-    EXPECT_THROW(loading << 1, CArchiveException*);
+    expectRaised<CArchiveException>([&] { loading << 1; });
     CArchive storing(&file, CArchive::store);
     int number = 0;
-    EXPECT_THROW(storing >> number, CArchiveException*);
+    expectRaised<CArchiveException>([&] { storing >> number; });
     storing.Close();
-    EXPECT_THROW(storing << 1, CArchiveException*);
+    expectRaised<CArchiveException>([&] { storing << 1; });
     EXPECT_THROW(stored([&](CArchive& archive) { archive << &file; }), CNotSupportedException*);
 }
 
@@ -338,6 +339,6 @@ TEST(Archive, ReportsAFullDiskWhenClosing) {
     CFile full("/dev/full", CFile::modeWrite);
     CArchive archive(&full, CArchive::store);
     archive << 1;
-    EXPECT_THROW(archive.Close(), CFileException*);
+    expectRaised<CFileException>([&] { archive.Close(); });
     archive.Abort();
 }

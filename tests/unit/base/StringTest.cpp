@@ -2,6 +2,7 @@
 
 #include "platform/base/Exception.h"
 #include "platform/base/StringSource.h"
+#include "tests/unit/base/ExpectRaised.h"
 
 #include <gtest/gtest.h>
 
@@ -13,17 +14,6 @@
 using namespace std::string_view_literals;
 
 namespace {
-
-/// Runs something that must raise a framework exception of a class.
-template <typename Exception, typename Function>
-void expectRaised(Function function) {
-    try {
-        function();
-        ADD_FAILURE() << "nothing was raised";
-    } catch (Exception* e) {
-        e->Delete();
-    }
-}
 
 CString withZeros() {
     return CString("a\0b\0", 4);
