@@ -4,8 +4,10 @@
 #include "platform/base/Text.h"
 
 #include <algorithm>
+#include <array>
 #include <cstring>
 #include <string>
+#include <vector>
 
 namespace {
 
@@ -15,23 +17,41 @@ std::string_view viewOrEmpty(LPCSTR text) {
     return text ? std::string_view(text) : std::string_view();
 }
 
-/// Whether the character of `text` at `at`, `length` bytes long, is one of the set's.
-bool isInSet(std::string_view set, std::string_view text, std::size_t at, std::size_t length) {
-    const std::string_view character = text.substr(at, length);
-    for (std::size_t i = 0; i < set.size(); i += tvx::text::characterLength(set, i)) {
-        if (set.substr(i, tvx::text::characterLength(set, i)) == character)
-            return true;
+/// A set of characters. Those of ASCII, which are most of them, are looked up in a table.
+class CharacterSet {
+public:
+    explicit CharacterSet(std::string_view set) {
+        for (std::size_t at = 0; at < set.size();) {
+            const std::size_t length = tvx::text::characterLength(set, at);
+            const auto byte = static_cast<unsigned char>(set[at]);
+            if (byte < m_ascii.size())
+                m_ascii[byte] = true;
+            else
+                m_others.push_back(set.substr(at, length));
+            at += length;
+        }
     }
-    return false;
-}
+    bool contains(std::string_view character) const {
+        const auto byte = static_cast<unsigned char>(character.front());
+        if (byte < m_ascii.size())
+            return m_ascii[byte];
+        return std::ranges::find(m_others, character) != m_others.end();
+    }
+
+private:
+    std::array<bool, 128> m_ascii{};
+    std::vector<std::string_view> m_others;
+};
 
 enum class Member { yes, no };
 
 /// Where the first character at or after `at` stands that is, or is not, in the set; the length when there is none.
-std::size_t findMember(std::string_view text, std::string_view set, Member wanted, std::size_t at = 0) {
+std::size_t findMember(std::string_view text, std::string_view characters, Member wanted, std::size_t at = 0) {
+    const CharacterSet set(characters);
     while (at < text.size()) {
-        const std::size_t length = tvx::text::characterLength(text, at);
-        if (isInSet(set, text, at, length) == (wanted == Member::yes))
+        const bool isAscii = static_cast<unsigned char>(text[at]) < 0x80;
+        const std::size_t length = isAscii ? 1 : tvx::text::characterLength(text, at);
+        if (set.contains(text.substr(at, length)) == (wanted == Member::yes))
             return at;
         at += length;
     }
@@ -39,11 +59,12 @@ std::size_t findMember(std::string_view text, std::string_view set, Member wante
 }
 
 /// Where the end of the text is when the set's characters are cut off behind.
-std::size_t trimmedEnd(std::string_view text, std::string_view set) {
+std::size_t trimmedEnd(std::string_view text, std::string_view characters) {
+    const CharacterSet set(characters);
     std::size_t end = text.size();
     while (end > 0) {
         const std::size_t last = tvx::text::previousCharacter(text, end);
-        if (!isInSet(set, text, last, end - last))
+        if (!set.contains(text.substr(last, end - last)))
             break;
         end = last;
     }

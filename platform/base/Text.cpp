@@ -47,6 +47,15 @@ char32_t fold(char32_t codePoint) {
     return codePoint >= 0x80 && folded < 0x80 ? codePoint : folded;
 }
 
+/// The folded character at `at`, which moves behind it.
+char32_t nextFolded(std::string_view text, std::size_t& at) {
+    const auto byte = static_cast<unsigned char>(text[at]);
+    if (!isAscii(byte))
+        return fold(decode(text, at));
+    ++at;
+    return mapLower(byte);
+}
+
 template <typename Map>
 std::string mapped(std::string_view text, Map map) {
     std::string result;
@@ -95,8 +104,8 @@ int compareNoCase(std::string_view left, std::string_view right) noexcept {
     std::size_t leftAt = 0;
     std::size_t rightAt = 0;
     while (leftAt < left.size() && rightAt < right.size()) {
-        const char32_t a = fold(decode(left, leftAt));
-        const char32_t b = fold(decode(right, rightAt));
+        const char32_t a = nextFolded(left, leftAt);
+        const char32_t b = nextFolded(right, rightAt);
         if (a != b)
             return a < b ? -1 : 1;
     }
@@ -110,7 +119,7 @@ bool equalNoCase(std::string_view left, std::string_view right) noexcept {
 bool startsWithNoCase(std::string_view text, std::string_view prefix) noexcept {
     std::size_t at = 0;
     for (std::size_t prefixAt = 0; prefixAt < prefix.size();) {
-        if (at >= text.size() || fold(decode(text, at)) != fold(decode(prefix, prefixAt)))
+        if (at >= text.size() || nextFolded(text, at) != nextFolded(prefix, prefixAt))
             return false;
     }
     return true;
