@@ -18,7 +18,7 @@ BOOL fillLogical(HDC handle, const RECT& rect, const BrushObject& brush, Rop2 ro
     QImage pattern;
     const auto ink = dc->brushInk(brush, rop, pattern);
     if (drawing && ink)
-        drawing.canvas.fill(dc->state.mapping.toDevice(rect), *ink);
+        drawing.canvas.fill(dc->state.mapping.toPixels(rect), *ink);
     return TRUE;
 }
 
@@ -55,10 +55,12 @@ void CDC::FrameRect(const RECT* rect, CBrush* brush) {
     const auto tool = brushOf(brush ? static_cast<HBRUSH>(brush->m_hObject) : nullptr);
     if (!rect || !tool)
         return;
-    const RECT sides[] = {{rect->left, rect->top, rect->right, rect->top + 1},
-                          {rect->left, rect->bottom - 1, rect->right, rect->bottom},
-                          {rect->left, rect->top + 1, rect->left + 1, rect->bottom - 1},
-                          {rect->right - 1, rect->top + 1, rect->right, rect->bottom - 1}};
+    const int inside[] = {saturated(std::int64_t{rect->left} + 1), saturated(std::int64_t{rect->top} + 1),
+                          saturated(std::int64_t{rect->right} - 1), saturated(std::int64_t{rect->bottom} - 1)};
+    const RECT sides[] = {{rect->left, rect->top, rect->right, inside[1]},
+                          {rect->left, inside[3], rect->right, rect->bottom},
+                          {rect->left, inside[1], inside[0], inside[3]},
+                          {inside[2], inside[1], rect->right, inside[3]}};
     for (const RECT& side : sides) {
         if (side.left < side.right && side.top < side.bottom)
             fillLogical(m_hDC, side, *tool, Rop2::copy);
@@ -67,7 +69,7 @@ void CDC::FrameRect(const RECT* rect, CBrush* brush) {
 
 void CDC::InvertRect(const RECT* rect) {
     if (rect)
-        PatBlt(rect->left, rect->top, rect->right - rect->left, rect->bottom - rect->top, DSTINVERT);
+        fillLogical(m_hDC, *rect, solid(0), Rop2::notDestination);
 }
 
 BOOL CDC::FillRgn(CRgn* region, CBrush* brush) {
@@ -94,20 +96,22 @@ void CDC::FillSolidRect(const RECT* rect, COLORREF color) {
 }
 
 void CDC::FillSolidRect(int x, int y, int cx, int cy, COLORREF color) {
-    const RECT rect = {x, y, x + cx, y + cy};
+    const RECT rect = rectAt(x, y, cx, cy);
     FillSolidRect(&rect, color);
 }
 
 void CDC::Draw3dRect(const RECT* rect, COLORREF topLeft, COLORREF bottomRight) {
     if (rect)
-        Draw3dRect(rect->left, rect->top, rect->right - rect->left, rect->bottom - rect->top, topLeft, bottomRight);
+        Draw3dRect(rect->left, rect->top, distance(rect->left, rect->right), distance(rect->top, rect->bottom), topLeft,
+                   bottomRight);
 }
 
 void CDC::Draw3dRect(int x, int y, int cx, int cy, COLORREF topLeft, COLORREF bottomRight) {
-    FillSolidRect(x, y, cx - 1, 1, topLeft);
-    FillSolidRect(x, y, 1, cy - 1, topLeft);
-    FillSolidRect(x + cx, y, -1, cy, bottomRight);
-    FillSolidRect(x, y + cy, cx, -1, bottomRight);
+    const RECT rect = rectAt(x, y, cx, cy);
+    FillSolidRect(x, y, distance(1, cx), 1, topLeft);
+    FillSolidRect(x, y, 1, distance(1, cy), topLeft);
+    FillSolidRect(rect.right, y, -1, cy, bottomRight);
+    FillSolidRect(x, rect.bottom, cx, -1, bottomRight);
 }
 
 BOOL CDC::PatBlt(int x, int y, int width, int height, DWORD rop) {
@@ -115,7 +119,7 @@ BOOL CDC::PatBlt(int x, int y, int width, int height, DWORD rop) {
     const Rop3 ternary = rop3FromCode(rop);
     if (!dc || usesSource(ternary))
         return FALSE;
-    const RECT rect = {x, y, x + width, y + height};
+    const RECT rect = rectAt(x, y, width, height);
     const Rop2 binary = rop2FromRop3(ternary);
     const bool usesBrush = static_cast<unsigned>(binary) >> 2 != (static_cast<unsigned>(binary) & 3U);
     return fillLogical(m_hDC, rect, usesBrush ? *dc->state.brush : solid(0), binary);
@@ -192,7 +196,7 @@ void CDC::DrawFocusRect(const RECT* rect) {
     if (!drawing)
         return;
     // Every second pixel by its place, so that the dots stay where they are when the frame grows.
-    std::vector<QPoint> dots = outlineOf(roundRectSpans(dc->state.mapping.toDevice(*rect), {}));
+    std::vector<QPoint> dots = framePixels(dc->state.mapping.toPixels(*rect), drawing.canvas.bounds());
     std::erase_if(dots, [](QPoint point) { return ((point.x() + point.y()) & 1) != 0; });
     drawing.canvas.plot(dots, {kWhitePixel, Rop2::xorPen, nullptr, {}});
 }
@@ -210,7 +214,7 @@ BOOL drawIcon(HDC handle, QPoint logical, HICON icon, QSize size) {
     if (!drawing)
         return TRUE;
     Canvas& canvas = drawing.canvas;
-    const QRect place(dc->state.mapping.toDevice(logical), size.isEmpty() ? image.size() : size);
+    const QRect place(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size);
     QPainter painter(canvas.image);
     painter.setClipRegion(canvas.clip.translated(canvas.origin));
     painter.setRenderHint(QPainter::SmoothPixmapTransform);
@@ -245,7 +249,7 @@ BOOL CDC::SetPixelV(int x, int y, COLORREF color) {
         return FALSE;
     Drawing drawing(*dc);
     if (drawing)
-        drawing.canvas.plot(dc->state.mapping.toDevice(QPoint(x, y)), dc->ink(color));
+        drawing.canvas.plot(dc->state.mapping.toPixel(QPoint(x, y)), dc->ink(color));
     return TRUE;
 }
 
@@ -264,7 +268,7 @@ COLORREF CDC::GetPixel(int x, int y) const {
     if (!dc)
         return CLR_INVALID;
     Drawing drawing(*dc);
-    const QPoint point = dc->state.mapping.toDevice(QPoint(x, y));
+    const QPoint point = dc->state.mapping.toPixel(QPoint(x, y));
     if (!drawing || !drawing.canvas.clip.contains(point))
         return CLR_INVALID;
     return colorOf(drawing.canvas.row(point.y())[point.x()]);

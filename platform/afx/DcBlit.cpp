@@ -27,9 +27,9 @@ struct BlitArea {
     bool mirroredY;
 };
 
-BlitArea blitArea(const Mapping& mapping, const QRect& logical) {
-    const QPoint first = mapping.toDevice(logical.topLeft());
-    const QPoint second = mapping.toDevice(logical.topLeft() + QPoint(logical.width(), logical.height()));
+BlitArea blitArea(const Mapping& mapping, const RECT& logical) {
+    const QPoint first = mapping.toPixel(QPoint(logical.left, logical.top));
+    const QPoint second = mapping.toPixel(QPoint(logical.right, logical.bottom));
     const Extent across = extentOf(first.x(), second.x());
     const Extent down = extentOf(first.y(), second.y());
     return {{across.start, down.start, across.length, down.length}, across.mirrored, down.mirrored};
@@ -100,8 +100,8 @@ BOOL CDC::StretchBlt(int x, int y, int width, int height, CDC* source, int sourc
     const auto from = findContext(source ? source->m_hDC : nullptr);
     if (!target || !from)
         return FALSE;
-    const BlitArea toArea = blitArea(target->state.mapping, QRect(x, y, width, height));
-    const BlitArea fromArea = blitArea(from->state.mapping, QRect(sourceX, sourceY, sourceWidth, sourceHeight));
+    const BlitArea toArea = blitArea(target->state.mapping, rectAt(x, y, width, height));
+    const BlitArea fromArea = blitArea(from->state.mapping, rectAt(sourceX, sourceY, sourceWidth, sourceHeight));
     if (!toArea.rect.isEmpty() && !fromArea.rect.isEmpty())
         drawSource(*target, toArea, *from, fromArea, ternary);
     return TRUE;

@@ -73,6 +73,13 @@ void drawLine(CDC& dc, const LayoutLine& line, const RECT& rect, UINT format, in
         drawUnderline(dc, line, x, y, style);
 }
 
+/// The rectangle without numbers so large that sums with them would not fit.
+RECT pulledIn(const RECT& rect) {
+    static constexpr int kFar = 1 << 29;
+    const auto pull = [](int value) { return std::clamp(value, -kFar, kFar); };
+    return {pull(rect.left), pull(rect.top), pull(rect.right), pull(rect.bottom)};
+}
+
 int widestLine(const TextLayout& layout) {
     int width = 0;
     for (const LayoutLine& line : layout.lines)
@@ -96,29 +103,31 @@ int CDC::DrawText(LPCSTR text, int count, RECT* rect, UINT format) {
     if (!text || !rect || !GetTextMetrics(&metrics))
         return 0;
     const TextState state(*this);
+    const RECT area = pulledIn(*rect);
     const std::string_view whole = count < 0 ? std::string_view(text) : std::string_view(text, count);
     TextLayoutStyle style;
     style.format = format;
-    style.width = rect->right - rect->left;
+    style.width = area.right - area.left;
     const int perTab = format & DT_TABSTOP ? static_cast<int>((format >> 8) & 0xFF) : 8;
     style.tabWidth = std::max(1, perTab) * metrics.tmAveCharWidth;
     style.lineHeight = metrics.tmHeight + (format & DT_EXTERNALLEADING ? metrics.tmExternalLeading : 0);
     const TextLayout layout = layOutText(*this, whole, style);
     // In the metric modes y grows upwards.
     const int downwards = GetMapMode() != MM_TEXT && GetViewportExt().cy * GetWindowExt().cy < 0 ? -1 : 1;
-    int y = firstLineTop(*rect, format, downwards * layout.height());
+    int y = firstLineTop(area, format, downwards * layout.height());
     const int top = y;
     if (format & DT_CALCRECT) {
+        *rect = area;
         fitRectangle(*rect, format, layout, top);
         if (downwards < 0)
             rect->bottom = top - layout.height();
         return layout.height();
     }
     for (const LayoutLine& line : layout.lines) {
-        drawLine(*this, line, *rect, format, y, style);
+        drawLine(*this, line, area, format, y, style);
         y += downwards * style.lineHeight;
     }
-    return layout.height() + std::abs(top - rect->top);
+    return layout.height() + std::abs(top - area.top);
 }
 
 int CDC::DrawText(const CString& text, RECT* rect, UINT format) {

@@ -3,6 +3,9 @@
 #include "platform/afx/detail/Outline.h"
 #include "platform/afx/detail/Regions.h"
 
+#include <QPainterPath>
+
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <numbers>
@@ -32,10 +35,12 @@ public:
     [[nodiscard]] const Mapping& mapping() const {
         return dc->state.mapping;
     }
-    void fill(const Spans& spans) {
+    /// Fills with the brush. @param area spans or a rectangle
+    template <class Area>
+    void fill(const Area& area) {
         QImage pattern;
         if (const auto ink = dc->brushInk(pattern))
-            canvas().fill(spans, *ink);
+            canvas().fill(area, *ink);
     }
 
     std::shared_ptr<DeviceContext> dc;
@@ -48,7 +53,7 @@ QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
     QPolygon result;
     result.reserve(count);
     for (int i = 0; i < count; ++i)
-        result << mapping.toDevice(pointOf(points[i]));
+        result << mapping.toPixel(pointOf(points[i]));
     return result;
 }
 
@@ -96,8 +101,42 @@ namespace {
 /// Pixels of a rectangular shape's box in which its outline and filling go. Without an outline the right and bottom
 /// pixels stay free, as with it they belong to the outline.
 QRect shapeBox(const Shape& shape, const RECT& rect) {
-    const QRect box = shape.mapping().toDevice(rect);
+    const QRect box = shape.mapping().toPixels(rect);
     return shape.dc->penInk() ? box : box.adjusted(0, 0, -1, -1);
+}
+
+/// Shapes larger than this are drawn as polygons: going through all of their rows and pixels, of which few can be seen,
+/// would take too long.
+constexpr int kLargestByPixels = 1 << 14;
+
+bool isLarge(const QRect& box) {
+    return std::max(box.width(), box.height()) > kLargestByPixels;
+}
+
+QPolygon roundedPolygon(const QRect& box, QSize corner) {
+    QPainterPath path;
+    path.addRoundedRect(QRectF(box.topLeft(), box.bottomRight()), corner.width() / 2.0, corner.height() / 2.0);
+    QPolygon polygon = path.toFillPolygon().toPolygon();
+    polygon.removeLast(); // the first one again
+    return polygon;
+}
+
+void drawRounded(Shape& shape, const QRect& box, QSize corner) {
+    const Spans rows = roundRectSpans(box, corner);
+    shape.fill(rows);
+    Outline(*shape.dc, shape.canvas()).rounded(box, corner, rows);
+}
+
+void drawLargeRounded(Shape& shape, const QRect& box, QSize corner) {
+    const QPolygon polygon = roundedPolygon(box, corner);
+    const std::array polygons = {QPolygonF(polygon)};
+    shape.fill(polygonSpans(polygons, FillRule::winding, shape.canvas().bounds()));
+    Outline(*shape.dc, shape.canvas()).closed(polygon);
+}
+
+void drawRectangle(Shape& shape, const QRect& box) {
+    shape.fill(box);
+    Outline(*shape.dc, shape.canvas()).rectangle(box);
 }
 
 BOOL drawRounded(HDC handle, const RECT& rect, QSize corner) {
@@ -105,9 +144,14 @@ BOOL drawRounded(HDC handle, const RECT& rect, QSize corner) {
     if (!shape.visible())
         return shape.valid();
     const QRect box = shapeBox(shape, rect);
-    const Spans rows = roundRectSpans(box, corner);
-    shape.fill(rows);
-    Outline(*shape.dc, shape.canvas()).rounded(box, corner, rows);
+    if (box.isEmpty())
+        return TRUE;
+    if (corner.isEmpty())
+        drawRectangle(shape, box);
+    else if (isLarge(box))
+        drawLargeRounded(shape, box, corner);
+    else
+        drawRounded(shape, box, corner);
     return TRUE;
 }
 
@@ -134,7 +178,7 @@ BOOL CDC::RoundRect(const RECT* rect, POINT corner) {
 BOOL CDC::Ellipse(int left, int top, int right, int bottom) {
     const auto dc = findContext(m_hDC);
     const RECT rect = {left, top, right, bottom};
-    return dc && drawRounded(m_hDC, rect, dc->state.mapping.toDevice(rect).size());
+    return dc && drawRounded(m_hDC, rect, dc->state.mapping.toPixels(rect).size());
 }
 
 BOOL CDC::Ellipse(const RECT* rect) {
@@ -161,6 +205,8 @@ public:
 
     /// The pixels in drawing order, from start to end.
     [[nodiscard]] QPolygon pixels() const {
+        if (isLarge(box_))
+            return corners();
         std::vector<QPoint> all = outlineOf(ellipseSpans(box_));
         std::erase_if(all, [&](QPoint point) { return turn(start_, angle(point)) > sweep_; });
         std::ranges::sort(all, {}, [&](QPoint point) { return turn(start_, angle(point)); });
@@ -171,16 +217,28 @@ public:
     }
 
 private:
+    /// Corners of a polygon that stands for a large ellipse's pixels.
+    [[nodiscard]] QPolygon corners() const {
+        constexpr int kCorners = 4096;
+        QPolygon result;
+        for (int i = 0; i <= kCorners; ++i) {
+            const double direction = start_ + (counterClockwise_ ? -1 : 1) * sweep_ * i / kCorners;
+            const double x = box_.left() + (box_.width() - 1) * (1 + std::cos(direction)) / 2;
+            const double y = box_.top() + (box_.height() - 1) * (1 + std::sin(direction)) / 2;
+            result << QPoint(static_cast<int>(std::lround(x)), static_cast<int>(std::lround(y)));
+        }
+        return result;
+    }
     /// Direction of a point in a picture where the ellipse is a circle: 0 right, growing clockwise.
     [[nodiscard]] double angle(QPoint point) const {
         const double x = 2.0 * (point.x() - box_.left()) + 1 - box_.width();
         const double y = 2.0 * (point.y() - box_.top()) + 1 - box_.height();
-        return std::atan2(y * box_.width(), x * box_.height());
+        return std::atan2(y / box_.height(), x / box_.width());
     }
     /// How far it is from one direction to another, in the direction of drawing: 0 .. 2 pi.
     [[nodiscard]] double turn(double from, double to) const {
-        const double distance = counterClockwise_ ? from - to : to - from;
-        return distance < 0 ? distance + 2 * std::numbers::pi : distance;
+        const double turned = counterClockwise_ ? from - to : to - from;
+        return turned < 0 ? turned + 2 * std::numbers::pi : turned;
     }
 
     QRect box_;
@@ -199,10 +257,10 @@ BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, Arc
     Shape shape(handle);
     if (!shape.visible())
         return shape.valid();
-    const QRect box = shape.mapping().toDevice(rect);
+    const QRect box = shape.mapping().toPixels(rect);
     if (box.isEmpty())
         return TRUE;
-    const ArcPixels arc(box, shape.mapping().toDevice(pointOf(rays[0])), shape.mapping().toDevice(pointOf(rays[1])),
+    const ArcPixels arc(box, shape.mapping().toPixel(pointOf(rays[0])), shape.mapping().toPixel(pointOf(rays[1])),
                         shape.dc->state.arcDirection);
     QPolygon outline = arc.pixels();
     if (kind == ArcShape::pie)

@@ -301,7 +301,7 @@ BOOL CDC::PtVisible(int x, int y) const {
     if (!dc)
         return FALSE;
     Drawing drawing(*dc);
-    return drawing && drawing.canvas.clip.contains(dc->state.mapping.toDevice(QPoint(x, y)));
+    return drawing && drawing.canvas.clip.contains(dc->state.mapping.toPixel(QPoint(x, y)));
 }
 
 BOOL CDC::PtVisible(POINT point) const {
@@ -313,7 +313,7 @@ BOOL CDC::RectVisible(const RECT* rect) const {
     if (!dc || !rect)
         return FALSE;
     Drawing drawing(*dc);
-    return drawing && drawing.canvas.clip.intersects(dc->state.mapping.toDevice(*rect));
+    return drawing && drawing.canvas.clip.intersects(dc->state.mapping.toPixels(*rect));
 }
 
 namespace {
@@ -335,7 +335,7 @@ int clipBy(HDC handle, const QRegion& region, int mode) {
 
 int clipByRect(HDC handle, const RECT& logical, int mode) {
     const auto dc = findContext(handle);
-    return dc ? clipBy(handle, dc->state.mapping.toDevice(logical), mode) : RGN_ERROR;
+    return dc ? clipBy(handle, dc->state.mapping.toPixels(logical), mode) : RGN_ERROR;
 }
 
 } // namespace
@@ -378,6 +378,6 @@ int CDC::OffsetClipRgn(int x, int y) {
     if (!dc)
         return RGN_ERROR;
     if (dc->state.clip)
-        dc->state.clip->translate(dc->state.mapping.toDevice(QPoint(x, y)) - dc->state.mapping.toDevice(QPoint(0, 0)));
+        dc->state.clip->translate(dc->state.mapping.toPixel(QPoint(x, y)) - dc->state.mapping.toPixel(QPoint(0, 0)));
     return dc->state.clip ? regionKind(*dc->state.clip) : SIMPLEREGION;
 }

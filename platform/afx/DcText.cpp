@@ -76,18 +76,18 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
     Drawing drawing(*dc);
     const Mapping& mapping = dc->state.mapping;
     if (rect && (options & ETO_OPAQUE) && drawing)
-        drawing.canvas.fill(mapping.toDevice(*rect), dc->ink(dc->state.backColor));
+        drawing.canvas.fill(mapping.toPixels(*rect), dc->ink(dc->state.backColor));
     if (!font)
         return FALSE;
     TextLine line(*font, viewOf(text, static_cast<int>(count)));
     if (advances)
         line.setAdvances(deviceAdvances(mapping, advances, line.characterCount()));
     const bool moves = (dc->state.textAlign & TA_UPDATECP) != 0;
-    const QPoint start = mapping.toDevice(moves ? dc->state.position : QPoint(x, y));
+    const QPoint start = mapping.toPixel(moves ? dc->state.position : QPoint(x, y));
     const TextPlace place = placeText(*font, dc->state.textAlign, start, line.width());
     if (drawing) {
         if (rect && (options & ETO_CLIPPED))
-            drawing.canvas.clip &= mapping.toDevice(*rect);
+            drawing.canvas.clip &= mapping.toPixels(*rect);
         if (dc->state.backMode == OPAQUE && !(options & ETO_OPAQUE))
             line.fillBackground(drawing.canvas, place.left, dc->ink(dc->state.backColor));
         line.draw(drawing.canvas, place.left, dc->ink(dc->state.textColor).color);
@@ -236,13 +236,13 @@ CSize layOutTabs(CDC& dc, std::string_view text, int tabCount, const int* tabs, 
     if (!dc.GetTextMetrics(&metrics))
         return {};
     const TabStops stops(tabCount, tabs, metrics.tmAveCharWidth);
-    const int start = output ? output->x - origin : 0;
+    const int start = output ? std::clamp(distance(origin, output->x), -kFarthestPixel, kFarthestPixel) : 0;
     int x = 0;
     for (std::size_t at = 0; at <= text.size();) {
         const std::size_t end = std::min(text.find('\t', at), text.size());
         const auto length = static_cast<int>(end - at);
         if (output)
-            dc.TextOut(output->x + x, output->y, text.data() + at, length);
+            dc.TextOut(saturated(std::int64_t{output->x} + x), output->y, text.data() + at, length);
         x += dc.GetTextExtent(text.data() + at, length).cx;
         if (end < text.size())
             x = stops.after(start + x) - start;

@@ -44,7 +44,18 @@ HRGN addRegion(QRegion region) {
 }
 
 QRect ordered(int left, int top, int right, int bottom) {
-    return {std::min(left, right), std::min(top, bottom), std::abs(right - left), std::abs(bottom - top)};
+    return Mapping().toPixels({left, top, right, bottom});
+}
+
+/// Regions of other shapes than rectangles are kept row by row, and so only within reach of a screen.
+QRect screenReach() {
+    constexpr int kFar = 1 << 15;
+    return {QPoint(-kFar, -kFar), QPoint(kFar, kFar)};
+}
+
+QRegion ellipseRegion(const QRect& box) {
+    const QRect reach = screenReach();
+    return reach.contains(box) ? regionOf(ellipseSpans(box)) : QRegion(box & reach, QRegion::Ellipse);
 }
 
 } // namespace
@@ -58,7 +69,7 @@ BOOL CRgn::CreateRectRgnIndirect(const RECT* rect) {
 }
 
 BOOL CRgn::CreateEllipticRgn(int left, int top, int right, int bottom) {
-    return Attach(addRegion(regionOf(ellipseSpans(ordered(left, top, right, bottom)))));
+    return Attach(addRegion(ellipseRegion(ordered(left, top, right, bottom))));
 }
 
 BOOL CRgn::CreatePolygonRgn(const POINT* points, int count, int mode) {
@@ -69,7 +80,8 @@ BOOL CRgn::CreatePolygonRgn(const POINT* points, int count, int mode) {
         polygon << QPointF(points[i].x, points[i].y);
     const std::array polygons = {polygon};
     const FillRule rule = mode == WINDING ? FillRule::winding : FillRule::alternate;
-    return Attach(addRegion(regionOf(polygonSpans(polygons, rule, polygon.boundingRect().toAlignedRect()))));
+    return Attach(
+        addRegion(regionOf(polygonSpans(polygons, rule, polygon.boundingRect().toAlignedRect() & screenReach()))));
 }
 
 int CRgn::CombineRgn(const CRgn* first, const CRgn* second, int mode) {

@@ -9,8 +9,8 @@
 int main(int argc, char** argv) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     testing::InitGoogleTest(&argc, argv);
-    QApplication::setStyle(QStringLiteral("Fusion"));
     const QApplication application(argc, argv);
+    QApplication::setStyle(QStringLiteral("Fusion"));
     QFont font(QStringLiteral("DejaVu Sans Condensed"));
     font.setPixelSize(11);
     font.setHintingPreference(QFont::PreferFullHinting);

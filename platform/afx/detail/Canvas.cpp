@@ -6,8 +6,8 @@ namespace tvx::afx {
 
 namespace {
 
-int wrapped(int value, int by) {
-    const int rest = value % by;
+int wrapped(std::int64_t value, int by) {
+    const auto rest = static_cast<int>(value % by);
     return rest < 0 ? rest + by : rest;
 }
 
@@ -37,8 +37,8 @@ bool Ink::at(int x, int y, Pixel& pixel) const {
     pixel = color;
     if (!pattern)
         return true;
-    const int column = wrapped(x - patternOrigin.x(), pattern->width());
-    const int line = wrapped(y - patternOrigin.y(), pattern->height());
+    const int column = wrapped(std::int64_t{x} - patternOrigin.x(), pattern->width());
+    const int line = wrapped(std::int64_t{y} - patternOrigin.y(), pattern->height());
     pixel = reinterpret_cast<const Pixel*>(pattern->constScanLine(line))[column];
     return (pixel & kOpaque) != 0;
 }

@@ -130,7 +130,7 @@ inline RECT rectOf(const QRect& rect) {
     return {rect.left(), rect.top(), rect.left() + rect.width(), rect.top() + rect.height()};
 }
 inline QRect rectOf(const RECT& rect) {
-    return {rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top};
+    return {QPoint(rect.left, rect.top), QSize(distance(rect.left, rect.right), distance(rect.top, rect.bottom))};
 }
 inline QPoint pointOf(POINT point) {
     return {point.x, point.y};

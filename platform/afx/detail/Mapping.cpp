@@ -3,14 +3,13 @@
 #include "platform/afx/GdiTypes.h"
 
 #include <algorithm>
-#include <climits>
 #include <cstdlib>
 
 namespace tvx::afx {
 
 int scaled(std::int64_t value, int by, int per) {
     if (by == per)
-        return static_cast<int>(std::clamp<std::int64_t>(value, INT_MIN, INT_MAX));
+        return saturated(value);
     __extension__ using Wide = __int128;
     const Wide sign = per < 0 ? -1 : 1;
     const Wide numerator = sign * (Wide{2} * value * by + per);
@@ -98,7 +97,7 @@ namespace {
 
 int converted(int value, int fromOrigin, int by, int per, int toOrigin) {
     const std::int64_t distance = std::int64_t{value} - fromOrigin;
-    return scaled(std::int64_t{scaled(distance, by, per)} + toOrigin, 1, 1);
+    return saturated(std::int64_t{scaled(distance, by, per)} + toOrigin);
 }
 
 } // namespace
@@ -115,13 +114,17 @@ QPoint Mapping::toLogical(QPoint device) const {
         converted(device.y(), viewportOrigin.y(), windowExtent_.height(), viewportExtent_.height(), windowOrigin.y())};
 }
 
-QRect Mapping::toDevice(const RECT& logical) const {
-    const QPoint first = toDevice(QPoint(logical.left, logical.top));
-    const QPoint second = toDevice(QPoint(logical.right, logical.bottom));
-    const int left = std::min(first.x(), second.x());
-    const int top = std::min(first.y(), second.y());
-    return {left, top, scaled(std::int64_t{std::max(first.x(), second.x())} - left, 1, 1),
-            scaled(std::int64_t{std::max(first.y(), second.y())} - top, 1, 1)};
+QPoint Mapping::toPixel(QPoint logical) const {
+    const QPoint device = toDevice(logical);
+    return {std::clamp(device.x(), -kFarthestPixel, kFarthestPixel),
+            std::clamp(device.y(), -kFarthestPixel, kFarthestPixel)};
+}
+
+QRect Mapping::toPixels(const RECT& logical) const {
+    const QPoint first = toPixel(QPoint(logical.left, logical.top));
+    const QPoint second = toPixel(QPoint(logical.right, logical.bottom));
+    const QPoint corner(std::min(first.x(), second.x()), std::min(first.y(), second.y()));
+    return {corner, QSize(std::abs(second.x() - first.x()), std::abs(second.y() - first.y()))};
 }
 
 QSize Mapping::sizeToDevice(QSize logical) const {

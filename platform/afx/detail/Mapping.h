@@ -7,10 +7,17 @@
 #include <QRect>
 #include <QSize>
 
+#include <algorithm>
+#include <climits>
+#include <cstdint>
+
 namespace tvx::afx {
 
 /// Pixels to an inch, both ways.
 constexpr int kPixelsPerInch = 96;
+
+/// Nothing is drawn beyond this distance from the origin.
+constexpr int kFarthestPixel = 1 << 27;
 
 /// Conversion between logical and device units, in integers: halves are rounded up.
 class TVX_PLATFORM_API Mapping {
@@ -35,8 +42,10 @@ public:
 
     [[nodiscard]] QPoint toDevice(QPoint logical) const;
     [[nodiscard]] QPoint toLogical(QPoint device) const;
+    /// As `toDevice`, for drawing: never farther out than `kFarthestPixel`, so that sizes and sums fit an `int`.
+    [[nodiscard]] QPoint toPixel(QPoint logical) const;
     /// Both corners converted; of corners in the wrong order those of the result are put right.
-    [[nodiscard]] QRect toDevice(const RECT& logical) const;
+    [[nodiscard]] QRect toPixels(const RECT& logical) const;
     /// Widths and heights alone, never negative.
     [[nodiscard]] QSize sizeToDevice(QSize logical) const;
     [[nodiscard]] QSize sizeToLogical(QSize device) const;
@@ -49,6 +58,19 @@ private:
     QSize windowExtent_{1, 1};
     QSize viewportExtent_{1, 1};
 };
+
+/// The number kept inside the range of `int`.
+constexpr int saturated(std::int64_t value) {
+    return static_cast<int>(std::clamp<std::int64_t>(value, INT_MIN, INT_MAX));
+}
+/// A rectangle from its corner and size, which may be negative.
+constexpr RECT rectAt(int x, int y, int width, int height) {
+    return {x, y, saturated(std::int64_t{x} + width), saturated(std::int64_t{y} + height)};
+}
+/// Width or height of a rectangle.
+constexpr int distance(int from, int to) {
+    return saturated(std::int64_t{to} - from);
+}
 
 /// `value * by / per`, rounded to the nearest integer (halves up) and kept inside the range of `int`. `per` is not 0.
 [[nodiscard]] TVX_PLATFORM_API int scaled(std::int64_t value, int by, int per);

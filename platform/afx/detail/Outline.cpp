@@ -123,6 +123,15 @@ void Outline::closed(const QPolygon& points) {
     plotPixels();
 }
 
+void Outline::rectangle(const QRect& box) {
+    if (isWide())
+        rounded(box, {}, {});
+    else if (box.width() == 1 || box.height() == 1)
+        line(QPolygon({box.topLeft(), box.bottomRight()}), LastPoint::drawn);
+    else
+        closed(QPolygon({box.topLeft(), box.topRight(), box.bottomRight(), box.bottomLeft()}));
+}
+
 void Outline::rounded(const QRect& box, QSize corner, const Spans& rows) {
     if (!ink_ || box.isEmpty())
         return;

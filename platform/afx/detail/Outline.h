@@ -17,7 +17,9 @@ public:
     void line(const QPolygon& points, LastPoint last = LastPoint::left);
     /// A closed line through points.
     void closed(const QPolygon& points);
-    /// Around a rectangle, a round rectangle or an ellipse whose rows are `rows`.
+    /// Along the inside of a rectangle.
+    void rectangle(const QRect& box);
+    /// Around a round rectangle or an ellipse whose rows are `rows`.
     void rounded(const QRect& box, QSize corner, const Spans& rows);
 
 private:

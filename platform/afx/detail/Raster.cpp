@@ -1,5 +1,7 @@
 #include "platform/afx/detail/Raster.h"
 
+#include "platform/afx/detail/Mapping.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -7,11 +9,10 @@ namespace tvx::afx {
 
 namespace {
 
-/// Points farther out than this are pulled in, so that products of two coordinates fit 64 bits.
-constexpr int kFarthest = 1 << 27;
-
+/// Points farther out are pulled in, so that products of two coordinates fit 64 bits.
 QPoint pulledIn(QPoint point) {
-    return {std::clamp(point.x(), -kFarthest, kFarthest), std::clamp(point.y(), -kFarthest, kFarthest)};
+    return {std::clamp(point.x(), -kFarthestPixel, kFarthestPixel),
+            std::clamp(point.y(), -kFarthestPixel, kFarthestPixel)};
 }
 
 std::int64_t floorDiv(std::int64_t value, std::int64_t by) {
@@ -81,6 +82,28 @@ Spans roundRectSpans(const QRect& box, QSize corner) {
         rows.push_back({box.top() + row, box.left() + inset, box.right() + 1 - inset});
     }
     return rows;
+}
+
+std::vector<QPoint> framePixels(const QRect& box, const QRect& bounds) {
+    std::vector<QPoint> pixels;
+    if (box.isEmpty())
+        return pixels;
+    const QRect inside = box & bounds;
+    const auto add = [&](QPoint point) {
+        if (bounds.contains(point))
+            pixels.push_back(point);
+    };
+    for (int x = inside.left(); x <= inside.right(); ++x) {
+        add({x, box.top()});
+        if (box.height() > 1)
+            add({x, box.bottom()});
+    }
+    for (int y = std::max(inside.top(), box.top() + 1); y <= std::min(inside.bottom(), box.bottom() - 1); ++y) {
+        add({box.left(), y});
+        if (box.width() > 1)
+            add({box.right(), y});
+    }
+    return pixels;
 }
 
 namespace {

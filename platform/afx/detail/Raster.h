@@ -87,6 +87,9 @@ void LinePixels::forEach(Range range, Plot plot) const {
 /// The rows of a rectangle whose corners are quarters of an ellipse of size `corner`.
 [[nodiscard]] TVX_PLATFORM_API Spans roundRectSpans(const QRect& box, QSize corner);
 
+/// The pixels of a rectangle's border that lie in `bounds`, each once.
+[[nodiscard]] std::vector<QPoint> framePixels(const QRect& box, const QRect& bounds);
+
 /// The outline, one pixel thin, of a shape with one span a row and no dents (as the two above make): clockwise from
 /// the left end of the top row, each pixel once.
 [[nodiscard]] TVX_PLATFORM_API std::vector<QPoint> outlineOf(const Spans& rows);

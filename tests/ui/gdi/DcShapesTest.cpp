@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <climits>
+
 namespace {
 
 TEST(Lines, LeaveTheEndPointOut) {
@@ -293,16 +295,53 @@ TEST(Clipping, ByARegionUsesDeviceUnits) {
 
 TEST(Shapes, WithHugeCoordinatesEndSoonAndStayInside) {
     MemoryDc dc(10, 10);
-    constexpr int far = 2'000'000'000;
+    constexpr int far = INT_MAX;
     dc.MoveTo(-far, 5);
     dc.LineTo(far, 5);
     EXPECT_EQ(dc.picture({0, 5, 10, 6}), "##########\n");
-    const POINT triangle[] = {{-far, -far}, {far, -far}, {5, far}};
-    EXPECT_TRUE(dc.Polygon(triangle, 3));
-    const RECT all = {-far, -far, far, far};
+    const RECT all = {INT_MIN, INT_MIN, far, far};
+    const POINT triangle[] = {{INT_MIN, INT_MIN}, {far, INT_MIN}, {5, far}};
+    CPen wide(PS_SOLID, 5, 0), dotted(PS_DOT, 1, 0);
+    CBrush red(RGB(255, 0, 0));
+    dc.SelectObject(&red);
+    for (CPen* pen : {&wide, &dotted}) {
+        dc.SelectObject(pen);
+        dc.PatBlt(0, 0, 10, 10, WHITENESS);
+        EXPECT_TRUE(dc.Polygon(triangle, 3));
+        EXPECT_EQ(dc.GetPixel(5, 5), RGB(255, 0, 0));
+        EXPECT_TRUE(dc.Rectangle(&all));
+        EXPECT_TRUE(dc.Ellipse(&all));
+        EXPECT_TRUE(dc.RoundRect(&all, {far, far}));
+        EXPECT_TRUE(dc.Pie(&all, {far, 0}, {0, far}));
+        EXPECT_TRUE(dc.Arc(&all, {far, 0}, {0, far}));
+        EXPECT_EQ(dc.GetPixel(9, 9), RGB(255, 0, 0));
+    }
     dc.InvertRect(&all);
-    dc.SelectStockObject(NULL_PEN);
-    EXPECT_TRUE(dc.PatBlt(-far, -far, far, far, WHITENESS));
+    dc.FrameRect(&all, &red);
+    dc.DrawFocusRect(&all);
+    dc.Draw3dRect(&all, 0, 0);
+    dc.TextOut(far, INT_MIN, "x", 1);
+    dc.BitBlt(far, far, far, far, &dc, far, far, SRCCOPY);
+    dc.BitBlt(INT_MIN, INT_MIN, far, far, &dc, 0, 0, SRCCOPY);
+    RECT rect = all;
+    dc.DrawText("x", 1, &rect, DT_CENTER | DT_WORDBREAK);
+    dc.SetBrushOrg(INT_MIN, far);
+    dc.SetViewportOrg(far, INT_MIN);
+    dc.SetWindowOrg(INT_MIN, far);
+    EXPECT_TRUE(dc.PatBlt(INT_MIN, INT_MIN, far, far, WHITENESS));
+    EXPECT_TRUE(dc.Rectangle(&all));
+}
+
+TEST(Shapes, ThatAreLargeLookLikeThePartOfASmallerOneThatIsSeen) {
+    // Seen from so near, both ellipses pass through the same place: the rightmost point.
+    MemoryDc large(20, 20);
+    CBrush red(RGB(255, 0, 0));
+    large.SelectObject(&red);
+    large.Ellipse(-40000, -20000, 10, 20020);
+    EXPECT_EQ(large.picture({0, 10, 20, 11}), "rrrrrrrrr#..........\n");
+    large.PatBlt(0, 0, 20, 20, WHITENESS);
+    large.Chord(-40000, -20000, 10, 20020, 10, 20020, 10, -20000); // from below to above, on the right
+    EXPECT_EQ(large.picture({0, 10, 20, 11}), "rrrrrrrrr#..........\n");
 }
 
 } // namespace
