@@ -1,6 +1,7 @@
 // What happens when the library is loaded.
-#include "platform/win/ExtensionModule.h"
 #include "platform/win/Module.h"
+#include "afx.h"
+#include "platform/win/ExtensionModule.h"
 
 #include <new>
 
@@ -16,7 +17,7 @@ public:
         try {
             new CDynLinkLibrary(s_state); // the chain owns it
         } catch (const std::bad_alloc&) {
-            // The library works without being in the chain.
+            TRACE0("The library works without its resources in the chain.\n");
         }
     }
     ~LibraryModule() {

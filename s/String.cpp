@@ -3,62 +3,68 @@
 #include "platform/base/Text.h"
 #include "s/Record.h"
 
-#include <algorithm>
+#include <array>
 #include <memory>
 #include <string>
 #include <string_view>
 
 namespace {
 
-bool isQuote(std::string_view character) {
-    return character == "\"" || character == "'";
+bool isQuote(char character) {
+    return character == '"' || character == '\'';
 }
 
-/// A set of characters in UTF-8. Where all of them are ASCII, which no other character contains, bytes are searched.
+/// A set of characters in UTF-8.
 class CharacterSet {
 public:
-    explicit CharacterSet(std::string characters)
-        : m_characters(std::move(characters)),
-          m_isAscii(std::all_of(m_characters.begin(), m_characters.end(),
-                                [](char byte) { return static_cast<unsigned char>(byte) < 0x80; })) {}
+    explicit CharacterSet(std::string characters) : m_characters(std::move(characters)) {
+        for (std::size_t at = 0; at < m_characters.size(); at += tvx::text::characterLength(m_characters, at))
+            m_isLead[static_cast<unsigned char>(m_characters[at])] = true;
+    }
 
-    /// Bytes of the character of the set that `text` begins with, 0 when it begins with another.
-    std::size_t matchAtStart(std::string_view text) const {
-        const std::size_t length = tvx::text::characterLength(text);
-        for (std::size_t at = 0; length > 0 && at < m_characters.size();) {
-            const std::size_t step = tvx::text::characterLength(m_characters, at);
-            if (text.substr(0, length) == std::string_view(m_characters).substr(at, step))
+    /// Bytes of the character of the set that stands at `at`, 0 when another one does.
+    std::size_t match(std::string_view text, std::size_t at) const {
+        if (at >= text.size() || !m_isLead[static_cast<unsigned char>(text[at])])
+            return 0;
+        return static_cast<unsigned char>(text[at]) < 0x80 ? 1 : matchSequence(text, at);
+    }
+
+    /// Where the first character of the set stands from `at` on; the text's length when there is none.
+    std::size_t find(std::string_view text, std::size_t at) const {
+        while (at < text.size() && match(text, at) == 0)
+            ++at;
+        return at;
+    }
+
+private:
+    std::size_t matchSequence(std::string_view text, std::size_t at) const {
+        const std::string_view character = text.substr(at, tvx::text::characterLength(text, at));
+        if (tvx::text::characterStart(text, at) != at)
+            return 0;
+        for (std::size_t own = 0; own < m_characters.size();) {
+            const std::size_t length = tvx::text::characterLength(m_characters, own);
+            if (std::string_view(m_characters).substr(own, length) == character)
                 return length;
-            at += step;
+            own += length;
         }
         return 0;
     }
 
-    /// Where the first character of the set stands in `text`, `npos` when there is none.
-    std::size_t find(std::string_view text) const {
-        if (m_isAscii)
-            return text.find_first_of(m_characters);
-        for (std::size_t at = 0; at < text.size(); at += tvx::text::characterLength(text, at))
-            if (matchAtStart(text.substr(at)) > 0)
-                return at;
-        return std::string_view::npos;
-    }
-
-private:
     std::string m_characters;
-    bool m_isAscii;
+    std::array<bool, 256> m_isLead{};
 };
 
 void add(CStringArray& fields, std::string_view field) {
     fields.Add(CString(field));
 }
 
-/// Takes a quoted field off `rest`, which begins behind the opening quote; the field keeps its quotes.
-void takeQuoted(CStringArray& fields, std::string_view& rest, std::string_view quote) {
-    const std::size_t closing = rest.find(quote);
-    const std::size_t length = closing == std::string_view::npos ? rest.size() : closing + quote.size();
-    add(fields, std::string_view(quote.data(), quote.size() + length));
-    rest.remove_prefix(length);
+/// Adds the quoted field whose opening quote stands at `at`.
+/// @return where the text goes on behind it
+std::size_t addQuoted(CStringArray& fields, std::string_view text, std::size_t at) {
+    const std::size_t closing = text.find(text[at], at + 1);
+    const std::size_t end = closing == std::string_view::npos ? text.size() : closing + 1;
+    add(fields, text.substr(at, end - at));
+    return end;
 }
 
 } // namespace
@@ -101,18 +107,16 @@ CStringArray* Gui_String::GetStringArray(const char* separators, int skipEmpty, 
     const CharacterSet skipped(given);
     const CharacterSet stops(ignoreQuotes ? given : given + "\"'");
     auto fields = MakeRecord<CStringArray>();
-    std::string_view rest = View();
-    for (std::size_t at = stops.find(rest); at != std::string_view::npos; at = stops.find(rest)) {
-        if (at > 0 || !skipEmpty)
-            add(*fields, rest.substr(0, at));
-        const std::string_view stop = rest.substr(at, tvx::text::characterLength(rest, at));
-        rest.remove_prefix(at + stop.size());
-        if (!ignoreQuotes && isQuote(stop))
-            takeQuoted(*fields, rest, stop);
-        while (skipEmpty && skipped.matchAtStart(rest) > 0)
-            rest.remove_prefix(skipped.matchAtStart(rest));
+    const std::string_view text = View();
+    std::size_t start = 0;
+    for (std::size_t at = stops.find(text, 0); at < text.size(); at = stops.find(text, start)) {
+        if (at > start || !skipEmpty)
+            add(*fields, text.substr(start, at - start));
+        start = !ignoreQuotes && isQuote(text[at]) ? addQuoted(*fields, text, at) : at + stops.match(text, at);
+        while (const std::size_t length = skipEmpty ? skipped.match(text, start) : 0)
+            start += length;
     }
-    if (!rest.empty())
-        add(*fields, rest);
+    if (start < text.size())
+        add(*fields, text.substr(start));
     return fields.release();
 }

@@ -29,6 +29,7 @@ using INT_PTR = std::intptr_t;
 using UINT_PTR = std::uintptr_t;
 using LONG_PTR = std::intptr_t;
 using DWORD_PTR = std::uintptr_t;
+using ULONG_PTR = std::uintptr_t;
 using WPARAM = UINT_PTR;
 using LPARAM = LONG_PTR;
 using LRESULT = LONG_PTR;
@@ -98,6 +99,7 @@ DECLARE_HANDLE(HRSRC);
 
 /// @{
 /// The halves of a number: of the low 32 bits those of 16 bits, of the low 16 bits those of 8 bits.
+
 constexpr WORD LOWORD(std::uintptr_t value) {
     return static_cast<WORD>(value & 0xFFFF);
 }

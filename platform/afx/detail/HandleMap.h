@@ -16,6 +16,11 @@ public:
         const auto made = temporary_.find(handle);
         return made != temporary_.end() ? made->second.get() : nullptr;
     }
+    /// Only the host's own object.
+    [[nodiscard]] Object* findPermanent(const void* handle) const {
+        const auto own = permanent_.find(handle);
+        return own != permanent_.end() ? own->second : nullptr;
+    }
     void addPermanent(const void* handle, Object& object) {
         permanent_[handle] = &object;
     }

@@ -24,8 +24,7 @@ public:
 
 private:
     void thin(const QPolygon& points);
-    void addPixel(QPoint point, int phase);
-    void plotPixels();
+    void dot(QPoint point);
     void wide(const QPainterPath& path);
     [[nodiscard]] bool isWide() const {
         return width_ > 1;
@@ -38,8 +37,6 @@ private:
     UINT style_;
     int width_;
     int phase_ = 0; ///< pixels of the dash pattern used up
-    std::vector<QPoint> on_;
-    std::vector<QPoint> off_;
 };
 
 } // namespace tvx::afx

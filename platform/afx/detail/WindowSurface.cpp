@@ -179,12 +179,9 @@ bool WindowTarget::open(Canvas& canvas) {
     if (!widget_ || !widget_->isVisible())
         return false;
     const QRect area = area_();
-    if (!drawable_ || !layoutIsFixed) {
-        drawable_ = drawableRegion(*widget_, part_) & area;
-        if (limit)
-            *drawable_ &= *limit;
-    }
-    const QRegion& clip = *drawable_;
+    QRegion clip = drawableRegion(*widget_, part_) & area;
+    if (limit)
+        clip &= *limit;
     const QPoint widgetOrigin = widget_->mapTo(widget_->window(), QPoint());
     origin_ = widgetOrigin + area.topLeft();
     QImage* image = WindowSurface::of(*widget_).open(clip.boundingRect().translated(widgetOrigin));
@@ -223,7 +220,6 @@ PaintTarget::PaintTarget(QWidget& widget, const QRegion& update, std::function<Q
     surface_ = &WindowSurface::of(widget);
     surface_->beginPaint();
     window_.shownBy = WindowSurface::ShownBy::toolkit;
-    window_.layoutIsFixed = true;
 }
 
 PaintTarget::~PaintTarget() {

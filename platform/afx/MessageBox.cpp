@@ -1,0 +1,213 @@
+#include "platform/afx/MessageBox.h"
+
+#include "platform/afx/detail/Gui.h"
+#include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/Window.h"
+
+#include <QApplication>
+#include <QKeyEvent>
+#include <QMessageBox>
+#include <QPushButton>
+
+#include <array>
+#include <cstdio>
+#include <cstring>
+#include <vector>
+
+using namespace tvx::afx;
+
+namespace {
+
+struct BoxButton {
+    int answer;
+    const char* label;
+};
+
+/// The buttons of each kind of box, in the order in which the kinds are numbered (MB_OK, MB_OKCANCEL, ...).
+const std::vector<BoxButton>& buttonsOf(UINT type) {
+    static const std::array<std::vector<BoxButton>, 6> kinds{{
+        {{IDOK, "OK"}},
+        {{IDOK, "OK"}, {IDCANCEL, "Cancel"}},
+        {{IDABORT, "&Abort"}, {IDRETRY, "&Retry"}, {IDIGNORE, "&Ignore"}},
+        {{IDYES, "&Yes"}, {IDNO, "&No"}, {IDCANCEL, "Cancel"}},
+        {{IDYES, "&Yes"}, {IDNO, "&No"}},
+        {{IDRETRY, "&Retry"}, {IDCANCEL, "Cancel"}},
+    }};
+    const UINT kind = type & MB_TYPEMASK;
+    return kinds[kind < kinds.size() ? kind : 0];
+}
+
+const BoxButton& defaultOf(UINT type) {
+    const auto& buttons = buttonsOf(type);
+    const UINT index = (type & MB_DEFMASK) >> 8;
+    return buttons[index < buttons.size() ? index : 0];
+}
+
+/// The answer of Esc and of the close button: Cancel, or the only button. None where a choice is asked for.
+int escapeAnswer(UINT type) {
+    const auto& buttons = buttonsOf(type);
+    for (const BoxButton& button : buttons) {
+        if (button.answer == IDCANCEL) {
+            return IDCANCEL;
+        }
+    }
+    return buttons.size() == 1 ? buttons.front().answer : 0;
+}
+
+QMessageBox::Icon iconOf(UINT type) {
+    switch (type & MB_ICONMASK) {
+    case MB_ICONERROR:
+        return QMessageBox::Critical;
+    case MB_ICONQUESTION:
+        return QMessageBox::Question;
+    case MB_ICONEXCLAMATION:
+        return QMessageBox::Warning;
+    case MB_ICONINFORMATION:
+        return QMessageBox::Information;
+    default:
+        return QMessageBox::NoIcon;
+    }
+}
+
+/// A box whose buttons end our own loop. The toolkit's own exec would let no exception out.
+class Box : public QMessageBox {
+public:
+    Box(QWidget* over, UINT type) : QMessageBox(over), m_type(type) {}
+
+    int ask(const char* text, const char* caption) {
+        setWindowTitle(toQt(caption));
+        setTextFormat(Qt::PlainText);
+        setText(toQt(text));
+        setIcon(iconOf(m_type));
+        for (const BoxButton& button : buttonsOf(m_type)) {
+            addButton(button);
+        }
+        setWindowModality(Qt::ApplicationModal);
+        guarded([this] {
+            show();
+            raise();
+            activateWindow();
+        });
+        const int answer = m_loop.run();
+        guarded([this] { hide(); });
+        return answer > 0 ? answer : defaultOf(m_type).answer;
+    }
+
+    void reject() override {
+        finish(escapeAnswer(m_type));
+    }
+
+protected:
+    void closeEvent(QCloseEvent* event) override {
+        event->ignore();
+        finish(escapeAnswer(m_type));
+    }
+    void keyPressEvent(QKeyEvent* event) override {
+        if (event->key() == Qt::Key_Escape) {
+            finish(escapeAnswer(m_type));
+            return;
+        }
+        QMessageBox::keyPressEvent(event);
+    }
+
+private:
+    void addButton(const BoxButton& entry) {
+        QPushButton* button = QMessageBox::addButton(QString::fromLatin1(entry.label), QMessageBox::ActionRole);
+        const int answer = entry.answer;
+        QObject::disconnect(button, nullptr, this, nullptr);
+        QObject::connect(button, &QPushButton::clicked, this, [this, answer] { finish(answer); });
+        if (answer == defaultOf(m_type).answer) {
+            setDefaultButton(button);
+        }
+    }
+
+    void finish(int answer) {
+        if (answer != 0) {
+            m_loop.end(answer);
+        }
+    }
+
+    UINT m_type;
+    ModalLoop m_loop;
+};
+
+} // namespace
+
+int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
+    text = text != nullptr ? text : "";
+    caption = caption != nullptr ? caption : "Error";
+    if (!ensureGui()) {
+        std::fprintf(stderr, "%s: %s\n", caption, text);
+        return defaultOf(type).answer;
+    }
+    Window* window = Window::from(owner);
+    QWidget* over = window != nullptr ? window->topLevel()->widget() : nullptr;
+    Box box(over, type);
+    return box.ask(text, caption);
+}
+
+int AfxMessageBox(LPCSTR text, UINT type, UINT helpId) {
+    CWinApp* app = AfxGetApp();
+    return app != nullptr ? app->DoMessageBox(text, type, helpId) : ::MessageBoxA(nullptr, text, nullptr, type);
+}
+
+int AfxMessageBox(UINT textId, UINT type, UINT helpId) {
+    CString text;
+    if (!text.LoadString(textId)) {
+        text.Format("?%u", textId);
+    }
+    return AfxMessageBox(text.GetString(), type, helpId == static_cast<UINT>(-1) ? textId : helpId);
+}
+
+int CWnd::MessageBox(LPCSTR text, LPCSTR caption, UINT type) {
+    return ::MessageBoxA(m_hWnd, text, caption != nullptr ? caption : AfxGetAppName(), type);
+}
+
+BOOL MessageBeep(UINT) {
+    if (ensureGui()) {
+        QApplication::beep();
+    }
+    return TRUE;
+}
+
+CWaitCursorPause::CWaitCursorPause(CWinApp& app) {
+    if (QCoreApplication::instance() != nullptr && QApplication::overrideCursor() != nullptr) {
+        QApplication::changeOverrideCursor(Qt::ArrowCursor);
+    }
+}
+
+CWaitCursorPause::~CWaitCursorPause() {
+    if (QCoreApplication::instance() != nullptr && QApplication::overrideCursor() != nullptr) {
+        QApplication::changeOverrideCursor(Qt::WaitCursor);
+    }
+}
+
+namespace {
+
+void formatStrings(CString& result, UINT formatId, LPCSTR first, LPCSTR second) {
+    CString format;
+    if (!format.LoadString(formatId)) {
+        result.Empty();
+        return;
+    }
+    CString text;
+    for (const char* at = format.GetString(); *at != '\0'; ++at) {
+        if (*at == '%' && (at[1] == '1' || at[1] == '2')) {
+            ++at;
+            text += *at == '1' ? first : second;
+        } else {
+            text += *at;
+        }
+    }
+    result = text;
+}
+
+} // namespace
+
+void AfxFormatString1(CString& result, UINT formatId, LPCSTR first) {
+    formatStrings(result, formatId, first, "");
+}
+
+void AfxFormatString2(CString& result, UINT formatId, LPCSTR first, LPCSTR second) {
+    formatStrings(result, formatId, first, second);
+}

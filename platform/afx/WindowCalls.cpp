@@ -1,0 +1,529 @@
+#include "platform/afx/WindowCalls.h"
+
+#include "platform/afx/detail/Gui.h"
+#include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/Window.h"
+#include "platform/base/Text.h"
+#include "platform/win/Error.h"
+
+#include <QApplication>
+#include <QScreen>
+
+#include <cstring>
+
+using namespace tvx::afx;
+
+namespace {
+
+/// The number that stands for the screen's own window; no window gets it.
+HWND desktopHandle() {
+    return reinterpret_cast<HWND>(static_cast<std::uintptr_t>(0x00010010));
+}
+
+QRect screenArea() {
+    return ensureGui() ? QGuiApplication::primaryScreen()->geometry() : QRect();
+}
+
+Window* windowOrError(HWND handle) {
+    Window* window = Window::from(handle);
+    if (window == nullptr) {
+        SetLastError(ERROR_INVALID_WINDOW_HANDLE);
+    }
+    return window;
+}
+
+HWND handleOf(const Window* window) {
+    return window != nullptr ? window->handle() : nullptr;
+}
+
+} // namespace
+
+BOOL IsWindow(HWND handle) {
+    return Window::from(handle) != nullptr ? TRUE : FALSE;
+}
+
+BOOL DestroyWindow(HWND handle) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr || window->isDestroyed()) {
+        return FALSE;
+    }
+    window->destroy();
+    return TRUE;
+}
+
+// --- the tree of windows ---
+
+HWND GetParent(HWND handle) {
+    const Window* window = windowOrError(handle);
+    return window != nullptr ? handleOf(window->isChild() ? window->parent() : window->owner()) : nullptr;
+}
+
+HWND SetParent(HWND handle, HWND parent) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr || (parent != nullptr && windowOrError(parent) == nullptr)) {
+        return nullptr;
+    }
+    const HWND previous = handleOf(window->parent());
+    window->setParent(Window::from(parent));
+    return previous;
+}
+
+HWND GetWindow(HWND handle, UINT relation) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return nullptr;
+    }
+    if (relation == GW_OWNER) {
+        return handleOf(window->owner());
+    }
+    if (relation == GW_CHILD) {
+        return window->children().empty() ? nullptr : window->children().front()->handle();
+    }
+    const auto& siblings = window->parent() != nullptr ? window->parent()->children() : Window::topLevels();
+    const auto place = std::find(siblings.begin(), siblings.end(), window);
+    switch (relation) {
+    case GW_HWNDFIRST:
+        return siblings.front()->handle();
+    case GW_HWNDLAST:
+        return siblings.back()->handle();
+    case GW_HWNDNEXT:
+        return std::next(place) != siblings.end() ? (*std::next(place))->handle() : nullptr;
+    case GW_HWNDPREV:
+        return place != siblings.begin() ? (*std::prev(place))->handle() : nullptr;
+    default:
+        return nullptr;
+    }
+}
+
+HWND GetTopWindow(HWND handle) {
+    return GetWindow(handle, GW_CHILD);
+}
+
+HWND GetDlgItem(HWND handle, int id) {
+    const Window* window = windowOrError(handle);
+    return window != nullptr ? handleOf(window->child(id)) : nullptr;
+}
+
+int GetDlgCtrlID(HWND handle) {
+    const Window* window = windowOrError(handle);
+    return window != nullptr ? window->id() : 0;
+}
+
+BOOL IsChild(HWND parent, HWND handle) {
+    const Window* window = Window::from(handle);
+    while (window != nullptr && window->isChild()) {
+        window = window->parent();
+        if (handleOf(window) == parent) {
+            return TRUE;
+        }
+    }
+    return FALSE;
+}
+
+namespace {
+
+BOOL enumerate(const std::vector<Window*>& windows, bool deep, WNDENUMPROC callback, LPARAM param) {
+    std::vector<HWND> handles;
+    for (const Window* window : windows) {
+        handles.push_back(window->handle());
+    }
+    for (const HWND handle : handles) {
+        if (Window::from(handle) == nullptr) {
+            continue;
+        }
+        if (!callback(handle, param)) {
+            return FALSE;
+        }
+        const Window* window = Window::from(handle);
+        if (deep && window != nullptr && !enumerate(window->children(), true, callback, param)) {
+            return FALSE;
+        }
+    }
+    return TRUE;
+}
+
+} // namespace
+
+BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param) {
+    const Window* window = windowOrError(parent);
+    return window != nullptr ? enumerate(window->children(), true, callback, param) : FALSE;
+}
+
+BOOL EnumWindows(WNDENUMPROC callback, LPARAM param) {
+    return enumerate(Window::topLevels(), false, callback, param);
+}
+
+HWND GetDesktopWindow() {
+    return desktopHandle();
+}
+
+HWND FindWindowA(LPCSTR className, LPCSTR text) {
+    for (const Window* window : Window::topLevels()) {
+        const bool sameClass = className == nullptr || tvx::text::equalNoCase(window->className(), className);
+        if (sameClass && (text == nullptr || fromQt(window->text()) == text)) {
+            return window->handle();
+        }
+    }
+    return nullptr;
+}
+
+HWND WindowFromPoint(POINT point) {
+    const QWidget* widget = ensureGui() ? QApplication::widgetAt(toQt(point)) : nullptr;
+    return handleOf(Window::of(widget));
+}
+
+HWND ChildWindowFromPoint(HWND parent, POINT point) {
+    const Window* window = windowOrError(parent);
+    if (window == nullptr || !QRect(QPoint(), window->clientRect().size()).contains(toQt(point))) {
+        return nullptr;
+    }
+    for (const Window* child : window->children()) {
+        if (child->windowRect().contains(toQt(point))) {
+            return child->handle();
+        }
+    }
+    return parent;
+}
+
+// --- state ---
+
+BOOL IsWindowVisible(HWND handle) {
+    const Window* window = Window::from(handle);
+    return window != nullptr && window->isVisible() ? TRUE : FALSE;
+}
+
+BOOL IsWindowEnabled(HWND handle) {
+    const Window* window = Window::from(handle);
+    return window != nullptr && window->isEnabled() ? TRUE : FALSE;
+}
+
+BOOL EnableWindow(HWND handle, BOOL enable) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    const bool wasDisabled = !window->isEnabled();
+    if (wasDisabled == (enable != FALSE)) {
+        window->setEnabled(enable != FALSE);
+    }
+    return wasDisabled ? TRUE : FALSE;
+}
+
+BOOL IsIconic(HWND handle) {
+    const Window* window = Window::from(handle);
+    return window != nullptr && window->widget()->isMinimized() ? TRUE : FALSE;
+}
+
+BOOL IsZoomed(HWND handle) {
+    const Window* window = Window::from(handle);
+    return window != nullptr && window->widget()->isMaximized() ? TRUE : FALSE;
+}
+
+BOOL ShowWindow(HWND handle, int command) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    const bool before = (window->style() & WS_VISIBLE) != 0;
+    window->show(command);
+    return before ? TRUE : FALSE;
+}
+
+LONG_PTR GetWindowLongPtrA(HWND handle, int index) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return 0;
+    }
+    switch (index) {
+    case GWL_STYLE:
+        return static_cast<LONG_PTR>(window->style());
+    case GWL_EXSTYLE:
+        return static_cast<LONG_PTR>(window->exStyle());
+    case GWL_ID:
+        return window->id();
+    case GWL_USERDATA:
+        return window->userData;
+    default:
+        return 0;
+    }
+}
+
+LONG_PTR SetWindowLongPtrA(HWND handle, int index, LONG_PTR value) {
+    const LONG_PTR previous = GetWindowLongPtrA(handle, index);
+    Window* window = Window::from(handle);
+    if (window == nullptr) {
+        return 0;
+    }
+    switch (index) {
+    case GWL_STYLE:
+        window->setStyle(static_cast<DWORD>(value), window->exStyle());
+        break;
+    case GWL_EXSTYLE:
+        window->setStyle(window->style(), static_cast<DWORD>(value));
+        break;
+    case GWL_ID:
+        window->setId(static_cast<int>(value));
+        break;
+    case GWL_USERDATA:
+        window->userData = value;
+        break;
+    default:
+        break;
+    }
+    return previous;
+}
+
+// --- text ---
+
+BOOL SetWindowTextA(HWND handle, LPCSTR text) {
+    if (windowOrError(handle) == nullptr) {
+        return FALSE;
+    }
+    return SendMessageA(handle, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(text != nullptr ? text : "")) != 0 ? TRUE
+                                                                                                           : FALSE;
+}
+
+int GetWindowTextA(HWND handle, LPSTR buffer, int size) {
+    if (size <= 0 || windowOrError(handle) == nullptr) {
+        return 0;
+    }
+    return static_cast<int>(
+        SendMessageA(handle, WM_GETTEXT, static_cast<WPARAM>(size), reinterpret_cast<LPARAM>(buffer)));
+}
+
+int GetWindowTextLengthA(HWND handle) {
+    return static_cast<int>(SendMessageA(handle, WM_GETTEXTLENGTH, 0, 0));
+}
+
+int GetClassNameA(HWND handle, LPSTR buffer, int size) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr || size <= 0) {
+        return 0;
+    }
+    const std::size_t length = std::min(window->className().size(), static_cast<std::size_t>(size - 1));
+    std::memcpy(buffer, window->className().data(), length);
+    buffer[length] = '\0';
+    return static_cast<int>(length);
+}
+
+// --- place and size ---
+
+BOOL MoveWindow(HWND handle, int x, int y, int width, int height, BOOL repaint) {
+    return SetWindowPos(handle, nullptr, x, y, width, height, SWP_NOZORDER | SWP_NOACTIVATE);
+}
+
+namespace {
+
+void placeInOrder(Window& window, HWND after) {
+    if (after == HWND_TOPMOST || after == HWND_NOTOPMOST) {
+        const DWORD topmost = after == HWND_TOPMOST ? DWORD{WS_EX_TOPMOST} : 0;
+        window.setStyle(window.style(), (window.exStyle() & ~DWORD{WS_EX_TOPMOST}) | topmost);
+        return;
+    }
+    if (after == HWND_BOTTOM) {
+        window.widget()->lower();
+    } else if (const Window* other = Window::from(after); other != nullptr && !window.widget()->isWindow()) {
+        window.widget()->stackUnder(other->widget());
+        window.placeAfter(Window::from(after));
+    } else {
+        window.widget()->raise();
+    }
+}
+
+} // namespace
+
+BOOL SetWindowPos(HWND handle, HWND after, int x, int y, int cx, int cy, UINT flags) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr || window->widget() == nullptr) {
+        return FALSE;
+    }
+    const QRect current = window->windowRect();
+    const QPoint place = (flags & SWP_NOMOVE) != 0 ? current.topLeft() : QPoint(x, y);
+    const QSize size = (flags & SWP_NOSIZE) != 0 ? current.size() : QSize(cx, cy).expandedTo(QSize(0, 0));
+    guarded([&] {
+        if (QRect(place, size) != current) {
+            window->setWindowRect(QRect(place, size));
+        }
+        if ((flags & SWP_NOZORDER) == 0) {
+            placeInOrder(*window, after);
+        }
+    });
+    if (IsWindow(handle)) {
+        window->tellGeometry();
+    }
+    const bool activate = (flags & SWP_NOACTIVATE) == 0;
+    if ((flags & SWP_SHOWWINDOW) != 0) {
+        ShowWindow(handle, activate ? SW_SHOW : SW_SHOWNA);
+    } else if ((flags & SWP_HIDEWINDOW) != 0) {
+        ShowWindow(handle, SW_HIDE);
+    }
+    return TRUE;
+}
+
+BOOL BringWindowToTop(HWND handle) {
+    return SetWindowPos(handle, HWND_TOP, 0, 0, 0, 0, SWP_NOMOVE | SWP_NOSIZE);
+}
+
+BOOL GetWindowRect(HWND handle, RECT* rect) {
+    if (handle == desktopHandle()) {
+        *rect = fromQt(screenArea());
+        return TRUE;
+    }
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    *rect = fromQt(window->screenRect());
+    return TRUE;
+}
+
+BOOL GetClientRect(HWND handle, RECT* rect) {
+    if (handle == desktopHandle()) {
+        *rect = fromQt(screenArea());
+        return TRUE;
+    }
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    const QSize size = window->clientRect().size();
+    *rect = {0, 0, size.width(), size.height()};
+    return TRUE;
+}
+
+BOOL GetWindowPlacement(HWND handle, WINDOWPLACEMENT* placement) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr || window->widget() == nullptr) {
+        return FALSE;
+    }
+    const QWidget& widget = *window->widget();
+    *placement = {};
+    placement->length = sizeof(WINDOWPLACEMENT);
+    placement->ptMinPosition = placement->ptMaxPosition = {-1, -1};
+    placement->showCmd = SW_SHOWNORMAL;
+    QRect normal = window->windowRect();
+    if (widget.isWindow() && (widget.isMaximized() || widget.isMinimized())) {
+        placement->showCmd = widget.isMinimized() ? SW_SHOWMINIMIZED : SW_SHOWMAXIMIZED;
+        normal = widget.normalGeometry();
+    }
+    placement->rcNormalPosition = fromQt(normal);
+    return TRUE;
+}
+
+BOOL SetWindowPlacement(HWND handle, const WINDOWPLACEMENT* placement) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    const RECT& rect = placement->rcNormalPosition;
+    SetWindowPos(handle, nullptr, rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top,
+                 SWP_NOZORDER | SWP_NOACTIVATE);
+    ShowWindow(handle, static_cast<int>(placement->showCmd));
+    return TRUE;
+}
+
+BOOL ClientToScreen(HWND handle, POINT* point) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    *point = fromQt(window->clientToScreen(toQt(*point)));
+    return TRUE;
+}
+
+BOOL ScreenToClient(HWND handle, POINT* point) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    *point = fromQt(window->screenToClient(toQt(*point)));
+    return TRUE;
+}
+
+int MapWindowPoints(HWND from, HWND to, POINT* points, UINT count) {
+    POINT offset{0, 0};
+    if (from != nullptr) {
+        ClientToScreen(from, &offset);
+    }
+    if (to != nullptr) {
+        ScreenToClient(to, &offset);
+    }
+    for (UINT i = 0; i < count; ++i) {
+        points[i].x += offset.x;
+        points[i].y += offset.y;
+    }
+    return MAKELONG(offset.x, offset.y);
+}
+
+// --- painting ---
+
+BOOL RedrawWindow(HWND handle, const RECT* rect, HRGN region, UINT flags) {
+    Window* window = windowOrError(handle);
+    QWidget* client = peerOf(handle);
+    if (window == nullptr || client == nullptr) {
+        return FALSE;
+    }
+    const QRect area = window->clientRect();
+    const QRect part = rect != nullptr ? toQt(*rect).translated(area.topLeft()).intersected(area) : area;
+    guarded([&] {
+        if ((flags & RDW_INVALIDATE) != 0) {
+            client->update(part);
+        }
+        if ((flags & RDW_ALLCHILDREN) != 0 && (flags & RDW_INVALIDATE) != 0) {
+            for (const Window* child : window->children()) {
+                child->clientWidget()->update();
+            }
+        }
+        if ((flags & (RDW_UPDATENOW | RDW_ERASENOW)) != 0) {
+            client->repaint(part);
+        }
+    });
+    return TRUE;
+}
+
+BOOL InvalidateRect(HWND handle, const RECT* rect, BOOL erase) {
+    return RedrawWindow(handle, rect, nullptr, RDW_INVALIDATE | (erase ? RDW_ERASE : 0U));
+}
+
+BOOL UpdateWindow(HWND handle) {
+    const Window* window = windowOrError(handle);
+    if (window == nullptr || window->widget() == nullptr) {
+        return FALSE;
+    }
+    // The toolkit keeps what is to be repainted per top-level widget and paints it all at this request.
+    QWidget* top = window->widget()->window();
+    guarded([top] {
+        QEvent request(QEvent::UpdateRequest);
+        QCoreApplication::sendEvent(top, &request);
+    });
+    return TRUE;
+}
+
+// --- activation ---
+
+HWND GetActiveWindow() {
+    return QCoreApplication::instance() != nullptr ? handleOf(Window::of(QApplication::activeWindow())) : nullptr;
+}
+
+HWND SetActiveWindow(HWND handle) {
+    const HWND previous = GetActiveWindow();
+    Window* window = windowOrError(handle);
+    if (window != nullptr && window->topLevel()->widget() != nullptr) {
+        guarded([window] { window->topLevel()->widget()->activateWindow(); });
+    }
+    return previous;
+}
+
+HWND GetForegroundWindow() {
+    return GetActiveWindow();
+}
+
+BOOL SetForegroundWindow(HWND handle) {
+    Window* window = windowOrError(handle);
+    if (window == nullptr) {
+        return FALSE;
+    }
+    guarded([window] { window->topLevel()->widget()->raise(); });
+    SetActiveWindow(handle);
+    return TRUE;
+}

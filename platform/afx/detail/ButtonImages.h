@@ -1,0 +1,16 @@
+#pragma once
+
+#include "platform/base/Types.h"
+
+#include <QIcon>
+#include <QImage>
+
+namespace tvx::afx {
+
+/// The pictures of a bitmap made for buttons and menus: its background, light grey (192, 192, 192) or magenta, becomes
+/// transparent. Null image for a handle that is no bitmap.
+[[nodiscard]] QImage buttonImages(HBITMAP bitmap);
+/// The whole bitmap as one picture; null icon for a handle that is none.
+[[nodiscard]] QIcon buttonIcon(HBITMAP bitmap);
+
+} // namespace tvx::afx

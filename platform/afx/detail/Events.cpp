@@ -1,0 +1,474 @@
+#include "platform/afx/detail/Capture.h"
+#include "platform/afx/detail/Cursors.h"
+#include "platform/afx/detail/Dispatch.h"
+#include "platform/afx/detail/Drops.h"
+#include "platform/afx/detail/Keys.h"
+#include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/MessageQueue.h"
+#include "platform/afx/detail/Window.h"
+
+#include <QApplication>
+#include <QContextMenuEvent>
+#include <QInputMethodEvent>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPaintEvent>
+#include <QWheelEvent>
+#include <QWindowStateChangeEvent>
+
+#include <memory>
+
+namespace tvx::afx {
+
+namespace {
+
+/// A press that pre-translation consumed: the toolkit sends it a second time, and that one must vanish too.
+struct ConsumedKey {
+    int key = 0;
+    quint64 timestamp = 0;
+    bool pending = false;
+} consumedKey;
+
+/// Whether Alt went down and nothing else happened since: its release then opens the menu bar.
+bool altAlone = false;
+
+bool keepForPeek(const MSG& msg, QObject* receiver, const QEvent* event) {
+    EventCapture& capture = EventCapture::instance();
+    if (!capture.isCollecting()) {
+        return false;
+    }
+    CapturedEvent captured;
+    captured.msg = msg;
+    captured.receiver = receiver;
+    captured.event.reset(event->clone());
+    capture.add(std::move(captured));
+    return true;
+}
+
+/// Runs one message with the event behind it. An input event that nobody passed on ends here.
+bool deliverInput(const MSG& msg, QObject* receiver, QEvent* event) {
+    EventSource source{receiver, event};
+    dispatch(msg, &source);
+    if (!source.passed) {
+        event->accept();
+    }
+    return true;
+}
+
+// --- keys ---
+
+bool isSystemKey(const QKeyEvent& event) {
+    const bool alt = event.modifiers().testFlag(Qt::AltModifier) && !event.modifiers().testFlag(Qt::ControlModifier);
+    return alt || event.key() == Qt::Key_F10 || event.key() == Qt::Key_Alt;
+}
+
+MSG keyMessage(const Window& window, const QKeyEvent& event, bool released) {
+    const bool system = isSystemKey(event);
+    const UINT down = system ? WM_SYSKEYDOWN : WM_KEYDOWN;
+    const UINT up = system ? WM_SYSKEYUP : WM_KEYUP;
+    return makeMessage(window.handle(), released ? up : down, static_cast<WPARAM>(virtualKey(event)),
+                       keyParameter(event, released));
+}
+
+/// The toolkit asks with this event before its own shortcuts: the place where a key can be taken from everybody.
+bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
+    MSG msg = keyMessage(window, event, false);
+    noteKey(static_cast<int>(msg.wParam), true);
+    event.accept(); // shortcuts of the toolkit's never fire: accelerators and mnemonics are the layer's
+    if (EventCapture::instance().isCollecting()) {
+        return true;
+    }
+    consumedKey.pending = false;
+    armIdle();
+    if (preTranslate(msg)) {
+        consumedKey = {event.key(), event.timestamp(), true};
+    }
+    return true;
+}
+
+bool takeConsumed(const QKeyEvent& event) {
+    const bool same = consumedKey.pending && consumedKey.key == event.key() &&
+                      (consumedKey.timestamp == event.timestamp() || event.timestamp() == 0);
+    consumedKey.pending = false;
+    return same;
+}
+
+/// Characters go one message each; the event itself goes to the widget with the first that nobody handled.
+void deliverCharacters(Window& window, const QKeyEvent& event, EventSource& source) {
+    const UINT message = isSystemKey(event) ? WM_SYSCHAR : WM_CHAR;
+    const HWND handle = window.handle();
+    const auto characters = event.text().toUcs4();
+    for (const auto character : characters) {
+        MSG msg = makeMessage(handle, message, character, keyParameter(event, false));
+        if (!preTranslate(msg)) {
+            dispatch(msg, &source);
+        }
+    }
+}
+
+bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
+    altAlone = event.key() == Qt::Key_Alt;
+    if (takeConsumed(event)) {
+        event.accept();
+        return true;
+    }
+    const MSG msg = keyMessage(window, event, false);
+    if (keepForPeek(msg, receiver, &event)) {
+        return true;
+    }
+    // The toolkit's question before its shortcuts is not kept for PeekMessage, so a kept press is offered here.
+    if (EventCapture::instance().isRedelivering()) {
+        MSG offered = msg;
+        if (preTranslate(offered)) {
+            event.accept();
+            return true;
+        }
+    }
+    EventSource source{receiver, &event};
+    const HWND handle = window.handle();
+    const bool makesCharacters = !event.text().isEmpty();
+    if (makesCharacters) {
+        // A widget inserts the character at this one event, so it gets it where the framework would insert it.
+        dispatch(msg);
+        if (Window::from(handle) != nullptr) {
+            deliverCharacters(window, event, source);
+        }
+    } else {
+        dispatch(msg, &source);
+    }
+    if (!source.passed) {
+        event.accept();
+    }
+    return true;
+}
+
+bool onKeyRelease(Window& window, QObject* receiver, QKeyEvent& event) {
+    if (event.isAutoRepeat()) {
+        event.accept();
+        return true;
+    }
+    MSG msg = keyMessage(window, event, true);
+    noteKey(static_cast<int>(msg.wParam), false);
+    if (keepForPeek(msg, receiver, &event)) {
+        return true;
+    }
+    if (event.key() == Qt::Key_Alt) {
+        // Only a lone Alt opens the menu; the release of an Alt that was used with another key is an ordinary one.
+        msg.message = altAlone ? WM_SYSKEYUP : WM_KEYUP;
+        altAlone = false;
+    }
+    EventSource source{receiver, &event};
+    armIdle();
+    if (!preTranslate(msg)) {
+        dispatch(msg, &source);
+    }
+    event.accept();
+    return true;
+}
+
+/// Text composed by an input method comes without key presses.
+bool onInputMethod(Window& window, QObject* receiver, QInputMethodEvent& event) {
+    const auto characters = event.commitString().toUcs4();
+    if (characters.isEmpty()) {
+        return false;
+    }
+    EventSource source{receiver, &event};
+    const HWND handle = window.handle();
+    for (const auto character : characters) {
+        MSG msg = makeMessage(handle, WM_CHAR, character, 1);
+        if (!preTranslate(msg)) {
+            dispatch(msg, &source);
+        }
+    }
+    return true;
+}
+
+// --- mouse ---
+
+UINT buttonMessage(const QMouseEvent& event) {
+    UINT first = WM_LBUTTONDOWN;
+    if (event.button() == Qt::RightButton) {
+        first = WM_RBUTTONDOWN;
+    } else if (event.button() == Qt::MiddleButton) {
+        first = WM_MBUTTONDOWN;
+    } else if (event.button() != Qt::LeftButton) {
+        return WM_NULL;
+    }
+    switch (event.type()) {
+    case QEvent::MouseButtonPress:
+        return first;
+    case QEvent::MouseButtonRelease:
+        return first + 1;
+    case QEvent::MouseButtonDblClick:
+        return first + 2;
+    default:
+        return WM_NULL;
+    }
+}
+
+Window* mouseTarget(Window* under) {
+    if (Window* capturing = Window::from(captureWindow())) {
+        return capturing;
+    }
+    while (under != nullptr && under->passesMouse() && under->parent() != nullptr) {
+        under = under->parent();
+    }
+    return under;
+}
+
+/// Lets windows choose the cursor, and views and child frames become active, before they see the press itself.
+void announceMouse(const Window& window, UINT message) {
+    const HWND handle = window.handle();
+    if (captureWindow() == nullptr) {
+        noteCursorWindow(handle);
+        SendMessageA(handle, WM_SETCURSOR, reinterpret_cast<WPARAM>(handle),
+                     MAKELPARAM(HTCLIENT, static_cast<int>(message)));
+    }
+    const bool press = message == WM_LBUTTONDOWN || message == WM_RBUTTONDOWN || message == WM_MBUTTONDOWN;
+    if (press && captureWindow() == nullptr) {
+        Window* current = Window::from(handle);
+        const HWND top = current != nullptr ? current->topLevel()->handle() : nullptr;
+        SendMessageA(handle, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(top),
+                     MAKELPARAM(HTCLIENT, static_cast<int>(message)));
+    }
+}
+
+bool onMouse(Window& under, QObject* receiver, QMouseEvent& event) {
+    const QPoint screen = event.globalPosition().toPoint();
+    notePointer(fromQt(screen));
+    const UINT message = event.type() == QEvent::MouseMove ? static_cast<UINT>(WM_MOUSEMOVE) : buttonMessage(event);
+    Window* target = mouseTarget(&under);
+    if (message == WM_NULL || target == nullptr) {
+        return false;
+    }
+    altAlone = false;
+    const HWND handle = target->handle();
+    if (!EventCapture::instance().isCollecting()) {
+        announceMouse(*target, message);
+    }
+    target = Window::from(handle);
+    if (target == nullptr) {
+        event.accept();
+        return true;
+    }
+    const QPoint point = target->screenToClient(screen);
+    MSG msg =
+        makeMessage(handle, message, buttonFlags(event.buttons(), event.modifiers()), MAKELPARAM(point.x(), point.y()));
+    if (keepForPeek(msg, receiver, &event)) {
+        return true;
+    }
+    noteIdle(msg);
+    if (preTranslate(msg)) {
+        event.accept();
+        return true;
+    }
+    return deliverInput(msg, receiver, &event);
+}
+
+bool onWheel(Window& under, QObject* receiver, QWheelEvent& event) {
+    Window* target = mouseTarget(&under);
+    if (target == nullptr || event.angleDelta().y() == 0) {
+        return false;
+    }
+    const QPoint screen = event.globalPosition().toPoint();
+    const WPARAM keys = buttonFlags(event.buttons(), event.modifiers());
+    MSG msg = makeMessage(target->handle(), WM_MOUSEWHEEL, MAKEWPARAM(static_cast<int>(keys), event.angleDelta().y()),
+                          MAKELPARAM(screen.x(), screen.y()));
+    if (keepForPeek(msg, receiver, &event)) {
+        return true;
+    }
+    armIdle();
+    if (preTranslate(msg)) {
+        event.accept();
+        return true;
+    }
+    return deliverInput(msg, receiver, &event);
+}
+
+/// The right button's release asks for a menu by way of its default; only the keyboard's request comes from here.
+bool onContextMenu(Window& window, QContextMenuEvent& event) {
+    event.accept();
+    if (event.reason() == QContextMenuEvent::Keyboard) {
+        window.call(WM_CONTEXTMENU, reinterpret_cast<WPARAM>(window.handle()), MAKELPARAM(-1, -1));
+    }
+    return true;
+}
+
+// --- painting, place, activation ---
+
+bool onPaint(Window& window, QObject* receiver, QPaintEvent& event) {
+    if (receiver != window.clientWidget()) {
+        return false;
+    }
+    const bool outer = std::exchange(window.inPaint, true);
+    window.paintRegion = event.region().translated(-window.clientRect().topLeft());
+    struct Done {
+        Window& window;
+        bool outer;
+        ~Done() {
+            window.inPaint = outer;
+            window.paintRegion = QRegion();
+        }
+    } done{window, outer};
+    EventSource source{receiver, &event};
+    dispatch(makeMessage(window.handle(), WM_PAINT, 0, 0), &source);
+    return true;
+}
+
+bool onCloseRequest(Window& window, QEvent& event) {
+    event.ignore();
+    armIdle();
+    MSG msg = makeMessage(window.handle(), WM_SYSCOMMAND, SC_CLOSE, 0);
+    pump(msg);
+    return true;
+}
+
+void onActivation(Window& window, bool active) {
+    Window* other = Window::of(QApplication::activeWindow());
+    const auto otherHandle = reinterpret_cast<LPARAM>(other != nullptr && other != &window ? other->handle() : nullptr);
+    const HWND handle = window.handle();
+    armIdle();
+    SendMessageA(handle, WM_NCACTIVATE, active ? TRUE : FALSE, 0);
+    SendMessageA(handle, WM_ACTIVATE, active ? WA_ACTIVE : WA_INACTIVE, otherHandle);
+}
+
+void onFocus(Window& window, const QFocusEvent& event) {
+    if (event.reason() == Qt::PopupFocusReason || event.reason() == Qt::MenuBarFocusReason) {
+        return; // a menu borrows the keyboard only
+    }
+    armIdle();
+    tellFocus(window, event.gotFocus());
+}
+
+/// Events that the toolkit handles first and the window hears of afterwards.
+bool onAfterwards(Window& window, QObject* receiver, QEvent& event, bool& result) {
+    EventSource source{receiver, &event};
+    const HWND handle = window.handle();
+    passToToolkit(source);
+    result = true;
+    Window* current = Window::from(handle);
+    if (current == nullptr) {
+        return true;
+    }
+    const bool outermost = receiver == current->widget();
+    switch (event.type()) {
+    case QEvent::Move:
+    case QEvent::Resize:
+    case QEvent::WindowStateChange:
+        if (outermost || receiver == current->clientWidget()) {
+            current->tellGeometry();
+        }
+        break;
+    case QEvent::WindowActivate:
+    case QEvent::WindowDeactivate:
+        if (outermost && current->widget()->isWindow()) {
+            onActivation(*current, event.type() == QEvent::WindowActivate);
+        }
+        break;
+    case QEvent::FocusIn:
+    case QEvent::FocusOut:
+        onFocus(*current, static_cast<QFocusEvent&>(event));
+        break;
+    case QEvent::Leave:
+        if (receiver == current->clientWidget()) {
+            current->call(WM_MOUSELEAVE);
+        }
+        break;
+    default:
+        break;
+    }
+    return true;
+}
+
+bool translateInput(Window& window, QObject* receiver, QEvent* event) {
+    switch (event->type()) {
+    case QEvent::ShortcutOverride:
+        return onShortcutOverride(window, receiver, static_cast<QKeyEvent&>(*event));
+    case QEvent::KeyPress:
+        return onKeyPress(window, receiver, static_cast<QKeyEvent&>(*event));
+    case QEvent::KeyRelease:
+        return onKeyRelease(window, receiver, static_cast<QKeyEvent&>(*event));
+    case QEvent::MouseButtonPress:
+    case QEvent::MouseButtonRelease:
+    case QEvent::MouseButtonDblClick:
+    case QEvent::MouseMove:
+        return onMouse(window, receiver, static_cast<QMouseEvent&>(*event));
+    case QEvent::Wheel:
+        return onWheel(window, receiver, static_cast<QWheelEvent&>(*event));
+    case QEvent::ContextMenu:
+        return onContextMenu(window, static_cast<QContextMenuEvent&>(*event));
+    default:
+        return false;
+    }
+}
+
+bool isInput(QEvent::Type type) {
+    switch (type) {
+    case QEvent::ShortcutOverride:
+    case QEvent::KeyPress:
+    case QEvent::KeyRelease:
+    case QEvent::MouseButtonPress:
+    case QEvent::MouseButtonRelease:
+    case QEvent::MouseButtonDblClick:
+    case QEvent::MouseMove:
+    case QEvent::Wheel:
+    case QEvent::ContextMenu:
+        return true;
+    default:
+        return false;
+    }
+}
+
+bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& result) {
+    switch (event->type()) {
+    case QEvent::Paint:
+        return onPaint(window, receiver, static_cast<QPaintEvent&>(*event));
+    case QEvent::Close:
+        return receiver == window.widget() && window.widget()->isWindow() && onCloseRequest(window, *event);
+    case QEvent::DragEnter:
+    case QEvent::DragMove:
+    case QEvent::Drop:
+        return translateDrop(window, *event);
+    case QEvent::InputMethod:
+        return onInputMethod(window, receiver, static_cast<QInputMethodEvent&>(*event));
+    case QEvent::Move:
+    case QEvent::Resize:
+    case QEvent::WindowStateChange:
+    case QEvent::WindowActivate:
+    case QEvent::WindowDeactivate:
+    case QEvent::FocusIn:
+    case QEvent::FocusOut:
+    case QEvent::Leave:
+        return onAfterwards(window, receiver, *event, result);
+    default:
+        return false;
+    }
+}
+
+} // namespace
+
+bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
+    if (takePassing(event) || ExceptionCarrier::isPending()) {
+        return false;
+    }
+    if (event->type() == QEvent::ApplicationStateChange) {
+        forgetKeys();
+        return false;
+    }
+    if (!receiver->isWidgetType()) {
+        return false;
+    }
+    const bool input = isInput(event->type());
+    // The toolkit forwards wheel and key events between widgets by sending them again; only the user's count. An
+    // open menu or drop-down list has all input to itself.
+    if (input && (!event->spontaneous() || QApplication::activePopupWidget() != nullptr)) {
+        return false;
+    }
+    Window* window = Window::of(receiver);
+    if (window == nullptr || window->isDestroyed()) {
+        return false;
+    }
+    return input ? translateInput(*window, receiver, event) : translateOther(*window, receiver, event, result);
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,82 @@
+#include "platform/afx/detail/Gui.h"
+
+#include "platform/afx/detail/Dispatch.h"
+#include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/MessageQueue.h"
+#include "platform/win/Display.h"
+#include "platform/win/Module.h"
+
+#include <QAbstractEventDispatcher>
+#include <QApplication>
+#include <QThread>
+
+#include <clocale>
+#include <cstdlib>
+#include <cxxabi.h>
+
+namespace tvx::afx {
+
+namespace {
+
+/// Sees every event once, with its deepest receiver, and turns it into messages. Event filters would see an ignored
+/// event again at every ancestor, and exceptions could not be caught in them.
+class GuiApplication : public QApplication {
+public:
+    GuiApplication(int& argc, char** argv) : QApplication(argc, argv) {}
+
+    bool notify(QObject* receiver, QEvent* event) override {
+        try {
+            bool result = true;
+            if (translateEvent(receiver, event, result)) {
+                return result;
+            }
+            return QApplication::notify(receiver, event);
+        } catch (abi::__forced_unwind&) {
+            throw;
+        } catch (...) {
+            ExceptionCarrier::store(std::current_exception());
+            return true;
+        }
+    }
+};
+
+bool askDisplay() {
+    const char* plugin = std::getenv("QT_QPA_PLATFORM");
+    if (plugin != nullptr && *plugin != '\0') {
+        return true;
+    }
+    const char* wayland = std::getenv("WAYLAND_DISPLAY");
+    return (wayland != nullptr && *wayland != '\0') || canOpenDisplay();
+}
+
+void makeApplication() {
+    static int argc = 1;
+    static std::string name = moduleFileName(nullptr);
+    static char* argv[] = {name.data(), nullptr};
+    auto* application = new GuiApplication(argc, argv);
+    QApplication::setQuitOnLastWindowClosed(false);
+    QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, application,
+                     &runIdle);
+    // The toolkit has taken the process's locale from the environment; numbers keep their point.
+    std::setlocale(LC_NUMERIC, "C");
+    MessageQueue::instance().moveToThread(application->thread());
+}
+
+} // namespace
+
+bool hasDisplay() {
+    static const bool answer = askDisplay();
+    return answer;
+}
+
+bool ensureGui() {
+    if (QCoreApplication::instance() == nullptr) {
+        if (!hasDisplay()) {
+            return false;
+        }
+        makeApplication();
+    }
+    return true;
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,16 @@
+#pragma once
+
+/// @file
+/// The toolkit's application object, made when the first window is needed.
+
+#include "platform/base/Export.h"
+
+namespace tvx::afx {
+
+/// Whether windows can be shown: a display was asked for and answers, or the toolkit was told to do without one.
+/// Asks once and keeps the answer.
+TVX_PLATFORM_API bool hasDisplay();
+/// Makes the toolkit's application object if it does not stand yet. False when there is no display.
+TVX_PLATFORM_API bool ensureGui();
+
+} // namespace tvx::afx

@@ -1,0 +1,71 @@
+#pragma once
+
+/// @file
+/// The toolkit's two text fields, one line and many lines, seen alike. Positions are the toolkit's: units of UTF-16, a
+/// line's end counting as one.
+
+#include <QMenu>
+#include <QString>
+
+#include <functional>
+#include <memory>
+#include <vector>
+
+class QWidget;
+
+namespace tvx::afx {
+
+/// A stretch of text; the caret stands at `caret`.
+struct TextRange {
+    int anchor = 0;
+    int caret = 0;
+    int first() const {
+        return std::min(anchor, caret);
+    }
+    int last() const {
+        return std::max(anchor, caret);
+    }
+};
+
+/// What an edit control needs of a text field.
+class TextField {
+public:
+    virtual ~TextField() = default;
+    virtual QWidget* widget() const = 0;
+    virtual QString text() const = 0;
+    virtual void setText(const QString& text) = 0;
+    virtual TextRange selection() const = 0;
+    virtual void select(const TextRange& range) = 0;
+    /// Replaces the selection; can be undone.
+    virtual void insert(const QString& text) = 0;
+    virtual void undo() = 0;
+    virtual bool canUndo() const = 0;
+    virtual void forgetUndo() = 0;
+    virtual bool isModified() const = 0;
+    virtual void setModified(bool modified) = 0;
+    virtual void setReadOnly(bool readOnly) = 0;
+    virtual void setPassword(bool password) = 0;
+    virtual void setAlignment(Qt::Alignment alignment) = 0;
+    virtual void setFrame(bool frame) = 0;
+    virtual void cut() = 0;
+    virtual void copy() = 0;
+    /// Where each line begins, wrapped ones counted singly.
+    virtual std::vector<int> lineStarts() const = 0;
+    virtual int firstVisibleLine() const = 0;
+    virtual void scrollLines(int lines) = 0;
+    virtual void showCaret() = 0;
+    virtual QMenu* makeMenu() = 0;
+};
+
+/// A field of one line. `changed` is called after each change of the text.
+std::unique_ptr<TextField> makeLineField(QWidget* parent, std::function<void()> changed);
+
+struct AreaOptions {
+    bool wraps = true;
+    bool verticalBar = false;
+    bool horizontalBar = false;
+};
+/// A field of many lines.
+std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed);
+
+} // namespace tvx::afx

@@ -1,0 +1,7 @@
+#pragma once
+
+/// @file
+/// The framework's ready-made dialogs.
+
+#include "afxwin.h"
+#include "platform/afx/FileDialog.h"

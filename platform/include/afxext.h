@@ -1,0 +1,9 @@
+#pragma once
+
+/// @file
+/// The framework's bars.
+
+#include "afxwin.h"
+#include "platform/afx/ControlBar.h"
+#include "platform/afx/StatusBar.h"
+#include "platform/afx/ToolBar.h"

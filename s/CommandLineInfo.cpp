@@ -1,0 +1,97 @@
+#include "s/CommandLineInfo.h"
+
+#include "platform/base/Text.h"
+#include "s/CommandLineState.h"
+#include "s/Record.h"
+
+#include <iterator>
+
+Gui_CommandLineInfo::Gui_CommandLineInfo() : m_impl(MakeRecord<Gui_CommandLineInfo_Impl>()) {}
+
+Gui_CommandLineInfo::~Gui_CommandLineInfo() = default;
+
+void Gui_CommandLineInfo::ParseParam(const char* param, BOOL isSwitch, BOOL isLast) {
+    if (!m_impl->ParseParam(*this, param, isSwitch))
+        CCommandLineInfo::ParseParam(param, isSwitch, isLast);
+    if (m_impl->IsNoSplashSwitch())
+        m_bShowSplash = FALSE;
+}
+
+int Gui_CommandLineInfo::IsSmokeTestSwitch() const {
+    return m_impl->IsSmokeTestSwitch();
+}
+
+int Gui_CommandLineInfo::IsHelpSwitch() const {
+    return m_impl->IsHelpSwitch();
+}
+
+Gui_CommandLineInfo::IntStyleEnum Gui_CommandLineInfo::GetStyleSwitch() const {
+    return m_impl->GetStyleSwitch();
+}
+
+Gui_CommandLineInfo_Impl::~Gui_CommandLineInfo_Impl() {
+    IssueCommandFileProblems(m_problems);
+}
+
+int Gui_CommandLineInfo_Impl::IsSmokeTestSwitch() const {
+    return m_smokeTest;
+}
+
+int Gui_CommandLineInfo_Impl::IsHelpSwitch() const {
+    return m_help;
+}
+
+int Gui_CommandLineInfo_Impl::IsNoSplashSwitch() const {
+    return m_noSplash;
+}
+
+Gui_CommandLineInfo_Impl::IntStyleEnum Gui_CommandLineInfo_Impl::GetStyleSwitch() const {
+    return m_style;
+}
+
+bool Gui_CommandLineInfo_Impl::ParseParam(Gui_CommandLineInfo& owner, const char* param, BOOL isSwitch) {
+    if (isSwitch) {
+        m_expectation = Expectation::Nothing;
+        return ParseSwitch(param);
+    }
+    switch (m_expectation) {
+    case Expectation::Style:
+        ParseStyle(param);
+        return true;
+    case Expectation::CommandFile:
+        ExpandCommandFile(owner, param, m_problems);
+        return true;
+    case Expectation::Nothing:
+        break;
+    }
+    return false;
+}
+
+bool Gui_CommandLineInfo_Impl::ParseSwitch(const char* param) {
+    const auto is = [param](const char* name) { return tvx::text::equalNoCase(param, name); };
+    if (is("smoketest"))
+        m_smokeTest = 1;
+    else if (is("help") || is("h"))
+        m_help = 1;
+    else if (is("nosplash"))
+        m_noSplash = 1;
+    else if (is("intstyle"))
+        m_expectation = Expectation::Style;
+    else if (is("f"))
+        m_expectation = Expectation::CommandFile;
+    else
+        return false;
+    return true;
+}
+
+void Gui_CommandLineInfo_Impl::ParseStyle(const char* param) {
+    static constexpr const char* names[] = {"nev", "kelma", "silent"};
+    m_expectation = Expectation::Nothing;
+    for (std::size_t style = 0; style < std::size(names); ++style)
+        if (tvx::text::equalNoCase(param, names[style]))
+            m_style = static_cast<IntStyleEnum>(style);
+}
+
+void Gui_CommandLineInfo_Impl::ForgetProblems() {
+    m_problems.RemoveAll();
+}

@@ -1,0 +1,85 @@
+#include "s/WinApp.h"
+
+#include "platform/port/Exception.h"
+#include "res/resource.h"
+#include "s/Msg.h"
+#include "s/Record.h"
+#include "s/WinAppData.h"
+
+#include <cstdlib>
+#include <cstring>
+#include <exception>
+
+IMPLEMENT_DYNAMIC(Gui_WinApp, CWinApp)
+
+namespace {
+
+void issueFatal(int line) {
+    WinAppOrigin(line).issueFatal(
+        1, "This application has discovered an exceptional condition from which it cannot recover.");
+}
+
+/// Replaces one of the application object's texts.
+void replace(LPCSTR& place, LPCSTR text) {
+    LPCSTR old = place;
+    place = strdup(text);
+    std::free(const_cast<LPSTR>(old));
+}
+
+} // namespace
+
+Gui_WinApp::Gui_WinApp(const char* appName) : CWinApp(appName), m_data(MakeRecord<Gui_WinAppData>()) {}
+
+Gui_WinApp::~Gui_WinApp() = default;
+
+void Gui_WinApp::SetRegistryKey(const char* key) {
+    CWinApp::SetRegistryKey(key);
+    CString title;
+    if (!title.LoadString(AFX_IDS_APP_TITLE))
+        title = AfxGetAppName();
+    Gui_Msg displayName(GUI_IDS_FAMILY_TITLE);
+    displayName << title;
+    replace(m_pszAppName, displayName);
+    replace(m_pszProfileName, title);
+}
+
+int Gui_WinApp::Run() {
+    int result = 1;
+    try {
+        result = CWinApp::Run();
+    } catch (const Port::Exception& exception) {
+        exception.report();
+        issueFatal(__LINE__);
+    } catch (const std::exception& exception) {
+        WinAppOrigin(__LINE__).issueError("%s", exception.what());
+        issueFatal(__LINE__);
+    } catch (CException* exception) {
+        exception->Delete();
+    } catch (...) {
+        issueFatal(__LINE__);
+    }
+    return result;
+}
+
+BOOL Gui_WinApp::PreTranslateMessage(MSG* message) {
+    return CWinApp::PreTranslateMessage(message);
+}
+
+BOOL Gui_WinApp::InitApplication() {
+    return CWinApp::InitApplication();
+}
+
+void Gui_WinApp::DoWaitCursor(int code) {
+    CWinApp::DoWaitCursor(code);
+    POINT position;
+    if (code <= 0 && GetCursorPos(&position))
+        SetCursorPos(position.x, position.y);
+}
+
+void Gui_WinApp::WinHelpA(DWORD_PTR data, UINT command) {
+    CWinApp::WinHelpA(data, command);
+}
+
+void Gui_WinApp::WinHelpInternal(DWORD_PTR data, UINT command) {
+    WinHelpA(data, command);
+}

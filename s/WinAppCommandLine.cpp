@@ -1,0 +1,72 @@
+// The check of the command line.
+#include "s/WinApp.h"
+
+#include "platform/port/CmdArgs.h"
+#include "platform/port/CmdOpcodes.h"
+#include "platform/port/MsgDispatcher.h"
+#include "s/CommandLineState.h"
+#include "s/MessageManager.h"
+#include "s/WinAppData.h"
+
+#include <cstdlib>
+#include <memory>
+
+namespace {
+
+/// Whose messages the functions below collect: message managers take plain functions.
+Gui_WinAppData* s_target = nullptr;
+
+void showError(CString text) {
+    s_target->pending += text;
+    AfxMessageBox(s_target->pending, MB_ICONERROR);
+}
+
+void collectStatus(CString line) {
+    s_target->pending += line;
+    s_target->pending += '\n';
+}
+
+void issueUsageText() {
+    WinAppOrigin(__LINE__).issueStatus("%s", s_target->usageText.GetString());
+}
+
+void issueUsageSummary(const CString& opcodes) {
+    const std::unique_ptr<char, decltype(&std::free)> usage(UT_CMDOPCODES(opcodes).usage(), &std::free);
+    if (usage)
+        WinAppOrigin(__LINE__).issueStatus("%s\n", usage.get());
+}
+
+/// Checks the words and leaves what there is to say in the target's pending text.
+void check(Gui_CmdLineArgsArray& arguments, const CString& opcodes) {
+    Gui_MessageManager manager(&showError, &collectStatus);
+    Port_MsgDispatcher::addMsgMan(&manager);
+    IssueCommandFileProblems(arguments.GetProblems());
+    if (arguments.GetCount() > 0) {
+        const UT_CMDARGS parser(arguments.GetCount(), arguments.GetVector(), opcodes, &issueUsageText,
+                                UT_CMDARGS::NoProgramName);
+        if (!parser.gaveusage() && parser.iserror()) {
+            issueUsageSummary(opcodes);
+            issueUsageText();
+        }
+    }
+    Port_MsgDispatcher::removeMsgMan(&manager);
+}
+
+} // namespace
+
+int Gui_WinApp::ProcessCommandLine(const Gui_CommandLineInfo& info) {
+    s_target = m_data.get();
+    Gui_CmdLineArgsArray arguments;
+    // They are those that the collector has met too, and are reported from there.
+    info.m_impl->ForgetProblems();
+    if (arguments.GetCount() > 0 || arguments.GetProblems().GetSize() > 0) {
+        m_data->usageText = info.GetUsageText();
+        check(arguments, info.GetCmdOpcodes());
+    }
+    if (!m_data->pending.IsEmpty()) {
+        AfxMessageBox(m_data->pending);
+        m_data->pending.Empty();
+        return 0;
+    }
+    return info.IsSmokeTestSwitch() ? 0 : 1;
+}

@@ -1,0 +1,15 @@
+#pragma once
+
+#include "afx.h"
+#include "platform/port/MsgManData.h"
+
+/// What the application object keeps for itself.
+struct Gui_WinAppData {
+    CString usageText; ///< the host's text behind the usage summary
+    CString pending;   ///< messages of the command-line check that are still to be shown
+};
+
+/// The origin of the messages that the application object issues.
+inline Port_MsgManData WinAppOrigin(int line) {
+    return Port_MsgManData::createObject("GuiUtilities", "../s/WinApp", line, "$Revision");
+}

@@ -1,0 +1,76 @@
+// What shapes the file dialogs.
+#include "s/WinApp.h"
+
+#include "afxdlgs.h"
+
+HWND Gui_WinApp::GetOwnerForFileDialog() {
+    const CWinThread* thread = AfxGetThread();
+    return thread && thread->m_pMainWnd ? thread->m_pMainWnd->m_hWnd : nullptr;
+}
+
+CString Gui_WinApp::GetInitialDirForFileDialog(const CString&) {
+    return CString();
+}
+
+CString Gui_WinApp::GetBaseNameForFileDialog(const CString& fileName) {
+    return fileName;
+}
+
+CString Gui_WinApp::GetFilterForFileDialog(CDocTemplate* docTemplate, int addAllFiles) {
+    CString filter;
+    if (docTemplate)
+        AddFileFilter(filter, docTemplate);
+    for (POSITION at = docTemplate ? nullptr : GetFirstDocTemplatePosition(); at;)
+        AddFileFilter(filter, GetNextDocTemplate(at));
+    if (addAllFiles)
+        AddFileFilter(filter, AFX_IDS_ALLFILTER, "*.*");
+    return filter;
+}
+
+CString Gui_WinApp::GetDefaultExtForFileDialog(CDocTemplate* docTemplate) {
+    POSITION first = docTemplate ? nullptr : GetFirstDocTemplatePosition();
+    if (first)
+        docTemplate = GetNextDocTemplate(first);
+    CString extension;
+    if (docTemplate)
+        docTemplate->GetDocString(extension, CDocTemplate::filterExt);
+    return extension.Mid(1);
+}
+
+CString Gui_WinApp::GetTitleForFileDialog(unsigned int titleId) {
+    CString title;
+    (void)title.LoadString(titleId);
+    return title;
+}
+
+unsigned int Gui_WinApp::GetFlagsForFileDialog(unsigned int flags) {
+    return flags & ~OFN_SHOWHELP;
+}
+
+CString Gui_WinApp::GetPathNameFromFileDialog(CFileDialog& dialog) {
+    return dialog.GetPathName();
+}
+
+void Gui_WinApp::AddFileFilter(CString& filter, const CString& description, const CString& pattern) {
+    // The new entry follows the zero that ends the one before.
+    if (filter.GetLength() >= 2 && filter.View().ends_with(std::string_view("\0\0", 2)))
+        filter.Truncate(filter.GetLength() - 1);
+    filter += description;
+    filter += '\0';
+    filter += pattern;
+    filter.Append("\0\0", 2);
+}
+
+void Gui_WinApp::AddFileFilter(CString& filter, unsigned int descriptionId, const CString& pattern) {
+    CString description;
+    (void)description.LoadString(descriptionId);
+    AddFileFilter(filter, description, pattern);
+}
+
+void Gui_WinApp::AddFileFilter(CString& filter, CDocTemplate* docTemplate) {
+    CString name;
+    CString extension;
+    if (docTemplate->GetDocString(name, CDocTemplate::filterName) && !name.IsEmpty() &&
+        docTemplate->GetDocString(extension, CDocTemplate::filterExt) && !extension.IsEmpty())
+        AddFileFilter(filter, name, '*' + extension);
+}
