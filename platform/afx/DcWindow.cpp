@@ -121,3 +121,11 @@ CPaintDC::~CPaintDC() {
     Detach();
     ::EndPaint(m_hWnd, &m_ps);
 }
+
+namespace tvx::afx {
+
+CDC* contextOf(HDC handle) {
+    return CDC::FromHandle(handle);
+}
+
+} // namespace tvx::afx
