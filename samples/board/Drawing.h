@@ -1,0 +1,104 @@
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// @file
+/// Drawings and their text format (docs/drawing-format.md). Nothing in here knows of windows.
+
+namespace board {
+
+enum class ShapeKind { rectangle, ellipse, line, text };
+
+/// 0xRRGGBB, or noColor for a shape that is not filled.
+using Color = std::uint32_t;
+inline constexpr Color noColor = 0xFF000000;
+
+/// Coordinates reach from -maxCoordinate to maxCoordinate, in pixels.
+inline constexpr int maxCoordinate = 100000;
+/// Limits of Shape::size, in pixels.
+inline constexpr int minTextSize = 4;
+inline constexpr int maxTextSize = 400;
+
+struct Point {
+    int x = 0;
+    int y = 0;
+    bool operator==(const Point&) const = default;
+};
+
+/// One shape of a drawing. Two points carry it: the ends of a line, opposite corners of the box of all others.
+struct Shape {
+    ShapeKind kind = ShapeKind::rectangle;
+    Point from;
+    Point to;
+    Color color = 0;         ///< Of the outline, or of the text.
+    Color fill = noColor;    ///< Of the area; lines have none.
+    int width = 1;           ///< Of the outline, 1 to 20 pixels.
+    int size = 16;           ///< Height of a text's characters.
+    std::string text;        ///< UTF-8, may hold line ends. Of texts only.
+    std::string linesBefore; ///< Comments and empty lines that stand before the shape in the file, as they are.
+
+    /// Whether a click at @p point means this shape: on or near a line, anywhere inside of the others.
+    [[nodiscard]] bool contains(Point point) const;
+    /// Moves the shape by the distance; it stops at the limits of coordinates without changing its size.
+    void moveBy(int dx, int dy);
+
+    bool operator==(const Shape&) const = default;
+};
+
+/// The shapes, the lowest first, and what else stands in the file.
+struct Drawing {
+    std::vector<Shape> shapes;
+    std::string linesAfter; ///< Comments and empty lines behind the last shape.
+
+    /// The number of the topmost shape at @p point, -1 for none.
+    [[nodiscard]] int shapeAt(Point point) const;
+    /// The lower right corner of all that is drawn, at least (0, 0).
+    [[nodiscard]] Point extent() const;
+
+    bool operator==(const Drawing&) const = default;
+};
+
+/// What reading gives: a drawing, or what is wrong and where.
+struct ReadResult {
+    Drawing drawing;
+    int line = 0;       ///< Of the first fault, counted from 1; 0 when there is none.
+    std::string reason; ///< A sentence for the user.
+
+    [[nodiscard]] bool ok() const {
+        return line == 0;
+    }
+};
+
+/// Reads the text of a drawing. A drawing with a fault is refused as a whole, so that saving cannot lose what was not
+/// understood.
+[[nodiscard]] ReadResult readDrawing(std::string_view text);
+
+/// The text of a drawing; reading it gives the same drawing.
+[[nodiscard]] std::string writeDrawing(const Drawing& drawing);
+
+/// The states of a drawing that Undo and Redo go through.
+class History {
+public:
+    /// Forgets everything.
+    void clear();
+    /// Remembers the state before a change; states that were undone are forgotten.
+    void remember(Drawing before);
+    [[nodiscard]] bool canUndo() const {
+        return !m_past.empty();
+    }
+    [[nodiscard]] bool canRedo() const {
+        return !m_future.empty();
+    }
+    /// Exchanges @p current for the state before, or the one after. Nothing happens when there is none.
+    void undo(Drawing& current);
+    void redo(Drawing& current);
+
+private:
+    std::vector<Drawing> m_past;
+    std::vector<Drawing> m_future;
+};
+
+} // namespace board
