@@ -54,8 +54,8 @@ void Shape::moveBy(int dx, int dy) {
 }
 
 int Drawing::shapeAt(Point point) const {
-    const auto found = std::find_if(shapes.rbegin(), shapes.rend(),
-                                    [point](const Shape& shape) { return shape.contains(point); });
+    const auto found =
+        std::find_if(shapes.rbegin(), shapes.rend(), [point](const Shape& shape) { return shape.contains(point); });
     return static_cast<int>(shapes.rend() - found) - 1;
 }
 

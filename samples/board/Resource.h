@@ -21,7 +21,7 @@
 #define ID_TOOL_LINE 32773
 #define ID_TOOL_TEXT 32774
 
-/* Colours and fills, in the order of the tables in BoardColors.cpp. */
+/* Colours and fills, in the order of the tables in BoardColors.h. */
 #define ID_COLOR_FIRST 32780
 #define ID_COLOR_LAST 32785
 #define ID_FILL_FIRST 32790

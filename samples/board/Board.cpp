@@ -1,0 +1,132 @@
+#include "Board.h"
+
+#include "BoardDoc.h"
+#include "BoardView.h"
+#include "MainFrame.h"
+#include "Resource.h"
+#include "platform/port/CmdOpcodes.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <cstring>
+
+// --- the command line ---
+
+void CBoardCommandLine::ParseParam(const char* param, BOOL isSwitch, BOOL isLast) {
+    if (isSwitch) {
+        const UT_CMDOPCODES options(GetCmdOpcodes());
+        const char* name = options.optionname(param);
+        m_gridFollows = name != nullptr && std::strcmp(name, "grid") == 0;
+    } else if (m_gridFollows) {
+        m_gridFollows = false;
+        m_grid = static_cast<int>(std::clamp(std::strtol(param, nullptr, 10), 0L, 1000L));
+        return;
+    }
+    const CString before = m_strFileName;
+    Gui_CommandLineInfo::ParseParam(param, isSwitch, isLast);
+    // The framework keeps the first plain word only, and takes words that are values of its own switches itself.
+    if (!isSwitch && m_strFileName != before) {
+        m_drawings.push_back(m_strFileName);
+        m_strFileName.Empty();
+    }
+}
+
+CString CBoardCommandLine::GetCmdOpcodes() const {
+    CString text;
+    text.LoadString(IDS_CMD_OPCODES);
+    return text;
+}
+
+CString CBoardCommandLine::GetUsageText() const {
+    CString text;
+    text.LoadString(IDS_USAGE);
+    return text;
+}
+
+// --- the About box ---
+
+namespace {
+
+class CAboutDialog : public CDialog {
+public:
+    CAboutDialog() : CDialog(IDD_ABOUT) {}
+
+protected:
+    BOOL OnInitDialog() override {
+        CDialog::OnInitDialog();
+        CString title;
+        title.Format("%s %s", theApp.m_pszAppName, theApp.GetAppVersion().GetString());
+        SetDlgItemText(IDC_VERSION, title);
+        return TRUE;
+    }
+};
+
+} // namespace
+
+// --- the application ---
+
+CBoardApp theApp;
+
+// clang-format off
+BEGIN_MESSAGE_MAP(CBoardApp, Gui_WinApp)
+    ON_COMMAND(ID_APP_ABOUT, &CBoardApp::OnAppAbout)
+    ON_COMMAND(ID_FILE_NEW, &CWinApp::OnFileNew)
+    ON_COMMAND(ID_FILE_OPEN, &CWinApp::OnFileOpen)
+END_MESSAGE_MAP()
+// clang-format on
+
+CBoardApp::CBoardApp() : Gui_WinApp("board") {}
+
+BOOL CBoardApp::InitInstance() {
+    SetRegistryKey("Tarvex");
+
+    CBoardCommandLine info;
+    ParseCommandLine(info);
+    if (!ProcessCommandLine(info)) {
+        return FALSE;
+    }
+    m_grid = info.m_grid;
+
+    AddDocTemplate(new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
+                                         RUNTIME_CLASS(CBoardView)));
+    auto* frame = new CMainFrame;
+    m_pMainWnd = frame;
+    if (!frame->LoadFrame(IDR_MAINFRAME)) {
+        return FALSE;
+    }
+    if (!OpenDrawings(info)) {
+        return FALSE;
+    }
+    frame->DragAcceptFiles();
+    frame->ShowWindow(m_nCmdShow);
+    frame->UpdateWindow();
+    return TRUE;
+}
+
+// One drawing that cannot be opened does not keep the others from being shown.
+BOOL CBoardApp::OpenDrawings(CBoardCommandLine& info) {
+    if (info.m_drawings.empty()) {
+        return ProcessShellCommand(info);
+    }
+    BOOL opened = FALSE;
+    for (const CString& drawing : info.m_drawings) {
+        info.m_nShellCommand = CCommandLineInfo::FileOpen;
+        info.m_strFileName = drawing;
+        opened |= ProcessShellCommand(info);
+    }
+    return opened;
+}
+
+HICON CBoardApp::GetAppIcon() {
+    return LoadIcon(IDR_MAINFRAME);
+}
+
+CString CBoardApp::GetAppVersion() {
+    CString version;
+    version.LoadString(IDS_VERSION);
+    return version;
+}
+
+void CBoardApp::OnAppAbout() {
+    CAboutDialog().DoModal();
+}

@@ -1,0 +1,44 @@
+#pragma once
+
+#include "s/CommandLineInfo.h"
+#include "s/WinApp.h"
+
+#include <vector>
+
+/// The command line of the board: the switches of the family, the grid, and any number of drawings.
+class CBoardCommandLine : public Gui_CommandLineInfo {
+public:
+    void ParseParam(const char* param, BOOL isSwitch, BOOL isLast) override;
+    CString GetCmdOpcodes() const override;
+    CString GetUsageText() const override;
+
+    /// Distance of the grid points in pixels; 0 for none.
+    int m_grid = 10;
+    /// The drawings to open, as they were named.
+    std::vector<CString> m_drawings;
+
+private:
+    /// Whether the next word is the value of `-grid`.
+    bool m_gridFollows = false;
+};
+
+/// The application object.
+class CBoardApp : public Gui_WinApp {
+public:
+    CBoardApp();
+    BOOL InitInstance() override;
+    HICON GetAppIcon() override;
+    CString GetAppVersion() override;
+
+    /// Distance of the grid points in pixels; 0 for none.
+    int m_grid = 10;
+
+    afx_msg void OnAppAbout();
+
+private:
+    BOOL OpenDrawings(CBoardCommandLine& info);
+
+    DECLARE_MESSAGE_MAP()
+};
+
+extern CBoardApp theApp;

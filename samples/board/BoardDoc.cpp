@@ -1,0 +1,135 @@
+#include "BoardDoc.h"
+
+#include "Resource.h"
+
+#include <string>
+#include <utility>
+
+namespace {
+
+constexpr ULONGLONG largestFile = 64 * 1024 * 1024;
+
+} // namespace
+
+IMPLEMENT_DYNCREATE(CBoardDoc, CDocument)
+
+// clang-format off
+BEGIN_MESSAGE_MAP(CBoardDoc, CDocument)
+    ON_COMMAND(ID_EDIT_UNDO, &CBoardDoc::OnEditUndo)
+    ON_COMMAND(ID_EDIT_REDO, &CBoardDoc::OnEditRedo)
+    ON_UPDATE_COMMAND_UI(ID_EDIT_UNDO, &CBoardDoc::OnUpdateEditUndo)
+    ON_UPDATE_COMMAND_UI(ID_EDIT_REDO, &CBoardDoc::OnUpdateEditRedo)
+END_MESSAGE_MAP()
+// clang-format on
+
+void CBoardDoc::Change(board::Drawing drawing) {
+    if (drawing == m_drawing) {
+        return;
+    }
+    m_history.remember(std::exchange(m_drawing, std::move(drawing)));
+    Changed();
+}
+
+void CBoardDoc::Changed() {
+    SetModifiedFlag(m_drawing != m_saved);
+    UpdateAllViews(nullptr);
+}
+
+void CBoardDoc::DeleteContents() {
+    m_drawing = {};
+    m_saved = {};
+    m_history.clear();
+}
+
+// --- the file ---
+
+BOOL CBoardDoc::OnOpenDocument(LPCSTR path) {
+    CFileException error;
+    CFile* file = GetFile(path, CFile::modeRead | CFile::shareDenyWrite, &error);
+    if (file == nullptr) {
+        ReportSaveLoadException(path, &error, FALSE, AFX_IDP_FAILED_TO_OPEN_DOC);
+        return FALSE;
+    }
+    std::string text;
+    try {
+        CWaitCursor wait;
+        const ULONGLONG length = file->GetLength();
+        if (length > largestFile) {
+            ReleaseFile(file, TRUE);
+            CString message;
+            message.Format(IDS_TOO_LARGE, path);
+            AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
+            return FALSE;
+        }
+        text.resize(length);
+        text.resize(file->Read(text.data(), static_cast<UINT>(length)));
+    } catch (CException* problem) {
+        ReleaseFile(file, TRUE);
+        ReportSaveLoadException(path, problem, FALSE, AFX_IDP_FAILED_TO_OPEN_DOC);
+        problem->Delete();
+        return FALSE;
+    }
+    ReleaseFile(file, FALSE);
+    return Take(path, text);
+}
+
+BOOL CBoardDoc::Take(const char* path, const std::string& text) {
+    board::ReadResult result = board::readDrawing(text);
+    if (!result.ok()) {
+        CString message;
+        message.Format(IDS_DAMAGED, path, result.line, result.reason.c_str());
+        AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
+        return FALSE;
+    }
+    DeleteContents();
+    m_drawing = std::move(result.drawing);
+    m_saved = m_drawing;
+    SetModifiedFlag(FALSE);
+    return TRUE;
+}
+
+// What GetFile gives is a new file beside the old one, whose place it takes in ReleaseFile: until all is written the
+// user's file stays as it is.
+BOOL CBoardDoc::OnSaveDocument(LPCSTR path) {
+    CFileException error;
+    CFile* file = GetFile(path, CFile::modeCreate | CFile::modeReadWrite | CFile::shareExclusive, &error);
+    if (file == nullptr) {
+        ReportSaveLoadException(path, &error, TRUE, AFX_IDP_INVALID_FILENAME);
+        return FALSE;
+    }
+    try {
+        CWaitCursor wait;
+        const std::string text = board::writeDrawing(m_drawing);
+        file->Write(text.data(), static_cast<UINT>(text.size()));
+        file->Close();
+    } catch (CException* problem) {
+        ReleaseFile(file, TRUE);
+        ReportSaveLoadException(path, problem, TRUE, AFX_IDP_FAILED_TO_SAVE_DOC);
+        problem->Delete();
+        return FALSE;
+    }
+    ReleaseFile(file, FALSE);
+    m_saved = m_drawing;
+    SetModifiedFlag(FALSE);
+    return TRUE;
+}
+
+// --- undo ---
+
+void CBoardDoc::OnEditUndo() {
+    m_history.undo(m_drawing);
+    Changed();
+}
+
+void CBoardDoc::OnEditRedo() {
+    m_history.redo(m_drawing);
+    Changed();
+}
+
+void CBoardDoc::OnUpdateEditUndo(CCmdUI* item) {
+    item->Enable(m_history.canUndo());
+}
+
+void CBoardDoc::OnUpdateEditRedo(CCmdUI* item) {
+    item->Enable(m_history.canRedo());
+}

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "Drawing.h"
+#include "afxwin.h"
+
+/// A drawing, with its file and the states that Undo goes through.
+class CBoardDoc : public CDocument {
+    DECLARE_DYNCREATE(CBoardDoc)
+
+public:
+    const board::Drawing& GetDrawing() const {
+        return m_drawing;
+    }
+    /// Replaces the drawing, as a change that can be undone.
+    void Change(board::Drawing drawing);
+
+    BOOL OnOpenDocument(LPCSTR path) override;
+    BOOL OnSaveDocument(LPCSTR path) override;
+    void DeleteContents() override;
+
+    afx_msg void OnEditUndo();
+    afx_msg void OnEditRedo();
+    afx_msg void OnUpdateEditUndo(CCmdUI* item);
+    afx_msg void OnUpdateEditRedo(CCmdUI* item);
+
+private:
+    /// Adopts what was read, or tells the user what is wrong with it.
+    BOOL Take(const char* path, const std::string& text);
+    void Changed();
+
+    board::Drawing m_drawing;
+    board::Drawing m_saved; ///< As the file has it.
+    board::History m_history;
+
+    DECLARE_MESSAGE_MAP()
+};

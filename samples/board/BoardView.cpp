@@ -1,0 +1,435 @@
+#include "BoardView.h"
+
+#include "Board.h"
+#include "BoardColors.h"
+#include "Resource.h"
+#include "ShapePainter.h"
+#include "TextDialog.h"
+
+#include <algorithm>
+#include <array>
+
+using namespace board;
+
+namespace {
+
+/// Half the width of a handle, in pixels.
+constexpr int handleReach = 4;
+/// A drag shorter than this draws nothing, in pixels.
+constexpr int leastDrag = 4;
+
+std::array<Point, 4> cornersOf(const Shape& shape) {
+    return {{shape.from, {shape.to.x, shape.from.y}, shape.to, {shape.from.x, shape.to.y}}};
+}
+
+bool hasHandle(const Shape& shape, std::size_t handle) {
+    return shape.kind != ShapeKind::line || handle % 2 == 0;
+}
+
+void moveHandle(Shape& shape, int handle, Point point) {
+    point.x = std::clamp(point.x, -maxCoordinate, maxCoordinate);
+    point.y = std::clamp(point.y, -maxCoordinate, maxCoordinate);
+    (handle == 0 || handle == 3 ? shape.from.x : shape.to.x) = point.x;
+    (handle == 0 || handle == 1 ? shape.from.y : shape.to.y) = point.y;
+}
+
+bool isTiny(const Shape& shape) {
+    return std::abs(shape.to.x - shape.from.x) < leastDrag && std::abs(shape.to.y - shape.from.y) < leastDrag;
+}
+
+} // namespace
+
+IMPLEMENT_DYNCREATE(CBoardView, CScrollView)
+
+// clang-format off
+BEGIN_MESSAGE_MAP(CBoardView, CScrollView)
+    ON_WM_LBUTTONDOWN()
+    ON_WM_MOUSEMOVE()
+    ON_WM_LBUTTONUP()
+    ON_WM_LBUTTONDBLCLK()
+    ON_WM_CAPTURECHANGED()
+    ON_WM_CONTEXTMENU()
+    ON_WM_KEYDOWN()
+    ON_WM_SETCURSOR()
+    ON_COMMAND_RANGE(ID_TOOL_SELECT, ID_TOOL_TEXT, &CBoardView::OnTool)
+    ON_UPDATE_COMMAND_UI_RANGE(ID_TOOL_SELECT, ID_TOOL_TEXT, &CBoardView::OnUpdateTool)
+    ON_COMMAND_RANGE(ID_COLOR_FIRST, ID_COLOR_LAST, &CBoardView::OnColor)
+    ON_UPDATE_COMMAND_UI_RANGE(ID_COLOR_FIRST, ID_COLOR_LAST, &CBoardView::OnUpdateColor)
+    ON_COMMAND_RANGE(ID_FILL_FIRST, ID_FILL_LAST, &CBoardView::OnFill)
+    ON_UPDATE_COMMAND_UI_RANGE(ID_FILL_FIRST, ID_FILL_LAST, &CBoardView::OnUpdateFill)
+    ON_COMMAND(ID_EDIT_CLEAR, &CBoardView::OnEditClear)
+    ON_COMMAND(ID_SHAPE_EDIT_TEXT, &CBoardView::OnEditText)
+    ON_COMMAND(ID_SHAPE_TO_FRONT, &CBoardView::OnToFront)
+    ON_COMMAND(ID_SHAPE_TO_BACK, &CBoardView::OnToBack)
+    ON_UPDATE_COMMAND_UI(ID_EDIT_CLEAR, &CBoardView::OnUpdateSelected)
+    ON_UPDATE_COMMAND_UI(ID_SHAPE_TO_FRONT, &CBoardView::OnUpdateSelected)
+    ON_UPDATE_COMMAND_UI(ID_SHAPE_TO_BACK, &CBoardView::OnUpdateSelected)
+    ON_UPDATE_COMMAND_UI(ID_SHAPE_EDIT_TEXT, &CBoardView::OnUpdateEditText)
+    ON_UPDATE_COMMAND_UI(ID_INDICATOR_POSITION, &CBoardView::OnUpdatePosition)
+END_MESSAGE_MAP()
+// clang-format on
+
+BOOL CBoardView::PreCreateWindow(CREATESTRUCT& cs) {
+    if (!CScrollView::PreCreateWindow(cs)) {
+        return FALSE;
+    }
+    cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, theApp.LoadStandardCursor(IDC_ARROW),
+                                       static_cast<HBRUSH>(GetStockObject(WHITE_BRUSH)));
+    return TRUE;
+}
+
+// --- showing ---
+
+void CBoardView::OnInitialUpdate() {
+    ShowScrollArea(); // before the base class, which draws
+    CScrollView::OnInitialUpdate();
+}
+
+void CBoardView::OnUpdate(CView*, LPARAM, CObject*) {
+    if (m_selected >= static_cast<int>(GetDocument()->GetDrawing().shapes.size())) {
+        m_selected = -1;
+    }
+    ShowScrollArea();
+    Invalidate();
+}
+
+void CBoardView::ShowScrollArea() {
+    constexpr int margin = 20;
+    const Point corner = GetDocument()->GetDrawing().extent();
+    SetScrollSizes(MM_TEXT, CSize(corner.x + margin, corner.y + margin));
+}
+
+void CBoardView::OnDraw(CDC* dc) {
+    DrawGrid(*dc);
+    const auto& shapes = GetDocument()->GetDrawing().shapes;
+    for (int i = 0; i < static_cast<int>(shapes.size()); ++i) {
+        const bool drafted = m_draft && !m_draftIsNew && i == m_selected;
+        DrawShape(*dc, drafted ? *m_draft : shapes[i]);
+    }
+    if (m_draft && m_draftIsNew) {
+        DrawShape(*dc, *m_draft);
+    }
+    if (const Shape* shape = m_draft ? &*m_draft : Selected()) {
+        DrawHandles(*dc, *shape);
+    }
+}
+
+void CBoardView::DrawGrid(CDC& dc) const {
+    const int step = theApp.m_grid;
+    if (step < 4) { // closer points would be a grey area
+        return;
+    }
+    CRect area;
+    dc.GetClipBox(area);
+    for (int y = area.top - area.top % step; y < area.bottom; y += step) {
+        for (int x = area.left - area.left % step; x < area.right; x += step) {
+            dc.SetPixelV(x, y, RGB(200, 205, 210));
+        }
+    }
+}
+
+void CBoardView::DrawHandles(CDC& dc, const Shape& shape) const {
+    const auto corners = cornersOf(shape);
+    for (std::size_t i = 0; i < corners.size(); ++i) {
+        if (hasHandle(shape, i)) {
+            CRect handle(CPoint(corners[i].x, corners[i].y), CSize(1, 1));
+            handle.InflateRect(handleReach, handleReach);
+            dc.FillSolidRect(handle, RGB(32, 64, 128));
+            handle.DeflateRect(1, 1);
+            dc.FillSolidRect(handle, RGB(255, 255, 255));
+        }
+    }
+}
+
+Point CBoardView::ToDrawing(CPoint point) const {
+    point += GetScrollPosition();
+    return {point.x, point.y};
+}
+
+Point CBoardView::Snapped(Point point) const {
+    const int step = std::max(theApp.m_grid, 1);
+    const auto snap = [step](int value) { return (value + (value < 0 ? -step : step) / 2) / step * step; };
+    return {snap(point.x), snap(point.y)};
+}
+
+// --- selecting ---
+
+const Shape* CBoardView::Selected() const {
+    return m_selected < 0 ? nullptr : &GetDocument()->GetDrawing().shapes[m_selected];
+}
+
+void CBoardView::Select(int index) {
+    if (index != m_selected) {
+        m_selected = index;
+        Invalidate();
+    }
+}
+
+int CBoardView::HandleAt(Point point) const {
+    const Shape* shape = Selected();
+    if (shape == nullptr) {
+        return -1;
+    }
+    const auto corners = cornersOf(*shape);
+    for (std::size_t i = 0; i < corners.size(); ++i) {
+        const bool near =
+            std::abs(corners[i].x - point.x) <= handleReach && std::abs(corners[i].y - point.y) <= handleReach;
+        if (near && hasHandle(*shape, i)) {
+            return static_cast<int>(i);
+        }
+    }
+    return -1;
+}
+
+// --- the mouse ---
+
+void CBoardView::OnLButtonDown(UINT, CPoint point) {
+    const Point place = ToDrawing(point);
+    if (m_tool == Tool::select) {
+        StartSelecting(place);
+    } else {
+        StartDrawing(Snapped(place));
+    }
+}
+
+void CBoardView::StartSelecting(Point point) {
+    if (const int handle = HandleAt(point); handle >= 0) {
+        StartDrag(Drag::resize, handle, point);
+        return;
+    }
+    Select(GetDocument()->GetDrawing().shapeAt(point));
+    if (m_selected >= 0) {
+        StartDrag(Drag::move, -1, Snapped(point));
+    }
+}
+
+void CBoardView::StartDrawing(Point point) {
+    Select(-1);
+    Shape shape;
+    shape.kind = static_cast<ShapeKind>(static_cast<int>(m_tool) - 1);
+    shape.from = shape.to = point;
+    shape.color = m_color;
+    shape.fill = shape.kind == ShapeKind::line ? noColor : m_fill;
+    shape.width = shape.kind == ShapeKind::text ? 1 : 2;
+    StartDrag(Drag::resize, 2, point);
+    m_draft = std::move(shape);
+    m_draftIsNew = true;
+}
+
+void CBoardView::StartDrag(Drag drag, int handle, Point point) {
+    m_drag = drag;
+    m_handle = handle;
+    m_last = point;
+    m_draftIsNew = false;
+    if (const Shape* shape = Selected()) {
+        m_draft = *shape;
+    }
+    SetCapture();
+}
+
+void CBoardView::OnMouseMove(UINT, CPoint point) {
+    m_pointer = ToDrawing(point);
+    if (m_drag == Drag::none || !m_draft) {
+        return;
+    }
+    const Point place = Snapped(m_pointer);
+    if (m_drag == Drag::move) {
+        m_draft->moveBy(place.x - m_last.x, place.y - m_last.y);
+    } else if (!(place == m_last)) {
+        moveHandle(*m_draft, m_handle, place);
+    }
+    m_last = place;
+    Invalidate();
+}
+
+void CBoardView::OnLButtonUp(UINT, CPoint) {
+    if (m_drag != Drag::none) {
+        EndDrag(true);
+    }
+}
+
+// The capture also goes when another window or a message box comes up: the drag is given up then.
+void CBoardView::OnCaptureChanged(CWnd*) {
+    if (m_drag != Drag::none) {
+        EndDrag(false);
+    }
+}
+
+void CBoardView::EndDrag(bool keep) {
+    m_drag = Drag::none;
+    if (GetCapture() == this) {
+        ReleaseCapture();
+    }
+    if (keep && m_draft) {
+        KeepDraft();
+    }
+    m_draft.reset();
+    Invalidate();
+}
+
+void CBoardView::KeepDraft() {
+    Shape shape = *m_draft;
+    if (!m_draftIsNew) {
+        ReplaceSelected(std::move(shape));
+        return;
+    }
+    m_tool = Tool::select;
+    if (isTiny(shape)) {
+        return;
+    }
+    if (shape.kind == ShapeKind::text) {
+        CTextDialog dialog("", this);
+        if (dialog.DoModal() != IDOK || dialog.GetText().IsEmpty()) {
+            return;
+        }
+        shape.text = dialog.GetText().GetString();
+    }
+    Drawing drawing = GetDocument()->GetDrawing();
+    drawing.shapes.push_back(std::move(shape));
+    m_selected = static_cast<int>(drawing.shapes.size()) - 1;
+    GetDocument()->Change(std::move(drawing));
+}
+
+void CBoardView::ReplaceSelected(Shape shape) {
+    Drawing drawing = GetDocument()->GetDrawing();
+    drawing.shapes[m_selected] = std::move(shape);
+    GetDocument()->Change(std::move(drawing));
+}
+
+void CBoardView::OnLButtonDblClk(UINT flags, CPoint point) {
+    OnLButtonDown(flags, point);
+    if (m_tool == Tool::select && Selected() != nullptr && Selected()->kind == ShapeKind::text) {
+        EndDrag(false);
+        OnEditText();
+    }
+}
+
+void CBoardView::OnContextMenu(CWnd*, CPoint point) {
+    CPoint inside = point;
+    ScreenToClient(&inside);
+    if (point == CPoint(-1, -1)) { // asked for with the keyboard
+        inside = CPoint(10, 10);
+        point = inside;
+        ClientToScreen(&point);
+    } else {
+        Select(GetDocument()->GetDrawing().shapeAt(ToDrawing(inside)));
+    }
+    CMenu menu;
+    menu.LoadMenu(IDR_CONTEXT);
+    menu.GetSubMenu(0)->TrackPopupMenu(TPM_LEFTALIGN | TPM_RIGHTBUTTON, point.x, point.y, GetTopLevelFrame());
+}
+
+BOOL CBoardView::OnSetCursor(CWnd* window, UINT hitTest, UINT message) {
+    if (hitTest != HTCLIENT || m_tool == Tool::select) {
+        return CScrollView::OnSetCursor(window, hitTest, message);
+    }
+    ::SetCursor(theApp.LoadStandardCursor(IDC_CROSS));
+    return TRUE;
+}
+
+void CBoardView::OnKeyDown(UINT key, UINT repeat, UINT flags) {
+    if (key == VK_ESCAPE) {
+        m_tool = Tool::select;
+        EndDrag(false);
+        Select(-1);
+        return;
+    }
+    const int dx = key == VK_LEFT ? -1 : key == VK_RIGHT ? 1 : 0;
+    const int dy = key == VK_UP ? -1 : key == VK_DOWN ? 1 : 0;
+    if (Selected() == nullptr || (dx == 0 && dy == 0)) {
+        CScrollView::OnKeyDown(key, repeat, flags);
+        return;
+    }
+    Shape shape = *Selected();
+    shape.moveBy(dx * static_cast<int>(repeat), dy * static_cast<int>(repeat));
+    ReplaceSelected(std::move(shape));
+}
+
+// --- commands ---
+
+void CBoardView::OnTool(UINT id) {
+    m_tool = static_cast<Tool>(id - ID_TOOL_SELECT);
+    Select(-1);
+}
+
+void CBoardView::OnUpdateTool(CCmdUI* item) {
+    item->Enable();
+    item->SetRadio(static_cast<UINT>(m_tool) == item->m_nID - ID_TOOL_SELECT);
+}
+
+void CBoardView::OnColor(UINT id) {
+    m_color = outlineColors[id - ID_COLOR_FIRST];
+    if (Selected() != nullptr) {
+        Shape shape = *Selected();
+        shape.color = m_color;
+        ReplaceSelected(std::move(shape));
+    }
+}
+
+void CBoardView::OnUpdateColor(CCmdUI* item) {
+    const Color shown = Selected() != nullptr ? Selected()->color : m_color;
+    item->SetRadio(shown == outlineColors[item->m_nID - ID_COLOR_FIRST]);
+}
+
+void CBoardView::OnFill(UINT id) {
+    m_fill = fillColors[id - ID_FILL_FIRST];
+    if (Selected() != nullptr && Selected()->kind != ShapeKind::line) {
+        Shape shape = *Selected();
+        shape.fill = m_fill;
+        ReplaceSelected(std::move(shape));
+    }
+}
+
+void CBoardView::OnUpdateFill(CCmdUI* item) {
+    const Color shown = Selected() != nullptr ? Selected()->fill : m_fill;
+    item->SetRadio(shown == fillColors[item->m_nID - ID_FILL_FIRST]);
+}
+
+void CBoardView::OnEditClear() {
+    Drawing drawing = GetDocument()->GetDrawing();
+    // The comments before the shape stay, with the shape that follows it.
+    const auto shape = drawing.shapes.begin() + m_selected;
+    std::string& after = shape + 1 == drawing.shapes.end() ? drawing.linesAfter : (shape + 1)->linesBefore;
+    after.insert(0, shape->linesBefore);
+    drawing.shapes.erase(shape);
+    m_selected = -1;
+    GetDocument()->Change(std::move(drawing));
+}
+
+void CBoardView::OnEditText() {
+    Shape shape = *Selected();
+    CTextDialog dialog(shape.text.c_str(), this);
+    if (dialog.DoModal() == IDOK) {
+        shape.text = dialog.GetText().GetString();
+        ReplaceSelected(std::move(shape));
+    }
+}
+
+void CBoardView::OnToFront() {
+    Drawing drawing = GetDocument()->GetDrawing();
+    std::rotate(drawing.shapes.begin() + m_selected, drawing.shapes.begin() + m_selected + 1, drawing.shapes.end());
+    m_selected = static_cast<int>(drawing.shapes.size()) - 1;
+    GetDocument()->Change(std::move(drawing));
+}
+
+void CBoardView::OnToBack() {
+    Drawing drawing = GetDocument()->GetDrawing();
+    std::rotate(drawing.shapes.begin(), drawing.shapes.begin() + m_selected, drawing.shapes.begin() + m_selected + 1);
+    m_selected = 0;
+    GetDocument()->Change(std::move(drawing));
+}
+
+void CBoardView::OnUpdateSelected(CCmdUI* item) {
+    item->Enable(Selected() != nullptr);
+}
+
+void CBoardView::OnUpdateEditText(CCmdUI* item) {
+    item->Enable(Selected() != nullptr && Selected()->kind == ShapeKind::text);
+}
+
+void CBoardView::OnUpdatePosition(CCmdUI* item) {
+    CString text;
+    text.Format("%d, %d", m_pointer.x, m_pointer.y);
+    item->Enable();
+    item->SetText(text);
+}

@@ -1,0 +1,62 @@
+#include "ShapePainter.h"
+
+using namespace board;
+
+namespace {
+
+COLORREF toColorRef(Color color) {
+    return RGB((color >> 16) & 0xFF, (color >> 8) & 0xFF, color & 0xFF);
+}
+
+CRect boxOf(const Shape& shape) {
+    CRect box(shape.from.x, shape.from.y, shape.to.x, shape.to.y);
+    box.NormalizeRect();
+    return box;
+}
+
+void drawText(CDC& dc, const Shape& shape) {
+    CRect box = boxOf(shape);
+    if (shape.fill != noColor) {
+        dc.FillSolidRect(box, toColorRef(shape.fill));
+    }
+    CFont font;
+    font.CreateFont(-shape.size, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_DEFAULT_PRECIS,
+                    CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, "Arial");
+    CFont* before = dc.SelectObject(&font);
+    dc.SetBkMode(TRANSPARENT);
+    dc.SetTextColor(toColorRef(shape.color));
+    dc.DrawText(shape.text.c_str(), -1, box, DT_LEFT | DT_TOP | DT_WORDBREAK | DT_NOPREFIX | DT_NOCLIP);
+    dc.SelectObject(before);
+}
+
+void drawOutline(CDC& dc, const Shape& shape) {
+    if (shape.kind == ShapeKind::line) {
+        dc.MoveTo(shape.from.x, shape.from.y);
+        dc.LineTo(shape.to.x, shape.to.y);
+    } else if (shape.kind == ShapeKind::ellipse) {
+        dc.Ellipse(boxOf(shape));
+    } else {
+        dc.Rectangle(boxOf(shape));
+    }
+}
+
+} // namespace
+
+void DrawShape(CDC& dc, const Shape& shape) {
+    if (shape.kind == ShapeKind::text) {
+        drawText(dc, shape);
+        return;
+    }
+    CPen pen(PS_SOLID, shape.width, toColorRef(shape.color));
+    CBrush brush;
+    if (shape.fill == noColor) {
+        brush.CreateStockObject(NULL_BRUSH);
+    } else {
+        brush.CreateSolidBrush(toColorRef(shape.fill));
+    }
+    CPen* penBefore = dc.SelectObject(&pen);
+    CBrush* brushBefore = dc.SelectObject(&brush);
+    drawOutline(dc, shape);
+    dc.SelectObject(brushBefore);
+    dc.SelectObject(penBefore);
+}
