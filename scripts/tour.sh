@@ -1,0 +1,151 @@
+#!/usr/bin/env bash
+# A guided tour of the sample application "board", for a display that nobody watches: drives it as a user would and
+# leaves pictures with an index page.
+#
+#   scripts/with-display.sh scripts/tour.sh PROGRAM PICTURES_DIR [ARGUMENT...]
+#
+# The arguments are the drawings to open instead of those that come with the program. Needs xdotool and ImageMagick.
+set -euo pipefail
+
+if [ $# -lt 2 ]; then
+    echo "usage: scripts/tour.sh PROGRAM PICTURES_DIR [ARGUMENT...]" >&2
+    exit 2
+fi
+program=$(realpath "$1")
+mkdir -p "$2"
+pictures=$(realpath "$2")
+shift 2
+root=$(cd "$(dirname "$0")/.." && pwd)
+limit=30 # seconds that anything may take
+
+work=$(mktemp -d "${TMPDIR:-/tmp}/tvx-tour.XXXXXX")
+process='' number=0
+stop() {
+    if [ -n "$process" ]; then kill "$process" 2>/dev/null || true; fi
+    rm -rf "$work"
+}
+trap stop EXIT
+export HOME="$work/home" XDG_RUNTIME_DIR="$work"
+mkdir -p "$HOME"
+
+fail() {
+    import -window root "$pictures/failed.png" 2>/dev/null || true
+    echo "tour: $1 (see $pictures/failed.png)" >&2
+    exit 1
+}
+
+# The tour changes drawings, so it works with copies.
+drawings=("$@")
+if [ ${#drawings[@]} -eq 0 ]; then
+    cp "$root"/samples/board/drawings/*.brd "$work/"
+    drawings=("$work/bench.brd" "$work/gearbox.brd")
+fi
+
+start() {
+    "$program" "$@" &
+    process=$!
+}
+
+# Waits for a window whose title matches $1, gives it the keyboard and leaves its number in $window.
+window=''
+await() {
+    window=$(timeout "$limit" xdotool search --sync --onlyvisible --name "$1" | tail -n 1) || fail "no window \"$1\""
+    timeout "$limit" xdotool windowactivate --sync "$window" || fail "window \"$1\" does not become active"
+}
+
+# Waits until the program has ended.
+ended() {
+    timeout "$limit" tail --pid="$process" -f /dev/null || fail "the program does not end"
+    wait "$process" || true
+    process=''
+}
+
+screen() {
+    import -window root "$1"
+    convert "$1" -depth 8 RGB:- | sha256sum
+}
+
+# picture NAME TEXT: waits until the screen shows something new and has come to rest, and keeps it.
+shown=''
+printf '<!doctype html>\n<html lang="en"><meta charset="utf-8"><title>Board: a guided tour</title>\n' >"$work/index.html"
+printf '<style>body{font:16px/1.5 sans-serif;max-width:1000px;margin:2em auto;color:#222}img{max-width:100%%;border:1px solid #ccc}</style>\n' >>"$work/index.html"
+printf '<h1>Board: a guided tour</h1>\n' >>"$work/index.html"
+picture() {
+    local before='' now file end=$((SECONDS + limit))
+    number=$((number + 1))
+    file=$(printf '%02d-%s.png' "$number" "$1")
+    while now=$(screen "$pictures/$file"); [ "$now" != "$before" ] || [ "$now" = "$shown" ]; do
+        [ $SECONDS -lt $end ] || fail "nothing new to see for \"$1\""
+        before=$now
+    done
+    shown=$now
+    printf '<h2>%d. %s</h2>\n<p><img src="%s" alt="%s"></p>\n' "$number" "$2" "$file" "$2" >>"$work/index.html"
+}
+
+# drag X1 Y1 X2 Y2: in percent of the main window.
+drag() {
+    local X=0 Y=0 WIDTH=0 HEIGHT=0
+    eval "$(xdotool getwindowgeometry --shell "$main" | grep -E '^(X|Y|WIDTH|HEIGHT)=')"
+    at() { echo "$((X + WIDTH * $1 / 100)) $((Y + HEIGHT * $2 / 100))"; }
+    # shellcheck disable=SC2046
+    xdotool mousemove $(at "$1" "$2") mousedown 1 mousemove $(at $((($1 + $3) / 2)) $((($2 + $4) / 2))) \
+        mousemove $(at "$3" "$4") mouseup 1
+}
+
+start "${drawings[@]}"
+await 'Board'
+main=$window
+picture start "The board with the drawings that were named on its command line."
+
+xdotool key --clearmodifiers alt+w
+picture window-menu "The Window menu lists the open drawings."
+xdotool key t
+picture tiled "The drawings side by side."
+
+xdotool key --clearmodifiers ctrl+3
+drag 62 62 82 86
+picture draw "An ellipse was drawn with the mouse. It is selected: the handles change its size."
+
+xdotool key --clearmodifiers ctrl+4
+drag 60 60 84 88
+picture line "A line across it."
+xdotool key --clearmodifiers ctrl+z
+picture undo "Undo took the line back."
+
+xdotool key --clearmodifiers alt+d
+picture menu "The Draw menu: tools, colours and fills."
+xdotool key Escape Escape
+
+xdotool key --clearmodifiers alt+h
+picture help-menu "The Help menu."
+xdotool key a
+await 'About'
+picture about "The About box."
+xdotool key Return
+
+timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
+xdotool key --clearmodifiers alt+F4
+picture unsaved "Closing with changes asks first."
+xdotool key --clearmodifiers n
+ended
+
+start -help
+await 'Board'
+picture usage "board -help shows the usage summary."
+xdotool key Return
+ended
+
+start -grid many -bogus
+await 'Board'
+picture errors "A wrong command line is explained: each fault with its reason."
+xdotool key Return
+ended
+
+printf 'board 1\nrectangle 10 10 90 60\ncircle 10 10 40\n' >"$work/damaged.brd"
+start "$work/damaged.brd"
+await 'Board'
+picture damaged "A damaged drawing is refused with file, line and reason."
+xdotool key Return
+ended
+
+mv "$work/index.html" "$pictures/index.html"
