@@ -80,7 +80,8 @@ public:
     void SetRegistryKey(LPCSTR key);
     void SetRegistryKey(UINT id);
 
-    // --- documents ---
+    /// Documents.
+    /// @{
 
     void AddDocTemplate(CDocTemplate* docTemplate);
     POSITION GetFirstDocTemplatePosition() const;
@@ -93,8 +94,10 @@ public:
     int GetOpenDocumentCount();
     /// Asks for a file name with the document manager's dialog.
     BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog, CDocTemplate* docTemplate);
+    /// @}
 
-    // --- resources ---
+    /// Resources.
+    /// @{
 
     HICON LoadIcon(LPCSTR name) const;
     HICON LoadIcon(UINT id) const;
@@ -102,8 +105,10 @@ public:
     HCURSOR LoadCursor(LPCSTR name) const;
     HCURSOR LoadCursor(UINT id) const;
     HCURSOR LoadStandardCursor(LPCSTR name) const;
+    /// @}
 
-    // --- what a derived class may change ---
+    /// What a derived class may change.
+    /// @{
 
     /// Shows a message box; AfxMessageBox calls this.
     /// @param helpId context of the box's help, 0 for none.
@@ -116,8 +121,10 @@ public:
     virtual void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT);
 
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    /// @}
 
-    // --- commands ---
+    /// Commands.
+    /// @{
 
     afx_msg void OnFileNew();
     afx_msg void OnFileOpen();
@@ -132,7 +139,7 @@ public:
     void HideApplication();
 
     DECLARE_MESSAGE_MAP()
-
+    /// @}
 private:
     friend int AfxWinMain(int argc, char** argv);
     void rememberCommandLine(int argc, char** argv);

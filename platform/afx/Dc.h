@@ -33,6 +33,7 @@ public:
     /// The context that sizes are asked of: always the same as `m_hDC`.
     HDC m_hAttribDC = nullptr;
 
+    /// The handle; null when nothing is held.
     operator HDC() const {
         return m_hDC;
     }
@@ -71,6 +72,7 @@ public:
 
     // Tools. The result is the tool selected before, null when nothing changed.
 
+    /// Makes a tool the one to draw with, until another one of its kind is selected.
     CPen* SelectObject(CPen* pen);
     CBrush* SelectObject(CBrush* brush);
     CFont* SelectObject(CFont* font);
@@ -78,67 +80,95 @@ public:
     CBitmap* SelectObject(CBitmap* bitmap);
     /// Selects a region as clipping area: `SelectClipRgn`, whose result this is.
     int SelectObject(CRgn* region);
+    /// Selects one of the predefined tools (BLACK_PEN, NULL_BRUSH, DEFAULT_GUI_FONT, ...).
     CGdiObject* SelectStockObject(int index);
+    /// The pen that is selected.
     CPen* GetCurrentPen() const;
+    /// The brush that is selected.
     CBrush* GetCurrentBrush() const;
+    /// The font that is selected.
     CFont* GetCurrentFont() const;
+    /// The bitmap that a memory context draws on; null for other contexts.
     CBitmap* GetCurrentBitmap() const;
 
     // Colours and modes. The result of a setter is the value before, 0 (CLR_INVALID) on failure.
 
+    /// The colour of text, and of the black pixels of monochrome pictures.
     COLORREF SetTextColor(COLORREF color);
+    /// Answers `SetTextColor`'s value.
     COLORREF GetTextColor() const;
     /// The colour behind text, between dashes and hatch lines, and of monochrome pictures' white pixels.
     COLORREF SetBkColor(COLORREF color);
+    /// Answers `SetBkColor`'s value.
     COLORREF GetBkColor() const;
     /// TRANSPARENT or OPAQUE (the default).
     int SetBkMode(int mode);
+    /// Answers `SetBkMode`'s value.
     int GetBkMode() const;
     /// How pens and brushes combine with what is there (R2_...).
     int SetROP2(int mode);
+    /// Answers `SetROP2`'s value.
     int GetROP2() const;
     /// ALTERNATE (the default) or WINDING.
     int SetPolyFillMode(int mode);
+    /// Answers `SetPolyFillMode`'s value.
     int GetPolyFillMode() const;
     /// BLACKONWHITE (the default), WHITEONBLACK, COLORONCOLOR or HALFTONE.
     int SetStretchBltMode(int mode);
+    /// Answers `SetStretchBltMode`'s value.
     int GetStretchBltMode() const;
     /// AD_COUNTERCLOCKWISE (the default) or AD_CLOCKWISE.
     int SetArcDirection(int direction);
+    /// Answers `SetArcDirection`'s value.
     int GetArcDirection() const;
     /// TA_... values combined.
     UINT SetTextAlign(UINT flags);
+    /// Answers `SetTextAlign`'s value.
     UINT GetTextAlign() const;
     /// Where hatches and patterns begin, in device units.
     CPoint SetBrushOrg(int x, int y);
     CPoint SetBrushOrg(POINT point);
+    /// Answers `SetBrushOrg`'s value.
     CPoint GetBrushOrg() const;
 
     // Mapping. A logical point is first moved by the window origin, then scaled by the extents, then moved by the
     // viewport origin, and rounded to the nearest pixel. There are 96 pixels to an inch.
 
+    /// Chooses MM_TEXT (pixels, the default), one of the metric modes (y grows upwards), MM_ISOTROPIC or
+    /// MM_ANISOTROPIC. The result is the mode before, 0 for a number that is none.
     int SetMapMode(int mode);
+    /// The mode that is set, 0 on failure.
     int GetMapMode() const;
+    /// The device point that the window origin is mapped to. The result is the one before.
     CPoint SetViewportOrg(int x, int y);
     CPoint SetViewportOrg(POINT point);
+    /// Answers `SetViewportOrg`'s value.
     CPoint GetViewportOrg() const;
+    /// Moves the viewport origin by device units. The result is the one before.
     CPoint OffsetViewportOrg(int x, int y);
     /// Changes MM_ISOTROPIC (after the window extents; one of the two is then made smaller) and MM_ANISOTROPIC only.
     CSize SetViewportExt(int cx, int cy);
     CSize SetViewportExt(SIZE size);
+    /// The device units that the window extents are mapped to.
     CSize GetViewportExt() const;
+    /// The logical point that is mapped to the viewport origin. The result is the one before.
     CPoint SetWindowOrg(int x, int y);
     CPoint SetWindowOrg(POINT point);
+    /// Answers `SetWindowOrg`'s value.
     CPoint GetWindowOrg() const;
+    /// Moves the window origin by logical units. The result is the one before.
     CPoint OffsetWindowOrg(int x, int y);
     /// Changes MM_ISOTROPIC and MM_ANISOTROPIC only. Extents of 0 are refused.
     CSize SetWindowExt(int cx, int cy);
     CSize SetWindowExt(SIZE size);
+    /// The logical units that the viewport extents stand for.
     CSize GetWindowExt() const;
+    /// Converts logical to device units in place.
     void LPtoDP(POINT* points, int count = 1) const;
     void LPtoDP(RECT* rect) const;
     /// Converts a size: the result is never negative.
     void LPtoDP(SIZE* size) const;
+    /// Converts device to logical units in place.
     void DPtoLP(POINT* points, int count = 1) const;
     void DPtoLP(RECT* rect) const;
     void DPtoLP(SIZE* size) const;
@@ -147,26 +177,36 @@ public:
 
     /// The rectangle around what can be drawn to at all.
     int GetClipBox(RECT* rect) const;
+    /// Whether drawing at the point would be seen.
     BOOL PtVisible(int x, int y) const;
     BOOL PtVisible(POINT point) const;
+    /// Whether any of the rectangle would be seen.
     BOOL RectVisible(const RECT* rect) const;
     /// @param region in device units, copied; null takes the clipping away
     int SelectClipRgn(CRgn* region);
     int SelectClipRgn(CRgn* region, int mode);
+    /// Takes a rectangle out of the clipping area.
     int ExcludeClipRect(int left, int top, int right, int bottom);
     int ExcludeClipRect(const RECT* rect);
+    /// Cuts the clipping area down to what lies in a rectangle.
     int IntersectClipRect(int left, int top, int right, int bottom);
     int IntersectClipRect(const RECT* rect);
+    /// Moves the clipping area by logical units.
     int OffsetClipRgn(int x, int y);
 
     // Lines. The end point of a line is not drawn.
 
+    /// Where the next line begins.
     CPoint GetCurrentPosition() const;
+    /// Sets the position without drawing. The result is the one before.
     CPoint MoveTo(int x, int y);
     CPoint MoveTo(POINT point);
+    /// Draws from the position to a point, which becomes the position.
     BOOL LineTo(int x, int y);
     BOOL LineTo(POINT point);
+    /// Draws through points; the position stays. FALSE for fewer than two points.
     BOOL Polyline(const POINT* points, int count);
+    /// Draws from the position through points; the last one becomes the position.
     BOOL PolylineTo(const POINT* points, int count);
     /// Part of the ellipse inside a rectangle, between its crossings with the rays from its centre through two points.
     BOOL Arc(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY);
@@ -174,29 +214,41 @@ public:
 
     // Shapes: outlined with the pen, filled with the brush.
 
+    /// A rectangle. Without a pen it is one pixel smaller at the right and at the bottom.
     BOOL Rectangle(int left, int top, int right, int bottom);
     BOOL Rectangle(const RECT* rect);
+    /// A rectangle whose corners are quarters of an ellipse of the size given.
     BOOL RoundRect(int left, int top, int right, int bottom, int cornerWidth, int cornerHeight);
     BOOL RoundRect(const RECT* rect, POINT corner);
+    /// The largest ellipse inside a rectangle.
     BOOL Ellipse(int left, int top, int right, int bottom);
     BOOL Ellipse(const RECT* rect);
+    /// What an arc and the lines from its ends to the centre enclose; see `Arc`.
     BOOL Pie(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY);
     BOOL Pie(const RECT* rect, POINT start, POINT end);
+    /// What an arc and the line between its ends enclose; see `Arc`.
     BOOL Chord(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY);
     BOOL Chord(const RECT* rect, POINT start, POINT end);
+    /// A polygon, closed by a line from the last point to the first. FALSE for fewer than two points.
     BOOL Polygon(const POINT* points, int count);
+    /// Several polygons as one area.
+    /// @param counts number of points of each
     BOOL PolyPolygon(const POINT* points, const int* counts, int count);
 
     // Areas
 
+    /// Fills a rectangle, whatever the binary raster operation is.
     void FillRect(const RECT* rect, CBrush* brush);
     /// A border of one logical unit inside the rectangle.
     void FrameRect(const RECT* rect, CBrush* brush);
+    /// Inverts the colours of a rectangle.
     void InvertRect(const RECT* rect);
+    /// Fills a region, which is in device units.
     BOOL FillRgn(CRgn* region, CBrush* brush);
     /// Fills and leaves `color` as background colour.
     void FillSolidRect(const RECT* rect, COLORREF color);
     void FillSolidRect(int x, int y, int cx, int cy, COLORREF color);
+    /// A frame of one unit inside the rectangle, the left and top sides in one colour, the others in another.
     void Draw3dRect(const RECT* rect, COLORREF topLeft, COLORREF bottomRight);
     void Draw3dRect(int x, int y, int cx, int cy, COLORREF topLeft, COLORREF bottomRight);
     /// @param edge  BDR_... or EDGE_...
@@ -213,6 +265,7 @@ public:
     /// The result is the colour really set, CLR_INVALID when the point is clipped away.
     COLORREF SetPixel(int x, int y, COLORREF color);
     COLORREF SetPixel(POINT point, COLORREF color);
+    /// As `SetPixel`, without asking what was set.
     BOOL SetPixelV(int x, int y, COLORREF color);
     /// CLR_INVALID when the point lies outside the clipping area.
     COLORREF GetPixel(int x, int y) const;
@@ -230,6 +283,7 @@ public:
 
     // Text. `count` is in bytes, -1 up to the NUL.
 
+    /// Draws one line of text at a point, placed by `SetTextAlign`.
     BOOL TextOut(int x, int y, LPCSTR text, int count);
     BOOL TextOut(int x, int y, const CString& text);
     /// @param options ETO_OPAQUE fills `rect` with the background colour, ETO_CLIPPED cuts the text at it
@@ -245,13 +299,16 @@ public:
     /// @return width and height of the text
     CSize TabbedTextOut(int x, int y, LPCSTR text, int count, int tabCount, const int* tabs, int tabOrigin);
     CSize TabbedTextOut(int x, int y, const CString& text, int tabCount, const int* tabs, int tabOrigin);
+    /// The size of what `TabbedTextOut` would draw.
     CSize GetTabbedTextExtent(LPCSTR text, int count, int tabCount, const int* tabs) const;
     CSize GetTabbedTextExtent(const CString& text, int tabCount, const int* tabs) const;
     /// Width and height of one line of text in the selected font: exactly what drawing it takes.
     CSize GetTextExtent(LPCSTR text, int count) const;
     CSize GetTextExtent(const CString& text) const;
+    /// As `GetTextExtent`.
     CSize GetOutputTextExtent(LPCSTR text, int count) const;
     CSize GetOutputTextExtent(const CString& text) const;
+    /// The sizes of the selected font.
     BOOL GetTextMetrics(TEXTMETRIC* metrics) const;
     /// Name of the selected font as it was asked for; of the face really used when no name was given.
     int GetTextFace(int count, LPSTR name) const;
@@ -320,18 +377,26 @@ TVX_PLATFORM_API HDC CreateCompatibleDC(HDC dc);
 TVX_PLATFORM_API BOOL DeleteDC(HDC dc);
 /// Selects a pen, brush, font or bitmap; the result is the one selected before, null on failure.
 TVX_PLATFORM_API HGDIOBJ SelectObject(HDC dc, HGDIOBJ object);
+/// As `CDC::GetTextExtent`; FALSE for a handle that is no context.
 TVX_PLATFORM_API BOOL GetTextExtentPoint32A(HDC dc, LPCSTR text, int count, SIZE* size);
+/// As `CDC::GetTextMetrics`.
 TVX_PLATFORM_API BOOL GetTextMetricsA(HDC dc, TEXTMETRICA* metrics);
+/// As `CDC::GetDeviceCaps`.
 TVX_PLATFORM_API int GetDeviceCaps(HDC dc, int index);
+/// As `CDC::BitBlt`.
 TVX_PLATFORM_API BOOL BitBlt(HDC dc, int x, int y, int width, int height, HDC source, int sourceX, int sourceY,
                              DWORD rop);
+/// As `CDC::GetPixel`.
 TVX_PLATFORM_API COLORREF GetPixel(HDC dc, int x, int y);
+/// As `CDC::SetPixel`.
 TVX_PLATFORM_API COLORREF SetPixel(HDC dc, int x, int y, COLORREF color);
 /// Fills with a brush, or with a system colour given as `(HBRUSH)(COLOR_... + 1)`.
 TVX_PLATFORM_API int FillRect(HDC dc, const RECT* rect, HBRUSH brush);
+/// Draws an icon, scaled unless a size is 0, over `background` when that is not null. `step` and `flags` are not used.
 TVX_PLATFORM_API BOOL DrawIconEx(HDC dc, int x, int y, HICON icon, int width, int height, UINT step, HBRUSH background,
                                  UINT flags);
 
+/// As `GetTextExtentPoint32A`.
 inline BOOL GetTextExtentPoint32(HDC dc, LPCSTR text, int count, SIZE* size) {
     return GetTextExtentPoint32A(dc, text, count, size);
 }

@@ -77,7 +77,8 @@ public:
     UINT m_nIDTracking = 0;
     UINT m_nIDLastMessage = 0;
 
-    // --- creation ---
+    /// Creation.
+    /// @{
 
     /// Creates the window from the resources with the number `id`: title (first part of the string), menu,
     /// accelerators, icon.
@@ -106,8 +107,10 @@ public:
     void InitialUpdateFrame(CDocument* document, BOOL makeVisible);
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
     void PostNcDestroy() override;
+    /// @}
 
-    // --- view and document ---
+    /// View and document.
+    /// @{
 
     CView* GetActiveView() const;
     /// Makes a view the active one: the former hears of it, the new one as well when `notify` is TRUE.
@@ -132,8 +135,10 @@ public:
     virtual HACCEL GetDefaultAccelerator();
     /// Whether this frame is the only one of its document. Used before a document is closed with its frame.
     static void UpdateAllFrames(const CWnd* except);
+    /// @}
 
-    // --- layout and bars ---
+    /// Layout and bars.
+    /// @{
 
     /// Places the bars and gives the pane the rest. `notify` FALSE only places.
     virtual void RecalcLayout(BOOL notify = TRUE);
@@ -153,8 +158,10 @@ public:
     const std::vector<CControlBar*>& GetControlBars() const {
         return m_bars;
     }
+    /// @}
 
-    // --- status line ---
+    /// Status line.
+    /// @{
 
     /// The prompt of a command: its string's part before the line end. FALSE leaves `message` empty.
     virtual void GetMessageString(UINT id, CString& message) const;
@@ -170,8 +177,10 @@ public:
     }
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    /// @}
 
-    // --- handlers ---
+    /// Handlers.
+    /// @{
 
     afx_msg int OnCreate(CREATESTRUCT* cs);
     afx_msg void OnDestroy();
@@ -198,7 +207,7 @@ public:
     afx_msg BOOL OnBarCheck(UINT id);
     afx_msg void OnUpdateKeyIndicator(CCmdUI* item);
     afx_msg void OnHelp();
-
+    /// @}
 protected:
     friend class CControlBar;
     friend class CDocument;

@@ -38,6 +38,7 @@ public:
     /// The handle; null when nothing is held. For reading only.
     HGDIOBJ m_hObject = nullptr;
 
+    /// The handle; null when nothing is held.
     operator HGDIOBJ() const {
         return m_hObject;
     }
@@ -79,6 +80,7 @@ public:
     /// As `CreatePen`.
     CPen(int style, int width, COLORREF color);
 
+    /// The handle; null when nothing is held.
     operator HPEN() const {
         return static_cast<HPEN>(m_hObject);
     }
@@ -88,6 +90,7 @@ public:
     /// @param style PS_SOLID, PS_NULL, PS_INSIDEFRAME, or one of the dashed styles, which are one pixel wide
     /// @param width logical units; 0 is one pixel in every mapping mode. Wide lines have round ends and joins
     BOOL CreatePen(int style, int width, COLORREF color);
+    /// As `CreatePen`, from a description.
     BOOL CreatePenIndirect(const LOGPEN* description);
     /// Describes the pen. FALSE when nothing is held.
     BOOL GetLogPen(LOGPEN* description) const;
@@ -106,6 +109,7 @@ public:
     /// As `CreatePatternBrush`.
     explicit CBrush(CBitmap* bitmap);
 
+    /// The handle; null when nothing is held.
     operator HBRUSH() const {
         return static_cast<HBRUSH>(m_hObject);
     }
@@ -119,6 +123,7 @@ public:
     BOOL CreateHatchBrush(int hatch, COLORREF color);
     /// A brush that repeats a copy of `bitmap`. A monochrome one takes the context's text and background colours.
     BOOL CreatePatternBrush(CBitmap* bitmap);
+    /// A brush of the kind that the description tells (BS_...). FALSE for an unknown kind.
     BOOL CreateBrushIndirect(const LOGBRUSH* description);
     /// A brush in the system colour COLOR_... .
     BOOL CreateSysColorBrush(int index);
@@ -133,6 +138,7 @@ public:
     /// Holds nothing until one of the `Create` calls.
     CFont() = default;
 
+    /// The handle; null when nothing is held.
     operator HFONT() const {
         return static_cast<HFONT>(m_hObject);
     }
@@ -143,6 +149,7 @@ public:
     BOOL CreateFont(int height, int width, int escapement, int orientation, int weight, BYTE italic, BYTE underline,
                     BYTE strikeOut, BYTE charSet, BYTE outPrecision, BYTE clipPrecision, BYTE quality,
                     BYTE pitchAndFamily, LPCSTR faceName);
+    /// A font from a description. FALSE for null.
     BOOL CreateFontIndirect(const LOGFONT* description);
     /// @param pointSize tenths of a point
     /// @param dc        whose mapping mode the height is made for; null is the screen in pixels
@@ -161,6 +168,7 @@ public:
     /// Holds nothing until one of the `Create` or `Load` calls.
     CBitmap() = default;
 
+    /// The handle; null when nothing is held.
     operator HBITMAP() const {
         return static_cast<HBITMAP>(m_hObject);
     }
@@ -193,14 +201,17 @@ public:
     /// Holds nothing until one of the `Create` calls.
     CRgn() = default;
 
+    /// The handle; null when nothing is held.
     operator HRGN() const {
         return static_cast<HRGN>(m_hObject);
     }
     /// As `CGdiObject::FromHandle`; null when the handle is no region.
     static CRgn* FromHandle(HRGN region);
 
+    /// A rectangle; the corners may come in any order.
     BOOL CreateRectRgn(int left, int top, int right, int bottom);
     BOOL CreateRectRgnIndirect(const RECT* rect);
+    /// The largest ellipse inside a rectangle.
     BOOL CreateEllipticRgn(int left, int top, int right, int bottom);
     /// @param mode ALTERNATE or WINDING
     BOOL CreatePolygonRgn(const POINT* points, int count, int mode);
@@ -208,21 +219,29 @@ public:
     /// Makes this region, which must exist, the combination RGN_... of two others. The result is the kind of region
     /// (NULLREGION, SIMPLEREGION, COMPLEXREGION) or ERROR.
     int CombineRgn(const CRgn* first, const CRgn* second, int mode);
+    /// Makes the region, which must exist, a rectangle.
     void SetRectRgn(int left, int top, int right, int bottom);
+    /// Moves the region; the result is its kind.
     int OffsetRgn(int x, int y);
     /// The rectangle around the region; the result is its kind.
     int GetRgnBox(RECT* rect) const;
+    /// Whether the pixel belongs to the region.
     BOOL PtInRegion(int x, int y) const;
+    /// Whether any of the rectangle belongs to the region.
     BOOL RectInRegion(const RECT* rect) const;
 };
 
 // The tools by handle. Who creates one deletes it.
 
+/// As `CPen::CreatePen`.
 TVX_PLATFORM_API HPEN CreatePen(int style, int width, COLORREF color);
+/// As `CBrush::CreateSolidBrush`.
 TVX_PLATFORM_API HBRUSH CreateSolidBrush(COLORREF color);
+/// The fields of LOGFONT, in order.
 TVX_PLATFORM_API HFONT CreateFontA(int height, int width, int escapement, int orientation, int weight, DWORD italic,
                                    DWORD underline, DWORD strikeOut, DWORD charSet, DWORD outPrecision,
                                    DWORD clipPrecision, DWORD quality, DWORD pitchAndFamily, LPCSTR faceName);
+/// A font from a description; null for null.
 TVX_PLATFORM_API HFONT CreateFontIndirectA(const LOGFONTA* description);
 /// As `CBitmap::CreateBitmap`; null on failure.
 TVX_PLATFORM_API HBITMAP CreateBitmap(int width, int height, UINT planes, UINT bitsPerPixel, LPCVOID bits);
@@ -247,26 +266,30 @@ TVX_PLATFORM_API DWORD GetObjectType(HGDIOBJ object);
 /// A predefined tool (BLACK_PEN, NULL_BRUSH, DEFAULT_GUI_FONT, ...); null for an unknown number. Not to be deleted.
 TVX_PLATFORM_API HGDIOBJ GetStockObject(int index);
 
+/// As `CreateFontIndirectA`.
 inline HFONT CreateFontIndirect(const LOGFONT* description) {
     return CreateFontIndirectA(description);
 }
+/// As `LoadBitmapA`.
 inline HBITMAP LoadBitmap(HINSTANCE module, LPCSTR name) {
     return LoadBitmapA(module, name);
 }
+/// As `GetObjectA`.
 inline int GetObject(HGDIOBJ object, int count, LPVOID buffer) {
     return GetObjectA(object, count, buffer);
 }
 
 // Icons
 
-/// An icon of one module in the size of SM_CXICON, or with a null module one of the predefined ones (IDI_...).
-/// Icons of modules are loaded once and shared: they need not be destroyed.
+/// An icon of one module in the size that it has nearest to SM_CXICON, or with a null module one of the predefined ones
+/// (IDI_...). Icons of modules are loaded once and shared: they need not be destroyed.
 /// @return null when there is no such icon or it is damaged
 TVX_PLATFORM_API HICON LoadIconA(HINSTANCE module, LPCSTR name);
 /// Destroys an icon that the caller created. FALSE for a handle that is no icon.
 TVX_PLATFORM_API BOOL DestroyIcon(HICON icon);
 /// A copy that the caller destroys; null for a handle that is no icon.
 TVX_PLATFORM_API HICON CopyIcon(HICON icon);
+/// As `LoadIconA`.
 inline HICON LoadIcon(HINSTANCE module, LPCSTR name) {
     return LoadIconA(module, name);
 }

@@ -31,12 +31,14 @@ struct LOGFONTA {
 using LOGFONT = LOGFONTA;
 using LPLOGFONT = LOGFONTA*;
 
+/// Describes a pen.
 struct LOGPEN {
     UINT lopnStyle;  ///< PS_...
     POINT lopnWidth; ///< x: width in logical units; 0 is one pixel
     COLORREF lopnColor;
 };
 
+/// Describes a brush.
 struct LOGBRUSH {
     UINT lbStyle; ///< BS_...
     COLORREF lbColor;
@@ -54,13 +56,16 @@ struct BITMAP {
     LPVOID bmBits;     ///< always null: bits are read with GetBitmapBits
 };
 
+/// A colour of a bitmap's colour table.
 struct RGBQUAD {
+    /// Each 0..255; the last one is 0.
     BYTE rgbBlue;
     BYTE rgbGreen;
     BYTE rgbRed;
     BYTE rgbReserved;
 };
 
+/// Size and format of device-independent bits.
 struct BITMAPINFOHEADER {
     DWORD biSize;
     LONG biWidth;
@@ -75,12 +80,14 @@ struct BITMAPINFOHEADER {
     DWORD biClrImportant;
 };
 
+/// The header of device-independent bits with the colour table that follows it.
 struct BITMAPINFO {
     BITMAPINFOHEADER bmiHeader;
     RGBQUAD bmiColors[1];
 };
 
 #pragma pack(push, 2)
+/// What a bitmap file begins with.
 struct BITMAPFILEHEADER {
     WORD bfType;
     DWORD bfSize;
@@ -344,6 +351,7 @@ constexpr int BDR_RAISEDOUTER = 0x0001;
 constexpr int BDR_SUNKENOUTER = 0x0002;
 constexpr int BDR_RAISEDINNER = 0x0004;
 constexpr int BDR_SUNKENINNER = 0x0008;
+/// The usual combinations.
 constexpr int EDGE_RAISED = (BDR_RAISEDOUTER | BDR_RAISEDINNER);
 constexpr int EDGE_SUNKEN = (BDR_SUNKENOUTER | BDR_SUNKENINNER);
 constexpr int EDGE_ETCHED = (BDR_SUNKENOUTER | BDR_RAISEDINNER);

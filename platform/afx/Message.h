@@ -419,6 +419,7 @@ struct WINDOWPLACEMENT {
 
 /// The limits a window may set when it is about to be sized; WM_GETMINMAXINFO carries a pointer to it.
 struct MINMAXINFO {
+    /// Sizes and places in screen pixels, the frame included; the first is unused.
     POINT ptReserved;
     POINT ptMaxSize;
     POINT ptMaxPosition;
@@ -427,6 +428,7 @@ struct MINMAXINFO {
 };
 
 struct WINDOWPOS {
+    /// The window, the one it stands behind, its rectangle in its parent and the SWP_... flags.
     HWND hwnd;
     HWND hwndInsertAfter;
     int x;
@@ -524,6 +526,8 @@ TVX_PLATFORM_API DWORD GetMessagePos();
 /// The time of the message now being handled.
 TVX_PLATFORM_API LONG GetMessageTime();
 
+/// The same calls by the names without their suffix.
+/// @{
 inline LRESULT SendMessage(HWND window, UINT message, WPARAM wParam = 0, LPARAM lParam = 0) {
     return SendMessageA(window, message, wParam, lParam);
 }
@@ -542,7 +546,10 @@ inline LRESULT DispatchMessage(const MSG* message) {
 inline UINT RegisterWindowMessage(LPCSTR name) {
     return RegisterWindowMessageA(name);
 }
+/// @}
 
+/// The signed halves of a parameter: a point, the turn of a wheel.
+/// @{
 constexpr int GET_X_LPARAM(LPARAM lParam) {
     return static_cast<SHORT>(LOWORD(static_cast<std::uintptr_t>(lParam)));
 }
@@ -552,3 +559,4 @@ constexpr int GET_Y_LPARAM(LPARAM lParam) {
 constexpr int GET_WHEEL_DELTA_WPARAM(WPARAM wParam) {
     return static_cast<SHORT>(HIWORD(wParam));
 }
+/// @}

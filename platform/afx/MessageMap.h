@@ -74,7 +74,9 @@ inline CPoint pointOf(LPARAM value) {
     return CPoint(GET_X_LPARAM(value), GET_Y_LPARAM(value));
 }
 
-// One function a shape of parameters; each unpacks the two numbers a message travels with.
+/// One function for each shape of parameters that handlers have. Each unpacks the two numbers a message travels with,
+/// calls the handler and answers whether the message is finished with it.
+/// @{
 
 template <auto Fn> // ()
 bool onNothing(CCmdTarget& t, MessageCall& m) {
@@ -260,6 +262,7 @@ bool onNotifyEx(CCmdTarget& t, MessageCall& m) {
     call<Fn>(t, m, m.id, extra->header, extra->result);
     return m.result != 0;
 }
+/// @}
 
 } // namespace tvx::afx
 

@@ -6,6 +6,8 @@
 
 #include "platform/afx/Message.h"
 
+/// Windows: their tree, state, place and painting. Each call is the CWnd member of the same name.
+/// @{
 TVX_PLATFORM_API BOOL IsWindow(HWND window);
 TVX_PLATFORM_API BOOL DestroyWindow(HWND window);
 /// The parent of a child, the owner of a popup or dialog.
@@ -36,7 +38,10 @@ TVX_PLATFORM_API int MapWindowPoints(HWND from, HWND to, POINT* points, UINT cou
 TVX_PLATFORM_API BOOL InvalidateRect(HWND window, const RECT* rect, BOOL erase);
 TVX_PLATFORM_API BOOL UpdateWindow(HWND window);
 TVX_PLATFORM_API BOOL RedrawWindow(HWND window, const RECT* rect, HRGN region, UINT flags);
+/// @}
 
+/// Keyboard, mouse and activation: which window has them. The setting calls answer the window that had them before.
+/// @{
 TVX_PLATFORM_API HWND GetFocus();
 TVX_PLATFORM_API HWND SetFocus(HWND window);
 TVX_PLATFORM_API HWND GetCapture();
@@ -46,6 +51,7 @@ TVX_PLATFORM_API HWND GetActiveWindow();
 TVX_PLATFORM_API HWND SetActiveWindow(HWND window);
 TVX_PLATFORM_API HWND GetForegroundWindow();
 TVX_PLATFORM_API BOOL SetForegroundWindow(HWND window);
+/// @}
 /// The screen's own window; its rectangle is the primary screen's.
 TVX_PLATFORM_API HWND GetDesktopWindow();
 TVX_PLATFORM_API HWND WindowFromPoint(POINT point);
@@ -55,6 +61,8 @@ TVX_PLATFORM_API HWND FindWindowA(LPCSTR className, LPCSTR text);
 TVX_PLATFORM_API BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param);
 TVX_PLATFORM_API BOOL EnumWindows(WNDENUMPROC callback, LPARAM param);
 
+/// Texts and numbers of a window; buffers are always ended by NUL.
+/// @{
 TVX_PLATFORM_API BOOL SetWindowTextA(HWND window, LPCSTR text);
 TVX_PLATFORM_API int GetWindowTextA(HWND window, LPSTR buffer, int size);
 TVX_PLATFORM_API int GetWindowTextLengthA(HWND window);
@@ -62,6 +70,7 @@ TVX_PLATFORM_API int GetClassNameA(HWND window, LPSTR buffer, int size);
 /// Style, extended style, identifier or user data (GWL_...).
 TVX_PLATFORM_API LONG_PTR GetWindowLongPtrA(HWND window, int index);
 TVX_PLATFORM_API LONG_PTR SetWindowLongPtrA(HWND window, int index, LONG_PTR value);
+/// @}
 
 TVX_PLATFORM_API BOOL GetCursorPos(POINT* point);
 TVX_PLATFORM_API BOOL SetCursorPos(int x, int y);
@@ -77,6 +86,8 @@ TVX_PLATFORM_API SHORT GetAsyncKeyState(int key);
 TVX_PLATFORM_API UINT_PTR SetTimer(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback);
 TVX_PLATFORM_API BOOL KillTimer(HWND window, UINT_PTR id);
 
+/// The same calls by the names without their suffix.
+/// @{
 inline LONG_PTR GetWindowLong(HWND window, int index) {
     return GetWindowLongPtrA(window, index);
 }
@@ -92,6 +103,7 @@ inline int GetWindowText(HWND window, LPSTR buffer, int size) {
 inline HCURSOR LoadCursor(HINSTANCE module, LPCSTR name) {
     return LoadCursorA(module, name);
 }
+/// @}
 
 // The system's cursors
 #define IDC_ARROW MAKEINTRESOURCE(32512)

@@ -58,7 +58,8 @@ public:
         return m_hWnd;
     }
 
-    // --- objects and handles ---
+    /// Objects and handles.
+    /// @{
 
     /// The object of a window, or a temporary one; null for a null handle.
     static CWnd* FromHandle(HWND window);
@@ -75,8 +76,10 @@ public:
     /// Attaches to the control `id` of `parent`. FALSE when there is none or it has an object already.
     BOOL SubclassDlgItem(UINT id, CWnd* parent);
     HWND UnsubclassWindow();
+    /// @}
 
-    // --- creation and end ---
+    /// Creation and end.
+    /// @{
 
     /// Creates a child window.
     /// @param className a registered class ("Edit", AfxRegisterWndClass, ...); null for the framework's plain class.
@@ -96,8 +99,10 @@ public:
     virtual void PreSubclassWindow();
     /// Called when the window is gone; the place for `delete this`.
     virtual void PostNcDestroy();
+    /// @}
 
-    // --- messages ---
+    /// Messages.
+    /// @{
 
     LRESULT SendMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
         return ::SendMessageA(m_hWnd, message, wParam, lParam);
@@ -127,8 +132,10 @@ public:
     BOOL PreTranslateInput(MSG* message);
     /// The first WM_COMMAND/WM_NOTIFY handler of the parent's; called with notifications of this window before them.
     virtual BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result);
+    /// @}
 
-    // --- state ---
+    /// State.
+    /// @{
 
     DWORD GetStyle() const;
     DWORD GetExStyle() const;
@@ -146,8 +153,10 @@ public:
     BOOL IsWindowVisible() const;
     BOOL IsIconic() const;
     BOOL IsZoomed() const;
+    /// @}
 
-    // --- text and font ---
+    /// Text and font.
+    /// @{
 
     /// Sets the caption of a frame, the text of a control.
     void SetWindowText(LPCSTR text);
@@ -165,8 +174,10 @@ public:
     /// Gives a frame its icon; `bigIcon` selects the one for task lists. Answers the previous one.
     HICON SetIcon(HICON icon, BOOL bigIcon);
     HICON GetIcon(BOOL bigIcon) const;
+    /// @}
 
-    // --- place and size ---
+    /// Place and size.
+    /// @{
 
     void GetWindowRect(RECT* rect) const;
     /// The client area, with its left top corner at 0, 0.
@@ -188,8 +199,10 @@ public:
     void MapWindowPoints(CWnd* to, RECT* rect) const;
     /// The window rectangle that gives the client rectangle `rect`, for this window's styles.
     virtual void CalcWindowRect(RECT* rect, UINT adjustType = 0);
+    /// @}
 
-    // --- painting ---
+    /// Painting.
+    /// @{
 
     /// Requests a repaint of the whole client area.
     void Invalidate(BOOL erase = TRUE);
@@ -207,8 +220,10 @@ public:
     int ReleaseDC(CDC* dc);
     /// Moves the contents (and the children) by an offset and requests the uncovered strip.
     void ScrollWindow(int dx, int dy, const RECT* scroll = nullptr, const RECT* clip = nullptr);
+    /// @}
 
-    // --- the tree of windows ---
+    /// The tree of windows.
+    /// @{
 
     CWnd* GetParent() const;
     /// Makes the window a child of another and answers the previous parent.
@@ -233,8 +248,10 @@ public:
     static CWnd* GetDesktopWindow();
     static CWnd* FindWindow(LPCSTR className, LPCSTR text);
     static CWnd* WindowFromPoint(POINT point);
+    /// @}
 
-    // --- activation, focus, capture ---
+    /// Activation, focus, capture.
+    /// @{
 
     CWnd* SetActiveWindow();
     static CWnd* GetActiveWindow();
@@ -246,14 +263,18 @@ public:
     /// Sends all mouse messages here until ReleaseCapture, wherever the pointer is.
     CWnd* SetCapture();
     static CWnd* GetCapture();
+    /// @}
 
-    // --- timers ---
+    /// Timers.
+    /// @{
 
     /// Starts or restarts a timer that sends WM_TIMER (or calls `callback`) every `elapse` milliseconds.
     UINT_PTR SetTimer(UINT_PTR id, UINT elapse, TIMERPROC callback = nullptr);
     BOOL KillTimer(UINT_PTR id);
+    /// @}
 
-    // --- scroll bars of the window's frame ---
+    /// Scroll bars of the window's frame.
+    /// @{
 
     int SetScrollPos(int bar, int pos, BOOL redraw = TRUE);
     int GetScrollPos(int bar) const;
@@ -264,16 +285,20 @@ public:
     void ShowScrollBar(UINT bar, BOOL show = TRUE);
     void EnableScrollBarCtrl(int bar, BOOL enable = TRUE);
     virtual CScrollBar* GetScrollBarCtrl(int bar) const;
+    /// @}
 
-    // --- menus ---
+    /// Menus.
+    /// @{
 
     CMenu* GetMenu() const;
     BOOL SetMenu(CMenu* menu);
     void DrawMenuBar();
     /// The window menu; with `revert` it gets its original items back.
     CMenu* GetSystemMenu(BOOL revert) const;
+    /// @}
 
-    // --- dialog items ---
+    /// Dialog items.
+    /// @{
 
     void SetDlgItemText(int id, LPCSTR text);
     int GetDlgItemText(int id, LPSTR buffer, int size) const;
@@ -310,8 +335,10 @@ public:
 
     /// The state behind the handle; null when there is no window. For the layer itself.
     tvx::afx::Window* GetState() const;
+    /// @}
 
-    // --- handlers of messages; the base versions do what happens by default ---
+    /// Handlers of messages; the base versions do what happens by default.
+    /// @{
 
     afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);
     afx_msg void OnActivateApp(BOOL active, DWORD threadId);
@@ -377,7 +404,7 @@ public:
     afx_msg void OnSize(UINT type, int cx, int cy);
     afx_msg void OnSysColorChange();
     afx_msg void OnTimer(UINT_PTR id);
-
+    /// @}
 protected:
     friend class tvx::afx::Window;
     /// Looks a message up in the map and calls its handler. FALSE when there is none.

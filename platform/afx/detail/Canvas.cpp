@@ -16,8 +16,7 @@ void fillRow(Pixel* pixels, int count, Pixel color, Rop2 rop) {
         std::fill_n(pixels, count, color);
         return;
     }
-    for (int i = 0; i < count; ++i)
-        pixels[i] = combine(rop, color, pixels[i]);
+    std::transform(pixels, pixels + count, pixels, PenOperation(rop, color));
 }
 
 void fillPatternRow(Pixel* row, const Span& span, const Ink& ink) {
@@ -79,37 +78,62 @@ void Canvas::plot(QPoint point, const Ink& ink) {
 }
 
 void Canvas::plot(std::span<const QPoint> points, const Ink& ink) {
-    Pixel color = 0;
+    if (points.empty())
+        return;
+    QRect around(points.front(), points.front());
+    for (const QPoint& point : points)
+        around |= QRect(point, point);
+    const PenOperation operation(ink.rop, ink.color);
     for (const QRect& visible : clip) {
+        if (!visible.intersects(around))
+            continue;
+        const bool whole = visible.contains(around);
         for (const QPoint& point : points) {
-            if (!visible.contains(point) || !ink.at(point.x(), point.y(), color))
-                continue;
-            Pixel& pixel = row(point.y())[point.x()];
-            pixel = combine(ink.rop, color, pixel);
-            touched_ |= QRect(point, point);
+            if (whole || visible.contains(point))
+                plotVisible(point, ink, operation);
         }
+        touched_ |= visible & around;
     }
 }
+
+void Canvas::plotVisible(QPoint point, const Ink& ink, const PenOperation& operation) {
+    Pixel& pixel = row(point.y())[point.x()];
+    Pixel color = 0;
+    if (!ink.pattern)
+        pixel = operation(pixel);
+    else if (ink.at(point.x(), point.y(), color))
+        pixel = combine(ink.rop, color, pixel);
+}
+
+namespace {
+
+void blitRow(Pixel* to, const Pixel* from, const Span& span, Rop3 rop, const Ink& brush) {
+    if (rop == kRop3Source) {
+        std::copy(from + span.left, from + span.right, to + span.left);
+        return;
+    }
+    if (!brush.pattern) {
+        std::transform(from + span.left, from + span.right, to + span.left, to + span.left,
+                       BlitOperation(rop, brush.color));
+        return;
+    }
+    Pixel pattern = 0;
+    for (int x = span.left; x < span.right; ++x) {
+        if (!brush.at(x, span.y, pattern))
+            pattern = to[x];
+        to[x] = combine(rop, pattern, from[x], to[x]);
+    }
+}
+
+} // namespace
 
 void Canvas::blit(const QImage& source, QPoint at, Rop3 rop, const Ink& brush) {
     const QRect whole(at, source.size());
     for (const QRect& visible : clip) {
         const QRect part = visible & whole;
-        if (part.isEmpty())
-            continue;
         for (int y = part.top(); y <= part.bottom(); ++y) {
             const auto* from = reinterpret_cast<const Pixel*>(source.constScanLine(y - at.y())) - at.x();
-            Pixel* to = row(y);
-            if (rop == kRop3Source) {
-                std::copy(from + part.left(), from + part.right() + 1, to + part.left());
-                continue;
-            }
-            Pixel pattern = 0;
-            for (int x = part.left(); x <= part.right(); ++x) {
-                if (!brush.at(x, y, pattern))
-                    pattern = to[x];
-                to[x] = combine(rop, pattern, from[x], to[x]);
-            }
+            blitRow(row(y), from, {y, part.left(), part.right() + 1}, rop, brush);
         }
         touched_ |= part;
     }

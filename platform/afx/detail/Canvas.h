@@ -67,7 +67,7 @@ public:
     void fill(const QRect& area, const Ink& ink);
     void fill(const Spans& spans, const Ink& ink);
     void plot(QPoint point, const Ink& ink);
-    /// Plots many points of one ink; gaps in the clipping area are looked up once a rectangle.
+    /// Many points of one ink.
     void plot(std::span<const QPoint> points, const Ink& ink);
     /// Combines `source`, whose pixels are in this canvas's format, with the pixels from `at` on.
     void blit(const QImage& source, QPoint at, Rop3 rop, const Ink& brush);
@@ -78,6 +78,7 @@ public:
 
 private:
     void fillClipped(const QRect& area, const Ink& ink);
+    void plotVisible(QPoint point, const Ink& ink, const PenOperation& operation);
     QRect touched_;
 };
 

@@ -1,5 +1,6 @@
 #include "platform/afx/detail/GdiObjects.h"
 
+#include <algorithm>
 #include <array>
 #include <utility>
 
@@ -34,9 +35,14 @@ HBITMAP addBitmap(int width, int height, PixelFormat format) {
 }
 
 HBITMAP addBitmap(const QImage& image, PixelFormat format) {
-    QImage pixels = image.convertToFormat(QImage::Format_RGB32);
+    // The pixels may be the caller's own memory, and their unused byte anything.
+    QImage pixels = image.format() == QImage::Format_RGB32 ? image.copy() : image.convertToFormat(QImage::Format_RGB32);
     if (pixels.isNull())
         return nullptr;
+    for (int y = 0; y < pixels.height(); ++y) {
+        auto* row = reinterpret_cast<Pixel*>(pixels.scanLine(y));
+        std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | kOpaque; });
+    }
     return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(pixels), format, nullptr}));
 }
 

@@ -287,6 +287,8 @@ void MdiChildWindow::show(int command) {
         return;
     }
     guarded([&] {
+        // Hiding the frame before its first showing has hidden the inner widget for good, as if it had been asked for.
+        m_main->setVisible(visible);
         switch (command) {
         case SW_HIDE:
             widget()->hide();

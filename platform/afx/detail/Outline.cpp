@@ -29,17 +29,16 @@ std::span<const int> dashPattern(UINT style) {
     }
 }
 
+/// All patterns repeat after this many pixels.
+constexpr int kDashPeriod = 24;
+
 bool isOn(std::span<const int> pattern, int phase) {
-    int length = 0;
-    for (const int part : pattern)
-        length += part;
-    phase %= std::max(1, length);
-    for (std::size_t i = 0; i < pattern.size(); ++i) {
-        if (phase < pattern[i])
-            return i % 2 == 0;
-        phase -= pattern[i];
-    }
-    return true;
+    if (pattern.empty())
+        return true;
+    std::size_t part = 0;
+    for (phase %= kDashPeriod; phase >= pattern[part % pattern.size()]; ++part)
+        phase -= pattern[part % pattern.size()];
+    return part % 2 == 0;
 }
 
 int deviceWidth(const DeviceContext& context) {
@@ -61,22 +60,24 @@ Outline::Outline(const DeviceContext& context, Canvas& canvas)
         gap_ = context.ink(context.state.backColor, ink_->rop);
 }
 
-void Outline::dot(QPoint point) {
-    const auto& ink = isOn(dashPattern(style_), phase_++) ? ink_ : gap_;
-    if (ink)
-        canvas_.plot(point, *ink);
+void Outline::addPixel(QPoint point, int phase) {
+    (isOn(dashPattern(style_), phase) ? on_ : off_).push_back(point);
+}
+
+void Outline::plotPixels() {
+    canvas_.plot(on_, *ink_);
+    if (gap_)
+        canvas_.plot(off_, *gap_);
+    on_.clear();
+    off_.clear();
 }
 
 void Outline::thin(const QPolygon& points) {
     const QRect bounds = canvas_.bounds();
     for (qsizetype i = 0; i + 1 < points.size(); ++i) {
         const LinePixels pixels(points[i], points[i + 1]);
-        const LinePixels::Range range = pixels.within(bounds);
-        const int before = phase_;
-        phase_ += range.first;
-        for (int index = range.first; index < range.last; ++index)
-            dot(pixels.at(index));
-        phase_ = before + pixels.count();
+        pixels.forEach(pixels.within(bounds), [&](int index, QPoint point) { addPixel(point, phase_ + index); });
+        phase_ = (phase_ + pixels.count() % kDashPeriod) % kDashPeriod;
     }
 }
 
@@ -103,7 +104,8 @@ void Outline::line(const QPolygon& points, LastPoint last) {
     }
     thin(points);
     if (last == LastPoint::drawn)
-        dot(points.last());
+        addPixel(points.last(), phase_);
+    plotPixels();
 }
 
 void Outline::closed(const QPolygon& points) {
@@ -118,6 +120,7 @@ void Outline::closed(const QPolygon& points) {
     }
     thin(points);
     thin(QPolygon({points.last(), points.first()}));
+    plotPixels();
 }
 
 void Outline::rectangle(const QRect& box) {
@@ -134,7 +137,8 @@ void Outline::rounded(const QRect& box, QSize corner, const Spans& rows) {
         return;
     if (!isWide()) {
         for (const QPoint& point : outlineOf(rows))
-            dot(point);
+            addPixel(point, phase_++);
+        plotPixels();
         return;
     }
     QRectF middle = QRectF(box.topLeft(), box.bottomRight());

@@ -24,7 +24,8 @@ public:
 
 private:
     void thin(const QPolygon& points);
-    void dot(QPoint point);
+    void addPixel(QPoint point, int phase);
+    void plotPixels();
     void wide(const QPainterPath& path);
     [[nodiscard]] bool isWide() const {
         return width_ > 1;
@@ -37,6 +38,8 @@ private:
     UINT style_;
     int width_;
     int phase_ = 0; ///< pixels of the dash pattern used up
+    std::vector<QPoint> on_;
+    std::vector<QPoint> off_;
 };
 
 } // namespace tvx::afx

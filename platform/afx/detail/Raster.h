@@ -7,6 +7,7 @@
 #include <QPolygonF>
 #include <QRect>
 
+#include <cstdint>
 #include <cstdlib>
 #include <span>
 #include <vector>
@@ -44,6 +45,9 @@ public:
     [[nodiscard]] Range within(const QRect& bounds) const;
     /// Pixel number `index`.
     [[nodiscard]] QPoint at(int index) const;
+    /// Calls `plot(index, point)` for the pixels of a range, in order.
+    template <class Plot>
+    void forEach(Range range, Plot plot) const;
 
 private:
     QPoint from_;
@@ -52,6 +56,30 @@ private:
     int majorStep_;
     std::int64_t minorDelta_;
 };
+
+template <class Plot>
+void LinePixels::forEach(Range range, Plot plot) const {
+    if (range.first >= range.last)
+        return;
+    // The rest of the division that `at` does, carried on from pixel to pixel.
+    const QPoint start = at(range.first) - from_;
+    const std::int64_t whole = 2 * std::int64_t{count_};
+    std::int64_t minor = steep_ ? start.x() : start.y();
+    std::int64_t rest = 2 * minorDelta_ * range.first + count_ - minor * whole;
+    for (int index = range.first; index < range.last; ++index) {
+        const int major = majorStep_ * index;
+        const int across = static_cast<int>(minor);
+        plot(index, from_ + (steep_ ? QPoint(across, major) : QPoint(major, across)));
+        rest += 2 * minorDelta_;
+        if (rest >= whole) {
+            rest -= whole;
+            ++minor;
+        } else if (rest < 0) {
+            rest += whole;
+            --minor;
+        }
+    }
+}
 
 /// The rows of the largest ellipse inside `box`, top row first. Empty for an empty box.
 [[nodiscard]] TVX_PLATFORM_API Spans ellipseSpans(const QRect& box);

@@ -61,4 +61,38 @@ constexpr Pixel combine(Rop3 rop, Pixel brush, Pixel source, Pixel destination) 
            (brush & combine(withBrush, source, destination));
 }
 
+/// A binary operation with a pen that does not change, in two steps for each pixel.
+class PenOperation {
+public:
+    constexpr PenOperation(Rop2 rop, Pixel pen)
+        : and_(combine(rop, pen, 0) ^ combine(rop, pen, ~Pixel{0})), xor_(combine(rop, pen, 0)) {}
+    [[nodiscard]] constexpr Pixel operator()(Pixel destination) const {
+        return ((destination & and_) ^ xor_) | kOpaque;
+    }
+
+private:
+    Pixel and_;
+    Pixel xor_;
+};
+
+/// A ternary operation with a brush that does not change: its polynomial in source and destination.
+class BlitOperation {
+public:
+    constexpr BlitOperation(Rop3 rop, Pixel brush)
+        : constant_(combine(rop, brush, 0, 0)),
+          source_(constant_ ^ combine(rop, brush, ~Pixel{0}, 0)),
+          destination_(constant_ ^ combine(rop, brush, 0, ~Pixel{0})),
+          both_(constant_ ^ source_ ^ destination_ ^ combine(rop, brush, ~Pixel{0}, ~Pixel{0})) {}
+    [[nodiscard]] constexpr Pixel operator()(Pixel source, Pixel destination) const {
+        return (constant_ ^ (source & source_) ^ (destination & destination_) ^ (source & destination & both_)) |
+               kOpaque;
+    }
+
+private:
+    Pixel constant_;
+    Pixel source_;
+    Pixel destination_;
+    Pixel both_;
+};
+
 } // namespace tvx::afx

@@ -115,8 +115,10 @@ void Window::realize(const CREATESTRUCT& cs) {
     const bool ownSize = cs.cx != CW_USEDEFAULT;
     const QPoint place = ownPlace ? QPoint(cs.x, cs.y) : current.topLeft();
     const QSize size = ownSize ? QSize(cs.cx, cs.cy) : current.size();
-    if (isChild() || ownPlace || ownSize) {
+    if (isChild() || ownPlace) {
         setWindowRect(QRect(place, size));
+    } else if (ownSize) {
+        m_widget->resize(size); // the place is left to the desktop
     }
     widgetMade();
 }

@@ -179,9 +179,12 @@ bool WindowTarget::open(Canvas& canvas) {
     if (!widget_ || !widget_->isVisible())
         return false;
     const QRect area = area_();
-    QRegion clip = drawableRegion(*widget_, part_) & area;
-    if (limit)
-        clip &= *limit;
+    if (!drawable_ || !layoutIsFixed) {
+        drawable_ = drawableRegion(*widget_, part_) & area;
+        if (limit)
+            *drawable_ &= *limit;
+    }
+    const QRegion& clip = *drawable_;
     const QPoint widgetOrigin = widget_->mapTo(widget_->window(), QPoint());
     origin_ = widgetOrigin + area.topLeft();
     QImage* image = WindowSurface::of(*widget_).open(clip.boundingRect().translated(widgetOrigin));
@@ -220,6 +223,7 @@ PaintTarget::PaintTarget(QWidget& widget, const QRegion& update, std::function<Q
     surface_ = &WindowSurface::of(widget);
     surface_->beginPaint();
     window_.shownBy = WindowSurface::ShownBy::toolkit;
+    window_.layoutIsFixed = true;
 }
 
 PaintTarget::~PaintTarget() {

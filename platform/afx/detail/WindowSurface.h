@@ -80,12 +80,15 @@ public:
     /// Nothing outside of this, in the widget's coordinates, is drawn.
     std::optional<QRegion> limit;
     WindowSurface::ShownBy shownBy = WindowSurface::ShownBy::flush;
+    /// Whether windows are laid out as they are until the target's end, so that what is visible is found out once.
+    bool layoutIsFixed = false;
 
 private:
     QPointer<QWidget> widget_;
     WindowPart part_;
     std::function<QRect()> area_;
     QPoint origin_; ///< of the area in the window, while open
+    std::optional<QRegion> drawable_;
 };
 
 /// What a widget's paint event draws on: the window's pixels, or those of a picture that is being taken of it.
