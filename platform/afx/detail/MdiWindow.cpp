@@ -235,6 +235,8 @@ QWidget* MdiChildWindow::childHost() const {
 QWidget* MdiChildWindow::makeWidget(QWidget*) {
     auto* sub = new SubWindow;
     m_main = makeMainWidget(sub, Qt::Widget);
+    // The toolkit's main window makes itself a top-level window whatever it is told at first.
+    m_main->setWindowFlags(Qt::Widget);
     sub->setWidget(m_main);
     guarded([&] { client().area()->addSubWindow(sub); });
     sub->hide();
@@ -287,8 +289,6 @@ void MdiChildWindow::show(int command) {
         return;
     }
     guarded([&] {
-        // Hiding the frame before its first showing has hidden the inner widget for good, as if it had been asked for.
-        m_main->setVisible(visible);
         switch (command) {
         case SW_HIDE:
             widget()->hide();
