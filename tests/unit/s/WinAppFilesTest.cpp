@@ -5,6 +5,25 @@
 
 using namespace std::string_literals;
 
+namespace {
+
+/// A template that has its texts from the test and makes no documents.
+class Template : public CMultiDocTemplate {
+public:
+    Template(const char* name, const char* extension)
+        : CMultiDocTemplate(0, nullptr, nullptr, nullptr), m_name(name), m_extension(extension) {}
+    BOOL GetDocString(CString& text, DocStringIndex index) const override {
+        text = index == filterName ? m_name : index == filterExt ? m_extension : CString();
+        return !text.IsEmpty();
+    }
+
+private:
+    CString m_name;
+    CString m_extension;
+};
+
+} // namespace
+
 TEST(WinAppFiles, FilterEntriesFollowEachOther) {
     CString filter;
     Gui_WinApp::AddFileFilter(filter, "Drawings", "*.brd");
@@ -31,4 +50,18 @@ TEST(WinAppFiles, TheHelpButtonIsTakenAwayAndNothingElse) {
 TEST(WinAppFiles, TheTitleIsAStringOfTheResources) {
     EXPECT_STREQ(theApp.GetTitleForFileDialog(20079), "Web Browser");
     EXPECT_STREQ(theApp.GetTitleForFileDialog(20050), "");
+}
+
+TEST(WinAppFiles, TemplatesBringTheirEntriesAndTheDefaultExtension) {
+    EXPECT_STREQ(theApp.GetDefaultExtForFileDialog(nullptr), "");
+    EXPECT_TRUE(theApp.GetFilterForFileDialog(nullptr, 0).IsEmpty());
+
+    auto* const notes = new Template("Notes", ".nts");
+    for (CDocTemplate* added : {new Template("Drawings", ".brd"), new Template("Console", ""), notes})
+        theApp.AddDocTemplate(added);
+    EXPECT_EQ(theApp.GetFilterForFileDialog(nullptr, 0).View(), "Drawings\0*.brd\0Notes\0*.nts\0\0"s);
+    EXPECT_TRUE(theApp.GetFilterForFileDialog(nullptr, 1).View().ends_with("*.nts\0All Files (*.*)\0*.*\0\0"s));
+    EXPECT_EQ(theApp.GetFilterForFileDialog(notes, 0).View(), "Notes\0*.nts\0\0"s);
+    EXPECT_STREQ(theApp.GetDefaultExtForFileDialog(nullptr), "brd");
+    EXPECT_STREQ(theApp.GetDefaultExtForFileDialog(notes), "nts");
 }
