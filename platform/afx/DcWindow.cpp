@@ -21,32 +21,47 @@ HDC screenContext() {
     return addContext(std::make_shared<DeviceContext>(DcKind::screen, std::make_unique<ScreenTarget>()));
 }
 
-HDC windowContext(HWND handle, WindowPart part) {
+/// The client area of a window in its client widget; empty when the window is gone.
+QRect clientArea(HWND handle) {
     const Window* window = Window::from(handle);
-    QWidget* widget = nullptr;
-    if (window != nullptr) {
-        widget = part == WindowPart::client ? window->clientWidget() : window->widget();
-    }
-    if (widget == nullptr) {
-        SetLastError(ERROR_INVALID_WINDOW_HANDLE);
-        return nullptr;
-    }
-    auto area = [handle, part] {
-        const Window* current = Window::from(handle);
-        if (current == nullptr || current->widget() == nullptr) {
-            return QRect();
-        }
-        return part == WindowPart::client ? current->clientRect() : current->widget()->rect();
-    };
-    auto context =
-        std::make_shared<DeviceContext>(DcKind::window, std::make_unique<WindowTarget>(*widget, part, std::move(area)));
-    context->window = handle;
+    return window ? window->clientRect() : QRect();
+}
+
+/// The whole window in its widget's coordinates. A frame that the desktop draws reaches beyond the widget.
+QRect wholeArea(HWND handle) {
+    const Window* window = Window::from(handle);
+    if (!window || !window->widget())
+        return {};
+    const QRect screen = window->screenRect();
+    return {window->widget()->mapFromGlobal(screen.topLeft()), screen.size()};
+}
+
+HDC addWindowContext(HWND window, DcKind kind, std::unique_ptr<DrawTarget> target) {
+    auto context = std::make_shared<DeviceContext>(kind, std::move(target));
+    context->window = window;
     return addContext(std::move(context));
 }
 
-/// A pointer to a window object that must have a window; null stands for the screen.
+HDC windowContext(HWND handle, WindowPart part) {
+    const Window* window = Window::from(handle);
+    const bool client = part == WindowPart::client;
+    QWidget* widget = !window ? nullptr : client ? window->clientWidget() : window->widget();
+    if (!widget) {
+        SetLastError(ERROR_INVALID_WINDOW_HANDLE);
+        return nullptr;
+    }
+    const auto area = [handle, client] { return client ? clientArea(handle) : wholeArea(handle); };
+    return addWindowContext(handle, DcKind::window, std::make_unique<WindowTarget>(*widget, part, area));
+}
+
+/// The handle of a window object; null for no object, which stands for the screen. Raises CResourceException when the
+/// object has no window.
 HWND handleOf(const CWnd* window) {
-    return window != nullptr ? window->m_hWnd : nullptr;
+    if (!window)
+        return nullptr;
+    if (!Window::from(window->m_hWnd))
+        AfxThrowResourceException();
+    return window->m_hWnd;
 }
 
 } // namespace
@@ -66,35 +81,30 @@ int ReleaseDC(HWND, HDC dc) {
 }
 
 HDC BeginPaint(HWND handle, PAINTSTRUCT* paint) {
-    *paint = {};
     Window* window = Window::from(handle);
-    QWidget* client = window != nullptr ? window->clientWidget() : nullptr;
-    if (client == nullptr) {
+    if (!window || !window->clientWidget() || !paint) {
         SetLastError(ERROR_INVALID_WINDOW_HANDLE);
         return nullptr;
     }
-    auto area = [handle] {
-        const Window* current = Window::from(handle);
-        return current != nullptr ? current->clientRect() : QRect();
-    };
-    const QRegion update = window->paintRegion.translated(window->clientRect().topLeft());
-    auto context =
-        std::make_shared<DeviceContext>(DcKind::paint, std::make_unique<PaintTarget>(*client, update, std::move(area)));
-    context->window = handle;
-    paint->hdc = addContext(std::move(context));
-    paint->rcPaint = fromQt(window->paintRegion.boundingRect());
-    paint->fErase = SendMessageA(handle, WM_ERASEBKGND, reinterpret_cast<WPARAM>(paint->hdc), 0) == 0 ? TRUE : FALSE;
+    const QRegion update = window->inPaint ? window->paintRegion : QRegion();
+    auto target =
+        std::make_unique<PaintTarget>(*window->clientWidget(), update.translated(window->clientRect().topLeft()),
+                                      [handle] { return clientArea(handle); });
+    *paint = {};
+    paint->hdc = addWindowContext(handle, DcKind::paint, std::move(target));
+    paint->rcPaint = fromQt(update.boundingRect());
+    if (!update.isEmpty())
+        paint->fErase = window->call(WM_ERASEBKGND, reinterpret_cast<WPARAM>(paint->hdc)) == 0;
     return paint->hdc;
 }
 
 BOOL EndPaint(HWND, const PAINTSTRUCT* paint) {
-    return removeContext(paint->hdc) ? TRUE : FALSE;
+    const auto context = findContext(paint ? paint->hdc : nullptr);
+    return context && context->kind == DcKind::paint && removeContext(paint->hdc);
 }
 
 CClientDC::CClientDC(CWnd* window) : m_hWnd(handleOf(window)) {
-    if (!Attach(window != nullptr && m_hWnd == nullptr ? nullptr : ::GetDC(m_hWnd))) {
-        AfxThrowResourceException();
-    }
+    Attach(::GetDC(m_hWnd));
 }
 
 CClientDC::~CClientDC() {
@@ -102,9 +112,7 @@ CClientDC::~CClientDC() {
 }
 
 CWindowDC::CWindowDC(CWnd* window) : m_hWnd(handleOf(window)) {
-    if (!Attach(window != nullptr && m_hWnd == nullptr ? nullptr : ::GetWindowDC(m_hWnd))) {
-        AfxThrowResourceException();
-    }
+    Attach(::GetWindowDC(m_hWnd));
 }
 
 CWindowDC::~CWindowDC() {
@@ -112,9 +120,8 @@ CWindowDC::~CWindowDC() {
 }
 
 CPaintDC::CPaintDC(CWnd* window) : m_hWnd(handleOf(window)) {
-    if (!Attach(::BeginPaint(m_hWnd, &m_ps))) {
+    if (!Attach(::BeginPaint(m_hWnd, &m_ps)))
         AfxThrowResourceException();
-    }
 }
 
 CPaintDC::~CPaintDC() {

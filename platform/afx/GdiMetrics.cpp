@@ -1,4 +1,5 @@
 #include "platform/afx/Gdi.h"
+#include "platform/afx/detail/Gui.h"
 
 #include <QApplication>
 #include <QScreen>
@@ -151,7 +152,7 @@ int fixedMetric(int index) {
 int GetSystemMetrics(int index) {
     if (const int fixed = fixedMetric(index))
         return fixed;
-    if (!qApp)
+    if (!tvx::afx::ensureGui())
         return 0;
     if (const int metric = frameMetric(index))
         return metric;

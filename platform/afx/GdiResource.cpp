@@ -1,5 +1,6 @@
 #include "platform/afx/Gdi.h"
 #include "platform/afx/detail/DeviceContext.h"
+#include "platform/afx/detail/Gui.h"
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Picture.h"
 #include "platform/win/Resource.h"
@@ -98,7 +99,7 @@ constexpr QStyle::StandardPixmap kPredefined[] = {
 
 HICON loadPredefined(LPCSTR name) {
     const std::size_t index = reinterpret_cast<std::uintptr_t>(name) - kFirstPredefined;
-    if (index >= std::size(kPredefined) || !qApp)
+    if (index >= std::size(kPredefined) || !ensureGui())
         return nullptr;
     const QIcon icon = QApplication::style()->standardIcon(kPredefined[index]);
     const int size = GetSystemMetrics(SM_CXICON);

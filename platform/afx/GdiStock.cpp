@@ -1,6 +1,7 @@
 #include "platform/afx/Gdi.h"
 #include "platform/afx/detail/Fonts.h"
 #include "platform/afx/detail/GdiObjects.h"
+#include "platform/afx/detail/Gui.h"
 
 #include <QApplication>
 #include <QPalette>
@@ -116,7 +117,7 @@ COLORREF GetSysColor(int index) {
         return 0;
     const PaletteColor& place = kSystemColors[index];
     const QColor color =
-        (qApp ? QApplication::palette() : QPalette(QColor(0xEF, 0xEF, 0xEF))).color(place.group, place.role);
+        (ensureGui() ? QApplication::palette() : QPalette(QColor(0xEF, 0xEF, 0xEF))).color(place.group, place.role);
     return RGB(color.red(), color.green(), color.blue());
 }
 

@@ -1,6 +1,7 @@
 #include "platform/afx/Thread.h"
 
 #include "platform/afx/App.h"
+#include "platform/afx/Dc.h"
 #include "platform/afx/Menu.h"
 #include "platform/afx/detail/Dispatch.h"
 #include "platform/afx/detail/Gui.h"
@@ -107,6 +108,8 @@ BOOL CWinThread::PumpMessage() {
 BOOL CWinThread::OnIdle(LONG) {
     CWnd::DeleteTempMap();
     CMenu::DeleteTempMap();
+    CDC::DeleteTempMap();
+    CGdiObject::DeleteTempMap();
     return FALSE;
 }
 

@@ -1,3 +1,5 @@
+#include "platform/afx/detail/Gui.h"
+
 #include <QApplication>
 #include <QFont>
 
@@ -9,7 +11,8 @@
 int main(int argc, char** argv) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     testing::InitGoogleTest(&argc, argv);
-    const QApplication application(argc, argv);
+    if (!tvx::afx::ensureGui())
+        return 1;
     QApplication::setStyle(QStringLiteral("Fusion"));
     QFont font(QStringLiteral("DejaVu Sans Condensed"));
     font.setPixelSize(11);

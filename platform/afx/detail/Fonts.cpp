@@ -1,5 +1,6 @@
 #include "platform/afx/detail/Fonts.h"
 
+#include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Mapping.h"
 #include "platform/base/Text.h"
 
@@ -155,7 +156,7 @@ FontKey keyOf(const LOGFONTA& font) {
 std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
     // Fonts must not outlive the connection to the desktop; a host has few different ones.
     static std::map<FontKey, std::shared_ptr<const RealizedFont>> fonts;
-    if (!qGuiApp)
+    if (!ensureGui())
         return nullptr;
     static const auto cleared = QObject::connect(qGuiApp, &QObject::destroyed, [] { fonts.clear(); });
     constexpr std::size_t kMostFonts = 256;
