@@ -7,6 +7,7 @@
 #include <QApplication>
 #include <QKeyEvent>
 #include <QMessageBox>
+#include <QPointer>
 #include <QPushButton>
 
 #include <array>
@@ -83,13 +84,19 @@ public:
             addButton(button);
         }
         setWindowModality(Qt::ApplicationModal);
+        const QPointer<QWidget> before = QApplication::activeWindow();
         guarded([this] {
             show();
             raise();
             activateWindow();
         });
         const int answer = m_loop.run();
-        guarded([this] { hide(); });
+        guarded([&] {
+            hide();
+            if (before != nullptr && before->isVisible()) {
+                before->activateWindow(); // not every window manager does it
+            }
+        });
         return answer > 0 ? answer : defaultOf(m_type).answer;
     }
 

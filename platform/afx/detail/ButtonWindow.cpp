@@ -140,7 +140,10 @@ void ButtonWindow::applyText() {
         const bool marked = dynamic_cast<QPushButton*>(widget()) == nullptr;
         shown = wrapped(shown, widget()->fontMetrics(), widget()->width() - (marked ? 20 : 8));
     }
-    guarded([&] { button()->setText(shown); });
+    guarded([&] {
+        button()->setText(shown);
+        button()->setShortcut({}); // mnemonics are the dialog's; the toolkit's act late
+    });
     button()->setAccessibleName(picture ? text() : QString());
 }
 

@@ -106,7 +106,9 @@ void DialogWindow::setWindowRect(const QRect& rect) {
 }
 
 void DialogWindow::keepOnScreen() {
-    const QRect area = widget()->screen()->availableGeometry();
+    // The window manager's frame is unknown until the dialog is shown.
+    constexpr QMargins frame(0, 0, 8, 32);
+    const QRect area = widget()->screen()->availableGeometry() - ((style() & WS_CAPTION) != 0 ? frame : QMargins());
     const QRect now = widget()->frameGeometry();
     QRect place = now;
     place.moveRight(std::min(place.right(), area.right()));
@@ -273,7 +275,8 @@ HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
     const bool known = findWindowClass(item.className.c_str()) != nullptr;
     cs.lpszClass = known ? item.className.c_str() : emptyPaneClass;
     cs.lpszName = caption.c_str();
-    cs.style = static_cast<LONG>((item.style | WS_CHILD) & ~DWORD{WS_VISIBLE});
+    const DWORD later = WS_VISIBLE | (known ? 0U : DWORD{WS_TABSTOP});
+    cs.style = static_cast<LONG>((item.style | WS_CHILD) & ~later);
     const bool edge = hasClientEdge(item.className) && (item.style & WS_BORDER) != 0;
     cs.dwExStyle = item.extendedStyle | (edge ? DWORD{WS_EX_CLIENTEDGE} : 0);
     cs.x = place.x();

@@ -22,12 +22,14 @@ namespace tvx::afx {
 
 namespace {
 
-/// A press that pre-translation consumed: the toolkit sends it a second time, and that one must vanish too.
-struct ConsumedKey {
+/// A press that pre-translation has seen already, when the toolkit asked for shortcuts. Presses that come without that
+/// question (redelivered ones, those of input methods and tests) are offered when they arrive.
+struct OfferedKey {
     int key = 0;
     quint64 timestamp = 0;
+    bool consumed = false;
     bool pending = false;
-} consumedKey;
+} offeredKey;
 
 /// Whether Alt went down and nothing else happened since: its release then opens the menu bar.
 bool altAlone = false;
@@ -78,19 +80,17 @@ bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
     if (EventCapture::instance().isCollecting()) {
         return true;
     }
-    consumedKey.pending = false;
     armIdle();
-    if (preTranslate(msg)) {
-        consumedKey = {event.key(), event.timestamp(), true};
-    }
+    const bool consumed = preTranslate(msg);
+    offeredKey = {event.key(), event.timestamp(), consumed, true};
     return true;
 }
 
-bool takeConsumed(const QKeyEvent& event) {
-    const bool same = consumedKey.pending && consumedKey.key == event.key() &&
-                      (consumedKey.timestamp == event.timestamp() || event.timestamp() == 0);
-    consumedKey.pending = false;
-    return same;
+/// Whether pre-translation consumes a press, or has done so.
+bool isConsumed(const QKeyEvent& event, MSG msg) {
+    const bool offered = std::exchange(offeredKey.pending, false) && offeredKey.key == event.key() &&
+                         (offeredKey.timestamp == event.timestamp() || event.timestamp() == 0);
+    return offered ? offeredKey.consumed : preTranslate(msg);
 }
 
 /// Characters go one message each; the event itself goes to the widget with the first that nobody handled.
@@ -108,24 +108,18 @@ void deliverCharacters(Window& window, const QKeyEvent& event, EventSource& sour
 
 bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
     altAlone = event.key() == Qt::Key_Alt;
-    if (takeConsumed(event)) {
-        event.accept();
-        return true;
-    }
     const MSG msg = keyMessage(window, event, false);
+    noteKey(static_cast<int>(msg.wParam), true);
     if (keepForPeek(msg, receiver, &event)) {
         return true;
     }
-    // The toolkit's question before its shortcuts is not kept for PeekMessage, so a kept press is offered here.
-    if (EventCapture::instance().isRedelivering()) {
-        MSG offered = msg;
-        if (preTranslate(offered)) {
-            event.accept();
-            return true;
-        }
+    const HWND target = window.handle();
+    if (isConsumed(event, msg) || Window::from(target) == nullptr) {
+        event.accept();
+        return true;
     }
     EventSource source{receiver, &event};
-    const HWND handle = window.handle();
+    const HWND handle = target;
     const bool makesCharacters = !event.text().isEmpty();
     if (makesCharacters) {
         // A widget inserts the character at this one event, so it gets it where the framework would insert it.

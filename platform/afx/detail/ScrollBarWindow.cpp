@@ -39,6 +39,7 @@ int codeOf(int action) {
 QWidget* ScrollBarWindow::makeWidget(QWidget* parent) {
     auto* bar = new QScrollBar((style() & SBS_VERT) != 0 ? Qt::Vertical : Qt::Horizontal, parent);
     bar->setRange(0, 0);
+    bar->setInvertedControls(bar->orientation() == Qt::Vertical);
     // The parent decides where the slider stands; the toolkit's own idea is put back before it acts on it.
     QObject::connect(bar, &QScrollBar::actionTriggered, bar, [this, bar](int action) {
         const int code = codeOf(action);

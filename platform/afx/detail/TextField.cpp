@@ -97,9 +97,7 @@ public:
         return 0;
     }
     void scrollLines(int) override {}
-    void showCaret() override {
-        m_edit->setCursorPosition(m_edit->cursorPosition());
-    }
+    void showCaret() override {} // it always is
     QMenu* makeMenu() override {
         return m_edit->createStandardContextMenu();
     }

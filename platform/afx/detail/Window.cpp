@@ -99,6 +99,9 @@ Window::~Window() = default;
 
 void Window::realize(const CREATESTRUCT& cs) {
     m_widget = makeWidget(m_parent != nullptr ? m_parent->childHost() : nullptr);
+    if (!m_widget->isWindow()) {
+        m_widget->hide(); // else it would come up with its parent
+    }
     m_handle = newHandle(*m_widget, !isChild());
     tables().byHandle[reinterpret_cast<std::uintptr_t>(m_handle)] = this;
     tables().byWidget[m_widget] = this;

@@ -1,0 +1,32 @@
+#include "platform/afx/App.h"
+#include "platform/afx/detail/Gui.h"
+
+#include <QApplication>
+#include <QFont>
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+
+namespace {
+
+/// Pre-translation and the road of commands end at the application object, so there is one.
+CWinApp testApplication("Afx tests");
+
+} // namespace
+
+/// Pixels and metrics are compared, so display, style and font are the same on every machine.
+int main(int argc, char** argv) {
+    setenv("QT_QPA_PLATFORM", "offscreen", 1);
+    testing::InitGoogleTest(&argc, argv);
+    QApplication::setStyle(QStringLiteral("Fusion"));
+    if (!tvx::afx::ensureGui()) {
+        return 1;
+    }
+    QFont font(QStringLiteral("DejaVu Sans Condensed"));
+    font.setPixelSize(11);
+    font.setHintingPreference(QFont::PreferFullHinting);
+    font.setKerning(false);
+    QApplication::setFont(font);
+    return RUN_ALL_TESTS();
+}
