@@ -32,6 +32,7 @@ public:
         MsgTypeInternal = 5, ///< a mistake in the program or in what is installed with it
         MsgTypeFatal = 6     ///< the application cannot go on
     };
+    /// The number of types.
     static constexpr int MsgTypeCount = 7;
 
     /// Whether messages from one place are written.
@@ -49,6 +50,7 @@ public:
     /// Whether the manager takes messages. A disabled one is passed over: the message goes to the manager registered
     /// before it. Managers start enabled.
     bool getEnabled() const;
+    /// Makes the manager take messages, or be passed over.
     void setEnabled(bool enabled);
 
     /// Whether work should stop: 0 means go on, any other value is the code with which the application should end.
@@ -110,10 +112,12 @@ public:
 
     /// Whether messages are written without the prefix that names their type. Off at first.
     bool getClean() const;
+    /// Turns the prefixes off, or on again with false.
     void setClean(bool clean);
 
     /// The width in columns at which lines are wrapped; 80 at first. 0 or less means that they are not.
     int getMaxLineWidth() const;
+    /// Sets the width for the messages that follow.
     void setMaxLineWidth(int columns);
 
     /// Turns a message into lines.

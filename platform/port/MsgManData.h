@@ -23,9 +23,13 @@ public:
     /// @param revision the source's revision, for debuggers; it is not shown.
     static Port_MsgManData createObject(const char* module, const char* source, int line, const char* revision);
 
+    /// Says what is going on, or what the user asked for.
     [[gnu::format(printf, 2, 3)]] void issueStatus(const char* format, ...) const;
+    /// Says something worth knowing.
     [[gnu::format(printf, 2, 3)]] void issueInfo(const char* format, ...) const;
+    /// Says that the work goes on although its result may not be what was wanted.
     [[gnu::format(printf, 2, 3)]] void issueWarning(const char* format, ...) const;
+    /// Says what could not be done, so that the user can do something about it.
     [[gnu::format(printf, 2, 3)]] void issueError(const char* format, ...) const;
     /// For mistakes of the program or its installation rather than of its user.
     [[gnu::format(printf, 2, 3)]] void issueInternal(const char* format, ...) const;

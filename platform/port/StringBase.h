@@ -24,9 +24,10 @@ class TVX_PLATFORM_API StringBase<char> {
 public:
     /// A stretch of a text. One that begins at 0 with length 0 stands before the first token.
     struct Range {
-        int start = 0;
-        int length = 0;
+        int start = 0;  ///< position of the first byte
+        int length = 0; ///< number of bytes
     };
+    /// Whether letter case counts in a comparison.
     enum class Case { Sensitive, Ignored };
 
     /// An empty text.
@@ -43,8 +44,10 @@ public:
     const std::string& str() const;
     /// The number of bytes.
     int GetLength() const;
+    /// Whether there is not a single byte.
     bool IsEmpty() const;
 
+    /// Appends @p other.
     StringBase& operator+=(const StringBase& other);
     friend StringBase operator+(StringBase left, const StringBase& right) {
         return left += right;
