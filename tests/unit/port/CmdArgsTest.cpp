@@ -144,7 +144,7 @@ TEST(OptionSpec, MistakesAreInternalErrorsThatNameTheLine) {
              {"<a> *", "\"*\" is no count range such as \"1\", \"0..3\" or \"1..*\""},
          }) {
         Collector collector;
-        const std::string specification = "good none\n\n" + std::string(line) + "\n";
+        const std::string specification = "good none\r\n\n" + std::string(line) + "\r";
         const char* argument = "-whatever";
         const UT_CMDARGS args(1, &argument, specification.c_str(), nullptr, UT_CMDARGS::NoProgramName);
         EXPECT_TRUE(args.iserror());

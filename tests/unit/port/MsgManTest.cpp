@@ -90,6 +90,7 @@ TEST(MsgFormat, CountsEastAsianCharactersAsTwoColumns) {
     EXPECT_EQ(wrap("図面。", 4), (Lines{"図\n", "面。\n"})) << "a full stop does not begin a line";
     EXPECT_EQ(wrap("a図面", 3), (Lines{"a図\n", "面\n"}));
     EXPECT_EQ(wrap("e\u0301e\u0301e\u0301", 2), (Lines{"e\u0301e\u0301\n", "e\u0301\n"})) << "marks take no column";
+    EXPECT_EQ(wrap("図か\u3099xx", 5), (Lines{"図\n", "か\u3099xx\n"})) << "a mark stays with its character";
 }
 
 TEST(MsgFormat, KeepsBrokenBytes) {
