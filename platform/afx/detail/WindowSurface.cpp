@@ -1,6 +1,5 @@
 #include "platform/afx/detail/WindowSurface.h"
 
-#include <QAbstractEventDispatcher>
 #include <QBackingStore>
 #include <QGroupBox>
 #include <QMdiSubWindow>
@@ -20,22 +19,6 @@ QHash<const QWidget*, WindowSurface*>& surfaces() {
     return all;
 }
 
-void flushAll() {
-    const auto all = surfaces();
-    for (WindowSurface* surface : all)
-        surface->flush();
-}
-
-/// Contexts that are kept open across messages show their drawing before the loop waits.
-void flushBeforeWaiting() {
-    static QPointer<QAbstractEventDispatcher> watched;
-    QAbstractEventDispatcher* dispatcher = QAbstractEventDispatcher::instance();
-    if (!dispatcher || watched == dispatcher)
-        return;
-    watched = dispatcher;
-    QObject::connect(dispatcher, &QAbstractEventDispatcher::aboutToBlock, flushAll);
-}
-
 } // namespace
 
 WindowSurface::WindowSurface(QWidget& window) : window_(window) {
@@ -43,7 +26,6 @@ WindowSurface::WindowSurface(QWidget& window) : window_(window) {
         surfaces().remove(key);
         delete this;
     });
-    flushBeforeWaiting();
 }
 
 WindowSurface& WindowSurface::of(const QWidget& widget) {
@@ -104,12 +86,29 @@ void WindowSurface::close(const QRect& touched, ShownBy shownBy) {
         if (alias_.isNull())
             writeCopy(touched);
         if (shownBy == ShownBy::flush)
-            unshown_ |= touched;
+            showLater(touched);
     }
     alias_ = QImage();
     if (began_)
         store_->endPaint();
     began_ = false;
+}
+
+/// A context that is kept open for longer shows its drawing when the program looks for the next message.
+void WindowSurface::showLater(const QRect& part) {
+    unshown_ |= part;
+    if (std::exchange(flushIsPosted_, true))
+        return;
+    const auto posted = [this] {
+        flushIsPosted_ = false;
+        flush();
+    };
+    QMetaObject::invokeMethod(this, posted, Qt::QueuedConnection);
+}
+
+void WindowSurface::endPaint() {
+    if (--painting_ == 0 && !unshown_.isEmpty())
+        showLater(QRect());
 }
 
 void WindowSurface::flush() {

@@ -18,8 +18,8 @@ namespace tvx::afx {
 ///
 /// The toolkit frees and replaces those pixels whenever it likes (a resize, hiding, another buffer), so they are asked
 /// for anew in each operation and never kept. Between operations the toolkit may paint the window; there is no session
-/// that would have to be closed first. What was drawn is shown (flushed) when a context is released, and before the
-/// event loop waits for those that are kept open.
+/// that would have to be closed first. What was drawn is shown (flushed) when a context is released; what was
+/// drawn through one that is kept open, when the program looks for its next event.
 class TVX_PLATFORM_API WindowSurface : public QObject {
 public:
     /// The surface of the window that `widget` is in. It lives as long as that window.
@@ -40,9 +40,7 @@ public:
     void beginPaint() {
         ++painting_;
     }
-    void endPaint() {
-        --painting_;
-    }
+    void endPaint();
 
 private:
     explicit WindowSurface(QWidget& window);
@@ -50,6 +48,7 @@ private:
     [[nodiscard]] bool isDirect(const QImage* image) const;
     void readCopy(const QImage* image, const QRect& wanted);
     void writeCopy(const QRect& touched);
+    void showLater(const QRect& part);
 
     QWidget& window_;
     QBackingStore* store_ = nullptr; ///< while open
@@ -58,6 +57,7 @@ private:
     QRect unshown_;
     int painting_ = 0;
     bool began_ = false;
+    bool flushIsPosted_ = false;
 };
 
 /// What a window's context covers.
