@@ -282,6 +282,19 @@ TEST(ModalDialogs, LieOnTheScreen) {
     dialog.DoModal();
 }
 
+TEST(Dialogs, StandOverTheMiddleOfTheirOwner) {
+    Owner owner;
+    CDialog dialog;
+    ASSERT_TRUE(dialog.Create(IDD_SHAPE, &owner));
+    CRect outer;
+    CRect inner;
+    owner.GetWindowRect(&outer);
+    dialog.GetWindowRect(&inner);
+    EXPECT_NEAR(inner.CenterPoint().x, outer.CenterPoint().x, 2);
+    EXPECT_NEAR(inner.CenterPoint().y, outer.CenterPoint().y, 2);
+    dialog.DestroyWindow();
+}
+
 TEST(Dialogs, ModelessOnesLiveBesideTheirOwner) {
     Owner owner;
     CDialog dialog;
