@@ -16,6 +16,8 @@ namespace {
 /// Whose messages the functions below collect: message managers take plain functions.
 Gui_WinAppData* s_target = nullptr;
 
+// Both have the type of the manager's callbacks, which take their texts by value.
+// NOLINTBEGIN(performance-unnecessary-value-param)
 void showError(CString text) {
     s_target->pending += text;
     AfxMessageBox(s_target->pending, MB_ICONERROR);
@@ -25,6 +27,7 @@ void collectStatus(CString line) {
     s_target->pending += line;
     s_target->pending += '\n';
 }
+// NOLINTEND(performance-unnecessary-value-param)
 
 void issueUsageText() {
     WinAppOrigin(__LINE__).issueStatus("%s", s_target->usageText.GetString());
