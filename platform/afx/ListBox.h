@@ -12,11 +12,13 @@ class TVX_PLATFORM_API CListBox : public CWnd {
     DECLARE_DYNAMIC(CListBox)
 
 public:
+    /// Creates the control with LBS_... styles.
     BOOL Create(DWORD style, const RECT& rect, CWnd* parent, UINT id);
     using CWnd::Create;
 
     // --- lines ---
 
+    /// Number of lines.
     int GetCount() const {
         return static_cast<int>(SendMessage(LB_GETCOUNT));
     }
@@ -33,6 +35,7 @@ public:
     int DeleteString(UINT index) {
         return static_cast<int>(SendMessage(LB_DELETESTRING, index));
     }
+    /// Removes all lines.
     void ResetContent() {
         SendMessage(LB_RESETCONTENT);
     }
@@ -40,6 +43,7 @@ public:
     int InitStorage(int lines, UINT bytes) {
         return static_cast<int>(SendMessage(LB_INITSTORAGE, static_cast<WPARAM>(lines), bytes));
     }
+    /// Bytes of a line, without the final zero.
     int GetTextLen(int index) const {
         return static_cast<int>(SendMessage(LB_GETTEXTLEN, static_cast<WPARAM>(index)));
     }
@@ -49,15 +53,19 @@ public:
     }
     /// Empty for a line that does not exist.
     void GetText(int index, CString& text) const;
+    /// The number a line carries, 0 from the start.
     DWORD_PTR GetItemData(int index) const {
         return static_cast<DWORD_PTR>(SendMessage(LB_GETITEMDATA, static_cast<WPARAM>(index)));
     }
+    /// Gives a line a number to carry; LB_ERR for a line that does not exist.
     int SetItemData(int index, DWORD_PTR data) {
         return static_cast<int>(SendMessage(LB_SETITEMDATA, static_cast<WPARAM>(index), static_cast<LPARAM>(data)));
     }
+    /// The same as a pointer, which stays the caller's.
     void* GetItemDataPtr(int index) const {
         return reinterpret_cast<void*>(GetItemData(index));
     }
+    /// Gives a line a pointer to carry; it stays the caller's.
     int SetItemDataPtr(int index, void* data) {
         return SetItemData(index, reinterpret_cast<DWORD_PTR>(data));
     }
@@ -65,6 +73,7 @@ public:
     int FindString(int after, LPCSTR text) const {
         return static_cast<int>(SendMessage(LB_FINDSTRING, static_cast<WPARAM>(after), reinterpret_cast<LPARAM>(text)));
     }
+    /// The same for a line that is the whole text.
     int FindStringExact(int after, LPCSTR text) const {
         return static_cast<int>(
             SendMessage(LB_FINDSTRINGEXACT, static_cast<WPARAM>(after), reinterpret_cast<LPARAM>(text)));
@@ -80,6 +89,7 @@ public:
     int SetCurSel(int index) {
         return static_cast<int>(SendMessage(LB_SETCURSEL, static_cast<WPARAM>(index)));
     }
+    /// Finds as FindString does and selects the line found.
     int SelectString(int after, LPCSTR text) {
         return static_cast<int>(
             SendMessage(LB_SELECTSTRING, static_cast<WPARAM>(after), reinterpret_cast<LPARAM>(text)));
@@ -92,6 +102,7 @@ public:
     int SetSel(int index, BOOL select = TRUE) {
         return static_cast<int>(SendMessage(LB_SETSEL, static_cast<WPARAM>(select), index));
     }
+    /// Number of selected lines; LB_ERR for single selections.
     int GetSelCount() const {
         return static_cast<int>(SendMessage(LB_GETSELCOUNT));
     }
@@ -100,31 +111,39 @@ public:
         return static_cast<int>(
             SendMessage(LB_GETSELITEMS, static_cast<WPARAM>(capacity), reinterpret_cast<LPARAM>(indices)));
     }
+    /// Selects the lines from `first` to `last` of a multiple selection, or takes them out.
     int SelItemRange(BOOL select, int first, int last) {
         return static_cast<int>(select ? SendMessage(LB_SELITEMRANGEEX, static_cast<WPARAM>(first), last)
                                        : SendMessage(LB_SELITEMRANGEEX, static_cast<WPARAM>(last), first));
     }
+    /// The line that the keyboard stands on.
     int GetCaretIndex() const {
         return static_cast<int>(SendMessage(LB_GETCARETINDEX));
     }
+    /// Moves the keyboard's line and shows it; the selection stays.
     int SetCaretIndex(int index, BOOL scroll = TRUE) {
         return static_cast<int>(SendMessage(LB_SETCARETINDEX, static_cast<WPARAM>(index), scroll));
     }
+    /// Sets the line that an extended selection begins at.
     void SetAnchorIndex(int index) {
         SendMessage(LB_SETANCHORINDEX, static_cast<WPARAM>(index));
     }
+    /// The line that an extended selection begins at.
     int GetAnchorIndex() const {
         return static_cast<int>(SendMessage(LB_GETANCHORINDEX));
     }
 
     // --- what is seen ---
 
+    /// The first line that is seen.
     int GetTopIndex() const {
         return static_cast<int>(SendMessage(LB_GETTOPINDEX));
     }
+    /// Scrolls so that this line is the first, as far as there are lines behind it.
     int SetTopIndex(int index) {
         return static_cast<int>(SendMessage(LB_SETTOPINDEX, static_cast<WPARAM>(index)));
     }
+    /// Height of lines in pixels.
     int GetItemHeight(int index) const {
         return static_cast<int>(SendMessage(LB_GETITEMHEIGHT, static_cast<WPARAM>(index)));
     }
@@ -143,6 +162,7 @@ public:
     void SetHorizontalExtent(int width) {
         SendMessage(LB_SETHORIZONTALEXTENT, static_cast<WPARAM>(width));
     }
+    /// The width set by SetHorizontalExtent, in pixels.
     int GetHorizontalExtent() const {
         return static_cast<int>(SendMessage(LB_GETHORIZONTALEXTENT));
     }
@@ -154,8 +174,11 @@ public:
 
     // --- owner drawing, when the parent did not answer ---
 
+    /// Paints a line into the context and rectangle of `item`.
     virtual void DrawItem(DRAWITEMSTRUCT* item);
+    /// Sets the height of lines, asked once when the control is created.
     virtual void MeasureItem(MEASUREITEMSTRUCT* item);
+    /// Frees what the data of a line that goes points to.
     virtual void DeleteItem(DELETEITEMSTRUCT* item);
 
 protected:
