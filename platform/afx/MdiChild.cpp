@@ -16,6 +16,7 @@ BEGIN_MESSAGE_MAP(CMDIChildWnd, CFrameWnd)
     ON_WM_MDIACTIVATE()
     ON_WM_MOUSEACTIVATE()
     ON_WM_DESTROY()
+    ON_WM_SIZE()
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -104,6 +105,15 @@ void CMDIChildWnd::OnDestroy() {
     }
 }
 
+void CMDIChildWnd::OnSize(UINT type, int cx, int cy) {
+    CFrameWnd::OnSize(type, cx, cy);
+    CMDIFrameWnd* frame = GetMDIFrame();
+    if (frame != nullptr && frame->MDIGetActive() == this) {
+        frame->OnUpdateFrameTitle(TRUE);  // a maximised child's name stands elsewhere in it
+        frame->m_nIdleFlags |= idleTitle; // the toolkit has its own idea of it, later
+    }
+}
+
 void CMDIChildWnd::ActivateFrame(int command) {
     CMDIFrameWnd* frame = GetMDIFrame();
     if (frame == nullptr) {
@@ -176,8 +186,12 @@ void CMDIChildWnd::OnUpdateFrameTitle(BOOL addToTitle) {
     }
     CString before;
     GetWindowText(before);
-    if (before != text) {
-        SetWindowText(text);
+    if (before == text) {
+        return;
+    }
+    SetWindowText(text);
+    if (CMDIFrameWnd* frame = GetMDIFrame()) {
+        frame->OnUpdateFrameTitle(addToTitle);
     }
 }
 

@@ -145,10 +145,20 @@ void CMDIFrameWnd::OnUpdateFrameTitle(BOOL addToTitle) {
     if ((GetStyle() & FWS_ADDTOTITLE) == 0) {
         return;
     }
-    // The toolkit puts a maximised child's title behind the frame's.
     BOOL maximized = FALSE;
     CMDIChildWnd* child = MDIGetActive(&maximized);
-    const CDocument* document = child != nullptr && !maximized ? child->GetActiveDocument() : nullptr;
+    if (maximized && child != nullptr) {
+        CString childTitle;
+        child->GetWindowText(childTitle);
+        const CString text = m_strTitle + " - [" + childTitle + "]";
+        CString before;
+        GetWindowText(before);
+        if (before != text) {
+            SetWindowText(text);
+        }
+        return;
+    }
+    const CDocument* document = child != nullptr ? child->GetActiveDocument() : nullptr;
     if (addToTitle && document != nullptr) {
         m_nWindow = child->m_nWindow;
         UpdateFrameTitleForDocument(document->GetTitle());

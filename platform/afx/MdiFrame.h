@@ -67,6 +67,7 @@ public:
     afx_msg void OnWindowNew();
 
 protected:
+    friend class CMDIChildWnd;
     BOOL OnCommand(WPARAM wParam, LPARAM lParam) override;
 
     DECLARE_MESSAGE_MAP()
@@ -120,6 +121,7 @@ public:
     afx_msg void OnMDIActivate(BOOL activate, CWnd* activated, CWnd* deactivated);
     afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);
     afx_msg void OnDestroy();
+    afx_msg void OnSize(UINT type, int cx, int cy);
 
 protected:
     DECLARE_MESSAGE_MAP()

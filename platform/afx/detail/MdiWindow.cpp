@@ -64,7 +64,6 @@ Window* activeMdiChild(const Window& frame) {
 
 QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
     auto* area = new QMdiArea(parent);
-    area->setOption(QMdiArea::DontMaximizeSubWindowOnActivation);
     area->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setActivationOrder(QMdiArea::ActivationHistoryOrder);
@@ -283,6 +282,7 @@ void MdiChildWindow::show(int command) {
     const HWND self = handle();
     setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
     if (visible != before) {
+        forgetToldSize();
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
     if (from(self) == nullptr) {

@@ -209,7 +209,7 @@ bool FrameMenuBar::openByKey(char32_t key) {
     if (key == 0) {
         // The toolkit gives the bar the keyboard when it sees Alt go down and up; both are taken from it by the
         // translation into messages.
-        QKeyEvent down(QEvent::ShortcutOverride, Qt::Key_Alt, Qt::AltModifier);
+        QKeyEvent down(QEvent::ShortcutOverride, Qt::Key_Alt, Qt::NoModifier); // as it is before the key counts
         QKeyEvent up(QEvent::KeyRelease, Qt::Key_Alt, Qt::NoModifier);
         guarded([&] {
             eventFilter(this, &down);

@@ -59,7 +59,7 @@ struct MenuPlace {
 [[nodiscard]] bool contains(HMENU outer, HMENU inner);
 
 /// The number that a text's "&" makes the access key, as a lower-case letter; 0 for none.
-[[nodiscard]] char32_t accessKey(const std::string& text);
+[[nodiscard]] TVX_PLATFORM_API char32_t accessKey(const std::string& text);
 
 /// Hears of changes of any menu; bars show them at once.
 class MenuListener {

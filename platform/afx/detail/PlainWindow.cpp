@@ -245,11 +245,15 @@ QWidget* TopLevelWindow::makeWidget(QWidget*) {
 }
 
 void TopLevelWindow::widgetMade() {
-    widget()->setWindowTitle(text());
+    widget()->setWindowTitle(Window::text());
     iconChanged();
     if (m_menu != nullptr) {
         setMenu(m_menu);
     }
+}
+
+QString TopLevelWindow::text() const {
+    return widget() != nullptr ? widget()->windowTitle() : Window::text();
 }
 
 void TopLevelWindow::iconChanged() {
@@ -363,6 +367,7 @@ void TopLevelWindow::show(int command) {
     if (visible != before) {
         if (visible) {
             applySizeLimits();
+            forgetToldSize();
         }
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }

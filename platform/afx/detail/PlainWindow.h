@@ -41,6 +41,8 @@ public:
     QRect clientRect() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void show(int command) override;
+    /// What the caption shows; a maximised child frame adds its name to it.
+    QString text() const override;
     HMENU menu() const override {
         return m_menu;
     }

@@ -156,6 +156,10 @@ public:
     void destroy();
 
 protected:
+    /// Makes the next tellGeometry send WM_SIZE in any case; frames hear of their size when they are first shown.
+    void forgetToldSize() {
+        m_toldSize = QSize(-1, -1);
+    }
     /// Makes the widget of this kind, hidden, as a child of `parent` (null for top-level windows).
     virtual QWidget* makeWidget(QWidget* parent) = 0;
     /// Called once the widget stands and the first text is to be shown, before WM_CREATE.
