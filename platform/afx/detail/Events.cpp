@@ -75,7 +75,6 @@ MSG keyMessage(const Window& window, const QKeyEvent& event, bool released) {
 /// The toolkit asks with this event before its own shortcuts: the place where a key can be taken from everybody.
 bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
     MSG msg = keyMessage(window, event, false);
-    noteKey(static_cast<int>(msg.wParam), true);
     event.accept(); // shortcuts of the toolkit's never fire: accelerators and mnemonics are the layer's
     if (EventCapture::instance().isCollecting()) {
         return true;
@@ -109,7 +108,6 @@ void deliverCharacters(Window& window, const QKeyEvent& event, EventSource& sour
 bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
     altAlone = event.key() == Qt::Key_Alt;
     const MSG msg = keyMessage(window, event, false);
-    noteKey(static_cast<int>(msg.wParam), true);
     if (keepForPeek(msg, receiver, &event)) {
         return true;
     }
@@ -142,7 +140,6 @@ bool onKeyRelease(Window& window, QObject* receiver, QKeyEvent& event) {
         return true;
     }
     MSG msg = keyMessage(window, event, true);
-    noteKey(static_cast<int>(msg.wParam), false);
     if (keepForPeek(msg, receiver, &event)) {
         return true;
     }
@@ -441,10 +438,28 @@ bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& resu
 
 } // namespace
 
+namespace {
+
+/// Keys count as down whoever gets them: an Alt that opens a menu is released over the menu.
+void followKeys(const QEvent& event) {
+    const bool released = event.type() == QEvent::KeyRelease;
+    const bool pressed = event.type() == QEvent::ShortcutOverride || event.type() == QEvent::KeyPress;
+    if (!event.spontaneous() || (!released && !pressed)) {
+        return;
+    }
+    const auto& key = static_cast<const QKeyEvent&>(event);
+    if (!key.isAutoRepeat()) {
+        noteKey(virtualKey(key), pressed);
+    }
+}
+
+} // namespace
+
 bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     if (takePassing(event) || ExceptionCarrier::isPending()) {
         return false;
     }
+    followKeys(*event);
     if (event->type() == QEvent::ApplicationStateChange) {
         forgetKeys();
         return false;
