@@ -436,6 +436,18 @@ bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& resu
     }
 }
 
+/// Keys are watched wherever they go: one released in a menu or a dialog of the toolkit's is not down any more.
+void watchKeys(const QEvent& event) {
+    if (!event.spontaneous() || (event.type() != QEvent::KeyPress && event.type() != QEvent::KeyRelease)) {
+        return;
+    }
+    const auto& key = static_cast<const QKeyEvent&>(event);
+    const bool down = event.type() == QEvent::KeyPress;
+    if (down || !key.isAutoRepeat()) {
+        noteKey(virtualKey(key), down);
+    }
+}
+
 } // namespace
 
 namespace {
@@ -464,6 +476,7 @@ bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
         forgetKeys();
         return false;
     }
+    watchKeys(*event);
     if (!receiver->isWidgetType()) {
         return false;
     }

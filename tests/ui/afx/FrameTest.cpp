@@ -152,6 +152,17 @@ TEST_F(Frame, Accelerators) {
     EXPECT_EQ(journal(), (std::vector<std::string>{"draw", "grid", "frame", "document"}));
 }
 
+TEST_F(Frame, AcceleratorsWorkAfterAMenuWasOpenedByKeys) {
+    openNote();
+    key(Qt::Key_E, Qt::AltModifier); // Alt is let go of while the menu has the keyboard
+    ASSERT_NE(openMenu(), nullptr);
+    key(Qt::Key_Escape);
+    key(Qt::Key_Escape);
+    EXPECT_EQ(CWnd::GetFocus(), &view());
+    key(Qt::Key_D, Qt::ControlModifier);
+    EXPECT_TRUE(noted("draw"));
+}
+
 TEST_F(Frame, AcceleratorsRestWhileAMenuIsOpen) {
     NoteFrame& frame = openNote();
     ASSERT_NE(clickBar(frame, "View"), nullptr);
