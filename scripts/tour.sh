@@ -53,6 +53,18 @@ await() {
     timeout "$limit" xdotool windowactivate --sync "$window" || fail "window \"$1\" does not become active"
 }
 
+# Answers boxes with Enter until the program has ended: several faults are shown one after the other.
+answer() {
+    local end=$((SECONDS + limit))
+    while kill -0 "$process" 2>/dev/null; do
+        [ $SECONDS -lt $end ] || fail "the program does not end"
+        window=$(xdotool search --onlyvisible --name 'Board' 2>/dev/null | tail -n 1) || true
+        if [ -n "$window" ]; then xdotool windowactivate --sync "$window" key Return 2>/dev/null || true; fi
+    done
+    wait "$process" || true
+    process=''
+}
+
 # Waits until the program has ended.
 ended() {
     timeout "$limit" tail --pid="$process" -f /dev/null || fail "the program does not end"
@@ -132,20 +144,17 @@ ended
 start -help
 await 'Board'
 picture usage "board -help shows the usage summary."
-xdotool key Return
-ended
+answer
 
 start -grid many -bogus
 await 'Board'
 picture errors "A wrong command line is explained: each fault with its reason."
-xdotool key Return
-ended
+answer
 
 printf 'board 1\nrectangle 10 10 90 60\ncircle 10 10 40\n' >"$work/damaged.brd"
 start "$work/damaged.brd"
 await 'Board'
 picture damaged "A damaged drawing is refused with file, line and reason."
-xdotool key Return
-ended
+answer
 
 mv "$work/index.html" "$pictures/index.html"
