@@ -3,6 +3,7 @@
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/Window.h"
+#include "platform/base/Exception.h"
 
 #include <QApplication>
 #include <QKeyEvent>
@@ -137,6 +138,17 @@ private:
     UINT m_type;
     ModalLoop m_loop;
 };
+
+/// Lets exceptions that report themselves do it in a message box.
+int reportException(const CString& text, UINT type, UINT fallback) {
+    return text.IsEmpty() && fallback != 0 ? AfxMessageBox(fallback, type) : AfxMessageBox(text.GetString(), type);
+}
+
+struct ReporterEntry {
+    ReporterEntry() {
+        tvx::setExceptionReporter(&reportException);
+    }
+} const reporterEntry;
 
 } // namespace
 

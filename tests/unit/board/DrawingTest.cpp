@@ -1,0 +1,129 @@
+#include "samples/board/Drawing.h"
+
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <iterator>
+#include <random>
+
+using namespace board;
+
+namespace {
+
+std::string contents(const std::filesystem::path& file) {
+    std::ifstream in(file, std::ios::binary);
+    return {std::istreambuf_iterator<char>(in), {}};
+}
+
+TEST(Drawing, ShippedOnesAreReadAndWrittenWithoutLoss) {
+    int count = 0;
+    for (const auto& entry : std::filesystem::directory_iterator(BOARD_DRAWINGS)) {
+        SCOPED_TRACE(entry.path().string());
+        const std::string text = contents(entry.path());
+        const ReadResult first = readDrawing(text);
+        ASSERT_TRUE(first.ok()) << first.line << ": " << first.reason;
+        EXPECT_FALSE(first.drawing.shapes.empty());
+        const std::string written = writeDrawing(first.drawing);
+        const ReadResult second = readDrawing(written);
+        ASSERT_TRUE(second.ok());
+        EXPECT_EQ(second.drawing, first.drawing);
+        EXPECT_EQ(writeDrawing(second.drawing), written);
+        ++count;
+    }
+    EXPECT_GE(count, 2);
+}
+
+TEST(Drawing, KeepsCommentsWithTheirShapes) {
+    const std::string text = "board 1\n# bearing\n\nline 1 2 3 4 color=#c00000\n# the end\n";
+    const ReadResult read = readDrawing(text);
+    ASSERT_TRUE(read.ok()) << read.reason;
+    const std::string written = writeDrawing(read.drawing);
+    EXPECT_NE(written.find("# bearing\n\nline 1 2 3 4"), std::string::npos) << written;
+    EXPECT_NE(written.find("# the end\n"), std::string::npos) << written;
+}
+
+TEST(Drawing, AcceptsAMarkAndForeignLineEnds) {
+    const ReadResult read = readDrawing("\xEF\xBB\xBF"
+                                        "board 1\r\nellipse 0 0 9 9 fill=#ffffff\r\n");
+    ASSERT_TRUE(read.ok()) << read.reason;
+    EXPECT_EQ(read.drawing.shapes.at(0).fill, 0xFFFFFFU);
+}
+
+TEST(Drawing, TextsOfAnyBytesSurvive) {
+    std::mt19937 random(7);
+    for (int round = 0; round < 300; ++round) {
+        Shape shape;
+        shape.kind = ShapeKind::text;
+        shape.to = {100, 20};
+        for (int i = 0; i < round % 40; ++i) {
+            shape.text += static_cast<char>(1 + random() % 255);
+        }
+        Drawing drawing;
+        drawing.shapes.push_back(shape);
+        const ReadResult read = readDrawing(writeDrawing(drawing));
+        ASSERT_TRUE(read.ok()) << read.reason;
+        EXPECT_EQ(read.drawing, drawing);
+    }
+}
+
+TEST(Drawing, FaultsAreNamedWithTheirLine) {
+    struct Case {
+        const char* text;
+        int line;
+    };
+    for (const Case& c :
+         {Case{"", 1}, Case{"board 2\n", 1}, Case{"board 1\ncircle 1 2 3\n", 2}, Case{"board 1\n\nline 1 2 3\n", 3},
+          Case{"board 1\nline 1 2 3 x\n", 2}, Case{"board 1\nline 1 2 3 4 color=#12345\n", 2},
+          Case{"board 1\nline 1 2 3 4 fill=#000000\n", 2}, Case{"board 1\ntext 0 0 9 9 \"open\n", 2},
+          Case{"board 1\nrectangle 0 0 999999999999 1\n", 2}, Case{"board 1\nrectangle 0 0 1 1 width=0\n", 2}}) {
+        SCOPED_TRACE(c.text);
+        const ReadResult read = readDrawing(c.text);
+        EXPECT_EQ(read.line, c.line);
+        EXPECT_FALSE(read.reason.empty());
+    }
+}
+
+TEST(Drawing, NoDamageCrashesTheReader) {
+    std::mt19937 random(3);
+    const std::string good = contents(std::filesystem::path(BOARD_DRAWINGS) / "plan.brd");
+    for (int round = 0; round < 2000; ++round) {
+        std::string text = good.substr(0, random() % good.size());
+        if (!text.empty()) {
+            text[random() % text.size()] = static_cast<char>(random());
+        }
+        const ReadResult read = readDrawing(text);
+        EXPECT_EQ(read.ok(), read.reason.empty());
+    }
+}
+
+TEST(Drawing, HitsTheTopmostShapeAndMovesWithinItsLimits) {
+    const ReadResult read = readDrawing("board 1\nrectangle 0 0 50 50\nellipse 10 10 40 40\nline 60 0 60 90\n");
+    ASSERT_TRUE(read.ok());
+    EXPECT_EQ(read.drawing.shapeAt({25, 25}), 1);
+    EXPECT_EQ(read.drawing.shapeAt({2, 2}), 0);
+    EXPECT_EQ(read.drawing.shapeAt({61, 45}), 2);
+    EXPECT_EQ(read.drawing.shapeAt({200, 200}), -1);
+    Shape shape = read.drawing.shapes[0];
+    shape.moveBy(10 * maxCoordinate, -10 * maxCoordinate);
+    EXPECT_EQ(shape.to.x, maxCoordinate);
+    EXPECT_EQ(shape.to.x - shape.from.x, 50);
+    EXPECT_EQ(shape.to.y - shape.from.y, 50);
+}
+
+TEST(History, GoesBackAndForthUntilSomethingNewIsDone) {
+    History history;
+    Drawing current;
+    history.remember(current);
+    current.shapes.emplace_back();
+    const Drawing one = current;
+    history.undo(current);
+    EXPECT_TRUE(current.shapes.empty());
+    EXPECT_FALSE(history.canUndo());
+    history.redo(current);
+    EXPECT_EQ(current, one);
+    history.undo(current);
+    history.remember(current);
+    EXPECT_FALSE(history.canRedo());
+}
+
+} // namespace
