@@ -450,28 +450,10 @@ void watchKeys(const QEvent& event) {
 
 } // namespace
 
-namespace {
-
-/// Keys count as down whoever gets them: an Alt that opens a menu is released over the menu.
-void followKeys(const QEvent& event) {
-    const bool released = event.type() == QEvent::KeyRelease;
-    const bool pressed = event.type() == QEvent::ShortcutOverride || event.type() == QEvent::KeyPress;
-    if (!event.spontaneous() || (!released && !pressed)) {
-        return;
-    }
-    const auto& key = static_cast<const QKeyEvent&>(event);
-    if (!key.isAutoRepeat()) {
-        noteKey(virtualKey(key), pressed);
-    }
-}
-
-} // namespace
-
 bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     if (takePassing(event) || ExceptionCarrier::isPending()) {
         return false;
     }
-    followKeys(*event);
     if (event->type() == QEvent::ApplicationStateChange) {
         forgetKeys();
         return false;
