@@ -7,10 +7,13 @@
 
 #include <QApplication>
 #include <QKeyEvent>
+#include <QLabel>
 #include <QMessageBox>
 #include <QPointer>
 #include <QPushButton>
+#include <QScreen>
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <cstring>
@@ -80,6 +83,7 @@ public:
         setWindowTitle(toQt(caption));
         setTextFormat(Qt::PlainText);
         setText(toQt(text));
+        keepLines();
         setIcon(iconOf(m_type));
         for (const BoxButton& button : buttonsOf(m_type)) {
             addButton(button);
@@ -119,6 +123,16 @@ protected:
     }
 
 private:
+    /// The toolkit breaks lines at 500 pixels; texts that come with line ends of their own keep theirs.
+    void keepLines() {
+        auto* label = findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
+        if (label == nullptr || !text().contains(QLatin1Char('\n'))) {
+            return;
+        }
+        const int widest = label->fontMetrics().size(0, text()).width() + 2 * label->margin();
+        label->setMinimumWidth(std::min(widest + 2, screen()->availableGeometry().width() * 3 / 5));
+    }
+
     void addButton(const BoxButton& entry) {
         QPushButton* button = QMessageBox::addButton(QString::fromLatin1(entry.label), QMessageBox::ActionRole);
         const int answer = entry.answer;
