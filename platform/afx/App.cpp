@@ -314,7 +314,8 @@ int runApplication(CWinApp& app) {
         if (app.m_pMainWnd != nullptr) {
             app.m_pMainWnd->DestroyWindow();
         }
-        return app.ExitInstance();
+        const int exitCode = app.ExitInstance();
+        return exitCode == 0 && wasDisplayMissed() ? 1 : exitCode;
     }
     return app.Run();
 }

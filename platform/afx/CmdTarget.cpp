@@ -47,6 +47,7 @@ struct CachedSearch {
     UINT message = 0;
     const AFX_MSGMAP_ENTRY* entry = nullptr;
 };
+thread_local std::array<CachedSearch, 512> cache;
 
 } // namespace
 
@@ -55,7 +56,6 @@ const AFX_MSGMAP_ENTRY* CCmdTarget::FindMessageEntry(UINT message, UINT code, UI
     if (message == WM_COMMAND || message == WM_NOTIFY || message >= 0xC000) {
         return search(map, message, code, id);
     }
-    thread_local std::array<CachedSearch, 512> cache;
     const auto slot = (reinterpret_cast<std::uintptr_t>(map) / 16 + message) % cache.size();
     CachedSearch& cached = cache[slot];
     if (cached.map != map || cached.message != message) {

@@ -339,7 +339,7 @@ BOOL CDialog::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info)
 
 LRESULT CDialog::OnCommandHelp(WPARAM, LPARAM context) {
     if (context == 0 && m_nIDHelp != 0) {
-        context = static_cast<LPARAM>(helpBase + m_nIDHelp);
+        context = LPARAM{helpBase} + m_nIDHelp;
     }
     CWinApp* app = AfxGetApp();
     if (context == 0 || app == nullptr) {

@@ -14,8 +14,8 @@ namespace {
 
 /// Rows of a bitmap as `GetBitmapBits` gives them: from the top, padded to even numbers of bytes.
 std::size_t rowBytes(const BitmapObject& bitmap) {
-    const int bits = bitmap.format == PixelFormat::monochrome ? 1 : 32;
-    return static_cast<std::size_t>((bitmap.image.width() * bits + 15) / 16 * 2);
+    const std::size_t bits = bitmap.format == PixelFormat::monochrome ? 1 : 32;
+    return (static_cast<std::size_t>(bitmap.image.width()) * bits + 15) / 16 * 2;
 }
 
 void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {

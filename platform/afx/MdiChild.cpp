@@ -206,7 +206,7 @@ CWnd* CMDIChildWnd::GetMessageBar() {
 
 BOOL CMDIChildWnd::PreTranslateMessage(MSG* message) {
     if (message->message < WM_KEYFIRST || message->message > WM_KEYLAST) {
-        return CWnd::PreTranslateMessage(message);
+        return CFrameWnd::PreTranslateMessage(message);
     }
     // The main frame has the menu, so the command is its to send on.
     const CMDIFrameWnd* frame = GetMDIFrame();

@@ -208,7 +208,7 @@ bool translateChildKeys(const CMDIFrameWnd& frame, const MSG& message) {
 
 BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
     if (message->message < WM_KEYFIRST || message->message > WM_KEYLAST) {
-        return CWnd::PreTranslateMessage(message);
+        return CFrameWnd::PreTranslateMessage(message);
     }
     CMDIChildWnd* child = MDIGetActive();
     if (child != nullptr && child->PreTranslateMessage(message)) {

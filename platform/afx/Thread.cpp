@@ -42,7 +42,7 @@ BOOL CWinThread::InitInstance() {
 
 int CWinThread::Run() {
     if (!ensureGui()) {
-        std::fputs("There is no display to show windows on: set DISPLAY.\n", stderr);
+        tellMissingDisplay();
         ExitInstance();
         return 1;
     }

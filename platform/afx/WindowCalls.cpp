@@ -124,6 +124,7 @@ namespace {
 
 BOOL enumerate(const std::vector<Window*>& windows, bool deep, WNDENUMPROC callback, LPARAM param) {
     std::vector<HWND> handles;
+    handles.reserve(windows.size());
     for (const Window* window : windows) {
         handles.push_back(window->handle());
     }

@@ -16,6 +16,10 @@ IMPLEMENT_DYNCREATE(CWnd, CCmdTarget)
 // --- objects and handles ---
 
 CWnd::~CWnd() {
+    // A frame whose window could not be created has deleted itself; hosts have often made it the main window before.
+    if (CWinThread* thread = AfxGetThread(); thread != nullptr && thread->m_pMainWnd == this) {
+        thread->m_pMainWnd = nullptr;
+    }
     if (m_hWnd == nullptr) {
         return;
     }
@@ -303,7 +307,8 @@ BOOL CWnd::WalkPreTranslateTree(HWND stop, MSG* message) {
 namespace {
 
 void sendToDescendants(const Window& window, const MSG& msg, BOOL deep, BOOL onlyPerm) {
-    const auto children = window.children();
+    // Handlers may create and destroy siblings, so the list is walked as it is now.
+    const std::vector<Window*> children(window.children().begin(), window.children().end());
     for (const Window* child : children) {
         const HWND handle = child->handle();
         if (Window::from(handle) == nullptr) {

@@ -139,13 +139,14 @@ ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
 ComboBoxWindow::~ComboBoxWindow() {
     if (box() != nullptr) {
         box()->disconnect();
-        box()->setModel(new QStringListModel(box())); // the widget outlives the lines it showed
+        box()->setModel(m_noLines); // the widget outlives the lines it showed
     }
 }
 
 QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     auto* face = new ComboFace(parent, *this);
     face->setModel(m_model.get());
+    m_noLines = new QStringListModel(face);
     face->setItemDelegate(new ItemDelegate(face, *this));
     face->setInsertPolicy(QComboBox::NoInsert);
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line

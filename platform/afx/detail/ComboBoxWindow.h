@@ -6,6 +6,7 @@
 #include "platform/afx/detail/Control.h"
 #include "platform/afx/detail/ListItems.h"
 
+class QAbstractItemModel;
 class QComboBox;
 class QLineEdit;
 
@@ -71,6 +72,7 @@ private:
     LRESULT fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     ListItems m_items;
     std::unique_ptr<ComboModel> m_model;
+    QAbstractItemModel* m_noLines = nullptr; ///< Of the widget, for the time after this window.
     int m_itemHeight = 15;
     int m_openHeight = 0;
     bool m_chosenWhileOpen = false;

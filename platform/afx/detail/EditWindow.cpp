@@ -10,6 +10,7 @@
 #include <QApplication>
 #include <QClipboard>
 
+#include <algorithm>
 #include <cstring>
 #include <limits>
 
@@ -357,7 +358,7 @@ LRESULT EditWindow::copyLine(int line, char* buffer) const {
     std::memcpy(&capacity, buffer, sizeof(capacity));
     const std::string text = fromQt(lineText(starts, static_cast<std::size_t>(line)));
     const std::size_t length = text::characterStart(text, std::min<std::size_t>(capacity, text.size()));
-    std::memcpy(buffer, text.data(), length);
+    std::copy_n(text.data(), length, buffer);
     return static_cast<LRESULT>(length);
 }
 

@@ -77,7 +77,7 @@ std::string_view faceName(const LOGFONTA& description) {
 } // namespace
 
 QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
-    const QString wanted = QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
+    QString wanted = QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
     if (!faceName.empty() && QFontDatabase::hasFamily(wanted))
         return wanted;
     const auto* found = std::ranges::find_if(

@@ -11,8 +11,10 @@
 #include <QThread>
 
 #include <clocale>
+#include <cstdio>
 #include <cstdlib>
 #include <cxxabi.h>
+#include <utility>
 
 namespace tvx::afx {
 
@@ -67,6 +69,22 @@ void makeApplication() {
 bool hasDisplay() {
     static const bool answer = askDisplay();
     return answer;
+}
+
+namespace {
+
+bool displayMissed = false;
+
+} // namespace
+
+void tellMissingDisplay() {
+    if (!std::exchange(displayMissed, true)) {
+        std::fputs("There is no display to show windows on: set DISPLAY to one that answers.\n", stderr);
+    }
+}
+
+bool wasDisplayMissed() {
+    return displayMissed;
 }
 
 bool ensureGui() {

@@ -12,5 +12,9 @@ namespace tvx::afx {
 TVX_PLATFORM_API bool hasDisplay();
 /// Makes the toolkit's application object if it does not stand yet. False when there is no display.
 TVX_PLATFORM_API bool ensureGui();
+/// Tells on standard error, once, that a window was wanted where none can be shown.
+TVX_PLATFORM_API void tellMissingDisplay();
+/// Whether that has been told.
+TVX_PLATFORM_API bool wasDisplayMissed();
 
 } // namespace tvx::afx

@@ -122,9 +122,12 @@ void shortenPath(LayoutLine& line, const CDC& dc, const TextLayoutStyle& style) 
 
 int layoutWidth(const CDC& dc, std::string_view text, const TextLayoutStyle& style) {
     const auto size = static_cast<int>(text.size());
+    // The size goes along, so nothing depends on a zero behind the text.
+    // NOLINTBEGIN(bugprone-suspicious-stringview-data-usage)
     if ((style.format & DT_EXPANDTABS) == 0)
         return dc.GetTextExtent(text.data(), size).cx;
     return dc.GetTabbedTextExtent(text.data(), size, 1, &style.tabWidth).cx;
+    // NOLINTEND(bugprone-suspicious-stringview-data-usage)
 }
 
 TextLayout layOutText(const CDC& dc, std::string_view text, const TextLayoutStyle& style) {

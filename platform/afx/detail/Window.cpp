@@ -149,6 +149,9 @@ bool Window::start(const CREATESTRUCT& cs) {
 
 HWND createWindow(const CREATESTRUCT& cs, CWnd* object, bool* stood) {
     const WindowClass* windowClass = findWindowClass(cs.lpszClass);
+    if (windowClass != nullptr && !ensureGui()) {
+        tellMissingDisplay();
+    }
     if (windowClass == nullptr || !ensureGui()) {
         SetLastError(windowClass == nullptr ? ERROR_CANNOT_FIND_WND_CLASS : ERROR_INVALID_WINDOW_HANDLE);
         return nullptr;
