@@ -1,70 +1,56 @@
 #include "platform/afx/detail/ChooseTemplate.h"
 
-#include "platform/afx/App.h"
-#include "platform/afx/detail/Gui.h"
-#include "platform/afx/detail/Loop.h"
-#include "platform/afx/detail/Window.h"
-
-#include <QDialog>
-#include <QDialogButtonBox>
-#include <QListWidget>
-#include <QVBoxLayout>
+#include "platform/afx/Dialog.h"
+#include "platform/afx/ListBox.h"
+#include "platform/win/FrameworkIds.h"
 
 namespace tvx::afx {
 
 namespace {
 
-/// The names in a list, with OK and Cancel.
-class Chooser : public QDialog {
+/// The names in a list; a double click chooses too.
+class NameDialog : public CDialog {
 public:
-    Chooser(QWidget* over, const std::vector<CString>& names) : QDialog(over) {
-        setWindowTitle(QStringLiteral("New"));
-        auto* layout = new QVBoxLayout(this);
-        m_list = new QListWidget(this);
-        for (const CString& name : names) {
-            m_list->addItem(toQt(name));
+    explicit NameDialog(const std::vector<CString>& names) : CDialog(AFX_IDD_NEWTYPEDLG), m_names(names) {}
+
+    int chosen = -1;
+
+protected:
+    BOOL OnInitDialog() override {
+        CDialog::OnInitDialog();
+        m_list.SubclassDlgItem(AFX_IDC_LISTBOX, this);
+        for (std::size_t i = 0; i < m_names.size(); ++i) {
+            m_list.SetItemData(m_list.AddString(m_names[i]), i); // the list sorts
         }
-        m_list->setCurrentRow(0);
-        auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, this);
-        layout->addWidget(m_list);
-        layout->addWidget(buttons);
-        connect(buttons, &QDialogButtonBox::accepted, this, [this] { m_loop.end(m_list->currentRow()); });
-        connect(buttons, &QDialogButtonBox::rejected, this, [this] { m_loop.end(-1); });
-        connect(m_list, &QListWidget::itemDoubleClicked, this, [this] { m_loop.end(m_list->currentRow()); });
-        setWindowModality(Qt::ApplicationModal);
+        m_list.SetCurSel(0);
+        return TRUE;
+    }
+    void OnOK() override {
+        const int at = m_list.GetCurSel();
+        if (at >= 0) {
+            chosen = static_cast<int>(m_list.GetItemData(at));
+            CDialog::OnOK();
+        }
     }
 
-    void accept() override {
-        m_loop.end(m_list->currentRow());
-    }
-    void reject() override {
-        m_loop.end(-1);
-    }
-    int choose() {
-        guarded([this] {
-            show();
-            m_list->setFocus();
-        });
-        const int chosen = m_loop.run();
-        guarded([this] { hide(); });
-        return chosen;
-    }
+    DECLARE_MESSAGE_MAP()
 
 private:
-    QListWidget* m_list;
-    ModalLoop m_loop;
+    const std::vector<CString>& m_names;
+    CListBox m_list;
 };
+
+// clang-format off
+BEGIN_MESSAGE_MAP(NameDialog, CDialog)
+    ON_LBN_DBLCLK(AFX_IDC_LISTBOX, &NameDialog::OnOK)
+END_MESSAGE_MAP()
+// clang-format on
 
 } // namespace
 
 int chooseName(const std::vector<CString>& names) {
-    if (!ensureGui()) {
-        return -1;
-    }
-    const CWnd* main = AfxGetMainWnd();
-    const Window* window = main != nullptr ? main->GetState() : nullptr;
-    Chooser chooser(window != nullptr ? window->widget() : nullptr, names);
-    return chooser.choose();
+    NameDialog dialog(names);
+    return dialog.DoModal() == IDOK ? dialog.chosen : -1;
 }
 
 } // namespace tvx::afx

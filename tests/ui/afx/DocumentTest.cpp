@@ -1,5 +1,9 @@
 #include "tests/ui/afx/FrameTesting.h"
 
+#include <QDropEvent>
+#include <QMimeData>
+#include <QUrl>
+
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -157,4 +161,37 @@ TEST_F(Documents, ShellCommands) {
     EXPECT_EQ(document().text, "");
     info.m_nShellCommand = CCommandLineInfo::FilePrint;
     EXPECT_FALSE(AfxGetApp()->ProcessShellCommand(info));
+}
+
+TEST_F(Documents, DroppedFilesAreOpened) {
+    NoteFrame& frame = openNote();
+    write(file("dropped.note"), saved("from the desktop"));
+    QMimeData data;
+    data.setUrls({QUrl::fromLocalFile(QString::fromStdString(file("dropped.note").string()))});
+    const auto drop = [&] {
+        QDropEvent event(QPointF(50, 50), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+        QCoreApplication::sendEvent(widgetOf(frame), &event);
+        settle();
+    };
+    drop();
+    EXPECT_EQ(document().text, "") << "frames that did not ask for files get none";
+    frame.DragAcceptFiles(TRUE);
+    drop();
+    EXPECT_EQ(document().text, "from the desktop");
+}
+
+TEST_F(Documents, NewAsksForTheKindWhereThereAreSeveral) {
+    BoardsFrame& frame = openBoards();
+    AfxGetApp()->AddDocTemplate(
+        new CMultiDocTemplate(IDR_TESTMAIN, RUNTIME_CLASS(Note), RUNTIME_CLASS(CMDIChildWnd), RUNTIME_CLASS(NoteView)));
+    inDialog([] { key(Qt::Key_Escape); });
+    AfxGetApp()->OnFileNew();
+    EXPECT_EQ(frame.MDIGetActive(), nullptr);
+    inDialog([] {
+        key(Qt::Key_Down);
+        key(Qt::Key_Return);
+    });
+    AfxGetApp()->OnFileNew();
+    ASSERT_NE(frame.MDIGetActive(), nullptr);
+    EXPECT_EQ(titleOf(*frame.MDIGetActive()), "Note1");
 }

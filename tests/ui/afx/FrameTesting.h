@@ -176,5 +176,7 @@ private:
 
 /// Does something in the next nested loop.
 void later(std::function<void()> act);
+/// Does something in the next modal dialog, once that has the keyboard.
+void inDialog(std::function<void()> act);
 
 } // namespace frametest
