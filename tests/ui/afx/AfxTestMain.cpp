@@ -19,10 +19,10 @@ CWinApp testApplication("Afx tests");
 int main(int argc, char** argv) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     testing::InitGoogleTest(&argc, argv);
-    QApplication::setStyle(QStringLiteral("Fusion"));
     if (!tvx::afx::ensureGui()) {
         return 1;
     }
+    QApplication::setStyle(QStringLiteral("Fusion"));
     QFont font(QStringLiteral("DejaVu Sans Condensed"));
     font.setPixelSize(11);
     font.setHintingPreference(QFont::PreferFullHinting);
