@@ -474,6 +474,19 @@ void Window::finishDestroy() {
     bury(this);
 }
 
+namespace {
+
+/// The widget lives a little longer than its window, which its signals must not reach any more.
+void silence(QWidget& widget) {
+    widget.blockSignals(true);
+    const auto parts = widget.findChildren<QObject*>();
+    for (QObject* part : parts) {
+        part->blockSignals(true);
+    }
+}
+
+} // namespace
+
 void Window::unlink() {
     if (m_object != nullptr) {
         m_object->m_hWnd = nullptr;
@@ -493,6 +506,7 @@ void Window::unlink() {
     }
     if (m_widget != nullptr) {
         tables().byWidget.erase(m_widget);
+        silence(*m_widget);
         m_widget->hide();
         m_widget->deleteLater();
     }
