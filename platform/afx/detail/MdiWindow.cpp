@@ -321,9 +321,6 @@ LRESULT MdiChildWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
     }
     if (message == WM_SYSCOMMAND) {
         switch (wParam & 0xFFF0U) {
-        case SC_MOVE:
-            guarded([this] { subWindow()->setFocus(); });
-            return 0;
         case SC_NEXTWINDOW:
         case SC_PREVWINDOW:
             return SendMessageA(client().handle(), WM_MDINEXT, 0, (wParam & 0xFFF0U) == SC_PREVWINDOW ? 1 : 0);

@@ -349,7 +349,9 @@ void updateSystemMenu(HWND handle) {
     const bool iconic = IsIconic(handle) != FALSE;
     const auto enable = [menu](UINT id, bool on) { EnableMenuItem(menu, id, on ? MF_ENABLED : MF_GRAYED); };
     enable(SC_RESTORE, zoomed || iconic);
-    enable(SC_MOVE, !zoomed);
+    // Child frames are moved and sized with the mouse only.
+    enable(SC_MOVE, !zoomed && !window->isChild());
+    enable(SC_SIZE, !zoomed && !window->isChild() && (window->style() & WS_THICKFRAME) != 0);
     enable(SC_MAXIMIZE, !zoomed && (window->style() & WS_MAXIMIZEBOX) != 0);
     enable(SC_MINIMIZE, !iconic && (window->style() & WS_MINIMIZEBOX) != 0);
 }
