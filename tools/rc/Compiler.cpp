@@ -75,7 +75,8 @@ std::string preprocess(const Options& options, const std::vector<fs::path>& fold
 ChildResult compileText(const Options& options, const std::string& text, const fs::path& output) {
     const fs::path source = beside(options.output, ".rc");
     writeFile(source, text);
-    return run({options.compiler, "/no-preprocess", "/C", "65001", "/FO", output.string(), source.string()});
+    // Without the end of options, the compiler takes a name such as /check/x.rc for its option /c.
+    return run({options.compiler, "/no-preprocess", "/C", "65001", "/FO", output.string(), "--", source.string()});
 }
 
 // The compiler tells what is wrong but not where. The statement is the first one with which it fails; the line within
