@@ -107,7 +107,8 @@ TEST(Exception, CutsMessagesBetweenCharacters) {
     EXPECT_STREQ("", text);
 }
 
-TEST(Exception, IsReportedOnStandardErrorUntilThereAreMessageBoxes) {
+TEST(Exception, IsReportedOnStandardErrorWithoutMessageBoxes) {
+    tvx::setExceptionReporter(nullptr);
     testing::internal::CaptureStderr();
     CFileException(CFileException::diskFull, ENOSPC, "a.brd").ReportError();
     EXPECT_EQ("The disk is full while accessing a.brd.\n", testing::internal::GetCapturedStderr());
