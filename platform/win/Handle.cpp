@@ -1,0 +1,142 @@
+#include "platform/win/Handle.h"
+
+#include "platform/win/Process.h"
+#include "platform/win/detail/KernelObject.h"
+
+#include <cerrno>
+#include <chrono>
+#include <mutex>
+#include <poll.h>
+#include <unistd.h>
+#include <unordered_map>
+#include <utility>
+
+namespace tvx::win {
+
+namespace {
+
+struct Entry {
+    std::shared_ptr<KernelObject> object;
+    Inheritance inheritance = Inheritance::none;
+};
+
+/// The handles of the process. Numbers are never used twice, so that a stale one is always noticed.
+class Handles {
+public:
+    static Handles& instance() {
+        // Never destroyed: static objects of hosts may hold handles.
+        static auto* handles = new Handles;
+        return *handles;
+    }
+
+    HANDLE add(Entry entry) {
+        const std::lock_guard lock(mutex_);
+        last_ += 4;
+        entries_.emplace(last_, std::move(entry));
+        return reinterpret_cast<HANDLE>(last_);
+    }
+
+    Entry find(HANDLE handle) const {
+        const std::lock_guard lock(mutex_);
+        const auto found = entries_.find(reinterpret_cast<std::uintptr_t>(handle));
+        return found == entries_.end() ? Entry() : found->second;
+    }
+
+    /// The entry comes back, so that its object ends outside the lock.
+    Entry take(HANDLE handle) {
+        const std::lock_guard lock(mutex_);
+        auto node = entries_.extract(reinterpret_cast<std::uintptr_t>(handle));
+        return node ? std::move(node.mapped()) : Entry();
+    }
+
+private:
+    mutable std::mutex mutex_;
+    std::unordered_map<std::uintptr_t, Entry> entries_;
+    std::uintptr_t last_ = 0;
+};
+
+using Clock = std::chrono::steady_clock;
+
+/// What is left until `deadline`, rounded up so that nobody returns too early.
+timespec remaining(Clock::time_point deadline) {
+    const auto left = std::max(deadline - Clock::now(), Clock::duration::zero());
+    const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(left);
+    return {seconds.count(), std::chrono::nanoseconds(left - seconds).count()};
+}
+
+} // namespace
+
+Descriptor& Descriptor::operator=(Descriptor&& other) noexcept {
+    Descriptor old(std::exchange(number_, other.release()));
+    return *this;
+}
+
+Descriptor::~Descriptor() {
+    if (number_ >= 0)
+        ::close(number_);
+}
+
+int Descriptor::release() noexcept {
+    return std::exchange(number_, -1);
+}
+
+short waitReadable(int descriptor, DWORD timeout) {
+    pollfd entry{descriptor, POLLIN, 0};
+    if (timeout == 0)
+        return ::poll(&entry, 1, 0) > 0 ? entry.revents : short{0};
+    const auto deadline = Clock::now() + std::chrono::milliseconds(timeout);
+    for (;;) {
+        const timespec left = remaining(deadline);
+        const int count = ::ppoll(&entry, 1, timeout == INFINITE ? nullptr : &left, nullptr);
+        if (count >= 0 || errno != EINTR)
+            return count > 0 ? entry.revents : short{0};
+    }
+}
+
+HANDLE makeHandle(std::shared_ptr<KernelObject> object, Inheritance inheritance) {
+    return Handles::instance().add({std::move(object), inheritance});
+}
+
+std::shared_ptr<KernelObject> objectOf(HANDLE handle) {
+    std::shared_ptr<KernelObject> object = Handles::instance().find(handle).object;
+    if (!object)
+        SetLastError(ERROR_INVALID_HANDLE);
+    return object;
+}
+
+bool isInheritable(HANDLE handle) {
+    return Handles::instance().find(handle).inheritance == Inheritance::inheritable;
+}
+
+} // namespace tvx::win
+
+using namespace tvx::win;
+
+BOOL CloseHandle(HANDLE handle) {
+    if (Handles::instance().take(handle).object)
+        return TRUE;
+    SetLastError(ERROR_INVALID_HANDLE);
+    return FALSE;
+}
+
+BOOL DuplicateHandle(HANDLE sourceProcess, HANDLE source, HANDLE targetProcess, HANDLE* target, DWORD /*access*/,
+                     BOOL inherit, DWORD options) {
+    if (sourceProcess != GetCurrentProcess() || targetProcess != GetCurrentProcess()) {
+        SetLastError(ERROR_ACCESS_DENIED);
+        return FALSE;
+    }
+    std::shared_ptr<KernelObject> object = objectOf(source);
+    if (!object)
+        return FALSE;
+    if (options & DUPLICATE_CLOSE_SOURCE)
+        CloseHandle(source);
+    *target = makeHandle(std::move(object), inherit ? Inheritance::inheritable : Inheritance::none);
+    return TRUE;
+}
+
+DWORD WaitForSingleObject(HANDLE handle, DWORD timeout) {
+    const std::shared_ptr<KernelObject> object = objectOf(handle);
+    if (!object)
+        return WAIT_FAILED;
+    return waitReadable(object->descriptor(), timeout) ? WAIT_OBJECT_0 : WAIT_TIMEOUT;
+}

@@ -1,0 +1,82 @@
+#pragma once
+
+/// @file
+/// What lies behind a handle of the system's objects.
+
+#include "platform/base/Export.h"
+#include "platform/base/Types.h"
+
+#include <memory>
+#include <optional>
+
+namespace tvx::win {
+
+/// Owns a descriptor of the system.
+class Descriptor {
+public:
+    explicit Descriptor(int number = -1) noexcept : number_(number) {}
+    Descriptor(Descriptor&& other) noexcept : number_(other.release()) {}
+    Descriptor& operator=(Descriptor&& other) noexcept;
+    ~Descriptor();
+
+    int number() const noexcept {
+        return number_;
+    }
+    explicit operator bool() const noexcept {
+        return number_ >= 0;
+    }
+    /// Gives the descriptor up without closing it.
+    int release() noexcept;
+
+private:
+    int number_;
+};
+
+/// Waits until a descriptor is readable or its other end is closed, without being woken by signals.
+/// @param timeout  milliseconds, `INFINITE` for ever
+/// @return the events that are there, 0 when the time ran out
+short waitReadable(int descriptor, DWORD timeout);
+
+/// A process or an end of a pipe. It is signalled while its descriptor is readable. Any thread may use it.
+class KernelObject {
+public:
+    explicit KernelObject(Descriptor descriptor) noexcept : descriptor_(std::move(descriptor)) {}
+    virtual ~KernelObject() = default;
+    KernelObject(const KernelObject&) = delete;
+    KernelObject& operator=(const KernelObject&) = delete;
+
+    int descriptor() const noexcept {
+        return descriptor_.number();
+    }
+
+protected:
+    Descriptor descriptor_;
+};
+
+/// Whether a child may be given a handle as a standard handle.
+enum class Inheritance { none, inheritable };
+
+/// A new handle to the object.
+HANDLE makeHandle(std::shared_ptr<KernelObject> object, Inheritance inheritance);
+
+/// The object of a handle, null with `ERROR_INVALID_HANDLE` as the last error when there is none.
+TVX_PLATFORM_API std::shared_ptr<KernelObject> objectOf(HANDLE handle);
+
+/// The same, of one kind of object.
+template <class Object>
+std::shared_ptr<Object> objectOf(HANDLE handle);
+
+/// Whether a child may be given this handle.
+bool isInheritable(HANDLE handle);
+
+} // namespace tvx::win
+
+#include "platform/win/Error.h"
+
+template <class Object>
+std::shared_ptr<Object> tvx::win::objectOf(HANDLE handle) {
+    auto object = std::dynamic_pointer_cast<Object>(objectOf(handle));
+    if (!object)
+        SetLastError(ERROR_INVALID_HANDLE);
+    return object;
+}

@@ -1,0 +1,122 @@
+#include "platform/win/detail/ProcessObject.h"
+
+#include "platform/win/Process.h"
+#include "platform/win/detail/PidFd.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <sys/epoll.h>
+#include <sys/wait.h>
+
+namespace tvx::win {
+
+namespace {
+
+constexpr DWORD signalBase = 0xC0000000;
+
+/// Collects an ended child. False when it runs, or when somebody else has collected it.
+bool collectStatus(int process, siginfo_t& status) {
+    status = {};
+    int result = 0;
+    do {
+        result = ::waitid(P_PIDFD, static_cast<id_t>(process), &status, WEXITED | WNOHANG | __WALL);
+    } while (result != 0 && errno == EINTR);
+    return result == 0 && status.si_pid != 0;
+}
+
+bool hasEnded(int process) {
+    return waitReadable(process, 0) != 0;
+}
+
+} // namespace
+
+DWORD exitCodeOf(const siginfo_t& status) {
+    if (status.si_code == CLD_EXITED)
+        return static_cast<DWORD>(status.si_status) & 0xFF;
+    switch (status.si_status) {
+    case SIGINT:
+        return STATUS_CONTROL_C_EXIT;
+    case SIGSEGV:
+        return STATUS_ACCESS_VIOLATION;
+    case SIGILL:
+        return STATUS_ILLEGAL_INSTRUCTION;
+    case SIGFPE:
+        return STATUS_INTEGER_DIVIDE_BY_ZERO;
+    case SIGBUS:
+        return STATUS_IN_PAGE_ERROR;
+    case SIGTRAP:
+        return STATUS_BREAKPOINT;
+    default:
+        return signalBase + static_cast<DWORD>(status.si_status);
+    }
+}
+
+ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
+    : KernelObject(std::move(process)), kinship_(kinship) {}
+
+ProcessObject::~ProcessObject() {
+    if (kinship_ == Kinship::child && exitCode() == STILL_ACTIVE && !code_)
+        ReleasedChildren::instance().add(std::move(descriptor_));
+    ReleasedChildren::instance().collect();
+}
+
+DWORD ProcessObject::exitCode() {
+    const std::lock_guard lock(mutex_);
+    if (!code_ && hasEnded(descriptor()))
+        code_ = collect();
+    return code_.value_or(STILL_ACTIVE);
+}
+
+DWORD ProcessObject::collect() {
+    siginfo_t status;
+    if (kinship_ == Kinship::stranger || !collectStatus(descriptor(), status))
+        return signalBase;
+    // A child that was faster than the order to end keeps its own code.
+    const bool killed = status.si_code == CLD_KILLED && status.si_status == SIGKILL;
+    return killed && ordered_ ? *ordered_ : exitCodeOf(status);
+}
+
+DWORD ProcessObject::terminate(DWORD code) {
+    const std::lock_guard lock(mutex_);
+    if (kinship_ == Kinship::stranger || code_ || hasEnded(descriptor()))
+        return ERROR_ACCESS_DENIED;
+    if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0)
+        return errorFromErrno(errno);
+    // The first order is the one that ends the child.
+    if (!ordered_)
+        ordered_ = code;
+    return ERROR_SUCCESS;
+}
+
+ReleasedChildren& ReleasedChildren::instance() {
+    static auto* children = new ReleasedChildren;
+    return *children;
+}
+
+ReleasedChildren::ReleasedChildren() : bell_(::epoll_create1(EPOLL_CLOEXEC)) {}
+
+void ReleasedChildren::add(Descriptor process) {
+    const std::lock_guard lock(mutex_);
+    epoll_event event{EPOLLIN, {}};
+    // Without the bell the child is still collected with the next start or release.
+    ::epoll_ctl(bell_.number(), EPOLL_CTL_ADD, process.number(), &event);
+    running_.push_back(std::move(process));
+}
+
+void ReleasedChildren::collect() {
+    const std::lock_guard lock(mutex_);
+    std::erase_if(running_, [](const Descriptor& process) {
+        siginfo_t status;
+        const bool ended = hasEnded(process.number());
+        if (ended)
+            collectStatus(process.number(), status);
+        return ended;
+    });
+}
+
+std::size_t ReleasedChildren::count() const {
+    const std::lock_guard lock(mutex_);
+    return running_.size();
+}
+
+} // namespace tvx::win

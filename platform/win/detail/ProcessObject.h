@@ -1,0 +1,63 @@
+#pragma once
+
+#include "platform/win/detail/KernelObject.h"
+
+#include <csignal>
+#include <mutex>
+#include <optional>
+#include <vector>
+
+namespace tvx::win {
+
+/// Whose child a process is: only children of this process can be ended, collected and asked for their code.
+enum class Kinship { child, stranger };
+
+/// A process, held by the system's reference to it.
+class ProcessObject : public KernelObject {
+public:
+    ProcessObject(Descriptor process, Kinship kinship) noexcept;
+    /// A child that still runs is handed to the ReleasedChildren.
+    ~ProcessObject() override;
+
+    /// The code that the process ended with, `STILL_ACTIVE` while it runs. Collects a child that has ended.
+    DWORD exitCode();
+    /// Kills a child, which then reports `code`. Answers `ERROR_SUCCESS` or why not.
+    DWORD terminate(DWORD code);
+
+private:
+    DWORD collect();
+
+    const Kinship kinship_;
+    std::mutex mutex_;
+    std::optional<DWORD> code_;    ///< once the end was seen
+    std::optional<DWORD> ordered_; ///< what the child is to report when it was killed
+};
+
+/// The platform's exit code for the status of an ended child.
+DWORD exitCodeOf(const siginfo_t& status);
+
+/// Children that nobody holds any more. They are collected when they have ended, so that none stays behind as a zombie:
+/// whenever a process is started or released, and as soon as they end where the event loop watches the bell.
+class TVX_PLATFORM_API ReleasedChildren {
+public:
+    static ReleasedChildren& instance();
+
+    void add(Descriptor process);
+    /// Collects those that have ended.
+    void collect();
+    /// How many still run.
+    std::size_t count() const;
+    /// A descriptor that is readable while an ended child waits to be collected; -1 when the system gives none.
+    int bell() const noexcept {
+        return bell_.number();
+    }
+
+private:
+    ReleasedChildren();
+
+    mutable std::mutex mutex_;
+    std::vector<Descriptor> running_;
+    Descriptor bell_;
+};
+
+} // namespace tvx::win
