@@ -5,6 +5,7 @@
 #include "platform/afx/detail/HandleTable.h"
 #include "platform/afx/detail/Keys.h"
 #include "platform/afx/detail/Menus.h"
+#include "platform/afx/detail/Window.h"
 #include "platform/win/AcceleratorTemplate.h"
 #include "platform/win/Resource.h"
 
@@ -115,7 +116,7 @@ int TranslateAcceleratorA(HWND window, HACCEL handle, MSG* message) {
         return 0;
     }
     const auto table = tableOf(handle);
-    if (!table || !IsWindow(window)) {
+    if (!table || Window::from(window) == nullptr) {
         return 0;
     }
     const auto found =

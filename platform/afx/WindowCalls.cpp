@@ -38,10 +38,6 @@ HWND handleOf(const Window* window) {
 
 } // namespace
 
-BOOL IsWindow(HWND handle) {
-    return Window::from(handle) != nullptr ? TRUE : FALSE;
-}
-
 BOOL DestroyWindow(HWND handle) {
     Window* window = windowOrError(handle);
     if (window == nullptr || window->isDestroyed()) {
@@ -52,11 +48,6 @@ BOOL DestroyWindow(HWND handle) {
 }
 
 // --- the tree of windows ---
-
-HWND GetParent(HWND handle) {
-    const Window* window = windowOrError(handle);
-    return window != nullptr ? handleOf(window->isChild() ? window->parent() : window->owner()) : nullptr;
-}
 
 HWND SetParent(HWND handle, HWND parent) {
     Window* window = windowOrError(handle);
@@ -122,10 +113,10 @@ BOOL IsChild(HWND parent, HWND handle) {
 
 namespace {
 
-BOOL enumerate(const std::vector<Window*>& windows, bool deep, WNDENUMPROC callback, LPARAM param) {
+BOOL tellDescendants(const Window& parent, WNDENUMPROC callback, LPARAM param) {
     std::vector<HWND> handles;
-    handles.reserve(windows.size());
-    for (const Window* window : windows) {
+    handles.reserve(parent.children().size());
+    for (const Window* window : parent.children()) {
         handles.push_back(window->handle());
     }
     for (const HWND handle : handles) {
@@ -136,7 +127,7 @@ BOOL enumerate(const std::vector<Window*>& windows, bool deep, WNDENUMPROC callb
             return FALSE;
         }
         const Window* window = Window::from(handle);
-        if (deep && window != nullptr && !enumerate(window->children(), true, callback, param)) {
+        if (window != nullptr && !tellDescendants(*window, callback, param)) {
             return FALSE;
         }
     }
@@ -147,11 +138,7 @@ BOOL enumerate(const std::vector<Window*>& windows, bool deep, WNDENUMPROC callb
 
 BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param) {
     const Window* window = windowOrError(parent);
-    return window != nullptr ? enumerate(window->children(), true, callback, param) : FALSE;
-}
-
-BOOL EnumWindows(WNDENUMPROC callback, LPARAM param) {
-    return enumerate(Window::topLevels(), false, callback, param);
+    return window != nullptr ? tellDescendants(*window, callback, param) : FALSE;
 }
 
 HWND GetDesktopWindow() {
@@ -208,26 +195,6 @@ BOOL EnableWindow(HWND handle, BOOL enable) {
         window->setEnabled(enable != FALSE);
     }
     return wasDisabled ? TRUE : FALSE;
-}
-
-BOOL IsIconic(HWND handle) {
-    const Window* window = Window::from(handle);
-    return window != nullptr && window->widget()->isMinimized() ? TRUE : FALSE;
-}
-
-BOOL IsZoomed(HWND handle) {
-    const Window* window = Window::from(handle);
-    return window != nullptr && window->widget()->isMaximized() ? TRUE : FALSE;
-}
-
-BOOL ShowWindow(HWND handle, int command) {
-    Window* window = windowOrError(handle);
-    if (window == nullptr) {
-        return FALSE;
-    }
-    const bool before = (window->style() & WS_VISIBLE) != 0;
-    window->show(command);
-    return before ? TRUE : FALSE;
 }
 
 LONG_PTR GetWindowLongPtrA(HWND handle, int index) {
@@ -296,17 +263,6 @@ int GetWindowTextLengthA(HWND handle) {
     return static_cast<int>(SendMessageA(handle, WM_GETTEXTLENGTH, 0, 0));
 }
 
-int GetClassNameA(HWND handle, LPSTR buffer, int size) {
-    const Window* window = windowOrError(handle);
-    if (window == nullptr || size <= 0) {
-        return 0;
-    }
-    const std::size_t length = std::min(window->className().size(), static_cast<std::size_t>(size - 1));
-    std::memcpy(buffer, window->className().data(), length);
-    buffer[length] = '\0';
-    return static_cast<int>(length);
-}
-
 // --- place and size ---
 
 BOOL MoveWindow(HWND handle, int x, int y, int width, int height, BOOL repaint) {
@@ -349,7 +305,7 @@ BOOL SetWindowPos(HWND handle, HWND after, int x, int y, int cx, int cy, UINT fl
             placeInOrder(*window, after);
         }
     });
-    if (IsWindow(handle)) {
+    if (Window::from(handle) != nullptr) {
         window->tellGeometry();
     }
     const bool activate = (flags & SWP_NOACTIVATE) == 0;
@@ -513,18 +469,4 @@ HWND SetActiveWindow(HWND handle) {
         guarded([window] { window->topLevel()->widget()->activateWindow(); });
     }
     return previous;
-}
-
-HWND GetForegroundWindow() {
-    return GetActiveWindow();
-}
-
-BOOL SetForegroundWindow(HWND handle) {
-    Window* window = windowOrError(handle);
-    if (window == nullptr) {
-        return FALSE;
-    }
-    guarded([window] { window->topLevel()->widget()->raise(); });
-    SetActiveWindow(handle);
-    return TRUE;
 }

@@ -3,6 +3,11 @@
 /// @file
 /// The calls that work on bare window handles. A handle that is no window (any more) makes them answer 0 and do
 /// nothing.
+///
+/// Under X11 the handle of a top-level window is its X id, which means the same window to every process. The calls
+/// `IsWindow`, `IsIconic`, `IsZoomed`, `ShowWindow`, `GetParent`, `GetClassNameA`, `GetWindowThreadProcessId` and
+/// `SetForegroundWindow` take windows of other processes too. In a Wayland session they do not exist: handles of other
+/// processes are no windows there.
 
 #include "platform/afx/Message.h"
 
@@ -23,6 +28,8 @@ TVX_PLATFORM_API BOOL IsWindowEnabled(HWND window);
 TVX_PLATFORM_API BOOL EnableWindow(HWND window, BOOL enable);
 TVX_PLATFORM_API BOOL IsIconic(HWND window);
 TVX_PLATFORM_API BOOL IsZoomed(HWND window);
+/// The result tells whether the window was visible before. Windows of other processes are minimised, restored,
+/// maximised and brought to the front; SW_HIDE leaves them as they are.
 TVX_PLATFORM_API BOOL ShowWindow(HWND window, int command);
 TVX_PLATFORM_API BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint);
 TVX_PLATFORM_API BOOL SetWindowPos(HWND window, HWND after, int x, int y, int cx, int cy, UINT flags);
@@ -49,17 +56,31 @@ TVX_PLATFORM_API HWND SetCapture(HWND window);
 TVX_PLATFORM_API BOOL ReleaseCapture();
 TVX_PLATFORM_API HWND GetActiveWindow();
 TVX_PLATFORM_API HWND SetActiveWindow(HWND window);
-TVX_PLATFORM_API HWND GetForegroundWindow();
-TVX_PLATFORM_API BOOL SetForegroundWindow(HWND window);
 /// @}
+/// The active window, this process's or another one's; null when there is none.
+TVX_PLATFORM_API HWND GetForegroundWindow();
+/// Brings a window to the front and makes it the active one. FALSE when it is no window, or when the window manager
+/// refuses another process's: that one asks for attention then.
+TVX_PLATFORM_API BOOL SetForegroundWindow(HWND window);
 /// The screen's own window; its rectangle is the primary screen's.
 TVX_PLATFORM_API HWND GetDesktopWindow();
 TVX_PLATFORM_API HWND WindowFromPoint(POINT point);
 TVX_PLATFORM_API HWND ChildWindowFromPoint(HWND parent, POINT point);
 TVX_PLATFORM_API HWND FindWindowA(LPCSTR className, LPCSTR text);
-/// Calls `callback` for each window until it answers FALSE: all descendants, or all top-level windows.
+/// Calls `callback` for all descendants of a window until it answers FALSE.
 TVX_PLATFORM_API BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param);
+/// Calls `callback` for each top-level window until it answers FALSE: this process's in the order of their creation,
+/// then those of other processes that the window manager lists, the topmost first.
 TVX_PLATFORM_API BOOL EnumWindows(WNDENUMPROC callback, LPARAM param);
+/// The same for the windows of one thread. Of another process all windows belong to its first thread, whose number is
+/// the process's own.
+TVX_PLATFORM_API BOOL EnumThreadWindows(DWORD thread, WNDENUMPROC callback, LPARAM param);
+/// The thread that a window lives on; 0 when it is no window, or one of another machine.
+/// @param process receives the window's process; may be null; unchanged when the result is 0
+TVX_PLATFORM_API DWORD GetWindowThreadProcessId(HWND window, DWORD* process);
+/// Kept for hosts that attach to the foreground window's thread before they activate a window. The display has one
+/// input for all, so nothing has to be attached. FALSE for equal threads and for 0.
+TVX_PLATFORM_API BOOL AttachThreadInput(DWORD from, DWORD to, BOOL attach);
 
 /// Texts and numbers of a window; buffers are always ended by NUL.
 /// @{

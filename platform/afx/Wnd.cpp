@@ -86,7 +86,7 @@ HWND CWnd::Detach() {
 }
 
 BOOL CWnd::SubclassWindow(HWND handle) {
-    if (FromHandlePermanent(handle) != nullptr || !::IsWindow(handle)) {
+    if (FromHandlePermanent(handle) != nullptr || Window::from(handle) == nullptr) {
         return FALSE;
     }
     PreSubclassWindow();

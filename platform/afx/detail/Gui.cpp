@@ -5,6 +5,7 @@
 #include "platform/afx/detail/MessageQueue.h"
 #include "platform/win/Display.h"
 #include "platform/win/Module.h"
+#include "platform/win/Thread.h"
 
 #include <QAbstractEventDispatcher>
 #include <QApplication>
@@ -42,6 +43,8 @@ public:
     }
 };
 
+DWORD threadOfWindows = 0;
+
 bool askDisplay() {
     const char* plugin = std::getenv("QT_QPA_PLATFORM");
     if (plugin != nullptr && *plugin != '\0') {
@@ -56,6 +59,7 @@ void makeApplication() {
     static std::string name = moduleFileName(nullptr);
     static char* argv[] = {name.data(), nullptr};
     auto* application = new GuiApplication(argc, argv);
+    threadOfWindows = GetCurrentThreadId();
     QApplication::setQuitOnLastWindowClosed(false);
     QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, application,
                      &runIdle);
@@ -65,6 +69,10 @@ void makeApplication() {
 }
 
 } // namespace
+
+DWORD guiThread() {
+    return threadOfWindows;
+}
 
 bool hasDisplay() {
     static const bool answer = askDisplay();

@@ -4,6 +4,7 @@
 /// The toolkit's application object, made when the first window is needed.
 
 #include "platform/base/Export.h"
+#include "platform/base/Types.h"
 
 namespace tvx::afx {
 
@@ -12,6 +13,8 @@ namespace tvx::afx {
 TVX_PLATFORM_API bool hasDisplay();
 /// Makes the toolkit's application object if it does not stand yet. False when there is no display.
 TVX_PLATFORM_API bool ensureGui();
+/// The number of the thread that this process's windows live on, 0 before there can be any.
+[[nodiscard]] DWORD guiThread();
 /// Tells on standard error, once, that a window was wanted where none can be shown.
 TVX_PLATFORM_API void tellMissingDisplay();
 /// Whether that has been told.

@@ -329,7 +329,7 @@ HMENU makeSystemMenu(const Window& window) {
 /// Menus of windows that have ended go with the next one that is asked for.
 void forgetEnded() {
     std::erase_if(systemMenus(), [](const auto& entry) {
-        const bool ended = !IsWindow(reinterpret_cast<HWND>(entry.first));
+        const bool ended = Window::from(reinterpret_cast<HWND>(entry.first)) == nullptr;
         if (ended) {
             DestroyMenu(entry.second);
         }
@@ -425,7 +425,7 @@ BOOL SetMenu(HWND handle, HMENU menu) {
 }
 
 BOOL DrawMenuBar(HWND handle) {
-    return IsWindow(handle);
+    return Window::from(handle) != nullptr ? TRUE : FALSE;
 }
 
 HMENU GetSystemMenu(HWND handle, BOOL revert) {
