@@ -1,7 +1,9 @@
 // What happens when the library is loaded.
 #include "platform/win/Module.h"
 #include "afx.h"
+#include "platform/port/Version.h"
 #include "platform/win/ExtensionModule.h"
+#include "s/Version.h"
 
 #include <new>
 
@@ -9,7 +11,8 @@ namespace {
 
 AFX_EXTENSION_MODULE s_state;
 
-/// Joins the host's search for resources, before the host's own objects are made.
+/// Joins the host's search for resources and provides the installation's values, before the host's own objects are
+/// made.
 class LibraryModule {
 public:
     LibraryModule() {
@@ -19,8 +22,10 @@ public:
         } catch (const std::bad_alloc&) {
             TRACE0("The library works without its resources in the chain.\n");
         }
+        Port::Version::setReader(&Gui_InstallInfo::GetValue);
     }
     ~LibraryModule() {
+        Port::Version::setReader(nullptr);
         AfxTermExtensionModule(s_state);
     }
     LibraryModule(const LibraryModule&) = delete;

@@ -1,6 +1,7 @@
 #include "platform/port/MsgManData.h"
 
 #include "platform/base/Text.h"
+#include "platform/port/Env.h"
 #include "platform/port/MsgDispatcher.h"
 
 namespace {
@@ -52,4 +53,13 @@ void Port_MsgManData::issueInternal(const char* format, ...) const {
 
 void Port_MsgManData::issueFatal(int code, const char* format, ...) const {
     ISSUE(MsgTypeFatal, code);
+}
+
+void Port_MsgManData::debugStub(const char* format, ...) {
+    if (!Port_Env::GetEnv("TVX_MSG_DEBUG"))
+        return;
+    std::va_list arguments;
+    va_start(arguments, format);
+    createObject("", "", 0, "").issue(Port_MsgMan::MsgTypeDebug, 0, format, arguments);
+    va_end(arguments);
 }

@@ -38,6 +38,10 @@ public:
     /// @param code the code with which the application is about to end.
     [[gnu::format(printf, 3, 4)]] void issueFatal(int code, const char* format, ...) const;
 
+    /// Issues a trace for developers, without an origin, when the environment variable `TVX_MSG_DEBUG` is set; does
+    /// nothing otherwise.
+    [[gnu::format(printf, 1, 2)]] static void debugStub(const char* format, ...);
+
 private:
     Port_MsgManData(const char* module, const char* source, int line, const char* revision);
     void issue(Port_MsgMan::MsgType type, int code, const char* format, std::va_list arguments) const;

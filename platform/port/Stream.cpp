@@ -1,8 +1,12 @@
 #include "platform/port/Stream.h"
 
+#include "platform/base/Text.h"
+
+#include <algorithm>
 #include <cerrno>
 #include <csignal>
 #include <cstdio>
+#include <cstring>
 #include <ctime>
 #include <pthread.h>
 #include <unistd.h>
@@ -10,6 +14,9 @@
 namespace Port {
 
 namespace {
+
+constexpr std::size_t chunkSize = 64 * 1024;
+constexpr std::size_t longestCharacter = 4;
 
 /// Holds back the signal that a pipe without reader sends, which would end the process, for the length of a write.
 class BrokenPipeGuard {
@@ -48,9 +55,25 @@ void writeAll(int descriptor, std::string_view text) {
     }
 }
 
+/// Bytes read into the buffer; 0 at the end of the file and when it cannot be read on.
+std::size_t readSome(int descriptor, char* to, std::size_t size) {
+    for (;;) {
+        const ssize_t got = ::read(descriptor, to, size);
+        if (got >= 0 || errno != EINTR)
+            return got > 0 ? static_cast<std::size_t>(got) : 0;
+    }
+}
+
+/// Length of the line end at the beginning of @p text.
+std::size_t lineEndLength(std::string_view text) {
+    return text.starts_with("\r\n") ? 2 : 1;
+}
+
 } // namespace
 
 Stream::Stream(int descriptor) : m_descriptor(descriptor) {}
+
+Stream::~Stream() = default;
 
 Stream& Stream::operator<<(const char* text) {
     return text ? *this << std::string_view(text) : *this;
@@ -78,6 +101,48 @@ Stream& Stream::operator<<(Stream& (*manipulator)(Stream&)) {
 
 Stream& Stream::endl(Stream& stream) {
     return stream << '\n';
+}
+
+int Stream::readline(char* to, int limit) {
+    const auto most = static_cast<std::size_t>(std::max(limit, 1));
+    // Enough to see a line end behind the longest piece, and whether a cut there would split a character.
+    buffer(most + longestCharacter);
+    const std::string_view text = std::string_view(m_input).substr(m_consumed, most + longestCharacter);
+    std::size_t length = text.find_first_of("\r\n");
+    std::size_t used = 0;
+    m_eof = false;
+    if (length <= most) {
+        used = length + lineEndLength(text.substr(length));
+    } else if (text.size() > most) {
+        length = tvx::text::characterStart(text, most);
+        used = length = length > 0 ? length : most;
+    } else {
+        used = length = text.size();
+        m_eof = true;
+    }
+    std::memcpy(to, text.data(), length);
+    to[length] = '\0';
+    m_consumed += used;
+    return static_cast<int>(length);
+}
+
+bool Stream::geteof() const {
+    return m_eof;
+}
+
+/// Reads on until @p count bytes wait, or there are no more.
+void Stream::buffer(std::size_t count) {
+    if (m_exhausted || m_input.size() - m_consumed >= count)
+        return;
+    m_input.erase(0, m_consumed);
+    m_consumed = 0;
+    while (!m_exhausted && m_input.size() < count) {
+        const std::size_t before = m_input.size();
+        m_input.resize(before + chunkSize);
+        const std::size_t got = readSome(m_descriptor, m_input.data() + before, chunkSize);
+        m_input.resize(before + got);
+        m_exhausted = got == 0;
+    }
 }
 
 } // namespace Port
