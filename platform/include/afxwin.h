@@ -32,5 +32,6 @@
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/FrameworkIds.h"
 #include "platform/win/Module.h"
+#include "platform/win/Registry.h"
 #include "platform/win/Resource.h"
 #include "platform/win/ResourceConstants.h"

@@ -1,0 +1,158 @@
+#pragma once
+
+#include "platform/base/Export.h"
+#include "platform/win/Error.h"
+#include "platform/win/detail/RegistryFile.h"
+#include "platform/win/detail/RegistryPath.h"
+
+#include <array>
+#include <atomic>
+#include <memory>
+#include <mutex>
+#include <string>
+#include <thread>
+#include <unordered_map>
+#include <vector>
+
+namespace tvx::registry {
+
+class Connection;
+
+struct Value {
+    std::string name; ///< as it was first written
+    DWORD type = 0;
+    std::string data;
+};
+
+/// Where an enumeration stands, so that the next name is found without counting from the beginning.
+struct Cursor {
+    DWORD index = 0;
+    std::string folded; ///< name of the entry at `index`
+    bool isSet = false;
+};
+
+/// A mutex that its owner may lock again, and that can be let go in the child of a fork.
+class StoreMutex {
+public:
+    void lock();
+    void unlock();
+    [[nodiscard]] bool isMine() const {
+        return m_owner.load(std::memory_order_relaxed) == std::this_thread::get_id();
+    }
+
+private:
+    std::mutex m_mutex;
+    std::atomic<std::thread::id> m_owner;
+    int m_depth = 0;
+};
+
+/// The settings of one hive. There is one object a hive and process; it opens its file when it is first needed and again
+/// when another file has taken its place.
+///
+/// The operations answer the platform's numbers. They are to be called with the mutex locked; what the user is to be
+/// told meanwhile is taken from takeNotices() after it is unlocked.
+class Store {
+public:
+    explicit Store(Hive hive);
+    ~Store();
+    Store(const Store&) = delete;
+    Store& operator=(const Store&) = delete;
+
+    /// The process's store.
+    static Store& of(Hive hive);
+
+    StoreMutex mutex;
+
+    [[nodiscard]] DWORD findKey(const KeyPath& key);
+    [[nodiscard]] DWORD createKey(const KeyPath& key, bool& created);
+    [[nodiscard]] DWORD deleteKey(const KeyPath& key);
+    [[nodiscard]] DWORD readValue(const KeyPath& key, std::string_view name, std::shared_ptr<const Value>& value);
+    [[nodiscard]] DWORD writeValue(const KeyPath& key, const Value& value);
+    [[nodiscard]] DWORD deleteValue(const KeyPath& key, std::string_view name);
+    /// The name of the key at `index` below `key`.
+    [[nodiscard]] DWORD keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string& name);
+    /// The value at `index` of `key`.
+    [[nodiscard]] DWORD valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& value);
+
+    [[nodiscard]] DWORD begin();
+    [[nodiscard]] DWORD commit();
+    void rollback();
+
+    /// What happens to the log on closing: brought into the file by the last process, or left as it is.
+    enum class Log { merge, keep };
+    /// Closes the file; the next operation opens it again. Does nothing within a transaction.
+    void close(Log log = Log::merge);
+    /// Leaves an open transaction to the process that this one is a fork of.
+    void leaveToParent();
+
+    [[nodiscard]] std::vector<std::string> takeNotices();
+
+private:
+    enum class Intent { read, write };
+    /// How the open file can be used.
+    enum class Mode { closed, shared, readOnly, copy };
+    /// Faults that the user is told once about.
+    enum class Fault { unusable, newer, damaged, notSaved, count_ };
+
+    /// What a question was answered with.
+    struct Reply {
+        DWORD result = 0;
+        std::shared_ptr<const Value> value;
+    };
+    using Replies = std::unordered_map<std::string, Reply>;
+    struct Memory;
+
+    template <typename Operation>
+    DWORD run(Intent intent, Operation operation);
+    template <typename Operation>
+    DWORD change(Operation operation);
+    template <typename Operation>
+    DWORD together(Operation operation);
+    template <typename Question>
+    Reply remembered(std::string_view subject, std::string_view detail, Question question);
+    Reply askKey(const KeyPath& key);
+    Reply askValue(const KeyPath& key, std::string_view folded);
+    DWORD addLevels(const KeyPath& key);
+    DWORD removeKey(const KeyPath& key);
+    /// The replies to what was asked since anybody's last write; null when that cannot be told cheaply.
+    Replies* replies();
+
+    DWORD ensureOpen(Intent intent);
+    DWORD open(Intent intent);
+    DWORD openFile();
+    DWORD connect(const std::string& file);
+    DWORD checkSchema();
+    DWORD checkVersion();
+    DWORD initialise();
+    DWORD openCopy(DWORD reason);
+    DWORD createFile();
+    DWORD replaceDamaged();
+    void chooseJournal();
+    [[nodiscard]] bool isEmptyDatabase();
+    [[nodiscard]] bool isCurrent() const;
+
+    /// The platform's number for a result of the database.
+    DWORD failed(int result);
+    void tell(Fault fault, std::string text);
+
+    const Hive m_hive;
+    std::string m_name; ///< where the file is expected
+    std::string m_file; ///< where links lead from there
+    FileIdentity m_identity;
+    FileStamp m_stamp;
+    FileStamp m_logStamp;
+    Mode m_mode = Mode::closed;
+    DWORD m_writeError = ERROR_ACCESS_DENIED; ///< what a write is answered where none is possible
+    bool m_inTransaction = false;
+    bool m_isLost = false; ///< the process is the child of one that forked within a transaction
+    std::unique_ptr<Connection> m_connection;
+    std::unique_ptr<FileCopy> m_copy;
+    std::unique_ptr<Memory> m_memory;
+    std::vector<std::string> m_notices;
+    std::array<bool, static_cast<std::size_t>(Fault::count_)> m_told{};
+};
+
+/// Closes the files of all hives, as at the end of the process. They are opened again when needed.
+TVX_PLATFORM_API void closeStores();
+
+} // namespace tvx::registry

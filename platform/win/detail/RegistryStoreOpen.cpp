@@ -1,0 +1,259 @@
+#include "platform/win/detail/RegistryConnection.h"
+#include "platform/win/detail/RegistryMemory.h"
+#include "platform/win/detail/RegistryStore.h"
+
+#include <cstdlib>
+#include <pthread.h>
+
+namespace tvx::registry {
+
+namespace {
+
+constexpr std::int64_t applicationId = 0x54565852; // "TVXR", as file(1) sees it
+constexpr std::int64_t schemaVersion = 1;
+constexpr const char* schema = "BEGIN IMMEDIATE;"
+                               "CREATE TABLE key (id INTEGER PRIMARY KEY, parent INTEGER NOT NULL,"
+                               " path TEXT NOT NULL UNIQUE, name TEXT NOT NULL);"
+                               "CREATE INDEX key_parent ON key (parent, path);"
+                               "CREATE TABLE value (key INTEGER NOT NULL, folded TEXT NOT NULL, name TEXT NOT NULL,"
+                               " type INTEGER NOT NULL, data BLOB NOT NULL, PRIMARY KEY (key, folded)) WITHOUT ROWID;"
+                               "INSERT INTO key VALUES (1, 0, '', '');"
+                               "PRAGMA application_id = 1414944850;"
+                               "PRAGMA user_version = 1;"
+                               "COMMIT";
+static_assert(applicationId == 1414944850 && schemaVersion == 1);
+
+struct Stores {
+    Store user{Hive::user};
+    Store machine{Hive::machine};
+};
+
+/// Never destroyed: objects that end later than this may still keep their settings.
+Stores& stores();
+
+/// The database must not be carried over a fork, not even to be closed in the child: both would believe in locks that
+/// only one of them has. So it is closed before, and each of the two opens it again when it needs it.
+void beforeFork() {
+    for (Store* store : {&stores().user, &stores().machine}) {
+        store->mutex.lock();
+        store->close(Store::Log::keep);
+    }
+}
+
+void afterForkInParent() {
+    for (Store* store : {&stores().user, &stores().machine})
+        store->mutex.unlock();
+}
+
+void afterForkInChild() {
+    for (Store* store : {&stores().user, &stores().machine}) {
+        store->leaveToParent();
+        store->mutex.unlock();
+    }
+}
+
+Stores& stores() {
+    static Stores* const all = [] {
+        pthread_atfork(&beforeFork, &afterForkInParent, &afterForkInChild);
+        std::atexit(&closeStores);
+        return new Stores;
+    }();
+    return *all;
+}
+
+} // namespace
+
+Store::Store(Hive hive) : m_hive(hive), m_memory(std::make_unique<Memory>()) {}
+
+Store::~Store() = default;
+
+Store& Store::of(Hive hive) {
+    return hive == Hive::user ? stores().user : stores().machine;
+}
+
+void closeStores() {
+    for (Store* store : {&stores().user, &stores().machine}) {
+        const std::lock_guard lock(store->mutex);
+        store->close();
+    }
+}
+
+void Store::close(Log log) {
+    if (m_inTransaction)
+        return;
+    if (m_connection != nullptr && log == Log::keep)
+        m_connection->keepLogOnClose();
+    m_memory->replies.clear();
+    m_memory->watch = Memory::Watch::none;
+    m_connection.reset();
+    m_copy.reset();
+    m_mode = Mode::closed;
+}
+
+void Store::leaveToParent() {
+    m_isLost = m_inTransaction;
+}
+
+bool Store::isCurrent() const {
+    switch (m_mode) {
+    case Mode::closed:
+        return false;
+    case Mode::copy:
+        return m_stamp == stampOf(m_file) && m_logStamp == stampOf(m_file + "-wal");
+    default:
+        return m_identity == identityOf(m_name);
+    }
+}
+
+DWORD Store::ensureOpen(Intent intent) {
+    if (m_isLost || (intent == Intent::write && m_hive == Hive::machine))
+        return ERROR_ACCESS_DENIED;
+    if (m_inTransaction)
+        return ERROR_SUCCESS;
+    // What could not be written before may have become possible.
+    const bool isEnough = m_mode == Mode::shared || intent == Intent::read;
+    return isEnough && isCurrent() ? ERROR_SUCCESS : open(intent);
+}
+
+DWORD Store::open(Intent intent) {
+    close();
+    m_name = locate(m_hive);
+    if (m_name.empty())
+        return intent == Intent::read ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
+    m_file = resolve(m_name);
+    const FileKind kind = kindOf(m_file);
+    if (kind == FileKind::missing) {
+        if (intent == Intent::read)
+            return ERROR_FILE_NOT_FOUND;
+        if (const DWORD result = createFile(); result != ERROR_SUCCESS)
+            return result;
+    } else if (kind != FileKind::regular) {
+        tell(Fault::unusable, "The settings cannot be used: " + m_name +
+                                  (kind == FileKind::other ? " is no file." : " cannot be reached."));
+        return ERROR_ACCESS_DENIED;
+    }
+    return openFile();
+}
+
+DWORD Store::createFile() {
+    // A link that leads nowhere says where the file is wanted, but a missing folder there may be a disk that is not in
+    // its place at the moment.
+    const DWORD result = makeFile(m_file, m_file == m_name ? Folders::make : Folders::expect);
+    if (result != ERROR_SUCCESS)
+        tell(Fault::notSaved, "Settings cannot be saved: " + m_file + " cannot be made. " + errorText(result));
+    return result;
+}
+
+DWORD Store::openFile() {
+    m_writeError = ERROR_ACCESS_DENIED;
+    const DWORD result = connect(m_file);
+    if (result == ERROR_SUCCESS || result == ERROR_REGISTRY_CORRUPT)
+        return result;
+    close(Log::keep);
+    const bool isPlaceBad =
+        result == ERROR_ACCESS_DENIED || result == ERROR_DISK_FULL || result == ERROR_REGISTRY_IO_FAILED;
+    return isPlaceBad ? openCopy(result) : result;
+}
+
+DWORD Store::connect(const std::string& file) {
+    m_identity = identityOf(m_name); // first: should another file come in between, it is noticed by the next call
+    m_connection = std::make_unique<Connection>();
+    DWORD result = failed(m_connection->open(file));
+    if (result == ERROR_SUCCESS)
+        result = checkSchema();
+    if (result != ERROR_SUCCESS)
+        return result;
+    m_memory->watch = m_copy != nullptr             ? Memory::Watch::nothing
+                      : m_connection->shareLog() ? Memory::Watch::log
+                                                    : Memory::Watch::none;
+    return ERROR_SUCCESS;
+}
+
+DWORD Store::checkSchema() {
+    const auto id = m_connection->number("PRAGMA application_id");
+    if (!id)
+        return failed(m_connection->error());
+    m_mode = m_connection->isReadOnly() || m_hive == Hive::machine ? Mode::readOnly : Mode::shared;
+    if (m_copy != nullptr)
+        m_mode = Mode::copy;
+    if (m_mode == Mode::shared)
+        chooseJournal();
+    if (*id == 0 && isEmptyDatabase()) {
+        if (const DWORD result = initialise(); result != ERROR_SUCCESS)
+            return result;
+    } else if (*id != applicationId) {
+        tell(Fault::unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
+        return ERROR_BAD_FORMAT;
+    }
+    return checkVersion();
+}
+
+bool Store::isEmptyDatabase() {
+    return m_connection->number("SELECT count(*) FROM sqlite_schema") == 0;
+}
+
+DWORD Store::checkVersion() {
+    const auto version = m_connection->number("PRAGMA user_version");
+    if (!version)
+        return failed(m_connection->error());
+    if (*version <= schemaVersion)
+        return ERROR_SUCCESS;
+    tell(Fault::newer, "The settings in " + m_file +
+                           " were written by a newer version of this software. They are read as far as possible and "
+                           "not changed.");
+    m_mode = m_mode == Mode::copy ? Mode::copy : Mode::readOnly;
+    return ERROR_SUCCESS;
+}
+
+void Store::chooseJournal() {
+    const char* wanted = allowsSharedMemory(m_file) ? "wal" : "delete";
+    if (m_connection->text("PRAGMA journal_mode") == wanted)
+        return;
+    // Where the file is in use this fails, and it stays as it is: every kind is safe, some are only slower.
+    (void)m_connection->execute((std::string("PRAGMA journal_mode = ") + wanted).c_str());
+}
+
+DWORD Store::initialise() {
+    if (m_mode != Mode::shared)
+        return ERROR_FILE_NOT_FOUND;
+    const FolderLock lock(m_file);
+    if (!lock.isHeld())
+        return ERROR_BUSY;
+    if (!isEmptyDatabase())
+        return ERROR_SUCCESS; // another process was faster
+    const int result = m_connection->execute(schema);
+    if (result != SQLITE_OK)
+        (void)m_connection->execute("ROLLBACK");
+    return failed(result);
+}
+
+DWORD Store::openCopy(DWORD reason) {
+    m_writeError = reason;
+    m_stamp = stampOf(m_file);
+    m_logStamp = stampOf(m_file + "-wal");
+    m_copy = std::make_unique<FileCopy>(m_file);
+    if (!m_copy->name().empty() && connect(m_copy->name()) == ERROR_SUCCESS && isCurrent())
+        return ERROR_SUCCESS;
+    close();
+    tell(Fault::unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
+    return reason;
+}
+
+DWORD Store::replaceDamaged() {
+    const FileIdentity damaged = m_identity;
+    const bool isOurs = m_hive == Hive::user && m_copy == nullptr;
+    close(Log::keep);
+    const FolderLock lock(m_file);
+    if (isOurs && lock.isHeld() && identityOf(m_name) != damaged)
+        return ERROR_SUCCESS; // another process has set it aside already
+    const auto aside = isOurs && lock.isHeld() ? setAside(m_file) : std::nullopt;
+    if (!aside) {
+        tell(Fault::unusable, "The settings cannot be used: " + m_file + " is damaged.");
+        return ERROR_ACCESS_DENIED;
+    }
+    tell(Fault::damaged, "The file of the settings, " + m_file +
+                             ", is damaged. It was kept as " + *aside + ", and new settings are begun.");
+    return ERROR_SUCCESS;
+}
+
+} // namespace tvx::registry
