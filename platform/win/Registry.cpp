@@ -60,11 +60,10 @@ public:
 
 private:
     HandleTable() {
-        m_keys[HKEY_CLASSES_ROOT] = std::make_shared<OpenKey>(
-            OpenKey{Hive::user, pathOf("Software\\Classes"), KEY_ALL_ACCESS, true, {}, {}});
+        m_keys[HKEY_CLASSES_ROOT] =
+            std::make_shared<OpenKey>(OpenKey{Hive::user, pathOf("Software\\Classes"), KEY_ALL_ACCESS, true, {}, {}});
         m_keys[HKEY_CURRENT_USER] = std::make_shared<OpenKey>();
-        m_keys[HKEY_LOCAL_MACHINE] =
-            std::make_shared<OpenKey>(OpenKey{Hive::machine, {}, KEY_READ, false, {}, {}});
+        m_keys[HKEY_LOCAL_MACHINE] = std::make_shared<OpenKey>(OpenKey{Hive::machine, {}, KEY_READ, false, {}, {}});
     }
 
     std::mutex m_mutex;

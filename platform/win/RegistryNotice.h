@@ -14,7 +14,8 @@ namespace tvx {
 using RegistryNotice = void (*)(const std::string& text);
 
 /// Installs the function that tells the user; null goes back to standard error. Called once by the floor that has
-/// message boxes. The function is called after the settings call that met the fault, on its thread, once for each fault.
+/// message boxes. The function is called after the settings call that met the fault, on its thread, once for each
+/// fault.
 TVX_PLATFORM_API void setRegistryNotice(RegistryNotice notice) noexcept;
 
 } // namespace tvx

@@ -138,7 +138,8 @@ FileStamp stampOf(const std::string& file) {
     struct stat status {};
     if (stat(file.c_str(), &status) != 0)
         return {};
-    return {{status.st_dev, status.st_ino}, status.st_size, status.st_mtim.tv_sec * 1'000'000'000 + status.st_mtim.tv_nsec};
+    return {
+        {status.st_dev, status.st_ino}, status.st_size, status.st_mtim.tv_sec * 1'000'000'000 + status.st_mtim.tv_nsec};
 }
 
 bool allowsSharedMemory(const std::string& file) {

@@ -22,7 +22,8 @@ struct Store::Memory {
     Replies* current(const Connection& connection) {
         if (watch == Watch::none)
             return nullptr;
-        if (const LogHead now = watch == Watch::log ? connection.logHead() : head; now != head || replies.size() > most) {
+        if (const LogHead now = watch == Watch::log ? connection.logHead() : head;
+            now != head || replies.size() > most) {
             replies.clear();
             head = now;
         }

@@ -44,8 +44,7 @@ DWORD Store::run(Intent intent, Operation operation) {
 /// The same with an operation that writes.
 template <typename Operation>
 DWORD Store::change(Operation operation) {
-    const DWORD result =
-        run(Intent::write, [&] { return m_mode == Mode::shared ? operation() : m_writeError; });
+    const DWORD result = run(Intent::write, [&] { return m_mode == Mode::shared ? operation() : m_writeError; });
     if (result == ERROR_DISK_FULL || result == ERROR_BUSY || result == ERROR_REGISTRY_IO_FAILED)
         tell(Fault::notSaved, "Settings could not be saved in " + m_file + ". " + errorText(result));
     return result;
@@ -103,7 +102,9 @@ Store::Reply Store::askValue(const KeyPath& key, std::string_view folded) {
     if (step != SQLITE_DONE)
         return {failed(step), nullptr};
     const DWORD keyResult = askKey(key).result;
-    return {keyResult == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : keyResult == 0 ? ERROR_FILE_NOT_FOUND : keyResult,
+    return {keyResult == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED
+            : keyResult == 0                  ? ERROR_FILE_NOT_FOUND
+                                              : keyResult,
             nullptr};
 }
 

@@ -46,8 +46,8 @@ private:
     int m_depth = 0;
 };
 
-/// The settings of one hive. There is one object a hive and process; it opens its file when it is first needed and again
-/// when another file has taken its place.
+/// The settings of one hive. There is one object a hive and process; it opens its file when it is first needed and
+/// again when another file has taken its place.
 ///
 /// The operations answer the platform's numbers. They are to be called with the mutex locked; what the user is to be
 /// told meanwhile is taken from takeNotices() after it is unlocked.

@@ -163,9 +163,9 @@ DWORD Store::connect(const std::string& file) {
         result = checkSchema();
     if (result != ERROR_SUCCESS)
         return result;
-    m_memory->watch = m_copy != nullptr             ? Memory::Watch::nothing
+    m_memory->watch = m_copy != nullptr          ? Memory::Watch::nothing
                       : m_connection->shareLog() ? Memory::Watch::log
-                                                    : Memory::Watch::none;
+                                                 : Memory::Watch::none;
     return ERROR_SUCCESS;
 }
 
@@ -251,8 +251,8 @@ DWORD Store::replaceDamaged() {
         tell(Fault::unusable, "The settings cannot be used: " + m_file + " is damaged.");
         return ERROR_ACCESS_DENIED;
     }
-    tell(Fault::damaged, "The file of the settings, " + m_file +
-                             ", is damaged. It was kept as " + *aside + ", and new settings are begun.");
+    tell(Fault::damaged, "The file of the settings, " + m_file + ", is damaged. It was kept as " + *aside +
+                             ", and new settings are begun.");
     return ERROR_SUCCESS;
 }
 
