@@ -161,3 +161,24 @@ struct DELETEITEMSTRUCT {
     ULONG_PTR itemData;
 };
 using LPDELETEITEMSTRUCT = DELETEITEMSTRUCT*;
+
+/// A stretch of text: the byte it begins at and the byte behind it.
+struct _charrange {
+    LONG cpMin;
+    LONG cpMax;
+};
+using CHARRANGE = _charrange;
+
+/// A search in a text: where to search, what to look for (zero-terminated), and where it was found.
+struct _findtextexa {
+    CHARRANGE chrg;
+    LPCSTR lpstrText;
+    CHARRANGE chrgText;
+};
+using FINDTEXTEXA = _findtextexa;
+using FINDTEXTEX = _findtextexa;
+
+// How a text is looked for
+#define FR_DOWN 0x00000001
+#define FR_WHOLEWORD 0x00000002
+#define FR_MATCHCASE 0x00000004

@@ -21,7 +21,8 @@ public:
     void SetSel(DWORD selection, BOOL noScroll = FALSE) {
         SetSel(static_cast<SHORT>(LOWORD(selection)), static_cast<SHORT>(HIWORD(selection)), noScroll);
     }
-    /// Puts a text into the place of the selection; no limit applies.
+    /// Puts a text into the place of the selection; no limit applies. Without `canUndo` nothing, not even what was
+    /// done before, can be taken back afterwards.
     void ReplaceSel(LPCSTR text, BOOL canUndo = FALSE) {
         SendMessage(EM_REPLACESEL, static_cast<WPARAM>(canUndo), reinterpret_cast<LPARAM>(text));
     }

@@ -103,6 +103,10 @@ TVX_PLATFORM_API HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name);
 TVX_PLATFORM_API SHORT GetKeyState(int key);
 TVX_PLATFORM_API SHORT GetAsyncKeyState(int key);
 
+/// The dialog units of the system font (SYSTEM_FONT), in pixels: width in the low half, height in the high one. A
+/// horizontal dialog unit is a quarter of the width, a vertical one an eighth of the height.
+TVX_PLATFORM_API LONG GetDialogBaseUnits();
+
 /// Starts a timer. With a null window the identifier is chosen and answered.
 TVX_PLATFORM_API UINT_PTR SetTimer(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback);
 TVX_PLATFORM_API BOOL KillTimer(HWND window, UINT_PTR id);

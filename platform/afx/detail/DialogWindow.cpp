@@ -7,6 +7,7 @@
 #include "platform/afx/detail/ButtonWindow.h"
 #include "platform/afx/detail/DeviceContext.h"
 #include "platform/afx/detail/Dispatch.h"
+#include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/PlainWindow.h"
 #include "platform/base/Text.h"
@@ -336,3 +337,12 @@ bool fillControls(DialogWindow& dialog, LPCSTR name) {
 }
 
 } // namespace tvx::afx
+
+LONG GetDialogBaseUnits() {
+    if (!tvx::afx::ensureGui()) {
+        return 0;
+    }
+    const QFont font = tvx::afx::toolkitFont(static_cast<HFONT>(GetStockObject(SYSTEM_FONT)));
+    const QSize units = tvx::afx::dialogBaseUnits(font);
+    return static_cast<LONG>(MAKELONG(units.width(), units.height()));
+}

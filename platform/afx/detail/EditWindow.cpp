@@ -399,6 +399,9 @@ LRESULT EditWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
         return 0;
     case EM_REPLACESEL:
         insert(toQt(reinterpret_cast<const char*>(lParam)), Source::Program);
+        if (wParam == 0) {
+            m_field->forgetUndo();
+        }
         return 0;
     case EM_LINESCROLL:
         m_field->scrollLines(static_cast<int>(lParam));

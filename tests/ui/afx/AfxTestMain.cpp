@@ -1,5 +1,5 @@
-#include "platform/afx/App.h"
 #include "platform/afx/detail/Gui.h"
+#include "tests/ui/afx/TestApplication.h"
 
 #include <QApplication>
 #include <QFont>
@@ -8,12 +8,8 @@
 
 #include <cstdlib>
 
-namespace {
-
 /// Pre-translation and the road of commands end at the application object, so there is one.
-CWinApp testApplication("Afx tests");
-
-} // namespace
+TestApplication testApplication;
 
 /// Pixels and metrics are compared, so display, style and font are the same on every machine.
 int main(int argc, char** argv) {

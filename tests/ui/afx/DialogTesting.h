@@ -9,6 +9,8 @@
 #include "platform/afx/detail/Window.h"
 #include "tests/ui/afx/DialogTestIds.h"
 
+#include <gtest/gtest.h>
+
 #include <QAbstractButton>
 #include <QApplication>
 #include <QMessageBox>

@@ -1,0 +1,182 @@
+// Edit controls of the library: finding, appending within a limit, the menu of a right click.
+#include "s/Edit.h"
+
+#include "afxwin.h"
+#include "tests/ui/afx/DialogTesting.h"
+
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+#include <utility>
+
+namespace {
+
+constexpr DWORD logStyle = WS_CHILD | WS_VISIBLE | WS_VSCROLL | ES_MULTILINE | ES_AUTOHSCROLL;
+
+/// A window with one edit control, which notes requests for a context menu.
+class EditWindow : public CWnd {
+public:
+    explicit EditWindow(DWORD style = logStyle) {
+        CreateEx(0, nullptr, "", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 20, 20, 400, 240, nullptr, nullptr);
+        edit.Create(style, CRect(0, 0, 300, 160), this, 1);
+        EXPECT_TRUE(waitForActive(*this));
+    }
+    std::pair<int, int> selection() const {
+        int start = 0;
+        int end = 0;
+        edit.GetSel(start, end);
+        return {start, end};
+    }
+    std::string text() const {
+        return textOf(&edit);
+    }
+    int find(const char* wanted, int from, int to, unsigned long flags) {
+        range = {{from, to}, wanted, {-7, -7}};
+        return edit.FindTextA(flags, &range);
+    }
+
+    Gui_Edit edit;
+    _findtextexa range{};
+    int menus = 0;
+    CPoint menuPlace;
+
+protected:
+    afx_msg void OnContextMenu(CWnd*, CPoint point) {
+        ++menus;
+        menuPlace = point;
+    }
+    DECLARE_MESSAGE_MAP()
+};
+
+// clang-format off
+BEGIN_MESSAGE_MAP(EditWindow, CWnd)
+    ON_WM_CONTEXTMENU()
+END_MESSAGE_MAP()
+// clang-format on
+
+using Selection = std::pair<int, int>;
+
+} // namespace
+
+TEST(Edit, ReadsTheSelection) {
+    EditWindow window;
+    window.edit.SetWindowText("один two\r\nthree");
+    EXPECT_EQ(window.edit.GetTextLength(), 19);
+    EXPECT_EQ(window.edit.GetSelText(), "");
+    window.edit.SetSel(9, 14);
+    EXPECT_EQ(window.edit.GetSelText(), "two\r\n");
+    window.edit.SetSel(0, -1);
+    EXPECT_EQ(window.edit.GetSelText(), "один two\r\nthree");
+}
+
+TEST(Edit, FindsByCaseAndWholeWords) {
+    EditWindow window;
+    window.edit.SetWindowText("concat cat");
+    EXPECT_EQ(window.find("cat", 0, 10, 2), 7);
+    EXPECT_EQ(window.find("cat", 0, 10, 0), 3);
+    EXPECT_EQ(window.find("cat", 0, 5, 0), -1); // it ends at 6
+    EXPECT_EQ(window.range.chrgText.cpMin, 3);
+    EXPECT_EQ(window.range.chrgText.cpMax, 6);
+    EXPECT_EQ(window.find("CAT", 0, 10, 4), -1);
+    EXPECT_EQ(window.find("CAT", 0, 10, 6), -1);
+    EXPECT_EQ(window.find("CAT", 0, 10, 2), 7);
+    EXPECT_EQ(window.find("CAT", 0, 10, 1 | 4), 3); // a further bit: neither case nor words count
+    EXPECT_EQ(window.find("cat", 3, 10, 2), 7);     // "n" stands before it
+    EXPECT_EQ(window.find("cat", 4, -1, 0), -1);    // the range's end must be a real position
+}
+
+TEST(Edit, RefusesSearchesOutsideTheText) {
+    EditWindow window;
+    EXPECT_EQ(window.find("a", 0, 10, 0), -1);
+    window.edit.SetWindowText("abc");
+    EXPECT_EQ(window.find("a", -1, 10, 0), -1);
+    EXPECT_EQ(window.find("c", 3, 10, 0), -1);
+    EXPECT_EQ(window.find("abcd", 0, 10, 0), -1);
+    EXPECT_EQ(window.range.chrgText.cpMin, -7);
+}
+
+TEST(Edit, FindsWordsInTextOfAnyLanguage) {
+    EditWindow window;
+    window.edit.SetWindowText("Maßstab\u3000GRÖSSE größe\r\nẞ ende");
+    EXPECT_EQ(window.find("größe", 0, 100, 2), 19);
+    EXPECT_EQ(window.find("grösse", 0, 100, 2), 11);
+    EXPECT_EQ(window.find("SSE", 0, 100, 2), -1);
+    EXPECT_EQ(window.find("ß", 0, 100, 2), 28); // the capital form takes a byte more
+    EXPECT_EQ(window.range.chrgText.cpMax, 31);
+    EXPECT_EQ(window.find("ENDE", 0, 100, 2), 32);
+}
+
+TEST(Edit, DropsTheOldestTextBeyondTheLimit) {
+    EditWindow window;
+    window.edit.SetLimitText(1000);
+    window.edit.SetWindowText(("start" + std::string(945, '.')).c_str());
+    window.edit.SetSel(2, 4);
+    window.edit.AppendText(CString('x', 100));
+    EXPECT_EQ(window.text(), std::string(900, '.') + std::string(100, 'x'));
+    EXPECT_EQ(window.selection(), Selection(0, 0)); // what was selected has gone
+    window.edit.SetSel(890, 910);
+    window.edit.AppendText("0123456789");
+    EXPECT_EQ(window.selection(), Selection(880, 900));
+    EXPECT_EQ(window.edit.GetSelText(), std::string(10, '.').append(10, 'x').c_str());
+    EXPECT_FALSE(window.edit.CanUndo());
+}
+
+TEST(Edit, PutsTheCaretBehindTheNewTextWhenNothingIsSelected) {
+    EditWindow window;
+    window.edit.AppendText("line\r\n");
+    window.edit.SetSel(2, 2);
+    Gui_Edit::AppendText(window.edit, "line\r\n");
+    EXPECT_EQ(window.text(), "line\r\nline\r\n");
+    EXPECT_EQ(window.selection(), Selection(12, 12));
+}
+
+TEST(Edit, CutsBetweenCharactersOnly) {
+    EditWindow window;
+    window.edit.SetLimitText(10);
+    window.edit.AppendText("äöü\r\n");
+    window.edit.AppendText("1234"); // two bytes too many: one letter
+    EXPECT_EQ(window.text(), "öü\r\n1234");
+    window.edit.AppendText("567"); // a letter and half of one: both
+    EXPECT_EQ(window.text(), "\r\n1234567");
+    window.edit.AppendText("89"); // half of a line's end: all of it
+    EXPECT_EQ(window.text(), "123456789");
+    window.edit.AppendText("€€€€"); // more than the limit: the last of it
+    EXPECT_EQ(window.text(), "9€€€");
+}
+
+TEST(Edit, GetsALimitWhereItHasNone) {
+    class Unlimited : public Gui_Edit {
+    public:
+        UINT given = 0;
+
+    protected:
+        LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+            if (message == EM_GETLIMITTEXT)
+                return given;
+            if (message == EM_SETLIMITTEXT)
+                given = static_cast<UINT>(wParam);
+            return Gui_Edit::WindowProc(message, wParam, lParam);
+        }
+    };
+    EditWindow window;
+    Unlimited lines;
+    lines.Create(logStyle, CRect(0, 0, 10, 10), &window, 2);
+    lines.AppendText("x");
+    EXPECT_EQ(lines.given, 60000u);
+    Unlimited line;
+    line.Create(WS_CHILD, CRect(0, 0, 10, 10), &window, 3);
+    line.AppendText("x");
+    EXPECT_EQ(line.given, 30000u);
+}
+
+TEST(Edit, LeavesTheMenuOfARightClickToTheParent) {
+    EditWindow window;
+    click(&window.edit, {30, 20}, Qt::NoModifier, Qt::RightButton);
+    ASSERT_TRUE(QTest::qWaitFor([&] { return window.menus != 0; }));
+    CPoint place(30, 20);
+    window.edit.ClientToScreen(&place);
+    EXPECT_EQ(window.menuPlace, place);
+    EXPECT_EQ(window.menus, 1);
+    EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+}
