@@ -2,12 +2,57 @@
 
 #include "platform/win/Error.h"
 #include "platform/win/Process.h"
+#include "s/ProcessRecord.h"
+#include "s/Record.h"
 
+#include <algorithm>
 #include <limits>
+#include <utility>
 
 namespace {
 
 constexpr unsigned long crashBits = 0xC0000000;
+constexpr WORD showHidden = 0;
+constexpr WORD showNormally = 5;
+
+bool isValid(HANDLE handle) {
+    return handle != INVALID_HANDLE_VALUE;
+}
+
+void close(HANDLE& handle) {
+    if (isValid(handle))
+        CloseHandle(std::exchange(handle, INVALID_HANDLE_VALUE));
+}
+
+enum class PipeEnds { onlyReadingForChild, bothForChild };
+
+/// A pipe between the child and this process.
+struct Pipe {
+    HANDLE readEnd = INVALID_HANDLE_VALUE;
+    HANDLE writeEnd = INVALID_HANDLE_VALUE;
+
+    Pipe() = default;
+    Pipe(const Pipe&) = delete;
+    Pipe& operator=(const Pipe&) = delete;
+    ~Pipe() {
+        close(readEnd);
+        close(writeEnd);
+    }
+
+    bool Create(PipeEnds ends) {
+        const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
+        if (!CreatePipe(&readEnd, &writeEnd, &inheritable, 0))
+            return false;
+        const HANDLE self = GetCurrentProcess();
+        return ends == PipeEnds::bothForChild || DuplicateHandle(self, writeEnd, self, &writeEnd, 0, FALSE,
+                                                                 DUPLICATE_SAME_ACCESS | DUPLICATE_CLOSE_SOURCE);
+    }
+};
+
+bool start(const char* commandLine, const char* directory, STARTUPINFOA& startup, PROCESS_INFORMATION& child) {
+    CString line(commandLine);
+    return CreateProcessA(nullptr, line.GetBuffer(), nullptr, nullptr, TRUE, 0, nullptr, directory, &startup, &child);
+}
 
 int hasProcess(DWORD processId) {
     const HANDLE process = OpenProcess(PROCESS_QUERY_INFORMATION, FALSE, processId);
@@ -22,6 +67,159 @@ int hasProcess(DWORD processId) {
 }
 
 } // namespace
+
+void Gui_Process::Record::NoteError() {
+    lastError = GetLastError();
+}
+
+void Gui_Process::Record::SetPolicy(ReleasePolicy policy, DWORD code) {
+    if (isValid(inputPipe))
+        return;
+    releasePolicy = policy;
+    releaseExitCode = code;
+}
+
+Gui_Process::Gui_Process() : m_record(MakeRecord<Record>()) {}
+
+Gui_Process::~Gui_Process() {
+    Release();
+}
+
+int Gui_Process::Run(const char* commandLine, const char* directory, int capture, int hidden) {
+    Record& record = *m_record;
+    record.lastError = 0;
+    if (isValid(record.process))
+        return 0;
+    Pipe input;
+    Pipe output;
+    if (capture)
+        record.SetPolicy(TerminateOnRelease, 1);
+    STARTUPINFOA startup;
+    startup.dwFlags = STARTF_USESHOWWINDOW | STARTF_USESTDHANDLES;
+    startup.wShowWindow = hidden ? showHidden : showNormally;
+    PROCESS_INFORMATION child;
+    const bool connected =
+        !capture || (input.Create(PipeEnds::onlyReadingForChild) && output.Create(PipeEnds::bothForChild));
+    startup.hStdInput = input.readEnd;
+    startup.hStdOutput = startup.hStdError = output.writeEnd;
+    if (!connected || !start(commandLine, directory, startup, child)) {
+        record.NoteError();
+        return 0;
+    }
+    WaitForInputIdle(child.hProcess, 1000);
+    record.process = child.hProcess;
+    record.processId = child.dwProcessId;
+    record.mainThread = child.hThread;
+    record.mainThreadId = child.dwThreadId;
+    record.inputPipe = std::exchange(input.writeEnd, INVALID_HANDLE_VALUE);
+    record.outputPipe = std::exchange(output.readEnd, INVALID_HANDLE_VALUE);
+    record.exitCode = STILL_ACTIVE;
+    return 1;
+}
+
+int Gui_Process::RunWaitForWindow(const char* commandLine, const char* directory, unsigned long /*timeout*/) {
+    m_record->SetPolicy(LeaveRunning, 0);
+    return Run(commandLine, directory, 0, 0);
+}
+
+unsigned long Gui_Process::GetExitCode() {
+    Record& record = *m_record;
+    record.lastError = 0;
+    DWORD code = STILL_ACTIVE;
+    if (record.exitCode != STILL_ACTIVE)
+        return record.exitCode;
+    if (GetExitCodeProcess(record.process, &code))
+        record.exitCode = code;
+    else
+        record.NoteError();
+    return code;
+}
+
+int Gui_Process::IsActive() {
+    return GetExitCode() == STILL_ACTIVE;
+}
+
+unsigned long Gui_Process::Wait(unsigned long timeout) const {
+    // Without a child the handle would stand for the calling process, which never ends while it waits.
+    if (!isValid(m_record->process))
+        return WAIT_FAILED;
+    return WaitForSingleObject(m_record->process, static_cast<DWORD>(std::min<unsigned long>(timeout, INFINITE)));
+}
+
+int Gui_Process::Terminate(unsigned long exitCode) {
+    Record& record = *m_record;
+    record.lastError = 0;
+    if (!isValid(record.process))
+        return 0;
+    if (TerminateProcess(record.process, static_cast<UINT>(exitCode)))
+        return 1;
+    record.NoteError();
+    return 0;
+}
+
+void Gui_Process::Release() {
+    Record& record = *m_record;
+    if (isValid(record.process) && record.releasePolicy != LeaveRunning)
+        Terminate(record.releaseExitCode);
+    close(record.process);
+    close(record.mainThread);
+    close(record.inputPipe);
+    close(record.outputPipe);
+    record.mainThreadId = 0;
+    record.lastError = 0;
+    record.exitCode = 0xFFFFFFFF;
+}
+
+void Gui_Process::SetReleasePolicy(ReleasePolicy policy, unsigned long exitCode) {
+    m_record->SetPolicy(policy, static_cast<DWORD>(exitCode));
+}
+
+int Gui_Process::HasOutput() {
+    Record& record = *m_record;
+    record.lastError = 0;
+    DWORD waiting = 0;
+    if (isValid(record.outputPipe) && !PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr))
+        record.NoteError();
+    return waiting > 0;
+}
+
+int Gui_Process::GetOutput(CString& text) {
+    Record& record = *m_record;
+    record.lastError = 0;
+    if (!isValid(record.outputPipe))
+        return 0;
+    DWORD waiting = 0;
+    if (!PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr))
+        record.NoteError();
+    if (waiting == 0)
+        return 0;
+    DWORD count = 0;
+    char* buffer = text.GetBuffer(static_cast<int>(waiting) + 1);
+    if (!ReadFile(record.outputPipe, buffer, waiting, &count, nullptr))
+        record.NoteError();
+    text.ReleaseBuffer(static_cast<int>(count));
+    return 1;
+}
+
+unsigned long Gui_Process::GetError() const {
+    return m_record->lastError;
+}
+
+void* Gui_Process::GetProcessHandle() const {
+    return m_record->process;
+}
+
+void* Gui_Process::GetMainThreadHandle() const {
+    return m_record->mainThread;
+}
+
+unsigned long Gui_Process::GetMainThreadId() const {
+    return m_record->mainThreadId;
+}
+
+unsigned long Gui_Process::GetProcessId() const {
+    return m_record->processId;
+}
 
 int Gui_Process::IsActive(unsigned long processId) {
     return processId <= std::numeric_limits<DWORD>::max() && hasProcess(static_cast<DWORD>(processId));

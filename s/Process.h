@@ -3,15 +3,104 @@
 #include "afx.h"
 #include "s/Export.h"
 
-/// Child processes, and questions about any process.
+#include <memory>
+
+/// One program that runs as a child process.
+///
+/// The host makes one object for each program, starts it with Run, and asks from time to time what has become of it:
+/// nothing here waits for the child or calls back, and no operation shows a message or throws. Output is collected
+/// without ever blocking.
+///
+/// @code
+/// Gui_Process compiler;
+/// if (!compiler.Run("compile -v part.brd", nullptr, 1, 1))
+///     report(compiler.GetError());
+/// ...
+/// // now and then, until it has ended and nothing is left:
+/// if (compiler.GetOutput(text))
+///     show(text);
+/// if (!compiler.IsActive() && !compiler.HasOutput())
+///     report(compiler.GetExitCode());
+/// @endcode
+///
+/// The object holds one child at a time, from a successful Run to Release, also after the child has ended. The
+/// destructor releases. Objects are not copied, and belong to one thread; the static members may be called from any.
+///
+/// docs/processes.md has the rules of command lines, the exit codes, and what a child inherits.
 class GUI_API Gui_Process {
 public:
-    /// Whether any process with that id is alive. One that has ended but was not collected by its parent is not; one
-    /// that the caller may not ask about is. May be called from any thread.
-    static int IsActive(unsigned long processId);
+    /// What Release does to a child that it holds.
+    enum ReleasePolicy {
+        LeaveRunning = 0,       ///< the child runs on, and nothing of it stays behind when it ends
+        TerminateOnRelease = 1, ///< the child is terminated
+    };
 
+    /// Holds no child. The release policy is `TerminateOnRelease` with exit code 1.
+    Gui_Process();
+    /// Releases.
+    virtual ~Gui_Process();
+    Gui_Process(const Gui_Process&) = delete;
+    Gui_Process& operator=(const Gui_Process&) = delete;
+
+    /// Starts a program.
+    /// @param commandLine  the program and its arguments; blanks in names are kept by quotes
+    /// @param directory    where the child starts; null is the current directory
+    /// @param capture      non-zero connects the child's standard input and output to pipes, and sets the release
+    ///                     policy to `TerminateOnRelease` with exit code 1; 0: it reads nothing and its output is lost
+    /// @param hidden       non-zero: an application of the family shows no window
+    /// @return 1; 0 when the start failed (GetError says why) or a child is held already (GetError is 0)
+    int Run(const char* commandLine, const char* directory, int capture, int hidden);
+    /// Sets the release policy to `LeaveRunning` with exit code 0, then starts a program without capture, shown.
+    /// @param timeout  not used: programs do not tell when their window is there
+    int RunWaitForWindow(const char* commandLine, const char* directory, unsigned long timeout);
+
+    /// What the child ended with: 259 while it runs, 0xFFFFFFFF without a child. A child that a signal ended has a code
+    /// beginning with 0xC or 0x8.
+    unsigned long GetExitCode();
+    /// Whether the child still runs: 1 or 0.
+    int IsActive();
+    /// Waits until the child has ended; messages are not handled meanwhile.
+    /// @param timeout  milliseconds; 0xFFFFFFFF waits for ever
+    /// @return 0 when it has ended, 258 when the time ran out, 0xFFFFFFFF without a child
+    unsigned long Wait(unsigned long timeout) const;
+    /// Ends the child at once; it cannot refuse. It is still held, and reports `exitCode` from then on.
+    /// @return 0 without a child, or when it has ended already
+    int Terminate(unsigned long exitCode);
+    /// Lets go of the child as the release policy says, and of output that was not read. Nothing happens without one.
+    void Release();
+    /// Decides what Release does.
+    /// @param exitCode  what a child that is terminated reports
+    /// A child with captured output is always terminated with 1: the call is ignored while one is held.
+    void SetReleasePolicy(ReleasePolicy policy, unsigned long exitCode);
+
+    /// Whether captured output waits to be read: 1 or 0.
+    int HasOutput();
+    /// Reads all captured output that waits, as it is.
+    /// @param text  replaced; unchanged when nothing waits
+    /// @return 1, or 0 when nothing waits. GetError is 109 when nothing can come any more.
+    int GetOutput(CString& text);
+
+    /// The platform's error number of the last operation that failed; most operations begin by setting it to 0.
+    unsigned long GetError() const;
+    /// The child's handle, `INVALID_HANDLE_VALUE` without a child. It is closed by Release.
+    void* GetProcessHandle() const;
+    /// The handle of the child's first thread, likewise.
+    void* GetMainThreadHandle() const;
+    /// The id of the child's first thread, 0 without a child.
+    unsigned long GetMainThreadId() const;
+    /// The child's process id; has no meaning without a child.
+    unsigned long GetProcessId() const;
+
+    /// Whether any process with that id is alive. One that has ended but was not collected by its parent is not; one
+    /// that the caller may not ask about is.
+    static int IsActive(unsigned long processId);
     /// 1 for the exit code of a program that the interrupt keys stopped, 0xC000013A.
     static int IsAbortExitCode(unsigned long code);
     /// 1 for the exit code of a program that crashed: one of the two highest bits is set, and it is no abort.
     static int IsCrashExitCode(unsigned long code);
+
+protected:
+    struct Record;
+
+    std::unique_ptr<Record> m_record;
 };

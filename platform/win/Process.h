@@ -9,6 +9,7 @@
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
 #include "platform/win/Handle.h"
+#include "platform/win/Pipe.h"
 
 inline constexpr DWORD STILL_ACTIVE = 259; ///< What GetExitCodeProcess gives for a process that runs.
 
@@ -24,6 +25,71 @@ inline constexpr DWORD STATUS_ILLEGAL_INSTRUCTION = 0xC000001D;
 inline constexpr DWORD STATUS_INTEGER_DIVIDE_BY_ZERO = 0xC0000094;
 inline constexpr DWORD STATUS_CONTROL_C_EXIT = 0xC000013A;
 /// @}
+
+inline constexpr DWORD STARTF_USESHOWWINDOW = 0x001; ///< `wShowWindow` of a start-up record counts.
+inline constexpr DWORD STARTF_USESTDHANDLES = 0x100; ///< The standard handles of a start-up record count.
+
+/// How a child is to start. Only the fields named in comments are used.
+struct STARTUPINFOA {
+    DWORD cb = sizeof(STARTUPINFOA); ///< the record's size
+    LPSTR lpReserved = nullptr;
+    LPSTR lpDesktop = nullptr;
+    LPSTR lpTitle = nullptr;
+    DWORD dwX = 0;
+    DWORD dwY = 0;
+    DWORD dwXSize = 0;
+    DWORD dwYSize = 0;
+    DWORD dwXCountChars = 0;
+    DWORD dwYCountChars = 0;
+    DWORD dwFillAttribute = 0;
+    DWORD dwFlags = 0;    ///< of `STARTF_USESHOWWINDOW`, `STARTF_USESTDHANDLES`
+    WORD wShowWindow = 0; ///< how the child is to show its first window: 0 hides it. Applications of the family obey.
+    WORD cbReserved2 = 0;
+    BYTE* lpReserved2 = nullptr;
+    HANDLE hStdInput = nullptr;  ///< ends of pipes that are inheritable; anything else is the null device
+    HANDLE hStdOutput = nullptr; ///< likewise
+    HANDLE hStdError = nullptr;  ///< likewise; may be the same as `hStdOutput`
+};
+using STARTUPINFO = STARTUPINFOA;
+
+/// A started child. The caller closes both handles.
+struct PROCESS_INFORMATION {
+    HANDLE hProcess = nullptr; ///< the child
+    HANDLE hThread = nullptr;  ///< its first thread; here another handle to the child
+    DWORD dwProcessId = 0;     ///< the system's process id
+    DWORD dwThreadId = 0;      ///< the first thread has the id of its process
+};
+
+/// Starts a program. docs/processes.md has the rules: how the command line is split, where the program is looked for,
+/// what names in it become, and what the child inherits.
+///
+/// The child is in a session of its own, so it outlives this process and its terminal. It inherits nothing but its
+/// three standard descriptors: those of the start-up record, or without `STARTF_USESTDHANDLES` this process's own.
+///
+/// @param application  the program's file, not searched for; null takes the first word of the command line
+/// @param commandLine  program and arguments; may be null when `application` is given
+/// @param processAttributes, threadAttributes  not used
+/// @param inherit      whether standard handles are handed on; FALSE makes them the null device
+/// @param flags        not used
+/// @param environment  null: the child gets this process's environment, cleaned of what the application's bundle added
+///                     for itself. Another one is refused with `ERROR_NOT_SUPPORTED`.
+/// @param directory    where the child starts; null is the current directory
+/// @param information  receives handles and ids; unchanged on failure
+/// @return FALSE on failure, also when the program was found but could not be started: `ERROR_FILE_NOT_FOUND`,
+///         `ERROR_PATH_NOT_FOUND`, `ERROR_ACCESS_DENIED` (not executable), `ERROR_BAD_EXE_FORMAT` (no program),
+///         `ERROR_DIRECTORY`, `ERROR_FILENAME_EXCED_RANGE` (command line too long), `ERROR_INVALID_PARAMETER` (empty)
+TVX_PLATFORM_API BOOL CreateProcessA(LPCSTR application, LPSTR commandLine,
+                                     const SECURITY_ATTRIBUTES* processAttributes,
+                                     const SECURITY_ATTRIBUTES* threadAttributes, BOOL inherit, DWORD flags,
+                                     LPVOID environment, LPCSTR directory, const STARTUPINFOA* startup,
+                                     PROCESS_INFORMATION* information);
+
+/// Tells how this process was asked to start: `wShowWindow` when it is to be hidden.
+TVX_PLATFORM_API void GetStartupInfoA(STARTUPINFOA* startup);
+
+/// Waits until a child has its first window and is idle. Programs of this system do not tell when they are; the answer
+/// is at once the one for programs without windows, `WAIT_FAILED`.
+TVX_PLATFORM_API DWORD WaitForInputIdle(HANDLE process, DWORD timeout);
 
 /// The calling process's id.
 TVX_PLATFORM_API DWORD GetCurrentProcessId();

@@ -12,7 +12,7 @@
 namespace tvx::win {
 
 /// Owns a descriptor of the system.
-class Descriptor {
+class TVX_PLATFORM_API Descriptor {
 public:
     explicit Descriptor(int number = -1) noexcept : number_(number) {}
     Descriptor(Descriptor&& other) noexcept : number_(other.release()) {}
@@ -35,7 +35,7 @@ private:
 /// Waits until a descriptor is readable or its other end is closed, without being woken by signals.
 /// @param timeout  milliseconds, `INFINITE` for ever
 /// @return the events that are there, 0 when the time ran out
-short waitReadable(int descriptor, DWORD timeout);
+TVX_PLATFORM_API short waitReadable(int descriptor, DWORD timeout);
 
 /// A process or an end of a pipe. It is signalled while its descriptor is readable. Any thread may use it.
 class KernelObject {

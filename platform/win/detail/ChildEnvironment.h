@@ -1,0 +1,37 @@
+#pragma once
+
+#include "platform/base/Export.h"
+
+#include <deque>
+#include <string>
+#include <vector>
+
+namespace tvx::win {
+
+/// How a child is to show its first window.
+enum class StartShow { normal, hidden };
+
+/// The environment of a child: the process's own, with the user's values where the application's bundle had put its
+/// own for itself (docs/processes.md says how a bundle tells), and the wish to be hidden.
+///
+/// Holds while the process's environment is not changed.
+class TVX_PLATFORM_API ChildEnvironment {
+public:
+    explicit ChildEnvironment(StartShow show);
+
+    /// As `execve` takes it.
+    char* const* block() const {
+        return block_.data();
+    }
+
+private:
+    void add(std::string variable);
+
+    std::deque<std::string> own_;
+    std::vector<char*> block_;
+};
+
+/// How this process was asked to show its first window when it was started.
+StartShow askedStartShow();
+
+} // namespace tvx::win

@@ -1,0 +1,23 @@
+#pragma once
+
+#include "platform/win/Handle.h"
+#include "s/Process.h"
+
+/// What a process object knows of its child.
+struct Gui_Process::Record {
+    HANDLE process = INVALID_HANDLE_VALUE;
+    HANDLE mainThread = INVALID_HANDLE_VALUE;
+    HANDLE inputPipe = INVALID_HANDLE_VALUE;  ///< this process's end of the child's standard input
+    HANDLE outputPipe = INVALID_HANDLE_VALUE; ///< this process's end of the child's standard output and error
+    DWORD lastError = 0;
+    ReleasePolicy releasePolicy = TerminateOnRelease;
+    DWORD releaseExitCode = 1;
+    DWORD mainThreadId = 0;
+    DWORD exitCode = 0xFFFFFFFF; ///< 0xFFFFFFFF without a child, `STILL_ACTIVE` until its end was seen
+    DWORD processId = 0;
+
+    /// Keeps the error of a call of the platform that failed.
+    void NoteError();
+    /// Ignored while a child with captured output is held.
+    void SetPolicy(ReleasePolicy policy, DWORD code);
+};

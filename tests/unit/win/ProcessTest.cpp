@@ -1,0 +1,346 @@
+#include "platform/win/Process.h"
+
+#include "platform/win/Error.h"
+#include "platform/win/detail/ProcessObject.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <csignal>
+#include <cstdlib>
+#include <fcntl.h>
+#include <filesystem>
+#include <fstream>
+#include <optional>
+#include <sstream>
+#include <unistd.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+/// A started child, held until the test ends.
+class Child {
+public:
+    explicit Child(const std::string& line, const char* directory = nullptr, WORD show = 5) {
+        const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
+        HANDLE writeEnd = nullptr;
+        CreatePipe(&output_, &writeEnd, &inheritable, 0);
+        STARTUPINFOA startup;
+        startup.dwFlags = STARTF_USESTDHANDLES | STARTF_USESHOWWINDOW;
+        startup.wShowWindow = show;
+        startup.hStdOutput = startup.hStdError = writeEnd;
+        std::string text = line;
+        SetLastError(0);
+        started = CreateProcessA(nullptr, text.data(), nullptr, nullptr, TRUE, 0, nullptr, directory, &startup,
+                                 &information) == TRUE;
+        error = GetLastError();
+        CloseHandle(writeEnd);
+    }
+    ~Child() {
+        CloseHandle(output_);
+        if (started) {
+            CloseHandle(information.hProcess);
+            CloseHandle(information.hThread);
+        }
+    }
+    Child(const Child&) = delete;
+    Child& operator=(const Child&) = delete;
+
+    /// All that it writes.
+    std::string output() const {
+        std::string text;
+        char buffer[4096];
+        for (DWORD count = 0; ReadFile(output_, buffer, sizeof buffer, &count, nullptr);)
+            text.append(buffer, count);
+        EXPECT_EQ(GetLastError(), ERROR_BROKEN_PIPE);
+        return text;
+    }
+
+    DWORD code() const {
+        EXPECT_EQ(WaitForSingleObject(information.hProcess, INFINITE), WAIT_OBJECT_0);
+        DWORD code = 0;
+        EXPECT_TRUE(GetExitCodeProcess(information.hProcess, &code));
+        return code;
+    }
+
+    bool started = false;
+    DWORD error = 0;
+    PROCESS_INFORMATION information;
+
+private:
+    HANDLE output_ = nullptr;
+};
+
+/// A shell command. It must not hold double quotes.
+std::string shell(const std::string& command) {
+    return "/bin/sh -c \"" + command + "\"";
+}
+
+class ProcessFiles : public testing::Test {
+protected:
+    void SetUp() override {
+        fs::create_directories(folder);
+    }
+
+    std::string write(const std::string& name, const std::string& text, fs::perms mode = fs::perms::owner_all) const {
+        const fs::path file = folder / name;
+        std::ofstream(file) << text;
+        fs::permissions(file, mode);
+        return file.string();
+    }
+
+    const fs::path folder = fs::temp_directory_path() / "my programs";
+};
+
+std::string lineWith(const std::string& text, const std::string& start) {
+    std::istringstream lines(text);
+    for (std::string line; std::getline(lines, line);) {
+        if (line.starts_with(start))
+            return line;
+    }
+    return {};
+}
+
+} // namespace
+
+TEST(Process, TellsItsExitCode) {
+    EXPECT_EQ(Child("true").code(), 0u);
+    EXPECT_EQ(Child(shell("exit 77")).code(), 77u);
+    const Child sleeper("sleep 1000");
+    DWORD code = 0;
+    ASSERT_TRUE(GetExitCodeProcess(sleeper.information.hProcess, &code));
+    EXPECT_EQ(code, STILL_ACTIVE);
+    EXPECT_EQ(WaitForSingleObject(sleeper.information.hThread, 0), WAIT_TIMEOUT);
+    EXPECT_TRUE(TerminateProcess(sleeper.information.hProcess, 4711));
+    EXPECT_EQ(sleeper.code(), 4711u);
+    EXPECT_FALSE(TerminateProcess(sleeper.information.hProcess, 1));
+    EXPECT_EQ(GetLastError(), ERROR_ACCESS_DENIED);
+    EXPECT_EQ(sleeper.code(), 4711u);
+}
+
+TEST(Process, DeathsBySignalHaveThePlatformsCodes) {
+    const struct {
+        const char* signal;
+        DWORD code;
+    } cases[] = {
+        {"INT", 0xC000013A},
+        {"SEGV", 0xC0000005},
+        {"ILL", 0xC000001D},
+        {"FPE", 0xC0000094},
+        {"BUS", 0xC0000006},
+        {"TRAP", 0x80000003},
+        {"TERM", 0xC0000000 + SIGTERM},
+        {"KILL", 0xC0000000 + SIGKILL},
+        {"HUP", 0xC0000001},
+        {"ABRT", 0xC0000006},
+        {"PIPE", 0xC0000000 + SIGPIPE},
+    };
+    for (const auto& [signal, code] : cases) {
+        const Child child(shell("ulimit -c 0; kill -" + std::string(signal) + " $$"));
+        EXPECT_EQ(child.code(), code) << signal;
+    }
+}
+
+TEST_F(ProcessFiles, FailuresOfTheStartAreTold) {
+    write("plain.txt", "text", fs::perms::owner_read);
+    write("no-program", "neither binary nor script");
+    const std::string path = folder.string();
+    const struct {
+        std::string line;
+        DWORD error;
+    } cases[] = {
+        {"no-such-program-anywhere", ERROR_FILE_NOT_FOUND},
+        {"'quoted' strangely", ERROR_FILE_NOT_FOUND},
+        {"\"\" x", ERROR_FILE_NOT_FOUND},
+        {"\"" + path + "/missing\"", ERROR_FILE_NOT_FOUND},
+        {path + "/missing -a", ERROR_FILE_NOT_FOUND},
+        {"\"" + path + "/missing/folder/tool\"", ERROR_PATH_NOT_FOUND},
+        {"Q:\\tool", ERROR_PATH_NOT_FOUND},
+        {"\"" + path + "\"", ERROR_ACCESS_DENIED},
+        {"\"" + path + "\\no-program\" x", ERROR_BAD_EXE_FORMAT},
+        {"true " + std::string(200000, 'x'), ERROR_FILENAME_EXCED_RANGE},
+        {"", ERROR_INVALID_PARAMETER},
+        {" \t", ERROR_INVALID_PARAMETER},
+    };
+    for (const auto& [line, error] : cases) {
+        const Child child(line);
+        EXPECT_FALSE(child.started) << line;
+        EXPECT_EQ(child.error, error) << line.substr(0, 80);
+    }
+    // The superuser may execute what has an executable bit for anybody.
+    EXPECT_EQ(Child("\"" + path + "/plain.txt\"").error, ERROR_ACCESS_DENIED);
+    EXPECT_EQ(Child("true", "/no/such/folder").error, ERROR_DIRECTORY);
+    EXPECT_EQ(Child("true", (path + "/no-program").c_str()).error, ERROR_DIRECTORY);
+}
+
+TEST_F(ProcessFiles, FindsProgramsAsThePlatformDoes) {
+    write("my tool", "#!/bin/sh\necho \"$0\" \"$@\"\n");
+    const std::string tool = (folder / "my tool").string();
+    EXPECT_EQ(Child("\"" + tool + "\" a").output(), tool + " a\n");
+    EXPECT_EQ(Child(tool + " a").output(), tool + " a\n") << "blanks without quotes";
+    EXPECT_EQ(Child("\"C:" + tool + ".EXE\" a").output(), tool + " a\n");
+    EXPECT_EQ(Child("echo.exe a").output(), "a\n");
+
+    // A program of the system comes before a file in the current folder, which comes last.
+    write("echo", "#!/bin/sh\nprintf 'planted\\n'\n");
+    const fs::path before = fs::current_path();
+    fs::current_path(folder);
+    EXPECT_EQ(Child("echo a").output(), "a\n");
+    EXPECT_EQ(Child("\"my tool\" a").output(), tool + " a\n");
+    EXPECT_EQ(Child("\"./my tool\" a", "/").output(), (folder / "./my tool").string() + " a\n");
+    fs::current_path(before);
+}
+
+TEST_F(ProcessFiles, HandsOverItsWords) {
+    EXPECT_EQ(Child(R"(printf "[%s]" a "b c" "" d\"e C:\usr)").output(), "[a][b c][][d\"e][/usr]");
+    EXPECT_EQ(Child("pwd -P", folder.c_str()).output(), fs::canonical(folder).string() + "\n");
+    EXPECT_EQ(Child("pwd -P", "C:\\").output(), "/\n");
+    std::string words = "-a";
+    EXPECT_EQ(Child("printf %s").output(), "");
+    STARTUPINFOA startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    PROCESS_INFORMATION child;
+    ASSERT_TRUE(
+        CreateProcessA("/bin/true", words.data(), nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &child));
+    CloseHandle(child.hThread);
+    CloseHandle(child.hProcess);
+}
+
+TEST(ProcessInheritance, OnlyTheThreeDescriptorsAreInherited) {
+    const int file = ::open("/dev/zero", O_RDONLY);
+    ASSERT_GE(file, 3);
+    const int other = ::fcntl(file, F_DUPFD, 200); // without the close-on-exec flag
+    // The listing has a descriptor of its own for the folder.
+    EXPECT_EQ(Child("ls /proc/self/fd").output(), "0\n1\n2\n3\n");
+    EXPECT_EQ(Child("readlink /proc/self/fd/0").output(), "/dev/null\n");
+    ::close(other);
+    ::close(file);
+}
+
+TEST(ProcessInheritance, StandardDescriptorsMayBeClosedHere) {
+    const int kept[] = {::dup(0), ::dup(1), ::dup(2)};
+    for (int descriptor = 0; descriptor < 3; ++descriptor)
+        ::close(descriptor);
+    std::string text;
+    {
+        // The pipe's own ends are among the three now.
+        const Child child(shell("echo out; echo err >&2; readlink /proc/self/fd/0"));
+        text = child.output();
+    }
+    for (int descriptor = 0; descriptor < 3; ++descriptor) {
+        ::dup2(kept[descriptor], descriptor);
+        ::close(kept[descriptor]);
+    }
+    EXPECT_EQ(text, "out\nerr\n/dev/null\n");
+}
+
+TEST(ProcessInheritance, TheEnvironmentIsTheUsers) {
+    ::setenv("PLAIN", "kept", 1);
+    ::setenv("TVX_BUNDLE_VARIABLES", "LD_LIBRARY_PATH::XDG_DATA_DIRS:EMPTY", 1);
+    ::setenv("LD_LIBRARY_PATH", "/bundle/lib:/usr/lib", 1);
+    ::setenv("XDG_DATA_DIRS", "/bundle/share:/usr/share", 1);
+    ::setenv("TVX_USER_XDG_DATA_DIRS", "/usr/share", 1);
+    ::setenv("EMPTY", "bundle", 1);
+    ::setenv("TVX_USER_EMPTY", "", 1);
+    const std::string text = Child("env").output();
+    EXPECT_EQ(lineWith(text, "PLAIN="), "PLAIN=kept");
+    EXPECT_EQ(lineWith(text, "LD_LIBRARY_PATH"), "") << "was not set by the user";
+    EXPECT_EQ(lineWith(text, "XDG_DATA_DIRS"), "XDG_DATA_DIRS=/usr/share");
+    EXPECT_EQ(lineWith(text, "EMPTY"), "EMPTY=");
+    EXPECT_EQ(lineWith(text, "TVX_BUNDLE"), "");
+    EXPECT_EQ(lineWith(text, "TVX_USER"), "");
+    EXPECT_STREQ(std::getenv("LD_LIBRARY_PATH"), "/bundle/lib:/usr/lib") << "the host's own stays";
+}
+
+TEST(ProcessInheritance, TheWishToBeHiddenReachesTheChildOnly) {
+    EXPECT_EQ(lineWith(Child("env", nullptr, 0).output(), "TVX_START_HIDDEN"), "TVX_START_HIDDEN=1");
+    STARTUPINFOA startup;
+    GetStartupInfoA(&startup);
+    EXPECT_EQ(startup.dwFlags, 0u);
+    ::setenv("TVX_START_HIDDEN", "1", 1);
+    GetStartupInfoA(&startup);
+    EXPECT_EQ(startup.dwFlags, STARTF_USESHOWWINDOW);
+    EXPECT_EQ(startup.wShowWindow, 0);
+    EXPECT_EQ(lineWith(Child("env").output(), "TVX_START_HIDDEN"), "") << "not inherited further";
+}
+
+TEST(ProcessInheritance, SignalsAreAsTheyWereForTheUser) {
+    ::signal(SIGPIPE, SIG_IGN);
+    ::signal(SIGUSR1, SIG_IGN); // stands for what the process was started to ignore
+    ::signal(SIGUSR2, [](int) {});
+    sigset_t blocked;
+    sigemptyset(&blocked);
+    sigaddset(&blocked, SIGTERM);
+    ::sigprocmask(SIG_BLOCK, &blocked, nullptr);
+    const std::string status = Child("cat /proc/self/status").output();
+    ::sigprocmask(SIG_UNBLOCK, &blocked, nullptr);
+    EXPECT_EQ(lineWith(status, "SigBlk"), "SigBlk:\t0000000000000000");
+    EXPECT_EQ(lineWith(status, "SigIgn"), "SigIgn:\t0000000000000200");
+}
+
+TEST(ProcessInheritance, OnlyInheritableEndsReachTheChild) {
+    HANDLE readEnd = nullptr;
+    HANDLE writeEnd = nullptr;
+    ASSERT_TRUE(CreatePipe(&readEnd, &writeEnd, nullptr, 0));
+    STARTUPINFOA startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdOutput = writeEnd;
+    char line[] = "echo lost";
+    PROCESS_INFORMATION child;
+    ASSERT_TRUE(CreateProcessA(nullptr, line, nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &child));
+    CloseHandle(writeEnd);
+    EXPECT_EQ(WaitForSingleObject(child.hProcess, INFINITE), WAIT_OBJECT_0);
+    EXPECT_FALSE(PeekNamedPipe(readEnd, nullptr, 0, nullptr, nullptr, nullptr));
+    EXPECT_EQ(GetLastError(), ERROR_BROKEN_PIPE);
+    for (const HANDLE handle : {readEnd, child.hProcess, child.hThread})
+        EXPECT_TRUE(CloseHandle(handle));
+}
+
+TEST(Handles, StaleAndForeignOnesAreRefused) {
+    HANDLE readEnd = nullptr;
+    HANDLE writeEnd = nullptr;
+    ASSERT_TRUE(CreatePipe(&readEnd, &writeEnd, nullptr, 0));
+    DWORD number = 0;
+    EXPECT_FALSE(GetExitCodeProcess(readEnd, &number));
+    EXPECT_EQ(GetLastError(), ERROR_INVALID_HANDLE);
+    HANDLE copy = nullptr;
+    ASSERT_TRUE(DuplicateHandle(GetCurrentProcess(), writeEnd, GetCurrentProcess(), &copy, 0, FALSE,
+                                DUPLICATE_SAME_ACCESS | DUPLICATE_CLOSE_SOURCE));
+    EXPECT_FALSE(CloseHandle(writeEnd));
+    EXPECT_TRUE(PeekNamedPipe(readEnd, nullptr, 0, nullptr, &number, nullptr)) << "the copy keeps the pipe";
+    EXPECT_EQ(number, 0u);
+    EXPECT_TRUE(CloseHandle(copy));
+    EXPECT_FALSE(PeekNamedPipe(readEnd, nullptr, 0, nullptr, &number, nullptr));
+    EXPECT_TRUE(CloseHandle(readEnd));
+    for (const HANDLE none : {readEnd, HANDLE{nullptr}, INVALID_HANDLE_VALUE}) {
+        EXPECT_FALSE(CloseHandle(none));
+        EXPECT_EQ(WaitForSingleObject(none, 0), WAIT_FAILED);
+        EXPECT_EQ(GetLastError(), ERROR_INVALID_HANDLE);
+    }
+}
+
+TEST(ProcessEnd, IsSeenWhenAHandlerOfTheHostCollectsAllChildren) {
+    ::signal(SIGCHLD, SIG_IGN); // the system collects them at once
+    const Child child(shell("exit 3"));
+    EXPECT_EQ(child.code(), 0xC0000000) << "nobody can tell the code";
+    ::signal(SIGCHLD, SIG_DFL);
+    EXPECT_EQ(Child(shell("exit 3")).code(), 3u);
+}
+
+TEST(ProcessEnd, RingsTheBellOfReleasedChildren) {
+    auto& released = tvx::win::ReleasedChildren::instance();
+    DWORD id = 0;
+    {
+        const Child child("sleep 1000");
+        id = child.information.dwProcessId;
+    }
+    ASSERT_EQ(released.count(), 1u);
+    EXPECT_EQ(tvx::win::waitReadable(released.bell(), 0), 0);
+    ::kill(static_cast<pid_t>(id), SIGKILL);
+    EXPECT_NE(tvx::win::waitReadable(released.bell(), INFINITE), 0);
+    released.collect();
+    EXPECT_EQ(released.count(), 0u);
+    EXPECT_EQ(tvx::win::waitReadable(released.bell(), 0), 0);
+    EXPECT_EQ(::kill(static_cast<pid_t>(id), 0), -1) << "no zombie";
+}
