@@ -5,6 +5,7 @@
 
 #include <cerrno>
 #include <chrono>
+#include <fcntl.h>
 #include <mutex>
 #include <poll.h>
 #include <unistd.h>
@@ -66,8 +67,17 @@ timespec remaining(Clock::time_point deadline) {
 
 } // namespace
 
+Descriptor::Descriptor(int number) noexcept : number_(number) {
+    const bool misplaced = number >= 0 && number <= STDERR_FILENO;
+    const int moved = misplaced ? ::fcntl(number, F_DUPFD_CLOEXEC, STDERR_FILENO + 1) : -1;
+    if (moved >= 0) {
+        ::close(number);
+        number_ = moved;
+    }
+}
+
 Descriptor& Descriptor::operator=(Descriptor&& other) noexcept {
-    Descriptor old(std::exchange(number_, other.release()));
+    std::swap(number_, other.number_);
     return *this;
 }
 

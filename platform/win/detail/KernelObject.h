@@ -14,7 +14,10 @@ namespace tvx::win {
 /// Owns a descriptor of the system.
 class TVX_PLATFORM_API Descriptor {
 public:
-    explicit Descriptor(int number = -1) noexcept : number_(number) {}
+    Descriptor() noexcept = default;
+    /// Takes over what the system has just made; -1 is none. In a process that was started without standard descriptors
+    /// it may have got the place of one of them, which others will write to or replace: then it moves away from there.
+    explicit Descriptor(int number) noexcept;
     Descriptor(Descriptor&& other) noexcept : number_(other.release()) {}
     Descriptor& operator=(Descriptor&& other) noexcept;
     ~Descriptor();
@@ -29,7 +32,7 @@ public:
     int release() noexcept;
 
 private:
-    int number_;
+    int number_ = -1;
 };
 
 /// Waits until a descriptor is readable or its other end is closed, without being woken by signals.

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <climits>
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
@@ -49,11 +50,18 @@ public:
 
     /// All that it writes.
     std::string output() const {
+        std::string text = output(INT_MAX);
+        EXPECT_EQ(GetLastError(), ERROR_BROKEN_PIPE);
+        return text;
+    }
+
+    /// The first lines that it writes, or more.
+    std::string output(int lines) const {
         std::string text;
         char buffer[4096];
-        for (DWORD count = 0; ReadFile(output_, buffer, sizeof buffer, &count, nullptr);)
+        DWORD count = 0;
+        while (std::ranges::count(text, '\n') < lines && ReadFile(output_, buffer, sizeof buffer, &count, nullptr))
             text.append(buffer, count);
-        EXPECT_EQ(GetLastError(), ERROR_BROKEN_PIPE);
         return text;
     }
 
@@ -222,16 +230,16 @@ TEST(ProcessInheritance, StandardDescriptorsMayBeClosedHere) {
     const int kept[] = {::dup(0), ::dup(1), ::dup(2)};
     for (int descriptor = 0; descriptor < 3; ++descriptor)
         ::close(descriptor);
-    std::string text;
-    {
-        // The pipe's own ends are among the three now.
-        const Child child(shell("echo out; echo err >&2; readlink /proc/self/fd/0"));
-        text = child.output();
-    }
+    // What is made now gets their numbers at first.
+    std::optional<Child> child(std::in_place,
+                               shell("echo out; echo err >&2; readlink /proc/self/fd/0; exec sleep 1000"));
     for (int descriptor = 0; descriptor < 3; ++descriptor) {
         ::dup2(kept[descriptor], descriptor);
         ::close(kept[descriptor]);
     }
+    const std::string text = child->output(3);
+    EXPECT_TRUE(TerminateProcess(child->information.hProcess, 9));
+    EXPECT_EQ(child->code(), 9u);
     EXPECT_EQ(text, "out\nerr\n/dev/null\n");
 }
 
@@ -330,6 +338,9 @@ TEST(ProcessEnd, IsSeenWhenAHandlerOfTheHostCollectsAllChildren) {
 
 TEST(ProcessEnd, RingsTheBellOfReleasedChildren) {
     auto& released = tvx::win::ReleasedChildren::instance();
+    // Children of other tests that run in this process.
+    for (; released.count() > 0; released.collect())
+        tvx::win::waitReadable(released.bell(), INFINITE);
     DWORD id = 0;
     {
         const Child child("sleep 1000");
