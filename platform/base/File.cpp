@@ -1,6 +1,7 @@
 #include "platform/base/File.h"
 
-#include "platform/base/SystemPath.h"
+#include "platform/base/Text.h"
+#include "platform/base/detail/Locate.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -71,25 +72,13 @@ CString absoluteName(LPCTSTR name) {
     const std::string_view given(name);
     if (given.empty() || given.front() == '/' || given.front() == '\\' || tvx::hasDrive(given))
         return name;
+    const bool isSystemForm = given.find('\\') == std::string_view::npos;
     std::error_code error;
-    std::string folder = std::filesystem::current_path(error).string();
-    if (error)
+    const std::string folder = isSystemForm ? std::filesystem::current_path(error).string() : tvx::currentFolderName();
+    if (folder.empty())
         return name;
-    if (given.find('\\') == std::string_view::npos)
-        return CString(std::string_view(folder)) + (folder == "/" ? "" : "/") + name;
-    std::ranges::replace(folder, '/', '\\');
-    return CString("C:") + folder.c_str() + (folder == "\\" ? "" : "\\") + name;
-}
-
-BYTE attributesOf(const struct stat& state, std::string_view name) {
-    BYTE attributes = CFile::normal;
-    if (!(state.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)))
-        attributes |= CFile::readOnly;
-    if (S_ISDIR(state.st_mode))
-        attributes |= CFile::directory;
-    if (name.substr(nameStart(name)).starts_with('.'))
-        attributes |= CFile::hidden;
-    return attributes;
+    const bool isRoot = folder.back() == '/' || folder.back() == '\\';
+    return CString(std::string_view(folder)) + (isRoot ? "" : isSystemForm ? "/" : "\\") + name;
 }
 
 void fillStatus(CFileStatus& status, const struct stat& state, const CString& fullName) {
@@ -97,7 +86,7 @@ void fillStatus(CFileStatus& status, const struct stat& state, const CString& fu
     status.m_mtime = state.st_mtime;
     status.m_atime = state.st_atime;
     status.m_size = static_cast<ULONGLONG>(state.st_size);
-    status.m_attribute = attributesOf(state, fullName.View());
+    status.m_attribute = tvx::attributesOf(state, fullName.View());
     status.m_szFullName = fullName;
 }
 
@@ -109,6 +98,22 @@ int checkedOrigin(UINT from) {
 }
 
 } // namespace
+
+BYTE tvx::attributesOf(const struct stat& state, std::string_view name) {
+    BYTE attributes = CFile::normal;
+    if (!(state.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)))
+        attributes |= CFile::readOnly;
+    if (S_ISDIR(state.st_mode))
+        attributes |= CFile::directory;
+    const std::string_view last = name.substr(nameStart(name));
+    if (last.starts_with('.') && last != "." && last != "..")
+        attributes |= CFile::hidden;
+    return attributes;
+}
+
+BOOL AfxComparePath(LPCTSTR first, LPCTSTR second) {
+    return tvx::text::equalNoCase(first ? first : "", second ? second : "");
+}
 
 CFile::CFile(LPCTSTR fileName, UINT openFlags) {
     CFileException error;

@@ -142,3 +142,6 @@ private:
     int m_descriptor = -1;
     CString m_fileName;
 };
+
+/// Whether two names are written alike without regard to case. Neither is completed or looked for.
+TVX_PLATFORM_API BOOL AfxComparePath(LPCTSTR first, LPCTSTR second);
