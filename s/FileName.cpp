@@ -2,43 +2,18 @@
 
 #include "platform/base/Text.h"
 #include "s/FileNameRecord.h"
+#include "s/FileNameText.h"
 #include "s/Record.h"
 
-#include <algorithm>
 #include <string>
 #include <string_view>
 #include <utility>
 
 IMPLEMENT_SERIAL(Gui_FileName, CObject, 1)
 
+using namespace FileNameText;
+
 namespace {
-
-constexpr char separator = '\\';
-constexpr std::string_view networkMark = "\\\\";
-
-int uncFlag = 1;
-
-std::string_view viewOf(const char* text) {
-    return text ? std::string_view(text) : std::string_view();
-}
-
-std::string withBackslashes(std::string_view name) {
-    std::string result(name);
-    std::ranges::replace(result, '/', separator);
-    return result;
-}
-
-/// The folders in the form of a path: separators turned, one at the end.
-std::string asPath(std::string_view folders) {
-    std::string path = withBackslashes(folders);
-    if (!path.empty() && path.back() != separator)
-        path += separator;
-    return path;
-}
-
-std::string withDot(std::string_view extension) {
-    return extension.empty() || extension.front() == '.' ? std::string(extension) : '.' + std::string(extension);
-}
 
 /// The parts of a name, put together again they are the name.
 struct Split {
@@ -55,20 +30,11 @@ Split split(std::string_view name) {
         parts.drive = name.substr(0, 2);
     name.remove_prefix(parts.drive.size());
     // Not found is the largest number: adding 1 gives 0, the beginning.
-    parts.folders = name.substr(0, name.rfind(separator) + 1);
+    parts.folders = name.substr(0, name.rfind(Separator) + 1);
     name.remove_prefix(parts.folders.size());
     parts.base = name.substr(0, name.rfind('.'));
     parts.extension = name.substr(parts.base.size());
     return parts;
-}
-
-/// Takes the first folder off a path.
-std::string_view popFirst(std::string_view& path) {
-    if (path.starts_with(separator))
-        path.remove_prefix(1);
-    const std::string_view folder = path.substr(0, path.find(separator));
-    path.remove_prefix(std::min(folder.size() + 1, path.size()));
-    return folder;
 }
 
 } // namespace
@@ -125,18 +91,18 @@ void Gui_FileName::Empty() {
 
 void Gui_FileName::SetFullName(const char* fullName) {
     tvx::allocating([&] {
-        const std::string_view given = viewOf(fullName);
-        const std::string name = withBackslashes(given);
+        const std::string_view given = View(fullName);
+        const std::string name = WithBackslashes(given);
         const Split parts = split(name);
-        if (!given.starts_with(networkMark)) {
+        if (!given.starts_with(NetworkMark)) {
             SetMount(std::string(parts.drive).c_str());
             m_record->path = CString(parts.folders);
         } else {
-            std::string_view path = parts.folders.substr(networkMark.size());
-            const std::string server(popFirst(path));
-            const std::string_view share = popFirst(path);
-            m_record->mount = CString(std::string(networkMark) + server + separator + std::string(share));
-            m_record->path = separator + CString(path);
+            std::string_view path = parts.folders.substr(NetworkMark.size());
+            const std::string server(PopFirst(path));
+            const std::string_view share = PopFirst(path);
+            m_record->mount = CString(std::string(NetworkMark) + server + Separator + std::string(share));
+            m_record->path = Separator + CString(path);
         }
         m_record->base = CString(parts.base);
         m_record->extension = CString(parts.extension);
@@ -151,10 +117,11 @@ void Gui_FileName::SetMount(const char* mount) {
     m_record->mount = mount;
     if (!m_record->mount.IsEmpty() && !HasNetworkMount() && !m_record->mount.View().ends_with(':'))
         m_record->mount += ':';
+    GetRemoteMountName(m_record->mount, 1);
 }
 
 void Gui_FileName::SetPath(const char* path) {
-    tvx::allocating([&] { m_record->path = CString(asPath(viewOf(path))); });
+    tvx::allocating([&] { m_record->path = CString(AsPath(View(path))); });
 }
 
 void Gui_FileName::SetBase(const char* base) {
@@ -162,13 +129,13 @@ void Gui_FileName::SetBase(const char* base) {
 }
 
 void Gui_FileName::SetExtension(const char* extension) {
-    tvx::allocating([&] { m_record->extension = CString(withDot(viewOf(extension))); });
+    tvx::allocating([&] { m_record->extension = CString(WithDot(View(extension))); });
 }
 
 void Gui_FileName::SetMountAndPath(const char* folder) {
     const CString base = m_record->base;
     const CString extension = m_record->extension;
-    tvx::allocating([&] { SetFullName(folder ? asPath(folder).c_str() : nullptr); });
+    tvx::allocating([&] { SetFullName(folder ? AsPath(folder).c_str() : nullptr); });
     m_record->base = base;
     m_record->extension = extension;
 }
@@ -182,31 +149,31 @@ void Gui_FileName::SetBaseAndExtension(const char* name) {
 }
 
 void Gui_FileName::PushPathStart(const char* path) {
-    tvx::allocating([&] { m_record->path = CString(asPath(viewOf(path))) + m_record->path; });
+    tvx::allocating([&] { m_record->path = CString(AsPath(View(path))) + m_record->path; });
 }
 
 void Gui_FileName::PushPathEnd(const char* path) {
     tvx::allocating([&] {
-        std::string added = withBackslashes(viewOf(path));
+        std::string added = WithBackslashes(View(path));
         if (added.empty())
             return;
-        if (added.front() == separator)
+        if (added.front() == Separator)
             added.erase(0, 1);
-        m_record->path = CString(asPath(std::string(m_record->path.View()) + added));
+        m_record->path = CString(AsPath(std::string(m_record->path.View()) + added));
     });
 }
 
 CString Gui_FileName::PopPathStart() {
     const CString path = m_record->path;
     std::string_view rest = path.View();
-    const CString folder(popFirst(rest));
+    const CString folder(PopFirst(rest));
     m_record->path = CString(rest);
     return folder;
 }
 
 CString Gui_FileName::PopPathEnd() {
     const CString path = m_record->path.Left(m_record->path.GetLength() - 1);
-    const int start = path.ReverseFind(separator) + 1;
+    const int start = path.ReverseFind(Separator) + 1;
     m_record->path = path.Left(start);
     return path.Mid(start);
 }
@@ -229,7 +196,7 @@ CString Gui_FileName::GetName() const {
 
 CString Gui_FileName::GetBaseAndExtension(const char* defaultBase, const char* defaultExtension) const {
     CString name = HasBase() ? m_record->base : CString(defaultBase);
-    tvx::allocating([&] { name += HasExtension() ? m_record->extension : CString(withDot(viewOf(defaultExtension))); });
+    tvx::allocating([&] { name += HasExtension() ? m_record->extension : CString(WithDot(View(defaultExtension))); });
     return name;
 }
 
@@ -255,18 +222,18 @@ int Gui_FileName::HasExtension() const {
 
 int Gui_FileName::HasExtension(const char* extension) const {
     const std::string_view own = m_record->extension.View();
-    const std::string_view asked = viewOf(extension);
+    const std::string_view asked = View(extension);
     if (asked.empty() || own.empty())
         return asked.empty() && own.empty();
     return tvx::text::equalNoCase(asked.front() == '.' ? own : own.substr(1), asked);
 }
 
 int Gui_FileName::HasNetworkMount() const {
-    return m_record->mount.View().starts_with(networkMark);
+    return m_record->mount.View().starts_with(NetworkMark);
 }
 
 int Gui_FileName::HasAbsolutePath() const {
-    return m_record->path.View().starts_with(separator);
+    return m_record->path.View().starts_with(Separator);
 }
 
 int Gui_FileName::HasRelativePath() const {
@@ -274,13 +241,5 @@ int Gui_FileName::HasRelativePath() const {
 }
 
 char Gui_FileName::GetPathSeparator() {
-    return separator;
-}
-
-void Gui_FileName::SetUncFlag(int flag) {
-    uncFlag = flag;
-}
-
-int Gui_FileName::GetUncFlag() {
-    return uncFlag;
+    return Separator;
 }

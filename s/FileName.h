@@ -5,6 +5,8 @@
 
 #include <memory>
 
+class CDC;
+
 /// A file name as four parts that are set one by one: mount, path, base and extension.
 ///
 /// The mount is a drive ("C:") or a share ("\\server\share"); the path holds the folders and ends with a backslash;
@@ -80,6 +82,9 @@ public:
     /// @name The parts
     /// @{
 
+    /// The drive or share.
+    /// @param unc  0: a share that is connected to a drive is given as that drive, when there is one
+    CString GetMount(int unc = 1) const;
     /// The folders, with a separator at the end; absolute when they begin with one.
     CString GetPath() const;
     /// The name without its extension.
@@ -92,6 +97,45 @@ public:
     /// @param defaultBase       taken when the base is empty; may be null
     /// @param defaultExtension  taken when the extension is empty, with or without its dot; may be null
     CString GetBaseAndExtension(const char* defaultBase = nullptr, const char* defaultExtension = nullptr) const;
+    /// @}
+
+    /// @name Whole names
+    ///
+    /// A missing mount is the current drive, missing folders are the current folder, unless a default stands in for
+    /// them. A default that is not null but empty leaves its part empty.
+    /// @{
+
+    /// Mount and path.
+    /// @param unc             non-zero: a relative path is completed with the current folder, and shares stay shares;
+    /// 0:
+    ///                        it stays relative, and shares are given as drives where there is one
+    /// @param defaultMount    taken when the mount is empty, as SetMount takes it; may be null
+    /// @param defaultPath     taken when the path is empty, as SetPath takes it; may be null
+    /// @param stripSeparator  non-zero: without the separator at the end
+    CString GetMountAndPath(int unc = 1, const char* defaultMount = nullptr, const char* defaultPath = nullptr,
+                            int stripSeparator = 0) const;
+    /// The whole name: as GetMountAndPath and GetBaseAndExtension, one behind the other.
+    CString GetFullName(int unc = 1, const char* defaultMount = nullptr, const char* defaultPath = nullptr,
+                        const char* defaultBase = nullptr, const char* defaultExtension = nullptr,
+                        int stripSeparator = 0) const;
+    /// The whole name with shares. The text is valid until the next conversion of this object or its end, whatever is
+    /// done to the parts meanwhile.
+    operator const char*() const;
+    /// Whether two names denote the same file, as far as their texts tell: both completed, compared without regard to
+    /// case. Links and ".." are not looked at.
+    /// @return non-zero when they do
+    int IsEquivalent(const Gui_FileName& other) const;
+    /// The whole name for display, with "..." in place of as many of its first folders as must be left out:
+    /// "C:\...\gui\main.cpp".
+    /// @param maxLength  characters that there is room for
+    /// @param keepName   what to give when not even base and extension have room: 0 the empty text, else those
+    CString GetAbbreviatedName(int maxLength, int keepName) const;
+    /// The same, measured in the units of a device context in its current font. Without one, or one that cannot
+    /// measure, everything has room.
+    CString GetAbbreviatedName(const CDC* dc, int maxWidth, int keepName) const;
+    /// The whole name as an address that the family's help understands: "file:///C|\doc\a.htm", or
+    /// "file:\\server\share\a.htm" for a share without drive. Separators stay backslashes, nothing is escaped.
+    CString AsURL() const;
     /// @}
 
     /// @name Questions about the parts: 1 or 0
@@ -114,14 +158,49 @@ public:
     int HasRelativePath() const;
     /// @}
 
+    /// @name Questions to the file system: 1 or 0
+    ///
+    /// They are about the whole name, completed with the current drive and folder. What cannot be examined counts as
+    /// not being there.
+    /// @{
+
+    /// Whether there is a file or folder of that name.
+    int Exists() const;
+    /// The same as Exists.
+    int IsReadable() const;
+    int IsDirectory() const;
+    int IsFile() const;
+    /// Whether it exists and may be written. On a removable medium a file is made in its root, and deleted again, to
+    /// find out; a disc is never writable.
+    int IsWritable() const;
+    /// The same as IsWritable.
+    int IsDeletable() const;
+    /// Whether it exists and has the extension of a program: ".bat", ".exe" or ".com" in any case.
+    int IsExecutable() const;
+    /// @}
+
     /// What stands between folders: the backslash.
     static char GetPathSeparator();
+
+    /// @name Network names
+    /// @{
 
     /// Switches network names on (non-zero) or off, for the whole process. They are on at first: setting a mount turns
     /// a drive into the share that it is connected to, so that stored names mean the same on every machine.
     static void SetUncFlag(int flag);
     /// What SetUncFlag was given last; 1 at first.
     static int GetUncFlag();
+    /// Turns a drive into the share that it is connected to, in lower case. Nothing happens while network names are
+    /// switched off.
+    /// @param mount    its first character is the drive
+    /// @param uncOnly  0: also a connection whose name is no share
+    /// @return 1 when the mount may be used as it is now: it became a share, was one, or names are switched off; 0 for
+    /// a
+    ///     drive that is not connected, which stays
+    static int GetRemoteMountName(CString& mount, int uncOnly);
+    /// There are no other network names than shares: 0, and the text stays.
+    static int GetNetworkName(CString& name);
+    /// @}
 
 private:
     struct Record;

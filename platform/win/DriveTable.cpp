@@ -1,0 +1,252 @@
+#include "platform/win/detail/DriveTable.h"
+
+#include "platform/base/Text.h"
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <map>
+#include <optional>
+
+namespace tvx::win {
+namespace {
+
+/// What a line of mountinfo tells (proc(5)).
+struct Mount {
+    std::string point;
+    std::string fileSystem;
+    std::string source;
+};
+
+/// Takes the first of the fields that single characters separate.
+std::string_view takeField(std::string_view& text, char separator) {
+    const std::string_view field = text.substr(0, text.find(separator));
+    text.remove_prefix(std::min(field.size() + 1, text.size()));
+    return field;
+}
+
+/// Blanks, tabs, line ends and backslashes are written as three octal digits behind a backslash.
+std::string unescaped(std::string_view text) {
+    std::string result;
+    for (std::size_t at = 0; at < text.size(); ++at) {
+        unsigned value = 0;
+        const char* const digits = text.data() + at + 1;
+        const bool isEscape = text[at] == '\\' && text.size() - at > 3 &&
+                              std::from_chars(digits, digits + 3, value, 8).ptr == digits + 3 && value < 256;
+        result += isEscape ? static_cast<char>(value) : text[at];
+        at += isEscape ? 3 : 0;
+    }
+    return result;
+}
+
+std::optional<Mount> parseLine(std::string_view line) {
+    constexpr int fieldsBeforePoint = 4;
+    constexpr std::string_view endOfOptions = " - ";
+    const std::size_t end = line.find(endOfOptions);
+    if (end == std::string_view::npos)
+        return std::nullopt;
+    std::string_view left = line.substr(0, end);
+    std::string_view right = line.substr(end + endOfOptions.size());
+    for (int field = 0; field < fieldsBeforePoint; ++field)
+        takeField(left, ' ');
+    Mount mount{unescaped(takeField(left, ' ')), std::string(takeField(right, ' ')), {}};
+    mount.source = unescaped(takeField(right, ' '));
+    return mount.point.starts_with('/') && mount.point.find('\0') == std::string::npos ? std::optional(mount)
+                                                                                       : std::nullopt;
+}
+
+/// The mounts that can be reached, by mount point: of several on one point the last one lies on top.
+std::map<std::string, Mount> parseMounts(std::string_view text) {
+    std::map<std::string, Mount> mounts;
+    while (!text.empty())
+        if (auto mount = parseLine(takeField(text, '\n')))
+            mounts.insert_or_assign(mount->point, *mount);
+    return mounts;
+}
+
+/// File systems whose source names a server and a folder of it: "server:/folder", "user@server:folder",
+/// "//server/share" or "https://server/folder".
+bool isNetwork(std::string_view fileSystem) {
+    static constexpr std::array<std::string_view, 12> names{
+        "nfs",        "nfs4",       "cifs",           "smb3",           "smbfs",     "ceph",
+        "fuse.sshfs", "fuse.davfs", "fuse.glusterfs", "fuse.curlftpfs", "fuse.ceph", "davfs"};
+    return std::ranges::find(names, fileSystem) != names.end();
+}
+
+std::string_view trimSlashes(std::string_view text) {
+    while (text.starts_with('/'))
+        text.remove_prefix(1);
+    while (text.ends_with('/'))
+        text.remove_suffix(1);
+    return text;
+}
+
+std::string_view lastPart(std::string_view path) {
+    return path.substr(path.rfind('/') + 1);
+}
+
+std::string joined(std::string_view path) {
+    std::string name(path);
+    std::ranges::replace(name, '/', '-');
+    return name;
+}
+
+/// A server and the folder of it that is mounted.
+struct Remote {
+    std::string server;
+    std::string folder;
+    bool isShare = false; ///< the folder begins with the name of a share
+};
+
+std::optional<Remote> parseSource(std::string_view source) {
+    Remote remote;
+    const std::size_t scheme = source.find("://");
+    if (scheme != std::string_view::npos || source.starts_with("//")) {
+        source = source.substr(scheme == std::string_view::npos ? 2 : scheme + 3);
+        remote.isShare = scheme == std::string_view::npos;
+        remote.server = takeField(source, '/');
+    } else {
+        // The folder stands behind the last colon before it, addresses hold colons themselves.
+        const std::size_t slash = source.find(":/");
+        const std::size_t colon = slash == std::string_view::npos ? source.rfind(':') : slash;
+        if (colon == std::string_view::npos)
+            return std::nullopt;
+        remote.server = source.substr(0, std::min(colon, source.find(',')));
+        source.remove_prefix(colon + 1);
+    }
+    remote.folder = trimSlashes(source);
+    remote.server.erase(0, remote.server.find('@') + 1);
+    std::erase_if(remote.server, [](char character) { return character == '[' || character == ']'; });
+    std::ranges::replace(remote.server, ':', '-');
+    return remote.server.empty() ? std::nullopt : std::optional(remote);
+}
+
+/// "\\server\share" for a network mount, not yet one of `taken`. The share is one word: the last folder, or all of them
+/// joined where that name is taken or would mean another folder of the share.
+std::string remoteName(const Mount& mount, const std::vector<Drive>& taken) {
+    const auto remote = parseSource(mount.source);
+    if (!remote)
+        return {};
+    const std::string server = "\\\\" + remote->server + "\\";
+    const std::string_view folder = remote->folder.empty() ? lastPart(mount.point) : std::string_view(remote->folder);
+    std::string name = server + (remote->isShare ? joined(folder) : std::string(lastPart(folder)));
+    const auto isTaken = [&](const Drive& drive) { return text::equalNoCase(drive.remoteName, name); };
+    if (std::ranges::any_of(taken, isTaken))
+        name = server + joined(folder);
+    std::ranges::replace(name.begin() + static_cast<std::ptrdiff_t>(server.size()), name.end(), '\\', '-');
+    return name;
+}
+
+/// Where desktops and people mount what they plug in, also disks that are not marked as removable.
+bool isMediaFolder(std::string_view point) {
+    return point.starts_with("/media/") || point.starts_with("/run/media/");
+}
+
+/// The drive that a mount is; nothing for one that only is a folder.
+std::optional<Drive> driveOf(const Mount& mount, const std::vector<Drive>& others, const RemovableTest& isRemovable) {
+    if (mount.point == "/")
+        return std::nullopt;
+    if (isNetwork(mount.fileSystem)) {
+        Drive drive{0, mount.point, DriveKind::remote, remoteName(mount, others)};
+        return drive.remoteName.empty() ? std::nullopt : std::optional(drive);
+    }
+    if (!mount.source.starts_with("/dev/"))
+        return std::nullopt;
+    const bool isDisc = mount.fileSystem == "iso9660" || mount.source.starts_with("/dev/sr");
+    if (isDisc || isMediaFolder(mount.point) || isRemovable(mount.source))
+        return Drive{0, mount.point, isDisc ? DriveKind::optical : DriveKind::removable, {}};
+    return std::nullopt;
+}
+
+bool isLetter(char character) {
+    return character >= 'A' && character <= 'Z';
+}
+
+char upper(char character) {
+    return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
+}
+
+bool setKind(Drive& drive, std::string_view kind) {
+    if (kind.starts_with("\\\\") && kind.find('\\', 2) != std::string_view::npos) {
+        drive.kind = DriveKind::remote;
+        drive.remoteName = kind;
+        return true;
+    }
+    if (kind == "removable")
+        drive.kind = DriveKind::removable;
+    else if (kind == "cdrom")
+        drive.kind = DriveKind::optical;
+    else
+        return kind.empty() || kind == "fixed";
+    return true;
+}
+
+std::optional<Drive> parseEntry(std::string_view entry) {
+    Drive drive;
+    const std::string_view letter = takeField(entry, '=');
+    std::string_view folder = takeField(entry, '|');
+    while (folder.size() > 1 && folder.ends_with('/'))
+        folder.remove_suffix(1);
+    if (letter.size() != 1 || !isLetter(upper(letter.front())) || !folder.starts_with('/') || !setKind(drive, entry))
+        return std::nullopt;
+    drive.letter = upper(letter.front());
+    drive.folder = folder;
+    return drive;
+}
+
+bool isBelow(std::string_view path, std::string_view folder) {
+    return folder == "/" || (path.starts_with(folder) && (path.size() == folder.size() || path[folder.size()] == '/'));
+}
+
+} // namespace
+
+DriveTable DriveTable::fromMounts(std::string_view mountInfo, const RemovableTest& isRemovable) {
+    DriveTable table;
+    table.m_drives.push_back({'C', "/", DriveKind::fixed, {}});
+    char letter = 'D';
+    for (const auto& [point, mount] : parseMounts(mountInfo)) {
+        std::optional<Drive> drive = driveOf(mount, table.m_drives, isRemovable);
+        if (!drive || (!isLetter(letter) && drive->kind != DriveKind::remote))
+            continue;
+        drive->letter = isLetter(letter) ? letter++ : '\0';
+        table.m_drives.push_back(*std::move(drive));
+    }
+    return table;
+}
+
+DriveTable DriveTable::fromText(std::string_view text, std::vector<std::string>& mistakes) {
+    DriveTable table;
+    while (!text.empty()) {
+        const std::string_view entry = takeField(text, ';');
+        std::optional<Drive> drive = parseEntry(entry);
+        if (drive && !table.find(drive->letter))
+            table.m_drives.push_back(*std::move(drive));
+        else if (!entry.empty())
+            mistakes.emplace_back(entry);
+    }
+    std::ranges::sort(table.m_drives, {}, &Drive::letter);
+    return table;
+}
+
+const Drive* DriveTable::find(char letter) const noexcept {
+    const char wanted = upper(letter);
+    const auto found = std::ranges::find(m_drives, wanted, &Drive::letter);
+    return isLetter(wanted) && found != m_drives.end() ? &*found : nullptr;
+}
+
+const Drive* DriveTable::findShare(std::string_view remoteName) const noexcept {
+    const auto found = std::ranges::find_if(m_drives, [remoteName](const Drive& drive) {
+        return !drive.remoteName.empty() && text::equalNoCase(drive.remoteName, remoteName);
+    });
+    return found == m_drives.end() ? nullptr : &*found;
+}
+
+const Drive* DriveTable::holding(std::string_view path) const noexcept {
+    const Drive* best = nullptr;
+    for (const Drive& drive : m_drives)
+        if (drive.letter && isBelow(path, drive.folder) && (!best || drive.folder.size() > best->folder.size()))
+            best = &drive;
+    return best;
+}
+
+} // namespace tvx::win
