@@ -1,6 +1,7 @@
 #include "s/CommandLineInfo.h"
 
 #include "platform/base/Text.h"
+#include "platform/port/CmdOpcodes.h"
 #include "s/CommandLineState.h"
 #include "s/Record.h"
 
@@ -52,7 +53,7 @@ Gui_CommandLineInfo_Impl::IntStyleEnum Gui_CommandLineInfo_Impl::GetStyleSwitch(
 bool Gui_CommandLineInfo_Impl::ParseParam(Gui_CommandLineInfo& owner, const char* param, BOOL isSwitch) {
     if (isSwitch) {
         m_expectation = Expectation::Nothing;
-        return ParseSwitch(param);
+        return ParseSwitch(param) || ParseAbbreviation(owner, param);
     }
     switch (m_expectation) {
     case Expectation::Style:
@@ -82,6 +83,13 @@ bool Gui_CommandLineInfo_Impl::ParseSwitch(const char* param) {
     else
         return false;
     return true;
+}
+
+/// Takes the abbreviations that the check of the options takes.
+bool Gui_CommandLineInfo_Impl::ParseAbbreviation(const Gui_CommandLineInfo& owner, const char* param) {
+    const UT_CMDOPCODES options(owner.GetCmdOpcodes());
+    const char* const name = options.optionname(param);
+    return name && ParseSwitch(name);
 }
 
 void Gui_CommandLineInfo_Impl::ParseStyle(const char* param) {

@@ -35,6 +35,9 @@ class Gui_CommandLineInfo_Impl;
 /// | `-intstyle STYLE` | see GetStyleSwitch; STYLE is `nev`, `kelma` or `silent`, any other word is ignored |
 /// | `-f FILE...` | the words up to the next switch name command files, whose words take their place |
 ///
+/// A switch that the host's option specification lists may be abbreviated as long as only one option begins that way:
+/// `-smoke` is `-smoketest`, for the check as well as here.
+///
 /// They are known without the host's doing, but `ProcessCommandLine` accepts only what the option specification lists,
 /// so a host lists those it wants to take (`-f` apart, which is gone by then). Everything else goes to the base class,
 /// which takes the first plain word as the file to open.

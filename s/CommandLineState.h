@@ -48,6 +48,7 @@ private:
     enum class Expectation { Style = 0, CommandFile = 1, Nothing = 2 };
 
     bool ParseSwitch(const char* param);
+    bool ParseAbbreviation(const Gui_CommandLineInfo& owner, const char* param);
     void ParseStyle(const char* param);
 
     int m_smokeTest = 0;

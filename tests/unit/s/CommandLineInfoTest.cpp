@@ -111,6 +111,23 @@ TEST_F(CommandLineInfo, KnowsTheSwitchesOfTheFamily) {
     start(longer, {"-helper"});
     EXPECT_EQ(longer.info.IsHelpSwitch(), 0);
 
+    for (const char* word : {"-sm", "/SMOKE"}) {
+        Outcome abbreviated;
+        start(abbreviated, {word});
+        EXPECT_EQ(abbreviated.info.IsSmokeTestSwitch(), 1) << word;
+        EXPECT_EQ(abbreviated.result, 0) << word;
+        EXPECT_TRUE(theApp.boxes.empty()) << word;
+    }
+    Outcome ambiguous;
+    start(ambiguous, {"-s"});
+    EXPECT_EQ(ambiguous.info.IsSmokeTestSwitch(), 0);
+    EXPECT_EQ(ambiguous.result, 0) << "the check refuses it";
+    EXPECT_FALSE(theApp.boxes.empty());
+    Outcome unlisted;
+    start(unlisted, {"-intst", "silent"});
+    EXPECT_EQ(unlisted.info.GetStyleSwitch(), Gui_CommandLineInfo::IntStyleNone)
+        << "only what the host lists can be abbreviated";
+
     Outcome splash;
     start(splash, {"-NoSplash", "one.brd"});
     EXPECT_FALSE(splash.info.m_bShowSplash);
