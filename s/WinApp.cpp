@@ -1,5 +1,6 @@
 #include "s/WinApp.h"
 
+#include "platform/afx/MessageBox.h"
 #include "platform/port/Exception.h"
 #include "res/resource.h"
 #include "s/Msg.h"
@@ -48,14 +49,17 @@ int Gui_WinApp::Run() {
     try {
         result = CWinApp::Run();
     } catch (const Port::Exception& exception) {
+        const CLastReport report;
         exception.report();
         issueFatal(__LINE__);
     } catch (const std::exception& exception) {
+        const CLastReport report;
         WinAppOrigin(__LINE__).issueError("%s", exception.what());
         issueFatal(__LINE__);
     } catch (CException* exception) {
         exception->Delete();
     } catch (...) {
+        const CLastReport report;
         issueFatal(__LINE__);
     }
     return result;

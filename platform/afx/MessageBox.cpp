@@ -17,6 +17,7 @@
 #include <array>
 #include <cstdio>
 #include <cstring>
+#include <string>
 #include <vector>
 
 using namespace tvx::afx;
@@ -83,7 +84,7 @@ public:
         setWindowTitle(toQt(caption));
         setTextFormat(Qt::PlainText);
         setText(toQt(text));
-        keepLines();
+        makeRoom();
         setIcon(iconOf(m_type));
         for (const BoxButton& button : buttonsOf(m_type)) {
             addButton(button);
@@ -123,14 +124,24 @@ protected:
     }
 
 private:
-    /// The toolkit breaks lines at 500 pixels; texts that come with line ends of their own keep theirs.
-    void keepLines() {
+    /// The toolkit breaks lines at 500 pixels; texts that come with line ends of their own keep theirs. A short text
+    /// leaves room for the caption.
+    void makeRoom() {
         auto* label = findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
-        if (label == nullptr || !text().contains(QLatin1Char('\n'))) {
+        if (label == nullptr) {
             return;
         }
-        const int widest = label->fontMetrics().size(0, text()).width() + 2 * label->margin();
-        label->setMinimumWidth(std::min(widest + 2, screen()->availableGeometry().width() * 3 / 5));
+        constexpr int captionButtons = 110;
+        const QFontMetrics metrics = label->fontMetrics();
+        const int caption = metrics.horizontalAdvance(windowTitle()) + captionButtons;
+        int width = caption > label->sizeHint().width() ? caption : 0;
+        if (text().contains(QLatin1Char('\n'))) {
+            const int lines = metrics.size(0, text()).width() + 2 * label->margin() + 2;
+            width = std::max(width, std::min(lines, screen()->availableGeometry().width() * 3 / 5));
+        }
+        if (width > 0) {
+            label->setMinimumWidth(width);
+        }
     }
 
     void addButton(const BoxButton& entry) {
@@ -164,19 +175,31 @@ struct ReporterEntry {
     }
 } const reporterEntry;
 
+/// The text as a box shows it: what was collected line by line ends with a line end, which would be an empty line.
+std::string shown(LPCSTR text) {
+    std::string result(text != nullptr ? text : "");
+    result.erase(result.find_last_not_of("\r\n") + 1);
+    return result;
+}
+
+/// The window that a box belongs to; none while it is hidden, as a main frame is at the start, so that the window
+/// manager finds the place.
+QWidget* visibleOwner(HWND owner) {
+    Window* window = Window::from(owner);
+    QWidget* widget = window != nullptr ? window->topLevel()->widget() : nullptr;
+    return widget != nullptr && widget->isVisible() ? widget : nullptr;
+}
+
 } // namespace
 
 int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
-    text = text != nullptr ? text : "";
     caption = caption != nullptr ? caption : "Error";
     if (!ensureGui()) {
-        std::fprintf(stderr, "%s: %s\n", caption, text);
+        std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
         return defaultOf(type).answer;
     }
-    Window* window = Window::from(owner);
-    QWidget* over = window != nullptr ? window->topLevel()->widget() : nullptr;
-    Box box(over, type);
-    return box.ask(text, caption);
+    Box box(visibleOwner(owner), type);
+    return box.ask(shown(text).c_str(), caption);
 }
 
 int AfxMessageBox(LPCSTR text, UINT type, UINT helpId) {

@@ -5,6 +5,7 @@
 #include "MainFrame.h"
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
+#include "platform/port/MsgDispatcher.h"
 
 #include <algorithm>
 #include <cstdlib>
@@ -78,6 +79,7 @@ END_MESSAGE_MAP()
 CBoardApp::CBoardApp() : Gui_WinApp("board") {}
 
 BOOL CBoardApp::InitInstance() {
+    Port_MsgDispatcher::addMsgMan(&m_messages);
     SetRegistryKey("Tarvex");
 
     CBoardCommandLine info;

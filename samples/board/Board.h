@@ -1,6 +1,7 @@
 #pragma once
 
 #include "s/CommandLineInfo.h"
+#include "s/MessageManager.h"
 #include "s/WinApp.h"
 
 #include <vector>
@@ -37,6 +38,9 @@ public:
 
 private:
     BOOL OpenDrawings(CBoardCommandLine& info);
+
+    /// Shows errors in message boxes, those of handlers that have failed among them.
+    Gui_MessageManager m_messages;
 
     DECLARE_MESSAGE_MAP()
 };

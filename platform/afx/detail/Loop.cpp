@@ -1,6 +1,8 @@
 #include "platform/afx/detail/Loop.h"
 
+#include "platform/afx/MessageBox.h"
 #include "platform/afx/detail/MessageQueue.h"
+#include "platform/base/Exception.h"
 
 namespace tvx::afx {
 
@@ -10,6 +12,7 @@ struct LoopState {
     ModalLoop* innermost = nullptr;
     int guards = 0; ///< Guarded calls on the stack above the innermost loop.
     std::exception_ptr pending;
+    int lastReports = 0; ///< While there are any, what handlers throw is dropped.
     bool quitting = false;
     int exitCode = 0;
 };
@@ -17,6 +20,16 @@ struct LoopState {
 LoopState& state() {
     thread_local LoopState instance;
     return instance;
+}
+
+/// Ends an exception. The framework's own ones are thrown as pointers, which go with them.
+void drop(const std::exception_ptr& error) noexcept {
+    try {
+        std::rethrow_exception(error);
+    } catch (CException* framework) {
+        framework->Delete();
+    } catch (...) {
+    }
 }
 
 } // namespace
@@ -53,6 +66,10 @@ void ModalLoop::end(int result) {
 
 void ExceptionCarrier::store(std::exception_ptr error) noexcept {
     LoopState& current = state();
+    if (current.lastReports > 0) {
+        drop(error);
+        return;
+    }
     if (!current.pending) {
         current.pending = std::move(error);
     }
@@ -99,3 +116,11 @@ int takeQuit() {
 }
 
 } // namespace tvx::afx
+
+CLastReport::CLastReport() {
+    ++tvx::afx::state().lastReports;
+}
+
+CLastReport::~CLastReport() {
+    --tvx::afx::state().lastReports;
+}

@@ -1,4 +1,5 @@
 #include "afxwin.h"
+#include "platform/afx/MessageBox.h"
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/Window.h"
@@ -331,6 +332,49 @@ TEST_F(Core, FrameworkExceptionsAreReportedInAMessageBox) {
     CFileException error(CFileException::fileNotFound, 2, "plan.brd");
     error.ReportError(MB_ICONSTOP);
     EXPECT_TRUE(shown.contains("plan.brd")) << shown.toStdString();
+}
+
+TEST_F(Core, MessageBoxesBelongToWindowsThatAreSeen) {
+    QString shown;
+    const QWidget* owner = nullptr;
+    int width = 0;
+    const auto ask = [&](const char* text, const char* caption) {
+        QTimer::singleShot(0, [&] {
+            auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+            ASSERT_NE(box, nullptr);
+            shown = box->text();
+            owner = box->parentWidget();
+            width = box->width();
+            QTest::keyClick(box, Qt::Key_Escape);
+        });
+        ::MessageBoxA(view.m_hWnd, text, caption, MB_OK);
+    };
+    ask("\nFirst line.\r\nLast line.\r\n\n", "Short");
+    EXPECT_EQ(shown, "\nFirst line.\r\nLast line.") << "an empty line at the end would only take room";
+    EXPECT_EQ(owner, frame.widget());
+    frame.ShowWindow(SW_HIDE);
+    ask("", "A caption that is much longer than the text of the box");
+    EXPECT_EQ(owner, nullptr);
+    EXPECT_GT(width,
+              QFontMetrics(QApplication::font()).horizontalAdvance("A caption that is much longer than the text"));
+}
+
+TEST_F(Core, LastReportsOutliveHandlersThatFailAgain) {
+    view.on[WM_APP + 1] = [] { throw std::runtime_error("again"); };
+    {
+        const CLastReport report;
+        tvx::afx::ModalLoop loop;
+        view.on[WM_APP + 2] = [&] {
+            loop.end(7);
+            AfxThrowMemoryException();
+        };
+        view.PostMessage(WM_APP + 1);
+        view.PostMessage(WM_APP + 2);
+        EXPECT_EQ(loop.run(), 7);
+    }
+    tvx::afx::ModalLoop loop;
+    view.PostMessage(WM_APP + 1);
+    EXPECT_THROW((void)loop.run(), std::runtime_error);
 }
 
 } // namespace
