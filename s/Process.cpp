@@ -122,17 +122,20 @@ int Gui_Process::RunWaitForWindow(const char* commandLine, const char* directory
     return Run(commandLine, directory, 0, 0);
 }
 
-unsigned long Gui_Process::GetExitCode() {
-    Record& record = *m_record;
-    record.lastError = 0;
-    DWORD code = STILL_ACTIVE;
-    if (record.exitCode != STILL_ACTIVE)
-        return record.exitCode;
-    if (GetExitCodeProcess(record.process, &code))
-        record.exitCode = code;
+DWORD Gui_Process::Record::CurrentExitCode() {
+    lastError = 0;
+    DWORD code = exitCode;
+    if (exitCode != STILL_ACTIVE)
+        return code;
+    if (GetExitCodeProcess(process, &code))
+        exitCode = code;
     else
-        record.NoteError();
+        NoteError();
     return code;
+}
+
+unsigned long Gui_Process::GetExitCode() {
+    return m_record->CurrentExitCode();
 }
 
 int Gui_Process::IsActive() {
@@ -161,6 +164,9 @@ void Gui_Process::Release() {
     Record& record = *m_record;
     if (isValid(record.process) && record.releasePolicy != LeaveRunning)
         Terminate(record.releaseExitCode);
+    record.StopNotifying();
+    record.chunk.Empty();
+    record.unfinished.clear();
     close(record.process);
     close(record.mainThread);
     close(record.inputPipe);
@@ -193,6 +199,9 @@ int Gui_Process::GetOutput(CString& text) {
         record.NoteError();
     if (waiting == 0)
         return 0;
+    // A larger buffer has no use for the old content.
+    if (text.GetAllocLength() <= static_cast<int>(waiting))
+        text.Empty();
     DWORD count = 0;
     char* buffer = text.GetBuffer(static_cast<int>(waiting) + 1);
     if (!ReadFile(record.outputPipe, buffer, waiting, &count, nullptr))

@@ -5,11 +5,13 @@
 
 #include <memory>
 
+class CEdit;
+
 /// One program that runs as a child process.
 ///
 /// The host makes one object for each program, starts it with Run, and asks from time to time what has become of it:
 /// nothing here waits for the child or calls back, and no operation shows a message or throws. Output is collected
-/// without ever blocking.
+/// without ever blocking. A host that shows output as it comes is woken by NotifyWindow and needs no timer.
 ///
 /// @code
 /// Gui_Process compiler;
@@ -17,8 +19,7 @@
 ///     report(compiler.GetError());
 /// ...
 /// // now and then, until it has ended and nothing is left:
-/// if (compiler.GetOutput(text))
-///     show(text);
+/// compiler.AppendOutput(m_log, nullptr);
 /// if (!compiler.IsActive() && !compiler.HasOutput())
 ///     report(compiler.GetExitCode());
 /// @endcode
@@ -79,6 +80,23 @@ public:
     /// @param text  replaced; unchanged when nothing waits
     /// @return 1, or 0 when nothing waits. GetError is 109 when nothing can come any more.
     int GetOutput(CString& text);
+    /// Appends the captured output that waits to a log, whose oldest text gives way at its limit
+    /// (Gui_Edit::AppendText). A child that writes faster than the log takes it does not hold up the caller: what comes
+    /// during the call may be left for the next one.
+    /// @param lastChunk  receives the piece that was read last, when there was one; may be null
+    /// @return whether anything was appended: 1 or 0
+    int AppendOutput(CEdit& edit, CString* lastChunk);
+    /// Asks for one message as soon as there is something to do: output waits, no more can come, or the child has
+    /// ended. Ask again when it has been handled; messages come at most once a frame. Release and the window's end
+    /// withdraw the request.
+    /// @param window   one of this thread; it gets the message with two zeros
+    /// @param message  its number; a later request with the same window and number replaces this one
+    /// @return 1, or 0 when nothing is to be expected: no child, or GetExitCode has told its end and no output can come
+    int NotifyWindow(HWND window, unsigned int message);
+
+    /// Brings the windows of a running child to the front, minimised ones too.
+    /// @return always 0
+    int ShowMainWindow() const;
 
     /// The platform's error number of the last operation that failed; most operations begin by setting it to 0.
     unsigned long GetError() const;

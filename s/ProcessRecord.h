@@ -3,6 +3,8 @@
 #include "platform/win/Handle.h"
 #include "s/Process.h"
 
+#include <string>
+
 /// What a process object knows of its child.
 struct Gui_Process::Record {
     HANDLE process = INVALID_HANDLE_VALUE;
@@ -15,7 +17,14 @@ struct Gui_Process::Record {
     DWORD mainThreadId = 0;
     DWORD exitCode = 0xFFFFFFFF; ///< 0xFFFFFFFF without a child, `STILL_ACTIVE` until its end was seen
     DWORD processId = 0;
+    bool notifies = false;  ///< a message about the child was asked for
+    CString chunk;          ///< what AppendOutput read last: its room is used again
+    std::string unfinished; ///< output that waits for its rest before it is shown
 
+    /// Asks for the exit code as long as the child runs.
+    DWORD CurrentExitCode();
+    /// Withdraws requests for messages about the child.
+    void StopNotifying();
     /// Keeps the error of a call of the platform that failed.
     void NoteError();
     /// Ignored while a child with captured output is held.

@@ -8,6 +8,7 @@
 #include "platform/base/Exception.h"
 #include "platform/win/FrameworkIds.h"
 #include "platform/win/Module.h"
+#include "platform/win/Process.h"
 #include "platform/win/Resource.h"
 
 #include <QApplication>
@@ -322,6 +323,19 @@ int runApplication(CWinApp& app) {
 
 } // namespace
 
+namespace {
+
+/// Whoever started the application may want it to begin without a window.
+void rememberStart(CWinApp& app) {
+    STARTUPINFOA startup;
+    GetStartupInfoA(&startup);
+    if (startup.dwFlags & STARTF_USESHOWWINDOW) {
+        app.m_nCmdShow = startup.wShowWindow;
+    }
+}
+
+} // namespace
+
 int AfxWinMain(int argc, char** argv) {
     CWinApp* app = AfxGetApp();
     if (app == nullptr) {
@@ -330,6 +344,7 @@ int AfxWinMain(int argc, char** argv) {
     }
     app->m_hInstance = AfxGetInstanceHandle();
     app->rememberCommandLine(argc, argv);
+    rememberStart(*app);
     nameModule(*app);
     try {
         return runApplication(*app);

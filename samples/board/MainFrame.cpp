@@ -1,6 +1,8 @@
 #include "MainFrame.h"
 
+#include "OutputWindow.h"
 #include "Resource.h"
+#include "s/QueryDlg.h"
 
 #include <iterator>
 
@@ -15,6 +17,7 @@ IMPLEMENT_DYNCREATE(CMainFrame, CMDIFrameWnd)
 // clang-format off
 BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
     ON_WM_CREATE()
+    ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -36,4 +39,24 @@ int CMainFrame::OnCreate(CREATESTRUCT* cs) {
         return -1;
     }
     return 0;
+}
+
+void CMainFrame::OnRunCommand() {
+    CString title;
+    CString prompt;
+    title.LoadString(IDS_RUN_TITLE);
+    prompt.LoadString(IDS_RUN_PROMPT);
+    Gui_QueryDlg query(this);
+    query.SetTitle(title);
+    query.SetPrompt(prompt);
+    query.SetAnswer(m_lastCommand);
+    query.SetAnswerFieldWidth(50);
+    if (query.DoModal() != IDOK) {
+        return;
+    }
+    const CString command = query.GetAnswer();
+    if (!command.IsEmpty()) {
+        m_lastCommand = command;
+        COutputWindow::Run(command, this);
+    }
 }

@@ -10,10 +10,12 @@ class CMainFrame : public CMDIFrameWnd {
 public:
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
     afx_msg int OnCreate(CREATESTRUCT* cs);
+    afx_msg void OnRunCommand();
 
 private:
     CToolBar m_toolBar;
     CStatusBar m_statusBar;
+    CString m_lastCommand;
 
     DECLARE_MESSAGE_MAP()
 };

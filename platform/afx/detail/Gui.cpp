@@ -1,6 +1,7 @@
 #include "platform/afx/detail/Gui.h"
 
 #include "platform/afx/detail/Dispatch.h"
+#include "platform/afx/detail/HandleWatches.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/MessageQueue.h"
 #include "platform/win/Display.h"
@@ -66,6 +67,7 @@ void makeApplication() {
     // The toolkit has taken the process's locale from the environment; numbers keep their point.
     std::setlocale(LC_NUMERIC, "C");
     MessageQueue::instance().moveToThread(application->thread());
+    watchReleasedChildren();
 }
 
 } // namespace

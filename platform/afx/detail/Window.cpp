@@ -4,6 +4,7 @@
 #include "platform/afx/detail/Capture.h"
 #include "platform/afx/detail/Dispatch.h"
 #include "platform/afx/detail/Gui.h"
+#include "platform/afx/detail/HandleWatches.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/MessageQueue.h"
 #include "platform/afx/detail/PlainWindow.h"
@@ -468,6 +469,7 @@ void Window::finishDestroy() {
     const HWND handle = m_handle;
     forgetFocus(handle);
     forgetTimers(handle);
+    forgetHandleWatches(handle);
     call(WM_NCDESTROY);
     MessageQueue::instance().forget(handle);
     unlink();

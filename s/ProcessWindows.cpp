@@ -1,0 +1,151 @@
+// What a process object does with windows: its child's, and those that show its output.
+#include "afxwin.h"
+#include "platform/afx/HandleWatch.h"
+#include "platform/win/Error.h"
+#include "platform/win/Process.h"
+#include "s/Edit.h"
+#include "s/Process.h"
+#include "s/ProcessRecord.h"
+
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <string>
+#include <string_view>
+#include <utility>
+
+// Output
+
+namespace {
+
+/// How long output is read before the user's input gets its turn. What waits when the reading begins takes a fraction.
+constexpr std::chrono::milliseconds readingTime{8};
+
+/// The most text that an edit control without a limit gets.
+constexpr std::size_t mostWithoutLimit = 60000;
+
+std::size_t limitOf(CEdit& edit) {
+    const UINT limit = edit.GetLimitText();
+    return limit == 0 ? mostWithoutLimit : limit;
+}
+
+/// Appends a piece. Of text beyond the limit only the end will be seen; the control cuts it between characters, which
+/// have at most four bytes.
+void appendEnd(std::string& text, std::string_view piece, std::size_t limit) {
+    const std::size_t most = limit + 4;
+    if (piece.size() >= most)
+        text.clear();
+    else if (text.size() > 2 * most)
+        text.erase(0, text.size() - most);
+    text += piece.substr(piece.size() - std::min(piece.size(), most));
+}
+
+/// The length of what must not be shown before its rest is there: the first bytes of a character, half a line end.
+std::size_t unfinishedLength(std::string_view text) {
+    if (text.ends_with('\r'))
+        return 1;
+    for (std::size_t length = 1; length <= std::min<std::size_t>(text.size(), 3); ++length) {
+        const auto byte = static_cast<unsigned char>(text[text.size() - length]);
+        if (byte >= 0xC0) {
+            const std::size_t whole = byte >= 0xF0 ? 4 : byte >= 0xE0 ? 3 : 2;
+            return whole > length ? length : 0;
+        }
+        if (byte < 0x80)
+            break;
+    }
+    return 0;
+}
+
+} // namespace
+
+int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
+    using Clock = std::chrono::steady_clock;
+    Record& record = *m_record;
+    const auto deadline = Clock::now() + readingTime;
+    std::string text = std::exchange(record.unfinished, {});
+    const std::size_t limit = limitOf(edit);
+    int found = 0;
+    CString& chunk = record.chunk;
+    while (GetOutput(chunk)) {
+        found = 1;
+        appendEnd(text, chunk.View(), limit);
+        if (lastChunk)
+            *lastChunk = chunk;
+        if (Clock::now() >= deadline)
+            break;
+    }
+    if (record.lastError != ERROR_BROKEN_PIPE) {
+        const std::size_t unfinished = unfinishedLength(text);
+        record.unfinished = text.substr(text.size() - unfinished);
+        text.resize(text.size() - unfinished);
+    }
+    if (!text.empty())
+        Gui_Edit::AppendText(edit, CString(text));
+    return found;
+}
+
+int Gui_Process::NotifyWindow(HWND window, unsigned int message) {
+    Record& record = *m_record;
+    std::array<HANDLE, 2> handles{};
+    std::size_t count = 0;
+    if (record.exitCode == STILL_ACTIVE)
+        handles[count++] = record.process;
+    // A pipe at its end is readable for ever.
+    if (PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr))
+        handles[count++] = record.outputPipe;
+    if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message))
+        return 0;
+    record.notifies = true;
+    return 1;
+}
+
+void Gui_Process::Record::StopNotifying() {
+    if (!std::exchange(notifies, false))
+        return;
+    tvx::cancelPosts(process);
+    tvx::cancelPosts(outputPipe);
+}
+
+// Windows of the child
+
+namespace {
+
+/// Classes of windows that are there for their process, not for its user.
+constexpr std::string_view helperClasses[] = {
+    "#32772",
+    "tooltips_class32",
+    "OleMainThreadWndClass",
+    "OleDdeWndClass",
+    "OleMainThreadWndClass 0x######## ",
+    "OleDdeWndClass 0x######## ",
+};
+
+bool isHelper(HWND window) {
+    char name[101] = "";
+    const int length = GetClassNameA(window, name, sizeof name);
+    return std::ranges::find(helperClasses, std::string_view(name, static_cast<std::size_t>(length))) !=
+           std::end(helperClasses);
+}
+
+BOOL CALLBACK bringToFront(HWND window, LPARAM) {
+    if (GetParent(window) || isHelper(window) || !IsWindow(window))
+        return TRUE;
+    if (IsIconic(window)) {
+        ShowWindow(window, SW_RESTORE);
+        return TRUE;
+    }
+    // Hidden and shown again, a window comes in front of the others.
+    const bool maximized = IsZoomed(window);
+    ShowWindow(window, SW_HIDE);
+    ShowWindow(window, maximized ? SW_SHOWMAXIMIZED : SW_SHOWNORMAL);
+    return TRUE;
+}
+
+} // namespace
+
+int Gui_Process::ShowMainWindow() const {
+    Record& record = *m_record;
+    if (record.CurrentExitCode() == STILL_ACTIVE && record.mainThreadId != 0)
+        EnumThreadWindows(record.mainThreadId, &bringToFront, 0);
+    return 0;
+}
