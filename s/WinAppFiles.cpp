@@ -2,18 +2,21 @@
 #include "s/WinApp.h"
 
 #include "afxdlgs.h"
+#include "s/FileName.h"
 
 HWND Gui_WinApp::GetOwnerForFileDialog() {
     const CWinThread* thread = AfxGetThread();
     return thread && thread->m_pMainWnd ? thread->m_pMainWnd->m_hWnd : nullptr;
 }
 
-CString Gui_WinApp::GetInitialDirForFileDialog(const CString&) {
-    return CString();
+CString Gui_WinApp::GetInitialDirForFileDialog(const CString& fileName) {
+    const Gui_FileName name(fileName);
+    return name.HasAbsolutePath() ? name.GetMountAndPath() : Gui_FileName().GetMountAndPath();
 }
 
 CString Gui_WinApp::GetBaseNameForFileDialog(const CString& fileName) {
-    return fileName;
+    const Gui_FileName name(fileName);
+    return name.HasAbsolutePath() ? name.GetBaseAndExtension() : fileName;
 }
 
 CString Gui_WinApp::GetFilterForFileDialog(CDocTemplate* docTemplate, int addAllFiles) {
@@ -48,7 +51,9 @@ unsigned int Gui_WinApp::GetFlagsForFileDialog(unsigned int flags) {
 }
 
 CString Gui_WinApp::GetPathNameFromFileDialog(CFileDialog& dialog) {
-    return dialog.GetPathName();
+    const CString path = dialog.GetPathName();
+    // A name that has no other form than the system's, because it holds a backslash, must stay as it is.
+    return path.View().starts_with('/') ? path : Gui_FileName(path).GetFullName();
 }
 
 void Gui_WinApp::AddFileFilter(CString& filter, const CString& description, const CString& pattern) {

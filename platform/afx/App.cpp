@@ -6,6 +6,7 @@
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/Window.h"
 #include "platform/base/Exception.h"
+#include "platform/base/SystemPath.h"
 #include "platform/win/FrameworkIds.h"
 #include "platform/win/Module.h"
 #include "platform/win/Process.h"
@@ -303,7 +304,7 @@ void nameModule(CWinApp& app) {
     }
     if (app.m_pszHelpFilePath == nullptr) {
         const auto help = program.parent_path() / (std::string(app.m_pszExeName) + ".hlp");
-        replaceText(app.m_pszHelpFilePath, help.c_str());
+        replaceText(app.m_pszHelpFilePath, tvx::driveName(help.string()).c_str());
     }
 }
 

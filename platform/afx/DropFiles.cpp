@@ -3,6 +3,7 @@
 #include "platform/afx/detail/Drops.h"
 #include "platform/afx/detail/HandleTable.h"
 #include "platform/afx/detail/Window.h"
+#include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
 
 #include <QDropEvent>
@@ -28,7 +29,7 @@ Names namesOf(const QMimeData& data) {
     const auto urls = data.urls();
     for (const QUrl& url : urls) {
         if (url.isLocalFile()) {
-            names.push_back(fromQt(url.toLocalFile()));
+            names.push_back(tvx::driveName(fromQt(url.toLocalFile())));
         }
     }
     return names;

@@ -148,7 +148,7 @@ INT_PTR CFileDialog::DoModal() {
 void CFileDialog::takeAnswer(const Answer& answer) {
     m_paths.clear();
     for (const QString& file : answer.files) {
-        m_paths.emplace_back(fromQt(file).c_str());
+        m_paths.emplace_back(tvx::driveName(fromQt(file)).c_str());
     }
     m_ofn.nFilterIndex = static_cast<DWORD>(answer.filter + 1);
     const CString path = GetPathName();

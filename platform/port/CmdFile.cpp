@@ -1,5 +1,6 @@
 #include "platform/port/CmdFile.h"
 
+#include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
 #include "platform/port/MsgManData.h"
 #include "platform/port/detail/CommandFile.h"
@@ -43,7 +44,8 @@ std::string chainText() {
 
 class Descriptor {
 public:
-    explicit Descriptor(const char* name) : m_number(::open(name, O_RDONLY | O_CLOEXEC | O_NOCTTY)) {}
+    explicit Descriptor(const char* name)
+        : m_number(::open(tvx::systemPath(name).value_or(name).c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY)) {}
     ~Descriptor() {
         if (m_number >= 0)
             ::close(m_number);

@@ -1,5 +1,6 @@
 #include "platform/win/Module.h"
 
+#include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
 #include "platform/win/Error.h"
 #include "platform/win/detail/ModuleTable.h"
@@ -199,7 +200,7 @@ HMODULE GetModuleHandleA(LPCSTR name) {
 }
 
 DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size) {
-    const std::string path = tvx::moduleFileName(module);
+    const std::string path = tvx::driveName(tvx::moduleFileName(module));
     if (path.empty() || buffer == nullptr || size == 0) {
         SetLastError(path.empty() ? ERROR_MOD_NOT_FOUND : ERROR_INSUFFICIENT_BUFFER);
         return 0;

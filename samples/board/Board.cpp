@@ -6,6 +6,7 @@
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
+#include "s/FileName.h"
 
 #include <algorithm>
 #include <cstdlib>
@@ -105,6 +106,17 @@ BOOL CBoardApp::InitInstance() {
     return TRUE;
 }
 
+// A drawing may be named without its extension.
+CString CBoardApp::DrawingName(const CString& word) {
+    const Gui_FileName name(word);
+    if (name.HasExtension() || name.Exists()) {
+        return word;
+    }
+    Gui_FileName drawing(name);
+    drawing.SetExtension("brd");
+    return drawing.IsFile() ? drawing.GetFullName() : word;
+}
+
 // One drawing that cannot be opened does not keep the others from being shown.
 BOOL CBoardApp::OpenDrawings(CBoardCommandLine& info) {
     if (info.m_drawings.empty()) {
@@ -113,7 +125,7 @@ BOOL CBoardApp::OpenDrawings(CBoardCommandLine& info) {
     BOOL opened = FALSE;
     for (const CString& drawing : info.m_drawings) {
         info.m_nShellCommand = CCommandLineInfo::FileOpen;
-        info.m_strFileName = drawing;
+        info.m_strFileName = DrawingName(drawing);
         opened |= ProcessShellCommand(info);
     }
     return opened;

@@ -38,6 +38,7 @@ public:
 
 private:
     BOOL OpenDrawings(CBoardCommandLine& info);
+    static CString DrawingName(const CString& word);
 
     /// Shows errors in message boxes, those of handlers that have failed among them.
     Gui_MessageManager m_messages;

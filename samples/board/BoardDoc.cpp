@@ -1,6 +1,7 @@
 #include "BoardDoc.h"
 
 #include "Resource.h"
+#include "s/FileName.h"
 
 #include <string>
 #include <utility>
@@ -8,6 +9,12 @@
 namespace {
 
 constexpr ULONGLONG largestFile = 64 * 1024 * 1024;
+
+/// A drawing's name as messages show it: they stay readable however deep the drawing lies.
+CString shown(LPCSTR path) {
+    constexpr int room = 80;
+    return Gui_FileName(path).GetAbbreviatedName(room, TRUE);
+}
 
 } // namespace
 
@@ -57,7 +64,7 @@ BOOL CBoardDoc::OnOpenDocument(LPCSTR path) {
         if (length > largestFile) {
             ReleaseFile(file, TRUE);
             CString message;
-            message.Format(IDS_TOO_LARGE, path);
+            message.Format(IDS_TOO_LARGE, shown(path).GetString());
             AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
             return FALSE;
         }
@@ -77,7 +84,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     board::ReadResult result = board::readDrawing(text);
     if (!result.ok()) {
         CString message;
-        message.Format(IDS_DAMAGED, path, result.line, result.reason.c_str());
+        message.Format(IDS_DAMAGED, shown(path).GetString(), result.line, result.reason.c_str());
         AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
         return FALSE;
     }

@@ -2,6 +2,7 @@
 
 #include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
+#include "platform/win/Files.h"
 
 #include <filesystem>
 #include <string_view>
@@ -49,16 +50,7 @@ CString withoutExtension(const CString& name) {
 }
 
 CString fullPath(LPCSTR path) {
-    const std::string_view text(path);
-    const bool absolute = !text.empty() && (text.front() == '/' || text.front() == '\\' ||
-                                            (hasDrive(text) && text.size() > 2 && (text[2] == '\\' || text[2] == '/')));
-    if (absolute || text.empty()) {
-        return path;
-    }
-    std::error_code error;
-    const fs::path named = systemPath(path, PathUse::creating).value_or(path);
-    const fs::path result = fs::absolute(named, error).lexically_normal();
-    return error ? CString(path) : CString(result.c_str());
+    return make(fullName(path));
 }
 
 bool sameFile(LPCSTR first, LPCSTR second) {

@@ -33,7 +33,7 @@ TEST_F(Documents, SaveAndOpen) {
     const int updates = view().updates;
     EXPECT_EQ(AfxGetApp()->OpenDocumentFile(file("b.note").c_str()), &document());
     EXPECT_EQ(document().text, "two");
-    EXPECT_EQ(document().GetPathName(), file("b.note").c_str());
+    EXPECT_EQ(document().GetPathName(), driveName("b.note"));
     EXPECT_GT(view().updates, updates);
     EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 1);
 }
@@ -90,7 +90,7 @@ TEST_F(Documents, FailedSaveKeepsTheFile) {
     BoxAnswer box("OK");
     EXPECT_FALSE(document().DoFileSave());
     ASSERT_EQ(box.texts.size(), 1U);
-    EXPECT_EQ(box.texts[0], "The disk is full while writing " + file("d.note").string() + ".");
+    EXPECT_EQ(box.texts[0], std::string("The disk is full while writing ") + driveName("d.note").GetString() + ".");
     EXPECT_EQ(contents(file("d.note")), saved("good"));
     EXPECT_TRUE(document().IsModified());
     const auto entries = std::filesystem::directory_iterator(file(""));

@@ -41,7 +41,7 @@ TEST_F(FileDialogs, OpenAnswersTheParts) {
     dialog.m_ofn.lpstrTitle = "Pick a board";
     answer("some.picture.brd");
     ASSERT_EQ(dialog.DoModal(), IDOK);
-    EXPECT_EQ(dialog.GetPathName(), file("some.picture.brd").c_str());
+    EXPECT_EQ(dialog.GetPathName(), driveName("some.picture.brd"));
     EXPECT_EQ(dialog.GetFileName(), "some.picture.brd");
     EXPECT_EQ(dialog.GetFileExt(), "brd");
     EXPECT_EQ(dialog.GetFileTitle(), "some.picture");
@@ -68,7 +68,7 @@ TEST_F(FileDialogs, SaveCompletesTheExtension) {
     });
     answer("fresh");
     ASSERT_EQ(dialog.DoModal(), IDOK);
-    EXPECT_EQ(dialog.GetPathName(), file("fresh.brd").c_str());
+    EXPECT_EQ(dialog.GetPathName(), driveName("fresh.brd"));
 }
 
 TEST_F(FileDialogs, OverwritingIsAskedAbout) {

@@ -13,6 +13,7 @@
 #include "platform/afx/View.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/PlainWindow.h"
+#include "platform/base/SystemPath.h"
 #include "tests/ui/afx/FrameTestIds.h"
 
 #include <QAbstractButton>
@@ -131,6 +132,10 @@ protected:
     Note& document() const;
     std::filesystem::path file(const std::string& name) const {
         return m_folder / name;
+    }
+    /// The file's name as the framework hands it out.
+    CString driveName(const std::string& name) const {
+        return tvx::driveName(file(name).string()).c_str();
     }
 
 private:

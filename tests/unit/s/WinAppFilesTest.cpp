@@ -1,5 +1,8 @@
 #include "TestApp.h"
 
+#include "afxdlgs.h"
+#include "s/FileName.h"
+
 #include <gtest/gtest.h>
 #include <string>
 
@@ -45,6 +48,23 @@ TEST(WinAppFiles, ATextOfOtherOriginKeepsItsEnd) {
 TEST(WinAppFiles, TheHelpButtonIsTakenAwayAndNothingElse) {
     EXPECT_EQ(theApp.GetFlagsForFileDialog(0xFFFFFFFF), 0xFFFFFFEFu);
     EXPECT_EQ(theApp.GetFlagsForFileDialog(0x6), 0x6u);
+}
+
+TEST(WinAppFiles, DialogsBeginWhereTheNameLies) {
+    EXPECT_STREQ(theApp.GetInitialDirForFileDialog("C:\\plans\\a.brd"), "C:\\plans\\");
+    EXPECT_STREQ(theApp.GetBaseNameForFileDialog("C:\\plans\\a.brd"), "a.brd");
+    EXPECT_STREQ(theApp.GetInitialDirForFileDialog("/plans/a.brd").Right(7), "\\plans\\");
+    const CString current = Gui_FileName().GetMountAndPath();
+    EXPECT_STREQ(theApp.GetInitialDirForFileDialog("plans\\a.brd"), current);
+    EXPECT_STREQ(theApp.GetBaseNameForFileDialog("plans\\a.brd"), "plans\\a.brd");
+    EXPECT_STREQ(theApp.GetInitialDirForFileDialog(""), current);
+}
+
+TEST(WinAppFiles, ChosenNamesAreWhole) {
+    CFileDialog dialog(TRUE, nullptr, "a.brd");
+    EXPECT_STREQ(theApp.GetPathNameFromFileDialog(dialog), Gui_FileName("a.brd").GetFullName());
+    CFileDialog odd(TRUE, nullptr, "/tmp/odd\\name");
+    EXPECT_STREQ(theApp.GetPathNameFromFileDialog(odd), "/tmp/odd\\name");
 }
 
 TEST(WinAppFiles, TheTitleIsAStringOfTheResources) {

@@ -1,6 +1,7 @@
 #include "platform/win/Resource.h"
 
 #include "platform/base/String.h"
+#include "platform/base/SystemPath.h"
 #include "platform/win/Error.h"
 #include "platform/win/ExtensionModule.h"
 #include "tests/data/resources/resource.h"
@@ -34,7 +35,7 @@ TEST(Module, FilesAreKnownByTheirRealPath) {
 }
 
 TEST(Module, FileNameIsCutToTheBuffer) {
-    const std::string path = tvx::moduleFileName(nullptr);
+    const std::string path = tvx::driveName(tvx::moduleFileName(nullptr));
     char buffer[MAX_PATH * 4] = "";
     EXPECT_EQ(GetModuleFileNameA(nullptr, buffer, sizeof buffer), path.size());
     EXPECT_EQ(buffer, path);
