@@ -7,6 +7,7 @@
 #include "platform/afx/Thread.h"
 #include "platform/base/List.h"
 #include "platform/win/ExtensionModule.h"
+#include "platform/win/Registry.h"
 
 class CDocManager;
 class CDocTemplate;
@@ -76,9 +77,39 @@ public:
     /// when the application is to end.
     BOOL ProcessShellCommand(CCommandLineInfo& info);
 
+    /// Settings. Each is an entry of a section of the application's part of the user's settings, which is the key
+    /// "Software\<maker>\<profile name>", or "Software\<profile name>" before SetRegistryKey was called. Code that sets
+    /// m_pszProfileName for a while reaches the settings of that name. Nothing is kept in memory: what another process
+    /// writes is seen by the next call. docs/settings.md tells where the file is.
+    /// @{
+
     /// Makes `key` the maker's part of the settings; the application's part is its program name.
     void SetRegistryKey(LPCSTR key);
     void SetRegistryKey(UINT id);
+
+    /// The number of an entry, or `defaultValue` where there is no entry or it is no number.
+    virtual UINT GetProfileInt(LPCSTR section, LPCSTR entry, int defaultValue);
+    /// The text of an entry, or `defaultValue` (null: the empty text) where there is no entry or it is no text.
+    virtual CString GetProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR defaultValue = nullptr);
+    CString GetProfileString(LPCSTR section, LPCSTR entry, LPCSTR defaultValue = nullptr) {
+        return GetProfileStringA(section, entry, defaultValue);
+    }
+    /// The bytes of an entry.
+    /// @param data  receives a copy, which the caller frees with delete[]; null where the call fails
+    /// @return whether there is such an entry of bytes
+    virtual BOOL GetProfileBinary(LPCSTR section, LPCSTR entry, LPBYTE* data, UINT* size);
+    /// Writes a number. FALSE when that failed, as in the other calls that write.
+    virtual BOOL WriteProfileInt(LPCSTR section, LPCSTR entry, int value);
+    /// Writes a text.
+    /// @param entry  null removes the whole section
+    /// @param value  null removes the entry
+    virtual BOOL WriteProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR value);
+    BOOL WriteProfileString(LPCSTR section, LPCSTR entry, LPCSTR value) {
+        return WriteProfileStringA(section, entry, value);
+    }
+    /// Writes bytes.
+    virtual BOOL WriteProfileBinary(LPCSTR section, LPCSTR entry, LPBYTE data, UINT size);
+    /// @}
 
     /// Documents.
     /// @{
@@ -144,6 +175,8 @@ private:
     friend int AfxWinMain(int argc, char** argv);
     void rememberCommandLine(int argc, char** argv);
     void DeleteDocManager();
+    CString profilePath() const;
+    LSTATUS writeEntry(LPCSTR section, LPCSTR entry, DWORD type, std::string_view bytes);
     int m_waitDepth = 0;
 };
 

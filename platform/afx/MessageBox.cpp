@@ -4,6 +4,7 @@
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/Window.h"
 #include "platform/base/Exception.h"
+#include "platform/win/RegistryNotice.h"
 
 #include <QApplication>
 #include <QKeyEvent>
@@ -169,9 +170,20 @@ int reportException(const CString& text, UINT type, UINT fallback) {
     return text.IsEmpty() && fallback != 0 ? AfxMessageBox(fallback, type) : AfxMessageBox(text.GetString(), type);
 }
 
+/// Tells about the file of the settings in a message box. Only the user-interface thread can show one, and only while
+/// the application lives.
+void tellAboutSettings(const std::string& text) {
+    if (AfxGetApp() != nullptr && AfxGetThread() != nullptr) {
+        AfxMessageBox(text.c_str(), MB_OK | MB_ICONEXCLAMATION);
+    } else {
+        std::fprintf(stderr, "%s\n", text.c_str());
+    }
+}
+
 struct ReporterEntry {
     ReporterEntry() {
         tvx::setExceptionReporter(&reportException);
+        tvx::setRegistryNotice(&tellAboutSettings);
     }
 } const reporterEntry;
 

@@ -1,0 +1,67 @@
+#pragma once
+
+#include "afxwin.h"
+#include "s/Export.h"
+
+/// The settings of an application and of the family. There are no objects of this class.
+///
+/// Values are texts below "Software" of the current user's settings:
+///
+/// | where | what |
+/// |---|---|
+/// | `<registry key>\<title>\<section>` | the application's own, by ReadString and WriteString |
+/// | `Tarvex\Common` | what all applications of the family share |
+/// | `Tarvex\<application name>\FirstInstance` | which process is the first instance of an application |
+///
+/// The registry key and the title are those of Gui_WinApp::SetRegistryKey. Each operation reads or writes the store
+/// itself; what another process writes is there at once. docs/settings.md has the whole layout.
+///
+/// @code
+/// CString unit = "mm";
+/// Gui_Profile::ReadString(unit, "Unit", nullptr); // stays "mm" where nothing is stored
+/// Gui_Profile::WriteString("inch", "Unit", nullptr);
+/// @endcode
+class GUI_API Gui_Profile {
+public:
+    Gui_Profile& operator=(const Gui_Profile&) = default;
+
+    /// Reads a text of the running application.
+    /// @param value    receives the text; unchanged when there is none
+    /// @param section  null: "Settings"
+    /// @return 1, or 0 when there is no text or an empty one
+    static int ReadString(CString& value, const char* entry, const char* section);
+    /// Writes a text of the running application. Nothing is reported when that fails.
+    /// @param value    null removes the entry
+    /// @param entry    null removes the whole section
+    /// @param section  null: "Settings"
+    static void WriteString(const char* value, const char* entry, const char* section);
+
+    /// Where an application that keeps settings for each version of a suite is to keep them: a path like
+    /// "NEV\10.1\board" below a key that the caller chooses. No key is touched.
+    ///
+    /// | suite | application | version | path |
+    /// |---|---|---|---|
+    /// | no | no | no | `Common` |
+    /// | no | no | yes | `Common\<version>` |
+    /// | no | yes | no | `Common\<application>` |
+    /// | no | yes | yes | `Common\<version>\<application>` |
+    /// | yes | no | yes | `NEV\<version>\Common` |
+    /// | yes | yes | yes | `NEV\<version>\<application>` |
+    /// | yes | any | no | empty |
+    ///
+    /// The version is the first four characters of the installation's ("10.1" without one).
+    static CString GetKeyLocation(CString appName, bool underSuite, bool perApplication, bool versioned);
+
+    /// Writes a number of the record of an application's first instance. Nothing is reported when that fails.
+    /// @param appName    the application's name as given to the constructor of Gui_WinApp
+    /// @param valueName  "ProcessID" or "WindowID"
+    /// @param value      0 for none; 32 bits are kept
+    static void WriteFirstInstanceInfo(const char* appName, const char* valueName, unsigned long value);
+    /// Reads a number of that record. Makes the record's key when it is missing.
+    /// @param value  receives the number (0 means none); unchanged when there is none that can be read
+    /// @return 1, or 0 when nothing, no number or too long a text is stored
+    static int ReadFirstInstanceInfo(const char* appName, const char* valueName, unsigned long& value);
+
+private:
+    Gui_Profile() = default;
+};

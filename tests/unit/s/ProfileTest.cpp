@@ -1,0 +1,170 @@
+#include "s/Profile.h"
+
+#include "TestApp.h"
+#include "platform/win/detail/RegistryStore.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+
+namespace {
+
+/// A store and an installation of its own, and an application that has named itself.
+class Profile : public ::testing::Test {
+protected:
+    void SetUp() override {
+        std::string name = (std::filesystem::temp_directory_path() / "profile.XXXXXX").string();
+        m_folder = mkdtemp(name.data());
+        tvx::registry::closeStores();
+        setenv("TVX_REGISTRY", (m_folder / "registry.db").c_str(), 1);
+        setenv("TARVEX", m_folder.c_str(), 1);
+        unsetenv("MYTARVEX");
+        theApp.SetRegistryKey("Maker");
+    }
+    void TearDown() override {
+        tvx::registry::closeStores();
+        std::filesystem::remove_all(m_folder);
+    }
+    void install(const char* version) const {
+        std::ofstream(m_folder / "fileset.txt") << "Mon Jan 5 10:00:00 UTC 2026::version=" << version << "\n";
+    }
+    static std::string stored(const std::string& path, const char* name) {
+        HKEY key = nullptr;
+        if (RegOpenKeyExA(HKEY_CURRENT_USER, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS)
+            return "<no key>";
+        char text[100] = {};
+        DWORD size = sizeof text;
+        DWORD type = REG_NONE;
+        const LSTATUS result = RegQueryValueExA(key, name, nullptr, &type, reinterpret_cast<BYTE*>(text), &size);
+        RegCloseKey(key);
+        return result != ERROR_SUCCESS ? "<no value>" : type != REG_SZ ? "<no text>" : text;
+    }
+    static std::string applicationKey(const char* section) {
+        return std::string("Software\\Maker\\") + theApp.m_pszProfileName + "\\" + section;
+    }
+
+    std::filesystem::path m_folder;
+};
+
+TEST_F(Profile, KeepsTextsBelowRegistryKeyTitleAndSection) {
+    Gui_Profile::WriteString("inch", "Unit", nullptr);
+    Gui_Profile::WriteString("mm", "Unit", "View");
+    EXPECT_EQ(stored(applicationKey("Settings"), "Unit"), "inch");
+    EXPECT_EQ(stored(applicationKey("View"), "Unit"), "mm");
+    CString value = "cm";
+    EXPECT_EQ(Gui_Profile::ReadString(value, "Unit", nullptr), 1);
+    EXPECT_EQ(value, "inch");
+}
+
+TEST_F(Profile, LeavesTheVariableAloneWhereThereIsNoText) {
+    CString value = "cm";
+    EXPECT_EQ(Gui_Profile::ReadString(value, "Unit", nullptr), 0);
+    Gui_Profile::WriteString("", "Unit", nullptr);
+    EXPECT_EQ(stored(applicationKey("Settings"), "Unit"), "");
+    EXPECT_EQ(Gui_Profile::ReadString(value, "Unit", nullptr), 0);
+    EXPECT_EQ(value, "cm");
+}
+
+TEST_F(Profile, RemovesEntriesAndSections) {
+    Gui_Profile::WriteString("1", "A", nullptr);
+    Gui_Profile::WriteString("2", "B", nullptr);
+    Gui_Profile::WriteString(nullptr, "A", nullptr);
+    EXPECT_EQ(stored(applicationKey("Settings"), "A"), "<no value>");
+    EXPECT_EQ(stored(applicationKey("Settings"), "B"), "2");
+    Gui_Profile::WriteString("ignored", nullptr, nullptr);
+    EXPECT_EQ(stored(applicationKey("Settings"), "B"), "<no key>");
+}
+
+TEST_F(Profile, ReachesAnotherProfileWhileTheApplicationHasItsName) {
+    const LPCSTR own = theApp.m_pszProfileName;
+    theApp.m_pszProfileName = "Common";
+    Gui_Profile::WriteString("1", "AlwayOnWeb", nullptr);
+    theApp.m_pszProfileName = own;
+    EXPECT_EQ(stored("Software\\Maker\\Common\\Settings", "AlwayOnWeb"), "1");
+    CString value;
+    EXPECT_EQ(Gui_Profile::ReadString(value, "AlwayOnWeb", nullptr), 0);
+}
+
+TEST_F(Profile, KeepsNumbersAndBytesOfHosts) {
+    EXPECT_EQ(theApp.GetProfileInt("View", "Zoom", -7), static_cast<UINT>(-7));
+    EXPECT_TRUE(theApp.WriteProfileInt("View", "Zoom", -3));
+    EXPECT_EQ(static_cast<int>(theApp.GetProfileInt("View", "Zoom", 1)), -3);
+    EXPECT_EQ(theApp.GetProfileString("View", "Zoom", "no text"), "no text");
+    std::string written(300, '\0');
+    written.back() = 'x';
+    EXPECT_TRUE(theApp.WriteProfileBinary("View", "Bytes", reinterpret_cast<BYTE*>(written.data()), 300));
+    LPBYTE bytes = nullptr;
+    UINT size = 0;
+    ASSERT_TRUE(theApp.GetProfileBinary("View", "Bytes", &bytes, &size));
+    EXPECT_EQ(std::string(reinterpret_cast<char*>(bytes), size), written);
+    delete[] bytes;
+    EXPECT_FALSE(theApp.GetProfileBinary("View", "Zoom", &bytes, &size));
+    const std::string text(5000, 'a');
+    EXPECT_TRUE(theApp.WriteProfileString("View", "Long", text.c_str()));
+    EXPECT_EQ(theApp.GetProfileString("View", "Long"), text.c_str());
+}
+
+TEST_F(Profile, ComposesLocationsOfKeys) {
+    const auto location = [](bool suite, bool application, bool versioned) {
+        return std::string(Gui_Profile::GetKeyLocation("board", suite, application, versioned));
+    };
+    install("12.34.5");
+    EXPECT_EQ(location(false, false, false), "Common");
+    EXPECT_EQ(location(false, false, true), "Common\\12.3");
+    EXPECT_EQ(location(false, true, false), "Common\\board");
+    EXPECT_EQ(location(false, true, true), "Common\\12.3\\board");
+    EXPECT_EQ(location(true, false, true), "NEV\\12.3\\Common");
+    EXPECT_EQ(location(true, true, true), "NEV\\12.3\\board");
+    EXPECT_EQ(location(true, true, false), "");
+    EXPECT_EQ(location(true, false, false), "");
+    EXPECT_EQ(stored("Common", ""), "<no key>");
+}
+
+TEST_F(Profile, TakesTenOneForAVersionThatNobodyKnows) {
+    EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\10.1");
+    install("9");
+    EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\9");
+}
+
+TEST_F(Profile, KeepsARecordOfFirstInstances) {
+    unsigned long number = 7;
+    EXPECT_EQ(Gui_Profile::ReadFirstInstanceInfo("board", "ProcessID", number), 0);
+    EXPECT_EQ(stored("Software\\Tarvex\\board\\FirstInstance", "ProcessID"), "<no value>") << "the key is made";
+    Gui_Profile::WriteFirstInstanceInfo("board", "ProcessID", 4294967295);
+    EXPECT_EQ(stored("Software\\Tarvex\\board\\FirstInstance", "ProcessID"), "-1");
+    EXPECT_EQ(Gui_Profile::ReadFirstInstanceInfo("board", "ProcessID", number), 1);
+    EXPECT_EQ(number, 4294967295u);
+    number = 7;
+    EXPECT_EQ(Gui_Profile::ReadFirstInstanceInfo("notes", "ProcessID", number), 0);
+    EXPECT_EQ(number, 7u);
+}
+
+TEST_F(Profile, ReadsNumbersOfOthersAsFarAsTheyAreNumbers) {
+    const auto read = [](const std::string& text, LONG* number) {
+        HKEY key = nullptr;
+        RegCreateKeyExA(HKEY_CURRENT_USER, "Software\\Tarvex\\board\\FirstInstance", 0, nullptr, 0, KEY_WRITE, nullptr,
+                        &key, nullptr);
+        RegSetValueExA(key, "WindowID", 0, REG_SZ, reinterpret_cast<const BYTE*>(text.c_str()),
+                       static_cast<DWORD>(text.size() + 1));
+        RegCloseKey(key);
+        unsigned long value = 7;
+        const int result = Gui_Profile::ReadFirstInstanceInfo("board", "WindowID", value);
+        *number = static_cast<LONG>(value);
+        return result;
+    };
+    LONG number = 0;
+    EXPECT_EQ(read("12abc", &number), 0);
+    EXPECT_EQ(number, 7);
+    EXPECT_EQ(read("  12", &number), 1);
+    EXPECT_EQ(number, 12);
+    EXPECT_EQ(read("", &number), 1);
+    EXPECT_EQ(number, 0);
+    EXPECT_EQ(read("0000000000000000012", &number), 1);
+    EXPECT_EQ(number, 12);
+    EXPECT_EQ(read("00000000000000000012", &number), 0) << "twenty characters do not fit";
+    EXPECT_EQ(number, 7);
+}
+
+} // namespace
