@@ -128,6 +128,18 @@ Query Connection::query(Sql sql) {
     return Query(statement);
 }
 
+void Connection::forEachRow(const char* sql, const std::function<void(const Query& row)>& take) {
+    sqlite3_stmt* statement = nullptr;
+    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK)
+        return;
+    {
+        Query rows(statement);
+        while (rows.step() == SQLITE_ROW)
+            take(rows);
+    }
+    sqlite3_finalize(statement);
+}
+
 int Query::step() {
     return m_statement != nullptr ? sqlite3_step(m_statement) : SQLITE_SCHEMA;
 }

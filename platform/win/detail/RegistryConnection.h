@@ -4,6 +4,7 @@
 
 #include <array>
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <sqlite3.h>
 #include <string>
@@ -36,6 +37,8 @@ class Query {
 public:
     explicit Query(sqlite3_stmt* statement) : m_statement(statement) {}
     ~Query() {
+        if (m_statement == nullptr)
+            return; // could not be prepared: a file of another version
         sqlite3_reset(m_statement);
         sqlite3_clear_bindings(m_statement);
     }
@@ -79,6 +82,8 @@ public:
     /// Asks for one text; empty when that fails.
     [[nodiscard]] std::string text(const char* sql);
     [[nodiscard]] Query query(Sql sql);
+    /// Hands out the rows of a question up to its end or the first that cannot be read.
+    void forEachRow(const char* sql, const std::function<void(const Query& row)>& take);
 
     /// Result of the last call that failed, with its details.
     [[nodiscard]] int error() const {

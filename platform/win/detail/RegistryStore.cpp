@@ -51,8 +51,7 @@ DWORD Store::change(Operation operation) {
 }
 
 /// Does several changes, all or none.
-template <typename Operation>
-DWORD Store::together(Operation operation) {
+DWORD Store::together(const std::function<DWORD()>& operation) {
     if (m_inTransaction)
         return operation();
     DWORD result = failed(m_connection->query(Sql::begin).step());
@@ -86,14 +85,14 @@ Store::Reply Store::remembered(std::string_view subject, std::string_view detail
     return reply;
 }
 
-Store::Reply Store::askKey(const KeyPath& key) {
-    const int step = m_connection->query(Sql::findKey).bind(key.folded).step();
+Store::Reply Store::askKey(std::string_view path) {
+    const int step = m_connection->query(Sql::findKey).bind(path).step();
     return {step == SQLITE_DONE ? ERROR_FILE_NOT_FOUND : failed(step), nullptr};
 }
 
-Store::Reply Store::askValue(const KeyPath& key, std::string_view folded) {
+Store::Reply Store::askValue(std::string_view path, std::string_view folded) {
     Query query = m_connection->query(Sql::readValue);
-    const int step = query.bind(key.folded).bind(folded).step();
+    const int step = query.bind(path).bind(folded).step();
     if (step == SQLITE_ROW) {
         return {ERROR_SUCCESS,
                 std::make_shared<Value>(Value{std::string(query.bytes(0)), static_cast<DWORD>(query.number(1)),
@@ -101,7 +100,7 @@ Store::Reply Store::askValue(const KeyPath& key, std::string_view folded) {
     }
     if (step != SQLITE_DONE)
         return {failed(step), nullptr};
-    const DWORD keyResult = askKey(key).result;
+    const DWORD keyResult = askKey(path).result;
     return {keyResult == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED
             : keyResult == 0                  ? ERROR_FILE_NOT_FOUND
                                               : keyResult,
@@ -113,13 +112,14 @@ DWORD Store::findKey(const KeyPath& key) {
         return ERROR_SUCCESS; // a root is there before its file
     // No value has a zero in its name, so this cannot be mistaken for one.
     constexpr std::string_view noValue("\0", 1);
-    return run(Intent::read, [&] { return remembered(key.folded, noValue, [&] { return askKey(key); }).result; });
+    return run(Intent::read,
+               [&] { return remembered(key.folded, noValue, [&] { return askKey(key.folded); }).result; });
 }
 
 DWORD Store::readValue(const KeyPath& key, std::string_view name, std::shared_ptr<const Value>& value) {
     const std::string folded = text::foldCase(name);
     return run(Intent::read, [&] {
-        Reply reply = remembered(key.folded, folded, [&] { return askValue(key, folded); });
+        Reply reply = remembered(key.folded, folded, [&] { return askValue(key.folded, folded); });
         value = std::move(reply.value);
         return reply.result;
     });
@@ -174,16 +174,18 @@ DWORD Store::removeKey(const KeyPath& key) {
 
 DWORD Store::writeValue(const KeyPath& key, const Value& value) {
     const std::string folded = text::foldCase(value.name);
-    return change([&] {
-        const int step = m_connection->query(Sql::writeValue)
-                             .bind(key.folded)
-                             .bind(folded)
-                             .bind(value.name)
-                             .bind(std::int64_t{value.type})
-                             .bindBytes(value.data)
-                             .step();
-        return step == SQLITE_DONE && m_connection->changes() == 0 ? ERROR_KEY_DELETED : failed(step);
-    });
+    return change([&] { return insertValue(key.folded, folded, value); });
+}
+
+DWORD Store::insertValue(std::string_view path, std::string_view folded, const Value& value) {
+    const int step = m_connection->query(Sql::writeValue)
+                         .bind(path)
+                         .bind(folded)
+                         .bind(value.name)
+                         .bind(std::int64_t{value.type})
+                         .bindBytes(value.data)
+                         .step();
+    return step == SQLITE_DONE && m_connection->changes() == 0 ? ERROR_KEY_DELETED : failed(step);
 }
 
 DWORD Store::deleteValue(const KeyPath& key, std::string_view name) {
@@ -304,10 +306,8 @@ DWORD Store::failed(int result) {
 }
 
 void Store::tell(Fault fault, std::string text) {
-    bool& isTold = m_told[static_cast<std::size_t>(fault)];
-    if (!isTold)
+    if (m_told.emplace(fault, m_name).second)
         m_notices.push_back(std::move(text));
-    isTold = true;
 }
 
 std::vector<std::string> Store::takeNotices() {

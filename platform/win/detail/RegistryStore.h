@@ -5,13 +5,16 @@
 #include "platform/win/detail/RegistryFile.h"
 #include "platform/win/detail/RegistryPath.h"
 
-#include <array>
 #include <atomic>
+#include <cstdint>
+#include <functional>
 #include <memory>
 #include <mutex>
+#include <set>
 #include <string>
 #include <thread>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 namespace tvx::registry {
@@ -91,8 +94,8 @@ private:
     enum class Intent { read, write };
     /// How the open file can be used.
     enum class Mode { closed, shared, readOnly, copy };
-    /// Faults that the user is told once about.
-    enum class Fault { unusable, newer, damaged, notSaved, count_ };
+    /// Faults that last, so that the user is told once about each.
+    enum class Fault { unusable, newer, notSaved };
 
     /// What a question was answered with.
     struct Reply {
@@ -106,12 +109,12 @@ private:
     DWORD run(Intent intent, Operation operation);
     template <typename Operation>
     DWORD change(Operation operation);
-    template <typename Operation>
-    DWORD together(Operation operation);
+    DWORD together(const std::function<DWORD()>& operation);
     template <typename Question>
     Reply remembered(std::string_view subject, std::string_view detail, Question question);
-    Reply askKey(const KeyPath& key);
-    Reply askValue(const KeyPath& key, std::string_view folded);
+    Reply askKey(std::string_view path);
+    Reply askValue(std::string_view path, std::string_view folded);
+    DWORD insertValue(std::string_view path, std::string_view folded, const Value& value);
     DWORD addLevels(const KeyPath& key);
     DWORD removeKey(const KeyPath& key);
     /// The replies to what was asked since anybody's last write; null when that cannot be told cheaply.
@@ -122,11 +125,12 @@ private:
     DWORD openFile();
     DWORD connect(const std::string& file);
     DWORD checkSchema();
-    DWORD checkVersion();
+    [[nodiscard]] bool isOfNewerVersion(std::int64_t version);
     DWORD initialise();
     DWORD openCopy(DWORD reason);
     DWORD createFile();
     DWORD replaceDamaged();
+    std::size_t takeOver(const std::string& damaged);
     void chooseJournal();
     [[nodiscard]] bool isEmptyDatabase();
     [[nodiscard]] bool isCurrent() const;
@@ -149,7 +153,7 @@ private:
     std::unique_ptr<FileCopy> m_copy;
     std::unique_ptr<Memory> m_memory;
     std::vector<std::string> m_notices;
-    std::array<bool, static_cast<std::size_t>(Fault::count_)> m_told{};
+    std::set<std::pair<Fault, std::string>> m_told; ///< with the file's name
 };
 
 /// Closes the files of all hives, as at the end of the process. They are opened again when needed.

@@ -171,38 +171,32 @@ DWORD Store::connect(const std::string& file) {
 
 DWORD Store::checkSchema() {
     const auto id = m_connection->number("PRAGMA application_id");
-    if (!id)
+    const auto version = id ? m_connection->number("PRAGMA user_version") : std::nullopt;
+    if (!version)
         return failed(m_connection->error());
-    m_mode = m_connection->isReadOnly() || m_hive == Hive::machine ? Mode::readOnly : Mode::shared;
-    if (m_copy != nullptr)
-        m_mode = Mode::copy;
-    if (m_mode == Mode::shared)
-        chooseJournal();
-    if (*id == 0 && isEmptyDatabase()) {
-        if (const DWORD result = initialise(); result != ERROR_SUCCESS)
-            return result;
-    } else if (*id != applicationId) {
+    const bool isNew = *id == 0 && isEmptyDatabase();
+    if (*id != applicationId && !isNew) {
         tell(Fault::unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
         return ERROR_BAD_FORMAT;
     }
-    return checkVersion();
+    const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::machine || isOfNewerVersion(*version);
+    m_mode = m_copy != nullptr ? Mode::copy : isForReading ? Mode::readOnly : Mode::shared;
+    if (m_mode == Mode::shared)
+        chooseJournal();
+    return isNew ? initialise() : ERROR_SUCCESS;
+}
+
+bool Store::isOfNewerVersion(std::int64_t version) {
+    if (version <= schemaVersion)
+        return false;
+    tell(Fault::newer, "The settings in " + m_file +
+                           " were written by a newer version of this software. They are read as far as possible and "
+                           "not changed.");
+    return true;
 }
 
 bool Store::isEmptyDatabase() {
     return m_connection->number("SELECT count(*) FROM sqlite_schema") == 0;
-}
-
-DWORD Store::checkVersion() {
-    const auto version = m_connection->number("PRAGMA user_version");
-    if (!version)
-        return failed(m_connection->error());
-    if (*version <= schemaVersion)
-        return ERROR_SUCCESS;
-    tell(Fault::newer, "The settings in " + m_file +
-                           " were written by a newer version of this software. They are read as far as possible and "
-                           "not changed.");
-    m_mode = m_mode == Mode::copy ? Mode::copy : Mode::readOnly;
-    return ERROR_SUCCESS;
 }
 
 void Store::chooseJournal() {
@@ -231,6 +225,8 @@ DWORD Store::openCopy(DWORD reason) {
     m_writeError = reason;
     m_stamp = stampOf(m_file);
     m_logStamp = stampOf(m_file + "-wal");
+    if (m_stamp.size == 0)
+        return reason; // there is nothing to be read
     m_copy = std::make_unique<FileCopy>(m_file);
     if (!m_copy->name().empty() && connect(m_copy->name()) == ERROR_SUCCESS && isCurrent())
         return ERROR_SUCCESS;
@@ -243,16 +239,21 @@ DWORD Store::replaceDamaged() {
     const FileIdentity damaged = m_identity;
     const bool isOurs = m_hive == Hive::user && m_copy == nullptr;
     close(Log::keep);
-    const FolderLock lock(m_file);
-    if (isOurs && lock.isHeld() && identityOf(m_name) != damaged)
-        return ERROR_SUCCESS; // another process has set it aside already
-    const auto aside = isOurs && lock.isHeld() ? setAside(m_file) : std::nullopt;
+    std::optional<std::string> aside;
+    if (isOurs) {
+        const FolderLock lock(m_file);
+        if (lock.isHeld() && identityOf(m_name) != damaged)
+            return ERROR_SUCCESS; // another process has set it aside already
+        aside = lock.isHeld() ? setAside(m_file) : std::nullopt;
+    }
     if (!aside) {
         tell(Fault::unusable, "The settings cannot be used: " + m_file + " is damaged.");
         return ERROR_ACCESS_DENIED;
     }
-    tell(Fault::damaged, "The file of the settings, " + m_file + ", is damaged. It was kept as " + *aside +
-                             ", and new settings are begun.");
+    const std::size_t saved = takeOver(*aside);
+    m_notices.push_back("The file of your settings, " + m_file + ", is damaged. It was kept as " + *aside + ". " +
+                        (saved == 0 ? std::string("No setting in it could be read.")
+                                    : std::to_string(saved) + " settings in it could be read and were kept."));
     return ERROR_SUCCESS;
 }
 

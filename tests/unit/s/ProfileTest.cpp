@@ -5,9 +5,11 @@
 
 #include <gtest/gtest.h>
 
+#include <chrono>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <string>
 
 namespace {
 
@@ -28,7 +30,12 @@ protected:
         std::filesystem::remove_all(m_folder);
     }
     void install(const char* version) const {
-        std::ofstream(m_folder / "fileset.txt") << "Mon Jan 5 10:00:00 UTC 2026::version=" << version << "\n";
+        const std::filesystem::path file = m_folder / "fileset.txt";
+        std::ofstream(file) << "Mon Jan 5 10:00:00 UTC 2026::version=" << version << "\n";
+        // The reader looks at a file again when it is newer than what it has read, in whole seconds.
+        static auto newest = std::filesystem::file_time_type::clock::now();
+        newest += std::chrono::seconds(10);
+        std::filesystem::last_write_time(file, newest);
     }
     static std::string stored(const std::string& path, const char* name) {
         HKEY key = nullptr;

@@ -1,0 +1,313 @@
+// Stores that something is wrong with.
+#include "platform/win/Registry.h"
+#include "platform/win/RegistryNotice.h"
+
+#include "ChildProcess.h"
+#include "RegistrySandbox.h"
+
+#include <algorithm>
+#include <fstream>
+#include <iterator>
+#include <memory>
+#include <sched.h>
+#include <sqlite3.h>
+#include <sys/mount.h>
+#include <sys/stat.h>
+#include <vector>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+class RegistryFaults : public ::testing::Test {
+protected:
+    static constexpr const char* path = "Software\\Tarvex";
+    static constexpr uid_t nobody = 65534;
+
+    RegistryFaults() {
+        notices.clear();
+        tvx::setRegistryNotice([](const std::string& text) { notices.push_back(text); });
+    }
+    ~RegistryFaults() override {
+        if (geteuid() != getuid() && seteuid(getuid()) != 0)
+            std::abort();
+        tvx::setRegistryNotice(nullptr);
+    }
+
+    static std::string contents(const fs::path& file) {
+        std::ifstream stream(file, std::ios::binary);
+        return {std::istreambuf_iterator<char>(stream), {}};
+    }
+    void put(const std::string& bytes) const {
+        tvx::registry::closeStores();
+        fs::create_directories(m_sandbox.file.parent_path());
+        std::ofstream(m_sandbox.file, std::ios::binary) << bytes;
+    }
+    static void run(const fs::path& file, const char* sql) {
+        tvx::registry::closeStores();
+        sqlite3* database = nullptr;
+        ASSERT_EQ(sqlite3_open(file.c_str(), &database), SQLITE_OK);
+        EXPECT_EQ(sqlite3_exec(database, sql, nullptr, nullptr, nullptr), SQLITE_OK);
+        sqlite3_close(database);
+    }
+    [[nodiscard]] std::vector<fs::path> setAside() const {
+        std::vector<fs::path> found;
+        for (const auto& entry : fs::directory_iterator(m_sandbox.file.parent_path()))
+            if (entry.path().filename().string().starts_with("registry-damaged-") && entry.path().extension() == ".db")
+                found.push_back(entry.path());
+        return found;
+    }
+    /// Goes on as a user whom the modes of files hold back, where the tests run as one whom they do not.
+    void becomeOrdinary() const {
+        tvx::registry::closeStores();
+        if (geteuid() != 0)
+            return;
+        for (fs::path folder = m_sandbox.folder; folder != "/"; folder = folder.parent_path())
+            fs::permissions(folder, fs::perms::others_exec, fs::perm_options::add);
+        for (const auto& entry : fs::recursive_directory_iterator(m_sandbox.folder))
+            ASSERT_EQ(chown(entry.path().c_str(), nobody, nobody), 0);
+        ASSERT_EQ(chown(m_sandbox.folder.c_str(), nobody, nobody), 0);
+        ASSERT_EQ(seteuid(nobody), 0);
+    }
+
+    RegistrySandbox m_sandbox;
+    inline static std::vector<std::string> notices;
+};
+
+TEST_F(RegistryFaults, DamagedFileIsSetAsideAndToldOnce) {
+    for (const std::string& bytes : {std::string(10000, 'x'), std::string("short")}) {
+        put(bytes);
+        notices.clear();
+        RegistrySandbox::use(m_sandbox.file);
+        const auto before = setAside().size();
+        EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+        const TestKey key(path);
+        EXPECT_EQ(key.write("a", "1"), 0);
+        EXPECT_EQ(key.read("a"), "1");
+        ASSERT_EQ(setAside().size(), before + 1);
+        std::vector<std::string> kept;
+        for (const fs::path& file : setAside())
+            kept.push_back(contents(file));
+        EXPECT_TRUE(std::ranges::find(kept, bytes) != kept.end());
+    }
+}
+
+TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
+    {
+        const TestKey key(path);
+        tvx::RegistryTransaction transaction;
+        ASSERT_EQ(transaction.begin(), 0);
+        for (int i = 0; i < 3000; ++i)
+            key.write(std::to_string(10000 + i).c_str(), std::string(50, 'v'));
+        ASSERT_EQ(transaction.commit(), 0);
+    }
+    tvx::registry::closeStores();
+    const std::string whole = contents(m_sandbox.file);
+    std::string damaged = whole;
+    const std::size_t middle = whole.size() / 2 / 4096 * 4096;
+    damaged.replace(middle, 4096, std::string(4096, '\xA5'));
+    put(damaged);
+    const TestKey key(path, TestKey::Way::open);
+    ASSERT_EQ(key.result, 0);
+    int found = 0;
+    for (int i = 0; i < 3000; ++i)
+        found += key.read(std::to_string(10000 + i).c_str()) == std::string(50, 'v') ? 1 : 0;
+    EXPECT_GT(found, 2500) << "only what was on the damaged page is lost";
+    EXPECT_LT(found, 3000);
+    EXPECT_EQ(notices.size(), 1u);
+    ASSERT_EQ(setAside().size(), 1u);
+    EXPECT_TRUE(contents(setAside().front()) == damaged);
+    EXPECT_EQ(key.write("a", "1"), 0);
+}
+
+TEST_F(RegistryFaults, OneOfSeveralProcessesSetsADamagedFileAside) {
+    put(std::string(5000, 'x'));
+    std::vector<std::unique_ptr<ChildProcess>> children;
+    for (int i = 0; i < 4; ++i)
+        children.push_back(std::make_unique<ChildProcess>([i](ChildProcess& parent) {
+            (void)parent.receive();
+            TestKey(path).write(std::to_string(i).c_str(), "1");
+            parent.send(static_cast<int>(notices.size()));
+        }));
+    for (const auto& child : children)
+        child->send(0);
+    int told = 0;
+    for (const auto& child : children)
+        told += child->receive();
+    EXPECT_EQ(told, 1);
+    EXPECT_EQ(setAside().size(), 1u);
+    for (int i = 0; i < 4; ++i)
+        EXPECT_EQ(TestKey(path).read(std::to_string(i).c_str()), "1");
+}
+
+TEST_F(RegistryFaults, LinkStaysALink) {
+    const fs::path target = m_sandbox.folder / "elsewhere.db";
+    fs::create_directories(m_sandbox.file.parent_path());
+    fs::create_symlink("../elsewhere.db", m_sandbox.file);
+    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND}) << "leads nowhere so far";
+    EXPECT_EQ(TestKey(path).write("a", "1"), 0);
+    EXPECT_TRUE(fs::exists(target));
+    tvx::registry::closeStores();
+    std::ofstream(target, std::ios::binary) << std::string(3000, 'x');
+    EXPECT_EQ(TestKey(path).write("a", "2"), 0);
+    EXPECT_TRUE(fs::is_symlink(m_sandbox.file));
+    EXPECT_FALSE(fs::is_symlink(target));
+    EXPECT_EQ(TestKey(path).read("a"), "2");
+    EXPECT_EQ(notices.size(), 1u);
+}
+
+TEST_F(RegistryFaults, LinkIntoAMissingFolderIsLeftAlone) {
+    fs::create_directories(m_sandbox.file.parent_path());
+    fs::create_symlink(m_sandbox.folder / "unplugged" / "registry.db", m_sandbox.file);
+    EXPECT_NE(TestKey(path).result, 0);
+    EXPECT_EQ(TestKey(path).read("a"), "<6>");
+    EXPECT_FALSE(fs::exists(m_sandbox.folder / "unplugged"));
+    EXPECT_TRUE(fs::is_symlink(m_sandbox.file));
+    EXPECT_EQ(notices.size(), 1u);
+}
+
+TEST_F(RegistryFaults, FolderInThePlaceOfTheFile) {
+    fs::create_directories(m_sandbox.file / "inside");
+    EXPECT_EQ(TestKey(path).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_TRUE(fs::exists(m_sandbox.file / "inside"));
+    EXPECT_EQ(notices.size(), 1u);
+    fs::remove_all(m_sandbox.file);
+    EXPECT_EQ(TestKey(path).write("a", "1"), 0) << "once it is gone";
+}
+
+TEST_F(RegistryFaults, NewerVersionIsReadAndNotChanged) {
+    TestKey(path).write("a", "1");
+    run(m_sandbox.file, "PRAGMA user_version = 2; PRAGMA journal_mode = DELETE");
+    const std::string before = contents(m_sandbox.file);
+    const TestKey key(path);
+    EXPECT_EQ(key.read("a"), "1");
+    EXPECT_EQ(key.write("a", "2"), LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_TRUE(contents(m_sandbox.file) == before);
+    EXPECT_EQ(TestKey("Software\\Other").result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(notices.size(), 1u);
+    run(m_sandbox.file, "ALTER TABLE value RENAME TO entry");
+    EXPECT_NE(TestKey(path).read("a"), "1");
+    EXPECT_EQ(notices.size(), 1u);
+    EXPECT_EQ(setAside().size(), 0u);
+}
+
+TEST_F(RegistryFaults, FileOfAnotherProgramIsLeftAlone) {
+    put("");
+    run(m_sandbox.file, "CREATE TABLE songs (title TEXT)");
+    const std::string before = contents(m_sandbox.file);
+    EXPECT_EQ(TestKey(path).result, LSTATUS{ERROR_BAD_FORMAT});
+    EXPECT_EQ(notices.size(), 1u);
+    tvx::registry::closeStores();
+    EXPECT_TRUE(contents(m_sandbox.file) == before);
+}
+
+TEST_F(RegistryFaults, EmptyFileIsANewStore) {
+    put("");
+    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+    EXPECT_EQ(TestKey(path).write("a", "1"), 0);
+    EXPECT_TRUE(notices.empty());
+}
+
+TEST_F(RegistryFaults, ReadOnlyFileIsReadAndNobodyIsTold) {
+    TestKey(path).write("a", "1");
+    becomeOrdinary();
+    fs::permissions(m_sandbox.file, fs::perms::owner_read);
+    const TestKey key(path);
+    EXPECT_EQ(key.read("a"), "1");
+    EXPECT_EQ(key.write("a", "2"), LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey("Software\\Other").result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_TRUE(notices.empty());
+}
+
+TEST_F(RegistryFaults, ReadOnlyFolderIsReadWithWhatAKilledWriterLeft) {
+    ChildProcess writer([](ChildProcess& parent) {
+        TestKey(path).write("a", "1");
+        parent.send(0);
+        (void)parent.receive();
+    });
+    ASSERT_EQ(writer.receive(), 0);
+    writer.kill();
+    becomeOrdinary();
+    const fs::path folder = m_sandbox.file.parent_path();
+    fs::remove(m_sandbox.file.string() + "-shm");
+    fs::permissions(folder, fs::perms::owner_read | fs::perms::owner_exec);
+    const TestKey key(path);
+    EXPECT_EQ(key.read("a"), "1");
+    EXPECT_EQ(key.write("a", "2"), LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_TRUE(notices.empty());
+    fs::permissions(folder, fs::perms::owner_all);
+    EXPECT_EQ(key.write("a", "2"), 0) << "as soon as it is possible";
+    EXPECT_EQ(key.read("a"), "2");
+}
+
+TEST_F(RegistryFaults, UnreadableFileIsToldOnceAndLeftAlone) {
+    TestKey(path).write("a", "1");
+    becomeOrdinary();
+    fs::permissions(m_sandbox.file, fs::perms::none);
+    EXPECT_EQ(TestKey(path).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey(path).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(notices.size(), 1u);
+    fs::permissions(m_sandbox.file, fs::perms::owner_read | fs::perms::owner_write);
+    EXPECT_EQ(TestKey(path).read("a"), "1");
+}
+
+/// Runs on a disk of 256 KiB in a name space of its own.
+class RegistryOnFullDisk : public RegistryFaults {
+protected:
+    void SetUp() override {
+        m_disk = m_sandbox.folder / "disk";
+        fs::create_directories(m_disk);
+        if (unshare(CLONE_NEWNS) != 0 || mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
+            mount("none", m_disk.c_str(), "tmpfs", 0, "size=256k,mode=0700") != 0)
+            GTEST_SKIP() << "disks cannot be mounted here";
+        RegistrySandbox::use(m_disk / "registry.db");
+    }
+    void TearDown() override {
+        tvx::registry::closeStores();
+        umount(m_disk.c_str());
+    }
+    void fill() const {
+        std::ofstream stream(m_disk / "ballast");
+        while (stream << "x" << std::flush) {
+        }
+    }
+
+    fs::path m_disk;
+};
+
+TEST_F(RegistryOnFullDisk, WhatDoesNotFitIsToldOnceAndTheRestStays) {
+    const TestKey key(path);
+    int kept = 0;
+    while (kept < 1000 && key.write(std::to_string(kept).c_str(), std::string(2000, 'v')) == 0)
+        ++kept;
+    ASSERT_LT(kept, 1000);
+    EXPECT_EQ(key.write("another", std::string(9000, 'v')), LSTATUS{ERROR_DISK_FULL});
+    EXPECT_EQ(notices.size(), 1u);
+    for (int i = 0; i < kept; ++i)
+        EXPECT_EQ(key.read(std::to_string(i).c_str()), std::string(2000, 'v'));
+}
+
+TEST_F(RegistryOnFullDisk, StartsOnADiskThatIsFull) {
+    TestKey(path).write("a", "1");
+    tvx::registry::closeStores();
+    fill();
+    const TestKey key(path);
+    EXPECT_EQ(key.read("a"), "1");
+    EXPECT_EQ(key.write("a", "2"), LSTATUS{ERROR_DISK_FULL});
+    EXPECT_EQ(key.read("a"), "1");
+    EXPECT_EQ(notices.size(), 1u);
+    fs::remove(m_disk / "ballast");
+    EXPECT_EQ(key.write("a", "2"), 0) << "as soon as there is room";
+    EXPECT_EQ(key.read("a"), "2");
+}
+
+TEST_F(RegistryOnFullDisk, AFileThatCannotBeBegunIsTold) {
+    fill();
+    EXPECT_NE(TestKey(path).result, 0);
+    EXPECT_EQ(notices.size(), 1u);
+    fs::remove(m_disk / "ballast");
+    EXPECT_EQ(TestKey(path).write("a", "1"), 0);
+}
+
+} // namespace

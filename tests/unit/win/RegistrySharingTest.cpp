@@ -1,0 +1,139 @@
+// Several processes with one store.
+#include "platform/win/Registry.h"
+
+#include "ChildProcess.h"
+#include "RegistrySandbox.h"
+
+#include <memory>
+#include <vector>
+
+namespace {
+
+class RegistrySharing : public ::testing::Test {
+protected:
+    static constexpr const char* path = "Software\\Tarvex\\Shared";
+
+    RegistrySandbox m_sandbox;
+};
+
+TEST_F(RegistrySharing, SeesWhatAnotherProcessWroteAtOnce) {
+    const TestKey key(path);
+    key.write("a", "0");
+    ChildProcess writer([](ChildProcess& parent) {
+        const TestKey own(path);
+        for (int i = parent.receive(); i >= 0; i = parent.receive()) {
+            own.write("a", std::to_string(i));
+            if (i % 5 == 0)
+                RegDeleteValueA(own.handle, "a");
+            if (i % 7 == 0)
+                tvx::registry::closeStores(); // as if it were another process each time
+            parent.send(i);
+        }
+    });
+    for (int i = 1; i <= 200; ++i) {
+        EXPECT_EQ(key.read("a"), (i - 1) % 5 == 0 && i > 1 ? "<2>" : std::to_string(i - 1));
+        writer.send(i);
+        ASSERT_EQ(writer.receive(), i);
+        EXPECT_EQ(key.read("a"), i % 5 == 0 ? "<2>" : std::to_string(i));
+    }
+}
+
+TEST_F(RegistrySharing, SeesThatAnotherFileHasTakenThePlace) {
+    const TestKey key(path);
+    key.write("a", "old");
+    EXPECT_EQ(key.read("a"), "old");
+    std::filesystem::remove_all(m_sandbox.file.parent_path());
+    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+    EXPECT_TRUE(ChildProcess([](ChildProcess&) { TestKey(path).write("a", "new"); }).end());
+    EXPECT_EQ(key.read("a"), "new");
+    EXPECT_EQ(key.write("a", "newer"), 0);
+    tvx::registry::closeStores();
+    EXPECT_EQ(key.read("a"), "newer");
+}
+
+TEST_F(RegistrySharing, LosesNoWriteOfSeveralProcesses) {
+    constexpr int processes = 4;
+    constexpr int writes = 150;
+    std::vector<std::unique_ptr<ChildProcess>> writers;
+    for (int process = 0; process < processes; ++process)
+        writers.push_back(std::make_unique<ChildProcess>([process](ChildProcess& parent) {
+            (void)parent.receive(); // all begin together, with a store that does not exist
+            int failures = 0;
+            for (int i = 0; i < writes; ++i) {
+                const TestKey own(std::string(path) + "\\" + std::to_string(i % 10));
+                failures += own.write((std::to_string(process) + "." + std::to_string(i)).c_str(), "x") != 0 ? 1 : 0;
+                failures += own.write("everybody's", std::string(2000, static_cast<char>('a' + process))) != 0 ? 1 : 0;
+            }
+            parent.send(failures);
+        }));
+    for (const auto& writer : writers)
+        writer->send(0);
+    for (const auto& writer : writers) {
+        EXPECT_EQ(writer->receive(), 0);
+        EXPECT_TRUE(writer->end());
+    }
+    for (int process = 0; process < processes; ++process)
+        for (int i = 0; i < writes; ++i)
+            EXPECT_EQ(TestKey(std::string(path) + "\\" + std::to_string(i % 10))
+                          .read((std::to_string(process) + "." + std::to_string(i)).c_str()),
+                      "x");
+    const std::string last = TestKey(std::string(path) + "\\0").read("everybody's");
+    EXPECT_EQ(last, std::string(2000, last[0])) << "half a value";
+}
+
+TEST_F(RegistrySharing, KeepsWhatWasWrittenBeforeAProcessWasKilled) {
+    for (int round = 0; round < 15; ++round) {
+        ChildProcess writer([](ChildProcess& parent) {
+            const TestKey own(path);
+            for (int i = 1;; ++i) {
+                if (own.write("a", std::to_string(i)) != 0 || own.write("b", std::string(i % 9000, 'b')) != 0)
+                    std::_Exit(2);
+                parent.send(i);
+            }
+        });
+        int acknowledged = 0;
+        while (acknowledged < 3 + 7 * round)
+            acknowledged = writer.receive();
+        ASSERT_GT(acknowledged, 0);
+        writer.kill();
+        for (int i = writer.receive(); i >= 0; i = writer.receive())
+            acknowledged = i;
+        const int kept = std::stoi(TestKey(path).read("a"));
+        EXPECT_GE(kept, acknowledged);
+        EXPECT_LE(kept, acknowledged + 1);
+    }
+}
+
+TEST_F(RegistrySharing, GivesUpOnAWriterThatDoesNotEnd) {
+    const TestKey key(path);
+    key.write("a", "1");
+    ChildProcess writer([](ChildProcess& parent) {
+        tvx::RegistryTransaction transaction;
+        const LSTATUS begun = transaction.begin();
+        TestKey(path).write("a", "2");
+        parent.send(begun);
+        (void)parent.receive();
+    });
+    ASSERT_EQ(writer.receive(), 0);
+    EXPECT_EQ(key.read("a"), "1") << "readers need not wait";
+    testing::internal::CaptureStderr();
+    EXPECT_EQ(key.write("a", "3"), LSTATUS{ERROR_BUSY});
+    EXPECT_NE(testing::internal::GetCapturedStderr().find("could not be saved"), std::string::npos);
+    writer.kill();
+    EXPECT_EQ(key.write("a", "3"), 0);
+    EXPECT_EQ(key.read("a"), "3");
+}
+
+TEST_F(RegistrySharing, LeavesATransactionToTheProcessThatBeganIt) {
+    const TestKey key(path);
+    tvx::RegistryTransaction transaction;
+    ASSERT_EQ(transaction.begin(), 0);
+    key.write("a", "1");
+    ChildProcess child([&](ChildProcess& parent) { parent.send(key.write("a", "2")); });
+    EXPECT_EQ(child.receive(), LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_TRUE(child.end());
+    EXPECT_EQ(transaction.commit(), 0);
+    EXPECT_EQ(key.read("a"), "1");
+}
+
+} // namespace
