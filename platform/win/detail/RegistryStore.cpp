@@ -209,13 +209,18 @@ bool follows(const Cursor& cursor, DWORD index) {
     return cursor.isSet && index == cursor.index + 1;
 }
 
+/// A root is there without a file, and empty.
+DWORD endOfMissing(DWORD result) {
+    return result == ERROR_FILE_NOT_FOUND ? ERROR_NO_MORE_ITEMS : result;
+}
+
 } // namespace
 
 DWORD Store::keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string& name) {
     const DWORD found = findKey(key);
     if (found != ERROR_SUCCESS)
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
-    return run(Intent::read, [&] {
+    const DWORD result = run(Intent::read, [&] {
         const std::string last = cursor.folded;
         Query query = m_connection->query(follows(cursor, index) ? Sql::keyAfter : Sql::keyAt);
         query.bind(key.folded);
@@ -226,13 +231,14 @@ DWORD Store::keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string&
         cursor = {index, std::string(query.bytes(1)), true};
         return ERROR_SUCCESS;
     });
+    return endOfMissing(result);
 }
 
 DWORD Store::valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& value) {
     const DWORD found = findKey(key);
     if (found != ERROR_SUCCESS)
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
-    return run(Intent::read, [&] {
+    const DWORD result = run(Intent::read, [&] {
         const std::string last = cursor.folded;
         Query query = m_connection->query(follows(cursor, index) ? Sql::valueAfter : Sql::valueAt);
         query.bind(key.folded);
@@ -243,6 +249,7 @@ DWORD Store::valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& val
         cursor = {index, std::string(query.bytes(3)), true};
         return ERROR_SUCCESS;
     });
+    return endOfMissing(result);
 }
 
 // --- transactions ---
