@@ -164,11 +164,11 @@ bool allowsSharedMemory(const std::string& file) {
     return std::ranges::find(remote, static_cast<std::uint32_t>(status.f_type)) == remote.end();
 }
 
-DWORD makeFile(const std::string& file, Folders folders) {
-    if (folders == Folders::make) {
-        if (const DWORD result = makeFolders(fs::path(file).parent_path()); result != ERROR_SUCCESS)
-            return result;
-    }
+DWORD makeFolderOf(const std::string& file) {
+    return makeFolders(fs::path(file).parent_path());
+}
+
+DWORD makeFile(const std::string& file) {
     const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
     if (descriptor < 0)
         return errno == EEXIST ? ERROR_SUCCESS : errorFromErrno(errno);

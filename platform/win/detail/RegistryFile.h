@@ -45,11 +45,12 @@ struct FileStamp {
 /// Whether shared memory between processes works on the file system of a file: not for files on other machines.
 [[nodiscard]] bool allowsSharedMemory(const std::string& file);
 
-enum class Folders { make, expect };
-/// Makes an empty file that is private to the user, on demand with the folders above it. One that exists is left as it
-/// is.
+/// Makes the folders above a file that are missing, private to the user.
 /// @return the platform's number
-[[nodiscard]] DWORD makeFile(const std::string& file, Folders folders);
+[[nodiscard]] DWORD makeFolderOf(const std::string& file);
+/// Makes an empty file that is private to the user. One that exists is left as it is.
+/// @return the platform's number
+[[nodiscard]] DWORD makeFile(const std::string& file);
 
 /// Held by the process that creates a file or sets one aside; the others wait. Let go by the system when the process
 /// ends.

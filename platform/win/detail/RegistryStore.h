@@ -120,6 +120,7 @@ private:
     /// The replies to what was asked since anybody's last write; null when that cannot be told cheaply.
     Replies* replies();
 
+    void closeConnection(Log log);
     DWORD ensureOpen(Intent intent);
     DWORD open(Intent intent);
     DWORD openFile();

@@ -81,13 +81,23 @@ void closeStores() {
 void Store::close(Log log) {
     if (m_inTransaction)
         return;
-    if (m_connection != nullptr && log == Log::keep)
-        m_connection->keepLogOnClose();
+    if (m_connection != nullptr)
+        closeConnection(log);
     m_memory->replies.clear();
     m_memory->watch = Memory::Watch::none;
-    m_connection.reset();
     m_copy.reset();
     m_mode = Mode::closed;
+}
+
+void Store::closeConnection(Log log) {
+    // Merging deletes the log by its name. Where another file has taken the place, or takes it right now, that would be
+    // the other file's.
+    std::optional<FolderLock> lock;
+    if (log == Log::merge && m_mode == Mode::shared)
+        lock.emplace(m_file);
+    if (!lock || !lock->isHeld() || !isCurrent())
+        m_connection->keepLogOnClose();
+    m_connection.reset();
 }
 
 void Store::leaveToParent() {
@@ -138,7 +148,11 @@ DWORD Store::open(Intent intent) {
 DWORD Store::createFile() {
     // A link that leads nowhere says where the file is wanted, but a missing folder there may be a disk that is not in
     // its place at the moment.
-    const DWORD result = makeFile(m_file, m_file == m_name ? Folders::make : Folders::expect);
+    DWORD result = m_file == m_name ? makeFolderOf(m_file) : ERROR_SUCCESS;
+    if (result == ERROR_SUCCESS) {
+        const FolderLock lock(m_file); // not while a damaged one and its log are being set aside
+        result = makeFile(m_file);
+    }
     if (result != ERROR_SUCCESS)
         tell(Fault::notSaved, "Settings cannot be saved: " + m_file + " cannot be made. " + errorText(result));
     return result;

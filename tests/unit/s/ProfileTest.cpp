@@ -1,14 +1,14 @@
 #include "s/Profile.h"
 
 #include "TestApp.h"
+#include "platform/port/Version.h"
 #include "platform/win/detail/RegistryStore.h"
+#include "s/Version.h"
 
 #include <gtest/gtest.h>
 
-#include <chrono>
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 #include <string>
 
 namespace {
@@ -21,21 +21,17 @@ protected:
         m_folder = mkdtemp(name.data());
         tvx::registry::closeStores();
         setenv("TVX_REGISTRY", (m_folder / "registry.db").c_str(), 1);
-        setenv("TARVEX", m_folder.c_str(), 1);
-        unsetenv("MYTARVEX");
         theApp.SetRegistryKey("Maker");
     }
     void TearDown() override {
+        Port::Version::setReader(&Gui_InstallInfo::GetValue);
         tvx::registry::closeStores();
         std::filesystem::remove_all(m_folder);
     }
-    void install(const char* version) const {
-        const std::filesystem::path file = m_folder / "fileset.txt";
-        std::ofstream(file) << "Mon Jan 5 10:00:00 UTC 2026::version=" << version << "\n";
-        // The reader looks at a file again when it is newer than what it has read, in whole seconds.
-        static auto newest = std::filesystem::file_time_type::clock::now();
-        newest += std::chrono::seconds(10);
-        std::filesystem::last_write_time(file, newest);
+    /// Lets the installation have a version.
+    static void install(const char* version) {
+        installed = version;
+        Port::Version::setReader([](const char*) { return installed.c_str(); });
     }
     static std::string stored(const std::string& path, const char* name) {
         HKEY key = nullptr;
@@ -53,6 +49,7 @@ protected:
     }
 
     std::filesystem::path m_folder;
+    inline static std::string installed;
 };
 
 TEST_F(Profile, KeepsTextsBelowRegistryKeyTitleAndSection) {
@@ -130,6 +127,7 @@ TEST_F(Profile, ComposesLocationsOfKeys) {
 }
 
 TEST_F(Profile, TakesTenOneForAVersionThatNobodyKnows) {
+    install("");
     EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\10.1");
     install("9");
     EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\9");

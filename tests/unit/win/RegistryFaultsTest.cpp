@@ -63,7 +63,7 @@ protected:
         if (geteuid() != 0)
             return;
         for (fs::path folder = m_sandbox.folder; folder != "/"; folder = folder.parent_path())
-            fs::permissions(folder, fs::perms::others_exec, fs::perm_options::add);
+            fs::permissions(folder, fs::perms::group_exec | fs::perms::others_exec, fs::perm_options::add);
         for (const auto& entry : fs::recursive_directory_iterator(m_sandbox.folder))
             ASSERT_EQ(chown(entry.path().c_str(), nobody, nobody), 0);
         ASSERT_EQ(chown(m_sandbox.folder.c_str(), nobody, nobody), 0);
@@ -126,8 +126,8 @@ TEST_F(RegistryFaults, OneOfSeveralProcessesSetsADamagedFileAside) {
     for (int i = 0; i < 4; ++i)
         children.push_back(std::make_unique<ChildProcess>([i](ChildProcess& parent) {
             (void)parent.receive();
-            TestKey(path).write(std::to_string(i).c_str(), "1");
-            parent.send(static_cast<int>(notices.size()));
+            const LSTATUS result = TestKey(path).write(std::to_string(i).c_str(), "1");
+            parent.send(result != 0 ? 100 : static_cast<int>(notices.size()));
         }));
     for (const auto& child : children)
         child->send(0);
