@@ -123,7 +123,7 @@ private:
     void closeConnection(Log log);
     DWORD ensureOpen(Intent intent);
     DWORD open(Intent intent);
-    DWORD openFile();
+    DWORD openFile(Intent intent);
     DWORD connect(const std::string& file);
     DWORD checkSchema();
     [[nodiscard]] bool isOfNewerVersion(std::int64_t version);

@@ -142,7 +142,7 @@ DWORD Store::open(Intent intent) {
                                   (kind == FileKind::other ? " is no file." : " cannot be reached."));
         return ERROR_ACCESS_DENIED;
     }
-    return openFile();
+    return openFile(intent);
 }
 
 DWORD Store::createFile() {
@@ -158,12 +158,14 @@ DWORD Store::createFile() {
     return result;
 }
 
-DWORD Store::openFile() {
+DWORD Store::openFile(Intent intent) {
     m_writeError = ERROR_ACCESS_DENIED;
     const DWORD result = connect(m_file);
     if (result == ERROR_SUCCESS || result == ERROR_REGISTRY_CORRUPT)
         return result;
     close(Log::keep);
+    if (m_identity == FileIdentity{} || m_identity != identityOf(m_name))
+        return open(intent); // somebody has set it aside just now
     const bool isPlaceBad =
         result == ERROR_ACCESS_DENIED || result == ERROR_DISK_FULL || result == ERROR_REGISTRY_IO_FAILED;
     return isPlaceBad ? openCopy(result) : result;
