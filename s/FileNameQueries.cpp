@@ -24,12 +24,8 @@ CString fileSystemForm(const Gui_FileName& name) {
     return form.GetLength() == 2 && form[1] == ':' ? form + "\\." : form;
 }
 
-DWORD attributesOf(const Gui_FileName& name) {
-    return GetFileAttributesA(fileSystemForm(name));
-}
-
-bool areThere(DWORD attributes) {
-    return attributes != INVALID_FILE_ATTRIBUTES;
+tvx::FileKind kindOf(const Gui_FileName& name) {
+    return tvx::fileKind(fileSystemForm(name));
 }
 
 /// Removable media may be write-protected without the system knowing: only writing tells.
@@ -57,7 +53,7 @@ bool isDriveWritable(const CString& root) {
 } // namespace
 
 int Gui_FileName::Exists() const {
-    return areThere(attributesOf(*this));
+    return kindOf(*this) != tvx::FileKind::none;
 }
 
 int Gui_FileName::IsReadable() const {
@@ -65,19 +61,17 @@ int Gui_FileName::IsReadable() const {
 }
 
 int Gui_FileName::IsDirectory() const {
-    const DWORD attributes = attributesOf(*this);
-    return areThere(attributes) && (attributes & FILE_ATTRIBUTE_DIRECTORY);
+    return kindOf(*this) == tvx::FileKind::folder;
 }
 
 int Gui_FileName::IsFile() const {
-    const DWORD attributes = attributesOf(*this);
-    return areThere(attributes) && !(attributes & FILE_ATTRIBUTE_DIRECTORY);
+    return kindOf(*this) == tvx::FileKind::file;
 }
 
 int Gui_FileName::IsWritable() const {
     const CString form = fileSystemForm(*this);
     const DWORD attributes = GetFileAttributesA(form);
-    if (!areThere(attributes) || (attributes & FILE_ATTRIBUTE_READONLY))
+    if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY))
         return 0;
     return form.GetLength() < 3 || form[1] != ':' || isDriveWritable(form.Left(2) + Separator);
 }

@@ -8,6 +8,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <ctime>
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
@@ -35,7 +36,7 @@ class MountList {
 public:
     /// The list's text, when it is another than at the last call.
     std::optional<std::string> changed() {
-        if (m_descriptor >= 0 && !isSignalled())
+        if (m_descriptor >= 0 && (isJustAsked() || !isSignalled()))
             return std::nullopt;
         if (m_descriptor < 0 && (m_descriptor = ::open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC)) < 0)
             return std::nullopt;
@@ -43,6 +44,18 @@ public:
     }
 
 private:
+    /// Asking is a call of the system, and names come in thousands: a table may be so old.
+    bool isJustAsked() {
+        constexpr long milliseconds = 20;
+        timespec now{};
+        ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
+        const long time = now.tv_sec * 1000 + now.tv_nsec / 1000000;
+        if (time - m_asked < milliseconds)
+            return true;
+        m_asked = time;
+        return false;
+    }
+
     bool isSignalled() const {
         pollfd entry{m_descriptor, POLLPRI, 0};
         return ::poll(&entry, 1, 0) > 0;
@@ -61,6 +74,7 @@ private:
     }
 
     int m_descriptor = -1;
+    long m_asked = 0;
 };
 
 class LiveDrives {

@@ -38,11 +38,19 @@ std::optional<std::string> pathOf(LPCSTR name, PathUse use = PathUse::existing) 
     return path;
 }
 
-/// What the name leads to in the end, links followed; errno tells why there is nothing.
-bool follow(tvx::Location& location) {
-    errno = ENOENT;
+/// What a name leads to in the end, links followed; nothing, with the last error, when it leads nowhere.
+std::optional<tvx::Location> follow(LPCSTR name) {
+    auto location = tvx::locate(name ? name : "");
+    if (!location) {
+        SetLastError(ERROR_PATH_NOT_FOUND);
+        return std::nullopt;
+    }
     // Where the look-up failed, the system says why: missing, or not to be seen.
-    return (location.exists && !S_ISLNK(location.state.st_mode)) || ::stat(location.path.c_str(), &location.state) == 0;
+    if ((location->exists && !S_ISLNK(location->state.st_mode)) ||
+        ::stat(location->path.c_str(), &location->state) == 0)
+        return location;
+    tvx::setLastErrorFromErrno();
+    return std::nullopt;
 }
 
 int systemFlags(DWORD access, DWORD disposition) {
@@ -131,15 +139,9 @@ std::string systemFullName(std::string_view name) {
 } // namespace
 
 DWORD GetFileAttributesA(LPCSTR name) {
-    auto location = tvx::locate(name ? name : "");
-    if (!location) {
-        SetLastError(ERROR_PATH_NOT_FOUND);
+    const auto location = follow(name);
+    if (!location)
         return INVALID_FILE_ATTRIBUTES;
-    }
-    if (!follow(*location)) {
-        tvx::setLastErrorFromErrno();
-        return INVALID_FILE_ATTRIBUTES;
-    }
     DWORD attributes = tvx::attributesOf(location->state, location->path);
     if (::access(location->path.c_str(), W_OK) != 0)
         attributes |= FILE_ATTRIBUTE_READONLY;
@@ -192,6 +194,13 @@ DWORD GetFullPathNameA(LPCSTR name, DWORD size, LPSTR buffer, LPSTR* filePart) {
         *filePart = last < full.size() ? buffer + last : nullptr;
     }
     return length;
+}
+
+tvx::FileKind tvx::fileKind(LPCSTR name) {
+    const auto location = follow(name);
+    if (!location)
+        return FileKind::none;
+    return S_ISDIR(location->state.st_mode) ? FileKind::folder : FileKind::file;
 }
 
 std::string tvx::fullName(std::string_view name) {

@@ -17,9 +17,10 @@
 /// Null with `ERROR_MOD_NOT_FOUND` when no such module registered itself.
 TVX_PLATFORM_API HMODULE GetModuleHandleA(LPCSTR name);
 
-/// Copies the full name of a module's file (links resolved), such as "C:\usr\bin\board", into `buffer` of `size` bytes, always ended by NUL.
-/// A null module is the application. The result is the length without the NUL; a path that does not fit is cut, the
-/// result is then `size` and the last error `ERROR_INSUFFICIENT_BUFFER`. 0 when the module is unknown.
+/// Copies the full name of a module's file (links resolved), such as "C:\usr\bin\board", into `buffer` of `size` bytes,
+/// always ended by NUL. A null module is the application. The result is the length without the NUL; a path that does
+/// not fit is cut, the result is then `size` and the last error `ERROR_INSUFFICIENT_BUFFER`. 0 when the module is
+/// unknown.
 TVX_PLATFORM_API DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size);
 
 /// @copydoc GetModuleHandleA
@@ -49,8 +50,8 @@ TVX_PLATFORM_API void unregisterResources(const void* data);
 /// The module that holds `address`, a function or a variable of it. Null when that file registered no resources.
 [[nodiscard]] TVX_PLATFORM_API HMODULE moduleFromAddress(const void* address);
 
-/// The full path of a module's file in the system's form, links resolved, whatever its length. A null module is the application; empty
-/// when the module is unknown.
+/// The full path of a module's file in the system's form, links resolved, whatever its length. A null module is the
+/// application; empty when the module is unknown.
 [[nodiscard]] TVX_PLATFORM_API std::string moduleFileName(HMODULE module);
 
 /// The application's module. It exists even when the application has no resources.

@@ -53,7 +53,8 @@ private:
     std::vector<Drive> m_drives;
 };
 
-/// The drives now. Asking costs next to nothing while nothing was mounted or taken away. For any thread.
+/// The drives now, at most a fiftieth of a second ago. Asking costs next to nothing while nothing was mounted or taken
+/// away. For any thread.
 [[nodiscard]] std::shared_ptr<const DriveTable> currentDrives();
 
 } // namespace tvx::win
