@@ -257,19 +257,24 @@ BENCHMARK(writeHundredTogether)->Unit(benchmark::kMicrosecond)->UseRealTime();
 constexpr int processes = 2;
 constexpr int writesEach = 2000;
 
-/// Writes and sends back the time of the worst write, in milliseconds; negative when one failed.
-double writeAll(int process) {
+/// Does the writes of one process. Answers the time of the worst one, in milliseconds; negative when one failed.
+template <typename Write>
+double worstOf(int process, Write write) {
     double worst = 0;
-    const HKEY key = openKey();
     for (int i = 0; i < writesEach; ++i) {
         const auto begin = std::chrono::steady_clock::now();
-        if (writeValue(key, std::to_string(process) + "." + std::to_string(i), valueText(i)) != 0)
+        if (!write(std::to_string(process) + "." + std::to_string(i), valueText(i)))
             return -1;
         const std::chrono::duration<double, std::milli> taken = std::chrono::steady_clock::now() - begin;
         worst = std::max(worst, taken.count());
     }
-    RegCloseKey(key);
     return worst;
+}
+
+double writeToStore(int process) {
+    const HKEY key = openKey();
+    return worstOf(
+        process, [key](const std::string& name, const std::string& text) { return writeValue(key, name, text) == 0; });
 }
 
 double collect(int from) {
@@ -297,32 +302,57 @@ int countLost() {
     return lost;
 }
 
+/// Lets each process write with `body` and answers the worst time of all.
+template <typename Body>
+double runProcesses(Body body) {
+    std::array<int, 2> ends{};
+    if (pipe(ends.data()) != 0)
+        std::abort();
+    for (int process = 0; process < processes; ++process) {
+        if (fork() == 0) {
+            const double own = body(process);
+            _exit(::write(ends[1], &own, sizeof own) == sizeof own ? 0 : 1);
+        }
+    }
+    const double worst = collect(ends[0]);
+    close(ends[0]);
+    close(ends[1]);
+    return worst;
+}
+
 void twoProcessesWrite(benchmark::State& state) {
     double worst = 0;
     int lost = 0;
     for (auto _ : state) {
         const Folder folder;
         fillStore(folder, 200);
-        std::array<int, 2> ends{};
-        if (pipe(ends.data()) != 0)
-            std::abort();
-        for (int process = 0; process < processes; ++process) {
-            if (fork() == 0) {
-                const double own = writeAll(process);
-                _exit(::write(ends[1], &own, sizeof own) == sizeof own ? 0 : 1);
-            }
-        }
-        const double slowest = collect(ends[0]);
+        const double slowest = runProcesses(&writeToStore);
         if (slowest < 0)
             state.SkipWithError("not written");
         worst = std::max(worst, slowest);
         lost += countLost();
-        close(ends[0]);
-        close(ends[1]);
     }
     state.counters["lost"] = lost;
     state.counters["worst_ms"] = worst;
 }
-BENCHMARK(twoProcessesWrite)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(5);
+BENCHMARK(twoProcessesWrite)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
+
+void twoProcessesWriteWithTheDatabaseAlone(benchmark::State& state) {
+    double worst = 0;
+    for (auto _ : state) {
+        const Folder folder;
+        Database(folder / "raw.db").fill(200);
+        const double slowest = runProcesses([&](int process) {
+            Database own(folder / "raw.db");
+            return worstOf(process,
+                           [&](const std::string& name, const std::string& text) { return own.write(name, text); });
+        });
+        if (slowest < 0)
+            state.SkipWithError("not written");
+        worst = std::max(worst, slowest);
+    }
+    state.counters["worst_ms"] = worst;
+}
+BENCHMARK(twoProcessesWriteWithTheDatabaseAlone)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
 
 } // namespace
