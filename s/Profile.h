@@ -62,6 +62,58 @@ public:
     /// @return 1, or 0 when nothing, no number or too long a text is stored
     static int ReadFirstInstanceInfo(const char* appName, const char* valueName, unsigned long& value);
 
+    /// Where windows stood. A record holds flags, show state, the two corners, the restored rectangle and the size of
+    /// the primary screen; it counts only on a screen of that size. A rectangle off the screen is returned as stored:
+    /// CWnd::SetWindowPlacement keeps the caption within reach.
+    /// @{
+
+    /// Reads where the main window stood.
+    /// @param placement  unchanged when nothing is read
+    /// @param entry      null: "WindowPlacement"
+    /// @param section    null: "Settings"
+    /// @return 1, or 0 when nothing, a damaged record or one of another screen size is stored
+    static int ReadWindowPlacement(WINDOWPLACEMENT& placement, const char* entry, const char* section);
+    /// Writes where the main window stands, as CWnd::GetWindowPlacement tells it. Nothing is reported when that fails.
+    static void WriteWindowPlacement(WINDOWPLACEMENT& placement, const char* entry, const char* section);
+    /// Reads where a dialog stood. Dialogs of the same name in all applications of the family share one record.
+    /// @param placement  unchanged when nothing is read
+    /// @return as ReadWindowPlacement
+    static int ReadDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement);
+    /// Writes where a dialog stands. Nothing is reported when that fails.
+    static void WriteDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement);
+    /// @}
+
+    /// Where the bars of a frame stood: side, row, place in the row, floating, shown.
+    /// @{
+
+    /// Whether the kept state fits the frame: each bar that was docked is still there. True when nothing is kept.
+    /// @param profileName  null: "ControlBar"
+    /// @return 1 or 0
+    static int CheckBarState(CFrameWnd* frame, const char* profileName);
+    /// Puts the bars where they stood, if the state fits. Otherwise they stay, and the state is kept.
+    /// @param profileName  null: "ControlBar"
+    /// @return 1
+    static int ReadBarState(CFrameWnd* frame, const char* profileName);
+    /// Keeps where the bars stand. Nothing is reported when that fails.
+    /// @param profileName  null: "ControlBar"
+    static void WriteBarState(CFrameWnd* frame, const char* profileName);
+    /// @}
+
+    /// Fonts.
+    /// @{
+
+    /// Reads a font.
+    /// @param font     unchanged when nothing is read
+    /// @param entry    null: "Font"
+    /// @param section  null: "Settings"
+    /// @return 1, or 0 when nothing, a damaged record or one with an empty or too long face name is stored
+    static int ReadLogFont(LOGFONTA& font, const char* entry, const char* section);
+    /// Writes a font. Nothing is reported when that fails.
+    /// @param font  a "~" in its face name becomes a space, here and in what is read back. A font with an empty face
+    ///              name does not come back
+    static void WriteLogFont(LOGFONTA& font, const char* entry, const char* section);
+    /// @}
+
 private:
     Gui_Profile() = default;
 };

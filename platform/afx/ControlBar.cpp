@@ -1,6 +1,6 @@
 #include "platform/afx/ControlBar.h"
 
-#include "platform/afx/detail/Window.h"
+#include "platform/afx/detail/BarWindow.h"
 
 #include <QMainWindow>
 #include <QToolBar>
@@ -66,6 +66,7 @@ void CControlBar::SetBarStyle(DWORD style) {
 
 void CControlBar::EnableDocking(DWORD sides) {
     m_dockSides = sides & CBRS_ALIGN_ANY;
+    m_dockable = true;
     if (QToolBar* tools = toolsOf(*this)) {
         tools->setMovable(true);
     }
@@ -93,18 +94,7 @@ UINT CControlBar::GetDockSide() const {
     if (main == nullptr || tools->isFloating()) {
         return 0;
     }
-    switch (main->toolBarArea(tools)) {
-    case Qt::LeftToolBarArea:
-        return AFX_IDW_DOCKBAR_LEFT;
-    case Qt::RightToolBarArea:
-        return AFX_IDW_DOCKBAR_RIGHT;
-    case Qt::TopToolBarArea:
-        return AFX_IDW_DOCKBAR_TOP;
-    case Qt::BottomToolBarArea:
-        return AFX_IDW_DOCKBAR_BOTTOM;
-    default:
-        return 0;
-    }
+    return dockBarOf(main->toolBarArea(tools));
 }
 
 CSize CControlBar::CalcFixedLayout(BOOL, BOOL) {

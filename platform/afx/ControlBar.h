@@ -89,6 +89,8 @@ protected:
     int m_nCount = 0;
     DWORD m_dwStyle = 0;
     DWORD m_dockSides = 0;
+    /// Whether EnableDocking was called, so that the bar may float.
+    bool m_dockable = false;
     /// What DelayShow asked for.
     enum class Delayed { None, Show, Hide };
     Delayed m_delayed = Delayed::None;

@@ -11,6 +11,8 @@
 #include <vector>
 
 class CControlBar;
+class CControlBarInfo;
+class CDockState;
 class CDocTemplate;
 class CDocument;
 class CView;
@@ -158,6 +160,16 @@ public:
     const std::vector<CControlBar*>& GetControlBars() const {
         return m_bars;
     }
+    /// Tells where each bar stands; a value to keep and to hand to SetDockState.
+    void GetDockState(CDockState& state) const;
+    /// Puts the bars where `state` says. Records of bars that the frame does not have, and sides at which a bar may not
+    /// dock, are passed over; bars without a record stand behind the others. A floating bar is moved onto a screen.
+    void SetDockState(const CDockState& state);
+    /// Puts the bars where they stood when SaveBarState was called with that name; without such a record nothing
+    /// happens. Call it when all bars are made.
+    void LoadBarState(LPCSTR profileName);
+    /// Keeps where the bars stand in the application profile, under a name of the host's choice.
+    void SaveBarState(LPCSTR profileName) const;
     /// @}
 
     /// Status line.
@@ -232,6 +244,7 @@ protected:
 private:
     void addBar(CControlBar* bar);
     void removeBar(CControlBar* bar);
+    void dockBars(const std::vector<const CControlBarInfo*>& records);
     void updateMenuItems(CMenu& popup);
     bool closeDocument();
     BOOL forwardScroll(UINT message, UINT code, UINT position);

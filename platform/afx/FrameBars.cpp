@@ -48,21 +48,6 @@ Qt::ToolBarArea firstArea(DWORD sides) {
     return Qt::TopToolBarArea;
 }
 
-DWORD sideOfDockBar(UINT id) {
-    switch (id) {
-    case AFX_IDW_DOCKBAR_TOP:
-        return CBRS_ALIGN_TOP;
-    case AFX_IDW_DOCKBAR_LEFT:
-        return CBRS_ALIGN_LEFT;
-    case AFX_IDW_DOCKBAR_RIGHT:
-        return CBRS_ALIGN_RIGHT;
-    case AFX_IDW_DOCKBAR_BOTTOM:
-        return CBRS_ALIGN_BOTTOM;
-    default:
-        return 0;
-    }
-}
-
 /// The bar of an area that stands at a point of the screen, before which a new one goes.
 QToolBar* barAt(const QMainWindow& main, Qt::ToolBarArea area, const QPoint& at, const QToolBar* except) {
     const auto bars = main.findChildren<QToolBar*>(QString(), Qt::FindDirectChildrenOnly);
@@ -109,6 +94,10 @@ void CFrameWnd::RecalcLayout(BOOL) {
         if (bar->m_delayed != CControlBar::Delayed::None) {
             const bool show = std::exchange(bar->m_delayed, CControlBar::Delayed::None) == CControlBar::Delayed::Show;
             bar->ShowWindow(show ? SW_SHOWNA : SW_HIDE);
+        }
+        auto* tools = bar->GetState() != nullptr ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
+        if (tools != nullptr && (bar->GetStyle() & WS_VISIBLE) != 0) {
+            guarded([tools] { showFloating(*tools); });
         }
     }
     const Window* pane = state->child(AFX_IDW_PANE_FIRST);

@@ -407,15 +407,24 @@ struct CREATESTRUCT {
 };
 using LPCREATESTRUCT = CREATESTRUCT*;
 
-/// Show state and restored rectangle of a top-level window, in screen pixels including its frame.
+/// Show state and restored rectangle of a window, its frame included: a top-level window's in screen pixels (not
+/// relative to what panels leave of the screen), a child's in its parent's client area.
 struct WINDOWPLACEMENT {
-    UINT length;
-    UINT flags;
-    UINT showCmd;
-    POINT ptMinPosition;
-    POINT ptMaxPosition;
-    RECT rcNormalPosition;
+    UINT length;           ///< sizeof(WINDOWPLACEMENT), 44.
+    UINT flags;            ///< WPF_...
+    UINT showCmd;          ///< SW_SHOWNORMAL, SW_SHOWMINIMIZED or SW_SHOWMAXIMIZED; any SW_... to set it.
+    POINT ptMinPosition;   ///< (-1, -1): icons and maximised windows are placed by the desktop.
+    POINT ptMaxPosition;   ///< (-1, -1) likewise.
+    RECT rcNormalPosition; ///< The window when it is neither minimised nor maximised.
 };
+
+// flags of WINDOWPLACEMENT
+/// Kept for hosts that set it; the desktop places icons.
+#define WPF_SETMINPOSITION 0x0001
+/// The minimised window will be maximised when it is restored.
+#define WPF_RESTORETOMAXIMIZED 0x0002
+/// Has no effect: windows of another thread do not exist.
+#define WPF_ASYNCWINDOWPLACEMENT 0x0004
 
 /// The limits a window may set when it is about to be sized; WM_GETMINMAXINFO carries a pointer to it.
 struct MINMAXINFO {

@@ -358,24 +358,64 @@ BOOL GetWindowPlacement(HWND handle, WINDOWPLACEMENT* placement) {
     placement->length = sizeof(WINDOWPLACEMENT);
     placement->ptMinPosition = placement->ptMaxPosition = {-1, -1};
     placement->showCmd = SW_SHOWNORMAL;
-    QRect normal = window->windowRect();
-    if (widget.isWindow() && (widget.isMaximized() || widget.isMinimized())) {
-        placement->showCmd = widget.isMinimized() ? SW_SHOWMINIMIZED : SW_SHOWMAXIMIZED;
-        normal = widget.normalGeometry();
+    const Placement* place = window->placement();
+    if (place != nullptr && widget.isMinimized()) {
+        placement->showCmd = SW_SHOWMINIMIZED;
+        placement->flags = widget.isMaximized() ? WPF_RESTORETOMAXIMIZED : 0;
+    } else if (place != nullptr && widget.isMaximized()) {
+        placement->showCmd = SW_SHOWMAXIMIZED;
     }
-    placement->rcNormalPosition = fromQt(normal);
+    placement->rcNormalPosition = fromQt(place != nullptr ? place->restored() : window->windowRect());
     return TRUE;
 }
 
+namespace {
+
+/// A rectangle that a window can have, whatever a damaged record says.
+QRect usableRect(const RECT& rect) {
+    static constexpr int farthest = 30000;
+    const auto near = [](int at) { return std::clamp(at, -farthest, farthest); };
+    const QPoint corner(near(rect.left), near(rect.top));
+    return {corner, QSize(near(rect.right) - corner.x(), near(rect.bottom) - corner.y()).expandedTo({1, 1})};
+}
+
+void setRestoredRect(Window& window, const QRect& rect) {
+    Placement* place = window.placement();
+    if (place != nullptr && window.widget()->isWindow()) {
+        place->setRestored(reachableFrame(rect));
+        return;
+    }
+    if (window.widget()->isMaximized() || window.widget()->isMinimized()) {
+        window.widget()->showNormal();
+    }
+    window.setWindowRect(rect);
+}
+
+} // namespace
+
 BOOL SetWindowPlacement(HWND handle, const WINDOWPLACEMENT* placement) {
     Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (window == nullptr || window->widget() == nullptr) {
         return FALSE;
     }
-    const RECT& rect = placement->rcNormalPosition;
-    SetWindowPos(handle, nullptr, rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top,
-                 SWP_NOZORDER | SWP_NOACTIVATE);
-    ShowWindow(handle, static_cast<int>(placement->showCmd));
+    if (placement->length != sizeof(WINDOWPLACEMENT)) {
+        SetLastError(ERROR_INVALID_PARAMETER);
+        return FALSE;
+    }
+    const bool minimized = placement->showCmd == SW_SHOWMINIMIZED || placement->showCmd == SW_MINIMIZE ||
+                           placement->showCmd == SW_SHOWMINNOACTIVE;
+    guarded([&] {
+        setRestoredRect(*window, usableRect(placement->rcNormalPosition));
+        if (minimized && window->widget()->isWindow()) {
+            Qt::WindowStates states = window->widget()->windowState() | Qt::WindowMinimized;
+            states.setFlag(Qt::WindowMaximized, (placement->flags & WPF_RESTORETOMAXIMIZED) != 0);
+            window->widget()->setWindowState(states);
+        }
+    });
+    if (IsWindow(handle)) {
+        window->tellGeometry();
+        ShowWindow(handle, static_cast<int>(placement->showCmd));
+    }
     return TRUE;
 }
 

@@ -101,7 +101,7 @@ BOOL CBoardApp::InitInstance() {
         return FALSE;
     }
     frame->DragAcceptFiles();
-    frame->ShowWindow(m_nCmdShow);
+    frame->ActivateFrame(m_nCmdShow);
     frame->UpdateWindow();
     return TRUE;
 }

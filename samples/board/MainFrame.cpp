@@ -2,6 +2,7 @@
 
 #include "OutputWindow.h"
 #include "Resource.h"
+#include "s/Profile.h"
 #include "s/QueryDlg.h"
 
 #include <iterator>
@@ -17,6 +18,7 @@ IMPLEMENT_DYNCREATE(CMainFrame, CMDIFrameWnd)
 // clang-format off
 BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
     ON_WM_CREATE()
+    ON_WM_CLOSE()
     ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
 END_MESSAGE_MAP()
 // clang-format on
@@ -38,7 +40,32 @@ int CMainFrame::OnCreate(CREATESTRUCT* cs) {
     if (!m_statusBar.Create(this) || !m_statusBar.SetIndicators(indicators, std::size(indicators))) {
         return -1;
     }
+    m_toolBar.EnableDocking(CBRS_ALIGN_ANY);
+    EnableDocking(CBRS_ALIGN_ANY);
+    DockControlBar(&m_toolBar);
     return 0;
+}
+
+void CMainFrame::ActivateFrame(int command) {
+    if (!m_placed) {
+        m_placed = true;
+        WINDOWPLACEMENT placement;
+        if (Gui_Profile::ReadWindowPlacement(placement, nullptr, nullptr)) {
+            SetWindowPlacement(&placement);
+            command = static_cast<int>(placement.showCmd);
+        }
+        Gui_Profile::ReadBarState(this, nullptr);
+    }
+    CMDIFrameWnd::ActivateFrame(command);
+}
+
+void CMainFrame::OnClose() {
+    WINDOWPLACEMENT placement;
+    if (GetWindowPlacement(&placement)) {
+        Gui_Profile::WriteWindowPlacement(placement, nullptr, nullptr);
+    }
+    Gui_Profile::WriteBarState(this, nullptr);
+    CMDIFrameWnd::OnClose();
 }
 
 void CMainFrame::OnRunCommand() {

@@ -3,16 +3,21 @@
 #include "afxext.h"
 #include "afxwin.h"
 
-/// The main window: tool bar above, status bar below, drawings in between.
+/// The main window: tool bar, status bar, drawings in between. It comes up where it stood last, with its bars as they
+/// were.
 class CMainFrame : public CMDIFrameWnd {
     DECLARE_DYNCREATE(CMainFrame)
 
 public:
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
+    void ActivateFrame(int command = -1) override;
+
     afx_msg int OnCreate(CREATESTRUCT* cs);
+    afx_msg void OnClose();
     afx_msg void OnRunCommand();
 
 private:
+    bool m_placed = false;
     CToolBar m_toolBar;
     CStatusBar m_statusBar;
     CString m_lastCommand;

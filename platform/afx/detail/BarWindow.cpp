@@ -1,12 +1,21 @@
 #include "platform/afx/detail/BarWindow.h"
 
+#include "platform/afx/Frame.h"
+
 #include <QMainWindow>
 #include <QStatusBar>
 #include <QToolBar>
 
+#include <algorithm>
+#include <iterator>
+
 namespace tvx::afx {
 
 namespace {
+
+bool isFrameShown(const QWidget& bar) {
+    return bar.parentWidget() != nullptr && bar.parentWidget()->window()->isVisible();
+}
 
 std::unique_ptr<Window> makeBar(const CREATESTRUCT& cs) {
     return std::make_unique<BarWindow>(cs);
@@ -42,18 +51,65 @@ void BarWindow::setWindowRect(const QRect& rect) {
     }
 }
 
+void BarWindow::show(int command) {
+    if (command != SW_HIDE && widget() != nullptr && widget()->isWindow() && !isFrameShown(*widget())) {
+        setStyle(style() | WS_VISIBLE, exStyle());
+        return;
+    }
+    Window::show(command);
+}
+
 void attachStatusBar(QMainWindow& main, QWidget* widget) {
     if (auto* bar = qobject_cast<QStatusBar*>(widget)) {
         main.setStatusBar(bar);
     }
 }
 
+namespace {
+
+struct Side {
+    UINT dockBar;
+    Qt::ToolBarArea area;
+    DWORD bit;
+};
+
+constexpr Side sides[] = {{AFX_IDW_DOCKBAR_TOP, Qt::TopToolBarArea, CBRS_ALIGN_TOP},
+                          {AFX_IDW_DOCKBAR_LEFT, Qt::LeftToolBarArea, CBRS_ALIGN_LEFT},
+                          {AFX_IDW_DOCKBAR_RIGHT, Qt::RightToolBarArea, CBRS_ALIGN_RIGHT},
+                          {AFX_IDW_DOCKBAR_BOTTOM, Qt::BottomToolBarArea, CBRS_ALIGN_BOTTOM}};
+
+} // namespace
+
+UINT dockBarOf(Qt::ToolBarArea area) {
+    const auto* side = std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.area == area; });
+    return side != std::end(sides) ? side->dockBar : 0;
+}
+
+Qt::ToolBarArea areaOf(UINT dockBar) {
+    const auto* side =
+        std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.dockBar == dockBar; });
+    return side != std::end(sides) ? side->area : Qt::TopToolBarArea;
+}
+
+DWORD sideOfDockBar(UINT dockBar) {
+    const auto* side =
+        std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.dockBar == dockBar; });
+    return side != std::end(sides) ? side->bit : 0;
+}
+
 void floatToolBar(QToolBar& bar, QPoint at) {
     const bool shown = !bar.isHidden();
-    bar.setWindowFlags(Qt::Tool | Qt::FramelessWindowHint | Qt::X11BypassWindowManagerHint);
+    bar.setWindowFlags(Qt::Tool | Qt::FramelessWindowHint);
+    bar.setAttribute(Qt::WA_ShowWithoutActivating); // the frame keeps the keyboard
     bar.move(at);
     bar.adjustSize();
-    bar.setVisible(shown);
+    bar.setVisible(shown && isFrameShown(bar));
+}
+
+void showFloating(QToolBar& bar) {
+    if (bar.isFloating() && bar.isHidden() && isFrameShown(bar)) {
+        bar.show();
+    }
 }
 
 } // namespace tvx::afx

@@ -15,6 +15,8 @@ class TVX_PLATFORM_API BarWindow : public Window {
 public:
     using Window::Window;
     void setWindowRect(const QRect& rect) override;
+    /// A floating bar of a frame that is not shown waits for it; see showFloating.
+    void show(int command) override;
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
@@ -28,9 +30,19 @@ protected:
     QWidget* makeWidget(QWidget* parent) override;
 };
 
+/// A side of a frame under its three names: the dock bar's identifier, the toolkit's area, the CBRS_ALIGN_... bit. What
+/// is no side is 0, and the area at the top.
+/// @{
+[[nodiscard]] UINT dockBarOf(Qt::ToolBarArea area);
+[[nodiscard]] Qt::ToolBarArea areaOf(UINT dockBar);
+[[nodiscard]] DWORD sideOfDockBar(UINT dockBar);
+/// @}
+
 /// Gives a frame its status bar, if the widget is one.
 void attachStatusBar(QMainWindow& main, QWidget* widget);
-/// Makes a tool bar a small window at a point of the screen.
+/// Makes a tool bar a small window at a point of the screen. It comes up when the frame does.
 void floatToolBar(QToolBar& bar, QPoint at);
+/// Shows a floating tool bar that waited for its frame.
+void showFloating(QToolBar& bar);
 
 } // namespace tvx::afx

@@ -110,14 +110,14 @@ void DialogWindow::keepOnScreen() {
     // The window manager's frame is unknown until the dialog is shown.
     constexpr QMargins frame(0, 0, 8, 32);
     const QRect area = widget()->screen()->availableGeometry() - ((style() & WS_CAPTION) != 0 ? frame : QMargins());
-    const QRect now = widget()->frameGeometry();
+    const QRect now = windowRect();
     QRect place = now;
     place.moveRight(std::min(place.right(), area.right()));
     place.moveBottom(std::min(place.bottom(), area.bottom()));
     place.moveLeft(std::max(place.left(), area.left()));
     place.moveTop(std::max(place.top(), area.top()));
     if (place != now) {
-        widget()->move(place.topLeft());
+        setWindowRect(place);
     }
 }
 
@@ -139,7 +139,7 @@ void DialogWindow::show(int command) {
     if (visible && !before) {
         keepOnScreen();
     }
-    guarded([&] { showTopLevel(*widget(), command); });
+    guarded([&] { showTopLevel(*this, command); });
     if (from(self) != nullptr) {
         tellGeometry();
     }

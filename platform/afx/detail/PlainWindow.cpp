@@ -293,6 +293,14 @@ QRect frameClientRect(const QMainWindow& main) {
     return area;
 }
 
+void TopLevelWindow::setWindowRect(const QRect& rect) {
+    if (placement() != nullptr) {
+        placement()->moveFrame(rect, Measured::Frame);
+    } else {
+        Window::setWindowRect(rect);
+    }
+}
+
 QRect TopLevelWindow::clientRect() const {
     return widget() != nullptr ? frameClientRect(*mainWindow()) : QRect();
 }
@@ -324,7 +332,11 @@ void TopLevelWindow::applySizeLimits() {
     }
 }
 
-void showTopLevel(QWidget& widget, int command) {
+void showTopLevel(Window& window, int command) {
+    QWidget& widget = *window.widget();
+    if (command != SW_HIDE && window.placement() != nullptr) {
+        window.placement()->aboutToShow();
+    }
     const bool activate = command != SW_SHOWNOACTIVATE && command != SW_SHOWNA && command != SW_SHOWMINNOACTIVE;
     widget.setAttribute(Qt::WA_ShowWithoutActivating, !activate);
     switch (command) {
@@ -372,7 +384,7 @@ void TopLevelWindow::show(int command) {
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
     if (from(self) != nullptr) {
-        guarded([&] { showTopLevel(*widget(), command); });
+        guarded([&] { showTopLevel(*this, command); });
     }
     if (from(self) != nullptr) {
         tellGeometry();

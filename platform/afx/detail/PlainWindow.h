@@ -41,6 +41,7 @@ public:
     QRect clientRect() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void show(int command) override;
+    void setWindowRect(const QRect& rect) override;
     /// What the caption shows; a maximised child frame adds its name to it.
     QString text() const override;
     HMENU menu() const override {
@@ -73,8 +74,8 @@ TVX_PLATFORM_API std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs)
 /// The toolkit's window flags for a framework window's styles.
 TVX_PLATFORM_API Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle);
 
-/// Does what a show command (SW_...) says with a top-level widget.
-TVX_PLATFORM_API void showTopLevel(QWidget& widget, int command);
+/// Does what a show command (SW_...) says with a top-level window's widget.
+TVX_PLATFORM_API void showTopLevel(Window& window, int command);
 
 /// Paints a window's background with its class brush. False when the class has none.
 bool eraseBackground(Window& window, HDC dc);

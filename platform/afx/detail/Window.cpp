@@ -103,6 +103,7 @@ void Window::realize(const CREATESTRUCT& cs) {
     if (!m_widget->isWindow()) {
         m_widget->hide(); // else it would come up with its parent
     }
+    keepPlace();
     m_handle = newHandle(*m_widget, !isChild());
     tables().byHandle[reinterpret_cast<std::uintptr_t>(m_handle)] = this;
     tables().byWidget[m_widget] = this;
@@ -125,6 +126,11 @@ void Window::realize(const CREATESTRUCT& cs) {
         m_widget->resize(size); // the place is left to the desktop
     }
     widgetMade();
+}
+
+void Window::keepPlace() {
+    const bool moves = m_widget->isWindow() || m_widget->windowType() == Qt::SubWindow;
+    m_placement = moves ? std::make_unique<Placement>(*this) : nullptr;
 }
 
 void Window::widgetMade() {}
@@ -240,6 +246,7 @@ void Window::setParent(Window* parent) {
     const QRect place = m_widget->geometry();
     guarded([&] {
         m_widget->setParent(parent != nullptr ? parent->childHost() : nullptr);
+        keepPlace();
         m_widget->setGeometry(place);
         m_widget->setVisible(shown);
     });
@@ -333,7 +340,7 @@ QRect Window::windowRect() const {
         return {};
     }
     if (m_widget->isWindow()) {
-        return m_widget->frameGeometry();
+        return m_placement != nullptr ? m_placement->frameRect() : m_widget->frameGeometry();
     }
     const QPoint origin = m_parent != nullptr ? m_parent->clientRect().topLeft() : QPoint();
     return m_widget->geometry().translated(-origin);
@@ -343,10 +350,8 @@ void Window::setWindowRect(const QRect& rect) {
     if (m_widget == nullptr) {
         return;
     }
-    if (m_widget->isWindow()) {
-        const QSize frame = m_widget->frameGeometry().size() - m_widget->geometry().size();
-        m_widget->move(rect.topLeft());
-        m_widget->resize((rect.size() - frame).expandedTo(QSize(1, 1)));
+    if (m_widget->isWindow() && m_placement != nullptr) {
+        m_placement->moveFrame(rect, Measured::Client);
         return;
     }
     const QPoint origin = m_parent != nullptr ? m_parent->clientRect().topLeft() : QPoint();
@@ -410,6 +415,9 @@ UINT sizeState(const QWidget& widget) {
 } // namespace
 
 void Window::tellGeometry() {
+    if (m_placement != nullptr) {
+        m_placement->changed();
+    }
     if (m_creating || m_destroyed || m_widget == nullptr) {
         return;
     }
@@ -495,6 +503,7 @@ void Window::unlink() {
         m_object = nullptr;
     }
     dropTemporary();
+    m_placement.reset();
     tables().byHandle.erase(reinterpret_cast<std::uintptr_t>(m_handle));
     if (m_parent != nullptr) {
         std::erase(m_parent->m_children, this);

@@ -4,6 +4,7 @@
 /// What lies behind a window handle: the widget, the place in the tree of windows, and the default behaviour.
 
 #include "platform/afx/Message.h"
+#include "platform/afx/detail/Placement.h"
 #include "platform/base/Export.h"
 
 #include <QPointer>
@@ -134,6 +135,10 @@ public:
 
     virtual QRect windowRect() const;
     virtual void setWindowRect(const QRect& rect);
+    /// What keeps the window's place; null for windows that are always inside another.
+    Placement* placement() const {
+        return m_placement.get();
+    }
     QRect screenRect() const;
     QPoint clientToScreen(const QPoint& point) const;
     QPoint screenToClient(const QPoint& point) const;
@@ -174,6 +179,7 @@ protected:
 private:
     friend HWND createWindow(const CREATESTRUCT& cs, CWnd* object, bool* stood);
     void realize(const CREATESTRUCT& cs);
+    void keepPlace();
     bool start(const CREATESTRUCT& cs);
     void markDestroyed();
     void tellDestroy();
@@ -190,6 +196,7 @@ private:
     QPointer<QWidget> m_widget;
     CWnd* m_object = nullptr;
     std::unique_ptr<CWnd> m_temporary;
+    std::unique_ptr<Placement> m_placement;
     DWORD m_style = 0;
     DWORD m_exStyle = 0;
     int m_id = 0;

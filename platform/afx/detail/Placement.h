@@ -1,0 +1,87 @@
+#pragma once
+
+/// @file
+/// Where a window with a caption stands, and where it goes back to from maximised or minimised.
+
+#include "platform/base/Export.h"
+
+#include <QRect>
+#include <QTimer>
+
+#include <optional>
+
+class QWidget;
+
+namespace tvx::afx {
+
+class Window;
+
+/// What a rectangle asked for measures.
+enum class Measured {
+    Frame,  ///< The window with its caption and borders.
+    Client, ///< The place is the frame's, the size that of the area inside.
+};
+
+/// Keeps the place of one top-level window or child frame.
+///
+/// The desktop puts its caption and borders around a window only when the window is shown, and tells their widths a
+/// little later. Until then only the size inside can be set: a rectangle asked for earlier is kept here and the frame
+/// brought to it once its borders are known. Window managers may still be busy with what they were told before, so a
+/// look back follows.
+///
+/// The restored rectangle follows the window while it is neither maximised nor minimised. Desktops tell a new size and
+/// a new state in either order, so it is taken only when all that they told at a time has been heard.
+class TVX_PLATFORM_API Placement {
+public:
+    explicit Placement(Window& window);
+    Placement(const Placement&) = delete;
+    Placement& operator=(const Placement&) = delete;
+
+    /// The frame of a top-level window as it is now, in screen coordinates.
+    QRect frameRect() const;
+    /// Moves the frame of a top-level window, at once or when its borders are known.
+    /// @param measured what the size means while the borders are not known
+    void moveFrame(const QRect& rect, Measured measured);
+    /// Makes `rect` the frame that the window goes back to, without touching it as long as it is maximised or
+    /// minimised.
+    void setRestored(const QRect& rect);
+    /// The frame the window has when it is neither maximised nor minimised.
+    QRect restored() const;
+
+    /// Called directly before the window is shown.
+    void aboutToShow();
+    /// Called for every change of place, size or state.
+    void changed();
+
+private:
+    struct Wish {
+        QRect rect;
+        Measured measured = Measured::Frame;
+        int attempts = 0; ///< How often the frame was moved for it.
+        int looks = 0;    ///< How often its borders were looked for.
+    };
+    QWidget& widget() const;
+    QMargins borders() const;
+    bool isNormal() const;
+    bool awaitsBorders() const;
+    void settle();
+    void grant();
+    void lookBack();
+    QRect wishedFrame() const;
+    void remember();
+
+    Window& m_window;
+    QTimer m_settle;
+    QTimer m_lookBack;
+    std::optional<Wish> m_wish;
+    QPoint m_askedCorner; ///< For desktops that do not tell where windows are.
+    QRect m_restored;
+    QSize m_restoredSize;  ///< The widget's own size for m_restored.
+    QRect m_before;        ///< The restored rectangle before the last change.
+    QRect m_specialInside; ///< The widget's geometry while last maximised or minimised.
+};
+
+/// The rectangle, moved and if need be shrunk so that enough of its caption to grasp shows on a screen.
+TVX_PLATFORM_API QRect reachableFrame(const QRect& frame);
+
+} // namespace tvx::afx
