@@ -3,6 +3,7 @@
 #include "afx.h"
 #include "platform/port/Version.h"
 #include "platform/win/ExtensionModule.h"
+#include "s/Locale.h"
 #include "s/Version.h"
 
 #include <new>
@@ -16,8 +17,10 @@ AFX_EXTENSION_MODULE s_state;
 class LibraryModule {
 public:
     LibraryModule() {
-        AfxInitExtensionModule(s_state, tvx::moduleFromAddress(&s_state));
+        const HINSTANCE instance = tvx::moduleFromAddress(&s_state);
+        AfxInitExtensionModule(s_state, instance);
         try {
+            Gui_Locale::SetDllResourceHandle(s_state, instance);
             new CDynLinkLibrary(s_state); // the chain owns it
         } catch (const std::bad_alloc&) {
             TRACE0("The library works without its resources in the chain.\n");

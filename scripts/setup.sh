@@ -24,6 +24,8 @@ build    llvm             llvm-rc compiles resource scripts
 display  xvfb             a display where there is none
 display  openbox          the window manager on that display
 display  fonts-dejavu-core  the font that tests and pictures are laid out with
+display  fonts-sawarabi-gothic  Japanese texts in tests and pictures; the smallest font with all of them
+display  qt6-translations-l10n  the toolkit's own texts in other languages
 tour     xdotool          keys and clicks of the guided tour
 tour     wmctrl           finds and activates windows in the guided tour
 tour     imagemagick      takes the pictures of the guided tour

@@ -3,9 +3,11 @@
 #include "platform/afx/App.h"
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/OwnText.h"
 #include "platform/afx/detail/Paths.h"
 #include "platform/afx/detail/Window.h"
 #include "platform/base/SystemPath.h"
+#include "platform/win/FrameworkIds.h"
 
 #include <QFileDialog>
 #include <QFileInfo>
@@ -87,6 +89,15 @@ private:
     ModalLoop m_loop;
 };
 
+void labelDialog(Dialog& dialog, bool open) {
+    dialog.setWindowTitle(ownText(open ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE));
+    dialog.setLabelText(QFileDialog::LookIn, ownText(TVX_IDS_FILE_LOOK_IN));
+    dialog.setLabelText(QFileDialog::FileName, ownText(TVX_IDS_FILE_NAME));
+    dialog.setLabelText(QFileDialog::FileType, ownText(TVX_IDS_FILE_TYPE));
+    dialog.setLabelText(QFileDialog::Accept, ownText(open ? TVX_IDS_FILE_OPEN : TVX_IDS_FILE_SAVE));
+    dialog.setLabelText(QFileDialog::Reject, ownText(TVX_IDS_FILE_CANCEL));
+}
+
 void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
     const bool several = (record.Flags & OFN_ALLOWMULTISELECT) != 0;
     const bool mustExist = (record.Flags & OFN_FILEMUSTEXIST) != 0;
@@ -94,6 +105,7 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
     dialog.setFileMode(!open || !mustExist ? QFileDialog::AnyFile
                        : several           ? QFileDialog::ExistingFiles
                                            : QFileDialog::ExistingFile);
+    labelDialog(dialog, open);
     dialog.setOption(QFileDialog::DontConfirmOverwrite, (record.Flags & OFN_OVERWRITEPROMPT) == 0);
     if (record.lpstrTitle != nullptr) {
         dialog.setWindowTitle(toQt(record.lpstrTitle));

@@ -2,8 +2,10 @@
 
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
+#include "platform/afx/detail/OwnText.h"
 #include "platform/afx/detail/Window.h"
 #include "platform/base/Exception.h"
+#include "platform/win/FrameworkIds.h"
 #include "platform/win/RegistryNotice.h"
 
 #include <QApplication>
@@ -27,18 +29,18 @@ namespace {
 
 struct BoxButton {
     int answer;
-    const char* label;
+    UINT label;
 };
 
 /// The buttons of each kind of box, in the order in which the kinds are numbered (MB_OK, MB_OKCANCEL, ...).
 const std::vector<BoxButton>& buttonsOf(UINT type) {
     static const std::array<std::vector<BoxButton>, 6> kinds{{
-        {{IDOK, "OK"}},
-        {{IDOK, "OK"}, {IDCANCEL, "Cancel"}},
-        {{IDABORT, "&Abort"}, {IDRETRY, "&Retry"}, {IDIGNORE, "&Ignore"}},
-        {{IDYES, "&Yes"}, {IDNO, "&No"}, {IDCANCEL, "Cancel"}},
-        {{IDYES, "&Yes"}, {IDNO, "&No"}},
-        {{IDRETRY, "&Retry"}, {IDCANCEL, "Cancel"}},
+        {{IDOK, TVX_IDS_OK}},
+        {{IDOK, TVX_IDS_OK}, {IDCANCEL, TVX_IDS_CANCEL}},
+        {{IDABORT, TVX_IDS_ABORT}, {IDRETRY, TVX_IDS_RETRY}, {IDIGNORE, TVX_IDS_IGNORE}},
+        {{IDYES, TVX_IDS_YES}, {IDNO, TVX_IDS_NO}, {IDCANCEL, TVX_IDS_CANCEL}},
+        {{IDYES, TVX_IDS_YES}, {IDNO, TVX_IDS_NO}},
+        {{IDRETRY, TVX_IDS_RETRY}, {IDCANCEL, TVX_IDS_CANCEL}},
     }};
     const UINT kind = type & MB_TYPEMASK;
     return kinds[kind < kinds.size() ? kind : 0];
@@ -146,7 +148,7 @@ private:
     }
 
     void addButton(const BoxButton& entry) {
-        QPushButton* button = QMessageBox::addButton(QString::fromLatin1(entry.label), QMessageBox::ActionRole);
+        QPushButton* button = QMessageBox::addButton(ownText(entry.label), QMessageBox::ActionRole);
         const int answer = entry.answer;
         QObject::disconnect(button, nullptr, this, nullptr);
         QObject::connect(button, &QPushButton::clicked, this, [this, answer] { finish(answer); });
@@ -205,7 +207,8 @@ QWidget* visibleOwner(HWND owner) {
 } // namespace
 
 int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
-    caption = caption != nullptr ? caption : "Error";
+    const std::string error = caption == nullptr ? fromQt(ownText(TVX_IDS_ERROR)) : std::string();
+    caption = caption != nullptr ? caption : error.c_str();
     if (!ensureGui()) {
         std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
         return defaultOf(type).answer;

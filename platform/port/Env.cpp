@@ -1,5 +1,7 @@
 #include "platform/port/Env.h"
 
+#include "platform/win/Installation.h"
+
 #include <cstdlib>
 
 const char* Port_Env::GetEnv(const char* name) {
@@ -7,11 +9,5 @@ const char* Port_Env::GetEnv(const char* name) {
 }
 
 std::vector<std::string> Port_Env::GetRoots() {
-    std::vector<std::string> roots;
-    for (const char* variable : {"MYTARVEX", "TARVEX"}) {
-        const char* root = GetEnv(variable);
-        if (root && *root)
-            roots.emplace_back(root);
-    }
-    return roots;
+    return tvx::installationRoots();
 }

@@ -184,7 +184,7 @@ bool activate(WindowId window) {
     xcb_ewmh_request_change_active_window(x->ewmh(), x->screen(), window, XCB_EWMH_CLIENT_SOURCE_TYPE_OTHER, x->now(),
                                           XCB_WINDOW_NONE);
     const bool done =
-        x->await(x->root(), patience, [&] { return activeWindow(*x) == window && !isIconic(*x, window); });
+        x->await({x->root(), window}, patience, [&] { return activeWindow(*x) == window && !isIconic(*x, window); });
     if (!done)
         changeStates(*x, window, XCB_EWMH_WM_STATE_ADD, x->ewmh()->_NET_WM_STATE_DEMANDS_ATTENTION, XCB_ATOM_NONE);
     return done;

@@ -104,6 +104,7 @@ constexpr TextEntry textTable[] = {
     {ERROR_DIRECTORY, "The name is not that of a folder."},
     {ERROR_OPERATION_ABORTED, "The operation was interrupted."},
     {ERROR_NOACCESS, "The memory address is not valid."},
+    {ERROR_INVALID_FLAGS, "A flag is wrong."},
     {ERROR_BADKEY, "The settings key is not valid."},
     {ERROR_REGISTRY_CORRUPT, "The file of the settings is damaged."},
     {ERROR_REGISTRY_IO_FAILED, "The file of the settings could not be read or written."},

@@ -2,6 +2,7 @@
 
 #include "platform/base/StringSource.h"
 #include "platform/win/Resource.h"
+#include "platform/win/ResourceLibrary.h"
 
 #include <algorithm>
 #include <concepts>
@@ -26,6 +27,12 @@ void join(CDynLinkLibrary* link) {
     links.insert(place, link);
 }
 
+// The layer's own texts in the user's language. Looked for when a search comes so far for the first time.
+HINSTANCE layerTranslation() {
+    static const HINSTANCE module = tvx::loadTranslation(tvx::platformModule());
+    return module;
+}
+
 // The first module of the search that `has` what is looked for; null when none has.
 HINSTANCE search(std::predicate<HINSTANCE> auto has) {
     for (const HINSTANCE module : {AfxGetResourceHandle(), AfxGetInstanceHandle()})
@@ -35,8 +42,10 @@ HINSTANCE search(std::predicate<HINSTANCE> auto has) {
         for (const HINSTANCE module : {link->m_hResource, link->m_hModule})
             if (module != nullptr && has(module))
                 return module;
-    const HINSTANCE layer = tvx::platformModule();
-    return layer != nullptr && has(layer) ? layer : nullptr;
+    for (const HINSTANCE module : {layerTranslation(), tvx::platformModule()})
+        if (module != nullptr && has(module))
+            return module;
+    return nullptr;
 }
 
 bool loadStringForBase(HINSTANCE module, UINT id, std::string& text) {

@@ -2,7 +2,8 @@
 
 /// @file
 /// The framework's search for resources: the current resource module, the application, then the chain of extension
-/// modules (newest first) and last the layer itself with the framework's own strings and dialogs.
+/// modules (newest first) and last the layer itself with the framework's own strings and dialogs. Where a module has a
+/// translation (ResourceLibrary.h) that stands before it.
 ///
 /// A shared library that brings resources joins the chain once, when it is loaded:
 ///

@@ -208,6 +208,29 @@
 #define AFX_IDP_ARCH_BADCLASS 0xF1D6
 #define AFX_IDP_ARCH_BADSCHEMA 0xF1D7
 
+/* Texts of the system's own parts: message boxes, system menus, file dialogs */
+#define TVX_IDS_OK 0xF300
+#define TVX_IDS_CANCEL 0xF301
+#define TVX_IDS_ABORT 0xF302
+#define TVX_IDS_RETRY 0xF303
+#define TVX_IDS_IGNORE 0xF304
+#define TVX_IDS_YES 0xF305
+#define TVX_IDS_NO 0xF306
+#define TVX_IDS_ERROR 0xF307
+#define TVX_IDS_SYS_RESTORE 0xF310
+#define TVX_IDS_SYS_MOVE 0xF311
+#define TVX_IDS_SYS_SIZE 0xF312
+#define TVX_IDS_SYS_MINIMIZE 0xF313
+#define TVX_IDS_SYS_MAXIMIZE 0xF314
+#define TVX_IDS_SYS_CLOSE 0xF315
+#define TVX_IDS_SYS_CLOSE_CHILD 0xF316
+#define TVX_IDS_FILE_LOOK_IN 0xF320
+#define TVX_IDS_FILE_NAME 0xF321
+#define TVX_IDS_FILE_TYPE 0xF322
+#define TVX_IDS_FILE_OPEN 0xF323
+#define TVX_IDS_FILE_SAVE 0xF324
+#define TVX_IDS_FILE_CANCEL 0xF325
+
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721
 #define AFX_IDC_LISTBOX 100

@@ -44,13 +44,10 @@ std::string pathOf(const void* base) {
 
 // What a module is called, in lower case: "guiutilities" for /usr/lib/libGuiUtilities.so.1.
 std::string plainName(std::string_view path) {
-    if (const auto slash = path.find_last_of("/\\"); slash != std::string_view::npos)
-        path.remove_prefix(slash + 1);
-    std::string name = text::toLower(path);
-    if (const auto extension = name.find(".so"); extension != std::string::npos)
-        name.erase(extension);
-    if (path.size() > name.size() && name.starts_with("lib"))
-        name.erase(0, 3);
+    std::string name = plainModuleName(path);
+    if (const auto slash = name.find_last_of("/\\"); slash != std::string::npos)
+        name.erase(0, slash + 1);
+    name = text::toLower(name);
     for (const std::string_view extension : {".dll", ".exe"})
         if (name.ends_with(extension))
             name.erase(name.size() - extension.size());
@@ -109,6 +106,31 @@ void ModuleTable::remove(const void* data) {
         std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
 }
 
+HMODULE ModuleTable::useFile(const std::string& path) {
+    const std::scoped_lock lock(m_mutex);
+    const auto found = std::ranges::find_if(
+        m_modules, [&](const auto& owned) { return owned->isResourceLibrary() && owned->path() == path; });
+    if (found == m_modules.end())
+        return nullptr;
+    ++(*found)->uses;
+    return (*found)->handle();
+}
+
+HMODULE ModuleTable::addFile(std::string path, std::vector<std::uint8_t> bytes) {
+    const std::scoped_lock lock(m_mutex);
+    return m_modules.emplace_back(std::make_unique<Module>(std::move(path), std::move(bytes)))->handle();
+}
+
+bool ModuleTable::releaseFile(HMODULE handle) {
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byHandle(handle);
+    if (module == nullptr || !module->isResourceLibrary())
+        return false;
+    if (--module->uses == 0)
+        std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+    return true;
+}
+
 HMODULE ModuleTable::application() {
     const std::scoped_lock lock(m_mutex);
     return applicationModule().handle();
@@ -152,6 +174,8 @@ Module& ModuleTable::applicationModule() {
 }
 
 Module* ModuleTable::byBase(const void* base) {
+    if (base == nullptr)
+        return nullptr;
     const auto found = std::ranges::find_if(m_modules, [&](const auto& owned) { return owned->base() == base; });
     return found == m_modules.end() ? nullptr : found->get();
 }
@@ -175,6 +199,20 @@ void registerResources(const void* anchor, const void* data, std::size_t size) {
 
 void unregisterResources(const void* data) {
     ModuleTable::instance().remove(data);
+}
+
+std::string plainModuleName(std::string_view path) {
+    const auto slash = path.find_last_of("/\\");
+    std::string folder(path.substr(0, slash == std::string_view::npos ? 0 : slash + 1));
+    std::string_view file = path.substr(folder.size());
+    constexpr std::string_view prefix = "lib";
+    const auto extension = text::toLower(file).find(".so");
+    if (extension == std::string::npos)
+        return std::string(path);
+    file = file.substr(0, extension);
+    if (text::startsWithNoCase(file, prefix))
+        file.remove_prefix(prefix.size());
+    return folder.append(file);
 }
 
 HMODULE moduleFromAddress(const void* address) {

@@ -1,8 +1,9 @@
 #pragma once
 
 /// @file
-/// Modules: the application and every shared library that brought resources. A module's handle is valid from the
-/// moment its file is loaded until it is unloaded; nobody frees it.
+/// Modules: the application, every shared library that brought resources, and the resource libraries that were loaded
+/// (ResourceLibrary.h). A module's handle is valid from the moment its file is loaded until it is unloaded; only
+/// handles of resource libraries are freed.
 
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
@@ -11,6 +12,7 @@
 #include <cstdint>
 #include <span>
 #include <string>
+#include <string_view>
 
 /// The module whose file has this name; null asks for the application. Only the last part of a path counts, with or
 /// without "lib" in front and an extension behind ("GuiUtilities" finds libGuiUtilities.so.1), in any case.
@@ -53,6 +55,10 @@ TVX_PLATFORM_API void unregisterResources(const void* data);
 /// The full path of a module's file in the system's form, links resolved, whatever its length. A null module is the
 /// application; empty when the module is unknown.
 [[nodiscard]] TVX_PLATFORM_API std::string moduleFileName(HMODULE module);
+
+/// A module's path without what this system adds to the names of shared libraries: "/opt/lib/GuiUtilities" for
+/// "/opt/lib/libGuiUtilities.so.1.0.0". Other names stay as they are.
+[[nodiscard]] TVX_PLATFORM_API std::string plainModuleName(std::string_view path);
 
 /// The application's module. It exists even when the application has no resources.
 [[nodiscard]] TVX_PLATFORM_API HMODULE applicationModule();

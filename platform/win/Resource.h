@@ -10,6 +10,7 @@
 
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
+#include "platform/win/Locale.h"
 #include "platform/win/Module.h"
 
 #include <optional>
@@ -33,15 +34,6 @@
 #define RT_DLGINIT MAKEINTRESOURCE(240)
 /// Tool bars.
 #define RT_TOOLBAR MAKEINTRESOURCE(241)
-
-/// A language identifier from a LANG_ and a SUBLANG_ number.
-constexpr WORD MAKELANGID(int primary, int sub) {
-    return static_cast<WORD>((sub << 10) | primary);
-}
-/// The low 10 bits of a language identifier: the language without its country.
-constexpr WORD PRIMARYLANGID(WORD language) {
-    return static_cast<WORD>(language & 0x3FF);
-}
 
 /// A resource of `module` (null: the application). The handle needs no freeing. Null with
 /// `ERROR_RESOURCE_DATA_NOT_FOUND` (the module has no resources, or damaged ones), `ERROR_RESOURCE_TYPE_NOT_FOUND` or

@@ -14,6 +14,7 @@ namespace {
 constexpr std::uint16_t ordinalMark = 0xFFFF;
 // Two lengths, two names of at least two bytes each, and 16 bytes of versions, flags and language.
 constexpr std::uint32_t smallestHeader = 28;
+constexpr std::uint32_t headSize = 32;
 
 std::string keyOf(WORD number) {
     return "#" + std::to_string(number);
@@ -39,8 +40,8 @@ std::string readKey(ByteReader& reader) {
 // The list begins with an empty entry, which tells this format from older ones.
 bool isListHead(ResourceBytes data) {
     ByteReader reader(data);
-    return reader.u32() == 0 && reader.u32() == 32 && reader.u16() == ordinalMark && reader.u16() == 0 &&
-           reader.u16() == ordinalMark && reader.u16() == 0;
+    return data.size() >= headSize && reader.u32() == 0 && reader.u32() == headSize && reader.u16() == ordinalMark &&
+           reader.u16() == 0 && reader.u16() == ordinalMark && reader.u16() == 0;
 }
 
 std::string damageAt(const char* what, std::size_t offset) {
@@ -92,7 +93,7 @@ ResourceIndex::ResourceIndex(ResourceBytes data) {
         return;
     }
     ByteReader reader(data);
-    reader.skip(32);
+    reader.skip(headSize);
     while (reader.remaining() > 0 && m_damage.empty())
         m_entries.push_back(readEntry(reader, m_damage));
     if (!m_damage.empty()) {

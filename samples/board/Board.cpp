@@ -7,6 +7,7 @@
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
 #include "s/FileName.h"
+#include "s/Locale.h"
 
 #include <algorithm>
 #include <cstdlib>
@@ -81,6 +82,7 @@ CBoardApp::CBoardApp() : Gui_WinApp("board") {}
 
 BOOL CBoardApp::InitInstance() {
     Port_MsgDispatcher::addMsgMan(&m_messages);
+    Gui_Locale::SetAppResourceHandle();
     SetRegistryKey("Tarvex");
 
     CBoardCommandLine info;

@@ -6,11 +6,16 @@
 #include "platform/afx/detail/MessageQueue.h"
 #include "platform/win/Display.h"
 #include "platform/win/Module.h"
+#include "platform/win/ResourceConstants.h"
 #include "platform/win/Thread.h"
+#include "platform/win/detail/LanguageTable.h"
 
 #include <QAbstractEventDispatcher>
 #include <QApplication>
+#include <QLibraryInfo>
+#include <QLocale>
 #include <QThread>
+#include <QTranslator>
 
 #include <clocale>
 #include <cstdio>
@@ -55,6 +60,21 @@ bool askDisplay() {
     return (wayland != nullptr && *wayland != '\0') || canOpenDisplay();
 }
 
+/// The toolkit's own texts (menus of text fields, lists of files) in the user's language, where they are installed.
+void translateToolkit() {
+    const LCID locale = GetUserDefaultLCID();
+    const tvx::detail::Language* language = tvx::detail::languageOf(locale);
+    if (language == nullptr || PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH) {
+        return;
+    }
+    auto* translator = new QTranslator(QCoreApplication::instance());
+    const QString folder = QLibraryInfo::path(QLibraryInfo::TranslationsPath);
+    if (translator->load(QLocale(QLatin1String(language->name)), QStringLiteral("qtbase"), QStringLiteral("_"),
+                         folder)) {
+        QCoreApplication::installTranslator(translator);
+    }
+}
+
 void makeApplication() {
     static int argc = 1;
     static std::string name = moduleFileName(nullptr);
@@ -64,6 +84,7 @@ void makeApplication() {
     QApplication::setQuitOnLastWindowClosed(false);
     QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, application,
                      &runIdle);
+    translateToolkit();
     // The toolkit has taken the process's locale from the environment; numbers keep their point.
     std::setlocale(LC_NUMERIC, "C");
     MessageQueue::instance().moveToThread(application->thread());

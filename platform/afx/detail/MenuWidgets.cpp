@@ -7,7 +7,9 @@
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/MdiWindow.h"
+#include "platform/afx/detail/OwnText.h"
 #include "platform/afx/detail/Window.h"
+#include "platform/win/FrameworkIds.h"
 
 #include <QActionGroup>
 #include <QApplication>
@@ -315,13 +317,16 @@ std::unordered_map<std::uintptr_t, HMENU>& systemMenus() {
 HMENU makeSystemMenu(const Window& window) {
     const HMENU menu = CreatePopupMenu();
     const auto state = [&window](DWORD bit) { return (window.style() & bit) != 0 ? MF_ENABLED : MF_GRAYED; };
-    AppendMenuA(menu, MF_STRING, SC_RESTORE, "&Restore");
-    AppendMenuA(menu, MF_STRING, SC_MOVE, "&Move");
-    AppendMenuA(menu, MF_STRING | state(WS_THICKFRAME), SC_SIZE, "&Size");
-    AppendMenuA(menu, MF_STRING | state(WS_MINIMIZEBOX), SC_MINIMIZE, "Mi&nimize");
-    AppendMenuA(menu, MF_STRING | state(WS_MAXIMIZEBOX), SC_MAXIMIZE, "Ma&ximize");
+    const auto append = [menu](UINT flags, UINT command, UINT text) {
+        AppendMenuA(menu, MF_STRING | flags, command, fromQt(ownText(text)).c_str());
+    };
+    append(0, SC_RESTORE, TVX_IDS_SYS_RESTORE);
+    append(0, SC_MOVE, TVX_IDS_SYS_MOVE);
+    append(state(WS_THICKFRAME), SC_SIZE, TVX_IDS_SYS_SIZE);
+    append(state(WS_MINIMIZEBOX), SC_MINIMIZE, TVX_IDS_SYS_MINIMIZE);
+    append(state(WS_MAXIMIZEBOX), SC_MAXIMIZE, TVX_IDS_SYS_MAXIMIZE);
     AppendMenuA(menu, MF_SEPARATOR, 0, nullptr);
-    AppendMenuA(menu, MF_STRING, SC_CLOSE, window.isChild() ? "&Close\tCtrl+F4" : "&Close\tAlt+F4");
+    append(0, SC_CLOSE, window.isChild() ? TVX_IDS_SYS_CLOSE_CHILD : TVX_IDS_SYS_CLOSE);
     SetMenuDefaultItem(menu, SC_CLOSE, 0);
     return menu;
 }

@@ -16,6 +16,14 @@ class Module {
 public:
     /// @param base the loader's entry of the file, which identifies it while it is loaded
     explicit Module(const void* base) : m_base(base) {}
+    /// A resource library, which has no code and so no entry of the loader.
+    /// @param path  the file's full path with links resolved
+    /// @param bytes its contents
+    Module(std::string path, std::vector<std::uint8_t> bytes) : m_path(std::move(path)), m_file(std::move(bytes)) {
+        add(m_file);
+    }
+    Module(const Module&) = delete;
+    Module& operator=(const Module&) = delete;
 
     [[nodiscard]] const void* base() const {
         return m_base;
@@ -26,6 +34,11 @@ public:
     [[nodiscard]] bool isEmpty() const {
         return m_parts.empty();
     }
+    [[nodiscard]] bool isResourceLibrary() const {
+        return m_base == nullptr;
+    }
+    /// How often a resource library was asked for and not given back.
+    int uses = 1;
     /// The file's full path with links resolved; worked out when first asked for.
     const std::string& path();
 
@@ -40,8 +53,9 @@ private:
         std::unique_ptr<ResourceIndex> index;
     };
 
-    const void* m_base;
+    const void* m_base = nullptr;
     std::string m_path;
+    std::vector<std::uint8_t> m_file;
     std::vector<Part> m_parts;
 };
 
@@ -52,6 +66,13 @@ public:
 
     void add(const void* anchor, ResourceBytes data);
     void remove(const void* data);
+
+    /// The resource library of that path, used once more; null when it is not loaded.
+    [[nodiscard]] HMODULE useFile(const std::string& path);
+    /// Keeps a resource library.
+    HMODULE addFile(std::string path, std::vector<std::uint8_t> bytes);
+    /// Ends one use of a resource library. False when `handle` is none.
+    bool releaseFile(HMODULE handle);
 
     [[nodiscard]] HMODULE application();
     [[nodiscard]] HMODULE fromAddress(const void* address);

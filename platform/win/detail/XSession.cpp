@@ -64,13 +64,14 @@ xcb_timestamp_t XConnection::now() {
     return XCB_CURRENT_TIME;
 }
 
-bool XConnection::await(xcb_window_t window, std::chrono::milliseconds longest, const std::function<bool()>& holds) {
+bool XConnection::await(std::initializer_list<xcb_window_t> windows, std::chrono::milliseconds longest,
+                        const std::function<bool()>& holds) {
     const auto end = std::chrono::steady_clock::now() + longest;
-    listen(window, XCB_EVENT_MASK_PROPERTY_CHANGE);
+    listen(windows, XCB_EVENT_MASK_PROPERTY_CHANGE);
     bool held = holds();
     while (!held && waitForEvent(end))
         held = holds();
-    listen(window, XCB_EVENT_MASK_NO_EVENT);
+    listen(windows, XCB_EVENT_MASK_NO_EVENT);
     return held;
 }
 
@@ -88,8 +89,9 @@ bool XConnection::waitForEvent(std::chrono::steady_clock::time_point end) {
     }
 }
 
-void XConnection::listen(xcb_window_t window, std::uint32_t events) {
-    xcb_change_window_attributes(m_xcb, window, XCB_CW_EVENT_MASK, &events);
+void XConnection::listen(std::initializer_list<xcb_window_t> windows, std::uint32_t events) {
+    for (const xcb_window_t window : windows)
+        xcb_change_window_attributes(m_xcb, window, XCB_CW_EVENT_MASK, &events);
     xcb_flush(m_xcb);
 }
 

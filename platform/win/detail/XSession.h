@@ -6,6 +6,7 @@
 #include <chrono>
 #include <cstdlib>
 #include <functional>
+#include <initializer_list>
 #include <memory>
 #include <mutex>
 #include <string>
@@ -55,12 +56,13 @@ public:
     [[nodiscard]] std::string text(xcb_window_t window, xcb_atom_t property) const;
     /// The display's time at this moment. Window managers refuse requests that seem older than what the user did last.
     [[nodiscard]] xcb_timestamp_t now();
-    /// Looks again whenever a property of `window` changes, until `holds` or the time is over.
-    bool await(xcb_window_t window, std::chrono::milliseconds longest, const std::function<bool()>& holds);
+    /// Looks again whenever a property of one of the windows changes, until `holds` or the time is over.
+    bool await(std::initializer_list<xcb_window_t> windows, std::chrono::milliseconds longest,
+               const std::function<bool()>& holds);
 
 private:
     bool waitForEvent(std::chrono::steady_clock::time_point end);
-    void listen(xcb_window_t window, std::uint32_t events);
+    void listen(std::initializer_list<xcb_window_t> windows, std::uint32_t events);
 
     std::string m_display;
     int m_screen = 0;
