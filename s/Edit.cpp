@@ -141,6 +141,37 @@ CString lastPart(const CString& text, int limit) {
     return part;
 }
 
+/// What the user sees of a control of many lines. When that is not the end, or something is selected, it stays while
+/// the text changes around it.
+class View {
+public:
+    explicit View(CEdit& edit, bool isSelected)
+        : m_edit(edit), m_first(edit.GetFirstVisibleLine()), m_lines(edit.GetLineCount()) {
+        m_stays = isSelected || (edit.IsWindowVisible() && !seesEnd());
+    }
+    /// Call it when the oldest text has gone, and before the new one comes.
+    void textDropped() {
+        m_first = std::max(m_first - (m_lines - m_edit.GetLineCount()), 0);
+    }
+    void restore() {
+        // To the very end: the caret's line can be in sight with the bar a line short of it.
+        const int first = m_stays ? m_first : m_edit.GetLineCount();
+        m_edit.LineScroll(first - m_edit.GetFirstVisibleLine());
+    }
+
+private:
+    bool seesEnd() const {
+        SCROLLINFO bar{};
+        bar.cbSize = sizeof(bar);
+        return !m_edit.GetScrollInfo(SB_VERT, &bar) || bar.nPos + std::max<int>(bar.nPage, 1) > bar.nMax;
+    }
+
+    CEdit& m_edit;
+    int m_first;
+    int m_lines;
+    bool m_stays = false;
+};
+
 /// Deletes at least `bytes` from the beginning of the text, in whole characters. The result is how many went.
 int dropOldest(CEdit& edit, int bytes) {
     const int before = edit.GetWindowTextLength();
@@ -165,6 +196,7 @@ void Gui_Edit::AppendText(CEdit& edit, const CString& text) {
     int end = 0;
     edit.GetSel(start, end);
     const bool selected = start != end;
+    View view(edit, selected);
     const int limit = limitOf(edit);
     const CString added = lastPart(text, limit);
     const int excess = added.GetLength() - (limit - edit.GetWindowTextLength());
@@ -172,10 +204,12 @@ void Gui_Edit::AppendText(CEdit& edit, const CString& text) {
         const int dropped = dropOldest(edit, excess);
         start = std::max(start - dropped, 0);
         end = std::max(end - dropped, 0);
+        view.textDropped();
     }
     const int length = edit.GetWindowTextLength();
-    edit.SetSel(length, length);
+    edit.SetSel(length, length, TRUE);
     edit.ReplaceSel(added, FALSE);
     if (selected)
         edit.SetSel(start, end, TRUE);
+    view.restore();
 }

@@ -39,7 +39,8 @@ public:
 
     /// Appends a text and drops the oldest text that the control's limit has no room for; of a text larger than the
     /// limit the end is kept. What was selected stays selected as far as it is still there, otherwise the caret stands
-    /// behind the new text.
+    /// behind the new text. The view follows the new text when the end was in sight and nothing selected; else the
+    /// lines that the user looks at stay where they are.
     ///
     /// A control without a limit (0) gets one: 60000, of one line 30000. Zero bytes become blanks. Nothing can be
     /// undone afterwards.

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstring>
 #include <numbers>
+#include <optional>
 #include <vector>
 
 using namespace tvx::afx;
@@ -110,7 +111,9 @@ CSize measure(HDC handle, std::string_view text) {
     const auto font = dc ? dc->font() : nullptr;
     if (!font)
         return {};
-    const QSize size = dc->state.mapping.sizeToLogical({TextLine(*font, text).width(), font->metrics.height()});
+    const std::optional<int> sum = font->advances.widthOf(text);
+    const int width = sum ? *sum : TextLine(*font, text).width();
+    const QSize size = dc->state.mapping.sizeToLogical({width, font->metrics.height()});
     return {size.width(), size.height()};
 }
 

@@ -7,6 +7,7 @@
 #include "platform/afx/detail/PlainWindow.h"
 #include "platform/base/Text.h"
 
+#include <QAbstractScrollArea>
 #include <QScreen>
 #include <QScrollBar>
 
@@ -405,8 +406,17 @@ BOOL CWnd::KillTimer(UINT_PTR id) {
 namespace {
 
 QScrollBar* barOf(const CWnd& window, int bar) {
-    const auto* plain = dynamic_cast<const PlainWindow*>(window.GetState());
-    return plain != nullptr && plain->widget() != nullptr ? plain->scrollBar(bar) : nullptr;
+    const Window* state = window.GetState();
+    if (state == nullptr || state->widget() == nullptr) {
+        return nullptr;
+    }
+    if (const auto* plain = dynamic_cast<const PlainWindow*>(state)) {
+        return plain->scrollBar(bar);
+    }
+    // Edit and list controls keep the ranges of their bars themselves.
+    const auto* area = dynamic_cast<const QAbstractScrollArea*>(state->widget());
+    const bool exists = area != nullptr && (state->style() & (bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL)) != 0;
+    return !exists ? nullptr : bar == SB_HORZ ? area->horizontalScrollBar() : area->verticalScrollBar();
 }
 
 } // namespace
@@ -446,6 +456,11 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     if (slider == nullptr) {
         return FALSE;
     }
+    auto* plain = dynamic_cast<PlainWindow*>(GetState());
+    if (plain == nullptr) {
+        slider->setValue((info->fMask & SIF_POS) != 0 ? info->nPos : slider->value());
+        return TRUE;
+    }
     SCROLLINFO now{};
     GetScrollInfo(bar, &now, SIF_ALL);
     if ((info->fMask & SIF_RANGE) != 0) {
@@ -465,7 +480,6 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     // A bar that has nothing to scroll disappears, unless it is to stay disabled.
     const bool needed = last > now.nMin;
     slider->setEnabled(needed);
-    auto* plain = static_cast<PlainWindow*>(GetState());
     plain->showScrollBar(bar, needed || (info->fMask & SIF_DISABLENOSCROLL) != 0);
     return TRUE;
 }

@@ -9,6 +9,7 @@
 #include <QComboBox>
 #include <QLineEdit>
 #include <QPainter>
+#include <QScopedValueRollback>
 #include <QStringListModel>
 #include <QStylePainter>
 #include <QStyledItemDelegate>
@@ -96,7 +97,14 @@ public:
     }
 
 protected:
+    /// Some styles open boxes that are not typed into as menus, which show all lines however many were asked for. A box
+    /// that says it can be typed into opens as a list.
+    void initStyleOption(QStyleOptionComboBox* option) const override {
+        QComboBox::initStyleOption(option);
+        option->editable = option->editable || !m_painting;
+    }
     void paintEvent(QPaintEvent* event) override {
+        const QScopedValueRollback painting(m_painting, true);
         if (!m_window.isOwnerDrawn() || m_window.isEditable()) {
             QComboBox::paintEvent(event);
             return;
@@ -123,6 +131,7 @@ protected:
 private:
     ComboBoxWindow& m_window;
     bool m_open = false;
+    bool m_painting = false;
 };
 
 std::unique_ptr<Window> makeComboBox(const CREATESTRUCT& cs) {

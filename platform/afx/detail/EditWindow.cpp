@@ -27,29 +27,6 @@ std::unique_ptr<Window> makeEdit(const CREATESTRUCT& cs) {
 
 const WindowClassEntry editEntry("Edit", &makeEdit);
 
-/// Bytes of the character that begins at `at`, and the units it takes.
-struct Step {
-    int bytes = 1;
-    int units = 1;
-};
-
-Step stepAt(const QString& text, int at) {
-    const QChar c = text.at(at);
-    if (c == QLatin1Char('\n')) {
-        return {2, 1};
-    }
-    if (c.isHighSurrogate() && at + 1 < text.size() && text.at(at + 1).isLowSurrogate()) {
-        return {4, 2};
-    }
-    return {c.unicode() < 0x80 ? 1 : c.unicode() < 0x800 ? 2 : 3, 1};
-}
-
-QString plainLines(QString text) {
-    text.replace(QLatin1String("\r\n"), QLatin1String("\n"));
-    text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
-    return text;
-}
-
 /// A field of one line ends at the first line end of a text put into it.
 QString firstLine(const QString& text) {
     const int end = text.indexOf(QLatin1Char('\n'));
@@ -57,29 +34,6 @@ QString firstLine(const QString& text) {
 }
 
 } // namespace
-
-int hostBytes(const QString& text, int units) {
-    int bytes = 0;
-    for (int at = 0; at < units && at < text.size();) {
-        const Step step = stepAt(text, at);
-        bytes += step.bytes;
-        at += step.units;
-    }
-    return bytes;
-}
-
-int toolkitUnits(const QString& text, int bytes) {
-    int at = 0;
-    while (at < text.size()) {
-        const Step step = stepAt(text, at);
-        if (step.bytes > bytes) {
-            break;
-        }
-        bytes -= step.bytes;
-        at += step.units;
-    }
-    return at;
-}
 
 EditWindow::EditWindow(const CREATESTRUCT& cs) : Control(cs), m_limit(defaultLimit) {}
 
@@ -193,7 +147,7 @@ void EditWindow::applyColors(QPalette& palette, const QColor& text, const QColor
 
 // --- typing ---
 
-void EditWindow::insert(QString text, Source source) {
+void EditWindow::insert(QString text, Source source, Undo undo) {
     text = isMultiLine() ? plainLines(text) : firstLine(plainLines(text));
     if ((style() & ES_UPPERCASE) != 0) {
         text = text.toUpper();
@@ -201,10 +155,9 @@ void EditWindow::insert(QString text, Source source) {
         text = text.toLower();
     }
     if (source == Source::User) {
-        const QString now = m_field->text();
         const TextRange selection = m_field->selection();
-        const int kept = hostBytes(now, static_cast<int>(now.size())) -
-                         (hostBytes(now, selection.last()) - hostBytes(now, selection.first()));
+        const int replaced = m_field->bytesAt(selection.last()) - m_field->bytesAt(selection.first());
+        const int kept = m_field->bytes() - replaced;
         const int units = toolkitUnits(text, std::max(m_limit - kept, 0));
         if (units < text.size()) {
             text.truncate(units);
@@ -215,7 +168,7 @@ void EditWindow::insert(QString text, Source source) {
             }
         }
     }
-    guarded([&] { m_field->insert(text); });
+    guarded([&] { m_field->insert(text, undo); });
     m_field->setModified(true);
 }
 
@@ -305,24 +258,18 @@ LRESULT EditWindow::showMenu(LPARAM place) {
 // --- selection and lines ---
 
 void EditWindow::select(LONG_PTR start, LONG_PTR end) {
-    const QString text = m_field->text();
-    const int size = static_cast<int>(text.size());
-    const auto units = [&](LONG_PTR bytes) { return bytes < 0 ? size : toolkitUnits(text, text::clampToInt32(bytes)); };
-    const TextRange now = m_field->selection();
-    guarded([&] {
-        if (start == -1) {
-            m_field->select({now.caret, now.caret});
-        } else {
-            m_field->select({units(start), units(end)});
-        }
-    });
+    const auto position = [&](LONG_PTR bytes) {
+        return m_field->positionAt(bytes < 0 ? m_field->bytes() : text::clampToInt32(bytes));
+    };
+    const int caret = m_field->selection().caret;
+    const TextRange range = start == -1 ? TextRange{caret, caret} : TextRange{position(start), position(end)};
+    guarded([&] { m_field->select(range); });
 }
 
 LRESULT EditWindow::selectedBytes(WPARAM start, LPARAM end) const {
-    const QString text = m_field->text();
     const TextRange range = m_field->selection();
-    const int first = hostBytes(text, range.first());
-    const int last = hostBytes(text, range.last());
+    const int first = m_field->bytesAt(range.first());
+    const int last = range.first() == range.last() ? first : m_field->bytesAt(range.last());
     if (start != 0) {
         *reinterpret_cast<DWORD*>(start) = static_cast<DWORD>(first);
     }
@@ -332,56 +279,39 @@ LRESULT EditWindow::selectedBytes(WPARAM start, LPARAM end) const {
     return first > 0xFFFF || last > 0xFFFF ? -1 : MAKELONG(first, last);
 }
 
-QString EditWindow::lineText(const std::vector<int>& starts, std::size_t line) const {
-    const QString text = m_field->text();
-    const int end = line + 1 < starts.size() ? starts[line + 1] : static_cast<int>(text.size());
-    QString part = text.mid(starts[line], end - starts[line]);
-    if (part.endsWith(QLatin1Char('\n'))) {
-        part.chop(1);
-    }
-    return part;
+bool EditWindow::hasLine(int number) const {
+    return number >= 0 && number < m_field->lineCount();
 }
 
-int EditWindow::lineAt(int position) const {
-    const auto starts = m_field->lineStarts();
-    const auto next = std::upper_bound(starts.begin(), starts.end(), position);
-    return std::max(static_cast<int>(next - starts.begin()) - 1, 0);
-}
-
-LRESULT EditWindow::copyLine(int line, char* buffer) const {
-    const auto starts = m_field->lineStarts();
-    if (line < 0 || static_cast<std::size_t>(line) >= starts.size()) {
+LRESULT EditWindow::copyLine(int number, char* buffer) const {
+    if (!hasLine(number)) {
         return 0;
     }
     // The buffer's first word tells its size; no zero is written behind the text.
     WORD capacity = 0;
     std::memcpy(&capacity, buffer, sizeof(capacity));
-    const std::string text = fromQt(lineText(starts, static_cast<std::size_t>(line)));
+    const std::string text = fromQt(m_field->line(number).text);
     const std::size_t length = text::characterStart(text, std::min<std::size_t>(capacity, text.size()));
     std::copy_n(text.data(), length, buffer);
     return static_cast<LRESULT>(length);
 }
 
 LRESULT EditWindow::lineProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
-    const auto starts = m_field->lineStarts();
-    const QString text = m_field->text();
     const auto number = static_cast<int>(wParam);
     const bool current = number == -1;
     switch (message) {
     case EM_GETLINECOUNT:
-        return static_cast<LRESULT>(starts.size());
+        return m_field->lineCount();
     case EM_LINEINDEX: {
-        const int line = current ? lineAt(m_field->selection().caret) : number;
-        const bool exists = line >= 0 && static_cast<std::size_t>(line) < starts.size();
-        return exists ? hostBytes(text, starts[static_cast<std::size_t>(line)]) : -1;
+        const int line = current ? m_field->lineAt(m_field->selection().caret) : number;
+        return hasLine(line) ? m_field->bytesAt(m_field->line(line).start) : -1;
     }
     case EM_LINELENGTH: {
-        const int position = current ? m_field->selection().caret : toolkitUnits(text, number);
-        const QString line = lineText(starts, static_cast<std::size_t>(lineAt(position)));
-        return hostBytes(line, static_cast<int>(line.size()));
+        const int position = current ? m_field->selection().caret : m_field->positionAt(number);
+        return hostBytes(m_field->line(m_field->lineAt(position)).text);
     }
     case EM_LINEFROMCHAR:
-        return lineAt(current ? m_field->selection().first() : toolkitUnits(text, number));
+        return m_field->lineAt(current ? m_field->selection().first() : m_field->positionAt(number));
     case EM_GETLINE:
         return copyLine(number, reinterpret_cast<char*>(lParam));
     default:
@@ -398,10 +328,7 @@ LRESULT EditWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
         select(static_cast<int>(wParam), static_cast<int>(lParam));
         return 0;
     case EM_REPLACESEL:
-        insert(toQt(reinterpret_cast<const char*>(lParam)), Source::Program);
-        if (wParam == 0) {
-            m_field->forgetUndo();
-        }
+        insert(toQt(reinterpret_cast<const char*>(lParam)), Source::Program, wParam != 0 ? Undo::Keep : Undo::Forget);
         return 0;
     case EM_LINESCROLL:
         m_field->scrollLines(static_cast<int>(lParam));
@@ -459,6 +386,8 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         }
     }
     switch (message) {
+    case WM_GETTEXTLENGTH:
+        return m_field->bytes();
     case WM_CHAR:
         if (!typed(message, wParam)) {
             passEvent(*this, message);

@@ -4,6 +4,7 @@
 /// Edit controls, of one line and of many.
 
 #include "platform/afx/detail/Control.h"
+#include "platform/afx/detail/HostText.h"
 #include "platform/afx/detail/TextField.h"
 
 namespace tvx::afx {
@@ -40,23 +41,17 @@ private:
     LRESULT lineProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     bool typed(UINT message, WPARAM character);
     bool editKey(WPARAM key);
-    void insert(QString text, Source source);
+    void insert(QString text, Source source, Undo undo = Undo::Keep);
     void paste(bool selection);
     void select(LONG_PTR start, LONG_PTR end);
     LRESULT selectedBytes(WPARAM start, LPARAM end) const;
-    LRESULT copyLine(int line, char* buffer) const;
+    LRESULT copyLine(int number, char* buffer) const;
     LRESULT showMenu(LPARAM place);
-    QString lineText(const std::vector<int>& starts, std::size_t line) const;
-    int lineAt(int position) const;
+    bool hasLine(int number) const;
     std::unique_ptr<TextField> m_field;
     int m_limit;
     WPARAM m_passwordChar = 0;
     int m_quiet = 0;
 };
-
-/// Bytes that the first `units` of a text take for hosts: its line ends are "\r\n" there.
-TVX_PLATFORM_API int hostBytes(const QString& text, int units);
-/// The position in the toolkit's units of a host's byte position; one within a character is moved to its beginning.
-TVX_PLATFORM_API int toolkitUnits(const QString& text, int bytes);
 
 } // namespace tvx::afx

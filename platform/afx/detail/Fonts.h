@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/afx/GdiTypes.h"
+#include "platform/afx/detail/Advances.h"
 #include "platform/base/Export.h"
 
 #include <QFont>
@@ -18,9 +19,10 @@ namespace tvx::afx {
 
 /// A font as one context draws with it, in device pixels.
 struct RealizedFont {
-    explicit RealizedFont(const QFont& font) : font(font), metrics(font) {}
+    explicit RealizedFont(const QFont& font) : font(font), metrics(font), advances(QFontMetricsF(font)) {}
     QFont font;
     QFontMetrics metrics;
+    Advances advances;
     double angle = 0; ///< of the base line in degrees, counter-clockwise
 };
 

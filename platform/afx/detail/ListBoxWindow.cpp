@@ -67,6 +67,13 @@ private:
     ListBoxWindow& m_window;
 };
 
+/// The toolkit repaints a bar whose page it is told, changed or not.
+void setPage(QScrollBar& bar, int page) {
+    if (bar.pageStep() != page) {
+        bar.setPageStep(page);
+    }
+}
+
 std::unique_ptr<Window> makeListBox(const CREATESTRUCT& cs) {
     return std::make_unique<ListBoxWindow>(cs);
 }
@@ -165,11 +172,14 @@ void ListBoxWindow::applyRange() {
     }
     guarded([this] {
         QScrollBar* vertical = m_area->verticalScrollBar();
-        vertical->setPageStep(visibleRows());
-        vertical->setRange(0, std::max(m_items.count() - visibleRows(), 0));
+        const int last = std::max(m_items.count() - visibleRows(), 0);
+        // A bar that only grows or shrinks needs no new layout: lists are filled line by line.
+        const QSignalBlocker quiet((vertical->maximum() > 0) == (last > 0) ? vertical : nullptr);
+        setPage(*vertical, visibleRows());
+        vertical->setRange(0, last);
         QScrollBar* horizontal = m_area->horizontalScrollBar();
         const int width = m_area->viewport()->width();
-        horizontal->setPageStep(width);
+        setPage(*horizontal, width);
         horizontal->setSingleStep(10);
         horizontal->setRange(0, std::max(m_extent - width, 0));
     });

@@ -3,9 +3,12 @@
 /// @file
 /// The lines of a list or combo box: a flat table without any idea of windows.
 
+#include "platform/afx/detail/GapBuffer.h"
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
 
+#include <cstdint>
+#include <deque>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -13,6 +16,9 @@
 namespace tvx::afx {
 
 /// Lines with their data. Indices count from 0; a function that takes one expects it to be valid (isValid).
+///
+/// Made for tens of thousands of lines: inserting and removing moves numbers, not lines, and a whole text is found by
+/// its number rather than by comparing texts.
 class TVX_PLATFORM_API ListItems {
 public:
     struct Item {
@@ -25,19 +31,20 @@ public:
     enum class Match { Prefix, Whole };
 
     int count() const {
-        return static_cast<int>(m_items.size());
+        return static_cast<int>(m_order.size());
     }
     bool isValid(LONG_PTR index) const {
         return index >= 0 && index < count();
     }
-    const Item& at(int index) const {
-        return m_items[static_cast<std::size_t>(index)];
-    }
+    /// The text must not be changed.
     Item& at(int index) {
-        return m_items[static_cast<std::size_t>(index)];
+        return m_items[m_order[static_cast<std::size_t>(index)]];
+    }
+    const Item& at(int index) const {
+        return m_items[m_order[static_cast<std::size_t>(index)]];
     }
     void reserve(std::size_t lines) {
-        m_items.reserve(lines);
+        m_order.reserve(lines);
     }
     /// Puts a line before `index`, or behind all others when it is -1; answers its place.
     int insert(LONG_PTR index, Item item);
@@ -54,7 +61,14 @@ public:
     int selectedCount() const;
 
 private:
-    std::vector<Item> m_items;
+    int findWhole(std::string_view text, std::size_t first) const;
+
+    std::deque<Item> m_items; ///< in the order they came
+    std::vector<std::uint32_t> m_free;
+    GapBuffer<std::uint32_t> m_order; ///< places in m_items
+    /// Numbers of the texts without case, line by line, made by the first search for a whole text.
+    mutable GapBuffer<std::uint32_t> m_keys;
+    mutable bool m_keyed = false;
 };
 
 } // namespace tvx::afx

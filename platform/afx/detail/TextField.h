@@ -9,7 +9,6 @@
 
 #include <functional>
 #include <memory>
-#include <vector>
 
 class QWidget;
 
@@ -27,6 +26,15 @@ struct TextRange {
     }
 };
 
+/// What becomes of the changes that could be taken back when the program makes another one.
+enum class Undo { Keep, Forget };
+
+/// A line as it is shown: where it begins, and its text without its end.
+struct Line {
+    int start = 0;
+    QString text;
+};
+
 /// What an edit control needs of a text field.
 class TextField {
 public:
@@ -36,8 +44,8 @@ public:
     virtual void setText(const QString& text) = 0;
     virtual TextRange selection() const = 0;
     virtual void select(const TextRange& range) = 0;
-    /// Replaces the selection; can be undone.
-    virtual void insert(const QString& text) = 0;
+    /// Replaces the selection.
+    virtual void insert(const QString& text, Undo undo) = 0;
     virtual void undo() = 0;
     virtual bool canUndo() const = 0;
     virtual void forgetUndo() = 0;
@@ -49,8 +57,18 @@ public:
     virtual void setFrame(bool frame) = 0;
     virtual void cut() = 0;
     virtual void copy() = 0;
-    /// Where each line begins, wrapped ones counted singly.
-    virtual std::vector<int> lineStarts() const = 0;
+    /// Length of the text in bytes, as hosts count them.
+    virtual int bytes() const = 0;
+    /// Bytes before a position.
+    virtual int bytesAt(int position) const = 0;
+    /// The position of a byte; one within a character is moved to its beginning.
+    virtual int positionAt(int bytes) const = 0;
+    /// Number of lines, wrapped ones counted singly.
+    virtual int lineCount() const = 0;
+    /// The line of a position.
+    virtual int lineAt(int position) const = 0;
+    /// @param number of an existing line
+    virtual Line line(int number) const = 0;
     virtual int firstVisibleLine() const = 0;
     virtual void scrollLines(int lines) = 0;
     virtual void showCaret() = 0;

@@ -68,11 +68,13 @@ const WindowClass* findWindowClass(const char* name) {
 }
 
 QString toQt(const char* text) {
-    return QString::fromUtf8(text);
+    const std::string_view bytes = text != nullptr ? text : "";
+    return text::isWellFormed(bytes) ? QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()))
+                                     : QString::fromStdU16String(text::widen16(bytes));
 }
 
 std::string fromQt(const QString& text) {
-    return text.toStdString();
+    return text.isValidUtf16() ? text.toStdString() : text::narrow(std::u16string_view(text.toStdU16String()));
 }
 
 QWidget* peerOf(HWND handle) {

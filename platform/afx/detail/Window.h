@@ -248,7 +248,8 @@ TVX_PLATFORM_API HWND createWindow(const CREATESTRUCT& cs, CWnd* object, bool* s
 /// The widget that shows a window's client area; null for no window. The area begins at clientRect() in it.
 TVX_PLATFORM_API QWidget* peerOf(HWND handle);
 
-/// UTF-8 text and the toolkit's. Broken sequences become replacement characters on the screen only.
+/// UTF-8 text and the toolkit's. A byte of a broken sequence is the lone surrogate U+DC00 + byte there: it shows as a
+/// replacement character and comes back as the same byte.
 TVX_PLATFORM_API QString toQt(const char* text);
 TVX_PLATFORM_API std::string fromQt(const QString& text);
 

@@ -350,4 +350,27 @@ TEST_F(DrawTextCall, ClipsAtTheRectangleUnlessToldNotTo) {
     EXPECT_EQ(inkBox(dc), inkBox(expected));
 }
 
+TEST(Advances, AreThoseOfTheToolkit) {
+    const std::string_view samples[] = {
+        "", "Affinity, office; fluffy AVAWATo", "größe Ñandú", "Ελληνικά", "Кириллица", "日本語", "→ ½ €"};
+    for (const char* face : {"MS Sans Serif", "System", "Courier"}) {
+        LOGFONT description = pointFont(100, face);
+        const auto font = realizeFont(description);
+        for (const std::string_view sample : samples)
+            EXPECT_EQ(font->advances.widthOf(sample), font->metrics.horizontalAdvance(shownText(sample))) << sample;
+        for (const std::string_view whole : {"e\xCC\x81", "\xD8\xB3\xD9\x84\xD8\xA7\xD9\x85", "a\tb", "\xFF"})
+            EXPECT_FALSE(font->advances.widthOf(whole)) << "a text whose characters depend on each other";
+    }
+}
+
+TEST(Advances, AddUpForEveryPairOfLetters) {
+    const auto font = realizeFont(pointFont(80, "MS Sans Serif"));
+    for (char first = ' '; first <= '~'; ++first) {
+        for (char second = ' '; second <= '~'; ++second) {
+            const std::string pair{first, second};
+            ASSERT_EQ(font->advances.widthOf(pair), font->metrics.horizontalAdvance(shownText(pair))) << pair;
+        }
+    }
+}
+
 } // namespace

@@ -6,6 +6,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <iterator>
 #include <memory>
 #include <string>
 #include <utility>
@@ -179,4 +181,92 @@ TEST(Edit, LeavesTheMenuOfARightClickToTheParent) {
     EXPECT_EQ(window.menuPlace, place);
     EXPECT_EQ(window.menus, 1);
     EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+}
+
+namespace {
+
+/// A log of numbered lines, fifty of which have room.
+class LogWindow : public EditWindow {
+public:
+    explicit LogWindow(DWORD style = 0) : EditWindow(logStyle | style) {
+        edit.SetLimitText(50 * 10);
+        append(50);
+    }
+    void append(int lines) {
+        for (int i = 0; i < lines; ++i) {
+            CString line;
+            line.Format("line %03d\r\n", m_next++);
+            edit.AppendText(line);
+        }
+    }
+    std::string firstSeen() const {
+        char buffer[40] = {};
+        edit.GetLine(edit.GetFirstVisibleLine(), buffer, sizeof(buffer) - 1);
+        return buffer;
+    }
+    bool seesEnd() {
+        SCROLLINFO bar{};
+        return edit.GetScrollInfo(SB_VERT, &bar) && bar.nPos + std::max<int>(bar.nPage, 1) > bar.nMax;
+    }
+
+private:
+    int m_next = 0;
+};
+
+} // namespace
+
+TEST(Edit, FollowsNewTextWhileItsEndIsInSight) {
+    LogWindow log;
+    EXPECT_TRUE(log.seesEnd());
+    log.append(20);
+    EXPECT_TRUE(log.seesEnd());
+    EXPECT_EQ(log.text().substr(0, 8), "line 020");
+}
+
+TEST(Edit, LeavesTheViewOfAUserWhoHasScrolled) {
+    LogWindow log;
+    log.edit.LineScroll(-20);
+    const std::string seen = log.firstSeen();
+    ASSERT_FALSE(log.seesEnd());
+    log.append(5);
+    EXPECT_EQ(log.firstSeen(), seen);
+    log.edit.LineScroll(1000);
+    log.append(1);
+    EXPECT_TRUE(log.seesEnd()); // back at the end, it follows again
+}
+
+TEST(Edit, KeepsWhatAUserHasSelectedAndScrolledTo) {
+    LogWindow log;
+    log.edit.SetSel(log.edit.LineIndex(30), log.edit.LineIndex(32));
+    log.edit.LineScroll(28 - log.edit.GetFirstVisibleLine());
+    const CString selected = log.edit.GetSelText();
+    ASSERT_EQ(selected, "line 030\r\nline 031\r\n");
+    log.append(20);
+    EXPECT_EQ(log.edit.GetSelText(), selected);
+    EXPECT_EQ(log.firstSeen(), "line 028");
+    log.append(11); // the first of the selected lines goes
+    EXPECT_EQ(log.edit.GetSelText(), "line 031\r\n");
+    EXPECT_EQ(log.firstSeen(), "line 031");
+}
+
+TEST(Edit, CountsBytesThroughEveryChange) {
+    EditWindow window;
+    const char* pieces[] = {"", "a", "größe", "\r\n", "日本\r\n語", "😀", "\xFF", "x\r\n\r\n"};
+    unsigned random = 1;
+    for (int i = 0; i < 3000; ++i) {
+        random = random * 1103515245 + 12345;
+        const int length = window.edit.GetTextLength();
+        const int start = static_cast<int>((random >> 8) % static_cast<unsigned>(length + 1));
+        window.edit.SetSel(start, std::min(start + static_cast<int>(random >> 4) % 9, length));
+        if (random % 7 == 0)
+            window.edit.Undo();
+        else
+            window.edit.ReplaceSel(pieces[(random >> 16) % std::size(pieces)], TRUE);
+        const std::string text = window.text();
+        ASSERT_EQ(window.edit.GetTextLength(), static_cast<int>(text.size())) << i;
+        const int line = window.edit.LineFromChar(-1);
+        const int index = window.edit.LineIndex(line);
+        ASSERT_TRUE(index == 0 || text.substr(static_cast<std::size_t>(index) - 2, 2) == "\r\n") << i;
+    }
+    EXPECT_NE(window.text().find('\xFF'), std::string::npos); // bytes that are no text are kept
 }
