@@ -36,24 +36,26 @@ class MountList {
 public:
     /// The list's text, when it is another than at the last call.
     std::optional<std::string> changed() {
-        if (m_descriptor >= 0 && (isJustAsked() || !isSignalled()))
+        if (m_descriptor >= 0 && !(isDue() && isSignalled()))
             return std::nullopt;
-        if (m_descriptor < 0 && (m_descriptor = ::open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC)) < 0)
+        if (m_descriptor < 0)
+            m_descriptor = ::open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC);
+        if (m_descriptor < 0)
             return std::nullopt;
         return read();
     }
 
 private:
     /// Asking is a call of the system, and names come in thousands: a table may be so old.
-    bool isJustAsked() {
+    bool isDue() {
         constexpr long milliseconds = 20;
         timespec now{};
         ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
         const long time = now.tv_sec * 1000 + now.tv_nsec / 1000000;
         if (time - m_asked < milliseconds)
-            return true;
+            return false;
         m_asked = time;
-        return false;
+        return true;
     }
 
     bool isSignalled() const {

@@ -135,7 +135,7 @@ DWORD copyValue(const Value& value, LPDWORD type, LPBYTE data, LPDWORD size) {
         return ERROR_SUCCESS;
     if (room < needed)
         return ERROR_MORE_DATA;
-    std::memcpy(data, value.data.data(), needed);
+    std::ranges::copy(value.data, reinterpret_cast<char*>(data));
     return ERROR_SUCCESS;
 }
 

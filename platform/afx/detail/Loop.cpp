@@ -29,6 +29,7 @@ void drop(const std::exception_ptr& error) noexcept {
     } catch (CException* framework) {
         framework->Delete();
     } catch (...) {
+        return; // the others end with the last reference to them
     }
 }
 

@@ -71,8 +71,9 @@ bool isAbsolute(std::string_view name) {
 /// The byte that two hexadecimal digits name.
 std::optional<char> codedByte(std::string_view digits) {
     unsigned value = 0;
-    const char* end = digits.data() + digits.size();
-    const auto [read, error] = std::from_chars(digits.data(), end, value, 16);
+    const char* begin = digits.data();
+    const char* end = begin + digits.size();
+    const auto [read, error] = std::from_chars(begin, end, value, 16);
     return digits.size() == 2 && read == end && error == std::errc() ? std::optional(static_cast<char>(value))
                                                                      : std::nullopt;
 }

@@ -81,7 +81,8 @@ void findByPath(Program& program, const std::string& name) {
 void findByName(Program& program, const std::string& name) {
     for (const std::string& folder : searchedFolders()) {
         for (const std::string& spelling : spellings(name)) {
-            consider(program, folder.empty() ? spelling : folder + "/" + spelling, spelling);
+            std::string file = folder.empty() ? "" : folder + '/';
+            consider(program, file.append(spelling), spelling);
             if (!program.file.empty())
                 return;
         }
