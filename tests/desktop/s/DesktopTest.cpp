@@ -22,9 +22,9 @@ TEST(Desktop, BringsAMinimisedWindowOfAnotherProcessForward) {
     ASSERT_EQ(GetForegroundWindow(), second.window);
     EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(first.window)), 1);
     EXPECT_FALSE(IsIconic(first.window));
-    EXPECT_EQ(GetForegroundWindow(), first.window);
+    EXPECT_TRUE(becomesTrue([&] { return GetForegroundWindow() == first.window; }));
     EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(second.window)), 1);
-    EXPECT_EQ(GetForegroundWindow(), second.window);
+    EXPECT_TRUE(becomesTrue([&] { return GetForegroundWindow() == second.window; }));
     EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(second.window)), 1) << "it is in front already";
 }
 
