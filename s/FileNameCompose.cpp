@@ -61,7 +61,7 @@ std::vector<std::string_view> shorterPaths(std::string_view path) {
 }
 
 CString abbreviated(const Gui_FileName& name, int keepName, const Fits& fits) {
-    const CString whole = name.GetFullName(1, nullptr, nullptr, nullptr, nullptr, 1);
+    CString whole = name.GetFullName(1, nullptr, nullptr, nullptr, nullptr, 1);
     if (fits(whole))
         return whole;
     const Gui_FileName working(whole);
@@ -93,13 +93,13 @@ CString Gui_FileName::GetMount(int unc) const {
 
 CString Gui_FileName::GetMountAndPath(int unc, const char* defaultMount, const char* defaultPath,
                                       int stripSeparator) const {
-    int drive = 0;
+    const int drive = HasMount() || defaultMount ? 0 : _getdrive();
     CString result;
     if (HasMount())
         result = GetMount(unc);
     else if (defaultMount)
         result = Gui_FileName(defaultMount, nullptr, nullptr, nullptr).GetMount(unc);
-    else if ((drive = _getdrive()) > 0)
+    else if (drive > 0)
         result = CString(static_cast<char>('A' + drive - 1)) + ':';
     Gui_FileName folder(nullptr, m_record->path, nullptr, nullptr);
     if (!folder.HasPath())

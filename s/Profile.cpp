@@ -4,6 +4,7 @@
 #include "platform/port/Version.h"
 
 #include <cstring>
+#include <utility>
 
 namespace {
 
@@ -56,7 +57,7 @@ void Gui_Profile::WriteString(const char* value, const char* entry, const char* 
 CString Gui_Profile::GetKeyLocation(CString appName, bool underSuite, bool perApplication, bool versioned) {
     if (underSuite && !versioned)
         return {};
-    const CString name = perApplication ? appName : CString("Common");
+    const CString name = perApplication ? std::move(appName) : CString("Common");
     if (underSuite)
         return "NEV\\" + installedVersion() + "\\" + name;
     CString location = "Common";

@@ -69,7 +69,8 @@ private:
         ::lseek(m_descriptor, 0, SEEK_SET);
         for (;;) {
             const ssize_t count = ::read(m_descriptor, part, sizeof(part));
-            if (count <= 0 && !(count < 0 && errno == EINTR))
+            const bool isInterrupted = count < 0 && errno == EINTR;
+            if (count <= 0 && !isInterrupted)
                 return text;
             text.append(part, static_cast<std::size_t>(std::max<ssize_t>(count, 0)));
         }
