@@ -9,6 +9,7 @@
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <string>
 
 namespace {
@@ -108,6 +109,17 @@ TEST_F(Profile, KeepsNumbersAndBytesOfHosts) {
     const std::string text(5000, 'a');
     EXPECT_TRUE(theApp.WriteProfileString("View", "Long", text.c_str()));
     EXPECT_EQ(theApp.GetProfileString("View", "Long"), text.c_str());
+}
+
+TEST_F(Profile, TellsOnceInABoxThatTheFileWasDamaged) {
+    std::ofstream(m_folder / "registry.db") << std::string(5000, 'x');
+    theApp.boxes.clear();
+    CString value = "cm";
+    EXPECT_EQ(Gui_Profile::ReadString(value, "Unit", nullptr), 0);
+    Gui_Profile::WriteString("mm", "Unit", nullptr);
+    EXPECT_EQ(Gui_Profile::ReadString(value, "Unit", nullptr), 1);
+    ASSERT_EQ(theApp.boxes.size(), 1u);
+    EXPECT_NE(theApp.boxes[0].text.find("registry-damaged-"), std::string::npos) << theApp.boxes[0].text;
 }
 
 TEST_F(Profile, ComposesLocationsOfKeys) {
