@@ -42,6 +42,7 @@ public:
         constexpr DWORD style = WS_CHILD | WS_VISIBLE | WS_VSCROLL | WS_HSCROLL;
         edit.Create(style | ES_MULTILINE | ES_READONLY | ES_AUTOHSCROLL | ES_AUTOVSCROLL, CRect(0, 0, 500, 300), this,
                     1);
+        QApplication::processEvents(); // nothing is painted before
     }
     ~Host() override {
         DestroyWindow();
@@ -65,6 +66,7 @@ void textArea(benchmark::State& state, Shown shown) {
         area.setMaximumBlockCount(static_cast<int>(state.range(0)) / lineBytes);
         area.resize(500, 300);
         area.setVisible(shown == Shown::Yes);
+        QApplication::processEvents();
         for (int i = 0; i < lineCount; ++i) {
             area.appendPlainText(lines[static_cast<std::size_t>(i)]);
             if (shown == Shown::Yes && i % linesAFrame == 0)

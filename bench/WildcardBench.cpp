@@ -2,7 +2,6 @@
 // a greedy loop of ten lines. Times are for all the names, or for one long text.
 
 #include "s/ListBox.h"
-#include "s/Wildcard.h"
 
 #include <benchmark/benchmark.h>
 #include <fnmatch.h>
@@ -61,13 +60,6 @@ struct Ours {
         return Gui_ListBox::MatchString(text, m_pattern) != 0;
     }
     CString m_pattern;
-};
-struct OursTakenApartOnce {
-    explicit OursTakenApartOnce(const char* pattern) : m_wildcard(pattern) {}
-    bool operator()(const CString& text) {
-        return m_wildcard.matches(text.View());
-    }
-    Wildcard m_wildcard;
 };
 struct Greedy {
     explicit Greedy(const char* pattern) : m_pattern(pattern) {}
@@ -135,7 +127,6 @@ void add(const std::string& who) {
 
 const bool added = [] {
     add<Ours>("MatchString");
-    add<OursTakenApartOnce>("taken apart once");
     add<Greedy>("greedy");
     add<Fnmatch>("fnmatch");
     add<GlibPattern>("GLib");

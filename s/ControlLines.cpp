@@ -74,10 +74,9 @@ int ControlLines::remove(const CStringList& texts) {
 }
 
 int ControlLines::removeUnmatched(const CString& pattern) {
-    const Wildcard wildcard(pattern.View());
     int removed = 0;
     for (int line = count() - 1; line >= 0; --line) {
-        if (!wildcard.matches(text(line).View())) {
+        if (!MatchesWildcard(text(line).View(), pattern.View())) {
             m_control.SendMessage(m_messages.remove, static_cast<WPARAM>(line));
             ++removed;
         }

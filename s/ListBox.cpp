@@ -26,7 +26,7 @@ int Gui_ListBox::StringCompare(const CString* first, const CString* second) {
 }
 
 int Gui_ListBox::MatchString(const CString& text, const CString& pattern) {
-    return Wildcard(pattern.View()).matches(text.View()) ? 1 : 0;
+    return MatchesWildcard(text.View(), pattern.View()) ? 1 : 0;
 }
 
 void Gui_ListBox::AddStringList(const CStringList& strings, int (*compare)(const CString*, const CString*)) {

@@ -7,98 +7,127 @@
 namespace {
 
 constexpr std::size_t none = std::string_view::npos;
+constexpr int mostStars = 10;
 
 /// A byte that can only stand within a character. A piece that begins with one fits between characters only.
 bool isWithinCharacter(char byte) {
     return (static_cast<unsigned char>(byte) & 0xC0) == 0x80;
 }
 
-bool fitsAt(std::string_view piece, std::string_view text, std::size_t at) {
-    return !isWithinCharacter(piece.front()) || tvx::text::characterStart(text, at) == at;
+std::size_t characterLength(std::string_view text, std::size_t at) {
+    return static_cast<unsigned char>(text[at]) < 0x80 ? 1 : tvx::text::characterLength(text, at);
 }
 
-} // namespace
-
-Wildcard::Wildcard(std::string_view pattern) noexcept {
-    std::size_t start = 0;
-    for (std::size_t star = pattern.find('*'); star != none; star = pattern.find('*', start)) {
-        if (m_stars == mostStars) {
-            ++m_stars;
-            return;
-        }
-        m_pieces[m_stars++] = pieceOf(pattern.substr(start, star - start));
-        start = star + 1;
-    }
-    m_pieces[m_stars] = pieceOf(pattern.substr(start));
-}
-
-Wildcard::Piece Wildcard::pieceOf(std::string_view text) noexcept {
-    return {text, text.find('?') != none};
-}
+/// What stands between two "*".
+struct Piece {
+    std::string_view text;
+    bool hasAny = false; ///< has a "?"
+};
 
 /// Where the piece ends when it stands at `at`; npos when it does not.
-std::size_t Wildcard::endOf(const Piece& piece, std::string_view text, std::size_t at) noexcept {
-    if (!piece.hasAny)
-        return text.substr(at).starts_with(piece.text) ? at + piece.text.size() : none;
-    for (const char wanted : piece.text) {
+std::size_t endOf(std::string_view piece, std::string_view text, std::size_t at) {
+    for (const char wanted : piece) {
         if (at == text.size() || (wanted != '?' && text[at] != wanted))
             return none;
-        at += wanted == '?' ? tvx::text::characterLength(text, at) : 1;
+        at += wanted == '?' ? characterLength(text, at) : 1;
     }
     return at;
 }
 
-/// Where the piece begins when it stands at the end of the text; npos when it does not.
-std::size_t Wildcard::startOf(const Piece& piece, std::string_view text) noexcept {
-    if (!piece.hasAny) {
-        const std::size_t at = text.size() - piece.text.size();
-        return text.ends_with(piece.text) && (piece.text.empty() || fitsAt(piece.text, text, at)) ? at : none;
-    }
+/// Where the piece, which has a "?", begins when it stands at the end of the text, `first` being the first place
+/// allowed; npos when it does not.
+std::size_t startOf(std::string_view piece, std::string_view text, std::size_t first) {
     constexpr std::size_t longestCharacter = 4;
-    const std::size_t most = longestCharacter * piece.text.size();
-    for (std::size_t at = text.size(); at > 0 && text.size() - at < most;) {
+    const std::size_t most = longestCharacter * piece.size();
+    for (std::size_t at = text.size(); at > first && text.size() - at < most;) {
         at = tvx::text::previousCharacter(text, at);
         if (endOf(piece, text, at) == text.size())
-            return at;
+            return at >= first ? at : none;
     }
     return none;
 }
 
+/// The end of a pattern: its last "*", and where what stands behind that begins in the text.
+struct End {
+    std::size_t star = 0;
+    std::size_t start = none; ///< npos when the text ends otherwise
+};
+
+/// @param first the first place allowed in the text
+End endOfPattern(std::string_view pattern, std::string_view text, std::size_t first) {
+    std::size_t at = text.size();
+    std::size_t left = pattern.size() - 1;
+    for (; pattern[left] != '*'; --left, --at) {
+        if (pattern[left] == '?') {
+            const std::size_t star = pattern.rfind('*', left);
+            return {star, startOf(pattern.substr(star + 1), text, first)};
+        }
+        if (at == first || text[at - 1] != pattern[left])
+            return {};
+    }
+    const bool fits = at == text.size() || !isWithinCharacter(text[at]) || tvx::text::characterStart(text, at) == at;
+    return {left, fits ? at : none};
+}
+
 /// Where the leftmost place of the piece from `from` on ends; npos when there is none.
-std::size_t Wildcard::findEnd(const Piece& piece, std::string_view text, std::size_t from) noexcept {
+std::size_t findEnd(const Piece& piece, std::string_view text, std::size_t from) {
     if (piece.text.empty())
         return from;
-    if (!piece.hasAny && piece.text.size() == 1 && !isWithinCharacter(piece.text.front())) {
-        const std::size_t at = text.find(piece.text.front(), from);
-        return at != none ? at + 1 : none;
-    }
     if (!piece.hasAny && !isWithinCharacter(piece.text.front())) {
-        // The C library's search takes linear time where the obvious one goes over long runs again and again.
-        const void* at = memmem(text.data() + from, text.size() - from, piece.text.data(), piece.text.size());
-        return at ? static_cast<std::size_t>(static_cast<const char*>(at) - text.data()) + piece.text.size() : none;
+        const char* start = text.data() + from;
+        const std::size_t left = text.size() - from;
+        const std::size_t size = piece.text.size();
+        // The C library's search does not go over long runs again and again as the obvious one does.
+        const void* at =
+            size == 1 ? std::memchr(start, piece.text.front(), left) : memmem(start, left, piece.text.data(), size);
+        return at ? static_cast<std::size_t>(static_cast<const char*>(at) - text.data()) + size : none;
     }
-    for (std::size_t at = from; at < text.size(); at += tvx::text::characterLength(text, at)) {
-        const std::size_t end = endOf(piece, text, at);
+    for (std::size_t at = from; at < text.size(); at += characterLength(text, at)) {
+        const std::size_t end = endOf(piece.text, text, at);
         if (end != none)
             return end;
     }
     return none;
 }
 
-bool Wildcard::matches(std::string_view text) const noexcept {
-    if (m_stars > mostStars)
+/// The piece that begins at `start` and ends before the next "*" or with the pattern.
+Piece pieceAt(std::string_view pattern, std::size_t start) {
+    Piece piece;
+    std::size_t end = start;
+    for (; end < pattern.size() && pattern[end] != '*'; ++end)
+        piece.hasAny = piece.hasAny || pattern[end] == '?';
+    piece.text = pattern.substr(start, end - start);
+    return piece;
+}
+
+/// Matches what follows the first "*", which stands at `star`, against the text from `at` on.
+bool matchesBehindStar(std::string_view text, std::size_t at, std::string_view pattern, std::size_t star) {
+    const auto [last, end] = endOfPattern(pattern, text, at);
+    if (end == none)
         return false;
-    std::size_t at = endOf(m_pieces[0], text, 0);
-    if (m_stars == 0 || at == none)
-        return at == text.size();
-    const std::size_t last = startOf(m_pieces[m_stars], text);
-    if (last == none || last < at)
-        return false;
-    const std::string_view between = text.substr(0, last);
-    for (std::size_t piece = 1; piece < m_stars; ++piece) {
-        at = findEnd(m_pieces[piece], between, at);
+    const std::string_view between = text.substr(0, end);
+    for (int stars = 1; star < last; ++stars) {
+        if (stars == mostStars)
+            return false;
+        const Piece piece = pieceAt(pattern, star + 1);
+        at = findEnd(piece, between, at);
         if (at == none)
             return false;
+        star += 1 + piece.text.size();
     }
     return true;
+}
+
+} // namespace
+
+bool MatchesWildcard(std::string_view text, std::string_view pattern) noexcept {
+    std::size_t at = 0;
+    for (std::size_t next = 0; next < pattern.size(); ++next) {
+        if (pattern[next] == '*')
+            return matchesBehindStar(text, at, pattern, next);
+        if (at == text.size() || (pattern[next] != '?' && pattern[next] != text[at]))
+            return false;
+        at += pattern[next] == '?' ? characterLength(text, at) : 1;
+    }
+    return at == text.size();
 }

@@ -55,7 +55,10 @@ public:
         }
         m_edit->textCursor().insertText(text);
         m_edit->setUndoRedoEnabled(true);
-        m_edit->ensureCursorVisible();
+        // A program that only deletes goes on with something else; the view need not go there and back.
+        if (undo == Undo::Keep || !text.isEmpty()) {
+            m_edit->ensureCursorVisible();
+        }
     }
     void undo() override {
         m_edit->document()->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
