@@ -66,6 +66,10 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
     m_askedCorner = rect.topLeft();
     if (awaitsBorders()) {
         m_wish = Wish{rect, measured};
+    } else if (isNormal()) {
+        // What the desktop still tells of the place before does not count.
+        m_wish = Wish{rect, Measured::Frame, kAttempts};
+        m_lookBack.start();
     }
     const QMargins around = borders();
     const QSize inside(rect.width() - around.left() - around.right(), rect.height() - around.top() - around.bottom());

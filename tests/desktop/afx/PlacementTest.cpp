@@ -1,10 +1,12 @@
 // Frames end where they were asked to, though the window manager puts its borders around them only when they are shown.
 #include "platform/afx/App.h"
+#include "platform/afx/Dialog.h"
 #include "platform/afx/Frame.h"
 #include "platform/afx/Gdi.h"
 #include "platform/afx/WindowCalls.h"
 #include "platform/afx/detail/Gui.h"
 #include "platform/afx/detail/Window.h"
+#include "tests/ui/afx/DialogTestIds.h"
 
 #include <gtest/gtest.h>
 
@@ -185,4 +187,34 @@ TEST_F(FramesOnDesktop, PlacedOffTheScreenComeBackToIt) {
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     const QRect screen = QGuiApplication::primaryScreen()->availableGeometry();
     standsAt(CRect(screen.right() + 1 - 600, screen.bottom() + 1 - 400, screen.right() + 1, screen.bottom() + 1));
+}
+
+TEST(DialogsOnDesktop, KeepTheirInsideAndStandWhereTheyStood) {
+    CDialog dialog;
+    ASSERT_TRUE(dialog.Create(IDD_EMPTY));
+    const auto client = [&dialog] {
+        CRect now;
+        dialog.GetClientRect(now);
+        return now;
+    };
+    const auto rect = [&dialog] {
+        CRect now;
+        dialog.GetWindowRect(now);
+        return now;
+    };
+    const auto framed = [&] { return rect().Width() > client().Width(); };
+    const CRect inside = client();
+    dialog.MoveWindow(200, 150, inside.Width(), inside.Height());
+    dialog.ShowWindow(SW_SHOW);
+    ASSERT_TRUE(QTest::qWaitFor([&] { return framed() && rect().TopLeft() == CPoint(200, 150); }, kPatience))
+        << words(rect());
+    EXPECT_EQ(client(), inside) << "the borders are around it, not in it: " << words(client());
+    const WINDOWPLACEMENT placement = placementOf(dialog);
+    dialog.DestroyWindow();
+    ASSERT_TRUE(dialog.Create(IDD_EMPTY));
+    ASSERT_TRUE(dialog.SetWindowPlacement(&placement));
+    EXPECT_TRUE(QTest::qWaitFor([&] { return rect() == CRect(placement.rcNormalPosition) && framed(); }, kPatience))
+        << words(rect());
+    EXPECT_EQ(client(), inside) << words(client());
+    dialog.DestroyWindow();
 }

@@ -209,3 +209,24 @@ TEST_F(Mdi, SystemMenuOfAChild) {
     clickItem(*menu, "Close");
     EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
 }
+
+TEST_F(Mdi, ChildrenKnowWhereTheyGoBackTo) {
+    CMDIChildWnd* child = open();
+    child->MoveWindow(20, 30, 300, 200);
+    settle();
+    WINDOWPLACEMENT placement;
+    frame->MDIMaximize(child);
+    settle();
+    ASSERT_TRUE(child->GetWindowPlacement(&placement));
+    EXPECT_EQ(placement.showCmd, UINT{SW_SHOWMAXIMIZED});
+    EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(20, 30, 320, 230));
+    placement.rcNormalPosition = CRect(5, 6, 305, 206);
+    ASSERT_TRUE(child->SetWindowPlacement(&placement));
+    settle();
+    EXPECT_TRUE(child->IsZoomed());
+    frame->MDIRestore(child);
+    settle();
+    ASSERT_TRUE(child->GetWindowPlacement(&placement));
+    EXPECT_EQ(placement.showCmd, UINT{SW_SHOWNORMAL});
+    EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(5, 6, 305, 206));
+}
