@@ -12,6 +12,7 @@
 #include "tests/unit/base/FileTestFolder.h"
 
 #include <filesystem>
+#include <memory>
 #include <string>
 #include <unistd.h>
 
@@ -169,10 +170,10 @@ TEST_F(ResourceLibrary, StandsBeforeAnExtensionModuleInTheSearch) {
     AFX_EXTENSION_MODULE state;
     AfxInitExtensionModule(state, GetModuleHandleA("win-test-extension"));
     state.hResource = library;
-    new CDynLinkLibrary(state);
+    // Ending the module would take out the link that the library itself made when it was loaded, too.
+    const auto link = std::make_unique<CDynLinkLibrary>(state);
     EXPECT_EQ(stringOf(IDS_EXTENSION_ONLY), "aus der Erweiterung");
     EXPECT_EQ(stringOf(IDS_SHADOWED), "of the program");
-    AfxTermExtensionModule(state);
 }
 
 TEST_F(ResourceLibrary, OfTheLayerHasItsTextsInTheUsersLanguage) {
