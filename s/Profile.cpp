@@ -2,6 +2,7 @@
 
 #include "platform/base/Text.h"
 #include "platform/port/Version.h"
+#include "s/InstanceKey.h"
 
 #include <cstring>
 #include <utility>
@@ -11,29 +12,6 @@ namespace {
 constexpr const char* defaultSection = "Settings";
 constexpr const char* defaultVersion = "10.1";
 constexpr int versionLength = 4;
-
-/// The key of an application's first instance, open. Closes itself.
-class InstanceKey {
-public:
-    explicit InstanceKey(const char* appName) {
-        CString path;
-        path.Format("Software\\Tarvex\\%s\\%s", appName, "FirstInstance");
-        RegCreateKeyExA(HKEY_CURRENT_USER, path, 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE, nullptr,
-                        &m_key, nullptr);
-    }
-    ~InstanceKey() {
-        RegCloseKey(m_key);
-    }
-    InstanceKey(const InstanceKey&) = delete;
-    InstanceKey& operator=(const InstanceKey&) = delete;
-
-    operator HKEY() const {
-        return m_key;
-    }
-
-private:
-    HKEY m_key = nullptr;
-};
 
 CString installedVersion() {
     const CString version = CString(Port::Version::getValue("version").c_str()).Left(versionLength);

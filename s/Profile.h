@@ -11,7 +11,7 @@
 /// |---|---|
 /// | `<registry key>\<title>\<section>` | the application's own, by ReadString and WriteString |
 /// | `Tarvex\Common` | what all applications of the family share |
-/// | `Tarvex\<application name>\FirstInstance` | which process is the first instance of an application |
+/// | `Tarvex\<application name>\FirstInstance` | the first instance (docs/single-instance.md) |
 ///
 /// The registry key and the title are those of Gui_WinApp::SetRegistryKey. Each operation reads or writes the store
 /// itself; what another process writes is there at once. docs/settings.md has the whole layout.

@@ -120,6 +120,48 @@ public:
     static void AddFileFilter(CString& filter, CDocTemplate* docTemplate);
     /// @}
 
+    /// @name One running instance
+    /// A host that allows one running instance for each application name asks at its start and says goodbye at its end:
+    ///
+    /// @code
+    /// BOOL BoardApp::InitInstance() {
+    ///     if (!IsFirstInstance()) {
+    ///         ShowFirstInstanceWindow();
+    ///         return FALSE;
+    ///     }
+    ///     RegisterInstance();
+    ///     ... // the main window
+    ///     RegisterInstanceWindow(Gui_Desktop::GetMainWindowID());
+    ///
+    /// int BoardApp::ExitInstance() {
+    ///     UnregisterInstance();
+    ///     return Gui_WinApp::ExitInstance();
+    /// }
+    /// @endcode
+    ///
+    /// The first instance's process and window stand in the settings under the application's name as given to the
+    /// constructor. A process that ended without UnregisterInstance is found to have ended, also when another process
+    /// has got its number since. Nothing locks the record: of two that start in the same moment both may run.
+    ///
+    /// With `TVX_GUI_INSTANCECHECKING` set to a text that begins with "0" the record is left alone, and every instance
+    /// is the first. No operation shows a message. docs/single-instance.md tells more.
+    /// @{
+
+    /// Whether no other instance is recorded, or the recorded one has ended: 1 or 0.
+    int IsFirstInstance();
+    /// Records this process as the first instance, as yet without a window.
+    /// @return 1
+    int RegisterInstance();
+    /// Records the main window of this process, once it exists. Nothing happens without RegisterInstance.
+    /// @param windowId  see Gui_Desktop::GetMainWindowID; 0 for none
+    void RegisterInstanceWindow(unsigned long windowId);
+    /// Brings the window of the recorded first instance to the front.
+    /// @return 1; 0 when there is no live first instance, or it has no window yet or no longer
+    int ShowFirstInstanceWindow();
+    /// Clears the record if it names this process.
+    void UnregisterInstance();
+    /// @}
+
 private:
     std::unique_ptr<Gui_WinAppData> m_data;
 };

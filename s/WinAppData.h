@@ -5,8 +5,9 @@
 
 /// What the application object keeps for itself.
 struct Gui_WinAppData {
-    CString usageText; ///< the host's text behind the usage summary
-    CString pending;   ///< messages of the command-line check that are still to be shown
+    int registered = 0; ///< 1 once this process has made itself the first instance
+    CString usageText;  ///< the host's text behind the usage summary
+    CString pending;    ///< messages of the command-line check that are still to be shown
 };
 
 /// The origin of the messages that the application object issues.

@@ -14,10 +14,9 @@ build    g++              C++20 compiler
 build    cmake            configures the build from CMakePresets.json
 build    ninja-build      runs the build
 build    ccache           keeps compiled objects between builds
-build    pkg-config       finds SQLite, GIO and xcb-ewmh
+build    pkg-config       finds SQLite and xcb-ewmh
 build    qt6-base-dev     real windows, text input and drawing behind the layer
 build    libsqlite3-dev   the settings store
-build    libglib2.0-dev   the desktop's default program for a kind of document
 build    libxcb1-dev      talks to the window manager
 build    libxcb-ewmh-dev  raises windows of other processes
 build    llvm             llvm-rc compiles resource scripts

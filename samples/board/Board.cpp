@@ -6,6 +6,7 @@
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
+#include "s/Desktop.h"
 #include "s/FileName.h"
 #include "s/Locale.h"
 
@@ -20,6 +21,7 @@ void CBoardCommandLine::ParseParam(const char* param, BOOL isSwitch, BOOL isLast
         const UT_CMDOPCODES options(GetCmdOpcodes());
         const char* name = options.optionname(param);
         m_gridFollows = name != nullptr && std::strcmp(name, "grid") == 0;
+        m_single |= name != nullptr && std::strcmp(name, "single") == 0;
     } else if (m_gridFollows) {
         m_gridFollows = false;
         m_grid = static_cast<int>(std::clamp(std::strtol(param, nullptr, 10), 0L, 1000L));
@@ -91,7 +93,25 @@ BOOL CBoardApp::InitInstance() {
         return FALSE;
     }
     m_grid = info.m_grid;
+    if (info.m_single) {
+        if (!IsFirstInstance()) {
+            ShowFirstInstanceWindow();
+            return FALSE;
+        }
+        RegisterInstance();
+        m_single = true;
+    }
+    return ShowMainFrame(info);
+}
 
+int CBoardApp::ExitInstance() {
+    if (m_single) {
+        UnregisterInstance();
+    }
+    return Gui_WinApp::ExitInstance();
+}
+
+BOOL CBoardApp::ShowMainFrame(CBoardCommandLine& info) {
     AddDocTemplate(new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
                                          RUNTIME_CLASS(CBoardView)));
     auto* frame = new CMainFrame;
@@ -105,6 +125,7 @@ BOOL CBoardApp::InitInstance() {
     frame->DragAcceptFiles();
     frame->ActivateFrame(m_nCmdShow);
     frame->UpdateWindow();
+    RegisterInstanceWindow(Gui_Desktop::GetMainWindowID());
     return TRUE;
 }
 

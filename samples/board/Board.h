@@ -6,7 +6,7 @@
 
 #include <vector>
 
-/// The command line of the board: the switches of the family, the grid, and any number of drawings.
+/// The command line of the board: the switches of the family, the grid, one instance only, and any number of drawings.
 class CBoardCommandLine : public Gui_CommandLineInfo {
 public:
     void ParseParam(const char* param, BOOL isSwitch, BOOL isLast) override;
@@ -15,6 +15,8 @@ public:
 
     /// Distance of the grid points in pixels; 0 for none.
     int m_grid = 10;
+    /// Whether a board that runs already is to be shown instead of this one.
+    bool m_single = false;
     /// The drawings to open, as they were named.
     std::vector<CString> m_drawings;
 
@@ -28,6 +30,7 @@ class CBoardApp : public Gui_WinApp {
 public:
     CBoardApp();
     BOOL InitInstance() override;
+    int ExitInstance() override;
     HICON GetAppIcon() override;
     CString GetAppVersion() override;
 
@@ -37,6 +40,10 @@ public:
     afx_msg void OnAppAbout();
 
 private:
+    /// Whether this is to be the only board.
+    bool m_single = false;
+
+    BOOL ShowMainFrame(CBoardCommandLine& info);
     BOOL OpenDrawings(CBoardCommandLine& info);
     static CString DrawingName(const CString& word);
 

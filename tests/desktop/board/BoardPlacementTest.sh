@@ -3,22 +3,10 @@
 #
 #   BoardPlacementTest.sh BOARD TVXSETTINGS DRAWING
 set -euo pipefail
+. "$(dirname "$0")/../Desktop.sh"
 program=$1 settings=$2 drawing=$3
 key='Software\Tarvex\Board'
-limit=30
 
-fail() {
-    echo "FAIL: $1" >&2
-    exit 1
-}
-# until_ DESCRIPTION COMMAND...: waits for the command to succeed.
-until_() {
-    local what=$1 end=$((SECONDS + limit))
-    shift
-    until "$@" >/dev/null 2>&1; do
-        [ $SECONDS -lt $end ] || fail "$what; the frame is at $(frame)"
-    done
-}
 main=
 find_main() {
     main=$(xdotool search --onlyvisible --name '^[^ ]*plan.brd - ' | tail -n 1)
@@ -50,18 +38,16 @@ maximized() {
 restored() {
     ! maximized
 }
-ended() {
-    ! kill -0 "$process" 2>/dev/null
-}
 start() {
     "$program" "$drawing" &
     process=$!
-    until_ "the window appears" find_main
+    processes=("$process")
+    await "the window appears" find_main
     xdotool windowactivate --sync "$main"
 }
 close() {
     xdotool windowactivate --sync "$main" key --clearmodifiers alt+F4
-    until_ "the application ends" ended
+    await "the application ends" ended "$process"
 }
 bar() {
     "$settings" get "$key\\ControlBar-Bar0" "$1"
@@ -73,27 +59,27 @@ bar_is() {
 
 start
 wmctrl -i -r "$main" -e 0,120,90,700,500
-until_ "the window manager moves the frame" moved
+await "the window manager moves the frame" moved
 place=$(frame)
 close
 for time in 1 2 3; do
     start
-    until_ "start $time: the frame is where it was" frame_is "$place"
+    await "start $time: the frame is where it was" frame_is "$place"
     close
 done
 
 start
 wmctrl -i -r "$main" -b add,maximized_vert,maximized_horz
-until_ "the window manager maximises" maximized
+await "the window manager maximises" maximized
 close
 start
-until_ "it comes up maximised" maximized
+await "it comes up maximised" maximized
 close
 start
-until_ "it comes up maximised again" maximized
+await "it comes up maximised again" maximized
 wmctrl -i -r "$main" -b remove,maximized_vert,maximized_horz
-until_ "it is restored" restored
-until_ "it goes back to where it was before" frame_is "$place"
+await "it is restored" restored
+await "it goes back to where it was before" frame_is "$place"
 close
 
 # drag_bar X Y: takes the tool bar's grip, at its left end below the menu, to a point inside the frame.
@@ -141,7 +127,7 @@ bar_is "it stays hidden" Visible 0
 
 "$settings" set "$key\\Settings" WindowPlacement "0,1,-1,-1,-1,-1,4000,3000,4600,3500,1280,800"
 start
-until_ "a frame off the screen comes back to it" frame_is 680,300,600,500
+await "a frame off the screen comes back to it" frame_is 680,300,600,500
 close
 "$settings" set "$key\\Settings" WindowPlacement "damaged"
 "$settings" set "$key\\ControlBar-Summary" Bars "many"

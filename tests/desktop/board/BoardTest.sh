@@ -4,37 +4,11 @@
 #
 #   BoardTest.sh BOARD DRAWING
 set -euo pipefail
+. "$(dirname "$0")/../Desktop.sh"
 program=$1
-work=$(mktemp -d "${TMPDIR:-/tmp}/board.XXXXXX")
-trap 'rm -rf "$work"' EXIT
 file="$work/plan with blanks.brd"
 cp "$2" "$file"
-limit=30
 
-fail() {
-    echo "FAIL: $1" >&2
-    exit 1
-}
-# until DESCRIPTION COMMAND...: waits for the command to succeed.
-until_() {
-    local what=$1 end=$((SECONDS + limit))
-    shift
-    until "$@" >/dev/null 2>&1; do
-        [ $SECONDS -lt $end ] || fail "$what"
-    done
-}
-window() {
-    xdotool search --onlyvisible --name "$1" | tail -n 1
-}
-titled() {
-    [ -n "$(window "$1")" ]
-}
-untitled() {
-    [ -z "$(window "$1")" ]
-}
-ended() {
-    ! kill -0 "$process"
-}
 sum() {
     sha256sum <"$file"
 }
@@ -44,7 +18,8 @@ changed() {
 start() {
     "$program" "$@" &
     process=$!
-    until_ "the window appears with the file's name" titled "plan with blanks.brd - Tarvex Board"
+    processes=("$process")
+    await "the window appears with the file's name" titled "plan with blanks.brd - Tarvex Board"
     main=$(window "plan with blanks.brd - Tarvex Board")
     xdotool windowactivate --sync "$main"
 }
@@ -60,22 +35,22 @@ before=$(sum)
 start "$file"
 draw
 xdotool key --clearmodifiers ctrl+s
-until_ "Ctrl+S saves" changed
+await "Ctrl+S saves" changed
 [ "$(grep -c '^rectangle' "$file")" -eq $(($(grep -c '^rectangle' "$2") + 1)) ] || fail "the rectangle is in the file"
 xdotool key --clearmodifiers alt+F4
-until_ "a saved drawing closes without a question" ended
+await "a saved drawing closes without a question" ended "$process"
 
 before=$(sum)
 start "$file"
 draw
 xdotool key --clearmodifiers alt+F4
-until_ "closing with changes asks" titled "^Tarvex Board$"
+await "closing with changes asks" titled "^Tarvex Board$"
 xdotool windowactivate --sync "$(window '^Tarvex Board$')" key Escape
-until_ "Esc takes the question away" untitled "^Tarvex Board$"
-ended && fail "Esc keeps the application"
+await "Esc takes the question away" untitled "^Tarvex Board$"
+ended "$process" && fail "Esc keeps the application"
 xdotool windowactivate --sync "$main" key --clearmodifiers alt+F4
-until_ "closing asks again" titled "^Tarvex Board$"
+await "closing asks again" titled "^Tarvex Board$"
 xdotool windowactivate --sync "$(window '^Tarvex Board$')" key n
-until_ "No ends the application" ended
+await "No ends the application" ended "$process"
 changed && fail "No leaves the file as it was"
 exit 0

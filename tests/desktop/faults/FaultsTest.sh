@@ -4,38 +4,15 @@
 #
 #   FaultsTest.sh HOST
 set -euo pipefail
+. "$(dirname "$0")/../Desktop.sh"
 host=$1
-work=$(mktemp -d "${TMPDIR:-/tmp}/faults.XXXXXX")
-trap 'rm -rf "$work"' EXIT
-limit=30
 process=''
 
-fail() {
-    import -window root "${TVX_PICTURE:-$work/failed.png}" || true
-    echo "FAIL: $1" >&2
-    exit 1
-}
-until_() {
-    local what=$1 end=$((SECONDS + limit))
-    shift
-    until "$@" >/dev/null 2>&1; do
-        [ $SECONDS -lt $end ] || fail "$what"
-    done
-}
-window() {
-    xdotool search --onlyvisible --name "$1" 2>/dev/null | tail -n 1
-}
-shown() {
-    [ -n "$(window "$1")" ]
-}
-ended() {
-    ! kill -0 "$process"
-}
 boxOrEnd() {
-    ended || shown '^Tarvex faulty$'
+    ended "$process" || titled '^Tarvex faulty$'
 }
 gone() {
-    ended || [ "$(window '^Tarvex faulty$')" != "$1" ]
+    ended "$process" || [ "$(window '^Tarvex faulty$')" != "$1" ]
 }
 
 # expect BOXES PLACE HOW [KEY]: runs the host, presses the key, answers the boxes and counts them.
@@ -43,17 +20,18 @@ expect() {
     local boxes=$1 count=0 box code=0
     "$host" "$2" "$3" 2>"$work/said" &
     process=$!
+    processes=("$process")
     if [ -n "${4:-}" ]; then
-        until_ "$2: the main window appears" shown '^Faulty$'
+        await "$2: the main window appears" titled '^Faulty$'
         xdotool windowactivate --sync "$(window '^Faulty$')" key --clearmodifiers "$4"
     fi
-    until_ "$2 $3: a box or the end" boxOrEnd
-    while ! ended 2>/dev/null; do
+    await "$2 $3: a box or the end" boxOrEnd
+    while ! ended "$process"; do
         box=$(window '^Tarvex faulty$')
         if [ -n "$box" ]; then
             count=$((count + 1))
             xdotool windowactivate --sync "$box" key Return
-            until_ "$2 $3: box $count goes when it is answered" gone "$box"
+            await "$2 $3: box $count goes when it is answered" gone "$box"
         fi
     done
     wait "$process" || code=$?

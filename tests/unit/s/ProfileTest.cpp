@@ -1,8 +1,8 @@
 #include "s/Profile.h"
 
+#include "StoreTest.h"
 #include "TestApp.h"
 #include "platform/port/Version.h"
-#include "platform/win/detail/RegistryStore.h"
 #include "s/Version.h"
 
 #include <gtest/gtest.h>
@@ -15,41 +15,25 @@
 namespace {
 
 /// A store and an installation of its own, and an application that has named itself.
-class Profile : public ::testing::Test {
+class Profile : public StoreTest {
 protected:
     void SetUp() override {
-        std::string name = (std::filesystem::temp_directory_path() / "profile.XXXXXX").string();
-        m_folder = mkdtemp(name.data());
-        tvx::registry::closeStores();
-        setenv("TVX_REGISTRY", (m_folder / "registry.db").c_str(), 1);
+        StoreTest::SetUp();
         theApp.SetRegistryKey("Maker");
     }
     void TearDown() override {
         Port::Version::setReader(&Gui_InstallInfo::GetValue);
-        tvx::registry::closeStores();
-        std::filesystem::remove_all(m_folder);
+        StoreTest::TearDown();
     }
     /// Lets the installation have a version.
     static void install(const char* version) {
         installed = version;
         Port::Version::setReader([](const char*) { return installed.c_str(); });
     }
-    static std::string stored(const std::string& path, const char* name) {
-        HKEY key = nullptr;
-        if (RegOpenKeyExA(HKEY_CURRENT_USER, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS)
-            return "<no key>";
-        char text[100] = {};
-        DWORD size = sizeof text;
-        DWORD type = REG_NONE;
-        const LSTATUS result = RegQueryValueExA(key, name, nullptr, &type, reinterpret_cast<BYTE*>(text), &size);
-        RegCloseKey(key);
-        return result != ERROR_SUCCESS ? "<no value>" : type != REG_SZ ? "<no text>" : text;
-    }
     static std::string applicationKey(const char* section) {
         return std::string("Software\\Maker\\") + theApp.m_pszProfileName + "\\" + section;
     }
 
-    std::filesystem::path m_folder;
     inline static std::string installed;
 };
 

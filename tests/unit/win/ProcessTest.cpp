@@ -1,6 +1,7 @@
 #include "platform/win/Process.h"
 
 #include "platform/win/Error.h"
+#include "platform/win/ProcessMark.h"
 #include "platform/win/detail/ProcessObject.h"
 
 #include <gtest/gtest.h>
@@ -354,4 +355,29 @@ TEST(ProcessEnd, RingsTheBellOfReleasedChildren) {
     EXPECT_EQ(released.count(), 0u);
     EXPECT_EQ(tvx::win::waitReadable(released.bell(), 0), 0);
     EXPECT_EQ(::kill(static_cast<pid_t>(id), 0), -1) << "no zombie";
+}
+
+TEST(ProcessMark, IsThatOfOneProcessWhateverItsProgramIsCalled) {
+    const fs::path program = fs::temp_directory_path() / "a) S 1 2 (b";
+    fs::copy_file("/bin/sleep", program, fs::copy_options::overwrite_existing);
+    const Child child("\"" + program.string() + "\" 1000");
+    ASSERT_TRUE(child.started);
+    const DWORD id = child.information.dwProcessId;
+    const std::string mark = tvx::processMark(id);
+    std::istringstream words(mark);
+    std::string boot;
+    DWORD number = 0;
+    long long ticks = 0;
+    words >> number >> boot >> ticks;
+    EXPECT_EQ(number, id) << mark;
+    EXPECT_EQ(boot.size(), 36u) << mark;
+    EXPECT_GT(ticks, 0) << mark;
+    EXPECT_TRUE(words.eof()) << mark;
+    EXPECT_FALSE(tvx::isOtherProcess(id, mark));
+    EXPECT_TRUE(tvx::isOtherProcess(id, mark + "1"));
+    EXPECT_FALSE(tvx::isOtherProcess(id + 1, mark + "1")) << "a mark of another number tells nothing";
+    EXPECT_EQ(tvx::processMark(0x7FFFFFFF), "");
+    EXPECT_FALSE(tvx::isOtherProcess(0x7FFFFFFF, "2147483647 x 1")) << "no such process";
+    TerminateProcess(child.information.hProcess, 1);
+    fs::remove(program);
 }

@@ -1,0 +1,44 @@
+# What the tests share that use an application as a user does, under a window manager. To be sourced.
+#
+# Leaves a folder for the test's files in $work, and ends the processes whose ids are in $processes when the test ends.
+limit=30 # seconds that anything may take
+work=$(mktemp -d "${TMPDIR:-/tmp}/desktop.XXXXXX")
+processes=()
+tidy() {
+    [ ${#processes[@]} -eq 0 ] || kill "${processes[@]}" 2>/dev/null || true
+    rm -rf "$work"
+}
+trap tidy EXIT
+
+# fail REASON: ends the test, with a picture of the screen where TVX_PICTURE names a file for it.
+fail() {
+    [ -z "${TVX_PICTURE:-}" ] || import -window root "$TVX_PICTURE" || true
+    echo "FAIL: $1" >&2
+    exit 1
+}
+# await REASON COMMAND...: waits for the command to succeed.
+await() {
+    local what=$1 end=$((SECONDS + limit))
+    shift
+    until "$@" >/dev/null 2>&1; do
+        [ $SECONDS -lt $end ] || fail "$what"
+    done
+}
+# window PATTERN: the id of the visible window with such a title, nothing without one.
+window() {
+    xdotool search --onlyvisible --name "$1" 2>/dev/null | tail -n 1
+}
+titled() {
+    [ -n "$(window "$1")" ]
+}
+untitled() {
+    [ -z "$(window "$1")" ]
+}
+# ended PROCESS
+ended() {
+    ! kill -0 "$1" 2>/dev/null
+}
+# active WINDOW: whether it is the window manager's active one.
+active() {
+    [ "$(xdotool getactivewindow 2>/dev/null)" = "$1" ]
+}
