@@ -2,7 +2,7 @@
 
 #include "platform/base/Text.h"
 #include "platform/port/Version.h"
-#include "s/InstanceKey.h"
+#include "s/SettingsKey.h"
 
 #include <cstring>
 #include <utility>

@@ -2,6 +2,7 @@
 
 #include "afxext.h"
 #include "platform/base/Text.h"
+#include "s/SettingsKey.h"
 
 #include <algorithm>
 #include <array>
@@ -19,29 +20,8 @@ constexpr const char* barProfile = "ControlBar";
 constexpr const char* familyKey = "Software\\Tarvex\\Common";
 constexpr char spaceInName = '~';
 
-/// The key of what the family shares, open. Closes itself.
-class FamilyKey {
-public:
-    FamilyKey() {
-        RegCreateKeyExA(HKEY_CURRENT_USER, familyKey, 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE,
-                        nullptr, &m_key, nullptr);
-    }
-    ~FamilyKey() {
-        RegCloseKey(m_key);
-    }
-    FamilyKey(const FamilyKey&) = delete;
-    FamilyKey& operator=(const FamilyKey&) = delete;
-
-    operator HKEY() const {
-        return m_key;
-    }
-
-private:
-    HKEY m_key = nullptr;
-};
-
 CString familyText(const char* name) {
-    const FamilyKey key;
+    const SettingsKey key(familyKey);
     DWORD size = 0;
     if (RegQueryValueExA(key, name, nullptr, nullptr, nullptr, &size) != ERROR_SUCCESS)
         return {};
@@ -133,7 +113,7 @@ int Gui_Profile::ReadDialogWindowPlacement(const char* name, WINDOWPLACEMENT& pl
 
 void Gui_Profile::WriteDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement) {
     const CString text = placementText(placement);
-    RegSetValueExA(FamilyKey(), name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.GetString()),
+    RegSetValueExA(SettingsKey(familyKey), name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.GetString()),
                    static_cast<DWORD>(text.GetLength() + 1));
 }
 

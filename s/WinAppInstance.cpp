@@ -5,9 +5,9 @@
 #include "platform/win/Process.h"
 #include "platform/win/ProcessMark.h"
 #include "s/Desktop.h"
-#include "s/InstanceKey.h"
 #include "s/Process.h"
 #include "s/Profile.h"
+#include "s/SettingsKey.h"
 #include "s/WinAppData.h"
 
 #include <array>

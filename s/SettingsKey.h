@@ -1,0 +1,39 @@
+#pragma once
+
+#include "afxwin.h"
+
+/// A key of the user's settings, open for reading and writing; made when it is missing. Closes itself.
+class SettingsKey {
+public:
+    /// @param path  below the root of the current user
+    explicit SettingsKey(const char* path) {
+        RegCreateKeyExA(HKEY_CURRENT_USER, path, 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE, nullptr,
+                        &m_key, nullptr);
+    }
+    ~SettingsKey() {
+        RegCloseKey(m_key);
+    }
+    SettingsKey(const SettingsKey&) = delete;
+    SettingsKey& operator=(const SettingsKey&) = delete;
+
+    operator HKEY() const {
+        return m_key;
+    }
+
+private:
+    HKEY m_key = nullptr;
+};
+
+/// The key with the record of an application's first instance.
+class InstanceKey : public SettingsKey {
+public:
+    /// @param appName  the application's name as given to the constructor of Gui_WinApp
+    explicit InstanceKey(const char* appName) : SettingsKey(path(appName)) {}
+
+private:
+    static CString path(const char* appName) {
+        CString text;
+        text.Format("Software\\Tarvex\\%s\\%s", appName, "FirstInstance");
+        return text;
+    }
+};
