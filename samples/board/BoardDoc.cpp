@@ -2,6 +2,7 @@
 
 #include "Resource.h"
 #include "s/FileName.h"
+#include "s/Msg.h"
 
 #include <string>
 #include <utility>
@@ -14,6 +15,28 @@ constexpr ULONGLONG largestFile = 64 * 1024 * 1024;
 CString shown(LPCSTR path) {
     constexpr int room = 80;
     return Gui_FileName(path).GetAbbreviatedName(room, TRUE);
+}
+
+/// A word of a damaged file, which may be anything, cut to what a message has room for.
+CString shown(std::string word) {
+    constexpr std::size_t room = 60;
+    if (word.size() > room) {
+        std::size_t end = room;
+        while (end > 0 && (word[end] & 0xC0) == 0x80) { // between characters
+            --end;
+        }
+        word.replace(end, std::string::npos, "...");
+    }
+    return word.c_str();
+}
+
+/// What is wrong with a drawing, in the user's language.
+CString sentence(const board::ReadResult& result) {
+    Gui_Msg message(IDS_FAULT_FIRST + static_cast<UINT>(result.fault));
+    for (const std::string& detail : result.details) {
+        message << shown(detail);
+    }
+    return message.GetValue();
 }
 
 } // namespace
@@ -84,7 +107,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     board::ReadResult result = board::readDrawing(text);
     if (!result.ok()) {
         CString message;
-        message.Format(IDS_DAMAGED, shown(path).GetString(), result.line, result.reason.c_str());
+        message.Format(IDS_DAMAGED, shown(path).GetString(), result.line, sentence(result).GetString());
         AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
         return FALSE;
     }

@@ -61,11 +61,28 @@ struct Drawing {
     bool operator==(const Drawing&) const = default;
 };
 
+/// What can be wrong with the text of a drawing, in the order of the sentences for the user, IDS_FAULT_FIRST and on.
+enum class Fault {
+    noDrawing,
+    unknownVersion, ///< the version
+    unknownShape,   ///< the word in its place
+    fewCoordinates,
+    noNumber, ///< of what, the word in its place, the least and the greatest number
+    noColor,  ///< the word in its place
+    noText,
+    openText,
+    noBlankAfterText,
+    unknownEscape,
+    unknownAttribute, ///< the shape, the attribute
+    zeroByte,
+};
+
 /// What reading gives: a drawing, or what is wrong and where.
 struct ReadResult {
     Drawing drawing;
-    int line = 0;       ///< Of the first fault, counted from 1; 0 when there is none.
-    std::string reason; ///< A sentence for the user.
+    int line = 0; ///< Of the first fault, counted from 1; 0 when there is none.
+    Fault fault{};
+    std::vector<std::string> details; ///< What the fault's sentence is filled with.
 
     [[nodiscard]] bool ok() const {
         return line == 0;

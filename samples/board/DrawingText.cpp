@@ -36,13 +36,10 @@ bool isBlank(char c) {
     return c == ' ' || c == '\t';
 }
 
-std::string quoted(std::string_view text) {
-    return "\"" + std::string(text) + "\"";
-}
-
 /// A fault, on its way out of the reader.
-struct Fault {
-    std::string reason;
+struct Damage {
+    Fault fault;
+    std::vector<std::string> details{};
 };
 
 /// Reads one line of the file, word by word.
@@ -74,10 +71,10 @@ public:
             text += m_rest[at] == '\\' ? escaped(++at) : m_rest[at];
         }
         if (at >= m_rest.size()) {
-            throw Fault{"The text has no closing quote."};
+            throw Damage{Fault::openText};
         }
         if (at + 1 < m_rest.size() && !isBlank(m_rest[at + 1])) {
-            throw Fault{"A blank is missing behind the closing quote."};
+            throw Damage{Fault::noBlankAfterText};
         }
         take(at + 1);
         return text;
@@ -95,7 +92,7 @@ private:
         case '\\':
             return c;
         default:
-            throw Fault{"A \\ in a text is followed by n, r, \" or another \\."};
+            throw Damage{Fault::unknownEscape};
         }
     }
 
@@ -126,8 +123,8 @@ std::optional<Number> parse(std::string_view text, int base) {
 int parseNumber(std::string_view what, std::string_view text, int least, int most) {
     const auto value = parse<int>(text, 10);
     if (!value || *value < least || *value > most) {
-        throw Fault{std::string(what) + ": " + quoted(text) + " is not a whole number from " + std::to_string(least) +
-                    " to " + std::to_string(most) + "."};
+        throw Damage{Fault::noNumber,
+                     {std::string(what), std::string(text), std::to_string(least), std::to_string(most)}};
     }
     return *value;
 }
@@ -136,16 +133,16 @@ Color parseColor(std::string_view text) {
     const bool shaped = text.size() == 7 && text.front() == '#';
     const auto value = shaped ? parse<Color>(text.substr(1), 16) : std::nullopt;
     if (!value) {
-        throw Fault{quoted(text) + " is not a colour such as #3366cc."};
+        throw Damage{Fault::noColor, {std::string(text)}};
     }
     return *value;
 }
 
 int parseCoordinate(LineReader& line) {
     if (line.atEnd()) {
-        throw Fault{"Four coordinates are needed: x and y of one corner, x and y of the other."};
+        throw Damage{Fault::fewCoordinates};
     }
-    return parseNumber("Coordinate", line.word(), -maxCoordinate, maxCoordinate);
+    return parseNumber("x, y", line.word(), -maxCoordinate, maxCoordinate);
 }
 
 void parseAttribute(Shape& shape, std::string_view word) {
@@ -161,7 +158,7 @@ void parseAttribute(Shape& shape, std::string_view word) {
     } else if (name == "size" && shape.kind == ShapeKind::text) {
         shape.size = parseNumber("size", value, minTextSize, maxTextSize);
     } else {
-        throw Fault{"A " + std::string(nameOf(shape.kind)) + " has no attribute " + quoted(name) + "."};
+        throw Damage{Fault::unknownAttribute, {std::string(nameOf(shape.kind)), std::string(name)}};
     }
 }
 
@@ -171,7 +168,7 @@ ShapeKind parseKind(std::string_view word) {
             return entry.kind;
         }
     }
-    throw Fault{"Unknown shape " + quoted(word) + "."};
+    throw Damage{Fault::unknownShape, {std::string(word)}};
 }
 
 Shape parseShape(std::string_view text) {
@@ -183,7 +180,7 @@ Shape parseShape(std::string_view text) {
     }
     if (shape.kind == ShapeKind::text) {
         if (!line.atQuote()) {
-            throw Fault{"The text in quotes is missing."};
+            throw Damage{Fault::noText};
         }
         shape.text = line.quotedText();
     }
@@ -196,11 +193,11 @@ Shape parseShape(std::string_view text) {
 void checkHeader(std::string_view line) {
     LineReader words(line);
     if (words.atEnd() || words.word() != "board") {
-        throw Fault{"This is no drawing: the first line must be " + quoted(header) + "."};
+        throw Damage{Fault::noDrawing};
     }
     const std::string_view version = words.atEnd() ? std::string_view() : words.word();
     if (version != "1" || !words.atEnd()) {
-        throw Fault{"Version " + quoted(version) + " of the format is not known to this program."};
+        throw Damage{Fault::unknownVersion, {std::string(version)}};
     }
 }
 
@@ -222,7 +219,7 @@ std::string_view takeLine(std::string_view& text) {
 
 void readLine(Drawing& drawing, std::string_view line) {
     if (line.find('\0') != std::string_view::npos) {
-        throw Fault{"The line holds a zero byte; this is not a text."};
+        throw Damage{Fault::zeroByte};
     }
     if (isShape(line)) {
         Shape shape = parseShape(line);
@@ -296,8 +293,8 @@ ReadResult readDrawing(std::string_view text) {
             ++number;
             readLine(result.drawing, takeLine(text));
         }
-    } catch (Fault& fault) {
-        result = {{}, number, std::move(fault.reason)};
+    } catch (Damage& damage) {
+        result = {{}, number, damage.fault, std::move(damage.details)};
     }
     return result;
 }

@@ -25,6 +25,21 @@
 #define IDS_STOPPED 210
 #define IDS_CRASHED 211
 
+/* What is wrong with a drawing, in the order of board::Fault. */
+#define IDS_FAULT_FIRST 220
+#define IDS_FAULT_NO_DRAWING 220
+#define IDS_FAULT_UNKNOWN_VERSION 221
+#define IDS_FAULT_UNKNOWN_SHAPE 222
+#define IDS_FAULT_FEW_COORDINATES 223
+#define IDS_FAULT_NO_NUMBER 224
+#define IDS_FAULT_NO_COLOR 225
+#define IDS_FAULT_NO_TEXT 226
+#define IDS_FAULT_OPEN_TEXT 227
+#define IDS_FAULT_NO_BLANK 228
+#define IDS_FAULT_UNKNOWN_ESCAPE 229
+#define IDS_FAULT_UNKNOWN_ATTRIBUTE 230
+#define IDS_FAULT_ZERO_BYTE 231
+
 /* The tools, in the order of board::Tool. */
 #define ID_TOOL_SELECT 32770
 #define ID_TOOL_RECTANGLE 32771
