@@ -10,6 +10,7 @@ set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/bin")
 set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/lib")
 # A translated resource library is looked up beside its module, so programs and libraries keep their real paths.
 set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+set(CMAKE_INSTALL_RPATH "$ORIGIN;$ORIGIN/../lib")
 
 find_program(TVX_CCACHE ccache)
 if(TVX_CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)

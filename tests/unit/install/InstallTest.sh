@@ -1,0 +1,32 @@
+#!/usr/bin/env bash
+# An installed library is enough for a host: the sample application is built outside of this tree with what was installed,
+# and runs, also after the installation was moved.
+#
+#   InstallTest.sh CMAKE BUILD_DIR SAMPLES_DIR COMPILER
+set -euo pipefail
+cmake=$1 build=$2 samples=$3 compiler=$4
+work=$(mktemp -d "${TMPDIR:-/tmp}/install.XXXXXX")
+trap 'rm -rf "$work"' EXIT
+
+"$cmake" --install "$build" --prefix "$work/first" >"$work/log" || { cat "$work/log"; exit 1; }
+mv "$work/first" "$work/moved"
+
+cp -r "$samples/board" "$work/host"
+cat - "$samples/board/CMakeLists.txt" >"$work/host/CMakeLists.txt" <<'TXT'
+cmake_minimum_required(VERSION 3.25)
+project(Host CXX)
+find_package(Tarvex 1.0 REQUIRED)
+TXT
+"$cmake" -S "$work/host" -B "$work/out" -G Ninja -DCMAKE_CXX_COMPILER="$compiler" -DCMAKE_PREFIX_PATH="$work/moved" \
+    -DCMAKE_BUILD_TYPE=Debug >"$work/log" 2>&1 && "$cmake" --build "$work/out" >>"$work/log" 2>&1 || {
+    cat "$work/log"
+    exit 1
+}
+"$work/out/board" -smoketest
+# The texts come from the host, the library and the layer, in the user's language.
+said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1)
+[[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
+
+ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
+"$work/moved/bin/tvxsettings" --help >/dev/null
+[ -s "$work/moved/share/man/man1/tvxsettings.1" ] || { echo "FAIL: no manual page"; exit 1; }
