@@ -29,8 +29,7 @@ public:
     ///
     /// A whole word stands between white space or the ends of the text; the character before `find->chrg.cpMin` counts.
     /// @param flags FR_WHOLEWORD (2), FR_MATCHCASE (4) or both (6). Every other value, also one with further bits,
-    /// looks
-    ///     for any place without regard to case
+    ///     looks for any place without regard to case
     /// @param find  `chrg` is the range to search: its end only limits what is accepted and must be a real position.
     ///     `lpstrText` is what to find. `chrgText` receives the first place found, even one beyond the range's end
     /// @return where the text was found; -1 when it was not, when the place found reaches beyond the range's end, and
