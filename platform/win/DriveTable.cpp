@@ -39,6 +39,13 @@ std::string unescaped(std::string_view text) {
     return result;
 }
 
+/// Of "/" nothing is taken.
+std::string_view withoutEndSlashes(std::string_view folder) {
+    while (folder.size() > 1 && folder.ends_with('/'))
+        folder.remove_suffix(1);
+    return folder;
+}
+
 std::optional<Mount> parseLine(std::string_view line) {
     constexpr int fieldsBeforePoint = 4;
     constexpr std::string_view endOfOptions = " - ";
@@ -49,7 +56,8 @@ std::optional<Mount> parseLine(std::string_view line) {
     std::string_view right = line.substr(end + endOfOptions.size());
     for (int field = 0; field < fieldsBeforePoint; ++field)
         takeField(left, ' ');
-    Mount mount{unescaped(takeField(left, ' ')), std::string(takeField(right, ' ')), {}};
+    Mount mount{
+        std::string(withoutEndSlashes(unescaped(takeField(left, ' ')))), std::string(takeField(right, ' ')), {}};
     mount.source = unescaped(takeField(right, ' '));
     return mount.point.starts_with('/') && mount.point.find('\0') == std::string::npos ? std::optional(mount)
                                                                                        : std::nullopt;
@@ -184,9 +192,7 @@ bool setKind(Drive& drive, std::string_view kind) {
 std::optional<Drive> parseEntry(std::string_view entry) {
     Drive drive;
     const std::string_view letter = takeField(entry, '=');
-    std::string_view folder = takeField(entry, '|');
-    while (folder.size() > 1 && folder.ends_with('/'))
-        folder.remove_suffix(1);
+    const std::string_view folder = withoutEndSlashes(takeField(entry, '|'));
     if (letter.size() != 1 || !isLetter(upper(letter.front())) || !folder.starts_with('/') || !setKind(drive, entry))
         return std::nullopt;
     drive.letter = upper(letter.front());
