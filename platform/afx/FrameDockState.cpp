@@ -109,7 +109,8 @@ void CFrameWnd::GetDockState(CDockState& state) const {
             info->m_nPlace = place->place;
         }
         if (info->m_bFloating) {
-            info->m_pointPos = CPoint(tools->x(), tools->y());
+            const QPoint at = placeOfFloating(*tools);
+            info->m_pointPos = CPoint(at.x(), at.y());
         }
         state.m_arrBarInfo.Add(info.release());
     }

@@ -3,6 +3,7 @@
 #include "platform/afx/Frame.h"
 
 #include <QMainWindow>
+#include <QMoveEvent>
 #include <QStatusBar>
 #include <QToolBar>
 
@@ -25,13 +26,47 @@ std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
     return std::make_unique<StatusBarWindow>(cs);
 }
 
+/// A tool bar that knows where it floats. While a window manager takes in a new window, the place that it tells can be
+/// the screen's corner; only what is told after the first painting counts.
+class Tools : public QToolBar {
+public:
+    using QToolBar::QToolBar;
+
+    QPoint place() const {
+        return isVisible() ? m_place : pos();
+    }
+
+protected:
+    void showEvent(QShowEvent* event) override {
+        if (!event->spontaneous()) {
+            m_place = pos();
+            m_painted = false;
+        }
+        QToolBar::showEvent(event);
+    }
+    void paintEvent(QPaintEvent* event) override {
+        m_painted = true;
+        QToolBar::paintEvent(event);
+    }
+    void moveEvent(QMoveEvent* event) override {
+        if (m_painted || !event->spontaneous()) {
+            m_place = event->pos();
+        }
+        QToolBar::moveEvent(event);
+    }
+
+private:
+    QPoint m_place;
+    bool m_painted = false;
+};
+
 const WindowClassEntry barEntry("ToolbarWindow32", &makeBar);
 const WindowClassEntry statusBarEntry("msctls_statusbar32", &makeStatusBar);
 
 } // namespace
 
 QWidget* BarWindow::makeWidget(QWidget* parent) {
-    auto* bar = new QToolBar(text(), parent);
+    auto* bar = new Tools(text(), parent);
     // Layouts are remembered under this name.
     bar->setObjectName(QStringLiteral("bar%1").arg(id()));
     bar->setMovable(false);
@@ -104,6 +139,11 @@ void floatToolBar(QToolBar& bar, QPoint at) {
     bar.move(at);
     bar.adjustSize();
     bar.setVisible(shown && isFrameShown(bar));
+}
+
+QPoint placeOfFloating(const QToolBar& bar) {
+    const auto* tools = dynamic_cast<const Tools*>(&bar);
+    return tools != nullptr ? tools->place() : bar.pos();
 }
 
 void showFloating(QToolBar& bar) {

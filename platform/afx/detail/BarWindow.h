@@ -42,6 +42,8 @@ protected:
 void attachStatusBar(QMainWindow& main, QWidget* widget);
 /// Makes a tool bar a small window at a point of the screen. It comes up when the frame does.
 void floatToolBar(QToolBar& bar, QPoint at);
+/// Where a floating tool bar stands on the screen. One that the desktop is about to show is where it was asked to be.
+[[nodiscard]] QPoint placeOfFloating(const QToolBar& bar);
 /// Shows a floating tool bar that waited for its frame.
 void showFloating(QToolBar& bar);
 
