@@ -100,34 +100,73 @@ Piece pieceAt(std::string_view pattern, std::size_t start) {
     return piece;
 }
 
-/// Matches what follows the first "*", which stands at `star`, against the text from `at` on.
-bool matchesBehindStar(std::string_view text, std::size_t at, std::string_view pattern, std::size_t star) {
-    const auto [last, end] = endOfPattern(pattern, text, at);
-    if (end == none)
-        return false;
-    const std::string_view between = text.substr(0, end);
-    for (int stars = 1; star < last; ++stars) {
+/// Where a pattern is being compared with a text.
+struct Place {
+    std::size_t text = 0;
+    std::size_t pattern = 0; ///< of a "*"
+};
+
+/// Matches the pieces from one "*" to another against a stretch of the text.
+bool matchesBetween(std::string_view text, std::string_view pattern, Place from, Place to) {
+    const std::string_view between = text.substr(0, to.text);
+    for (int stars = 1; from.pattern < to.pattern; ++stars) {
         if (stars == mostStars)
             return false;
-        const Piece piece = pieceAt(pattern, star + 1);
-        at = findEnd(piece, between, at);
-        if (at == none)
+        const Piece piece = pieceAt(pattern, from.pattern + 1);
+        from.text = findEnd(piece, between, from.text);
+        if (from.text == none)
             return false;
-        star += 1 + piece.text.size();
+        from.pattern += 1 + piece.text.size();
     }
     return true;
 }
 
-} // namespace
+/// Matches what follows the first "*". Of its own, so that what comes before it does not pay for it.
+[[gnu::noinline]] bool matchesBehindStar(std::string_view text, std::string_view pattern, Place star) {
+    const auto [last, end] = endOfPattern(pattern, text, star.text);
+    if (end == none)
+        return false;
+    return star.pattern == last || matchesBetween(text, pattern, star, {end, last});
+}
 
-bool MatchesWildcard(std::string_view text, std::string_view pattern) noexcept {
+bool matches(std::string_view text, std::string_view pattern) {
     std::size_t at = 0;
     for (std::size_t next = 0; next < pattern.size(); ++next) {
         if (pattern[next] == '*')
-            return matchesBehindStar(text, at, pattern, next);
+            return matchesBehindStar(text, pattern, {at, next});
         if (at == text.size() || (pattern[next] != '?' && pattern[next] != text[at]))
             return false;
         at += pattern[next] == '?' ? characterLength(text, at) : 1;
     }
     return at == text.size();
+}
+
+/// Whether the pattern is one "*" before characters that stand for themselves, the first of which can only stand
+/// between characters.
+bool isOnlyEnd(std::string_view pattern) {
+    if (pattern.size() < 2 || pattern[0] != '*' || isWithinCharacter(pattern[1]))
+        return false;
+    for (const char wanted : pattern.substr(1)) {
+        if (wanted == '*' || wanted == '?')
+            return false;
+    }
+    return true;
+}
+
+/// Compares all characters whether they differ or not: which one does cannot be foretold, and a branch that goes the
+/// other way costs more than the rest.
+bool endsWith(std::string_view text, std::string_view end) {
+    if (text.size() < end.size())
+        return false;
+    const char* at = text.data() + (text.size() - end.size());
+    unsigned differences = 0;
+    for (const char wanted : end)
+        differences |= static_cast<unsigned char>(*at++ ^ wanted);
+    return differences == 0;
+}
+
+} // namespace
+
+bool MatchesWildcard(std::string_view text, std::string_view pattern) noexcept {
+    return isOnlyEnd(pattern) ? endsWith(text, pattern.substr(1)) : matches(text, pattern);
 }

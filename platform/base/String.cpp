@@ -181,10 +181,6 @@ void CStringT<char>::SetString(const char* text, int length) {
     assign({text, text ? static_cast<std::size_t>(nonNegative(length)) : 0});
 }
 
-int CStringT<char>::GetLength() const noexcept {
-    return headerOf(m_text).length;
-}
-
 char CStringT<char>::GetAt(int index) const {
     return (*this)[index];
 }
@@ -312,6 +308,7 @@ void CStringT<char>::makeOwn(int capacity) {
 }
 
 void CStringT<char>::setLength(int length) noexcept {
+    static_assert(sizeof(Header) - offsetof(Header, length) == lengthBeforeText, "GetLength reads it there");
     headerOf(m_text).length = length;
     m_text[length] = '\0';
 }

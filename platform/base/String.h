@@ -6,6 +6,7 @@
 #include <compare>
 #include <cstdarg>
 #include <cstddef>
+#include <cstring>
 #include <functional>
 #include <string_view>
 #include <utility>
@@ -89,7 +90,11 @@ public:
         return {m_text, static_cast<std::size_t>(GetLength())};
     }
     /// Length in bytes.
-    int GetLength() const noexcept;
+    int GetLength() const noexcept {
+        int length = 0;
+        std::memcpy(&length, m_text - lengthBeforeText, sizeof length);
+        return length;
+    }
     /// Whether the length is 0.
     bool IsEmpty() const noexcept {
         return GetLength() == 0;
@@ -254,6 +259,9 @@ private:
     void setLength(int length) noexcept;
     void replaceRange(int index, int count, std::string_view text);
     void keepRange(std::size_t begin, std::size_t end);
+
+    /// How far before the text its length is kept.
+    static constexpr std::size_t lengthBeforeText = 8;
 
     char* m_text;
 
