@@ -79,9 +79,10 @@ int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
         record.unfinished = text.substr(text.size() - unfinished);
         text.resize(text.size() - unfinished);
     }
-    if (!text.empty())
-        Gui_Edit::AppendText(edit, CString(text));
-    return found;
+    if (text.empty())
+        return found;
+    Gui_Edit::AppendText(edit, CString(text));
+    return 1;
 }
 
 int Gui_Process::NotifyWindow(HWND window, unsigned int message) {
