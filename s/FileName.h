@@ -106,9 +106,8 @@ public:
     /// @{
 
     /// Mount and path.
-    /// @param unc             non-zero: a relative path is completed with the current folder, and shares stay shares;
-    /// 0:
-    ///                        it stays relative, and shares are given as drives where there is one
+    /// @param unc             non-zero: a relative path is completed with the current folder, and shares stay shares.
+    ///                        0: it stays relative, and shares are given as drives where there is one
     /// @param defaultMount    taken when the mount is empty, as SetMount takes it; may be null
     /// @param defaultPath     taken when the path is empty, as SetPath takes it; may be null
     /// @param stripSeparator  non-zero: without the separator at the end
@@ -126,7 +125,7 @@ public:
     /// @return non-zero when they do
     int IsEquivalent(const Gui_FileName& other) const;
     /// The whole name for display, with "..." in place of as many of its first folders as must be left out:
-    /// "C:\...\gui\main.cpp".
+    /// "C:\...\gui\main.cpp". A name without a mount is shortened to one without.
     /// @param maxLength  characters that there is room for
     /// @param keepName   what to give when not even base and extension have room: 0 the empty text, else those
     CString GetAbbreviatedName(int maxLength, int keepName) const;
@@ -195,8 +194,7 @@ public:
     /// @param mount    its first character is the drive
     /// @param uncOnly  0: also a connection whose name is no share
     /// @return 1 when the mount may be used as it is now: it became a share, was one, or names are switched off; 0 for
-    /// a
-    ///     drive that is not connected, which stays
+    ///     a drive that is not connected, which stays
     static int GetRemoteMountName(CString& mount, int uncOnly);
     /// There are no other network names than shares: 0, and the text stays.
     static int GetNetworkName(CString& name);

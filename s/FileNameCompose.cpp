@@ -68,7 +68,7 @@ CString abbreviated(const Gui_FileName& name, int keepName, const Fits& fits) {
     const CString last = working.GetBaseAndExtension();
     if (!fits(last))
         return keepName ? last : CString();
-    const CString prefix = working.GetMount() + "\\...\\";
+    const CString prefix = name.GetMount() + "\\...\\";
     const auto shortened = [&](std::string_view path) { return prefix + CString(path) + last; };
     const CString path = working.GetPath();
     const auto paths = shorterPaths(path.View());

@@ -27,11 +27,9 @@ public:
     /// Without callbacks: errors go to a message box with the error icon, all other lines to standard output.
     Gui_MessageManager();
     /// @param errorCallback  receives each message of the error class as one text, line feeds included; null shows it
-    /// in
-    ///                       a message box
+    ///                       in a message box
     /// @param statusCallback receives every other message line by line, without the line feeds; null writes the lines
-    /// to
-    ///                       standard output
+    ///                       to standard output
     Gui_MessageManager(Callback errorCallback, Callback statusCallback);
     ~Gui_MessageManager() override;
 

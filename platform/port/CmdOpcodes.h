@@ -34,8 +34,7 @@ public:
     /// themselves accept the abbreviations that the check accepts.
     /// @param word the option without "-", in any letter case, in full or abbreviated.
     /// @return the name as it is spelled in the specification, "help" for every help switch; null when no option or
-    /// more
-    ///     than one is meant. It belongs to this object.
+    ///     more than one is meant. It belongs to this object.
     const char* optionname(const char* word) const;
 
 private:

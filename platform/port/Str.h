@@ -27,8 +27,7 @@ public:
     /// Takes the first token off the front of @p source.
     /// @param source     loses the token and the delimiter behind it
     /// @param token      receives what stands before the first delimiter: nothing when @p source begins with one, all
-    /// of
-    ///     @p source when it has none
+    ///     of @p source when it has none
     /// @param delimiters the bytes that end a token
     /// @return the delimiter that ended the token, 0 when @p source ended first
     static char GetToken(std::string& source, std::string& token, const char* delimiters);

@@ -53,8 +53,7 @@ TVX_PLATFORM_API DWORD GetFileAttributesA(LPCSTR name);
 /// Opens or creates a file.
 /// @param access       of GENERIC_READ and GENERIC_WRITE
 /// @param share        0: nobody else may open it through this call meanwhile (`ERROR_SHARING_VIOLATION`), nor may it
-/// be
-///                     open already; otherwise others may
+///                     be open already; otherwise others may
 /// @param security     not used; the handle is not inherited
 /// @param disposition  one of CREATE_NEW to TRUNCATE_EXISTING
 /// @param flags        not used: new files get what the process's mask allows

@@ -129,6 +129,7 @@ TEST_F(FileNameFiles, AreShortenedForDisplay) {
     EXPECT_EQ(Gui_FileName("C:\\Übergröße\\ä.b").GetAbbreviatedName(16, 1), "C:\\Übergröße\\ä.b") << "16 characters";
     EXPECT_EQ(name.GetAbbreviatedName(nullptr, 0, 1), "C:\\proj\\src\\gui\\main.cpp");
     EXPECT_EQ(Gui_FileName("\\\\s\\d\\one\\two\\x").GetAbbreviatedName(14, 1), "\\\\s\\d\\...\\x");
+    EXPECT_EQ(Gui_FileName("\\one\\two\\x").GetAbbreviatedName(9, 1), "\\...\\x") << "the mount as it is: none";
     // A great many folders take no time worth waiting for.
     std::string deep = "C:";
     for (int i = 0; i < 100000; ++i)
