@@ -8,6 +8,7 @@
 #include "platform/afx/detail/Loop.h"
 #include "platform/afx/detail/MdiWindow.h"
 #include "platform/afx/detail/MenuWidgets.h"
+#include "platform/afx/detail/ScrollBarWindow.h"
 
 #include <QAbstractScrollArea>
 #include <QKeyEvent>
@@ -44,25 +45,6 @@ protected:
     }
     void scrollContentsBy(int, int) override {}
 };
-
-UINT scrollCode(int action) {
-    switch (action) {
-    case QAbstractSlider::SliderSingleStepAdd:
-        return SB_LINEDOWN;
-    case QAbstractSlider::SliderSingleStepSub:
-        return SB_LINEUP;
-    case QAbstractSlider::SliderPageStepAdd:
-        return SB_PAGEDOWN;
-    case QAbstractSlider::SliderPageStepSub:
-        return SB_PAGEUP;
-    case QAbstractSlider::SliderToMinimum:
-        return SB_TOP;
-    case QAbstractSlider::SliderToMaximum:
-        return SB_BOTTOM;
-    default:
-        return SB_THUMBTRACK;
-    }
-}
 
 } // namespace
 
@@ -134,13 +116,13 @@ void PlainWindow::connectBar(int bar) {
     // The toolkit would move the slider by itself; here the window decides, by SetScrollPos. Its own idea is put back
     // before it acts on it.
     QObject::connect(slider, &QScrollBar::actionTriggered, slider, [this, slider, message](int action) {
-        const UINT code = scrollCode(action);
+        const int code = scrollCodeOf(action);
         const int position = slider->sliderPosition();
         if (code != SB_THUMBTRACK) {
             slider->setSliderPosition(slider->value());
         }
         armIdle();
-        call(message, MAKEWPARAM(static_cast<int>(code), position));
+        call(message, MAKEWPARAM(code, position));
     });
     QObject::connect(slider, &QScrollBar::sliderReleased, slider, [this, slider, message] {
         call(message, MAKEWPARAM(SB_THUMBPOSITION, slider->sliderPosition()));

@@ -15,7 +15,9 @@ std::unique_ptr<Window> makeScrollBar(const CREATESTRUCT& cs) {
 
 const WindowClassEntry scrollBarEntry("ScrollBar", &makeScrollBar);
 
-int codeOf(int action) {
+} // namespace
+
+int scrollCodeOf(int action) {
     switch (action) {
     case QAbstractSlider::SliderSingleStepAdd:
         return SB_LINEDOWN;
@@ -34,15 +36,13 @@ int codeOf(int action) {
     }
 }
 
-} // namespace
-
 QWidget* ScrollBarWindow::makeWidget(QWidget* parent) {
     auto* bar = new QScrollBar((style() & SBS_VERT) != 0 ? Qt::Vertical : Qt::Horizontal, parent);
     bar->setRange(0, 0);
     bar->setInvertedControls(bar->orientation() == Qt::Vertical);
     // The parent decides where the slider stands; the toolkit's own idea is put back before it acts on it.
     QObject::connect(bar, &QScrollBar::actionTriggered, bar, [this, bar](int action) {
-        const int code = codeOf(action);
+        const int code = scrollCodeOf(action);
         const int position = bar->sliderPosition();
         if (code != SB_THUMBTRACK) {
             bar->setSliderPosition(bar->value());
