@@ -136,6 +136,18 @@ picture about "The About box."
 xdotool key Return
 
 timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
+xdotool key --clearmodifiers alt+t
+xdotool key Return
+await '^Run Command$'
+xdotool key --clearmodifiers ctrl+a
+xdotool type 'seq -f "Meshing part %g of 8" 8'
+picture run-command "Tools, Run Command asks for a program to run."
+xdotool key Return
+await '^seq '
+picture output "Its output appears in a window of its own while it runs."
+xdotool key Escape
+
+timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
 xdotool key --clearmodifiers alt+F4
 picture unsaved "Closing with changes asks first."
 xdotool key --clearmodifiers n

@@ -176,7 +176,8 @@ BOOL CDialog::createFrom(const tvx::DialogTemplate& description, CWnd* parent, b
 
 namespace {
 
-void place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& object) {
+/// Gives a dialog the place and size of its template. The answer is whether it was centred instead.
+bool place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& object) {
     const QRect rect = dialog.map(description.rect);
     Window* over = dialog.isChild() ? nullptr : dialog.owner();
     QPoint corner = rect.topLeft();
@@ -186,11 +187,13 @@ void place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& o
     if ((description.style & DS_CENTERMOUSE) != 0) {
         corner = QCursor::pos() - QPoint(rect.width() / 2, rect.height() / 2);
     }
-    guarded([&] { dialog.setWindowRect(QRect(corner, rect.size())); });
+    guarded([&] { dialog.setClientSize(corner, rect.size()); });
     const bool noPlace = rect.topLeft().isNull() && (description.style & (DS_ABSALIGN | DS_CENTERMOUSE)) == 0;
-    if (!dialog.isChild() && ((description.style & DS_CENTER) != 0 || noPlace || over == nullptr)) {
+    const bool centred = !dialog.isChild() && ((description.style & DS_CENTER) != 0 || noPlace || over == nullptr);
+    if (centred) {
         object.CenterWindow();
     }
+    return centred;
 }
 
 } // namespace
@@ -201,7 +204,8 @@ void CDialog::initialise(const tvx::DialogTemplate& description, CWnd*) {
     const HWND handle = m_hWnd;
     dialog.useFont(description);
     OnSetFont(GetFont());
-    place(dialog, description, *this);
+    const bool centred = place(dialog, description, *this);
+    const QRect placed = dialog.windowRect();
     if (!makeControls(dialog, description)) {
         std::fprintf(stderr, "A control of the dialog %s could not be made.\n", nameOf(m_lpszTemplateName).c_str());
     }
@@ -210,6 +214,10 @@ void CDialog::initialise(const tvx::DialogTemplate& description, CWnd*) {
     const bool setsFocus = SendMessage(WM_INITDIALOG, firstHandle, 0) != 0;
     if (!::IsWindow(handle) || m_ended) {
         return;
+    }
+    const QRect now = dialog.windowRect();
+    if (centred && now.topLeft() == placed.topLeft() && now.size() != placed.size()) {
+        CenterWindow(); // laid out anew, it is centred with its new size
     }
     if (setsFocus && !dialog.isChild()) {
         // Controls may have been shown, hidden or disabled meanwhile.

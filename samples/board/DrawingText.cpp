@@ -206,8 +206,8 @@ bool isShape(std::string_view line) {
     return first != std::string_view::npos && line[first] != '#';
 }
 
-/// Takes the next line off a text, without its end: a line feed with all the carriage returns before it, so that what is
-/// written reads as the same lines again. A last line may have none.
+/// Takes the next line off a text, without its end: a line feed with all the carriage returns before it, so that what
+/// is written reads as the same lines again. A last line may have none.
 std::string_view takeLine(std::string_view& text) {
     const std::size_t end = text.find('\n');
     std::string_view line = text.substr(0, end);

@@ -17,6 +17,7 @@
 #include <QApplication>
 #include <QFontMetrics>
 #include <QScreen>
+#include <QWindow>
 
 #include <cstdio>
 
@@ -106,10 +107,23 @@ void DialogWindow::setWindowRect(const QRect& rect) {
     fixSize();
 }
 
+QMargins DialogWindow::expectedBorders() const {
+    const bool framed = !isChild() && (style() & WS_CAPTION) == WS_CAPTION;
+    const QWidget* over = framed && owner() != nullptr ? owner()->widget() : nullptr;
+    const QWindow* native = over != nullptr && over->isVisible() ? over->windowHandle() : nullptr;
+    return native != nullptr ? native->frameMargins() : QMargins();
+}
+
+void DialogWindow::setClientSize(QPoint corner, QSize inside) {
+    const QMargins around = isChild() ? QMargins() : expectedBorders();
+    setWindowRect(QRect(corner, inside + QSize(around.left() + around.right(), around.top() + around.bottom())));
+}
+
 void DialogWindow::keepOnScreen() {
     // The window manager's frame is unknown until the dialog is shown.
     constexpr QMargins frame(0, 0, 8, 32);
-    const QRect area = widget()->screen()->availableGeometry() - ((style() & WS_CAPTION) != 0 ? frame : QMargins());
+    const bool isGuess = (style() & WS_CAPTION) != 0 && expectedBorders().isNull();
+    const QRect area = widget()->screen()->availableGeometry() - (isGuess ? frame : QMargins());
     const QRect now = windowRect();
     QRect place = now;
     place.moveRight(std::min(place.right(), area.right()));

@@ -24,6 +24,11 @@ public:
     ~DialogWindow() override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void setWindowRect(const QRect& rect) override;
+    /// Those of the owner, which has a caption as most dialogs do: sizes that a host computes for the whole window
+    /// then come out right before the desktop has told them.
+    QMargins expectedBorders() const override;
+    /// Gives the area inside a size, and the window a corner.
+    void setClientSize(QPoint corner, QSize inside);
     void show(int command) override;
 
     /// Takes the template's font: it gives the dialog its units, and its controls their text.

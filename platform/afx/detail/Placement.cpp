@@ -56,8 +56,18 @@ bool Placement::awaitsBorders() const {
     return framed && (!widget().isVisible() || borders().isNull());
 }
 
+/// What the desktop's borders will add to the size of a window that is not shown yet.
+QSize Placement::expectedGrowth() const {
+    if (widget().isVisible() || !awaitsBorders() || !borders().isNull()) {
+        return {0, 0};
+    }
+    const QMargins expected = m_window.expectedBorders();
+    return {expected.left() + expected.right(), expected.top() + expected.bottom()};
+}
+
 QRect Placement::frameRect() const {
-    return widget().geometry() + borders();
+    const QRect frame = widget().geometry() + borders();
+    return {frame.topLeft(), frame.size() + expectedGrowth()};
 }
 
 void Placement::moveFrame(const QRect& rect, Measured measured) {
@@ -72,7 +82,8 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
         m_lookBack.start();
     }
     const QMargins around = borders();
-    const QSize inside(rect.width() - around.left() - around.right(), rect.height() - around.top() - around.bottom());
+    const QSize inside =
+        rect.size() - expectedGrowth() - QSize(around.left() + around.right(), around.top() + around.bottom());
     if (around.isNull()) {
         widget().move(rect.topLeft());
         widget().resize(inside.expandedTo({1, 1}));

@@ -64,6 +64,7 @@ private:
     QMargins borders() const;
     bool isNormal() const;
     bool awaitsBorders() const;
+    QSize expectedGrowth() const;
     void settle();
     void grant();
     void lookBack();

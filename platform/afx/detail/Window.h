@@ -134,6 +134,10 @@ public:
     // --- place and size; rectangles in the parent's client coordinates, top-level ones in screen coordinates ---
 
     virtual QRect windowRect() const;
+    /// The borders that the desktop will put around a top-level window, as far as they can be known before it is shown.
+    virtual QMargins expectedBorders() const {
+        return {};
+    }
     virtual void setWindowRect(const QRect& rect);
     /// What keeps the window's place; null for windows that are always inside another.
     Placement* placement() const {

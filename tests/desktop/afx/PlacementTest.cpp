@@ -189,6 +189,34 @@ TEST_F(FramesOnDesktop, PlacedOffTheScreenComeBackToIt) {
     standsAt(CRect(screen.right() + 1 - 600, screen.bottom() + 1 - 400, screen.right() + 1, screen.bottom() + 1));
 }
 
+namespace {
+
+class LaidOutDialog : public CDialog {
+protected:
+    BOOL OnInitDialog() override {
+        CDialog::OnInitDialog();
+        return SetWindowPos(nullptr, 0, 0, 420, 260, SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+    }
+};
+
+} // namespace
+
+TEST_F(FramesOnDesktop, HaveDialogsOverTheirMiddleInTheWholeSizeThatTheyGaveThemselves) {
+    frame->MoveWindow(kPlace);
+    frame->ShowWindow(SW_SHOW);
+    standsAt(kPlace);
+    LaidOutDialog dialog;
+    ASSERT_TRUE(dialog.Create(IDD_EMPTY, frame.get()));
+    dialog.ShowWindow(SW_SHOW);
+    const QWidget& widget = *dialog.GetState()->widget();
+    const CSize size(420, 260);
+    const CRect wanted(kPlace.CenterPoint() - CSize(size.cx / 2, size.cy / 2), size);
+    const auto onScreen = [&] { return fromQt(widget.windowHandle()->frameGeometry()); };
+    const auto framed = [&] { return widget.windowHandle()->frameMargins().top() > 0; };
+    EXPECT_TRUE(QTest::qWaitFor([&] { return framed() && onScreen() == wanted; }, kPatience)) << words(onScreen());
+    dialog.DestroyWindow();
+}
+
 TEST(DialogsOnDesktop, KeepTheirInsideAndStandWhereTheyStood) {
     CDialog dialog;
     ASSERT_TRUE(dialog.Create(IDD_EMPTY));
