@@ -114,6 +114,13 @@ int fieldWidth(CWnd& field, int characters) {
     return std::min(characters, 0x7FFF) * metrics.tmAveCharWidth;
 }
 
+/// The height of a dialog around a client area: a high caption must not take all the room below the buttons.
+int leastHeight(const CWnd& dialog, int client) {
+    CRect window;
+    dialog.GetWindowRect(&window);
+    return client + window.Height() - clientSize(dialog).cy;
+}
+
 void place(CWnd& control, CPoint corner) {
     control.SetWindowPos(nullptr, corner.x, corner.y, 0, 0, SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
 }
@@ -140,5 +147,7 @@ void Gui_QueryDlg::layOut() {
     place(*GetDlgItem(IDCANCEL), layout.cancel);
     place(help, layout.help);
     help.ShowWindow(measures.hasHelp ? SW_SHOW : SW_HIDE);
-    SetWindowPos(nullptr, 0, 0, layout.dialog.cx, layout.dialog.cy, SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+    const int least = leastHeight(*this, layout.ok.y + measures.button.cy + measures.margin.cy);
+    SetWindowPos(nullptr, 0, 0, layout.dialog.cx, std::max<int>(layout.dialog.cy, least),
+                 SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
 }
