@@ -40,10 +40,10 @@ CString currentDirectory(int drive) {
 /// The current folder as a path, without its drive.
 /// @param drive  whose current folder: 1 for A:; 0 for that of the process
 CString currentPath(int drive) {
-    const CString folder = drive > 0 ? currentDirectory(drive) : currentDirectory();
-    CString path;
-    tvx::allocating([&] { path = CString(AsPath(folder.View().substr(IsDrive(folder.View()) ? 2 : 0))); });
-    return path;
+    return tvx::allocating([drive] {
+        const CString folder = drive > 0 ? currentDirectory(drive) : currentDirectory();
+        return CString(AsPath(folder.View().substr(IsDrive(folder.View()) ? 2 : 0)));
+    });
 }
 
 CString withoutEndSeparator(const CString& name) {
@@ -54,10 +54,12 @@ using Fits = std::function<bool(const CString&)>;
 
 /// What is left of a path when one, two, ... folders are taken off its beginning.
 std::vector<std::string_view> shorterPaths(std::string_view path) {
-    std::vector<std::string_view> paths;
-    while (!PopFirst(path).empty())
-        paths.push_back(path);
-    return paths;
+    return tvx::allocating([path]() mutable {
+        std::vector<std::string_view> paths;
+        while (!PopFirst(path).empty())
+            paths.push_back(path);
+        return paths;
+    });
 }
 
 CString abbreviated(const Gui_FileName& name, int keepName, const Fits& fits) {
@@ -93,7 +95,7 @@ CString Gui_FileName::GetMount(int unc) const {
 
 CString Gui_FileName::GetMountAndPath(int unc, const char* defaultMount, const char* defaultPath,
                                       int stripSeparator) const {
-    const int drive = HasMount() || defaultMount ? 0 : _getdrive();
+    const int drive = HasMount() || defaultMount ? 0 : tvx::allocating(_getdrive);
     CString result;
     if (HasMount())
         result = GetMount(unc);

@@ -25,7 +25,7 @@ CString fileSystemForm(const Gui_FileName& name) {
 }
 
 tvx::FileKind kindOf(const Gui_FileName& name) {
-    return tvx::fileKind(fileSystemForm(name));
+    return tvx::allocating([&name] { return tvx::fileKind(fileSystemForm(name)); });
 }
 
 /// Removable media may be write-protected without the system knowing: only writing tells.
@@ -50,6 +50,13 @@ bool isDriveWritable(const CString& root) {
     }
 }
 
+bool isWritable(const CString& form) {
+    const DWORD attributes = GetFileAttributesA(form);
+    if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY))
+        return false;
+    return form.GetLength() < 3 || form[1] != ':' || isDriveWritable(form.Left(2) + Separator);
+}
+
 } // namespace
 
 int Gui_FileName::Exists() const {
@@ -69,11 +76,7 @@ int Gui_FileName::IsFile() const {
 }
 
 int Gui_FileName::IsWritable() const {
-    const CString form = fileSystemForm(*this);
-    const DWORD attributes = GetFileAttributesA(form);
-    if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY))
-        return 0;
-    return form.GetLength() < 3 || form[1] != ':' || isDriveWritable(form.Left(2) + Separator);
+    return tvx::allocating([this] { return isWritable(fileSystemForm(*this)); });
 }
 
 int Gui_FileName::IsDeletable() const {

@@ -199,10 +199,11 @@ namespace tvx {
 
 /// Calls a function that allocates; where the standard library reports an exhausted heap or an impossible size, the
 /// framework's memory exception is raised.
+/// @return what the function returns
 template <typename Function>
-void allocating(Function function) {
+auto allocating(Function function) {
     try {
-        function();
+        return function();
     } catch (const std::bad_alloc&) {
         AfxThrowMemoryException();
     } catch (const std::length_error&) {
