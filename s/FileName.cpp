@@ -135,7 +135,7 @@ void Gui_FileName::SetExtension(const char* extension) {
 void Gui_FileName::SetMountAndPath(const char* folder) {
     const CString base = m_record->base;
     const CString extension = m_record->extension;
-    tvx::allocating([&] { SetFullName(folder ? AsPath(folder).c_str() : nullptr); });
+    tvx::allocating([&] { SetFullName(folder ? AsFolder(folder).c_str() : nullptr); });
     m_record->base = base;
     m_record->extension = extension;
 }
@@ -159,7 +159,7 @@ void Gui_FileName::PushPathEnd(const char* path) {
             return;
         if (added.front() == Separator)
             added.erase(0, 1);
-        m_record->path = CString(AsPath(std::string(m_record->path.View()) + added));
+        m_record->path = CString(AsFolder(std::string(m_record->path.View()) + added));
     });
 }
 

@@ -22,7 +22,8 @@ class CDC;
 /// @endcode
 ///
 /// File names are values: copy and assign them freely. Texts of any length are kept whole. A null pointer counts as an
-/// empty text. No operation reports an error, except that an exhausted heap raises the framework's memory exception.
+/// empty text, unless an operation says otherwise. No operation reports an error, except that an exhausted heap raises
+/// the framework's memory exception.
 class GUI_API Gui_FileName : public CObject {
     DECLARE_SERIAL(Gui_FileName)
 
@@ -63,7 +64,8 @@ public:
     void SetBase(const char* base);
     /// Sets the extension; a dot is added in front of one without.
     void SetExtension(const char* extension);
-    /// Sets mount and path from the name of a folder, and keeps base and extension.
+    /// Sets mount and path from the name of a folder, and keeps base and extension. A folder without a name is the
+    /// root; null empties mount and path. Two forward slashes begin a share here.
     void SetMountAndPath(const char* folder);
     /// Sets base and extension from the last part of a name, and keeps mount and path.
     void SetBaseAndExtension(const char* name);

@@ -10,11 +10,15 @@ std::string WithBackslashes(std::string_view name) {
     return result;
 }
 
+std::string AsFolder(std::string_view name) {
+    std::string folder = WithBackslashes(name);
+    if (!folder.ends_with(Separator))
+        folder += Separator;
+    return folder;
+}
+
 std::string AsPath(std::string_view folders) {
-    std::string path = WithBackslashes(folders);
-    if (!path.empty() && path.back() != Separator)
-        path += Separator;
-    return path;
+    return folders.empty() ? std::string() : AsFolder(folders);
 }
 
 std::string WithDot(std::string_view extension) {

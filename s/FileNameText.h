@@ -18,7 +18,10 @@ inline std::string_view View(const char* text) {
 /// The name with backslashes for forward slashes.
 std::string WithBackslashes(std::string_view name);
 
-/// Folders in the form of a path: separators turned, one at the end. The empty text stays empty.
+/// The name of a folder: separators turned, one at the end. The empty text becomes the root.
+std::string AsFolder(std::string_view name);
+
+/// Folders in the form of a path: as AsFolder, but the empty text stays empty.
 std::string AsPath(std::string_view folders);
 
 /// The extension with a dot in front. The empty text stays empty.

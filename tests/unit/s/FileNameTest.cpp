@@ -87,6 +87,10 @@ TEST_F(FileName, SettersCompleteTheirPart) {
     EXPECT_EQ(partsOf(name), (Parts{"E:", "\\one\\two.d\\", "x.y", ".doc"}));
     name.SetBaseAndExtension("F:\\gone\\new.brd");
     EXPECT_EQ(partsOf(name), (Parts{"E:", "\\one\\two.d\\", "new", ".brd"}));
+    name.SetMountAndPath("//server/share/dir");
+    EXPECT_EQ(partsOf(name), (Parts{"\\\\server\\share", "\\dir\\", "new", ".brd"}));
+    name.SetMountAndPath("");
+    EXPECT_EQ(partsOf(name), (Parts{"", "\\", "new", ".brd"}));
     name.SetMountAndPath(nullptr);
     EXPECT_EQ(partsOf(name), (Parts{"", "", "new", ".brd"}));
     name.SetMount("\\\\server\\share");
@@ -116,6 +120,10 @@ TEST_F(FileName, FoldersArePushedAndPopped) {
     name.SetPath("a\\");
     name.PushPathStart("/r");
     EXPECT_EQ(name.GetPath(), "\\r\\a\\");
+    name.SetPath(nullptr);
+    name.PushPathEnd("/");
+    EXPECT_EQ(name.GetPath(), "\\");
+    name.SetPath("\\r\\a");
     name.PushPathEnd(nullptr);
     name.PushPathStart("");
     EXPECT_EQ(name.GetPath(), "\\r\\a\\");
