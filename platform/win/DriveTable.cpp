@@ -125,7 +125,9 @@ std::optional<Remote> parseSource(std::string_view source) {
     remote.folder = trimSlashes(source);
     remote.server.erase(0, remote.server.find('@') + 1);
     std::erase_if(remote.server, [](char character) { return character == '[' || character == ']'; });
-    std::ranges::replace(remote.server, ':', '-');
+    std::ranges::replace_if(
+        remote.server,
+        [](char character) { return std::string_view(":/\\").find(character) != std::string_view::npos; }, '-');
     return remote.server.empty() ? std::nullopt : std::optional(remote);
 }
 
@@ -174,8 +176,18 @@ char upper(char character) {
     return character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A') : character;
 }
 
+/// Whether a name is "\\server\share" and no more: that is what names are looked up by.
+bool isShare(std::string_view name) {
+    if (!name.starts_with("\\\\"))
+        return false;
+    name.remove_prefix(2);
+    const std::string_view server = takeField(name, '\\');
+    return !server.empty() && !name.empty() && server.find('/') == std::string_view::npos &&
+           name.find_first_of("\\/") == std::string_view::npos;
+}
+
 bool setKind(Drive& drive, std::string_view kind) {
-    if (kind.starts_with("\\\\") && kind.find('\\', 2) != std::string_view::npos) {
+    if (isShare(kind)) {
         drive.kind = DriveKind::remote;
         drive.remoteName = kind;
         return true;

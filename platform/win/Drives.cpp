@@ -133,11 +133,18 @@ bool isFixedDrive(std::string_view root) {
     return (root == "C:" || root == "c:") && !std::getenv("TVX_DRIVES");
 }
 
+/// The drive that a name begins with, or whose share it does; null for an unknown one and for none.
+/// @param root  "D:", "\\server\share", "\\server/share" or empty
+const Drive* findRoot(const DriveTable& table, std::string root) {
+    std::ranges::replace(root, '/', '\\');
+    return hasDrive(root) ? table.find(root.front()) : table.findShare(root);
+}
+
 std::optional<std::string> folderOf(std::string_view root) {
     if (isFixedDrive(root))
         return "/";
     const auto table = currentDrives();
-    const Drive* drive = hasDrive(root) ? table->find(root.front()) : table->findShare(root);
+    const Drive* drive = findRoot(*table, std::string(root));
     return drive ? std::optional(drive->folder) : std::nullopt;
 }
 
@@ -197,9 +204,8 @@ DWORD GetLogicalDrives() {
 
 UINT GetDriveTypeA(LPCSTR root) {
     const std::string name = root ? root : tvx::currentFolderName();
-    const std::string_view drivePart = std::string_view(name).substr(0, tvx::rootLength(name));
     const auto table = currentDrives();
-    const Drive* drive = tvx::hasDrive(drivePart) ? table->find(name.front()) : table->findShare(drivePart);
+    const Drive* drive = findRoot(*table, name.substr(0, tvx::rootLength(name)));
     return drive ? typeOf(drive->kind) : DRIVE_NO_ROOT_DIR;
 }
 

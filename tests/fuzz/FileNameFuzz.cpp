@@ -49,6 +49,7 @@ void checkTable(const tvx::win::DriveTable& table) {
         require(drive.folder.starts_with('/') && (drive.folder == "/" || !drive.folder.ends_with("//")));
         require(!drive.letter || table.find(drive.letter) == &drive);
         require(drive.remoteName.empty() || table.findShare(drive.remoteName));
+        require(tvx::rootLength(drive.remoteName) == drive.remoteName.size());
         require(!drive.letter || table.holding(drive.folder));
     }
 }

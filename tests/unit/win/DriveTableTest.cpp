@@ -69,6 +69,7 @@ TEST(DriveTable, SharesAreNamedAfterServerAndFolder) {
     EXPECT_EQ(shareOf("fuse.sshfs", "me@files:"), "\\\\files\\point");
     EXPECT_EQ(shareOf("fuse.sshfs", "me@files:work"), "\\\\files\\work");
     EXPECT_EQ(shareOf("fuse.davfs", "https://cloud.example/dav/me"), "\\\\cloud.example\\me");
+    EXPECT_EQ(shareOf("fuse.sshfs", "me@files:a/odd:/work"), "\\\\files-a-odd\\work");
     EXPECT_EQ(shareOf("ceph", "10.0.0.1:6789,10.0.0.2:6789:/vol"), "\\\\10.0.0.1-6789\\vol");
     for (const char* source : {"nothing", ":/x", "//", "@:/x"})
         EXPECT_EQ(shareOf("nfs", source), "") << source;
@@ -111,5 +112,8 @@ TEST(DriveTable, ATextReplacesTheTable) {
 
 TEST(DriveTable, MistakesInTheTextAreLeftOutAndTold) {
     EXPECT_EQ(describe(fromText("C=/;CC=/x;D;=/y;1=/z;E=relative;F=/f|floppy;G=/g|\\\\server;C=/again", 8)), "C:/");
+    EXPECT_EQ(describe(fromText("C=/;D=/d|\\\\s\\;E=/d|\\\\\\d;F=/d|\\\\s\\d\\;G=/d|\\\\s\\d\\x;H=/d|\\\\s/d\\x", 5)),
+              "C:/")
+        << "names below such shares would not be found again";
     EXPECT_EQ(describe(fromText("")), "");
 }

@@ -47,6 +47,7 @@ TEST_F(Files, DrivesAreOfTheirKind) {
     EXPECT_EQ(GetDriveTypeA("F:"), DRIVE_CDROM);
     EXPECT_EQ(GetDriveTypeA("X:\\"), DRIVE_REMOTE);
     EXPECT_EQ(GetDriveTypeA("\\\\SRV\\data\\"), DRIVE_REMOTE);
+    EXPECT_EQ(GetDriveTypeA("\\\\srv/data"), DRIVE_REMOTE);
     EXPECT_EQ(GetDriveTypeA(nullptr), DRIVE_FIXED);
     for (const char* name : {"G:\\", "\\\\srv\\other", "\\\\", "", "stick", "\\"})
         EXPECT_EQ(GetDriveTypeA(name), DRIVE_NO_ROOT_DIR) << name;
@@ -196,6 +197,7 @@ TEST_F(Files, EverythingThatOpensAFileKnowsTheDrives) {
     put("data/plan.txt", "x");
     CFile file;
     EXPECT_TRUE(file.Open("\\\\srv\\data\\Plan.txt", CFile::modeRead));
+    EXPECT_TRUE(file.Open("\\\\srv/data/plan.txt", CFile::modeRead));
     EXPECT_TRUE(file.Open("X:\\plan.txt", CFile::modeRead));
     EXPECT_FALSE(file.Open("Y:\\plan.txt", CFile::modeRead));
     CFileStatus status;
