@@ -44,9 +44,9 @@ void addMenus(QMainWindow& window) {
     for (const MenuTexts& texts : menus) {
         QMenu* menu = window.menuBar()->addMenu(texts.title);
         for (const char* item : texts.items) {
-            if (item != nullptr && *item == '-') {
+            if (item && *item == '-') {
                 menu->addSeparator();
-            } else if (item != nullptr) {
+            } else if (item) {
                 menu->addAction(item);
             }
         }

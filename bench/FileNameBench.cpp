@@ -76,46 +76,56 @@ const std::vector<std::string>& files() {
 
 void existenceOf10000(benchmark::State& state) {
     std::vector<Gui_FileName> names;
-    for (const std::string& file : files())
+    for (const std::string& file : files()) {
         names.emplace_back(("C:" + file).c_str());
-    for (auto _ : state)
-        for (const Gui_FileName& name : names)
+    }
+    for (auto _ : state) {
+        for (const Gui_FileName& name : names) {
             benchmark::DoNotOptimize(name.Exists());
+        }
+    }
 }
 BENCHMARK(existenceOf10000)->Unit(benchmark::kMillisecond);
 
 /// With the names made anew each time, as a host that walks a list of texts does.
 void existenceOf10000Texts(benchmark::State& state) {
-    for (auto _ : state)
-        for (const std::string& file : files())
+    for (auto _ : state) {
+        for (const std::string& file : files()) {
             benchmark::DoNotOptimize(Gui_FileName(file.c_str()).Exists());
+        }
+    }
 }
 BENCHMARK(existenceOf10000Texts)->Unit(benchmark::kMillisecond);
 
 void existenceOf10000WithStat(benchmark::State& state) {
-    for (auto _ : state)
+    for (auto _ : state) {
         for (const std::string& file : files()) {
-            struct stat status {};
+            struct stat status{};
             benchmark::DoNotOptimize(::stat(file.c_str(), &status));
         }
+    }
 }
 BENCHMARK(existenceOf10000WithStat)->Unit(benchmark::kMillisecond);
 
 void existenceOf10000WithTheToolkit(benchmark::State& state) {
     std::vector<QString> names;
-    for (const std::string& file : files())
+    for (const std::string& file : files()) {
         names.push_back(QString::fromStdString(file));
-    for (auto _ : state)
-        for (const QString& name : names)
+    }
+    for (auto _ : state) {
+        for (const QString& name : names) {
             benchmark::DoNotOptimize(QFileInfo::exists(name));
+        }
+    }
 }
 BENCHMARK(existenceOf10000WithTheToolkit)->Unit(benchmark::kMillisecond);
 
 /// One that is missing: the folder's 10,000 entries are gone through for one that differs in case.
 void existenceOfAMissingOne(benchmark::State& state) {
     const Gui_FileName name(("C:" + files().front() + "x").c_str());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(name.Exists());
+    }
 }
 BENCHMARK(existenceOfAMissingOne)->Unit(benchmark::kMicrosecond);
 

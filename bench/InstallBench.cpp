@@ -27,10 +27,11 @@ public:
         m_root = ::mkdtemp(pattern.data());
         m_path = m_root + "/fileset.txt";
         std::ofstream file(m_path);
-        for (int i = 0; i < 10000; ++i)
+        for (int i = 0; i < 10000; ++i) {
             file << "Mon Jan " << (i / 3600 < 1 ? " " : "") << 1 + i / 3600 << " " << i / 3600 % 24 << ":"
                  << i / 60 % 60 << ":" << i % 60 << " GMT 2026::package" << i % 2500 << "=/opt/tarvex/packages/p" << i
                  << "/setup.bin\n";
+        }
         file.close();
         ::setenv("TARVEX", m_root.c_str(), 1);
         ::unsetenv("MYTARVEX");
@@ -70,8 +71,9 @@ BENCHMARK(loadFile)->Unit(benchmark::kMillisecond);
 void askUnchangedFile(benchmark::State& state) {
     Installation installation;
     installation.touch();
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(Gui_InstallInfo::GetValue("package7"));
+    }
 }
 BENCHMARK(askUnchangedFile);
 
@@ -87,8 +89,9 @@ void loadFileWithTheStandardLibrary(benchmark::State& state) {
             strptime(line.c_str(), "%a %b %e %H:%M:%S GMT %Y", &local);
             const std::time_t time = std::mktime(&local);
             auto& value = values[line.substr(mark + 2, equals - mark - 2)];
-            if (time >= value.second)
+            if (time >= value.second) {
                 value = {line.substr(equals + 1), time};
+            }
         }
         benchmark::DoNotOptimize(values);
     }
@@ -110,8 +113,9 @@ void loadFileWithTheToolkit(benchmark::State& state) {
             const QDateTime time =
                 english.toDateTime(line.left(mark).simplified(), QStringLiteral("ddd MMM d H:m:s 'GMT' yyyy"));
             auto& value = values[line.mid(mark + 2, equals - mark - 2)];
-            if (!value.second.isValid() || time >= value.second)
+            if (!value.second.isValid() || time >= value.second) {
                 value = {line.mid(equals + 1).trimmed(), time};
+            }
         }
         benchmark::DoNotOptimize(values);
     }

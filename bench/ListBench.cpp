@@ -28,16 +28,18 @@ std::string lineText(int number) {
 const std::vector<QString>& toolkitLines() {
     static const std::vector<QString> made = [] {
         std::vector<QString> lines;
-        for (int i = 0; i < lineCount; ++i)
+        for (int i = 0; i < lineCount; ++i) {
             lines.push_back(QString::fromStdString(lineText(i)));
+        }
         return lines;
     }();
     return made;
 }
 
 void collect(CStringList& lines, int first, int last) {
-    for (int i = first; i < last; ++i)
+    for (int i = first; i < last; ++i) {
         lines.AddTail(lineText(i).c_str());
+    }
 }
 
 void prepare() {
@@ -76,8 +78,9 @@ void listWidget(benchmark::State& state, Widths widths) {
         const QFontMetrics metrics(list.font());
         for (const QString& line : lines) {
             list.addItem(line);
-            if (widths == Widths::Measured)
+            if (widths == Widths::Measured) {
                 widest = std::max(widest, metrics.horizontalAdvance(line));
+            }
         }
         QApplication::processEvents();
         list.viewport()->repaint();
@@ -113,8 +116,9 @@ void fill(benchmark::State& state, Widths widths) {
     for (auto _ : state) {
         Host host(0);
         host.list.AddStringList(lines, nullptr);
-        if (widths == Widths::Measured)
+        if (widths == Widths::Measured) {
             host.list.UpdateHorizontalExtent();
+        }
         host.paint();
     }
 }
@@ -129,8 +133,9 @@ void merge(benchmark::State& state) {
     for (auto _ : state) {
         Host host(LBS_EXTENDEDSEL);
         host.list.AddStringList(first, Gui_ListBox::StringCompare);
-        for (int i = 0; i < lineCount / 10 * 9; i += 100)
+        for (int i = 0; i < lineCount / 10 * 9; i += 100) {
             host.list.SetSel(i);
+        }
         host.list.AddStringList(second, Gui_ListBox::StringCompare);
         host.list.UpdateHorizontalExtent();
         host.paint();

@@ -56,8 +56,9 @@ public:
 void textArea(benchmark::State& state, Shown shown) {
     prepare();
     std::vector<QString> lines;
-    for (int i = 0; i < lineCount; ++i)
+    for (int i = 0; i < lineCount; ++i) {
         lines.push_back(QString::fromStdString(lineText(i)));
+    }
     for (auto _ : state) {
         QPlainTextEdit area;
         area.setReadOnly(true);
@@ -69,8 +70,9 @@ void textArea(benchmark::State& state, Shown shown) {
         QApplication::processEvents();
         for (int i = 0; i < lineCount; ++i) {
             area.appendPlainText(lines[static_cast<std::size_t>(i)]);
-            if (shown == Shown::Yes && i % linesAFrame == 0)
+            if (shown == Shown::Yes && i % linesAFrame == 0) {
                 area.viewport()->repaint();
+            }
         }
     }
 }
@@ -78,15 +80,17 @@ void textArea(benchmark::State& state, Shown shown) {
 void append(benchmark::State& state, Shown shown) {
     prepare();
     std::vector<CString> lines;
-    for (int i = 0; i < lineCount; ++i)
+    for (int i = 0; i < lineCount; ++i) {
         lines.emplace_back((lineText(i) + "\r\n").c_str());
+    }
     for (auto _ : state) {
         Host host(shown);
         host.edit.SetLimitText(static_cast<UINT>(state.range(0)));
         for (int i = 0; i < lineCount; ++i) {
             host.edit.AppendText(lines[static_cast<std::size_t>(i)]);
-            if (shown == Shown::Yes && i % linesAFrame == 0)
+            if (shown == Shown::Yes && i % linesAFrame == 0) {
                 host.paint();
+            }
         }
     }
 }
@@ -97,8 +101,9 @@ void appendChunks(benchmark::State& state) {
     std::vector<CString> chunks;
     for (int i = 0; i < lineCount; i += linesAFrame) {
         std::string chunk;
-        for (int line = i; line < i + linesAFrame; ++line)
+        for (int line = i; line < i + linesAFrame; ++line) {
             chunk += lineText(line) + "\r\n";
+        }
         chunks.emplace_back(chunk.c_str());
     }
     for (auto _ : state) {
@@ -115,11 +120,13 @@ void appendChunks(benchmark::State& state) {
 void paintOnly(benchmark::State& state) {
     prepare();
     Host host(Shown::Yes);
-    for (int i = 0; i < 1000; ++i)
+    for (int i = 0; i < 1000; ++i) {
         host.edit.AppendText((lineText(i) + "\r\n").c_str());
+    }
     for (auto _ : state) {
-        for (int i = 0; i < lineCount; i += linesAFrame)
+        for (int i = 0; i < lineCount; i += linesAFrame) {
             host.paint();
+        }
     }
 }
 

@@ -27,8 +27,9 @@ namespace {
 /// Memory of a process that has worked for a while, touched, so that copying its page tables costs what it costs.
 void growTo200Megabytes() {
     static std::vector<char> memory;
-    if (memory.empty())
+    if (memory.empty()) {
         memory.assign(200U << 20, 'x');
+    }
     benchmark::DoNotOptimize(memory.data());
 }
 
@@ -106,8 +107,9 @@ std::string writer(const benchmark::State& state) {
 }
 
 void report(benchmark::State& state, std::int64_t bytes) {
-    if (bytes != amount * static_cast<std::int64_t>(state.iterations()))
+    if (bytes != amount * static_cast<std::int64_t>(state.iterations())) {
         state.SkipWithError("not all was read");
+    }
     state.SetBytesProcessed(bytes);
 }
 
@@ -120,8 +122,9 @@ void drainOurs(benchmark::State& state) {
         CString chunk;
         // GetOutput never waits; where the event loop would wait for the pipe, the processor goes to the writer.
         while (process.GetOutput(chunk) || process.GetError() == 0) {
-            if (process.GetError() == 0 && chunk.IsEmpty())
+            if (process.GetError() == 0 && chunk.IsEmpty()) {
                 std::this_thread::yield();
+            }
             bytes += chunk.GetLength();
             chunk.ReleaseBuffer(0);
         }
@@ -153,8 +156,9 @@ void drainLayer(benchmark::State& state) {
             ReadFile(readEnd, buffer.data(), waiting, &count, nullptr);
             bytes += count;
         }
-        for (const HANDLE handle : {readEnd, child.hProcess, child.hThread})
+        for (const HANDLE handle : {readEnd, child.hProcess, child.hThread}) {
             CloseHandle(handle);
+        }
     }
     report(state, bytes);
 }
@@ -164,8 +168,9 @@ void drainRawLoop(benchmark::State& state) {
     std::int64_t bytes = 0;
     for (auto _ : state) {
         int ends[2];
-        if (::pipe2(ends, O_CLOEXEC) != 0)
+        if (::pipe2(ends, O_CLOEXEC) != 0) {
             return state.SkipWithError("no pipe");
+        }
         ::fcntl(ends[0], F_SETPIPE_SZ, 1 << 20);
         posix_spawn_file_actions_t actions;
         ::posix_spawn_file_actions_init(&actions);
@@ -185,8 +190,9 @@ void drainRawLoop(benchmark::State& state) {
             int waiting = 0;
             ::ioctl(ends[0], FIONREAD, &waiting);
             const ssize_t count = ::read(ends[0], buffer.data(), static_cast<std::size_t>(std::max(waiting, 1)));
-            if (count <= 0)
+            if (count <= 0) {
                 break;
+            }
             bytes += count;
         }
         ::close(ends[0]);
@@ -201,8 +207,9 @@ void drainToolkit(benchmark::State& state) {
     for (auto _ : state) {
         QProcess process;
         process.startCommand(QString::fromStdString(writer(state)));
-        while (process.waitForReadyRead(-1))
+        while (process.waitForReadyRead(-1)) {
             bytes += process.readAllStandardOutput().size();
+        }
         process.waitForFinished(-1);
         bytes += process.readAllStandardOutput().size();
     }
@@ -222,23 +229,26 @@ BENCHMARK(drainToolkit)->Apply(placements);
 
 void aliveById(benchmark::State& state) {
     const auto parent = static_cast<unsigned long>(::getppid());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(Gui_Process::IsActive(parent));
+    }
 }
 BENCHMARK(aliveById);
 
 void aliveByKill(benchmark::State& state) {
     const pid_t parent = ::getppid();
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(::kill(parent, 0));
+    }
 }
 BENCHMARK(aliveByKill);
 
 void aliveHeldChild(benchmark::State& state) {
     Gui_Process process;
     process.Run("sleep 1000", nullptr, 0, 1);
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(process.IsActive());
+    }
 }
 BENCHMARK(aliveHeldChild);
 

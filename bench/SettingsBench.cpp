@@ -28,7 +28,7 @@ class Folder {
 public:
     Folder() {
         const char* place = std::getenv("TMPDIR");
-        std::string name = std::string(place != nullptr ? place : ".") + "/settings-bench.XXXXXX";
+        std::string name = std::string(place ? place : ".") + "/settings-bench.XXXXXX";
         m_folder = mkdtemp(name.data());
     }
     ~Folder() {
@@ -56,8 +56,9 @@ std::string valueText(std::int64_t i) {
 
 HKEY openKey() {
     HKEY key = nullptr;
-    if (RegCreateKeyExA(HKEY_CURRENT_USER, keyPath, 0, nullptr, 0, KEY_READ | KEY_WRITE, nullptr, &key, nullptr) != 0)
+    if (RegCreateKeyExA(HKEY_CURRENT_USER, keyPath, 0, nullptr, 0, KEY_READ | KEY_WRITE, nullptr, &key, nullptr) != 0) {
         std::abort();
+    }
     return key;
 }
 
@@ -71,17 +72,21 @@ void fillStore(const Folder& folder, std::int64_t count) {
     setenv("TVX_REGISTRY", (folder / "registry.db").c_str(), 1);
     tvx::RegistryTransaction transaction;
     const HKEY key = transaction.begin() == 0 ? openKey() : nullptr;
-    for (std::int64_t i = 0; i < count; ++i)
-        if (writeValue(key, valueName(i), valueText(i)) != 0)
+    for (std::int64_t i = 0; i < count; ++i) {
+        if (writeValue(key, valueName(i), valueText(i)) != 0) {
             std::abort();
-    if (transaction.commit() != 0)
+        }
+    }
+    if (transaction.commit() != 0) {
         std::abort();
+    }
     RegCloseKey(key);
 }
 
 void fillSettings(QSettings& settings, std::int64_t count) {
-    for (std::int64_t i = 0; i < count; ++i)
+    for (std::int64_t i = 0; i < count; ++i) {
         settings.setValue("bench/" + QString::number(i), QString::fromStdString(valueText(i)));
+    }
     settings.sync();
 }
 
@@ -110,16 +115,18 @@ public:
     }
     void fill(std::int64_t count) {
         run("BEGIN");
-        for (std::int64_t i = 0; i < count; ++i)
+        for (std::int64_t i = 0; i < count; ++i) {
             write(valueName(i), valueText(i));
+        }
         run("COMMIT");
     }
     std::string read(const std::string& name) {
         sqlite3_bind_text(m_select, 1, name.c_str(), -1, SQLITE_STATIC);
         std::string text;
-        if (sqlite3_step(m_select) == SQLITE_ROW)
+        if (sqlite3_step(m_select) == SQLITE_ROW) {
             text.assign(static_cast<const char*>(sqlite3_column_blob(m_select, 0)),
                         static_cast<std::size_t>(sqlite3_column_bytes(m_select, 0)));
+        }
         sqlite3_reset(m_select);
         return text;
     }
@@ -180,8 +187,9 @@ void readWithTheDatabaseAlone(benchmark::State& state) {
     Database database(folder / "raw.db");
     database.fill(state.range(0));
     std::int64_t i = 0;
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(database.read(valueName(i++ % 50)));
+    }
 }
 BENCHMARK(readWithTheDatabaseAlone)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond);
 
@@ -206,9 +214,11 @@ void write(benchmark::State& state) {
     fillStore(folder, state.range(0));
     const HKEY key = openKey();
     std::int64_t i = 0;
-    for (auto _ : state)
-        if (++i; writeValue(key, valueName(i % state.range(0)), valueText(i + 7)) != 0)
+    for (auto _ : state) {
+        if (++i; writeValue(key, valueName(i % state.range(0)), valueText(i + 7)) != 0) {
             state.SkipWithError("not written");
+        }
+    }
     RegCloseKey(key);
 }
 BENCHMARK(write)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond)->UseRealTime()->Iterations(1500);
@@ -218,9 +228,11 @@ void writeWithTheDatabaseAlone(benchmark::State& state) {
     Database database(folder / "raw.db");
     database.fill(state.range(0));
     std::int64_t i = 0;
-    for (auto _ : state)
-        if (++i; !database.write(valueName(i % state.range(0)), valueText(i + 7)))
+    for (auto _ : state) {
+        if (++i; !database.write(valueName(i % state.range(0)), valueText(i + 7))) {
             state.SkipWithError("not written");
+        }
+    }
 }
 BENCHMARK(writeWithTheDatabaseAlone)
     ->Arg(200)
@@ -251,12 +263,15 @@ void writeHundredTogether(benchmark::State& state) {
     for (auto _ : state) {
         ++round;
         tvx::RegistryTransaction transaction;
-        if (transaction.begin() != 0)
+        if (transaction.begin() != 0) {
             state.SkipWithError("not begun");
-        for (std::int64_t i = 0; i < 100; ++i)
+        }
+        for (std::int64_t i = 0; i < 100; ++i) {
             writeValue(key, valueName(i), valueText(i + round));
-        if (transaction.commit() != 0)
+        }
+        if (transaction.commit() != 0) {
             state.SkipWithError("not written");
+        }
     }
     RegCloseKey(key);
 }
@@ -273,8 +288,9 @@ double worstOf(int process, Write write) {
     double worst = 0;
     for (int i = 0; i < writesEach; ++i) {
         const auto begin = std::chrono::steady_clock::now();
-        if (!write(std::to_string(process) + "." + std::to_string(i), valueText(i)))
+        if (!write(std::to_string(process) + "." + std::to_string(i), valueText(i))) {
             return -1;
+        }
         const std::chrono::duration<double, std::milli> taken = std::chrono::steady_clock::now() - begin;
         worst = std::max(worst, taken.count());
     }
@@ -291,8 +307,9 @@ double collect(int from) {
     double worst = 0;
     for (int process = 0; process < processes; ++process) {
         double one = -1;
-        if (::read(from, &one, sizeof one) != sizeof one || one < 0)
+        if (::read(from, &one, sizeof one) != sizeof one || one < 0) {
             return -1;
+        }
         worst = std::max(worst, one);
         wait(nullptr);
     }
@@ -302,12 +319,14 @@ double collect(int from) {
 int countLost() {
     int lost = 0;
     const HKEY key = openKey();
-    for (int process = 0; process < processes; ++process)
-        for (int i = 0; i < writesEach; ++i)
+    for (int process = 0; process < processes; ++process) {
+        for (int i = 0; i < writesEach; ++i) {
             lost += RegQueryValueExA(key, (std::to_string(process) + "." + std::to_string(i)).c_str(), nullptr, nullptr,
                                      nullptr, nullptr) != 0
                         ? 1
                         : 0;
+        }
+    }
     RegCloseKey(key);
     return lost;
 }
@@ -316,8 +335,9 @@ int countLost() {
 template <typename Body>
 double runProcesses(Body body) {
     std::array<int, 2> ends{};
-    if (pipe(ends.data()) != 0)
+    if (pipe(ends.data()) != 0) {
         std::abort();
+    }
     for (int process = 0; process < processes; ++process) {
         if (fork() == 0) {
             const double own = body(process);
@@ -337,8 +357,9 @@ void twoProcessesWrite(benchmark::State& state) {
         const Folder folder;
         fillStore(folder, 200);
         const double slowest = runProcesses(&writeToStore);
-        if (slowest < 0)
+        if (slowest < 0) {
             state.SkipWithError("not written");
+        }
         worst = std::max(worst, slowest);
         lost += countLost();
     }
@@ -357,8 +378,9 @@ void twoProcessesWriteWithTheDatabaseAlone(benchmark::State& state) {
             return worstOf(process,
                            [&](const std::string& name, const std::string& text) { return own.write(name, text); });
         });
-        if (slowest < 0)
+        if (slowest < 0) {
             state.SkipWithError("not written");
+        }
         worst = std::max(worst, slowest);
     }
     state.counters["worst_ms"] = worst;

@@ -35,30 +35,34 @@ BENCHMARK(expandMessageWithTheToolkit);
 
 std::string megabyte() {
     std::string text;
-    while (text.size() < 1u << 20)
+    while (text.size() < 1u << 20) {
         text += "/usr/share/drawings/gear" + std::to_string(text.size()) + ";";
+    }
     return text;
 }
 
 void splitMegabyte(benchmark::State& state) {
     const Gui_String text(megabyte().c_str());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(std::unique_ptr<CStringArray>(text.GetStringArray(";", 1, 0))->GetSize());
+    }
 }
 BENCHMARK(splitMegabyte)->Unit(benchmark::kMillisecond);
 
 void splitMegabyteWithTheToolkit(benchmark::State& state) {
     const QString text = QString::fromStdString(megabyte());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(text.split(u';', Qt::SkipEmptyParts).size());
+    }
 }
 BENCHMARK(splitMegabyteWithTheToolkit)->Unit(benchmark::kMillisecond);
 
 /// A separator outside ASCII is compared character by character.
 void splitMegabyteAtWideCharacters(benchmark::State& state) {
     const Gui_String text(megabyte().c_str());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(std::unique_ptr<CStringArray>(text.GetStringArray("¤;", 1, 1))->GetSize());
+    }
 }
 BENCHMARK(splitMegabyteAtWideCharacters)->Unit(benchmark::kMillisecond);
 

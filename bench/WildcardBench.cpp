@@ -21,8 +21,9 @@ const std::vector<CString>& names() {
         std::mt19937 random(1);
         for (int i = 0; i < nameCount; ++i) {
             std::string name = random() % 3 == 0 ? "m" : "";
-            while (name.size() < 26)
+            while (name.size() < 26) {
                 name += static_cast<char>('a' + random() % 26);
+            }
             name += random() % 2 == 0 ? ".cpp" : ".txt";
             all.emplace_back(name.c_str());
         }
@@ -49,8 +50,9 @@ bool greedy(std::string_view text, std::string_view pattern) {
             return false;
         }
     }
-    while (wanted < pattern.size() && pattern[wanted] == '*')
+    while (wanted < pattern.size() && pattern[wanted] == '*') {
         ++wanted;
+    }
     return wanted == pattern.size();
 }
 
@@ -93,8 +95,9 @@ void manyNames(benchmark::State& state, const char* pattern) {
     int matched = 0;
     for (auto _ : state) {
         matched = 0;
-        for (const CString& name : all)
+        for (const CString& name : all) {
             matched += matcher(name) ? 1 : 0;
+        }
     }
     state.counters["matched"] = matched;
     state.SetItemsProcessed(state.iterations() * nameCount);
@@ -104,15 +107,17 @@ template <typename Matcher>
 void longText(benchmark::State& state, const char* pattern, const std::string& text) {
     Matcher matcher(pattern);
     const CString long_(text.c_str());
-    for (auto _ : state)
+    for (auto _ : state) {
         benchmark::DoNotOptimize(matcher(long_));
+    }
 }
 
 template <typename Matcher>
 void add(const std::string& who) {
-    for (const char* pattern : {"*.cpp", "*a*b*c*", "m?in*", "*xyz*"})
+    for (const char* pattern : {"*.cpp", "*a*b*c*", "m?in*", "*xyz*"}) {
         benchmark::RegisterBenchmark((std::string(pattern) + '/' + who).c_str(), manyNames<Matcher>, pattern)
             ->Unit(benchmark::kMicrosecond);
+    }
     const std::string many(10000, 'a');
     constexpr const char* attack = "*a*a*a*a*a*b";
     benchmark::RegisterBenchmark(("attack on a.../" + who).c_str(), longText<Matcher>, attack, many)

@@ -19,11 +19,13 @@ int Gui_Bitmap::Draw(CDC* dc, CPoint point, int rop) {
 
 int Gui_Bitmap::Draw(CDC* dc, int x, int y, int rop) {
     CDC memory;
-    if (!dc || !m_hObject || !memory.CreateCompatibleDC(dc))
+    if (!dc || !m_hObject || !memory.CreateCompatibleDC(dc)) {
         return 0;
+    }
     CBitmap* old = memory.SelectObject(static_cast<CBitmap*>(this));
-    if (!old)
+    if (!old) {
         return 0;
+    }
     // Drawn in pixels: in modes whose y axis points upwards a size in logical units would put the picture above the
     // point, and in scaled ones it could be a pixel off.
     CPoint corner(x, y);
@@ -50,8 +52,9 @@ HBITMAP createFor(HDC dc, const BitmapFile& file) {
 
 HBITMAP createBitmap(CDC* dc, const BitmapFile& file) {
     CWnd* main = dc ? nullptr : AfxGetMainWnd();
-    if (!main)
+    if (!main) {
         return createFor(dc ? dc->GetSafeHdc() : nullptr, file);
+    }
     CDC* screen = main->GetDC();
     const HBITMAP bitmap = createFor(screen ? screen->GetSafeHdc() : nullptr, file);
     main->ReleaseDC(screen);
@@ -60,12 +63,14 @@ HBITMAP createBitmap(CDC* dc, const BitmapFile& file) {
 
 Gui_Bitmap::LoadError load(HBITMAP& bitmap, const char* fileName, CDC* dc) {
     CFile file;
-    if (!fileName || !file.Open(fileName, CFile::modeRead | CFile::shareDenyNone))
+    if (!fileName || !file.Open(fileName, CFile::modeRead | CFile::shareDenyNone)) {
         return Gui_Bitmap::CannotOpen;
+    }
     BitmapFile read;
     const Gui_Bitmap::LoadError error = ReadBitmapFile(file, read);
-    if (error != Gui_Bitmap::Loaded)
+    if (error != Gui_Bitmap::Loaded) {
         return error;
+    }
     try {
         bitmap = read.isComplete() ? createBitmap(dc, read) : nullptr;
     } catch (const std::bad_alloc&) {
@@ -79,7 +84,8 @@ Gui_Bitmap::LoadError load(HBITMAP& bitmap, const char* fileName, CDC* dc) {
 int Gui_Bitmap::LoadBitmapFromFile(HBITMAP& bitmap, const char* fileName, CDC* dc, LoadError* error) {
     bitmap = nullptr;
     const LoadError result = load(bitmap, fileName, dc);
-    if (error)
+    if (error) {
         *error = result;
+    }
     return result == Loaded ? 1 : 0;
 }

@@ -23,10 +23,11 @@ int Gui_ComboBox::MatchString(const CString& text, const CString& pattern) {
 
 void Gui_ComboBox::AddStringList(const CStringList& strings, int (*compare)(const CString*, const CString*)) {
     ControlLines lines(*this, messages);
-    if ((GetStyle() & CBS_SORT) != 0 || !compare)
+    if ((GetStyle() & CBS_SORT) != 0 || !compare) {
         lines.add(strings);
-    else
+    } else {
         lines.merge(strings, compare);
+    }
 }
 
 int Gui_ComboBox::DeleteStringList(const CStringList& strings) {

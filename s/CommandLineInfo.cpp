@@ -12,10 +12,12 @@ Gui_CommandLineInfo::Gui_CommandLineInfo() : m_impl(MakeRecord<Gui_CommandLineIn
 Gui_CommandLineInfo::~Gui_CommandLineInfo() = default;
 
 void Gui_CommandLineInfo::ParseParam(const char* param, BOOL isSwitch, BOOL isLast) {
-    if (!m_impl->ParseParam(*this, param, isSwitch))
+    if (!m_impl->ParseParam(*this, param, isSwitch)) {
         CCommandLineInfo::ParseParam(param, isSwitch, isLast);
-    if (m_impl->IsNoSplashSwitch())
+    }
+    if (m_impl->IsNoSplashSwitch()) {
         m_bShowSplash = FALSE;
+    }
 }
 
 int Gui_CommandLineInfo::IsSmokeTestSwitch() const {
@@ -70,18 +72,19 @@ bool Gui_CommandLineInfo_Impl::ParseParam(Gui_CommandLineInfo& owner, const char
 
 bool Gui_CommandLineInfo_Impl::ParseSwitch(const char* param) {
     const auto is = [param](const char* name) { return tvx::text::equalNoCase(param, name); };
-    if (is("smoketest"))
+    if (is("smoketest")) {
         m_smokeTest = 1;
-    else if (is("help") || is("h"))
+    } else if (is("help") || is("h")) {
         m_help = 1;
-    else if (is("nosplash"))
+    } else if (is("nosplash")) {
         m_noSplash = 1;
-    else if (is("intstyle"))
+    } else if (is("intstyle")) {
         m_expectation = Expectation::Style;
-    else if (is("f"))
+    } else if (is("f")) {
         m_expectation = Expectation::CommandFile;
-    else
+    } else {
         return false;
+    }
     return true;
 }
 
@@ -95,9 +98,11 @@ bool Gui_CommandLineInfo_Impl::ParseAbbreviation(const Gui_CommandLineInfo& owne
 void Gui_CommandLineInfo_Impl::ParseStyle(const char* param) {
     static constexpr const char* names[] = {"nev", "kelma", "silent"};
     m_expectation = Expectation::Nothing;
-    for (std::size_t style = 0; style < std::size(names); ++style)
-        if (tvx::text::equalNoCase(param, names[style]))
+    for (std::size_t style = 0; style < std::size(names); ++style) {
+        if (tvx::text::equalNoCase(param, names[style])) {
             m_style = static_cast<IntStyleEnum>(style);
+        }
+    }
 }
 
 void Gui_CommandLineInfo_Impl::ForgetProblems() {

@@ -10,8 +10,9 @@
 void ExpandCommandFile(CCommandLineInfo& parser, const char* name, CStringArray& problems) {
     const char* const vector[] = {"exe", "-f", name};
     const UT_CMDFILE file(static_cast<int>(std::size(vector)), vector, UT_CMDFILE::Reporting::Silent);
-    for (const std::string& problem : file.geterrors())
+    for (const std::string& problem : file.geterrors()) {
         problems.Add(CString(problem.c_str()));
+    }
     const int count = file.getargc();
     for (int i = 1; i < count; ++i) {
         const auto [text, isSwitch] = tvx::afx::takeApart(file.getargv()[i]);
@@ -20,8 +21,9 @@ void ExpandCommandFile(CCommandLineInfo& parser, const char* name, CStringArray&
 }
 
 void IssueCommandFileProblems(const CStringArray& problems) {
-    for (INT_PTR i = 0; i < problems.GetSize(); ++i)
+    for (INT_PTR i = 0; i < problems.GetSize(); ++i) {
         WinAppOrigin(__LINE__).issueError("%s", problems[i].GetString());
+    }
 }
 
 Gui_CmdLineArgsArray::Gui_CmdLineArgsArray() {
@@ -29,15 +31,17 @@ Gui_CmdLineArgsArray::Gui_CmdLineArgsArray() {
 }
 
 Gui_CmdLineArgsArray::~Gui_CmdLineArgsArray() {
-    for (INT_PTR i = 0; m_vector && i < m_arguments.GetSize(); ++i)
+    for (INT_PTR i = 0; m_vector && i < m_arguments.GetSize(); ++i) {
         m_arguments[i].ReleaseBuffer();
+    }
 }
 
 void Gui_CmdLineArgsArray::ParseParam(const char* param, BOOL isSwitch, BOOL) {
     if (isSwitch) {
         m_commandFilePending = tvx::text::equalNoCase(param, "f");
-        if (!m_commandFilePending)
+        if (!m_commandFilePending) {
             m_arguments.Add(CString('-') + param);
+        }
     } else if (m_commandFilePending) {
         ExpandCommandFile(*this, param, m_problems);
     } else {
@@ -52,8 +56,9 @@ int Gui_CmdLineArgsArray::GetCount() const {
 char** Gui_CmdLineArgsArray::GetVector() {
     if (!m_vector && GetCount() > 0) {
         m_vector = std::make_unique<char*[]>(static_cast<std::size_t>(GetCount()));
-        for (int i = 0; i < GetCount(); ++i)
+        for (int i = 0; i < GetCount(); ++i) {
             m_vector[i] = m_arguments[i].GetBuffer();
+        }
     }
     return m_vector.get();
 }

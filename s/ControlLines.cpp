@@ -28,14 +28,16 @@ int ControlLines::find(int after, const char* text) const {
 
 int ControlLines::appendTo(CStringList& texts) const {
     const int lines = count();
-    for (int line = 0; line < lines; ++line)
+    for (int line = 0; line < lines; ++line) {
         texts.AddTail(text(line));
+    }
     return lines;
 }
 
 void ControlLines::add(const CStringList& texts) {
-    for (POSITION at = texts.GetHeadPosition(); at;)
+    for (POSITION at = texts.GetHeadPosition(); at;) {
         m_control.SendMessage(m_messages.add, 0, reinterpret_cast<LPARAM>(texts.GetNext(at).GetString()));
+    }
 }
 
 namespace {
@@ -44,8 +46,9 @@ namespace {
 std::vector<const CString*> pointersTo(const CStringList& texts) {
     std::vector<const CString*> pointers;
     pointers.reserve(static_cast<std::size_t>(texts.GetCount()));
-    for (POSITION at = texts.GetHeadPosition(); at;)
+    for (POSITION at = texts.GetHeadPosition(); at;) {
         pointers.push_back(&texts.GetNext(at));
+    }
     return pointers;
 }
 
@@ -59,16 +62,18 @@ void ControlLines::merge(const CStringList& texts, CompareTexts compare) {
     all.insert(all.end(), old.begin(), old.end());
     std::ranges::stable_sort(all, [&](const CString* a, const CString* b) { return compare(a, b) < 0; });
     m_control.SendMessage(m_messages.removeAll);
-    for (const CString* text : all)
+    for (const CString* text : all) {
         m_control.SendMessage(m_messages.add, 0, reinterpret_cast<LPARAM>(text->GetString()));
+    }
 }
 
 int ControlLines::remove(const CStringList& texts) {
     int removed = 0;
     for (POSITION at = texts.GetHeadPosition(); at;) {
         const int line = find(0, texts.GetNext(at));
-        if (line >= 0 && m_control.SendMessage(m_messages.remove, static_cast<WPARAM>(line)) >= 0)
+        if (line >= 0 && m_control.SendMessage(m_messages.remove, static_cast<WPARAM>(line)) >= 0) {
             ++removed;
+        }
     }
     return removed;
 }

@@ -18,8 +18,9 @@ public:
           m_foreground(GetWindowThreadProcessId(GetForegroundWindow(), nullptr)),
           m_attached(m_foreground != m_own && AttachThreadInput(m_own, m_foreground, TRUE)) {}
     ~ForegroundInput() {
-        if (m_attached)
+        if (m_attached) {
             AttachThreadInput(m_own, m_foreground, FALSE);
+        }
     }
     ForegroundInput(const ForegroundInput&) = delete;
     ForegroundInput& operator=(const ForegroundInput&) = delete;
@@ -43,10 +44,12 @@ unsigned long Gui_Desktop::GetDialogWindowID(HWND dialog) {
 
 int Gui_Desktop::ShowWindow(unsigned long windowId) {
     const HWND window = handleOf(windowId);
-    if (!IsWindow(window))
+    if (!IsWindow(window)) {
         return 0;
-    if (IsIconic(window))
+    }
+    if (IsIconic(window)) {
         ::ShowWindow(window, SW_RESTORE);
+    }
     const ForegroundInput input;
     SetForegroundWindow(window);
     return 1;

@@ -21,15 +21,17 @@ CString Gui_Edit::GetSelText() {
     int end = 0;
     GetSel(start, end);
     CString text;
-    if (start != end)
+    if (start != end) {
         GetWindowText(text);
+    }
     return text.Mid(start, end - start);
 }
 
 void Gui_Edit::OnRButtonUp(UINT, CPoint point) {
     ClientToScreen(&point);
-    if (CWnd* parent = GetParent())
+    if (CWnd* parent = GetParent()) {
         parent->PostMessage(WM_CONTEXTMENU, 0, MAKELPARAM(point.x, point.y));
+    }
 }
 
 // Finding
@@ -67,18 +69,21 @@ bool isWordStart(std::string_view text, std::size_t at) {
 /// Bytes of as many characters as `model` has. Letters that are equal without case need not have the same length.
 std::size_t lengthOfCharacters(std::string_view text, std::string_view model) {
     std::size_t length = 0;
-    for (std::size_t at = 0; at < model.size(); at += tvx::text::characterLength(model, at))
+    for (std::size_t at = 0; at < model.size(); at += tvx::text::characterLength(model, at)) {
         length += tvx::text::characterLength(text, length);
+    }
     return length;
 }
 
 /// Where a match that begins at `at` ends; npos when none does.
 std::size_t matchEnd(std::string_view text, std::size_t at, const Search& search) {
     const std::string_view rest = text.substr(at);
-    if (search.sense == Case::Match)
+    if (search.sense == Case::Match) {
         return rest.starts_with(search.wanted) ? at + search.wanted.size() : std::string_view::npos;
-    if (!tvx::text::startsWithNoCase(rest, search.wanted))
+    }
+    if (!tvx::text::startsWithNoCase(rest, search.wanted)) {
         return std::string_view::npos;
+    }
     return at + lengthOfCharacters(rest, search.wanted);
 }
 
@@ -87,8 +92,9 @@ Found findFrom(std::string_view text, std::size_t start, const Search& search) {
     for (std::size_t at = start; at < text.size(); at += tvx::text::characterLength(text, at)) {
         const std::size_t end = wordStart ? matchEnd(text, at, search) : std::string_view::npos;
         const bool wordEnd = search.place == Place::Any || end == text.size();
-        if (end != std::string_view::npos && (wordEnd || isSpaceAt(text, end)))
+        if (end != std::string_view::npos && (wordEnd || isSpaceAt(text, end))) {
             return {at, end};
+        }
         wordStart = search.place == Place::Any || isSpaceAt(text, at);
     }
     return {std::string_view::npos, std::string_view::npos};
@@ -96,10 +102,12 @@ Found findFrom(std::string_view text, std::size_t start, const Search& search) {
 
 Search searchFor(const char* wanted, unsigned long flags) {
     Search search{wanted};
-    if (flags == FR_MATCHCASE || flags == (FR_MATCHCASE | FR_WHOLEWORD))
+    if (flags == FR_MATCHCASE || flags == (FR_MATCHCASE | FR_WHOLEWORD)) {
         search.sense = Case::Match;
-    if (flags == FR_WHOLEWORD || flags == (FR_MATCHCASE | FR_WHOLEWORD))
+    }
+    if (flags == FR_WHOLEWORD || flags == (FR_MATCHCASE | FR_WHOLEWORD)) {
         search.place = Place::WholeWord;
+    }
     return search;
 }
 
@@ -109,11 +117,13 @@ int Gui_Edit::FindTextA(unsigned long flags, _findtextexa* find) {
     CString text;
     GetWindowText(text);
     const LONG start = find->chrg.cpMin;
-    if (start < 0 || start >= text.GetLength() || !find->lpstrText)
+    if (start < 0 || start >= text.GetLength() || !find->lpstrText) {
         return -1;
+    }
     const auto [first, end] = findFrom(text.View(), static_cast<std::size_t>(start), searchFor(find->lpstrText, flags));
-    if (first == std::string_view::npos)
+    if (first == std::string_view::npos) {
         return -1;
+    }
     find->chrgText = {static_cast<LONG>(first), static_cast<LONG>(end)};
     return find->chrgText.cpMax > find->chrg.cpMax ? -1 : find->chrgText.cpMin;
 }
@@ -126,16 +136,18 @@ constexpr int limitOfLines = 60000;
 constexpr int limitOfLine = 30000;
 
 int limitOf(CEdit& edit) {
-    if (edit.GetLimitText() == 0)
+    if (edit.GetLimitText() == 0) {
         edit.SetLimitText((edit.GetStyle() & ES_MULTILINE) != 0 ? limitOfLines : limitOfLine);
+    }
     return static_cast<int>(std::min<UINT>(edit.GetLimitText(), INT_MAX));
 }
 
 /// The end of `text` that the limit has room for, cut between characters, as the control can take it.
 CString lastPart(const CString& text, int limit) {
     std::size_t start = static_cast<std::size_t>(std::max(text.GetLength() - limit, 0));
-    while (tvx::text::characterStart(text.View(), start) != start)
+    while (tvx::text::characterStart(text.View(), start) != start) {
         ++start;
+    }
     CString part(text.View().substr(start));
     part.Replace('\0', ' ');
     return part;
@@ -209,7 +221,8 @@ void Gui_Edit::AppendText(CEdit& edit, const CString& text) {
     const int length = edit.GetWindowTextLength();
     edit.SetSel(length, length, TRUE);
     edit.ReplaceSel(added, FALSE);
-    if (selected)
+    if (selected) {
         edit.SetSel(start, end, TRUE);
+    }
     view.restore();
 }

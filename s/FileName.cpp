@@ -26,8 +26,9 @@ struct Split {
 /// Takes apart a name whose separators are backslashes.
 Split split(std::string_view name) {
     Split parts;
-    if (name.size() >= 2 && name[1] == ':')
+    if (name.size() >= 2 && name[1] == ':') {
         parts.drive = name.substr(0, 2);
+    }
     name.remove_prefix(parts.drive.size());
     // Not found is the largest number: adding 1 gives 0, the beginning.
     parts.folders = name.substr(0, name.rfind(Separator) + 1);
@@ -115,8 +116,9 @@ void Gui_FileName::SetName(const char* fullName) {
 
 void Gui_FileName::SetMount(const char* mount) {
     m_record->mount = mount;
-    if (!m_record->mount.IsEmpty() && !HasNetworkMount() && !m_record->mount.View().ends_with(':'))
+    if (!m_record->mount.IsEmpty() && !HasNetworkMount() && !m_record->mount.View().ends_with(':')) {
         m_record->mount += ':';
+    }
     GetRemoteMountName(m_record->mount, 1);
 }
 
@@ -155,10 +157,12 @@ void Gui_FileName::PushPathStart(const char* path) {
 void Gui_FileName::PushPathEnd(const char* path) {
     tvx::allocating([&] {
         std::string added = WithBackslashes(View(path));
-        if (added.empty())
+        if (added.empty()) {
             return;
-        if (added.front() == Separator)
+        }
+        if (added.front() == Separator) {
             added.erase(0, 1);
+        }
         m_record->path = CString(AsFolder(std::string(m_record->path.View()) + added));
     });
 }
@@ -223,8 +227,9 @@ int Gui_FileName::HasExtension() const {
 int Gui_FileName::HasExtension(const char* extension) const {
     const std::string_view own = m_record->extension.View();
     const std::string_view asked = View(extension);
-    if (asked.empty() || own.empty())
+    if (asked.empty() || own.empty()) {
         return asked.empty() && own.empty();
+    }
     return tvx::text::equalNoCase(asked.front() == '.' ? own : own.substr(1), asked);
 }
 

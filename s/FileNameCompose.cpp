@@ -56,20 +56,23 @@ using Fits = std::function<bool(const CString&)>;
 std::vector<std::string_view> shorterPaths(std::string_view path) {
     return tvx::allocating([path]() mutable {
         std::vector<std::string_view> paths;
-        while (!PopFirst(path).empty())
+        while (!PopFirst(path).empty()) {
             paths.push_back(path);
+        }
         return paths;
     });
 }
 
 CString abbreviated(const Gui_FileName& name, int keepName, const Fits& fits) {
     CString whole = name.GetFullName(1, nullptr, nullptr, nullptr, nullptr, 1);
-    if (fits(whole))
+    if (fits(whole)) {
         return whole;
+    }
     const Gui_FileName working(whole);
     const CString last = working.GetBaseAndExtension();
-    if (!fits(last))
+    if (!fits(last)) {
         return keepName ? last : CString();
+    }
     const CString prefix = name.GetMount() + "\\...\\";
     const auto shortened = [&](std::string_view path) { return prefix + CString(path) + last; };
     const CString path = working.GetPath();
@@ -87,8 +90,9 @@ CString comparable(const Gui_FileName& name) {
 } // namespace
 
 CString Gui_FileName::GetMount(int unc) const {
-    if (unc || m_record->mount.IsEmpty() || IsDrive(m_record->mount.View()))
+    if (unc || m_record->mount.IsEmpty() || IsDrive(m_record->mount.View())) {
         return m_record->mount;
+    }
     const CString drive = DriveOfShare(m_record->mount);
     return drive.IsEmpty() ? m_record->mount : drive;
 }
@@ -97,17 +101,20 @@ CString Gui_FileName::GetMountAndPath(int unc, const char* defaultMount, const c
                                       int stripSeparator) const {
     const int drive = HasMount() || defaultMount ? 0 : tvx::allocating(_getdrive);
     CString result;
-    if (HasMount())
+    if (HasMount()) {
         result = GetMount(unc);
-    else if (defaultMount)
+    } else if (defaultMount) {
         result = Gui_FileName(defaultMount, nullptr, nullptr, nullptr).GetMount(unc);
-    else if (drive > 0)
+    } else if (drive > 0) {
         result = CString(static_cast<char>('A' + drive - 1)) + ':';
+    }
     Gui_FileName folder(nullptr, m_record->path, nullptr, nullptr);
-    if (!folder.HasPath())
+    if (!folder.HasPath()) {
         folder.SetPath(defaultPath ? defaultPath : currentPath(drive).GetString());
-    if (folder.HasPath() && folder.HasRelativePath() && unc)
+    }
+    if (folder.HasPath() && folder.HasRelativePath() && unc) {
         result += currentPath(drive);
+    }
     result += folder.GetPath();
     return stripSeparator ? withoutEndSeparator(result) : result;
 }
@@ -144,7 +151,8 @@ CString Gui_FileName::GetAbbreviatedName(const CDC* dc, int maxWidth, int keepNa
 
 CString Gui_FileName::AsURL() const {
     const CString name = GetFullName(0);
-    if (name.GetLength() >= 2 && name[1] == ':')
+    if (name.GetLength() >= 2 && name[1] == ':') {
         return CString("file:///") + name[0] + '|' + name.Mid(2);
+    }
     return "file:" + name;
 }

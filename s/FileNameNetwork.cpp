@@ -22,12 +22,14 @@ char upper(char letter) {
 class Connections {
 public:
     Connections() {
-        if (WNetOpenEnumA(RESOURCE_CONNECTED, RESOURCETYPE_DISK, 0, nullptr, &m_handle) != ERROR_SUCCESS)
+        if (WNetOpenEnumA(RESOURCE_CONNECTED, RESOURCETYPE_DISK, 0, nullptr, &m_handle) != ERROR_SUCCESS) {
             m_handle = nullptr;
+        }
     }
     ~Connections() {
-        if (m_handle)
+        if (m_handle) {
             WNetCloseEnum(m_handle);
+        }
     }
     Connections(const Connections&) = delete;
     Connections& operator=(const Connections&) = delete;
@@ -41,8 +43,9 @@ public:
             m_buffer.resize(size);
             error = read(count, size);
         }
-        if (error != ERROR_SUCCESS)
+        if (error != ERROR_SUCCESS) {
             return {};
+        }
         return {reinterpret_cast<const NETRESOURCEA*>(m_buffer.data()), count};
     }
 
@@ -62,11 +65,12 @@ CString findConnection(const Wanted& isWanted, const std::function<CString(const
     CString found;
     tvx::allocating([&] {
         Connections connections;
-        for (auto some = connections.next(); !some.empty(); some = connections.next())
+        for (auto some = connections.next(); !some.empty(); some = connections.next()) {
             if (const auto at = std::ranges::find_if(some, isWanted); at != some.end()) {
                 found = result(*at);
                 return;
             }
+        }
     });
     return found;
 }

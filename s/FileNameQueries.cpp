@@ -32,8 +32,9 @@ tvx::FileKind kindOf(const Gui_FileName& name) {
 bool canCreateFileIn(const CString& root) {
     const CString probe = root + probeName;
     const HANDLE file = CreateFileA(probe, GENERIC_WRITE, 0, nullptr, OPEN_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
-    if (file == INVALID_HANDLE_VALUE)
+    if (file == INVALID_HANDLE_VALUE) {
         return false;
+    }
     CloseHandle(file);
     DeleteFileA(probe);
     return true;
@@ -52,8 +53,9 @@ bool isDriveWritable(const CString& root) {
 
 bool isWritable(const CString& form) {
     const DWORD attributes = GetFileAttributesA(form);
-    if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY))
+    if (attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_READONLY)) {
         return false;
+    }
     return form.GetLength() < 3 || form[1] != ':' || isDriveWritable(form.Left(2) + Separator);
 }
 
@@ -90,12 +92,14 @@ int Gui_FileName::IsExecutable() const {
 }
 
 int Gui_FileName::GetRemoteMountName(CString& mount, int uncOnly) {
-    if (!GetUncFlag() || mount.View().starts_with(NetworkMark))
+    if (!GetUncFlag() || mount.View().starts_with(NetworkMark)) {
         return 1;
+    }
     const char letter = mount.IsEmpty() ? '\0' : static_cast<char>(mount[0] | 0x20);
     const CString share = letter >= 'a' && letter <= 'z' ? ShareOfDrive(letter) : CString();
-    if (share.IsEmpty() || (uncOnly && !share.View().starts_with(NetworkMark)))
+    if (share.IsEmpty() || (uncOnly && !share.View().starts_with(NetworkMark))) {
         return 0;
+    }
     mount = share;
     mount.MakeLower();
     return 1;

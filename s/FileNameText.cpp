@@ -12,8 +12,9 @@ std::string WithBackslashes(std::string_view name) {
 
 std::string AsFolder(std::string_view name) {
     std::string folder = WithBackslashes(name);
-    if (!folder.ends_with(Separator))
+    if (!folder.ends_with(Separator)) {
         folder += Separator;
+    }
     return folder;
 }
 
@@ -26,8 +27,9 @@ std::string WithDot(std::string_view extension) {
 }
 
 std::string_view PopFirst(std::string_view& path) {
-    if (path.starts_with(Separator))
+    if (path.starts_with(Separator)) {
         path.remove_prefix(1);
+    }
     const std::string_view folder = path.substr(0, path.find(Separator));
     path.remove_prefix(std::min(folder.size() + 1, path.size()));
     return folder;

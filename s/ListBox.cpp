@@ -37,10 +37,11 @@ void Gui_ListBox::AddStringList(const CStringList& strings, int (*compare)(const
         return;
     }
     CStringList selected;
-    if (isMultiple(*this))
+    if (isMultiple(*this)) {
         GetSelections(selected);
-    else if (const int current = GetCurSel(); current >= 0)
+    } else if (const int current = GetCurSel(); current >= 0) {
         selected.AddTail(lines.text(current));
+    }
     lines.merge(strings, compare);
     SelectStringListExact(selected);
 }
@@ -59,35 +60,40 @@ int Gui_ListBox::GetContents(CStringList& strings) {
 
 int Gui_ListBox::GetSelections(CStringList& strings) {
     const int count = GetSelCount();
-    if (count <= 0)
+    if (count <= 0) {
         return count;
+    }
     std::vector<int> selected(static_cast<std::size_t>(count));
     selected.resize(static_cast<std::size_t>(std::max(GetSelItems(count, selected.data()), 0)));
     const ControlLines lines(*this, messages);
-    for (const int line : selected)
+    for (const int line : selected) {
         strings.AddTail(lines.text(line));
+    }
     return static_cast<int>(selected.size());
 }
 
 int Gui_ListBox::UnselectAll() {
     const int count = GetSelCount();
-    if (count > 0)
+    if (count > 0) {
         SetSel(-1, FALSE);
+    }
     return count;
 }
 
 int Gui_ListBox::SelectStringExact(int start, const char* text) {
     const int line = ControlLines(*this, messages).find(start, text);
-    if (line < 0)
+    if (line < 0) {
         return -1;
+    }
     return isMultiple(*this) ? SetSel(line, TRUE) : SetCurSel(line);
 }
 
 int Gui_ListBox::SelectStringListExact(const CStringList& strings) {
     int count = 0;
     for (POSITION at = strings.GetHeadPosition(); at;) {
-        if (SelectStringExact(0, strings.GetNext(at)) != -1)
+        if (SelectStringExact(0, strings.GetNext(at)) != -1) {
             ++count;
+        }
     }
     return count;
 }

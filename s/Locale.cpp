@@ -35,34 +35,39 @@ void report(HINSTANCE library, const CString& name) {
 }
 
 HINSTANCE loadResourceLibrary(HINSTANCE instance, const char* baseName) {
-    if (isEnglish())
+    if (isEnglish()) {
         return nullptr;
+    }
     const WithoutNetworkNames scope;
     Gui_FileName name;
     name = baseName ? baseName : tvx::plainModuleName(tvx::moduleFileName(instance)).c_str();
-    if (!name.HasBase())
+    if (!name.HasBase()) {
         return nullptr;
+    }
     char language[4] = "";
     GetLocaleInfoA(LOCALE_USER_DEFAULT, LOCALE_SABBREVLANGNAME, language, sizeof language);
     name.SetExtension(language);
     const CString libraryName = name.GetBaseAndExtension();
     SetLastError(ERROR_SUCCESS);
     const HINSTANCE library = LoadLibraryA(libraryName);
-    if (std::getenv("Gui_Locale"))
+    if (std::getenv("Gui_Locale")) {
         report(library, libraryName);
+    }
     return library;
 }
 
 } // namespace
 
 void Gui_Locale::SetAppResourceHandle(const char* baseName) {
-    if (const HINSTANCE library = loadResourceLibrary(AfxGetInstanceHandle(), baseName))
+    if (const HINSTANCE library = loadResourceLibrary(AfxGetInstanceHandle(), baseName)) {
         AfxSetResourceHandle(library);
+    }
 }
 
 void Gui_Locale::SetDllResourceHandle(AFX_EXTENSION_MODULE& module, HINSTANCE instance, const char* baseName) {
-    if (const HINSTANCE library = loadResourceLibrary(instance, baseName))
+    if (const HINSTANCE library = loadResourceLibrary(instance, baseName)) {
         module.hResource = library;
+    }
 }
 
 int Gui_Locale::GetFixedWidthFont(CFont& font) {

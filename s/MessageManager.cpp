@@ -22,30 +22,34 @@ void Gui_MessageManager::msgWrite(MsgType type, const wchar_t* text) {
     int count = 0;
     wchar_t** lines = msgFormat(type, getClean(), getMaxLineWidth(), text, &count);
     CString out;
-    for (int i = 0; i < count; ++i)
+    for (int i = 0; i < count; ++i) {
         out += UT_STR::WstrToMbstr(lines[i]).c_str();
+    }
     UT_STR::WDelStrings(lines, count);
-    if (type >= MsgTypeError && type <= MsgTypeFatal)
+    if (type >= MsgTypeError && type <= MsgTypeFatal) {
         writeError(out);
-    else
+    } else {
         writeStatus(out);
+    }
 }
 
 void Gui_MessageManager::writeError(const CString& text) const {
-    if (m_callbacks->error)
+    if (m_callbacks->error) {
         m_callbacks->error(text);
-    else
+    } else {
         AfxMessageBox(text, MB_ICONERROR);
+    }
 }
 
 void Gui_MessageManager::writeStatus(const CString& text) const {
     for (int start = 0; start < text.GetLength();) {
         const int end = text.Find('\n', start);
         const CString line = end < 0 ? text.Mid(start) : text.Mid(start, end - start);
-        if (m_callbacks->status)
+        if (m_callbacks->status) {
             m_callbacks->status(line);
-        else
+        } else {
             Port::File::getCout() << line.GetString() << Port::Stream::endl;
+        }
         start = end < 0 ? text.GetLength() : end + 1;
     }
 }

@@ -17,10 +17,11 @@ namespace {
 
 void appendParameter(std::string& text, char marker, const CStringArray& parameters) {
     const INT_PTR index = marker - '1';
-    if (index >= 0 && index <= 8 && index < parameters.GetSize())
+    if (index >= 0 && index <= 8 && index < parameters.GetSize()) {
         text += parameters[index].View();
-    else
+    } else {
         text += "???";
+    }
 }
 
 std::string expand(std::string_view format, const CStringArray& parameters) {
@@ -55,8 +56,9 @@ void Gui_Msg::SetFormat(const char* format) {
 }
 
 void Gui_Msg::SetFormat(unsigned int id, HINSTANCE module) {
-    if (!m_record->format.LoadString(module, id) && module)
+    if (!m_record->format.LoadString(module, id) && module) {
         m_record->format.Empty();
+    }
     ClearParameters();
 }
 
@@ -85,8 +87,9 @@ Gui_Msg::operator const char*() {
 
 const CString& Gui_Msg::expanded() {
     Record& record = *m_record;
-    if (record.value.IsEmpty())
+    if (record.value.IsEmpty()) {
         tvx::allocating([&] { record.value = CString(expand(record.format.View(), record.parameters)); });
+    }
     return record.value;
 }
 

@@ -20,8 +20,9 @@ bool isValid(HANDLE handle) {
 }
 
 void close(HANDLE& handle) {
-    if (isValid(handle))
+    if (isValid(handle)) {
         CloseHandle(std::exchange(handle, INVALID_HANDLE_VALUE));
+    }
 }
 
 enum class PipeEnds { onlyReadingForChild, bothForChild };
@@ -41,8 +42,9 @@ struct Pipe {
 
     bool Create(PipeEnds ends) {
         const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
-        if (!CreatePipe(&readEnd, &writeEnd, &inheritable, 0))
+        if (!CreatePipe(&readEnd, &writeEnd, &inheritable, 0)) {
             return false;
+        }
         const HANDLE self = GetCurrentProcess();
         return ends == PipeEnds::bothForChild || DuplicateHandle(self, writeEnd, self, &writeEnd, 0, FALSE,
                                                                  DUPLICATE_SAME_ACCESS | DUPLICATE_CLOSE_SOURCE);
@@ -73,8 +75,9 @@ void Gui_Process::Record::NoteError() {
 }
 
 void Gui_Process::Record::SetPolicy(ReleasePolicy policy, DWORD code) {
-    if (isValid(inputPipe))
+    if (isValid(inputPipe)) {
         return;
+    }
     releasePolicy = policy;
     releaseExitCode = code;
 }
@@ -88,12 +91,14 @@ Gui_Process::~Gui_Process() {
 int Gui_Process::Run(const char* commandLine, const char* directory, int capture, int hidden) {
     Record& record = *m_record;
     record.lastError = 0;
-    if (isValid(record.process))
+    if (isValid(record.process)) {
         return 0;
+    }
     Pipe input;
     Pipe output;
-    if (capture)
+    if (capture) {
         record.SetPolicy(TerminateOnRelease, 1);
+    }
     STARTUPINFOA startup;
     startup.dwFlags = STARTF_USESHOWWINDOW | STARTF_USESTDHANDLES;
     startup.wShowWindow = hidden ? showHidden : showNormally;
@@ -125,12 +130,14 @@ int Gui_Process::RunWaitForWindow(const char* commandLine, const char* directory
 DWORD Gui_Process::Record::CurrentExitCode() {
     lastError = 0;
     DWORD code = exitCode;
-    if (exitCode != STILL_ACTIVE)
+    if (exitCode != STILL_ACTIVE) {
         return code;
-    if (GetExitCodeProcess(process, &code))
+    }
+    if (GetExitCodeProcess(process, &code)) {
         exitCode = code;
-    else
+    } else {
         NoteError();
+    }
     return code;
 }
 
@@ -144,26 +151,30 @@ int Gui_Process::IsActive() {
 
 unsigned long Gui_Process::Wait(unsigned long timeout) const {
     // Without a child the handle would stand for the calling process, which never ends while it waits.
-    if (!isValid(m_record->process))
+    if (!isValid(m_record->process)) {
         return WAIT_FAILED;
+    }
     return WaitForSingleObject(m_record->process, static_cast<DWORD>(std::min<unsigned long>(timeout, INFINITE)));
 }
 
 int Gui_Process::Terminate(unsigned long exitCode) {
     Record& record = *m_record;
     record.lastError = 0;
-    if (!isValid(record.process))
+    if (!isValid(record.process)) {
         return 0;
-    if (TerminateProcess(record.process, static_cast<UINT>(exitCode)))
+    }
+    if (TerminateProcess(record.process, static_cast<UINT>(exitCode))) {
         return 1;
+    }
     record.NoteError();
     return 0;
 }
 
 void Gui_Process::Release() {
     Record& record = *m_record;
-    if (isValid(record.process) && record.releasePolicy != LeaveRunning)
+    if (isValid(record.process) && record.releasePolicy != LeaveRunning) {
         Terminate(record.releaseExitCode);
+    }
     record.StopNotifying();
     record.chunk.Empty();
     record.unfinished.clear();
@@ -184,28 +195,34 @@ int Gui_Process::HasOutput() {
     Record& record = *m_record;
     record.lastError = 0;
     DWORD waiting = 0;
-    if (isValid(record.outputPipe) && !PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr))
+    if (isValid(record.outputPipe) && !PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr)) {
         record.NoteError();
+    }
     return waiting > 0;
 }
 
 int Gui_Process::GetOutput(CString& text) {
     Record& record = *m_record;
     record.lastError = 0;
-    if (!isValid(record.outputPipe))
+    if (!isValid(record.outputPipe)) {
         return 0;
+    }
     DWORD waiting = 0;
-    if (!PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr))
+    if (!PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr)) {
         record.NoteError();
-    if (waiting == 0)
+    }
+    if (waiting == 0) {
         return 0;
+    }
     // A larger buffer has no use for the old content.
-    if (text.GetAllocLength() <= static_cast<int>(waiting))
+    if (text.GetAllocLength() <= static_cast<int>(waiting)) {
         text.Empty();
+    }
     DWORD count = 0;
     char* buffer = text.GetBuffer(static_cast<int>(waiting) + 1);
-    if (!ReadFile(record.outputPipe, buffer, waiting, &count, nullptr))
+    if (!ReadFile(record.outputPipe, buffer, waiting, &count, nullptr)) {
         record.NoteError();
+    }
     text.ReleaseBuffer(static_cast<int>(count));
     return 1;
 }

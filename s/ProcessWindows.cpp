@@ -33,25 +33,28 @@ std::size_t limitOf(CEdit& edit) {
 /// have at most four bytes.
 void appendEnd(std::string& text, std::string_view piece, std::size_t limit) {
     const std::size_t most = limit + 4;
-    if (piece.size() >= most)
+    if (piece.size() >= most) {
         text.clear();
-    else if (text.size() > 2 * most)
+    } else if (text.size() > 2 * most) {
         text.erase(0, text.size() - most);
+    }
     text += piece.substr(piece.size() - std::min(piece.size(), most));
 }
 
 /// The length of what must not be shown before its rest is there: the first bytes of a character, half a line end.
 std::size_t unfinishedLength(std::string_view text) {
-    if (text.ends_with('\r'))
+    if (text.ends_with('\r')) {
         return 1;
+    }
     for (std::size_t length = 1; length <= std::min<std::size_t>(text.size(), 3); ++length) {
         const auto byte = static_cast<unsigned char>(text[text.size() - length]);
         if (byte >= 0xC0) {
             const std::size_t whole = byte >= 0xF0 ? 4 : byte >= 0xE0 ? 3 : 2;
             return whole > length ? length : 0;
         }
-        if (byte < 0x80)
+        if (byte < 0x80) {
             break;
+        }
     }
     return 0;
 }
@@ -69,18 +72,21 @@ int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
     while (GetOutput(chunk)) {
         found = 1;
         appendEnd(text, chunk.View(), limit);
-        if (lastChunk)
+        if (lastChunk) {
             *lastChunk = chunk;
-        if (Clock::now() >= deadline)
+        }
+        if (Clock::now() >= deadline) {
             break;
+        }
     }
     if (record.lastError != ERROR_BROKEN_PIPE) {
         const std::size_t unfinished = unfinishedLength(text);
         record.unfinished = text.substr(text.size() - unfinished);
         text.resize(text.size() - unfinished);
     }
-    if (text.empty())
+    if (text.empty()) {
         return found;
+    }
     Gui_Edit::AppendText(edit, CString(text));
     return 1;
 }
@@ -89,20 +95,24 @@ int Gui_Process::NotifyWindow(HWND window, unsigned int message) {
     Record& record = *m_record;
     std::array<HANDLE, 2> handles{};
     std::size_t count = 0;
-    if (record.exitCode == STILL_ACTIVE)
+    if (record.exitCode == STILL_ACTIVE) {
         handles[count++] = record.process;
+    }
     // A pipe at its end is readable for ever.
-    if (PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr))
+    if (PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr)) {
         handles[count++] = record.outputPipe;
-    if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message))
+    }
+    if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message)) {
         return 0;
+    }
     record.notifies = true;
     return 1;
 }
 
 void Gui_Process::Record::StopNotifying() {
-    if (!std::exchange(notifies, false))
+    if (!std::exchange(notifies, false)) {
         return;
+    }
     tvx::cancelPosts(process);
     tvx::cancelPosts(outputPipe);
 }
@@ -129,8 +139,9 @@ bool isHelper(HWND window) {
 }
 
 BOOL CALLBACK bringToFront(HWND window, LPARAM) {
-    if (GetParent(window) || isHelper(window) || !IsWindow(window))
+    if (GetParent(window) || isHelper(window) || !IsWindow(window)) {
         return TRUE;
+    }
     if (IsIconic(window)) {
         ShowWindow(window, SW_RESTORE);
         return TRUE;
@@ -146,7 +157,8 @@ BOOL CALLBACK bringToFront(HWND window, LPARAM) {
 
 int Gui_Process::ShowMainWindow() const {
     Record& record = *m_record;
-    if (record.CurrentExitCode() == STILL_ACTIVE && record.mainThreadId != 0)
+    if (record.CurrentExitCode() == STILL_ACTIVE && record.mainThreadId != 0) {
         EnumThreadWindows(record.mainThreadId, &bringToFront, 0);
+    }
     return 0;
 }

@@ -21,28 +21,33 @@ CString installedVersion() {
 } // namespace
 
 int Gui_Profile::ReadString(CString& value, const char* entry, const char* section) {
-    const CString text = AfxGetApp()->GetProfileStringA(section != nullptr ? section : defaultSection, entry, nullptr);
-    if (text.IsEmpty())
+    const CString text = AfxGetApp()->GetProfileStringA(section ? section : defaultSection, entry, nullptr);
+    if (text.IsEmpty()) {
         return 0;
+    }
     value = text;
     return 1;
 }
 
 void Gui_Profile::WriteString(const char* value, const char* entry, const char* section) {
-    AfxGetApp()->WriteProfileStringA(section != nullptr ? section : defaultSection, entry, value);
+    AfxGetApp()->WriteProfileStringA(section ? section : defaultSection, entry, value);
 }
 
 CString Gui_Profile::GetKeyLocation(CString appName, bool underSuite, bool perApplication, bool versioned) {
-    if (underSuite && !versioned)
+    if (underSuite && !versioned) {
         return {};
+    }
     const CString name = perApplication ? std::move(appName) : CString("Common");
-    if (underSuite)
+    if (underSuite) {
         return "NEV\\" + installedVersion() + "\\" + name;
+    }
     CString location = "Common";
-    if (versioned)
+    if (versioned) {
         location += "\\" + installedVersion();
-    if (perApplication)
+    }
+    if (perApplication) {
         location += "\\" + name;
+    }
     return location;
 }
 
@@ -57,13 +62,15 @@ int Gui_Profile::ReadFirstInstanceInfo(const char* appName, const char* valueNam
     char text[20] = {};
     DWORD size = sizeof text;
     if (RegQueryValueExA(InstanceKey(appName), valueName, nullptr, nullptr, reinterpret_cast<BYTE*>(text), &size) !=
-        ERROR_SUCCESS)
+        ERROR_SUCCESS) {
         return 0;
+    }
     text[sizeof text - 1] = '\0'; // others may have stored a text without its zero
     const char* end = text;
     const LONG number = tvx::text::toInt32(text, &end);
-    if (*end != '\0')
+    if (*end != '\0') {
         return 0;
+    }
     value = static_cast<DWORD>(number);
     return 1;
 }

@@ -23,11 +23,13 @@ constexpr char spaceInName = '~';
 CString familyText(const char* name) {
     const SettingsKey key(familyKey);
     DWORD size = 0;
-    if (RegQueryValueExA(key, name, nullptr, nullptr, nullptr, &size) != ERROR_SUCCESS)
+    if (RegQueryValueExA(key, name, nullptr, nullptr, nullptr, &size) != ERROR_SUCCESS) {
         return {};
+    }
     std::vector<char> text(size + 1); // others may have stored a text without its zero
-    if (RegQueryValueExA(key, name, nullptr, nullptr, reinterpret_cast<BYTE*>(text.data()), &size) != ERROR_SUCCESS)
+    if (RegQueryValueExA(key, name, nullptr, nullptr, reinterpret_cast<BYTE*>(text.data()), &size) != ERROR_SUCCESS) {
         return {};
+    }
     return text.data();
 }
 
@@ -35,12 +37,14 @@ CString familyText(const char* name) {
 /// @return where the last one ended, null when one is missing
 const char* readNumbers(const char* text, std::span<int> numbers) {
     for (std::size_t i = 0; i < numbers.size(); ++i) {
-        if (i > 0 && *text++ != ',')
+        if (i > 0 && *text++ != ',') {
             return nullptr;
+        }
         const char* end = text;
         numbers[i] = tvx::text::toInt32(text, &end);
-        if (end == text)
+        if (end == text) {
             return nullptr;
+        }
         text = end;
     }
     return text;
@@ -48,8 +52,9 @@ const char* readNumbers(const char* text, std::span<int> numbers) {
 
 CString numbersText(std::span<const int> numbers) {
     CString text;
-    for (const int number : numbers)
+    for (const int number : numbers) {
         text.AppendFormat(text.IsEmpty() ? "%d" : ",%d", number);
+    }
     return text;
 }
 
@@ -72,9 +77,10 @@ CString placementText(const WINDOWPLACEMENT& placement) {
 
 int parsePlacement(const CString& text, WINDOWPLACEMENT& placement) {
     std::array<int, 12> numbers{};
-    if (readNumbers(text, numbers) == nullptr || numbers[10] != GetSystemMetrics(SM_CXSCREEN) ||
-        numbers[11] != GetSystemMetrics(SM_CYSCREEN))
+    if (!readNumbers(text, numbers) || numbers[10] != GetSystemMetrics(SM_CXSCREEN) ||
+        numbers[11] != GetSystemMetrics(SM_CYSCREEN)) {
         return 0;
+    }
     placement.length = sizeof placement;
     placement.flags = static_cast<UINT>(numbers[0]);
     placement.showCmd = static_cast<UINT>(numbers[1]);
@@ -100,11 +106,11 @@ static_assert(sizeof(WINDOWPLACEMENT) == 44);
 
 int Gui_Profile::ReadWindowPlacement(WINDOWPLACEMENT& placement, const char* entry, const char* section) {
     CString text;
-    return ReadString(text, entry != nullptr ? entry : placementEntry, section) ? parsePlacement(text, placement) : 0;
+    return ReadString(text, entry ? entry : placementEntry, section) ? parsePlacement(text, placement) : 0;
 }
 
 void Gui_Profile::WriteWindowPlacement(WINDOWPLACEMENT& placement, const char* entry, const char* section) {
-    WriteString(placementText(placement), entry != nullptr ? entry : placementEntry, section);
+    WriteString(placementText(placement), entry ? entry : placementEntry, section);
 }
 
 int Gui_Profile::ReadDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement) {
@@ -121,25 +127,28 @@ void Gui_Profile::WriteDialogWindowPlacement(const char* name, WINDOWPLACEMENT& 
 
 int Gui_Profile::CheckBarState(CFrameWnd* frame, const char* profileName) {
     CDockState state;
-    state.LoadState(profileName != nullptr ? profileName : barProfile);
+    state.LoadState(profileName ? profileName : barProfile);
     for (INT_PTR i = 0; i < state.m_arrBarInfo.GetSize(); ++i) {
         const auto* record = static_cast<const CControlBarInfo*>(state.m_arrBarInfo[i]);
-        if (record == nullptr)
+        if (!record) {
             return 0;
-        if (!record->m_bFloating && frame->GetControlBar(record->m_nBarID) == nullptr)
+        }
+        if (!record->m_bFloating && !frame->GetControlBar(record->m_nBarID)) {
             return 0;
+        }
     }
     return 1;
 }
 
 int Gui_Profile::ReadBarState(CFrameWnd* frame, const char* profileName) {
-    if (CheckBarState(frame, profileName))
-        frame->LoadBarState(profileName != nullptr ? profileName : barProfile);
+    if (CheckBarState(frame, profileName)) {
+        frame->LoadBarState(profileName ? profileName : barProfile);
+    }
     return 1;
 }
 
 void Gui_Profile::WriteBarState(CFrameWnd* frame, const char* profileName) {
-    frame->SaveBarState(profileName != nullptr ? profileName : barProfile);
+    frame->SaveBarState(profileName ? profileName : barProfile);
 }
 
 // --- fonts ---
@@ -147,12 +156,14 @@ void Gui_Profile::WriteBarState(CFrameWnd* frame, const char* profileName) {
 int Gui_Profile::ReadLogFont(LOGFONTA& font, const char* entry, const char* section) {
     CString text;
     std::array<int, 13> numbers{};
-    if (!ReadString(text, entry != nullptr ? entry : fontEntry, section))
+    if (!ReadString(text, entry ? entry : fontEntry, section)) {
         return 0;
+    }
     const char* end = readNumbers(text, numbers);
-    const CString name = end != nullptr && *end == ',' ? parseFaceName(end + 1) : CString();
-    if (name.IsEmpty())
+    const CString name = end && *end == ',' ? parseFaceName(end + 1) : CString();
+    if (name.IsEmpty()) {
         return 0;
+    }
     font.lfHeight = numbers[0];
     font.lfWidth = numbers[1];
     font.lfEscapement = numbers[2];
@@ -179,6 +190,6 @@ void Gui_Profile::WriteLogFont(LOGFONTA& font, const char* entry, const char* se
         font.lfItalic,        font.lfUnderline, font.lfStrikeOut,     font.lfCharSet,     font.lfOutPrecision,
         font.lfClipPrecision, font.lfQuality,   font.lfPitchAndFamily};
     const CString name(font.lfFaceName, static_cast<int>(strnlen(font.lfFaceName, LF_FACESIZE - 1)));
-    WriteString(numbersText(numbers) + "," + name, entry != nullptr ? entry : fontEntry, section);
+    WriteString(numbersText(numbers) + "," + name, entry ? entry : fontEntry, section);
     std::replace(std::begin(font.lfFaceName), std::end(font.lfFaceName), spaceInName, ' ');
 }

@@ -41,8 +41,9 @@ CString Gui_QueryDlg::GetAnswer() const {
 }
 
 void Gui_QueryDlg::SetAnswerFieldWidth(int characters) {
-    if (characters > 0)
+    if (characters > 0) {
         m_record->fieldWidth = characters;
+    }
 }
 
 void Gui_QueryDlg::SetHelpId(unsigned int id) {
@@ -65,8 +66,9 @@ void Gui_QueryDlg::OnOK() {
 
 void Gui_QueryDlg::OnHelpButton() {
     CWinApp* app = AfxGetApp();
-    if (m_record->helpId != 0 && app)
+    if (m_record->helpId != 0 && app) {
         app->WinHelpA(m_record->helpId, HELP_CONTEXT);
+    }
 }
 
 // Layout

@@ -18,33 +18,38 @@ bool isQuote(char character) {
 class CharacterSet {
 public:
     explicit CharacterSet(std::string characters) : m_characters(std::move(characters)) {
-        for (std::size_t at = 0; at < m_characters.size(); at += tvx::text::characterLength(m_characters, at))
+        for (std::size_t at = 0; at < m_characters.size(); at += tvx::text::characterLength(m_characters, at)) {
             m_isLead[static_cast<unsigned char>(m_characters[at])] = true;
+        }
     }
 
     /// Bytes of the character of the set that stands at `at`, 0 when another one does.
     std::size_t match(std::string_view text, std::size_t at) const {
-        if (at >= text.size() || !m_isLead[static_cast<unsigned char>(text[at])])
+        if (at >= text.size() || !m_isLead[static_cast<unsigned char>(text[at])]) {
             return 0;
+        }
         return static_cast<unsigned char>(text[at]) < 0x80 ? 1 : matchSequence(text, at);
     }
 
     /// Where the first character of the set stands from `at` on; the text's length when there is none.
     std::size_t find(std::string_view text, std::size_t at) const {
-        while (at < text.size() && match(text, at) == 0)
+        while (at < text.size() && match(text, at) == 0) {
             ++at;
+        }
         return at;
     }
 
 private:
     std::size_t matchSequence(std::string_view text, std::size_t at) const {
         const std::string_view character = text.substr(at, tvx::text::characterLength(text, at));
-        if (tvx::text::characterStart(text, at) != at)
+        if (tvx::text::characterStart(text, at) != at) {
             return 0;
+        }
         for (std::size_t own = 0; own < m_characters.size();) {
             const std::size_t length = tvx::text::characterLength(m_characters, own);
-            if (std::string_view(m_characters).substr(own, length) == character)
+            if (std::string_view(m_characters).substr(own, length) == character) {
                 return length;
+            }
             own += length;
         }
         return 0;
@@ -83,8 +88,9 @@ Gui_String& Gui_String::operator=(const Gui_String& text) = default;
 int Gui_String::GetIntValue(int& value, int base) const {
     const char* end = nullptr;
     const int number = tvx::text::toInt32(GetString(), &end, base);
-    if (end != GetString() + GetLength())
+    if (end != GetString() + GetLength()) {
         return 0;
+    }
     value = number;
     return 1;
 }
@@ -92,8 +98,9 @@ int Gui_String::GetIntValue(int& value, int base) const {
 int Gui_String::GetDoubleValue(double& value) const {
     const char* end = nullptr;
     const double number = tvx::text::toDouble(GetString(), &end);
-    if (end != GetString() + GetLength())
+    if (end != GetString() + GetLength()) {
         return 0;
+    }
     value = number;
     return 1;
 }
@@ -110,13 +117,16 @@ CStringArray* Gui_String::GetStringArray(const char* separators, int skipEmpty, 
     const std::string_view text = View();
     std::size_t start = 0;
     for (std::size_t at = stops.find(text, 0); at < text.size(); at = stops.find(text, start)) {
-        if (at > start || !skipEmpty)
+        if (at > start || !skipEmpty) {
             add(*fields, text.substr(start, at - start));
+        }
         start = !ignoreQuotes && isQuote(text[at]) ? addQuoted(*fields, text, at) : at + stops.match(text, at);
-        while (const std::size_t length = skipEmpty ? skipped.match(text, start) : 0)
+        while (const std::size_t length = skipEmpty ? skipped.match(text, start) : 0) {
             start += length;
+        }
     }
-    if (start < text.size())
+    if (start < text.size()) {
         add(*fields, text.substr(start));
+    }
     return fields.release();
 }

@@ -51,13 +51,15 @@ std::int64_t timeOf(std::string text) {
     for (std::string& field : fields) {
         // A day of one digit is padded with a second blank.
         text.erase(0, text.find_first_not_of(' '));
-        if (UT_STR::GetToken(text, field, " ") != ' ')
+        if (UT_STR::GetToken(text, field, " ") != ' ') {
             return unknownTime;
+        }
     }
     const auto& [weekday, month, day, clock, zone] = fields;
     std::tm local{};
-    if (UT_STR::SScanf(clock.c_str(), "%d %*c %d %*c %d", &local.tm_hour, &local.tm_min, &local.tm_sec) != 3)
+    if (UT_STR::SScanf(clock.c_str(), "%d %*c %d %*c %d", &local.tm_hour, &local.tm_min, &local.tm_sec) != 3) {
         return unknownTime;
+    }
     local.tm_mday = UT_STR::AToI(day.c_str());
     local.tm_mon = monthOf(month);
     local.tm_year = std::max(UT_STR::AToI(text.c_str()), 0) - 1900;
@@ -68,17 +70,20 @@ std::int64_t timeOf(std::string text) {
 std::optional<std::pair<std::string, Entry>> parse(std::string_view line) {
     static constexpr std::string_view mark = "::";
     const int end = UT_STR::FindString(line, mark);
-    if (end < 0)
+    if (end < 0) {
         return std::nullopt;
+    }
     const auto length = static_cast<std::size_t>(end);
     std::string rest(line.substr(length + mark.size()));
     std::string key;
-    if (UT_STR::GetToken(rest, key, "=") != '=' || key.empty())
+    if (UT_STR::GetToken(rest, key, "=") != '=' || key.empty()) {
         return std::nullopt;
-    if (key == "summary")
+    }
+    if (key == "summary") {
         rest += '\n';
-    else
+    } else {
         UT_STR::Trim(rest);
+    }
     return std::pair(std::move(key), Entry{std::move(rest), timeOf(std::string(line.substr(0, length)))});
 }
 
@@ -105,8 +110,10 @@ const char* rootIn(const char* variable) {
 /// The file's path below a root. It holds until the next call; null, and an error, when the root is too long.
 const char* pathBelow(const char* root, const char* variable) {
     static char path[pathSize];
-    if (UT_STR::Copy(path, pathSize, root) && UT_STR::Cat(path, pathSize, "/") && UT_STR::Cat(path, pathSize, fileName))
+    if (UT_STR::Copy(path, pathSize, root) && UT_STR::Cat(path, pathSize, "/") &&
+        UT_STR::Cat(path, pathSize, fileName)) {
         return path;
+    }
     origin(__LINE__).issueError("The value of environment variable %s is too long.\n", variable);
     return nullptr;
 }
@@ -115,8 +122,9 @@ OpenedFile openFile(const char* path) {
     OpenedFile file;
     // Asked before the file is opened: one that is replaced in between is then read once more, and not missed.
     std::int64_t changed = unknownTime;
-    if (Port::File::getdatetime(path, changed))
+    if (Port::File::getdatetime(path, changed)) {
         file.changed = changed;
+    }
     file.stream.reset(Port::File::open(path, Port::File::AccessRead, Port::File::FlagText));
     return file;
 }
@@ -126,19 +134,22 @@ OpenedFile findFile() {
     const char* const ownRoot = rootIn("MYTARVEX");
     const char* path = ownRoot ? pathBelow(ownRoot, "MYTARVEX") : nullptr;
     OpenedFile file = path ? openFile(path) : OpenedFile();
-    if (file.stream)
+    if (file.stream) {
         return file;
+    }
     const char* const root = rootIn("TARVEX");
     if (!root) {
         origin(__LINE__).issueError("Unable to obtain the value of environment variable TARVEX.\n");
         return file;
     }
     path = pathBelow(root, "TARVEX");
-    if (!path)
+    if (!path) {
         return file;
+    }
     file = openFile(path);
-    if (!file.stream)
+    if (!file.stream) {
         origin(__LINE__).issueError("Unable to open $TARVEX/%s.\n", fileName);
+    }
     return file;
 }
 
@@ -149,8 +160,9 @@ public:
     /// Reads the file if it was never read or is newer than when it was.
     void update(const OpenedFile& file) {
         const bool isNewer = file.changed && UT_TIME::DiffTime(*file.changed, m_changed) > 0;
-        if (m_isLoaded && !isNewer)
+        if (m_isLoaded && !isNewer) {
             return;
+        }
         load(*file.stream);
         m_isLoaded = true;
         m_changed = file.changed.value_or(unknownTime);
@@ -169,18 +181,21 @@ private:
         for (;;) {
             const int length = stream.readline(line, lineLimit);
             // What stands behind the last line end is a line that has not been written whole.
-            if (stream.geteof())
+            if (stream.geteof()) {
                 return;
-            if (auto parsed = parse({line, static_cast<std::size_t>(length)}))
+            }
+            if (auto parsed = parse({line, static_cast<std::size_t>(length)})) {
                 store(std::move(parsed->first), std::move(parsed->second));
+            }
         }
     }
 
     /// The newest entry of a key wins, the later line among equals.
     void store(std::string key, Entry entry) {
         const auto [place, isNew] = m_entries.try_emplace(std::move(key), entry);
-        if (!isNew && UT_TIME::DiffTime(entry.time, place->second.time) >= 0)
+        if (!isNew && UT_TIME::DiffTime(entry.time, place->second.time) >= 0) {
             place->second = std::move(entry);
+        }
     }
 
     std::unordered_map<std::string, Entry> m_entries;
@@ -196,8 +211,9 @@ const char* Gui_InstallInfo::GetValue(const char* key) {
     const char* value = nullptr;
     tvx::allocating([&] {
         const OpenedFile file = findFile();
-        if (!file.stream)
+        if (!file.stream) {
             return;
+        }
         s_values.update(file);
         value = key ? s_values.find(key) : nullptr;
     });

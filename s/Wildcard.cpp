@@ -27,8 +27,9 @@ struct Piece {
 /// Where the piece ends when it stands at `at`; npos when it does not.
 std::size_t endOf(std::string_view piece, std::string_view text, std::size_t at) {
     for (const char wanted : piece) {
-        if (at == text.size() || (wanted != '?' && text[at] != wanted))
+        if (at == text.size() || (wanted != '?' && text[at] != wanted)) {
             return none;
+        }
         at += wanted == '?' ? characterLength(text, at) : 1;
     }
     return at;
@@ -41,8 +42,9 @@ std::size_t startOf(std::string_view piece, std::string_view text, std::size_t f
     const std::size_t most = longestCharacter * piece.size();
     for (std::size_t at = text.size(); at > first && text.size() - at < most;) {
         at = tvx::text::previousCharacter(text, at);
-        if (endOf(piece, text, at) == text.size())
+        if (endOf(piece, text, at) == text.size()) {
             return at >= first ? at : none;
+        }
     }
     return none;
 }
@@ -62,8 +64,9 @@ End endOfPattern(std::string_view pattern, std::string_view text, std::size_t fi
             const std::size_t star = pattern.rfind('*', left);
             return {star, startOf(pattern.substr(star + 1), text, first)};
         }
-        if (at == first || text[at - 1] != pattern[left])
+        if (at == first || text[at - 1] != pattern[left]) {
             return {};
+        }
     }
     const bool fits = at == text.size() || !isWithinCharacter(text[at]) || tvx::text::characterStart(text, at) == at;
     return {left, fits ? at : none};
@@ -71,8 +74,9 @@ End endOfPattern(std::string_view pattern, std::string_view text, std::size_t fi
 
 /// Where the leftmost place of the piece from `from` on ends; npos when there is none.
 std::size_t findEnd(const Piece& piece, std::string_view text, std::size_t from) {
-    if (piece.text.empty())
+    if (piece.text.empty()) {
         return from;
+    }
     if (!piece.hasAny && !isWithinCharacter(piece.text.front())) {
         const char* start = text.data() + from;
         const std::size_t left = text.size() - from;
@@ -84,8 +88,9 @@ std::size_t findEnd(const Piece& piece, std::string_view text, std::size_t from)
     }
     for (std::size_t at = from; at < text.size(); at += characterLength(text, at)) {
         const std::size_t end = endOf(piece.text, text, at);
-        if (end != none)
+        if (end != none) {
             return end;
+        }
     }
     return none;
 }
@@ -94,8 +99,9 @@ std::size_t findEnd(const Piece& piece, std::string_view text, std::size_t from)
 Piece pieceAt(std::string_view pattern, std::size_t start) {
     Piece piece;
     std::size_t end = start;
-    for (; end < pattern.size() && pattern[end] != '*'; ++end)
+    for (; end < pattern.size() && pattern[end] != '*'; ++end) {
         piece.hasAny = piece.hasAny || pattern[end] == '?';
+    }
     piece.text = pattern.substr(start, end - start);
     return piece;
 }
@@ -110,12 +116,14 @@ struct Place {
 bool matchesBetween(std::string_view text, std::string_view pattern, Place from, Place to) {
     const std::string_view between = text.substr(0, to.text);
     for (int stars = 1; from.pattern < to.pattern; ++stars) {
-        if (stars == mostStars)
+        if (stars == mostStars) {
             return false;
+        }
         const Piece piece = pieceAt(pattern, from.pattern + 1);
         from.text = findEnd(piece, between, from.text);
-        if (from.text == none)
+        if (from.text == none) {
             return false;
+        }
         from.pattern += 1 + piece.text.size();
     }
     return true;
@@ -124,18 +132,21 @@ bool matchesBetween(std::string_view text, std::string_view pattern, Place from,
 /// Matches what follows the first "*". Of its own, so that what comes before it does not pay for it.
 [[gnu::noinline]] bool matchesBehindStar(std::string_view text, std::string_view pattern, Place star) {
     const auto [last, end] = endOfPattern(pattern, text, star.text);
-    if (end == none)
+    if (end == none) {
         return false;
+    }
     return star.pattern == last || matchesBetween(text, pattern, star, {end, last});
 }
 
 bool matches(std::string_view text, std::string_view pattern) {
     std::size_t at = 0;
     for (std::size_t next = 0; next < pattern.size(); ++next) {
-        if (pattern[next] == '*')
+        if (pattern[next] == '*') {
             return matchesBehindStar(text, pattern, {at, next});
-        if (at == text.size() || (pattern[next] != '?' && pattern[next] != text[at]))
+        }
+        if (at == text.size() || (pattern[next] != '?' && pattern[next] != text[at])) {
             return false;
+        }
         at += pattern[next] == '?' ? characterLength(text, at) : 1;
     }
     return at == text.size();
@@ -144,11 +155,13 @@ bool matches(std::string_view text, std::string_view pattern) {
 /// Whether the pattern is one "*" before characters that stand for themselves, the first of which can only stand
 /// between characters.
 bool isOnlyEnd(std::string_view pattern) {
-    if (pattern.size() < 2 || pattern[0] != '*' || isWithinCharacter(pattern[1]))
+    if (pattern.size() < 2 || pattern[0] != '*' || isWithinCharacter(pattern[1])) {
         return false;
+    }
     for (const char wanted : pattern.substr(1)) {
-        if (wanted == '*' || wanted == '?')
+        if (wanted == '*' || wanted == '?') {
             return false;
+        }
     }
     return true;
 }
@@ -156,12 +169,14 @@ bool isOnlyEnd(std::string_view pattern) {
 /// Compares all characters whether they differ or not: which one does cannot be foretold, and a branch that goes the
 /// other way costs more than the rest.
 bool endsWith(std::string_view text, std::string_view end) {
-    if (text.size() < end.size())
+    if (text.size() < end.size()) {
         return false;
+    }
     const char* at = text.data() + (text.size() - end.size());
     unsigned differences = 0;
-    for (const char wanted : end)
+    for (const char wanted : end) {
         differences |= static_cast<unsigned char>(*at++ ^ wanted);
+    }
     return differences == 0;
 }
 

@@ -36,8 +36,9 @@ Gui_WinApp::~Gui_WinApp() = default;
 void Gui_WinApp::SetRegistryKey(const char* key) {
     CWinApp::SetRegistryKey(key);
     CString title;
-    if (!title.LoadString(AFX_IDS_APP_TITLE))
+    if (!title.LoadString(AFX_IDS_APP_TITLE)) {
         title = AfxGetAppName();
+    }
     Gui_Msg displayName(GUI_IDS_FAMILY_TITLE);
     displayName << title;
     replace(m_pszAppName, displayName);
@@ -76,8 +77,9 @@ BOOL Gui_WinApp::InitApplication() {
 void Gui_WinApp::DoWaitCursor(int code) {
     CWinApp::DoWaitCursor(code);
     POINT position;
-    if (code <= 0 && GetCursorPos(&position))
+    if (code <= 0 && GetCursorPos(&position)) {
         SetCursorPos(position.x, position.y);
+    }
 }
 
 void Gui_WinApp::WinHelpA(DWORD_PTR data, UINT command) {

@@ -35,8 +35,9 @@ void issueUsageText() {
 
 void issueUsageSummary(const CString& opcodes) {
     const std::unique_ptr<char, decltype(&std::free)> usage(UT_CMDOPCODES(opcodes).usage(), &std::free);
-    if (usage)
+    if (usage) {
         WinAppOrigin(__LINE__).issueStatus("%s\n", usage.get());
+    }
 }
 
 /// Checks the words and leaves what there is to say in the target's pending text.

@@ -21,22 +21,27 @@ CString Gui_WinApp::GetBaseNameForFileDialog(const CString& fileName) {
 
 CString Gui_WinApp::GetFilterForFileDialog(CDocTemplate* docTemplate, int addAllFiles) {
     CString filter;
-    if (docTemplate)
+    if (docTemplate) {
         AddFileFilter(filter, docTemplate);
-    for (POSITION at = docTemplate ? nullptr : GetFirstDocTemplatePosition(); at;)
+    }
+    for (POSITION at = docTemplate ? nullptr : GetFirstDocTemplatePosition(); at;) {
         AddFileFilter(filter, GetNextDocTemplate(at));
-    if (addAllFiles)
+    }
+    if (addAllFiles) {
         AddFileFilter(filter, AFX_IDS_ALLFILTER, "*.*");
+    }
     return filter;
 }
 
 CString Gui_WinApp::GetDefaultExtForFileDialog(CDocTemplate* docTemplate) {
     POSITION first = docTemplate ? nullptr : GetFirstDocTemplatePosition();
-    if (first)
+    if (first) {
         docTemplate = GetNextDocTemplate(first);
+    }
     CString extension;
-    if (docTemplate)
+    if (docTemplate) {
         docTemplate->GetDocString(extension, CDocTemplate::filterExt);
+    }
     return extension.Mid(1);
 }
 
@@ -58,8 +63,9 @@ CString Gui_WinApp::GetPathNameFromFileDialog(CFileDialog& dialog) {
 
 void Gui_WinApp::AddFileFilter(CString& filter, const CString& description, const CString& pattern) {
     // The new entry follows the zero that ends the one before.
-    if (filter.GetLength() >= 2 && filter.View().ends_with(std::string_view("\0\0", 2)))
+    if (filter.GetLength() >= 2 && filter.View().ends_with(std::string_view("\0\0", 2))) {
         filter.Truncate(filter.GetLength() - 1);
+    }
     filter += description;
     filter += '\0';
     filter += pattern;
@@ -76,6 +82,7 @@ void Gui_WinApp::AddFileFilter(CString& filter, CDocTemplate* docTemplate) {
     CString name;
     CString extension;
     if (docTemplate->GetDocString(name, CDocTemplate::filterName) && !name.IsEmpty() &&
-        docTemplate->GetDocString(extension, CDocTemplate::filterExt) && !extension.IsEmpty())
+        docTemplate->GetDocString(extension, CDocTemplate::filterExt) && !extension.IsEmpty()) {
         AddFileFilter(filter, name, '*' + extension);
+    }
 }

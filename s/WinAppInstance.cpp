@@ -21,7 +21,7 @@ constexpr const char* markValue = "ProcessMark";
 
 bool isProtocolOff() {
     const char* checking = Port_Env::GetEnv("TVX_GUI_INSTANCECHECKING");
-    return checking != nullptr && *checking == '0';
+    return checking && *checking == '0';
 }
 
 /// A number of the running application's record; 0 when there is none.
@@ -40,8 +40,9 @@ std::string recordedMark() {
     DWORD size = text.size() - 1; // others may have stored a text without its zero
     const InstanceKey key(AfxGetAppName());
     if (RegQueryValueExA(key, markValue, nullptr, nullptr, reinterpret_cast<BYTE*>(text.data()), &size) !=
-        ERROR_SUCCESS)
+        ERROR_SUCCESS) {
         return {};
+    }
     return text.data();
 }
 
@@ -59,15 +60,17 @@ bool isFirstInstanceAlive(unsigned long processId) {
 } // namespace
 
 int Gui_WinApp::IsFirstInstance() {
-    if (isProtocolOff())
+    if (isProtocolOff()) {
         return 1;
+    }
     const unsigned long first = recorded(processValue);
     return first == 0 || !isFirstInstanceAlive(first);
 }
 
 int Gui_WinApp::RegisterInstance() {
-    if (isProtocolOff())
+    if (isProtocolOff()) {
         return 1;
+    }
     const DWORD process = GetCurrentProcessId();
     recordMark(tvx::processMark(process));
     record(processValue, process);
@@ -77,21 +80,24 @@ int Gui_WinApp::RegisterInstance() {
 }
 
 void Gui_WinApp::RegisterInstanceWindow(unsigned long windowId) {
-    if (m_data->registered)
+    if (m_data->registered) {
         record(windowValue, windowId);
+    }
 }
 
 int Gui_WinApp::ShowFirstInstanceWindow() {
     const unsigned long first = recorded(processValue);
-    if (first == 0 || !isFirstInstanceAlive(first))
+    if (first == 0 || !isFirstInstanceAlive(first)) {
         return 0;
+    }
     const unsigned long window = recorded(windowValue);
     return window != 0 ? Gui_Desktop::ShowWindow(window) : 0;
 }
 
 void Gui_WinApp::UnregisterInstance() {
-    if (isProtocolOff() || recorded(processValue) != GetCurrentProcessId())
+    if (isProtocolOff() || recorded(processValue) != GetCurrentProcessId()) {
         return;
+    }
     record(processValue, 0);
     record(windowValue, 0);
 }

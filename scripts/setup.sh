@@ -36,7 +36,7 @@ test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
 check    git              lists the files to check
 check    python3          the include, documentation and wording checks
-check    clang-format-14  the format check; other versions format differently
+check    clang-format-19  the format check; other versions format differently
 check    clang-tidy-19    the lint check; older ones cannot parse the standard library's ranges
 fuzz     clang-19         compiles the fuzz targets; older ones cannot parse the standard library's ranges
 fuzz     libclang-rt-19-dev  the fuzzing and sanitizer run-time of that compiler

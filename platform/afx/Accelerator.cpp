@@ -90,7 +90,7 @@ HACCEL LoadAcceleratorsA(HINSTANCE module, LPCSTR name) {
 }
 
 HACCEL CreateAcceleratorTableA(const ACCEL* entries, int count) {
-    return entries != nullptr && count > 0 ? addTable(Table(entries, entries + count)) : nullptr;
+    return entries && count > 0 ? addTable(Table(entries, entries + count)) : nullptr;
 }
 
 int CopyAcceleratorTableA(HACCEL handle, ACCEL* entries, int count) {
@@ -99,7 +99,7 @@ int CopyAcceleratorTableA(HACCEL handle, ACCEL* entries, int count) {
         return 0;
     }
     const auto all = static_cast<int>(table->size());
-    if (entries == nullptr) {
+    if (!entries) {
         return all;
     }
     const int copied = std::clamp(count, 0, all);
@@ -108,7 +108,7 @@ int CopyAcceleratorTableA(HACCEL handle, ACCEL* entries, int count) {
 }
 
 BOOL DestroyAcceleratorTable(HACCEL table) {
-    return accelerators().take(reinterpret_cast<std::uintptr_t>(table)) != nullptr ? TRUE : FALSE;
+    return accelerators().take(reinterpret_cast<std::uintptr_t>(table)) ? TRUE : FALSE;
 }
 
 int TranslateAcceleratorA(HWND window, HACCEL handle, MSG* message) {
@@ -116,7 +116,7 @@ int TranslateAcceleratorA(HWND window, HACCEL handle, MSG* message) {
         return 0;
     }
     const auto table = tableOf(handle);
-    if (!table || Window::from(window) == nullptr) {
+    if (!table || !Window::from(window)) {
         return 0;
     }
     const auto found =

@@ -44,7 +44,7 @@ AFX_MODULE_STATE& moduleState() {
 void replaceText(LPCSTR& place, const char* text) {
     if (place != text) {
         std::free(const_cast<char*>(place));
-        place = text != nullptr ? strdup(text) : nullptr;
+        place = text ? strdup(text) : nullptr;
     }
 }
 
@@ -56,7 +56,7 @@ CWinApp* AfxGetApp() {
 
 CWnd* AfxGetMainWnd() {
     CWinThread* thread = AfxGetThread();
-    return thread != nullptr ? thread->GetMainWnd() : nullptr;
+    return thread ? thread->GetMainWnd() : nullptr;
 }
 
 AFX_MODULE_STATE* AfxGetModuleState() {
@@ -100,7 +100,7 @@ BOOL CWinApp::InitInstance() {
 }
 
 int CWinApp::Run() {
-    if (m_pMainWnd == nullptr && hasDisplay()) {
+    if (!m_pMainWnd && hasDisplay()) {
         AfxPostQuitMessage(0); // nothing is there that could end the application
     }
     return CWinThread::Run();
@@ -117,7 +117,7 @@ void updateFrames() {
     const auto windows = Window::topLevels();
     for (const Window* window : windows) {
         CWnd* object = window->object();
-        if (object != nullptr && object->IsFrameWnd() && object->IsWindowVisible()) {
+        if (object && object->IsFrameWnd() && object->IsWindowVisible()) {
             object->SendMessage(WM_IDLEUPDATECMDUI, TRUE, 0);
             object->SendMessageToDescendants(WM_IDLEUPDATECMDUI, TRUE, 0, TRUE, TRUE);
         }
@@ -140,7 +140,7 @@ BOOL CWinApp::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info)
 
 void CWinApp::OnAppExit() {
     // The same road as the close button of the main window, so that documents are asked about.
-    if (m_pMainWnd != nullptr) {
+    if (m_pMainWnd) {
         m_pMainWnd->SendMessage(WM_CLOSE);
     } else {
         AfxPostQuitMessage(0);
@@ -148,13 +148,13 @@ void CWinApp::OnAppExit() {
 }
 
 void CWinApp::HideApplication() {
-    if (m_pMainWnd != nullptr) {
+    if (m_pMainWnd) {
         m_pMainWnd->ShowWindow(SW_HIDE);
     }
 }
 
 void CWinApp::DoWaitCursor(int code) {
-    if (QCoreApplication::instance() == nullptr) {
+    if (!QCoreApplication::instance()) {
         return;
     }
     const int before = m_waitDepth;
@@ -196,12 +196,11 @@ void CWinApp::OnContextHelp() {
 
 int CWinApp::DoMessageBox(LPCSTR text, UINT type, UINT) {
     const CWnd* over = CWnd::GetActiveWindow();
-    if (over == nullptr) {
+    if (!over) {
         over = GetMainWnd();
     }
     CWaitCursorPause pause(*this);
-    return ::MessageBoxA(over != nullptr ? over->m_hWnd : nullptr, text,
-                         m_pszAppName != nullptr ? m_pszAppName : AfxGetAppName(), type);
+    return ::MessageBoxA(over ? over->m_hWnd : nullptr, text, m_pszAppName ? m_pszAppName : AfxGetAppName(), type);
 }
 
 HCURSOR CWinApp::LoadCursor(LPCSTR name) const {
@@ -271,8 +270,7 @@ void CWinApp::ParseCommandLine(CCommandLineInfo& info) {
     for (std::size_t i = 0; i < words.size(); ++i) {
         const char* word = words[i].c_str();
         const char* name = AfxSwitchOf(word);
-        info.ParseParam(name != nullptr ? name : word, name != nullptr ? TRUE : FALSE,
-                        i + 1 == words.size() ? TRUE : FALSE);
+        info.ParseParam(name ? name : word, name ? TRUE : FALSE, i + 1 == words.size() ? TRUE : FALSE);
     }
 }
 
@@ -296,13 +294,13 @@ void nameModule(CWinApp& app) {
     const std::filesystem::path program = tvx::moduleFileName(nullptr);
     replaceText(app.m_pszExeName, program.stem().c_str());
     CString title;
-    if (app.m_pszAppName == nullptr) {
+    if (!app.m_pszAppName) {
         replaceText(app.m_pszAppName, title.LoadString(AFX_IDS_APP_TITLE) ? title.GetString() : app.m_pszExeName);
     }
-    if (AfxGetAppName() == nullptr) {
+    if (!AfxGetAppName()) {
         replaceText(moduleState().m_lpszCurrentAppName, app.m_pszExeName);
     }
-    if (app.m_pszHelpFilePath == nullptr) {
+    if (!app.m_pszHelpFilePath) {
         const auto help = program.parent_path() / (std::string(app.m_pszExeName) + ".hlp");
         replaceText(app.m_pszHelpFilePath, tvx::driveName(help.string()).c_str());
     }
@@ -313,7 +311,7 @@ int runApplication(CWinApp& app) {
         return 1;
     }
     if (!app.InitInstance()) {
-        if (app.m_pMainWnd != nullptr) {
+        if (app.m_pMainWnd) {
             app.m_pMainWnd->DestroyWindow();
         }
         const int exitCode = app.ExitInstance();
@@ -339,7 +337,7 @@ void rememberStart(CWinApp& app) {
 
 int AfxWinMain(int argc, char** argv) {
     CWinApp* app = AfxGetApp();
-    if (app == nullptr) {
+    if (!app) {
         std::fputs("This program has no application object.\n", stderr);
         return 1;
     }

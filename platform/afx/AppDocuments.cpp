@@ -5,7 +5,7 @@
 // The application object's dealings with documents: its document manager does the work.
 
 void CWinApp::AddDocTemplate(CDocTemplate* docTemplate) {
-    if (m_pDocManager == nullptr) {
+    if (!m_pDocManager) {
         m_pDocManager = new CDocManager;
     }
     m_pDocManager->AddDocTemplate(docTemplate);
@@ -17,45 +17,44 @@ void CWinApp::DeleteDocManager() {
 }
 
 POSITION CWinApp::GetFirstDocTemplatePosition() const {
-    return m_pDocManager != nullptr ? m_pDocManager->GetFirstDocTemplatePosition() : nullptr;
+    return m_pDocManager ? m_pDocManager->GetFirstDocTemplatePosition() : nullptr;
 }
 
 CDocTemplate* CWinApp::GetNextDocTemplate(POSITION& position) const {
-    return m_pDocManager != nullptr ? m_pDocManager->GetNextDocTemplate(position) : nullptr;
+    return m_pDocManager ? m_pDocManager->GetNextDocTemplate(position) : nullptr;
 }
 
 CDocument* CWinApp::OpenDocumentFile(LPCSTR fileName) {
-    return m_pDocManager != nullptr ? m_pDocManager->OpenDocumentFile(fileName) : nullptr;
+    return m_pDocManager ? m_pDocManager->OpenDocumentFile(fileName) : nullptr;
 }
 
 BOOL CWinApp::SaveAllModified() {
-    return m_pDocManager == nullptr || m_pDocManager->SaveAllModified() ? TRUE : FALSE;
+    return !m_pDocManager || m_pDocManager->SaveAllModified() ? TRUE : FALSE;
 }
 
 void CWinApp::CloseAllDocuments(BOOL endSession) {
-    if (m_pDocManager != nullptr) {
+    if (m_pDocManager) {
         m_pDocManager->CloseAllDocuments(endSession);
     }
 }
 
 int CWinApp::GetOpenDocumentCount() {
-    return m_pDocManager != nullptr ? m_pDocManager->GetOpenDocumentCount() : 0;
+    return m_pDocManager ? m_pDocManager->GetOpenDocumentCount() : 0;
 }
 
 BOOL CWinApp::DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog,
                                CDocTemplate* docTemplate) {
-    return m_pDocManager != nullptr ? m_pDocManager->DoPromptFileName(fileName, titleId, flags, openDialog, docTemplate)
-                                    : FALSE;
+    return m_pDocManager ? m_pDocManager->DoPromptFileName(fileName, titleId, flags, openDialog, docTemplate) : FALSE;
 }
 
 void CWinApp::OnFileNew() {
-    if (m_pDocManager != nullptr) {
+    if (m_pDocManager) {
         m_pDocManager->OnFileNew();
     }
 }
 
 void CWinApp::OnFileOpen() {
-    if (m_pDocManager != nullptr) {
+    if (m_pDocManager) {
         m_pDocManager->OnFileOpen();
     }
 }
@@ -68,10 +67,10 @@ BOOL CWinApp::ProcessShellCommand(CCommandLineInfo& info) {
         if (!handled) {
             OnFileNew();
         }
-        return m_pMainWnd != nullptr ? TRUE : FALSE;
+        return m_pMainWnd ? TRUE : FALSE;
     }
     case CCommandLineInfo::FileOpen:
-        return OpenDocumentFile(info.m_strFileName) != nullptr ? TRUE : FALSE;
+        return OpenDocumentFile(info.m_strFileName) ? TRUE : FALSE;
     case CCommandLineInfo::FileNothing:
     case CCommandLineInfo::FileDDE:
         return TRUE;

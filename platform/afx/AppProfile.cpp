@@ -24,7 +24,7 @@ public:
         }
     }
     ~Key() {
-        if (m_key != nullptr) {
+        if (m_key) {
             RegCloseKey(m_key);
         }
     }
@@ -44,7 +44,7 @@ private:
 };
 
 CString sectionPath(const CString& profile, LPCSTR section) {
-    return section != nullptr ? profile + "\\" + section : profile;
+    return section ? profile + "\\" + section : profile;
 }
 
 /// The bytes of an entry of the type asked for.
@@ -68,8 +68,8 @@ std::optional<std::string> readEntry(const CString& path, LPCSTR entry, DWORD wa
 
 CString CWinApp::profilePath() const {
     CString path = "Software";
-    for (const char* part : {m_pszRegistryKey, m_pszProfileName != nullptr ? m_pszProfileName : AfxGetAppName()}) {
-        if (part != nullptr) {
+    for (const char* part : {m_pszRegistryKey, m_pszProfileName ? m_pszProfileName : AfxGetAppName()}) {
+        if (part) {
             path += "\\";
             path += part;
         }
@@ -121,10 +121,10 @@ BOOL CWinApp::WriteProfileInt(LPCSTR section, LPCSTR entry, int value) {
 }
 
 BOOL CWinApp::WriteProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR value) {
-    if (entry == nullptr) {
+    if (!entry) {
         return RegDeleteKeyA(HKEY_CURRENT_USER, sectionPath(profilePath(), section)) == ERROR_SUCCESS;
     }
-    if (value == nullptr) {
+    if (!value) {
         const Key key(sectionPath(profilePath(), section), Key::Way::change);
         return key.result() == ERROR_SUCCESS && RegDeleteValueA(key, entry) == ERROR_SUCCESS;
     }

@@ -130,7 +130,7 @@ HANDLE SetClipboardData(UINT format, HANDLE block) {
         return nullptr;
     }
     HANDLE& place = state.own[format];
-    if (place != nullptr && place != block) {
+    if (place && place != block) {
         GlobalFree(place);
     }
     place = block;
@@ -169,7 +169,7 @@ BOOL IsClipboardFormatAvailable(UINT format) {
         return state.own.contains(format) ? TRUE : FALSE;
     }
     const QMimeData* data = QApplication::clipboard()->mimeData();
-    if (data == nullptr) {
+    if (!data) {
         return FALSE;
     }
     const QString type = mimeTypeOf(format);
@@ -200,7 +200,7 @@ HGLOBAL GlobalAlloc(UINT, std::size_t bytes) {
 HGLOBAL GlobalReAlloc(HGLOBAL handle, std::size_t bytes, UINT flags) {
     const auto found = blocks().find(handle);
     const HGLOBAL fresh = found != blocks().end() ? GlobalAlloc(flags, bytes) : nullptr;
-    if (fresh == nullptr) {
+    if (!fresh) {
         return nullptr;
     }
     std::memcpy(fresh, handle, std::min(bytes, found->second.size()));

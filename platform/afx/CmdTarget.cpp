@@ -22,7 +22,7 @@ const AFX_MSGMAP* CCmdTarget::GetMessageMap() const {
 namespace {
 
 bool matches(const AFX_MSGMAP_ENTRY& entry, UINT message, UINT code, UINT id) {
-    if (entry.registered != nullptr) {
+    if (entry.registered) {
         return *entry.registered == message;
     }
     return entry.nMessage == message && static_cast<UINT>(entry.nCode) == code && id >= entry.nID &&
@@ -30,13 +30,13 @@ bool matches(const AFX_MSGMAP_ENTRY& entry, UINT message, UINT code, UINT id) {
 }
 
 const AFX_MSGMAP_ENTRY* search(const AFX_MSGMAP* map, UINT message, UINT code, UINT id) {
-    while (map != nullptr) {
-        for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->pfn != nullptr; ++entry) {
+    while (map) {
+        for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->pfn; ++entry) {
             if (matches(*entry, message, code, id)) {
                 return entry;
             }
         }
-        map = map->pfnGetBaseMap != nullptr ? map->pfnGetBaseMap() : nullptr;
+        map = map->pfnGetBaseMap ? map->pfnGetBaseMap() : nullptr;
     }
     return nullptr;
 }
@@ -72,13 +72,12 @@ BOOL CCmdTarget::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* in
         plainCode = LOWORD(static_cast<std::uintptr_t>(static_cast<DWORD>(code)));
         message = message == 0 ? WM_COMMAND : message;
     }
-    for (const AFX_MSGMAP* map = GetMessageMap(); map != nullptr;
-         map = map->pfnGetBaseMap != nullptr ? map->pfnGetBaseMap() : nullptr) {
-        for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->pfn != nullptr; ++entry) {
+    for (const AFX_MSGMAP* map = GetMessageMap(); map; map = map->pfnGetBaseMap ? map->pfnGetBaseMap() : nullptr) {
+        for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->pfn; ++entry) {
             if (!matches(*entry, message, plainCode, id)) {
                 continue;
             }
-            if (info != nullptr) {
+            if (info) {
                 info->pTarget = this;
                 info->pmf = entry->pfn;
                 return TRUE;

@@ -11,7 +11,7 @@ namespace {
 
 /// The item of the menu that is being updated.
 MenuItem* itemOf(const CCmdUI& element) {
-    const HMENU menu = element.m_pMenu != nullptr ? element.m_pMenu->m_hMenu : nullptr;
+    const HMENU menu = element.m_pMenu ? element.m_pMenu->m_hMenu : nullptr;
     const MenuPlace place = findItem(menu, element.m_nIndex, MF_BYPOSITION);
     return place ? &place.item() : nullptr;
 }
@@ -20,21 +20,21 @@ MenuItem* itemOf(const CCmdUI& element) {
 
 void CCmdUI::Enable(BOOL on) {
     m_bEnableChanged = TRUE;
-    if (m_pMenu != nullptr) {
+    if (m_pMenu) {
         // A popup stays open to those who want to see what is in it.
-        if (m_pSubMenu == nullptr) {
+        if (!m_pSubMenu) {
             m_pMenu->EnableMenuItem(m_nIndex, MF_BYPOSITION | (on ? MF_ENABLED : MF_DISABLED | MF_GRAYED));
         }
         return;
     }
-    if (m_pOther == nullptr) {
+    if (!m_pOther) {
         return;
     }
     if (!on && CWnd::GetFocus() == m_pOther) {
         // A disabled control must not keep the keyboard.
         CWnd* parent = m_pOther->GetParent();
-        CWnd* next = parent != nullptr ? parent->GetNextDlgTabItem(m_pOther) : nullptr;
-        if (next != nullptr) {
+        CWnd* next = parent ? parent->GetNextDlgTabItem(m_pOther) : nullptr;
+        if (next) {
             next->SetFocus();
         }
     }
@@ -42,11 +42,11 @@ void CCmdUI::Enable(BOOL on) {
 }
 
 void CCmdUI::SetCheck(int check) {
-    if (m_pMenu != nullptr) {
-        if (m_pSubMenu == nullptr) {
+    if (m_pMenu) {
+        if (!m_pSubMenu) {
             m_pMenu->CheckMenuItem(m_nIndex, MF_BYPOSITION | (check != 0 ? MF_CHECKED : MF_UNCHECKED));
         }
-    } else if (m_pOther != nullptr && (m_pOther->SendMessage(WM_GETDLGCODE) & DLGC_BUTTON) != 0) {
+    } else if (m_pOther && (m_pOther->SendMessage(WM_GETDLGCODE) & DLGC_BUTTON) != 0) {
         m_pOther->SendMessage(BM_SETCHECK, static_cast<WPARAM>(check));
     }
 }
@@ -54,7 +54,7 @@ void CCmdUI::SetCheck(int check) {
 void CCmdUI::SetRadio(BOOL on) {
     SetCheck(on ? 1 : 0);
     MenuItem* item = itemOf(*this);
-    if (item != nullptr && m_pSubMenu == nullptr) {
+    if (item && !m_pSubMenu) {
         item->mark = MenuItem::Mark::radio;
         tellMenuChanged(m_pMenu->m_hMenu);
     }
@@ -62,11 +62,11 @@ void CCmdUI::SetRadio(BOOL on) {
 
 void CCmdUI::SetText(LPCSTR text) {
     if (MenuItem* item = itemOf(*this)) {
-        if (m_pSubMenu == nullptr) {
+        if (!m_pSubMenu) {
             item->text = text;
             tellMenuChanged(m_pMenu->m_hMenu);
         }
-    } else if (m_pOther != nullptr) {
+    } else if (m_pOther) {
         CString before;
         m_pOther->GetWindowText(before);
         if (before != text) {

@@ -22,13 +22,13 @@ namespace {
 
 QToolBar* toolsOf(const CControlBar& bar) {
     const Window* state = bar.GetState();
-    return state != nullptr ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
+    return state ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
 }
 
 } // namespace
 
 CControlBar::~CControlBar() {
-    if (CFrameWnd* frame = m_hWnd != nullptr ? GetDockingFrame() : nullptr) {
+    if (CFrameWnd* frame = m_hWnd ? GetDockingFrame() : nullptr) {
         frame->removeBar(this);
     }
 }
@@ -74,14 +74,14 @@ void CControlBar::EnableDocking(DWORD sides) {
 
 BOOL CControlBar::IsFloating() const {
     const QToolBar* tools = toolsOf(*this);
-    return tools != nullptr && tools->isFloating() ? TRUE : FALSE;
+    return tools && tools->isFloating() ? TRUE : FALSE;
 }
 
 BOOL CControlBar::IsVisible() const {
     if (m_delayed != Delayed::None) {
         return m_delayed == Delayed::Show ? TRUE : FALSE;
     }
-    return m_hWnd != nullptr && (GetStyle() & WS_VISIBLE) != 0 ? TRUE : FALSE;
+    return m_hWnd && (GetStyle() & WS_VISIBLE) != 0 ? TRUE : FALSE;
 }
 
 CFrameWnd* CControlBar::GetDockingFrame() const {
@@ -90,8 +90,8 @@ CFrameWnd* CControlBar::GetDockingFrame() const {
 
 UINT CControlBar::GetDockSide() const {
     QToolBar* tools = toolsOf(*this);
-    const auto* main = tools != nullptr ? qobject_cast<QMainWindow*>(tools->parentWidget()) : nullptr;
-    if (main == nullptr || tools->isFloating()) {
+    const auto* main = tools ? qobject_cast<QMainWindow*>(tools->parentWidget()) : nullptr;
+    if (!main || tools->isFloating()) {
         return 0;
     }
     return dockBarOf(main->toolBarArea(tools));
@@ -99,7 +99,7 @@ UINT CControlBar::GetDockSide() const {
 
 CSize CControlBar::CalcFixedLayout(BOOL, BOOL) {
     const Window* state = GetState();
-    const QSize size = state != nullptr ? state->widget()->sizeHint() : QSize();
+    const QSize size = state ? state->widget()->sizeHint() : QSize();
     return {size.width(), size.height()};
 }
 
@@ -113,8 +113,7 @@ BOOL CControlBar::PreTranslateMessage(MSG* message) {
     }
     // Keys in a bar's controls: the frame's accelerators come first, then those of a dialog.
     const CWnd* owner = GetOwner();
-    for (CWnd* frame = owner != nullptr ? owner->GetTopLevelFrame() : nullptr; frame != nullptr;
-         frame = frame->GetParentFrame()) {
+    for (CWnd* frame = owner ? owner->GetTopLevelFrame() : nullptr; frame; frame = frame->GetParentFrame()) {
         if (frame->PreTranslateMessage(message)) {
             return TRUE;
         }
@@ -123,12 +122,12 @@ BOOL CControlBar::PreTranslateMessage(MSG* message) {
 }
 
 LRESULT CControlBar::OnIdleUpdateCmdUI(WPARAM disable, LPARAM) {
-    if (m_hWnd == nullptr || !IsWindowVisible()) {
+    if (!m_hWnd || !IsWindowVisible()) {
         return 0;
     }
     CWnd* owner = GetOwner();
-    CFrameWnd* target = owner != nullptr && owner->IsFrameWnd() ? static_cast<CFrameWnd*>(owner) : GetParentFrame();
-    if (target != nullptr) {
+    CFrameWnd* target = owner && owner->IsFrameWnd() ? static_cast<CFrameWnd*>(owner) : GetParentFrame();
+    if (target) {
         OnUpdateCmdUI(target, disable != 0 ? TRUE : FALSE);
     }
     return 0;

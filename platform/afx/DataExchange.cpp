@@ -22,7 +22,7 @@ CDataExchange::CDataExchange(CWnd* dialog, BOOL saveAndValidate)
 
 HWND CDataExchange::PrepareCtrl(int id) {
     const HWND control = ::GetDlgItem(m_pDlgWnd->m_hWnd, id);
-    if (control == nullptr) {
+    if (!control) {
         std::fprintf(stderr, "Data exchange: the dialog has no control %d.\n", id);
         AfxThrowNotSupportedException();
     }
@@ -39,7 +39,7 @@ HWND CDataExchange::PrepareEditCtrl(int id) {
 
 void CDataExchange::Fail() {
     const HWND control = m_idLastControl != 0 ? ::GetDlgItem(m_pDlgWnd->m_hWnd, m_idLastControl) : nullptr;
-    if (m_bSaveAndValidate && control != nullptr) {
+    if (m_bSaveAndValidate && control) {
         ::SetFocus(control);
         if (m_bEditLastControl) {
             ::SendMessageA(control, EM_SETSEL, 0, -1);
@@ -133,7 +133,7 @@ constexpr long long uintMax = std::numeric_limits<std::uint32_t>::max();
 } // namespace
 
 void DDX_Control(CDataExchange* dx, int id, CWnd& control) {
-    if (control.m_hWnd != nullptr) {
+    if (control.m_hWnd) {
         return;
     }
     const HWND window = dx->PrepareCtrl(id);
@@ -216,7 +216,7 @@ void DDX_Radio(CDataExchange* dx, int id, int& value) {
     int index = 0;
     bool first = true;
     const auto style = [&] { return static_cast<DWORD>(::GetWindowLongPtrA(control, GWL_STYLE)); };
-    while (control != nullptr && (first || (style() & WS_GROUP) == 0)) {
+    while (control && (first || (style() & WS_GROUP) == 0)) {
         first = false;
         if ((::SendMessageA(control, WM_GETDLGCODE, 0, 0) & DLGC_RADIOBUTTON) != 0) {
             if (!dx->m_bSaveAndValidate) {

@@ -29,10 +29,12 @@ CDC::~CDC() {
 }
 
 CDC* CDC::FromHandle(HDC dc) {
-    if (!findContext(dc))
+    if (!findContext(dc)) {
         return nullptr;
-    if (CDC* known = contextMap().find(dc))
+    }
+    if (CDC* known = contextMap().find(dc)) {
         return known;
+    }
     auto wrapper = std::make_unique<CDC>();
     wrapper->m_hDC = wrapper->m_hAttribDC = dc;
     return contextMap().addTemporary(dc, std::move(wrapper));
@@ -43,23 +45,26 @@ void CDC::DeleteTempMap() {
 }
 
 BOOL CDC::Attach(HDC dc) {
-    if (m_hDC || !findContext(dc))
+    if (m_hDC || !findContext(dc)) {
         return FALSE;
+    }
     m_hDC = m_hAttribDC = dc;
     contextMap().addPermanent(dc, *this);
     return TRUE;
 }
 
 HDC CDC::Detach() {
-    if (m_hDC)
+    if (m_hDC) {
         contextMap().removePermanent(m_hDC, *this);
+    }
     m_hAttribDC = nullptr;
     return std::exchange(m_hDC, nullptr);
 }
 
 HDC CreateCompatibleDC(HDC dc) {
-    if (dc && !findContext(dc))
+    if (dc && !findContext(dc)) {
         return nullptr;
+    }
     // One pixel is what a memory context has until a bitmap is selected; the bitmap is the context's own.
     static const HGDIOBJ onePixel = [] {
         QImage pixel(1, 1, QImage::Format_RGB32);
@@ -85,20 +90,23 @@ BOOL CDC::DeleteDC() {
 
 int CDC::SaveDC() {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return 0;
+    }
     dc->saved.push_back(dc->state);
     return static_cast<int>(dc->saved.size());
 }
 
 BOOL CDC::RestoreDC(int saved) {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return FALSE;
+    }
     const int count = static_cast<int>(dc->saved.size());
     const int index = saved < 0 ? count + saved : saved - 1;
-    if (index < 0 || index >= count)
+    if (index < 0 || index >= count) {
         return FALSE;
+    }
     dc->state = std::move(dc->saved[static_cast<std::size_t>(index)]);
     dc->saved.resize(static_cast<std::size_t>(index));
     return TRUE;
@@ -111,8 +119,9 @@ namespace {
 template <class T>
 HGDIOBJ selectTool(Tool<T>& place, HGDIOBJ handle) {
     auto tool = findTool<T>(handle);
-    if (!tool)
+    if (!tool) {
         return nullptr;
+    }
     std::swap(place, tool);
     return tool.handle;
 }
@@ -120,18 +129,21 @@ HGDIOBJ selectTool(Tool<T>& place, HGDIOBJ handle) {
 HGDIOBJ selectBitmap(DeviceContext& context, HDC dc, HGDIOBJ handle) {
     const auto next = findTool<BitmapObject>(handle);
     MemoryTarget* memory = context.memory();
-    if (!memory || !next || (next->selectedInto && next->selectedInto != dc))
+    if (!memory || !next || (next->selectedInto && next->selectedInto != dc)) {
         return nullptr;
+    }
     memory->bitmap->selectedInto = nullptr;
-    if (next.object->owner == GdiOwner::host)
+    if (next.object->owner == GdiOwner::host) {
         next->selectedInto = dc;
+    }
     return memory->select(next).handle;
 }
 
 HGDIOBJ selectInto(HDC handle, HGDIOBJ object) {
     const auto dc = findContext(handle);
-    if (!dc)
+    if (!dc) {
         return nullptr;
+    }
     switch (::GetObjectType(object)) {
     case OBJ_PEN:
         return selectTool(dc->state.pen, object);
@@ -149,8 +161,9 @@ HGDIOBJ selectInto(HDC handle, HGDIOBJ object) {
 /// The object for a tool that was selected before. It may have been deleted while it was selected: the stock object
 /// that restores the same state is answered then.
 CGdiObject* previousObject(HGDIOBJ handle, int substitute) {
-    if (!handle)
+    if (!handle) {
         return nullptr;
+    }
     CGdiObject* object = CGdiObject::FromHandle(handle);
     return object ? object : CGdiObject::FromHandle(GetStockObject(substitute));
 }
@@ -224,8 +237,9 @@ constexpr int kRasterCapabilities = 0x2E99; // blits, stretched blits, bitmaps f
 
 int GetDeviceCaps(HDC handle, int index) {
     const auto dc = findContext(handle);
-    if (!dc)
+    if (!dc) {
         return 0;
+    }
     switch (index) {
     case TECHNOLOGY:
         return DT_RASDISPLAY;

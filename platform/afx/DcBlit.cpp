@@ -43,8 +43,9 @@ struct SourcePixels {
 
 SourcePixels readSource(DeviceContext& source, const QRect& wanted) {
     Drawing drawing(source);
-    if (!drawing)
+    if (!drawing) {
         return {};
+    }
     const Canvas& canvas = drawing.canvas;
     const QRect exists = wanted & canvas.image->rect().translated(-canvas.origin);
     return {exists.isEmpty() ? QImage() : canvas.image->copy(exists.translated(canvas.origin)),
@@ -56,8 +57,9 @@ SourcePixels readSource(DeviceContext& source, const QRect& wanted) {
 void convertPixels(QImage& image, const DeviceContext& source, const DeviceContext& target) {
     const PixelFormat from = source.target->format();
     const PixelFormat to = target.target->format();
-    if (from == to)
+    if (from == to) {
         return;
+    }
     const bool expands = from == PixelFormat::monochrome;
     const Pixel selected = expands ? kWhitePixel : pixelOf(source.state.backColor);
     const Pixel yes = expands ? pixelOf(target.state.backColor) : kWhitePixel;
@@ -71,8 +73,9 @@ void convertPixels(QImage& image, const DeviceContext& source, const DeviceConte
 void drawSource(DeviceContext& target, const BlitArea& to, DeviceContext& source, const BlitArea& from, Rop3 rop) {
     SourcePixels pixels = readSource(source, from.rect);
     Drawing drawing(target);
-    if (!drawing || pixels.image.isNull())
+    if (!drawing || pixels.image.isNull()) {
         return;
+    }
     QPoint at = to.rect.topLeft() + pixels.offset;
     const bool mirroredX = to.mirroredX != from.mirroredX;
     const bool mirroredY = to.mirroredY != from.mirroredY;
@@ -94,16 +97,19 @@ void drawSource(DeviceContext& target, const BlitArea& to, DeviceContext& source
 BOOL CDC::StretchBlt(int x, int y, int width, int height, CDC* source, int sourceX, int sourceY, int sourceWidth,
                      int sourceHeight, DWORD rop) {
     const Rop3 ternary = rop3FromCode(rop);
-    if (!usesSource(ternary))
+    if (!usesSource(ternary)) {
         return PatBlt(x, y, width, height, rop);
+    }
     const auto target = findContext(m_hDC);
     const auto from = findContext(source ? source->m_hDC : nullptr);
-    if (!target || !from)
+    if (!target || !from) {
         return FALSE;
+    }
     const BlitArea toArea = blitArea(target->state.mapping, rectAt(x, y, width, height));
     const BlitArea fromArea = blitArea(from->state.mapping, rectAt(sourceX, sourceY, sourceWidth, sourceHeight));
-    if (!toArea.rect.isEmpty() && !fromArea.rect.isEmpty())
+    if (!toArea.rect.isEmpty() && !fromArea.rect.isEmpty()) {
         drawSource(*target, toArea, *from, fromArea, ternary);
+    }
     return TRUE;
 }
 

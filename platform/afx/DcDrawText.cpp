@@ -25,23 +25,27 @@ private:
 
 int lineLeft(const RECT& rect, UINT format, int width) {
     const int space = rect.right - rect.left - width;
-    if (format & DT_CENTER)
+    if (format & DT_CENTER) {
         return rect.left + space / 2;
+    }
     return format & DT_RIGHT ? rect.left + space : rect.left;
 }
 
 int firstLineTop(const RECT& rect, UINT format, int height) {
-    if ((format & DT_SINGLELINE) == 0)
+    if ((format & DT_SINGLELINE) == 0) {
         return rect.top;
+    }
     const int space = rect.bottom - rect.top - height;
-    if (format & DT_VCENTER)
+    if (format & DT_VCENTER) {
         return rect.top + space / 2;
+    }
     return format & DT_BOTTOM ? rect.top + space : rect.top;
 }
 
 void drawUnderline(CDC& dc, const LayoutLine& line, int x, int y, const TextLayoutStyle& style) {
-    if (line.mnemonic == std::string::npos)
+    if (line.mnemonic == std::string::npos) {
         return;
+    }
     const std::string_view text = line.text;
     const int from = layoutWidth(dc, text.substr(0, line.mnemonic), style);
     const int to = layoutWidth(dc, text.substr(0, line.mnemonic + line.mnemonicLength), style);
@@ -62,15 +66,17 @@ void drawLine(CDC& dc, const LayoutLine& line, const RECT& rect, UINT format, in
     const UINT clip = format & DT_NOCLIP ? 0 : ETO_CLIPPED;
     if (format & DT_EXPANDTABS && line.text.find('\t') != std::string::npos) {
         const int saved = dc.SaveDC();
-        if (clip)
+        if (clip) {
             dc.IntersectClipRect(&rect);
+        }
         dc.TabbedTextOut(x, y, line.text.data(), static_cast<int>(line.text.size()), 1, &style.tabWidth, x);
         dc.RestoreDC(saved);
     } else {
         dc.ExtTextOut(x, y, clip, &rect, line.text.data(), static_cast<UINT>(line.text.size()), nullptr);
     }
-    if ((format & DT_HIDEPREFIX) == 0)
+    if ((format & DT_HIDEPREFIX) == 0) {
         drawUnderline(dc, line, x, y, style);
+    }
 }
 
 /// The rectangle without numbers so large that sums with them would not fit.
@@ -82,8 +88,9 @@ RECT pulledIn(const RECT& rect) {
 
 int widestLine(const TextLayout& layout) {
     int width = 0;
-    for (const LayoutLine& line : layout.lines)
+    for (const LayoutLine& line : layout.lines) {
         width = std::max(width, line.width);
+    }
     return width;
 }
 
@@ -100,8 +107,9 @@ void fitRectangle(RECT& rect, UINT format, const TextLayout& layout, int top) {
 
 int CDC::DrawText(LPCSTR text, int count, RECT* rect, UINT format) {
     TEXTMETRIC metrics;
-    if (!text || !rect || !GetTextMetrics(&metrics))
+    if (!text || !rect || !GetTextMetrics(&metrics)) {
         return 0;
+    }
     const TextState state(*this);
     const RECT area = pulledIn(*rect);
     const std::string_view whole = count < 0 ? std::string_view(text) : std::string_view(text, count);
@@ -119,8 +127,9 @@ int CDC::DrawText(LPCSTR text, int count, RECT* rect, UINT format) {
     if (format & DT_CALCRECT) {
         *rect = area;
         fitRectangle(*rect, format, layout, top);
-        if (downwards < 0)
+        if (downwards < 0) {
             rect->bottom = top - layout.height();
+        }
         return layout.height();
     }
     for (const LayoutLine& line : layout.lines) {

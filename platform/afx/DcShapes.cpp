@@ -19,8 +19,9 @@ namespace {
 class Shape {
 public:
     explicit Shape(HDC handle) : dc(findContext(handle)) {
-        if (dc)
+        if (dc) {
             drawing.emplace(*dc);
+        }
     }
     /// What a drawing call answers: whether the context was valid.
     [[nodiscard]] BOOL valid() const {
@@ -39,8 +40,9 @@ public:
     template <class Area>
     void fill(const Area& area) {
         QImage pattern;
-        if (const auto ink = dc->brushInk(pattern))
+        if (const auto ink = dc->brushInk(pattern)) {
             canvas().fill(area, *ink);
+        }
     }
 
     std::shared_ptr<DeviceContext> dc;
@@ -52,8 +54,9 @@ private:
 QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
     QPolygon result;
     result.reserve(count);
-    for (int i = 0; i < count; ++i)
+    for (int i = 0; i < count; ++i) {
         result << mapping.toPixel(pointOf(points[i]));
+    }
     return result;
 }
 
@@ -64,8 +67,9 @@ QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
 BOOL CDC::LineTo(int x, int y) {
     const CPoint from = GetCurrentPosition();
     const POINT points[] = {from, {x, y}};
-    if (!Polyline(points, 2))
+    if (!Polyline(points, 2)) {
         return FALSE;
+    }
     MoveTo(x, y);
     return TRUE;
 }
@@ -75,21 +79,25 @@ BOOL CDC::LineTo(POINT point) {
 }
 
 BOOL CDC::Polyline(const POINT* points, int count) {
-    if (!points || count < 2)
+    if (!points || count < 2) {
         return FALSE;
+    }
     Shape shape(m_hDC);
-    if (shape.visible())
+    if (shape.visible()) {
         Outline(*shape.dc, shape.canvas()).line(devicePoints(shape.mapping(), points, count));
+    }
     return shape.valid();
 }
 
 BOOL CDC::PolylineTo(const POINT* points, int count) {
-    if (!points || count < 1)
+    if (!points || count < 1) {
         return FALSE;
+    }
     std::vector<POINT> all = {GetCurrentPosition()};
     all.insert(all.end(), points, points + count);
-    if (!Polyline(all.data(), count + 1))
+    if (!Polyline(all.data(), count + 1)) {
         return FALSE;
+    }
     MoveTo(points[count - 1]);
     return TRUE;
 }
@@ -141,17 +149,20 @@ void drawRectangle(Shape& shape, const QRect& box) {
 
 BOOL drawRounded(HDC handle, const RECT& rect, QSize corner) {
     Shape shape(handle);
-    if (!shape.visible())
+    if (!shape.visible()) {
         return shape.valid();
+    }
     const QRect box = shapeBox(shape, rect);
-    if (box.isEmpty())
+    if (box.isEmpty()) {
         return TRUE;
-    if (corner.isEmpty())
+    }
+    if (corner.isEmpty()) {
         drawRectangle(shape, box);
-    else if (isLarge(box))
+    } else if (isLarge(box)) {
         drawLargeRounded(shape, box, corner);
-    else
+    } else {
         drawRounded(shape, box, corner);
+    }
     return TRUE;
 }
 
@@ -199,14 +210,16 @@ public:
           counterClockwise_(direction == AD_COUNTERCLOCKWISE),
           start_(angle(start)),
           sweep_(turn(start_, angle(end))) {
-        if (sweep_ == 0)
+        if (sweep_ == 0) {
             sweep_ = 2 * std::numbers::pi;
+        }
     }
 
     /// The pixels in drawing order, from start to end.
     [[nodiscard]] QPolygon pixels() const {
-        if (isLarge(box_))
+        if (isLarge(box_)) {
             return corners();
+        }
         std::vector<QPoint> all = outlineOf(ellipseSpans(box_));
         std::erase_if(all, [&](QPoint point) { return turn(start_, angle(point)) > sweep_; });
         std::ranges::sort(all, {}, [&](QPoint point) { return turn(start_, angle(point)); });
@@ -255,23 +268,28 @@ Spans areaOf(const QPolygon& corners, FillRule rule, const QRect& bounds) {
 
 BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, ArcShape kind) {
     Shape shape(handle);
-    if (!shape.visible())
+    if (!shape.visible()) {
         return shape.valid();
+    }
     const QRect box = shape.mapping().toPixels(rect);
-    if (box.isEmpty())
+    if (box.isEmpty()) {
         return TRUE;
+    }
     const ArcPixels arc(box, shape.mapping().toPixel(pointOf(rays[0])), shape.mapping().toPixel(pointOf(rays[1])),
                         shape.dc->state.arcDirection);
     QPolygon outline = arc.pixels();
-    if (kind == ArcShape::pie)
+    if (kind == ArcShape::pie) {
         outline << arc.centre();
-    if (kind != ArcShape::arc)
+    }
+    if (kind != ArcShape::arc) {
         shape.fill(areaOf(outline, FillRule::winding, shape.canvas().bounds()));
+    }
     Outline pen(*shape.dc, shape.canvas());
-    if (kind == ArcShape::arc)
+    if (kind == ArcShape::arc) {
         pen.line(outline, Outline::LastPoint::drawn);
-    else
+    } else {
         pen.closed(outline);
+    }
     return TRUE;
 }
 
@@ -308,11 +326,14 @@ BOOL CDC::Polygon(const POINT* points, int count) {
 }
 
 BOOL CDC::PolyPolygon(const POINT* points, const int* counts, int count) {
-    if (!points || !counts || count < 1 || std::any_of(counts, counts + count, [](int corners) { return corners < 2; }))
+    if (!points || !counts || count < 1 ||
+        std::any_of(counts, counts + count, [](int corners) { return corners < 2; })) {
         return FALSE;
+    }
     Shape shape(m_hDC);
-    if (!shape.visible())
+    if (!shape.visible()) {
         return shape.valid();
+    }
     std::vector<QPolygonF> areas;
     std::vector<QPolygon> outlines;
     for (int i = 0; i < count; points += counts[i++]) {
@@ -322,7 +343,8 @@ BOOL CDC::PolyPolygon(const POINT* points, const int* counts, int count) {
     const FillRule rule = shape.dc->state.polyFillMode == WINDING ? FillRule::winding : FillRule::alternate;
     shape.fill(polygonSpans(areas, rule, shape.canvas().bounds()));
     Outline pen(*shape.dc, shape.canvas());
-    for (const QPolygon& outline : outlines)
+    for (const QPolygon& outline : outlines) {
         pen.closed(outline);
+    }
     return TRUE;
 }

@@ -13,18 +13,18 @@ namespace {
 
 /// Sets one field of a context's state; the result is the value before, `failure` without a context.
 template <class Value>
-Value exchange(HDC handle, Value DcState::*field, Value value, Value failure = {}) {
+Value exchange(HDC handle, Value DcState::* field, Value value, Value failure = {}) {
     const auto dc = findContext(handle);
     return dc ? std::exchange(dc->state.*field, value) : failure;
 }
 
 template <class Value>
-Value read(HDC handle, Value DcState::*field, Value failure = {}) {
+Value read(HDC handle, Value DcState::* field, Value failure = {}) {
     const auto dc = findContext(handle);
     return dc ? dc->state.*field : failure;
 }
 
-int exchangeMode(HDC handle, int DcState::*field, int value, int least, int most) {
+int exchangeMode(HDC handle, int DcState::* field, int value, int least, int most) {
     return value < least || value > most ? 0 : exchange(handle, field, value);
 }
 
@@ -135,12 +135,12 @@ Mapping* mappingOf(HDC handle) {
     return dc ? &dc->state.mapping : nullptr;
 }
 
-CPoint exchangeOrigin(HDC handle, QPoint Mapping::*field, QPoint value) {
+CPoint exchangeOrigin(HDC handle, QPoint Mapping::* field, QPoint value) {
     Mapping* mapping = mappingOf(handle);
     return mapping ? asPoint(std::exchange(mapping->*field, value)) : CPoint();
 }
 
-CPoint origin(HDC handle, QPoint Mapping::*field) {
+CPoint origin(HDC handle, QPoint Mapping::* field) {
     const Mapping* mapping = mappingOf(handle);
     return mapping ? asPoint(mapping->*field) : CPoint();
 }
@@ -194,8 +194,9 @@ CPoint CDC::OffsetWindowOrg(int x, int y) {
 
 CSize CDC::SetViewportExt(int cx, int cy) {
     const CSize before = GetViewportExt();
-    if (Mapping* mapping = mappingOf(m_hDC))
+    if (Mapping* mapping = mappingOf(m_hDC)) {
         mapping->setViewportExtent({cx, cy});
+    }
     return before;
 }
 
@@ -210,8 +211,9 @@ CSize CDC::GetViewportExt() const {
 
 CSize CDC::SetWindowExt(int cx, int cy) {
     const CSize before = GetWindowExt();
-    if (Mapping* mapping = mappingOf(m_hDC))
+    if (Mapping* mapping = mappingOf(m_hDC)) {
         mapping->setWindowExtent({cx, cy});
+    }
     return before;
 }
 
@@ -231,10 +233,12 @@ using SizeConversion = QSize (Mapping::*)(QSize) const;
 
 void convert(HDC handle, Conversion conversion, std::span<POINT> points) {
     const Mapping* mapping = mappingOf(handle);
-    if (!mapping)
+    if (!mapping) {
         return;
-    for (POINT& point : points)
+    }
+    for (POINT& point : points) {
         point = asPoint((mapping->*conversion)(pointOf(point)));
+    }
 }
 
 void convert(HDC handle, Conversion conversion, RECT* rect) {
@@ -244,8 +248,9 @@ void convert(HDC handle, Conversion conversion, RECT* rect) {
 }
 
 void convert(HDC handle, SizeConversion conversion, SIZE* size) {
-    if (const Mapping* mapping = mappingOf(handle))
+    if (const Mapping* mapping = mappingOf(handle)) {
         *size = asSize((mapping->*conversion)({size->cx, size->cy}));
+    }
 }
 
 constexpr Conversion kToDevice = &Mapping::toDevice;
@@ -285,8 +290,9 @@ void CDC::DPtoLP(SIZE* size) const {
 
 int CDC::GetClipBox(RECT* rect) const {
     const auto dc = findContext(m_hDC);
-    if (!dc || !rect)
+    if (!dc || !rect) {
         return RGN_ERROR;
+    }
     Drawing drawing(*dc);
     // The screen has no pixels to open, but what fits on it is what can be asked about it.
     const QRegion clip =
@@ -298,8 +304,9 @@ int CDC::GetClipBox(RECT* rect) const {
 
 BOOL CDC::PtVisible(int x, int y) const {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return FALSE;
+    }
     Drawing drawing(*dc);
     return drawing && drawing.canvas.clip.contains(dc->state.mapping.toPixel(QPoint(x, y)));
 }
@@ -310,8 +317,9 @@ BOOL CDC::PtVisible(POINT point) const {
 
 BOOL CDC::RectVisible(const RECT* rect) const {
     const auto dc = findContext(m_hDC);
-    if (!dc || !rect)
+    if (!dc || !rect) {
         return FALSE;
+    }
     Drawing drawing(*dc);
     return drawing && drawing.canvas.clip.intersects(dc->state.mapping.toPixels(*rect));
 }
@@ -326,8 +334,9 @@ QRegion everything() {
 
 int clipBy(HDC handle, const QRegion& region, int mode) {
     const auto dc = findContext(handle);
-    if (!dc)
+    if (!dc) {
         return RGN_ERROR;
+    }
     auto& clip = dc->state.clip;
     clip = mode == RGN_COPY ? region : combined(clip.value_or(everything()), region, mode);
     return regionKind(*clip);
@@ -342,18 +351,21 @@ int clipByRect(HDC handle, const RECT& logical, int mode) {
 
 int CDC::SelectClipRgn(CRgn* region) {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return RGN_ERROR;
-    if (region && region->m_hObject)
+    }
+    if (region && region->m_hObject) {
         return SelectClipRgn(region, RGN_COPY);
+    }
     dc->state.clip.reset();
     return SIMPLEREGION;
 }
 
 int CDC::SelectClipRgn(CRgn* region, int mode) {
     const auto found = findTool<RegionObject>(region ? region->m_hObject : nullptr);
-    if (!found)
+    if (!found) {
         return mode == RGN_COPY && !region ? SelectClipRgn(nullptr) : RGN_ERROR;
+    }
     return clipBy(m_hDC, found->region, mode);
 }
 
@@ -375,9 +387,11 @@ int CDC::IntersectClipRect(const RECT* rect) {
 
 int CDC::OffsetClipRgn(int x, int y) {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return RGN_ERROR;
-    if (dc->state.clip)
+    }
+    if (dc->state.clip) {
         dc->state.clip->translate(dc->state.mapping.toPixel(QPoint(x, y)) - dc->state.mapping.toPixel(QPoint(0, 0)));
+    }
     return dc->state.clip ? regionKind(*dc->state.clip) : SIMPLEREGION;
 }

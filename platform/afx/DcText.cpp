@@ -13,8 +13,9 @@ using namespace tvx::afx;
 namespace {
 
 std::string_view viewOf(LPCSTR text, int count) {
-    if (!text)
+    if (!text) {
         return {};
+    }
     return count < 0 ? std::string_view(text) : std::string_view(text, static_cast<std::size_t>(count));
 }
 
@@ -62,8 +63,9 @@ TextPlace placeText(const RealizedFont& font, UINT align, QPoint point, int widt
 
 std::vector<int> deviceAdvances(const Mapping& mapping, const int* advances, std::size_t count) {
     std::vector<int> result(count);
-    for (std::size_t i = 0; i < count; ++i)
+    for (std::size_t i = 0; i < count; ++i) {
         result[i] = mapping.sizeToDevice({advances[i], 0}).width();
+    }
     return result;
 }
 
@@ -71,30 +73,37 @@ std::vector<int> deviceAdvances(const Mapping& mapping, const int* advances, std
 
 BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, UINT count, const int* advances) {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return FALSE;
+    }
     const auto font = dc->font();
     Drawing drawing(*dc);
     const Mapping& mapping = dc->state.mapping;
-    if (rect && (options & ETO_OPAQUE) && drawing)
+    if (rect && (options & ETO_OPAQUE) && drawing) {
         drawing.canvas.fill(mapping.toPixels(*rect), dc->ink(dc->state.backColor));
-    if (!font)
+    }
+    if (!font) {
         return FALSE;
+    }
     TextLine line(*font, viewOf(text, static_cast<int>(count)));
-    if (advances)
+    if (advances) {
         line.setAdvances(deviceAdvances(mapping, advances, line.characterCount()));
+    }
     const bool moves = (dc->state.textAlign & TA_UPDATECP) != 0;
     const QPoint start = mapping.toPixel(moves ? dc->state.position : QPoint(x, y));
     const TextPlace place = placeText(*font, dc->state.textAlign, start, line.width());
     if (drawing) {
-        if (rect && (options & ETO_CLIPPED))
+        if (rect && (options & ETO_CLIPPED)) {
             drawing.canvas.clip &= mapping.toPixels(*rect);
-        if (dc->state.backMode == OPAQUE && !(options & ETO_OPAQUE))
+        }
+        if (dc->state.backMode == OPAQUE && !(options & ETO_OPAQUE)) {
             line.fillBackground(drawing.canvas, place.left, dc->ink(dc->state.backColor));
+        }
         line.draw(drawing.canvas, place.left, dc->ink(dc->state.textColor).color);
     }
-    if (moves)
+    if (moves) {
         dc->state.position = mapping.toLogical(place.next);
+    }
     return TRUE;
 }
 
@@ -109,8 +118,9 @@ namespace {
 CSize measure(HDC handle, std::string_view text) {
     const auto dc = findContext(handle);
     const auto font = dc ? dc->font() : nullptr;
-    if (!font)
+    if (!font) {
         return {};
+    }
     const std::optional<int> sum = font->advances.widthOf(text);
     const int width = sum ? *sum : TextLine(*font, text).width();
     const QSize size = dc->state.mapping.sizeToLogical({width, font->metrics.height()});
@@ -136,8 +146,9 @@ CSize CDC::GetOutputTextExtent(const CString& text) const {
 }
 
 BOOL GetTextExtentPoint32A(HDC dc, LPCSTR text, int count, SIZE* size) {
-    if (!size || !findContext(dc))
+    if (!size || !findContext(dc)) {
         return FALSE;
+    }
     *size = measure(dc, viewOf(text, count));
     return TRUE;
 }
@@ -161,8 +172,9 @@ int averageWidth(const QFontMetrics& metrics) {
 BOOL GetTextMetricsA(HDC handle, TEXTMETRICA* metrics) {
     const auto dc = findContext(handle);
     const auto font = dc ? dc->font() : nullptr;
-    if (!font || !metrics)
+    if (!font || !metrics) {
         return FALSE;
+    }
     const QFontMetrics& device = font->metrics;
     const auto high = [&](int pixels) { return dc->state.mapping.sizeToLogical({0, pixels}).height(); };
     const auto wide = [&](int pixels) { return dc->state.mapping.sizeToLogical({pixels, 0}).width(); };
@@ -194,21 +206,25 @@ BOOL CDC::GetTextMetrics(TEXTMETRIC* metrics) const {
 
 int CDC::GetTextFace(CString& name) const {
     const auto dc = findContext(m_hDC);
-    if (!dc)
+    if (!dc) {
         return 0;
+    }
     name = dc->state.font->description.lfFaceName;
-    if (const auto font = dc->font(); font && name.IsEmpty())
+    if (const auto font = dc->font(); font && name.IsEmpty()) {
         name = font->font.family().toUtf8().constData();
+    }
     return name.GetLength();
 }
 
 int CDC::GetTextFace(int count, LPSTR name) const {
     CString face;
     const int length = GetTextFace(face);
-    if (!name)
+    if (!name) {
         return length + 1;
-    if (count <= 0)
+    }
+    if (count <= 0) {
         return 0;
+    }
     const int copied = std::min(length, count - 1);
     std::memcpy(name, static_cast<LPCSTR>(face), static_cast<std::size_t>(copied));
     name[copied] = '\0';
@@ -219,8 +235,9 @@ BOOL CDC::GetCharWidth(UINT first, UINT last, int* widths) const {
     const auto dc = findContext(m_hDC);
     const auto font = dc ? dc->font() : nullptr;
     constexpr UINT kLastCodePoint = 0x10FFFF;
-    if (!font || !widths || last < first || last > kLastCodePoint)
+    if (!font || !widths || last < first || last > kLastCodePoint) {
         return FALSE;
+    }
     for (UINT code = first; code <= last; ++code) {
         const auto character = static_cast<char32_t>(code);
         const int advance = font->metrics.horizontalAdvance(QString::fromUcs4(&character, 1));
@@ -236,19 +253,22 @@ namespace {
 /// Lays out the pieces between tabs and draws them when `output` is given.
 CSize layOutTabs(CDC& dc, std::string_view text, int tabCount, const int* tabs, int origin, const POINT* output) {
     TEXTMETRIC metrics;
-    if (!dc.GetTextMetrics(&metrics))
+    if (!dc.GetTextMetrics(&metrics)) {
         return {};
+    }
     const TabStops stops(tabCount, tabs, metrics.tmAveCharWidth);
     const int start = output ? std::clamp(distance(origin, output->x), -kFarthestPixel, kFarthestPixel) : 0;
     int x = 0;
     for (std::size_t at = 0; at <= text.size();) {
         const std::size_t end = std::min(text.find('\t', at), text.size());
         const auto length = static_cast<int>(end - at);
-        if (output)
+        if (output) {
             dc.TextOut(saturated(std::int64_t{output->x} + x), output->y, text.data() + at, length);
+        }
         x += dc.GetTextExtent(text.data() + at, length).cx;
-        if (end < text.size())
+        if (end < text.size()) {
             x = stops.after(start + x) - start;
+        }
         at = end + 1;
     }
     return {x, metrics.tmHeight};

@@ -30,8 +30,9 @@ QRect clientArea(HWND handle) {
 /// The whole window in its widget's coordinates. A frame that the desktop draws reaches beyond the widget.
 QRect wholeArea(HWND handle) {
     const Window* window = Window::from(handle);
-    if (!window || !window->widget())
+    if (!window || !window->widget()) {
         return {};
+    }
     const QRect screen = window->screenRect();
     return {window->widget()->mapFromGlobal(screen.topLeft()), screen.size()};
 }
@@ -57,21 +58,23 @@ HDC windowContext(HWND handle, WindowPart part) {
 /// The handle of a window object; null for no object, which stands for the screen. Raises CResourceException when the
 /// object has no window.
 HWND handleOf(const CWnd* window) {
-    if (!window)
+    if (!window) {
         return nullptr;
-    if (!Window::from(window->m_hWnd))
+    }
+    if (!Window::from(window->m_hWnd)) {
         AfxThrowResourceException();
+    }
     return window->m_hWnd;
 }
 
 } // namespace
 
 HDC GetDC(HWND window) {
-    return window != nullptr ? windowContext(window, WindowPart::client) : screenContext();
+    return window ? windowContext(window, WindowPart::client) : screenContext();
 }
 
 HDC GetWindowDC(HWND window) {
-    return window != nullptr ? windowContext(window, WindowPart::whole) : screenContext();
+    return window ? windowContext(window, WindowPart::whole) : screenContext();
 }
 
 int ReleaseDC(HWND, HDC dc) {
@@ -93,8 +96,9 @@ HDC BeginPaint(HWND handle, PAINTSTRUCT* paint) {
     *paint = {};
     paint->hdc = addWindowContext(handle, DcKind::paint, std::move(target));
     paint->rcPaint = fromQt(update.boundingRect());
-    if (!update.isEmpty())
+    if (!update.isEmpty()) {
         paint->fErase = window->call(WM_ERASEBKGND, reinterpret_cast<WPARAM>(paint->hdc)) == 0;
+    }
     return paint->hdc;
 }
 
@@ -120,8 +124,9 @@ CWindowDC::~CWindowDC() {
 }
 
 CPaintDC::CPaintDC(CWnd* window) : m_hWnd(handleOf(window)) {
-    if (!Attach(::BeginPaint(m_hWnd, &m_ps)))
+    if (!Attach(::BeginPaint(m_hWnd, &m_ps))) {
         AfxThrowResourceException();
+    }
 }
 
 CPaintDC::~CPaintDC() {

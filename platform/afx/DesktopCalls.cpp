@@ -76,8 +76,8 @@ bool tellOwn(WNDENUMPROC callback, LPARAM param) {
     for (const Window* window : Window::topLevels()) {
         handles.push_back(window->handle());
     }
-    return std::ranges::all_of(
-        handles, [&](HWND handle) { return Window::from(handle) == nullptr || callback(handle, param) != FALSE; });
+    return std::ranges::all_of(handles,
+                               [&](HWND handle) { return !Window::from(handle) || callback(handle, param) != FALSE; });
 }
 
 /// The windows of one process, of all other ones for 0.
@@ -90,22 +90,22 @@ bool tellForeign(DWORD process, WNDENUMPROC callback, LPARAM param) {
 } // namespace
 
 BOOL IsWindow(HWND handle) {
-    return toBool(Window::from(handle) != nullptr || desktop::exists(idOf(handle)));
+    return toBool(Window::from(handle) || desktop::exists(idOf(handle)));
 }
 
 BOOL IsIconic(HWND handle) {
     const Window* window = Window::from(handle);
-    return toBool(window != nullptr ? window->widget()->isMinimized() : desktop::isIconic(idOf(handle)));
+    return toBool(window ? window->widget()->isMinimized() : desktop::isIconic(idOf(handle)));
 }
 
 BOOL IsZoomed(HWND handle) {
     const Window* window = Window::from(handle);
-    return toBool(window != nullptr ? window->widget()->isMaximized() : desktop::isMaximized(idOf(handle)));
+    return toBool(window ? window->widget()->isMaximized() : desktop::isMaximized(idOf(handle)));
 }
 
 BOOL ShowWindow(HWND handle, int command) {
     Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         if (!isForeign(handle)) {
             return FALSE;
         }
@@ -119,19 +119,19 @@ BOOL ShowWindow(HWND handle, int command) {
 
 HWND GetParent(HWND handle) {
     const Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return isForeign(handle) ? handleOf(desktop::ownerOf(idOf(handle))) : nullptr;
     }
     const Window* above = window->isChild() ? window->parent() : window->owner();
-    return above != nullptr ? above->handle() : nullptr;
+    return above ? above->handle() : nullptr;
 }
 
 int GetClassNameA(HWND handle, LPSTR buffer, int size) {
     const Window* window = Window::from(handle);
-    if (size <= 0 || (window == nullptr && !isForeign(handle))) {
+    if (size <= 0 || (!window && !isForeign(handle))) {
         return 0;
     }
-    const std::string name = window != nullptr ? window->className() : desktop::classNameOf(idOf(handle));
+    const std::string name = window ? window->className() : desktop::classNameOf(idOf(handle));
     const std::size_t length = std::min(name.size(), static_cast<std::size_t>(size - 1));
     std::memcpy(buffer, name.data(), length);
     buffer[length] = '\0';
@@ -153,7 +153,7 @@ BOOL EnumThreadWindows(DWORD thread, WNDENUMPROC callback, LPARAM param) {
 DWORD GetWindowThreadProcessId(HWND handle, DWORD* process) {
     const bool own = Window::from(handle) != nullptr;
     const DWORD owner = own ? GetCurrentProcessId() : isForeign(handle) ? desktop::processOf(idOf(handle)) : 0;
-    if (process != nullptr && owner != 0) {
+    if (process && owner != 0) {
         *process = owner;
     }
     return own ? guiThread() : owner;
@@ -169,12 +169,12 @@ BOOL AttachThreadInput(DWORD from, DWORD to, BOOL) {
 
 HWND GetForegroundWindow() {
     const HWND own = GetActiveWindow();
-    return own != nullptr ? own : handleOf(desktop::active());
+    return own ? own : handleOf(desktop::active());
 }
 
 BOOL SetForegroundWindow(HWND handle) {
     Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return toBool(isForeign(handle) && desktop::activate(idOf(handle)));
     }
     guarded([window] { window->topLevel()->widget()->raise(); });

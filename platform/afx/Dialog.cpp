@@ -56,8 +56,8 @@ std::optional<tvx::DialogTemplate> loadTemplate(LPCSTR name) {
 /// change: the toolkit keeps the user away, the style tells the program.
 class OwnerLock {
 public:
-    explicit OwnerLock(Window* owner) : m_owner(owner != nullptr && owner->isEnabled() ? owner->handle() : nullptr) {
-        if (m_owner != nullptr) {
+    explicit OwnerLock(Window* owner) : m_owner(owner && owner->isEnabled() ? owner->handle() : nullptr) {
+        if (m_owner) {
             set(WS_DISABLED);
         }
     }
@@ -67,7 +67,7 @@ public:
     OwnerLock(const OwnerLock&) = delete;
     OwnerLock& operator=(const OwnerLock&) = delete;
     void release() {
-        if (m_owner != nullptr) {
+        if (m_owner) {
             set(0);
             m_owner = nullptr;
         }
@@ -83,27 +83,27 @@ private:
 };
 
 Window* topLevelOf(CWnd* window) {
-    Window* state = window != nullptr ? window->GetState() : nullptr;
-    return state != nullptr ? state->topLevel() : nullptr;
+    Window* state = window ? window->GetState() : nullptr;
+    return state ? state->topLevel() : nullptr;
 }
 
 /// The window a dialog stands over: the active one of the application when the host names none and another dialog is
 /// open already, so that dialogs stack.
 CWnd* ownerFor(CWnd* parent) {
-    if (parent != nullptr && parent->m_hWnd != nullptr) {
+    if (parent && parent->m_hWnd) {
         return parent;
     }
     const Window* active = Window::from(::GetActiveWindow());
-    if (dynamic_cast<const DialogWindow*>(active) != nullptr && !active->isChild()) {
+    if (dynamic_cast<const DialogWindow*>(active) && !active->isChild()) {
         return CWnd::FromHandle(active->handle());
     }
     CWnd* main = AfxGetMainWnd();
-    return main != nullptr && main->m_hWnd != nullptr ? main : nullptr;
+    return main && main->m_hWnd ? main : nullptr;
 }
 
 void activateAgain(HWND handle) {
     Window* window = Window::from(handle);
-    if (window != nullptr && window->isVisible() && !window->widget()->isMinimized()) {
+    if (window && window->isVisible() && !window->widget()->isMinimized()) {
         guarded([window] { window->widget()->activateWindow(); });
     }
 }
@@ -119,7 +119,7 @@ CDialog::CDialog(LPCSTR templateName, CWnd* parent) : m_lpszTemplateName(templat
 CDialog::CDialog(UINT templateId, CWnd* parent) : CDialog(MAKEINTRESOURCE(templateId), parent) {}
 
 CDialog::~CDialog() {
-    if (m_hWnd != nullptr) {
+    if (m_hWnd) {
         try {
             DestroyWindow();
         } catch (...) {
@@ -139,7 +139,7 @@ BOOL CDialog::Create(LPCSTR templateName, CWnd* parent) {
     if (IS_INTRESOURCE(templateName) && m_nIDHelp == 0) {
         m_nIDHelp = static_cast<UINT>(reinterpret_cast<std::uintptr_t>(templateName));
     }
-    m_pParentWnd = parent != nullptr ? parent : AfxGetMainWnd();
+    m_pParentWnd = parent ? parent : AfxGetMainWnd();
     if (!ensureGui()) {
         std::fputs("There is no display to show a dialog on: set DISPLAY.\n", stderr);
         return FALSE;
@@ -155,13 +155,13 @@ BOOL CDialog::createFrom(const tvx::DialogTemplate& description, CWnd* parent, b
     cs.lpszName = description.title.c_str();
     cs.style = static_cast<LONG>(description.style & ~(DWORD{WS_VISIBLE} | (child ? 0U : DWORD{WS_CHILD})));
     cs.dwExStyle = description.extendedStyle;
-    cs.hwndParent = parent != nullptr ? (child ? parent->m_hWnd : parent->GetTopLevelParent()->m_hWnd) : nullptr;
+    cs.hwndParent = parent ? (child ? parent->m_hWnd : parent->GetTopLevelParent()->m_hWnd) : nullptr;
     cs.hInstance = AfxGetInstanceHandle();
     cs.cx = cs.cy = 1; // known once the font is
     m_ended = false;
     m_modal = modal;
     const HWND handle = createWindow(cs, this);
-    if (handle == nullptr) {
+    if (!handle) {
         return FALSE;
     }
     initialise(description, parent);
@@ -181,7 +181,7 @@ bool place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& o
     const QRect rect = dialog.map(description.rect);
     Window* over = dialog.isChild() ? nullptr : dialog.owner();
     QPoint corner = rect.topLeft();
-    if (over != nullptr && (description.style & DS_ABSALIGN) == 0) {
+    if (over && (description.style & DS_ABSALIGN) == 0) {
         corner = over->clientToScreen(corner);
     }
     if ((description.style & DS_CENTERMOUSE) != 0) {
@@ -189,7 +189,7 @@ bool place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& o
     }
     guarded([&] { dialog.setClientSize(corner, rect.size()); });
     const bool noPlace = rect.topLeft().isNull() && (description.style & (DS_ABSALIGN | DS_CENTERMOUSE)) == 0;
-    const bool centred = !dialog.isChild() && ((description.style & DS_CENTER) != 0 || noPlace || over == nullptr);
+    const bool centred = !dialog.isChild() && ((description.style & DS_CENTER) != 0 || noPlace || !over);
     if (centred) {
         object.CenterWindow();
     }
@@ -210,7 +210,7 @@ void CDialog::initialise(const tvx::DialogTemplate& description, CWnd*) {
         std::fprintf(stderr, "A control of the dialog %s could not be made.\n", nameOf(m_lpszTemplateName).c_str());
     }
     Window* first = nextTabItem(dialog, nullptr, Direction::Forward);
-    const auto firstHandle = reinterpret_cast<WPARAM>(first != nullptr ? first->handle() : nullptr);
+    const auto firstHandle = reinterpret_cast<WPARAM>(first ? first->handle() : nullptr);
     const bool setsFocus = SendMessage(WM_INITDIALOG, firstHandle, 0) != 0;
     if (!::IsWindow(handle) || m_ended) {
         return;
@@ -256,13 +256,13 @@ int CDialog::DoModal() {
     }
     CWnd* parent = ownerFor(m_pParentWnd);
     Window* owner = topLevelOf(parent);
-    const HWND ownerHandle = owner != nullptr ? owner->handle() : nullptr;
+    const HWND ownerHandle = owner ? owner->handle() : nullptr;
     OwnerLock lock(owner);
     m_modalResult = -1;
     const auto close = [&] {
         // The owner reacts again before the dialog goes, so that it and no other program's window is activated.
         lock.release();
-        if (m_hWnd != nullptr) {
+        if (m_hWnd) {
             DestroyWindow();
         }
         m_modal = false;
@@ -272,7 +272,7 @@ int CDialog::DoModal() {
         if (createFrom(*description, parent, true) && !m_ended) {
             GetState()->widget()->setWindowModality(Qt::ApplicationModal);
             ShowWindow(SW_SHOW);
-            if (!m_ended && m_hWnd != nullptr) {
+            if (!m_ended && m_hWnd) {
                 RunModalLoop();
             }
         }
@@ -290,7 +290,7 @@ void CDialog::EndDialog(int result) {
     if (m_modal) {
         EndModalLoop(result);
     }
-    if (m_hWnd != nullptr) {
+    if (m_hWnd) {
         ShowWindow(SW_HIDE);
     }
 }
@@ -313,7 +313,7 @@ BOOL CDialog::PreTranslateMessage(MSG* message) {
     }
     if (message->message == WM_KEYDOWN && message->wParam == VK_F1) {
         CWnd* main = AfxGetMainWnd();
-        if (main != nullptr && main->m_hWnd != nullptr) {
+        if (main && main->m_hWnd) {
             main->SendMessage(WM_COMMAND, ID_HELP);
         } else if (CWinApp* app = AfxGetApp()) {
             app->OnCmdMsg(ID_HELP, CN_COMMAND, nullptr, nullptr);
@@ -322,7 +322,7 @@ BOOL CDialog::PreTranslateMessage(MSG* message) {
     }
     // The keys of a child dialog belong to the dialog around it.
     const Window* window = GetState();
-    if (window != nullptr && window->isChild() && dynamic_cast<DialogWindow*>(window->parent()) != nullptr) {
+    if (window && window->isChild() && dynamic_cast<DialogWindow*>(window->parent())) {
         return FALSE;
     }
     return PreTranslateInput(message);
@@ -338,11 +338,11 @@ BOOL CDialog::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info)
         return FALSE;
     }
     CWnd* owner = GetParent();
-    if (owner != nullptr && owner->OnCmdMsg(id, code, extra, info)) {
+    if (owner && owner->OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
     CWinThread* thread = AfxGetThread();
-    return thread != nullptr && thread->OnCmdMsg(id, code, extra, info) ? TRUE : FALSE;
+    return thread && thread->OnCmdMsg(id, code, extra, info) ? TRUE : FALSE;
 }
 
 LRESULT CDialog::OnCommandHelp(WPARAM, LPARAM context) {
@@ -350,7 +350,7 @@ LRESULT CDialog::OnCommandHelp(WPARAM, LPARAM context) {
         context = LPARAM{helpBase} + m_nIDHelp;
     }
     CWinApp* app = AfxGetApp();
-    if (context == 0 || app == nullptr) {
+    if (context == 0 || !app) {
         return FALSE;
     }
     app->WinHelpInternal(static_cast<DWORD_PTR>(context));
@@ -372,7 +372,7 @@ void CDialog::PrevDlgCtrl() const {
 }
 
 void CDialog::GotoDlgCtrl(CWnd* control) {
-    if (Window* window = control != nullptr ? control->GetState() : nullptr) {
+    if (Window* window = control ? control->GetState() : nullptr) {
         focusControl(*window);
     }
 }

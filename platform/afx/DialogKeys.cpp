@@ -18,7 +18,7 @@ namespace {
 
 UINT codeOf(Window& window, const MSG* msg = nullptr) {
     return static_cast<UINT>(
-        SendMessageA(window.handle(), WM_GETDLGCODE, msg != nullptr ? msg->wParam : 0, reinterpret_cast<LPARAM>(msg)));
+        SendMessageA(window.handle(), WM_GETDLGCODE, msg ? msg->wParam : 0, reinterpret_cast<LPARAM>(msg)));
 }
 
 bool isUsable(const Window& window) {
@@ -45,7 +45,7 @@ void collect(const Window& parent, std::vector<Window*>& controls) {
 }
 
 Window* focusIn(const Window& dialog) {
-    for (Window* window = Window::from(GetFocus()); window != nullptr; window = window->parent()) {
+    for (Window* window = Window::from(GetFocus()); window; window = window->parent()) {
         if (window == &dialog) {
             return Window::from(GetFocus());
         }
@@ -56,7 +56,7 @@ Window* focusIn(const Window& dialog) {
 } // namespace
 
 std::vector<Window*> dialogGroup(const Window& control) {
-    if (control.parent() == nullptr) {
+    if (!control.parent()) {
         return {};
     }
     const auto& siblings = control.parent()->children();
@@ -105,7 +105,7 @@ void focusControl(Window& control) {
     const HWND handle = control.handle();
     SetFocus(handle);
     Window* still = Window::from(handle);
-    if (still != nullptr && (codeOf(*still) & DLGC_HASSETSEL) != 0) {
+    if (still && (codeOf(*still) & DLGC_HASSETSEL) != 0) {
         SendMessageA(handle, EM_SETSEL, 0, -1);
     }
 }
@@ -124,15 +124,14 @@ bool onTab(Window& dialog, Window* focus) {
 
 bool onArrow(Window& focus, Direction direction) {
     Window* next = nextGroupItem(focus, direction);
-    if (next == nullptr || next == &focus) {
+    if (!next || next == &focus) {
         return true;
     }
     const HWND handle = next->handle();
     SetFocus(handle);
     next = Window::from(handle);
     // The mark follows the keyboard through a group of radio buttons that mark themselves.
-    if (next != nullptr && (codeOf(*next) & DLGC_RADIOBUTTON) != 0 &&
-        (next->style() & BS_TYPEMASK) == BS_AUTORADIOBUTTON) {
+    if (next && (codeOf(*next) & DLGC_RADIOBUTTON) != 0 && (next->style() & BS_TYPEMASK) == BS_AUTORADIOBUTTON) {
         SendMessageA(handle, BM_CLICK, 0, 0);
     }
     return true;
@@ -142,18 +141,18 @@ bool onArrow(Window& focus, Direction direction) {
 
 bool press(Window& dialog, int id) {
     const Window* button = dialog.child(id);
-    if (button != nullptr && !button->isEnabled()) {
+    if (button && !button->isEnabled()) {
         QApplication::beep();
         return true;
     }
     armIdle();
-    const HWND handle = button != nullptr ? button->handle() : nullptr;
+    const HWND handle = button ? button->handle() : nullptr;
     SendMessageA(dialog.handle(), WM_COMMAND, MAKEWPARAM(id, BN_CLICKED), reinterpret_cast<LPARAM>(handle));
     return true;
 }
 
 bool onEnter(Window& dialog, Window* focus) {
-    const UINT code = focus != nullptr ? codeOf(*focus) : 0;
+    const UINT code = focus ? codeOf(*focus) : 0;
     if ((code & (DLGC_DEFPUSHBUTTON | DLGC_UNDEFPUSHBUTTON)) != 0) {
         armIdle();
         SendMessageA(focus->handle(), BM_CLICK, 0, 0);
@@ -184,7 +183,7 @@ std::vector<Window*> withMnemonic(const std::vector<Window*>& controls, QChar le
     std::vector<Window*> found;
     for (Window* window : controls) {
         const auto* control = dynamic_cast<const Control*>(window);
-        if (control != nullptr && mnemonicOf(control->mnemonicText()) == letter) {
+        if (control && mnemonicOf(control->mnemonicText()) == letter) {
             found.push_back(window);
         }
     }
@@ -206,7 +205,7 @@ bool activate(const std::vector<Window*>& controls, Window* chosen, bool unique)
     UINT code = codeOf(*chosen);
     if ((code & DLGC_STATIC) != 0) {
         chosen = behindLabel(controls, chosen);
-        if (chosen != nullptr) {
+        if (chosen) {
             focusControl(*chosen);
         }
         return true;
@@ -240,7 +239,7 @@ bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
 }
 
 bool onKey(Window& dialog, Window* focus, const MSG& msg) {
-    const UINT code = focus != nullptr ? codeOf(*focus, &msg) : 0;
+    const UINT code = focus ? codeOf(*focus, &msg) : 0;
     if ((code & DLGC_WANTALLKEYS) != 0 || isKeyDown(VK_MENU)) {
         return false;
     }
@@ -250,10 +249,10 @@ bool onKey(Window& dialog, Window* focus, const MSG& msg) {
         return (code & DLGC_WANTTAB) == 0 && !control && onTab(dialog, focus);
     case VK_LEFT:
     case VK_UP:
-        return (code & DLGC_WANTARROWS) == 0 && focus != nullptr && onArrow(*focus, Direction::Backward);
+        return (code & DLGC_WANTARROWS) == 0 && focus && onArrow(*focus, Direction::Backward);
     case VK_RIGHT:
     case VK_DOWN:
-        return (code & DLGC_WANTARROWS) == 0 && focus != nullptr && onArrow(*focus, Direction::Forward);
+        return (code & DLGC_WANTARROWS) == 0 && focus && onArrow(*focus, Direction::Forward);
     case VK_RETURN:
     case VK_EXECUTE:
         return !control && onEnter(dialog, focus);
@@ -266,7 +265,7 @@ bool onKey(Window& dialog, Window* focus, const MSG& msg) {
 }
 
 bool onChar(Window& dialog, Window* focus, const MSG& msg) {
-    const UINT code = focus != nullptr ? codeOf(*focus, &msg) : 0;
+    const UINT code = focus ? codeOf(*focus, &msg) : 0;
     const bool wanted = (code & (DLGC_WANTCHARS | DLGC_WANTALLKEYS)) != 0;
     // A blank presses the focused button; it is nobody's mnemonic.
     if (wanted || msg.wParam <= ' ' || isKeyDown(VK_CONTROL)) {
@@ -298,5 +297,5 @@ using namespace tvx::afx;
 BOOL CWnd::PreTranslateInput(MSG* message) {
     Window* window = GetState();
     const bool key = message->message >= WM_KEYFIRST && message->message <= WM_KEYLAST;
-    return key && window != nullptr && isDialogMessage(*window, *message) ? TRUE : FALSE;
+    return key && window && isDialogMessage(*window, *message) ? TRUE : FALSE;
 }

@@ -20,7 +20,7 @@ CDocManager::~CDocManager() {
 }
 
 void CDocManager::AddDocTemplate(CDocTemplate* docTemplate) {
-    if (docTemplate == nullptr || std::find(m_templates.begin(), m_templates.end(), docTemplate) != m_templates.end()) {
+    if (!docTemplate || std::find(m_templates.begin(), m_templates.end(), docTemplate) != m_templates.end()) {
         return;
     }
     docTemplate->LoadTemplate();
@@ -71,7 +71,7 @@ void CDocManager::OnFileOpen() {
     CString name;
     if (DoPromptFileName(name, AFX_IDS_OPENFILE, OFN_HIDEREADONLY | OFN_FILEMUSTEXIST, TRUE, nullptr)) {
         CWinApp* app = AfxGetApp();
-        if (app != nullptr) {
+        if (app) {
             app->OpenDocumentFile(name);
         }
     }
@@ -104,7 +104,7 @@ BOOL CDocManager::DoPromptFileName(CString& fileName, UINT titleId, DWORD flags,
                                    CDocTemplate* docTemplate) {
     std::string filters;
     CString defaultExtension;
-    if (docTemplate != nullptr) {
+    if (docTemplate) {
         addFilter(filters, *docTemplate, defaultExtension);
     } else {
         for (const CDocTemplate* each : m_templates) {
@@ -151,14 +151,14 @@ namespace {
 
 void activate(const CDocument& document) {
     POSITION at = document.GetFirstViewPosition();
-    const CView* view = at != nullptr ? document.GetNextView(at) : nullptr;
-    CFrameWnd* frame = view != nullptr ? view->GetParentFrame() : nullptr;
-    if (frame == nullptr) {
+    const CView* view = at ? document.GetNextView(at) : nullptr;
+    CFrameWnd* frame = view ? view->GetParentFrame() : nullptr;
+    if (!frame) {
         return;
     }
     frame->ActivateFrame();
     auto* main = DYNAMIC_DOWNCAST(CFrameWnd, AfxGetMainWnd());
-    if (main != nullptr && main != frame) {
+    if (main && main != frame) {
         main->ActivateFrame();
     }
 }
@@ -174,11 +174,11 @@ CDocument* CDocManager::OpenDocumentFile(LPCSTR fileName) {
     const CString path = fullPath(name);
     CDocument* open = nullptr;
     CDocTemplate* docTemplate = bestTemplate(path, open);
-    if (open != nullptr) {
+    if (open) {
         activate(*open);
         return open;
     }
-    if (docTemplate == nullptr) {
+    if (!docTemplate) {
         AfxMessageBox(AFX_IDP_FAILED_TO_OPEN_DOC);
         return nullptr;
     }
@@ -203,7 +203,7 @@ void CDocManager::CloseAllDocuments(BOOL endSession) {
 int CDocManager::GetOpenDocumentCount() {
     int count = 0;
     for (const CDocTemplate* docTemplate : m_templates) {
-        for (POSITION at = docTemplate->GetFirstDocPosition(); at != nullptr; docTemplate->GetNextDoc(at)) {
+        for (POSITION at = docTemplate->GetFirstDocPosition(); at; docTemplate->GetNextDoc(at)) {
             ++count;
         }
     }

@@ -29,7 +29,7 @@ BOOL CDocTemplate::GetDocString(CString& text, DocStringIndex index) const {
 
 CDocTemplate::Confidence CDocTemplate::MatchDocType(LPCSTR path, CDocument*& match) {
     match = nullptr;
-    for (POSITION at = GetFirstDocPosition(); at != nullptr;) {
+    for (POSITION at = GetFirstDocPosition(); at;) {
         CDocument* document = GetNextDoc(at);
         if (sameFile(document->GetPathName(), path)) {
             match = document;
@@ -53,9 +53,9 @@ void CDocTemplate::RemoveDocument(CDocument* document) {
 }
 
 CDocument* CDocTemplate::CreateNewDocument() {
-    CObject* made = m_pDocClass != nullptr ? m_pDocClass->CreateObject() : nullptr;
+    CObject* made = m_pDocClass ? m_pDocClass->CreateObject() : nullptr;
     auto* document = DYNAMIC_DOWNCAST(CDocument, made);
-    if (document == nullptr) {
+    if (!document) {
         delete made;
         return nullptr;
     }
@@ -69,9 +69,9 @@ CFrameWnd* CDocTemplate::CreateNewFrame(CDocument* document, CFrameWnd* other) {
     context.m_pCurrentDoc = document;
     context.m_pNewViewClass = m_pViewClass;
     context.m_pNewDocTemplate = this;
-    CObject* made = m_pFrameClass != nullptr ? m_pFrameClass->CreateObject() : nullptr;
+    CObject* made = m_pFrameClass ? m_pFrameClass->CreateObject() : nullptr;
     auto* frame = DYNAMIC_DOWNCAST(CFrameWnd, made);
-    if (frame == nullptr) {
+    if (!frame) {
         delete made;
         return nullptr;
     }
@@ -84,7 +84,7 @@ void CDocTemplate::InitialUpdateFrame(CFrameWnd* frame, CDocument* document, BOO
 }
 
 BOOL CDocTemplate::SaveAllModified() {
-    for (POSITION at = GetFirstDocPosition(); at != nullptr;) {
+    for (POSITION at = GetFirstDocPosition(); at;) {
         if (!GetNextDoc(at)->SaveModified()) {
             return FALSE;
         }
@@ -94,7 +94,7 @@ BOOL CDocTemplate::SaveAllModified() {
 
 void CDocTemplate::CloseAllDocuments(BOOL) {
     std::vector<CDocument*> all;
-    for (POSITION at = GetFirstDocPosition(); at != nullptr;) {
+    for (POSITION at = GetFirstDocPosition(); at;) {
         all.push_back(GetNextDoc(at));
     }
     for (CDocument* document : all) {
@@ -103,7 +103,7 @@ void CDocTemplate::CloseAllDocuments(BOOL) {
 }
 
 void CDocTemplate::OnIdle() {
-    for (POSITION at = GetFirstDocPosition(); at != nullptr;) {
+    for (POSITION at = GetFirstDocPosition(); at;) {
         GetNextDoc(at)->OnIdle();
     }
 }

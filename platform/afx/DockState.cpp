@@ -17,7 +17,7 @@ constexpr int kMostBars = AFX_IDW_CONTROLBAR_LAST - AFX_IDW_CONTROLBAR_FIRST + 1
 
 std::optional<int> readNumber(const CString& section, LPCSTR entry) {
     CWinApp* app = AfxGetApp();
-    const CString text = app != nullptr ? app->GetProfileStringA(section, entry) : CString();
+    const CString text = app ? app->GetProfileStringA(section, entry) : CString();
     const char* begin = text.GetString();
     const char* end = begin + text.GetLength();
     int number = 0;
@@ -27,7 +27,7 @@ std::optional<int> readNumber(const CString& section, LPCSTR entry) {
 
 bool writeNumber(const CString& section, LPCSTR entry, int number) {
     CWinApp* app = AfxGetApp();
-    return app != nullptr && app->WriteProfileStringA(section, entry, std::to_string(number).c_str());
+    return app && app->WriteProfileStringA(section, entry, std::to_string(number).c_str());
 }
 
 CString barSection(LPCSTR profileName, int index) {

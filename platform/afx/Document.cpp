@@ -20,7 +20,7 @@ END_MESSAGE_MAP()
 
 CDocument::~CDocument() {
     disconnectViews();
-    if (m_pDocTemplate != nullptr) {
+    if (m_pDocTemplate) {
         m_pDocTemplate->RemoveDocument(this);
     }
 }
@@ -96,8 +96,8 @@ void CDocument::SendInitialUpdate() {
 std::vector<CFrameWnd*> CDocument::frames() const {
     std::vector<CFrameWnd*> all;
     for (const CView* view : m_views) {
-        CFrameWnd* frame = view->m_hWnd != nullptr ? view->GetParentFrame() : nullptr;
-        if (frame != nullptr && std::find(all.begin(), all.end(), frame) == all.end()) {
+        CFrameWnd* frame = view->m_hWnd ? view->GetParentFrame() : nullptr;
+        if (frame && std::find(all.begin(), all.end(), frame) == all.end()) {
             all.push_back(frame);
         }
     }
@@ -145,7 +145,7 @@ void serialize(CDocument& document, CFile& file, UINT mode) {
 BOOL CDocument::OnOpenDocument(LPCSTR path) {
     CFileException error;
     CFile* file = GetFile(path, CFile::modeRead | CFile::shareDenyWrite, &error);
-    if (file == nullptr) {
+    if (!file) {
         ReportSaveLoadException(path, &error, FALSE, AFX_IDP_FAILED_TO_OPEN_DOC);
         return FALSE;
     }
@@ -175,7 +175,7 @@ BOOL CDocument::OnOpenDocument(LPCSTR path) {
 BOOL CDocument::OnSaveDocument(LPCSTR path) {
     CFileException error;
     CFile* file = GetFile(path, CFile::modeCreate | CFile::modeReadWrite | CFile::shareExclusive, &error);
-    if (file == nullptr) {
+    if (!file) {
         ReportSaveLoadException(path, &error, TRUE, AFX_IDP_INVALID_FILENAME);
         return FALSE;
     }
@@ -201,8 +201,8 @@ void CDocument::OnCloseDocument() {
     const BOOL autoDelete = std::exchange(m_bAutoDelete, FALSE); // the last view's end must not delete it meanwhile
     while (!m_views.empty()) {
         CView* view = m_views.front();
-        CFrameWnd* frame = view->m_hWnd != nullptr ? view->GetParentFrame() : nullptr;
-        if (frame != nullptr) {
+        CFrameWnd* frame = view->m_hWnd ? view->GetParentFrame() : nullptr;
+        if (frame) {
             PreCloseFrame(frame);
             frame->DestroyWindow();
         }
@@ -243,21 +243,21 @@ UINT messageOf(const CException& error, BOOL saving) {
     if (const auto* file = dynamic_cast<const CFileException*>(&error)) {
         return messageOf(*file, saving);
     }
-    return dynamic_cast<const CArchiveException*>(&error) != nullptr ? AFX_IDP_FAILED_INVALID_FORMAT : 0;
+    return dynamic_cast<const CArchiveException*>(&error) ? AFX_IDP_FAILED_INVALID_FORMAT : 0;
 }
 
 } // namespace
 
 void CDocument::ReportSaveLoadException(LPCSTR path, CException* error, BOOL saving, UINT fallback) {
-    if (error != nullptr && error->IsKindOf(RUNTIME_CLASS(CUserException))) {
+    if (error && error->IsKindOf(RUNTIME_CLASS(CUserException))) {
         return; // the user knows already
     }
-    const UINT id = error != nullptr ? messageOf(*error, saving) : 0;
+    const UINT id = error ? messageOf(*error, saving) : 0;
     CString text;
     char description[512] = "";
     if (id != 0) {
         AfxFormatString1(text, id, path);
-    } else if (error != nullptr && error->GetErrorMessage(description, sizeof(description))) {
+    } else if (error && error->GetErrorMessage(description, sizeof(description))) {
         text = description;
     } else {
         AfxFormatString1(text, fallback, path);
@@ -316,17 +316,17 @@ bool CDocument::askForPath(CString& path, BOOL replace) {
             path = path.Left(unfit);
         }
         CString extension;
-        if (docTemplate != nullptr && docTemplate->GetDocString(extension, CDocTemplate::filterExt)) {
+        if (docTemplate && docTemplate->GetDocString(extension, CDocTemplate::filterExt)) {
             path += extension;
         }
     }
     CWinApp* app = AfxGetApp();
-    return app != nullptr && app->DoPromptFileName(path, replace ? AFX_IDS_SAVEFILE : AFX_IDS_SAVEFILECOPY,
-                                                   OFN_HIDEREADONLY | OFN_PATHMUSTEXIST, FALSE, docTemplate);
+    return app && app->DoPromptFileName(path, replace ? AFX_IDS_SAVEFILE : AFX_IDS_SAVEFILECOPY,
+                                        OFN_HIDEREADONLY | OFN_PATHMUSTEXIST, FALSE, docTemplate);
 }
 
 BOOL CDocument::DoSave(LPCSTR path, BOOL replace) {
-    CString name(path != nullptr ? path : "");
+    CString name(path ? path : "");
     if (name.IsEmpty() && !askForPath(name, replace)) {
         return FALSE;
     }
@@ -345,7 +345,7 @@ BOOL CDocument::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* inf
     if (CCmdTarget::OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
-    return m_pDocTemplate != nullptr ? m_pDocTemplate->OnCmdMsg(id, code, extra, info) : FALSE;
+    return m_pDocTemplate ? m_pDocTemplate->OnCmdMsg(id, code, extra, info) : FALSE;
 }
 
 void CDocument::OnFileSave() {

@@ -8,7 +8,7 @@
 CFile* CDocument::GetFile(LPCSTR fileName, UINT openFlags, CFileException* error) {
     auto file = std::make_unique<tvx::afx::MirrorFile>();
     CFileException ignored;
-    return file->Open(fileName, openFlags, error != nullptr ? error : &ignored) ? file.release() : nullptr;
+    return file->Open(fileName, openFlags, error ? error : &ignored) ? file.release() : nullptr;
 }
 
 void CDocument::ReleaseFile(CFile* file, BOOL abort) {

@@ -49,7 +49,7 @@ UINT DragQueryFileA(HDROP drop, UINT index, LPSTR buffer, UINT size) {
         return 0;
     }
     const std::string& name = (*names)[index];
-    if (buffer == nullptr || size == 0) {
+    if (!buffer || size == 0) {
         return static_cast<UINT>(name.size());
     }
     const std::size_t length = tvx::text::characterStart(name, std::min<std::size_t>(name.size(), size - 1));

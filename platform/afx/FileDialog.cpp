@@ -20,18 +20,18 @@ IMPLEMENT_DYNAMIC(CFileDialog, CWnd)
 
 CFileDialog::CFileDialog(BOOL openDialog, LPCSTR defaultExtension, LPCSTR fileName, DWORD flags, LPCSTR filter,
                          CWnd* parent, DWORD)
-    : m_bOpenFileDialog(openDialog), m_defaultExtension(defaultExtension != nullptr ? defaultExtension : "") {
+    : m_bOpenFileDialog(openDialog), m_defaultExtension(defaultExtension ? defaultExtension : "") {
     m_ofn.lStructSize = sizeof(m_ofn);
     m_ofn.Flags = flags;
-    m_ofn.hwndOwner = parent != nullptr ? parent->m_hWnd : nullptr;
+    m_ofn.hwndOwner = parent ? parent->m_hWnd : nullptr;
     m_ofn.lpstrFile = m_fileName;
     m_ofn.nMaxFile = sizeof(m_fileName);
     m_ofn.nFilterIndex = 1;
-    m_ofn.lpstrDefExt = defaultExtension != nullptr ? m_defaultExtension.GetString() : nullptr;
-    if (fileName != nullptr) {
+    m_ofn.lpstrDefExt = defaultExtension ? m_defaultExtension.GetString() : nullptr;
+    if (fileName) {
         std::strncpy(m_fileName, fileName, sizeof(m_fileName) - 1);
     }
-    if (filter != nullptr) {
+    if (filter) {
         m_filter = filter;
         m_filter.Replace('|', '\0');
         m_ofn.lpstrFilter = m_filter.GetString();
@@ -49,7 +49,7 @@ namespace {
 /// A filter as the toolkit writes it: "Boards (*.brd) (*.brd)"; the pattern "*.*" means all files.
 QStringList filtersOf(LPCSTR text) {
     QStringList filters;
-    while (text != nullptr && *text != '\0') {
+    while (text && *text != '\0') {
         const QString description = toQt(text);
         text += std::strlen(text) + 1;
         QString patterns = toQt(text);
@@ -107,7 +107,7 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
                                            : QFileDialog::ExistingFile);
     labelDialog(dialog, open);
     dialog.setOption(QFileDialog::DontConfirmOverwrite, (record.Flags & OFN_OVERWRITEPROMPT) == 0);
-    if (record.lpstrTitle != nullptr) {
+    if (record.lpstrTitle) {
         dialog.setWindowTitle(toQt(record.lpstrTitle));
     }
     const QStringList filters = filtersOf(record.lpstrFilter);
@@ -116,13 +116,13 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
     if (chosen >= 0 && chosen < filters.size()) {
         dialog.selectNameFilter(filters[chosen]);
     }
-    if (record.lpstrDefExt != nullptr) {
+    if (record.lpstrDefExt) {
         dialog.setDefaultSuffix(toQt(record.lpstrDefExt));
     }
-    if (record.lpstrInitialDir != nullptr && *record.lpstrInitialDir != '\0') {
+    if (record.lpstrInitialDir && *record.lpstrInitialDir != '\0') {
         dialog.setDirectory(QString::fromStdString(tvx::systemPath(record.lpstrInitialDir).value_or("")));
     }
-    const CString name(record.lpstrFile != nullptr ? record.lpstrFile : "");
+    const CString name(record.lpstrFile ? record.lpstrFile : "");
     if (!name.IsEmpty()) {
         const auto path = tvx::systemPath(name.GetString(), tvx::PathUse::creating).value_or(name.GetString());
         const QFileInfo info(QString::fromStdString(path));
@@ -145,9 +145,9 @@ INT_PTR CFileDialog::DoModal() {
         return IDCANCEL;
     }
     const CWnd* main = AfxGetMainWnd();
-    const HWND owner = m_ofn.hwndOwner != nullptr || main == nullptr ? m_ofn.hwndOwner : main->m_hWnd;
+    const HWND owner = m_ofn.hwndOwner || !main ? m_ofn.hwndOwner : main->m_hWnd;
     Window* over = Window::from(owner);
-    Dialog dialog(over != nullptr ? over->topLevel()->widget() : nullptr);
+    Dialog dialog(over ? over->topLevel()->widget() : nullptr);
     fillDialog(dialog, m_ofn, m_bOpenFileDialog != FALSE);
     dialog.isAccepted = [this, &dialog] {
         const auto filters = dialog.nameFilters();
@@ -164,7 +164,7 @@ void CFileDialog::takeAnswer(const Answer& answer) {
     }
     m_ofn.nFilterIndex = static_cast<DWORD>(answer.filter + 1);
     const CString path = GetPathName();
-    if (m_ofn.lpstrFile != nullptr && m_ofn.nMaxFile > static_cast<DWORD>(path.GetLength())) {
+    if (m_ofn.lpstrFile && m_ofn.nMaxFile > static_cast<DWORD>(path.GetLength())) {
         std::memcpy(m_ofn.lpstrFile, path.GetString(), static_cast<std::size_t>(path.GetLength()) + 1);
     }
     const CString name = lastPart(path);
@@ -174,7 +174,7 @@ void CFileDialog::takeAnswer(const Answer& answer) {
 }
 
 CString CFileDialog::GetPathName() const {
-    return m_paths.empty() ? CString(m_ofn.lpstrFile != nullptr ? m_ofn.lpstrFile : "") : m_paths.front();
+    return m_paths.empty() ? CString(m_ofn.lpstrFile ? m_ofn.lpstrFile : "") : m_paths.front();
 }
 
 CString CFileDialog::GetFileName() const {

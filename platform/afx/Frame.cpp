@@ -73,7 +73,7 @@ void CFrameWnd::UpdateAllFrames(const CWnd* except) {
     for (CFrameWnd* frame : frames) {
         const bool living = std::find(allFrames().begin(), allFrames().end(), frame) != allFrames().end();
         // Child frames are descendants of a frame that is updated itself.
-        if (!living || frame == except || frame->m_hWnd == nullptr || (frame->GetStyle() & WS_CHILD) != 0 ||
+        if (!living || frame == except || !frame->m_hWnd || (frame->GetStyle() & WS_CHILD) != 0 ||
             !frame->IsWindowVisible()) {
             continue;
         }
@@ -94,7 +94,7 @@ HICON CFrameWnd::LoadFrameIcon(UINT id) const {
 }
 
 BOOL CFrameWnd::PreCreateWindow(CREATESTRUCT& cs) {
-    if (cs.lpszClass == nullptr) {
+    if (!cs.lpszClass) {
         cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, ::LoadCursorA(nullptr, IDC_ARROW));
     }
     if ((cs.style & FWS_ADDTOTITLE) != 0) {
@@ -117,7 +117,7 @@ BOOL CFrameWnd::LoadFrame(UINT id, DWORD style, CWnd* parent, CCreateContext* co
     }
     m_hMenuDefault = ::GetMenu(m_hWnd);
     LoadAccelTable(MAKEINTRESOURCE(id));
-    if (context == nullptr) {
+    if (!context) {
         SendMessageToDescendants(WM_INITIALUPDATE, 0, 0, TRUE, TRUE);
     }
     return TRUE;
@@ -126,22 +126,22 @@ BOOL CFrameWnd::LoadFrame(UINT id, DWORD style, CWnd* parent, CCreateContext* co
 BOOL CFrameWnd::Create(LPCSTR className, LPCSTR title, DWORD style, const RECT& rect, CWnd* parent, LPCSTR menuName,
                        DWORD exStyle, CCreateContext* context) {
     HMENU menu = nullptr;
-    if (menuName != nullptr) {
+    if (menuName) {
         menu = ::LoadMenuA(AfxFindResourceHandle(menuName, RT_MENU), menuName);
-        if (menu == nullptr) {
+        if (!menu) {
             PostNcDestroy();
             return FALSE;
         }
     }
-    m_strTitle = title != nullptr ? title : "";
+    m_strTitle = title ? title : "";
     const bool ownPlace = rect.left != CW_USEDEFAULT;
     return CreateEx(
         exStyle, className, m_strTitle, style, rect.left, rect.top, ownPlace ? rect.right - rect.left : CW_USEDEFAULT,
-        ownPlace ? rect.bottom - rect.top : CW_USEDEFAULT, parent != nullptr ? parent->m_hWnd : nullptr, menu, context);
+        ownPlace ? rect.bottom - rect.top : CW_USEDEFAULT, parent ? parent->m_hWnd : nullptr, menu, context);
 }
 
 BOOL CFrameWnd::LoadAccelTable(LPCSTR name) {
-    if (m_hAccelTable != nullptr) {
+    if (m_hAccelTable) {
         return FALSE;
     }
     m_hAccelTable = ::LoadAcceleratorsA(AfxFindResourceHandle(name, RT_ACCELERATOR), name);
@@ -163,15 +163,15 @@ int CFrameWnd::OnCreateHelper(CREATESTRUCT* cs, CCreateContext* context) {
 }
 
 BOOL CFrameWnd::OnCreateClient(CREATESTRUCT*, CCreateContext* context) {
-    if (context != nullptr && context->m_pNewViewClass != nullptr) {
-        return CreateView(context, AFX_IDW_PANE_FIRST) != nullptr ? TRUE : FALSE;
+    if (context && context->m_pNewViewClass) {
+        return CreateView(context, AFX_IDW_PANE_FIRST) ? TRUE : FALSE;
     }
     return TRUE;
 }
 
 CWnd* CFrameWnd::CreateView(CCreateContext* context, UINT id) {
     auto* view = DYNAMIC_DOWNCAST(CWnd, context->m_pNewViewClass->CreateObject());
-    if (view == nullptr) {
+    if (!view) {
         return nullptr;
     }
     // A view that could not be created has deleted itself.
@@ -182,28 +182,28 @@ CWnd* CFrameWnd::CreateView(CCreateContext* context, UINT id) {
 
 void CFrameWnd::InitialUpdateFrame(CDocument* document, BOOL makeVisible) {
     CView* view = GetActiveView();
-    if (view == nullptr) {
+    if (!view) {
         view = DYNAMIC_DOWNCAST(CView, GetDescendantWindow(AFX_IDW_PANE_FIRST, TRUE));
-        if (view != nullptr) {
+        if (view) {
             SetActiveView(view, FALSE);
         }
     }
     if (makeVisible) {
         SendMessageToDescendants(WM_INITIALUPDATE, 0, 0, TRUE, TRUE);
-        if (view != nullptr) {
+        if (view) {
             view->OnActivateFrame(WA_INACTIVE, this);
         }
         int command = -1;
         CWinApp* app = AfxGetApp();
-        if (app != nullptr && app->m_pMainWnd == this) {
+        if (app && app->m_pMainWnd == this) {
             command = std::exchange(app->m_nCmdShow, -1); // only the first showing follows the start's wish
         }
         ActivateFrame(command);
-        if (view != nullptr) {
+        if (view) {
             view->OnActivateView(TRUE, view, view);
         }
     }
-    if (document != nullptr) {
+    if (document) {
         document->UpdateFrameCounts();
     }
     OnUpdateFrameTitle(TRUE);
@@ -215,7 +215,7 @@ void CFrameWnd::PostNcDestroy() {
 
 void CFrameWnd::OnDestroy() {
     // The menu of the document type is not the window's to destroy.
-    if (m_hMenuDefault != nullptr && ::GetMenu(m_hWnd) != m_hMenuDefault) {
+    if (m_hMenuDefault && ::GetMenu(m_hWnd) != m_hMenuDefault) {
         ::SetMenu(m_hWnd, m_hMenuDefault);
     }
     CWnd::OnDestroy();
@@ -232,21 +232,21 @@ void CFrameWnd::SetActiveView(CView* view, BOOL notify) {
         return;
     }
     CView* old = std::exchange(m_pViewActive, nullptr); // so that the old one's handler does not come back here
-    if (old != nullptr) {
+    if (old) {
         old->OnActivateView(FALSE, view, old);
     }
-    if (m_pViewActive != nullptr) {
+    if (m_pViewActive) {
         return; // the handler has chosen another one
     }
     m_pViewActive = view;
-    if (view != nullptr && notify) {
+    if (view && notify) {
         view->OnActivateView(TRUE, view, old);
     }
 }
 
 CDocument* CFrameWnd::GetActiveDocument() {
     const CView* view = GetActiveView();
-    return view != nullptr ? view->GetDocument() : nullptr;
+    return view ? view->GetDocument() : nullptr;
 }
 
 CFrameWnd* CFrameWnd::GetActiveFrame() {
@@ -272,11 +272,11 @@ void CFrameWnd::OnUpdateFrameTitle(BOOL addToTitle) {
         return;
     }
     const CDocument* document = GetActiveDocument();
-    UpdateFrameTitleForDocument(addToTitle && document != nullptr ? document->GetTitle().GetString() : nullptr);
+    UpdateFrameTitleForDocument(addToTitle && document ? document->GetTitle().GetString() : nullptr);
 }
 
 void CFrameWnd::UpdateFrameTitleForDocument(LPCSTR documentName) {
-    CString name(documentName != nullptr ? documentName : "");
+    CString name(documentName ? documentName : "");
     if (!name.IsEmpty() && m_nWindow > 0) {
         name.AppendFormat(":%d", m_nWindow);
     }
@@ -293,7 +293,7 @@ void CFrameWnd::UpdateFrameTitleForDocument(LPCSTR documentName) {
 }
 
 void CFrameWnd::OnUpdateFrameMenu(HMENU alternative) {
-    if (alternative == nullptr) {
+    if (!alternative) {
         alternative = m_hMenuDefault;
     }
     if (::GetMenu(m_hWnd) != alternative) {
@@ -312,21 +312,19 @@ BOOL CFrameWnd::PreTranslateMessage(MSG* message) {
         return CWnd::PreTranslateMessage(message);
     }
     const HACCEL accelerators = GetDefaultAccelerator();
-    return accelerators != nullptr && !menuHasKeyboard() && ::TranslateAcceleratorA(m_hWnd, accelerators, message)
-               ? TRUE
-               : FALSE;
+    return accelerators && !menuHasKeyboard() && ::TranslateAcceleratorA(m_hWnd, accelerators, message) ? TRUE : FALSE;
 }
 
 BOOL CFrameWnd::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {
     CView* view = GetActiveView();
-    if (view != nullptr && view->OnCmdMsg(id, code, extra, info)) {
+    if (view && view->OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
     if (CWnd::OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
     CWinApp* app = AfxGetApp();
-    return app != nullptr ? app->OnCmdMsg(id, code, extra, info) : FALSE;
+    return app ? app->OnCmdMsg(id, code, extra, info) : FALSE;
 }
 
 BOOL CFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
@@ -335,10 +333,10 @@ BOOL CFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
 
 bool CFrameWnd::closeDocument() {
     CDocument* document = GetActiveDocument();
-    if (document == nullptr || !document->m_bAutoDelete) {
+    if (!document || !document->m_bAutoDelete) {
         return false;
     }
-    for (POSITION at = document->GetFirstViewPosition(); at != nullptr;) {
+    for (POSITION at = document->GetFirstViewPosition(); at;) {
         const CView* view = document->GetNextView(at);
         if (view->GetParentFrame() != this) {
             document->PreCloseFrame(this);
@@ -351,12 +349,12 @@ bool CFrameWnd::closeDocument() {
 
 void CFrameWnd::OnClose() {
     CDocument* document = GetActiveDocument();
-    if (document != nullptr && !document->CanCloseFrame(this)) {
+    if (document && !document->CanCloseFrame(this)) {
         return;
     }
     CWinApp* app = AfxGetApp();
-    if (app != nullptr && app->m_pMainWnd == this) {
-        if (document == nullptr && !app->SaveAllModified()) {
+    if (app && app->m_pMainWnd == this) {
+        if (!document && !app->SaveAllModified()) {
             return;
         }
         const HWND self = m_hWnd;
@@ -381,10 +379,10 @@ void CFrameWnd::OnSize(UINT type, int cx, int cy) {
 void CFrameWnd::OnActivate(UINT state, CWnd* other, BOOL minimized) {
     CWnd::OnActivate(state, other, minimized);
     CView* view = GetActiveView();
-    if (view == nullptr) {
+    if (!view) {
         view = GetActiveFrame()->GetActiveView();
     }
-    if (view == nullptr) {
+    if (!view) {
         return;
     }
     if (state != WA_INACTIVE && !minimized) {
@@ -398,7 +396,7 @@ BOOL CFrameWnd::OnNcActivate(BOOL active) {
 }
 
 void CFrameWnd::OnSetFocus(CWnd* previous) {
-    if (m_pViewActive != nullptr) {
+    if (m_pViewActive) {
         m_pViewActive->SetFocus();
     } else {
         CWnd::OnSetFocus(previous);
@@ -415,12 +413,12 @@ void CFrameWnd::OnEnterIdle(UINT reason, CWnd* who) {
 
 BOOL CFrameWnd::OnQueryEndSession() {
     CWinApp* app = AfxGetApp();
-    return app == nullptr || app->m_pMainWnd != this || app->SaveAllModified() ? TRUE : FALSE;
+    return !app || app->m_pMainWnd != this || app->SaveAllModified() ? TRUE : FALSE;
 }
 
 void CFrameWnd::OnEndSession(BOOL ending) {
     CWinApp* app = AfxGetApp();
-    if (ending && app != nullptr && app->m_pMainWnd == this) {
+    if (ending && app && app->m_pMainWnd == this) {
         app->CloseAllDocuments(TRUE);
         app->ExitInstance();
     }
@@ -428,13 +426,13 @@ void CFrameWnd::OnEndSession(BOOL ending) {
 
 BOOL CFrameWnd::OnEraseBkgnd(CDC* dc) {
     // The pane covers the client area, so painting below it would only flicker.
-    return m_pViewActive != nullptr ? TRUE : CWnd::OnEraseBkgnd(dc);
+    return m_pViewActive ? TRUE : CWnd::OnEraseBkgnd(dc);
 }
 
 BOOL CFrameWnd::forwardScroll(UINT message, UINT code, UINT position) {
     // Scroll bars of a frame's own belong to its view.
     CWnd* view = GetActiveView();
-    if (view == nullptr) {
+    if (!view) {
         return FALSE;
     }
     view->SendMessage(message, MAKEWPARAM(static_cast<int>(code), static_cast<int>(position)));

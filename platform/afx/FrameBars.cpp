@@ -22,7 +22,7 @@ void placePane(QMainWindow& main, QWidget* pane) {
     if (QWidget* old = main.takeCentralWidget()) {
         old->setParent(&main);
     }
-    if (pane != nullptr) {
+    if (pane) {
         main.setCentralWidget(pane);
     }
 }
@@ -65,9 +65,9 @@ QToolBar* barAt(const QMainWindow& main, Qt::ToolBarArea area, const QPoint& at,
 void CFrameWnd::addBar(CControlBar* bar) {
     m_bars.push_back(bar);
     const Window* state = GetState();
-    QMainWindow* main = state != nullptr ? mainWindowOf(*state) : nullptr;
-    QWidget* widget = bar->GetState() != nullptr ? bar->GetState()->widget() : nullptr;
-    if (main == nullptr) {
+    QMainWindow* main = state ? mainWindowOf(*state) : nullptr;
+    QWidget* widget = bar->GetState() ? bar->GetState()->widget() : nullptr;
+    if (!main) {
         return;
     }
     guarded([&] {
@@ -85,8 +85,8 @@ void CFrameWnd::removeBar(CControlBar* bar) {
 
 void CFrameWnd::RecalcLayout(BOOL) {
     Window* state = GetState();
-    QMainWindow* main = state != nullptr ? mainWindowOf(*state) : nullptr;
-    if (main == nullptr || state->isDestroyed()) {
+    QMainWindow* main = state ? mainWindowOf(*state) : nullptr;
+    if (!main || state->isDestroyed()) {
         return;
     }
     m_nIdleFlags &= ~UINT{idleLayout};
@@ -95,14 +95,14 @@ void CFrameWnd::RecalcLayout(BOOL) {
             const bool show = std::exchange(bar->m_delayed, CControlBar::Delayed::None) == CControlBar::Delayed::Show;
             bar->ShowWindow(show ? SW_SHOWNA : SW_HIDE);
         }
-        auto* tools = bar->GetState() != nullptr ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
-        if (tools != nullptr && (bar->GetStyle() & WS_VISIBLE) != 0) {
+        auto* tools = bar->GetState() ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
+        if (tools && (bar->GetStyle() & WS_VISIBLE) != 0) {
             guarded([tools] { showFloating(*tools); });
         }
     }
     const Window* pane = state->child(AFX_IDW_PANE_FIRST);
     guarded([&] {
-        placePane(*main, pane != nullptr ? pane->widget() : nullptr);
+        placePane(*main, pane ? pane->widget() : nullptr);
         main->layout()->activate();
     });
     if (Window* still = Window::from(m_hWnd); still == state) {
@@ -118,9 +118,9 @@ void CFrameWnd::EnableDocking(DWORD sides) {
 
 void CFrameWnd::DockControlBar(CControlBar* bar, UINT side, const RECT* rect) {
     const Window* state = GetState();
-    QMainWindow* main = state != nullptr ? mainWindowOf(*state) : nullptr;
-    auto* tools = bar->GetState() != nullptr ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
-    if (main == nullptr || tools == nullptr) {
+    QMainWindow* main = state ? mainWindowOf(*state) : nullptr;
+    auto* tools = bar->GetState() ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
+    if (!main || !tools) {
         return;
     }
     const DWORD allowed = m_dockSides & bar->GetDockSides();
@@ -134,8 +134,8 @@ void CFrameWnd::DockControlBar(CControlBar* bar, UINT side, const RECT* rect) {
         tools->setAllowedAreas(areasOf(allowed));
         tools->setMovable(true);
         const bool shown = !tools->isHidden();
-        QToolBar* before = rect != nullptr ? barAt(*main, area, QPoint(rect->left, rect->top), tools) : nullptr;
-        if (before != nullptr) {
+        QToolBar* before = rect ? barAt(*main, area, QPoint(rect->left, rect->top), tools) : nullptr;
+        if (before) {
             main->insertToolBar(before, tools);
         } else {
             main->addToolBar(area, tools);
@@ -146,8 +146,8 @@ void CFrameWnd::DockControlBar(CControlBar* bar, UINT side, const RECT* rect) {
 }
 
 void CFrameWnd::FloatControlBar(CControlBar* bar, CPoint point, DWORD) {
-    auto* tools = bar->GetState() != nullptr ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
-    if (tools == nullptr) {
+    auto* tools = bar->GetState() ? qobject_cast<QToolBar*>(bar->GetState()->widget()) : nullptr;
+    if (!tools) {
         return;
     }
     guarded([&] {
@@ -179,7 +179,7 @@ CControlBar* CFrameWnd::GetControlBar(UINT id) {
 
 void CFrameWnd::OnUpdateControlBarMenu(CCmdUI* item) {
     const CControlBar* bar = GetControlBar(item->m_nID);
-    if (bar == nullptr) {
+    if (!bar) {
         item->ContinueRouting();
         return;
     }
@@ -189,7 +189,7 @@ void CFrameWnd::OnUpdateControlBarMenu(CCmdUI* item) {
 
 BOOL CFrameWnd::OnBarCheck(UINT id) {
     CControlBar* bar = GetControlBar(id);
-    if (bar == nullptr) {
+    if (!bar) {
         return FALSE;
     }
     ShowControlBar(bar, !bar->IsVisible(), FALSE);

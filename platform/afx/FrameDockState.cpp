@@ -30,7 +30,7 @@ struct DockPlace {
 };
 
 QToolBar* toolsOf(const CControlBar& bar) {
-    return bar.GetState() != nullptr ? qobject_cast<QToolBar*>(bar.GetState()->widget()) : nullptr;
+    return bar.GetState() ? qobject_cast<QToolBar*>(bar.GetState()->widget()) : nullptr;
 }
 
 /// All tool bars side by side and row by row, as the toolkit's layout has them.
@@ -38,7 +38,7 @@ std::vector<DockPlace> dockPlaces(const QMainWindow& main) {
     std::vector<DockPlace> places;
     for (int i = 0; const QLayoutItem* item = main.layout()->itemAt(i); ++i) {
         auto* bar = qobject_cast<QToolBar*>(item->widget());
-        if (bar == nullptr) {
+        if (!bar) {
             continue;
         }
         DockPlace next{bar, dockBarOf(main.toolBarArea(bar)), 0, 0};
@@ -79,8 +79,8 @@ std::vector<const CControlBarInfo*> ownRecords(CFrameWnd& frame, const CDockStat
     std::vector<const CControlBar*> seen;
     for (INT_PTR i = 0; i < state.m_arrBarInfo.GetSize(); ++i) {
         const auto* info = static_cast<const CControlBarInfo*>(state.m_arrBarInfo[i]);
-        const CControlBar* bar = info != nullptr ? frame.GetControlBar(info->m_nBarID) : nullptr;
-        if (bar != nullptr && std::find(seen.begin(), seen.end(), bar) == seen.end()) {
+        const CControlBar* bar = info ? frame.GetControlBar(info->m_nBarID) : nullptr;
+        if (bar && std::find(seen.begin(), seen.end(), bar) == seen.end()) {
             records.push_back(info);
             seen.push_back(bar);
         }
@@ -93,8 +93,8 @@ std::vector<const CControlBarInfo*> ownRecords(CFrameWnd& frame, const CDockStat
 void CFrameWnd::GetDockState(CDockState& state) const {
     state.Clear();
     const Window* window = GetState();
-    const QMainWindow* main = window != nullptr ? mainWindowOf(*window) : nullptr;
-    const auto places = main != nullptr ? dockPlaces(*main) : std::vector<DockPlace>();
+    const QMainWindow* main = window ? mainWindowOf(*window) : nullptr;
+    const auto places = main ? dockPlaces(*main) : std::vector<DockPlace>();
     for (CControlBar* bar : m_bars) {
         auto info = std::make_unique<CControlBarInfo>();
         info->m_pBar = bar;
@@ -121,11 +121,11 @@ void CFrameWnd::SetDockState(const CDockState& state) {
     dockBars(records);
     for (const CControlBarInfo* info : records) {
         CControlBar* bar = GetControlBar(info->m_nBarID);
-        if (bar == nullptr) {
+        if (!bar) {
             continue; // a handler of the ones before has ended it
         }
         const QToolBar* tools = toolsOf(*bar);
-        if (tools != nullptr && info->m_bFloating && bar->m_dockable) {
+        if (tools && info->m_bFloating && bar->m_dockable) {
             const QRect place =
                 reachableFrame(QRect(QPoint(info->m_pointPos.x, info->m_pointPos.y), tools->sizeHint()));
             FloatControlBar(bar, CPoint(place.x(), place.y()));
@@ -138,8 +138,8 @@ void CFrameWnd::SetDockState(const CDockState& state) {
 void CFrameWnd::dockBars(const std::vector<const CControlBarInfo*>& records) {
     constexpr int behindAll = std::numeric_limits<int>::max() / 2;
     const Window* window = GetState();
-    QMainWindow* main = window != nullptr ? mainWindowOf(*window) : nullptr;
-    if (main == nullptr) {
+    QMainWindow* main = window ? mainWindowOf(*window) : nullptr;
+    if (!main) {
         return;
     }
     auto places = dockPlaces(*main);

@@ -10,7 +10,7 @@ void CFrameWnd::OnInitMenu(CMenu* menu) {
 
 void CFrameWnd::OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu) {
     CWnd::OnInitMenuPopup(popup, index, systemMenu);
-    if (!systemMenu && popup != nullptr) {
+    if (!systemMenu && popup) {
         updateMenuItems(*popup);
     }
 }
@@ -20,7 +20,7 @@ namespace {
 /// The popup's item in the menu bar, for handlers that look at it.
 CMenu* parentOf(const CWnd& frame, const CMenu& popup) {
     CMenu* bar = frame.GetMenu();
-    const int count = bar != nullptr ? static_cast<int>(bar->GetMenuItemCount()) : 0;
+    const int count = bar ? static_cast<int>(bar->GetMenuItemCount()) : 0;
     for (int i = 0; i < count; ++i) {
         if (::GetSubMenu(bar->m_hMenu, i) == popup.m_hMenu) {
             return bar;
@@ -43,7 +43,7 @@ void CFrameWnd::updateMenuItems(CMenu& popup) {
         if (element.m_nID == static_cast<UINT>(-1)) {
             // A popup goes under the name of its first command.
             element.m_pSubMenu = popup.GetSubMenu(position);
-            element.m_nID = element.m_pSubMenu != nullptr ? element.m_pSubMenu->GetMenuItemID(0) : 0;
+            element.m_nID = element.m_pSubMenu ? element.m_pSubMenu->GetMenuItemID(0) : 0;
             if (element.m_nID == 0 || element.m_nID == static_cast<UINT>(-1)) {
                 continue;
             }

@@ -47,10 +47,12 @@ CGdiObject::~CGdiObject() {
 
 CGdiObject* CGdiObject::FromHandle(HGDIOBJ object) {
     const DWORD type = ::GetObjectType(object);
-    if (type == 0)
+    if (type == 0) {
         return nullptr;
-    if (CGdiObject* known = objectMap().find(object))
+    }
+    if (CGdiObject* known = objectMap().find(object)) {
         return known;
+    }
     auto wrapper = makeWrapper(type);
     wrapper->m_hObject = object;
     return objectMap().addTemporary(object, std::move(wrapper));
@@ -61,16 +63,18 @@ void CGdiObject::DeleteTempMap() {
 }
 
 BOOL CGdiObject::Attach(HGDIOBJ object) {
-    if (m_hObject || ::GetObjectType(object) == 0)
+    if (m_hObject || ::GetObjectType(object) == 0) {
         return FALSE;
+    }
     m_hObject = object;
     objectMap().addPermanent(object, *this);
     return TRUE;
 }
 
 HGDIOBJ CGdiObject::Detach() {
-    if (m_hObject)
+    if (m_hObject) {
         objectMap().removePermanent(m_hObject, *this);
+    }
     return std::exchange(m_hObject, nullptr);
 }
 
@@ -140,8 +144,9 @@ BOOL CPen::GetLogPen(LOGPEN* description) const {
 }
 
 HPEN CreatePen(int style, int width, COLORREF color) {
-    if (style < PS_SOLID || style > PS_INSIDEFRAME)
+    if (style < PS_SOLID || style > PS_INSIDEFRAME) {
         style = PS_SOLID;
+    }
     const LOGPEN description = {static_cast<UINT>(style), {std::abs(width), 0}, color};
     return static_cast<HPEN>(addGdiObject(PenObject{description}));
 }
@@ -165,8 +170,9 @@ BOOL CBrush::CreateSolidBrush(COLORREF color) {
 }
 
 BOOL CBrush::CreateHatchBrush(int hatch, COLORREF color) {
-    if (hatch < HS_HORIZONTAL || hatch > HS_DIAGCROSS)
+    if (hatch < HS_HORIZONTAL || hatch > HS_DIAGCROSS) {
         return FALSE;
+    }
     BrushObject brush;
     brush.description = {static_cast<UINT>(BS_HATCHED), color, static_cast<UINT_PTR>(hatch)};
     return Attach(addGdiObject(std::move(brush)));
@@ -174,8 +180,9 @@ BOOL CBrush::CreateHatchBrush(int hatch, COLORREF color) {
 
 BOOL CBrush::CreatePatternBrush(CBitmap* bitmap) {
     const auto source = findTool<BitmapObject>(bitmap ? bitmap->m_hObject : nullptr);
-    if (!source)
+    if (!source) {
         return FALSE;
+    }
     BrushObject brush;
     brush.description = {static_cast<UINT>(BS_PATTERN), 0, reinterpret_cast<UINT_PTR>(source.handle)};
     brush.pattern = source->image.copy();
@@ -184,8 +191,9 @@ BOOL CBrush::CreatePatternBrush(CBitmap* bitmap) {
 }
 
 BOOL CBrush::CreateBrushIndirect(const LOGBRUSH* description) {
-    if (!description)
+    if (!description) {
         return FALSE;
+    }
     switch (description->lbStyle) {
     case BS_SOLID:
         return CreateSolidBrush(description->lbColor);
@@ -234,8 +242,9 @@ BOOL CFont::CreatePointFont(int pointSize, LPCSTR faceName, CDC* dc) {
 }
 
 BOOL CFont::CreatePointFontIndirect(const LOGFONT* description, CDC* dc) {
-    if (!description)
+    if (!description) {
         return FALSE;
+    }
     LOGFONT font = *description;
     const int pixels = scaled(description->lfHeight, kPixelsPerInch, 720);
     const auto context = findContext(dc ? dc->m_hDC : nullptr);
@@ -264,14 +273,16 @@ HFONT CreateFontA(int height, int width, int escapement, int orientation, int we
     font.lfClipPrecision = static_cast<BYTE>(clipPrecision);
     font.lfQuality = static_cast<BYTE>(quality);
     font.lfPitchAndFamily = static_cast<BYTE>(pitchAndFamily);
-    if (faceName)
+    if (faceName) {
         std::memcpy(font.lfFaceName, faceName, strnlen(faceName, LF_FACESIZE - 1));
+    }
     return CreateFontIndirectA(&font);
 }
 
 HFONT CreateFontIndirectA(const LOGFONTA* description) {
-    if (!description)
+    if (!description) {
         return nullptr;
+    }
     LOGFONTA font = *description;
     font.lfFaceName[LF_FACESIZE - 1] = '\0';
     return static_cast<HFONT>(addGdiObject(FontObject{font}));
@@ -282,10 +293,12 @@ HFONT CreateFontIndirectA(const LOGFONTA* description) {
 BOOL DeleteObject(HGDIOBJ object) {
     const auto number = reinterpret_cast<std::uintptr_t>(object);
     const auto found = gdiObjects().find(number);
-    if (!found)
+    if (!found) {
         return FALSE;
-    if (found->owner == GdiOwner::host)
+    }
+    if (found->owner == GdiOwner::host) {
         gdiObjects().take(number);
+    }
     return TRUE;
 }
 
@@ -298,8 +311,9 @@ namespace {
 
 template <class Record>
 int copyRecord(const Record& record, int count, LPVOID buffer) {
-    if (!buffer)
+    if (!buffer) {
         return sizeof(Record);
+    }
     const int copied = std::clamp(count, 0, static_cast<int>(sizeof(Record)));
     std::memcpy(buffer, &record, static_cast<std::size_t>(copied));
     return copied;

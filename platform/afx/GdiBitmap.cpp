@@ -29,8 +29,9 @@ void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {
     }
     std::fill_n(bytes, rowBytes(bitmap), BYTE{0});
     for (int x = 0; x < bitmap.image.width(); ++x) {
-        if (pixels[x] == kWhitePixel)
+        if (pixels[x] == kWhitePixel) {
             bytes[x / 8] |= static_cast<BYTE>(0x80 >> (x % 8));
+        }
     }
 }
 
@@ -48,21 +49,24 @@ void unpackRow(BitmapObject& bitmap, int y, const BYTE* bytes) {
 
 std::vector<BYTE> allBits(const BitmapObject& bitmap) {
     std::vector<BYTE> bits(rowBytes(bitmap) * static_cast<std::size_t>(bitmap.image.height()));
-    for (int y = 0; y < bitmap.image.height(); ++y)
+    for (int y = 0; y < bitmap.image.height(); ++y) {
         packRow(bitmap, y, bits.data() + static_cast<std::size_t>(y) * rowBytes(bitmap));
+    }
     return bits;
 }
 
 } // namespace
 
 HBITMAP CreateBitmap(int width, int height, UINT planes, UINT bitsPerPixel, LPCVOID bits) {
-    if (planes != 1 || (bitsPerPixel != 1 && bitsPerPixel != 32))
+    if (planes != 1 || (bitsPerPixel != 1 && bitsPerPixel != 32)) {
         return nullptr;
+    }
     const HBITMAP handle = addBitmap(width, height, bitsPerPixel == 1 ? PixelFormat::monochrome : PixelFormat::color);
     const auto bitmap = findTool<BitmapObject>(handle);
     if (bitmap && bits) {
-        for (int y = 0; y < height; ++y)
+        for (int y = 0; y < height; ++y) {
             unpackRow(*bitmap, y, static_cast<const BYTE*>(bits) + static_cast<std::size_t>(y) * rowBytes(*bitmap));
+        }
     }
     return handle;
 }
@@ -86,8 +90,9 @@ BOOL CBitmap::GetBitmap(BITMAP* description) const {
 
 DWORD CBitmap::GetBitmapBits(DWORD count, LPVOID bits) const {
     const auto bitmap = findTool<BitmapObject>(m_hObject);
-    if (!bitmap || !bits)
+    if (!bitmap || !bits) {
         return 0;
+    }
     const std::vector<BYTE> all = allBits(*bitmap);
     const std::size_t copied = std::min<std::size_t>(count, all.size());
     std::memcpy(bits, all.data(), copied);
@@ -96,13 +101,15 @@ DWORD CBitmap::GetBitmapBits(DWORD count, LPVOID bits) const {
 
 DWORD CBitmap::SetBitmapBits(DWORD count, LPCVOID bits) {
     const auto bitmap = findTool<BitmapObject>(m_hObject);
-    if (!bitmap || !bits)
+    if (!bitmap || !bits) {
         return 0;
+    }
     std::vector<BYTE> all = allBits(*bitmap);
     const std::size_t copied = std::min<std::size_t>(count, all.size());
     std::memcpy(all.data(), bits, copied);
-    for (int y = 0; y < bitmap->image.height(); ++y)
+    for (int y = 0; y < bitmap->image.height(); ++y) {
         unpackRow(*bitmap, y, all.data() + static_cast<std::size_t>(y) * rowBytes(*bitmap));
+    }
     return static_cast<DWORD>(copied);
 }
 

@@ -150,12 +150,15 @@ int fixedMetric(int index) {
 } // namespace
 
 int GetSystemMetrics(int index) {
-    if (const int fixed = fixedMetric(index))
+    if (const int fixed = fixedMetric(index)) {
         return fixed;
-    if (!tvx::afx::ensureGui())
+    }
+    if (!tvx::afx::ensureGui()) {
         return 0;
-    if (const int metric = frameMetric(index))
+    }
+    if (const int metric = frameMetric(index)) {
         return metric;
+    }
     const int metric = controlMetric(index);
     return metric ? metric : screenMetric(index);
 }

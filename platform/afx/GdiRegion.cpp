@@ -7,16 +7,18 @@
 using namespace tvx::afx;
 
 int tvx::afx::regionKind(const QRegion& region) {
-    if (region.isEmpty())
+    if (region.isEmpty()) {
         return NULLREGION;
+    }
     return region.rectCount() == 1 ? SIMPLEREGION : COMPLEXREGION;
 }
 
 QRegion tvx::afx::regionOf(const Spans& spans) {
     std::vector<QRect> rows;
     rows.reserve(spans.size());
-    for (const Span& span : spans)
+    for (const Span& span : spans) {
         rows.emplace_back(span.left, span.y, span.right - span.left, 1);
+    }
     QRegion region;
     region.setRects(rows.data(), static_cast<int>(rows.size()));
     return region;
@@ -73,11 +75,13 @@ BOOL CRgn::CreateEllipticRgn(int left, int top, int right, int bottom) {
 }
 
 BOOL CRgn::CreatePolygonRgn(const POINT* points, int count, int mode) {
-    if (!points || count < 2)
+    if (!points || count < 2) {
         return FALSE;
+    }
     QPolygonF polygon;
-    for (int i = 0; i < count; ++i)
+    for (int i = 0; i < count; ++i) {
         polygon << QPointF(points[i].x, points[i].y);
+    }
     const std::array polygons = {polygon};
     const FillRule rule = mode == WINDING ? FillRule::winding : FillRule::alternate;
     return Attach(
@@ -88,29 +92,33 @@ int CRgn::CombineRgn(const CRgn* first, const CRgn* second, int mode) {
     const auto target = findTool<RegionObject>(m_hObject);
     const auto left = findTool<RegionObject>(first ? first->m_hObject : nullptr);
     const auto right = findTool<RegionObject>(second ? second->m_hObject : nullptr);
-    if (!target || !left || (!right && mode != RGN_COPY))
+    if (!target || !left || (!right && mode != RGN_COPY)) {
         return RGN_ERROR;
+    }
     target->region = combined(left->region, right ? right->region : QRegion(), mode);
     return regionKind(target->region);
 }
 
 void CRgn::SetRectRgn(int left, int top, int right, int bottom) {
-    if (const auto own = findTool<RegionObject>(m_hObject))
+    if (const auto own = findTool<RegionObject>(m_hObject)) {
         own->region = ordered(left, top, right, bottom);
+    }
 }
 
 int CRgn::OffsetRgn(int x, int y) {
     const auto own = findTool<RegionObject>(m_hObject);
-    if (!own)
+    if (!own) {
         return RGN_ERROR;
+    }
     own->region.translate(x, y);
     return regionKind(own->region);
 }
 
 int CRgn::GetRgnBox(RECT* rect) const {
     const auto own = findTool<RegionObject>(m_hObject);
-    if (!own || !rect)
+    if (!own || !rect) {
         return RGN_ERROR;
+    }
     *rect = rectOf(own->region.boundingRect());
     return regionKind(own->region);
 }

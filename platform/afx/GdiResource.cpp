@@ -28,8 +28,9 @@ HBITMAP addPicture(const tvx::Picture& picture) {
 }
 
 std::size_t paletteBytes(const BITMAPINFOHEADER& header) {
-    if (header.biBitCount > 8)
+    if (header.biBitCount > 8) {
         return 0;
+    }
     const std::size_t colors = header.biClrUsed ? header.biClrUsed : std::size_t{1} << header.biBitCount;
     return colors * sizeof(RGBQUAD);
 }
@@ -52,27 +53,32 @@ bool understood(const BITMAPINFOHEADER& header) {
 
 HBITMAP CreateDIBitmap(HDC dc, const BITMAPINFOHEADER* header, DWORD initialise, LPCVOID bits, const BITMAPINFO* info,
                        UINT usage) {
-    if (!header || !understood(*header) || usage != DIB_RGB_COLORS || (dc && !findContext(dc)))
+    if (!header || !understood(*header) || usage != DIB_RGB_COLORS || (dc && !findContext(dc))) {
         return nullptr;
-    if ((initialise & CBM_INIT) == 0)
+    }
+    if ((initialise & CBM_INIT) == 0) {
         return addBitmap(header->biWidth, std::abs(header->biHeight), PixelFormat::color);
-    if (!bits || !info || !understood(info->bmiHeader))
+    }
+    if (!bits || !info || !understood(info->bmiHeader)) {
         return nullptr;
+    }
     const BITMAPINFOHEADER& layout = info->bmiHeader;
     const std::size_t head = sizeof(BITMAPINFOHEADER) + paletteBytes(layout);
     std::vector<std::uint8_t> packed(head + pixelBytes(layout));
     std::memcpy(packed.data(), info, head);
     std::memcpy(packed.data() + head, bits, packed.size() - head);
     auto picture = tvx::parseBitmap(packed);
-    if (!picture)
+    if (!picture) {
         return nullptr;
+    }
     picture->bitsPerPixel = 32;
     return addPicture(*picture);
 }
 
 HBITMAP LoadBitmapA(HINSTANCE module, LPCSTR name) {
-    if (!module)
+    if (!module) {
         module = AfxFindResourceHandle(name, RT_BITMAP);
+    }
     const auto picture = tvx::loadBitmapPicture(module, name);
     return picture ? addPicture(*picture) : nullptr;
 }
@@ -99,8 +105,9 @@ constexpr QStyle::StandardPixmap kPredefined[] = {
 
 HICON loadPredefined(LPCSTR name) {
     const std::size_t index = reinterpret_cast<std::uintptr_t>(name) - kFirstPredefined;
-    if (index >= std::size(kPredefined) || !ensureGui())
+    if (index >= std::size(kPredefined) || !ensureGui()) {
         return nullptr;
+    }
     const QIcon icon = QApplication::style()->standardIcon(kPredefined[index]);
     const int size = GetSystemMetrics(SM_CXICON);
     return addIcon(icon.pixmap(QSize(size, size), 1.0).toImage());
@@ -108,8 +115,9 @@ HICON loadPredefined(LPCSTR name) {
 
 HICON loadFromModule(HINSTANCE module, LPCSTR name) {
     const auto picture = tvx::loadIconPicture(module, name, GetSystemMetrics(SM_CXICON));
-    if (!picture)
+    if (!picture) {
         return nullptr;
+    }
     const QImage pixels(reinterpret_cast<const uchar*>(picture->pixels.data()), picture->width, picture->height,
                         picture->width * 4, QImage::Format_ARGB32);
     return addIcon(pixels.copy());
@@ -126,7 +134,8 @@ std::string keyOf(HINSTANCE module, LPCSTR name) {
 HICON LoadIconA(HINSTANCE module, LPCSTR name) {
     static auto& shared = *new std::map<std::string, HICON>;
     HICON& icon = shared[keyOf(module, name)];
-    if (iconImage(icon).isNull())
+    if (iconImage(icon).isNull()) {
         icon = module ? loadFromModule(module, name) : loadPredefined(name);
+    }
     return icon;
 }

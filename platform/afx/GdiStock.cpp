@@ -113,8 +113,9 @@ bool isSystemColor(int index) {
 } // namespace
 
 COLORREF GetSysColor(int index) {
-    if (!isSystemColor(index))
+    if (!isSystemColor(index)) {
         return 0;
+    }
     const PaletteColor& place = kSystemColors[index];
     const QColor color =
         (ensureGui() ? QApplication::palette() : QPalette(QColor(0xEF, 0xEF, 0xEF))).color(place.group, place.role);

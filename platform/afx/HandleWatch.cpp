@@ -139,7 +139,7 @@ bool tvx::postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT m
     for (const HANDLE handle : handles) {
         objects.push_back(win::objectOf(handle));
     }
-    if (Window::from(window) == nullptr || std::ranges::find(objects, nullptr) != objects.end()) {
+    if (!Window::from(window) || std::ranges::find(objects, nullptr) != objects.end()) {
         return false;
     }
     watchOf(window, message).arm(handles, std::move(objects));

@@ -56,7 +56,7 @@ bool Window::showClassCursor(WPARAM under) {
         return false;
     }
     cursorWindow = target;
-    if (classCursor != nullptr) {
+    if (classCursor) {
         SetCursor(classCursor);
     } else {
         shown = nullptr;
@@ -92,12 +92,12 @@ HCURSOR SetCursor(HCURSOR cursor) {
     const HCURSOR previous = shown;
     shown = cursor;
     QWidget* widget = peerOf(cursorWindow);
-    if (widget != nullptr && cursor != nullptr) {
+    if (widget && cursor) {
         const QCursor wanted = cursorOf(cursor);
         if (widget->cursor().shape() != wanted.shape() || !widget->testAttribute(Qt::WA_SetCursor)) {
             widget->setCursor(wanted);
         }
-    } else if (widget != nullptr) {
+    } else if (widget) {
         widget->setCursor(Qt::BlankCursor);
     }
     return previous;

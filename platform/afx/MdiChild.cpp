@@ -28,14 +28,14 @@ BOOL CMDIChildWnd::PreCreateWindow(CREATESTRUCT& cs) {
 
 BOOL CMDIChildWnd::Create(LPCSTR className, LPCSTR title, DWORD style, const RECT& rect, CMDIFrameWnd* parent,
                           CCreateContext* context) {
-    if (parent == nullptr) {
+    if (!parent) {
         parent = DYNAMIC_DOWNCAST(CMDIFrameWnd, AfxGetMainWnd());
     }
-    if (parent == nullptr) {
+    if (!parent) {
         PostNcDestroy();
         return FALSE;
     }
-    m_strTitle = title != nullptr ? title : "";
+    m_strTitle = title ? title : "";
     const bool ownPlace = rect.left != CW_USEDEFAULT;
     return CreateEx(0, className, m_strTitle, style | WS_CHILD, rect.left, rect.top,
                     ownPlace ? rect.right - rect.left : CW_USEDEFAULT,
@@ -44,11 +44,10 @@ BOOL CMDIChildWnd::Create(LPCSTR className, LPCSTR title, DWORD style, const REC
 
 BOOL CMDIChildWnd::LoadFrame(UINT id, DWORD style, CWnd* parent, CCreateContext* context) {
     m_nIDHelp = id;
-    const auto* docTemplate =
-        context != nullptr ? DYNAMIC_DOWNCAST(CMultiDocTemplate, context->m_pNewDocTemplate) : nullptr;
-    if (docTemplate != nullptr) {
+    const auto* docTemplate = context ? DYNAMIC_DOWNCAST(CMultiDocTemplate, context->m_pNewDocTemplate) : nullptr;
+    if (docTemplate) {
         SetHandles(docTemplate->m_hMenuShared, docTemplate->m_hAccelTable);
-    } else if (m_hMenuShared == nullptr) {
+    } else if (!m_hMenuShared) {
         const LPCSTR name = MAKEINTRESOURCE(id);
         m_hMenuShared = ::LoadMenuA(AfxFindResourceHandle(name, RT_MENU), name);
         m_ownMenu = m_hMenuShared != nullptr;
@@ -108,7 +107,7 @@ void CMDIChildWnd::OnDestroy() {
 void CMDIChildWnd::OnSize(UINT type, int cx, int cy) {
     CFrameWnd::OnSize(type, cx, cy);
     CMDIFrameWnd* frame = GetMDIFrame();
-    if (frame != nullptr && frame->MDIGetActive() == this) {
+    if (frame && frame->MDIGetActive() == this) {
         frame->OnUpdateFrameTitle(TRUE);  // a maximised child's name stands elsewhere in it
         frame->m_nIdleFlags |= idleTitle; // the toolkit has its own idea of it, later
     }
@@ -116,7 +115,7 @@ void CMDIChildWnd::OnSize(UINT type, int cx, int cy) {
 
 void CMDIChildWnd::ActivateFrame(int command) {
     CMDIFrameWnd* frame = GetMDIFrame();
-    if (frame == nullptr) {
+    if (!frame) {
         CFrameWnd::ActivateFrame(command);
         return;
     }
@@ -137,15 +136,15 @@ void CMDIChildWnd::ActivateFrame(int command) {
 
 void CMDIChildWnd::OnMDIActivate(BOOL activate, CWnd* activated, CWnd*) {
     CView* view = GetActiveView();
-    if (!activate && view != nullptr) {
+    if (!activate && view) {
         view->OnActivateView(FALSE, view, view);
     }
     OnUpdateFrameMenu(activate, activated, nullptr);
     CMDIFrameWnd* frame = GetMDIFrame();
-    if (frame != nullptr) {
+    if (frame) {
         frame->OnUpdateFrameTitle(TRUE);
     }
-    if (activate && view != nullptr) {
+    if (activate && view) {
         view->OnActivateView(TRUE, view, view);
         const HWND focus = ::GetFocus();
         if (focus != view->m_hWnd && !::IsChild(m_hWnd, focus)) {
@@ -160,14 +159,14 @@ void CMDIChildWnd::OnUpdateFrameMenu(HMENU alternative) {
 
 void CMDIChildWnd::OnUpdateFrameMenu(BOOL activate, CWnd* activated, HMENU alternative) {
     CMDIFrameWnd* frame = GetMDIFrame();
-    if (frame == nullptr || (!activate && activated != nullptr)) {
+    if (!frame || (!activate && activated)) {
         return; // the one that becomes active brings its own
     }
-    HMENU menu = activate ? (alternative != nullptr ? alternative : m_hMenuShared) : nullptr;
-    if (menu == nullptr) {
+    HMENU menu = activate ? (alternative ? alternative : m_hMenuShared) : nullptr;
+    if (!menu) {
         menu = frame->m_hMenuDefault;
     }
-    if (menu != nullptr) {
+    if (menu) {
         frame->MDISetMenu(CMenu::FromHandle(menu), nullptr);
     }
 }
@@ -180,8 +179,8 @@ void CMDIChildWnd::OnUpdateFrameTitle(BOOL addToTitle) {
         return;
     }
     const CDocument* document = GetActiveDocument();
-    CString text = addToTitle && document != nullptr ? document->GetTitle() : m_strTitle;
-    if (document != nullptr && m_nWindow > 0) {
+    CString text = addToTitle && document ? document->GetTitle() : m_strTitle;
+    if (document && m_nWindow > 0) {
         text.AppendFormat(":%d", m_nWindow);
     }
     CString before;
@@ -201,7 +200,7 @@ HACCEL CMDIChildWnd::GetDefaultAccelerator() {
 
 CWnd* CMDIChildWnd::GetMessageBar() {
     CMDIFrameWnd* frame = GetMDIFrame();
-    return frame != nullptr ? frame->GetMessageBar() : CFrameWnd::GetMessageBar();
+    return frame ? frame->GetMessageBar() : CFrameWnd::GetMessageBar();
 }
 
 BOOL CMDIChildWnd::PreTranslateMessage(MSG* message) {
@@ -211,8 +210,7 @@ BOOL CMDIChildWnd::PreTranslateMessage(MSG* message) {
     // The main frame has the menu, so the command is its to send on.
     const CMDIFrameWnd* frame = GetMDIFrame();
     const HACCEL accelerators = GetDefaultAccelerator();
-    return frame != nullptr && accelerators != nullptr && !menuHasKeyboard() &&
-                   ::TranslateAcceleratorA(frame->m_hWnd, accelerators, message)
+    return frame && accelerators && !menuHasKeyboard() && ::TranslateAcceleratorA(frame->m_hWnd, accelerators, message)
                ? TRUE
                : FALSE;
 }
@@ -220,7 +218,7 @@ BOOL CMDIChildWnd::PreTranslateMessage(MSG* message) {
 int CMDIChildWnd::OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message) {
     const int answer = CFrameWnd::OnMouseActivate(desktop, hitTest, message);
     const CMDIFrameWnd* frame = GetMDIFrame();
-    if (answer != MA_NOACTIVATE && answer != MA_NOACTIVATEANDEAT && frame != nullptr && frame->MDIGetActive() != this) {
+    if (answer != MA_NOACTIVATE && answer != MA_NOACTIVATEANDEAT && frame && frame->MDIGetActive() != this) {
         MDIActivate();
     }
     return answer;

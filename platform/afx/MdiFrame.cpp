@@ -33,7 +33,7 @@ END_MESSAGE_MAP()
 
 BOOL CMDIFrameWnd::OnCreateClient(CREATESTRUCT* cs, CCreateContext*) {
     const CMenu* menu = GetMenu();
-    CMenu* windowMenu = menu != nullptr ? CMenu::FromHandle(GetWindowMenuPopup(menu->m_hMenu)) : nullptr;
+    CMenu* windowMenu = menu ? CMenu::FromHandle(GetWindowMenuPopup(menu->m_hMenu)) : nullptr;
     return CreateClient(cs, windowMenu);
 }
 
@@ -45,7 +45,7 @@ BOOL CMDIFrameWnd::CreateClient(CREATESTRUCT*, CMenu*) {
     cs.hMenu = reinterpret_cast<HMENU>(static_cast<UINT_PTR>(AFX_IDW_PANE_FIRST));
     cs.hInstance = AfxGetInstanceHandle();
     m_hWndMDIClient = createWindow(cs, nullptr);
-    return m_hWndMDIClient != nullptr ? TRUE : FALSE;
+    return m_hWndMDIClient ? TRUE : FALSE;
 }
 
 void CMDIFrameWnd::OnDestroy() {
@@ -63,7 +63,7 @@ void CMDIFrameWnd::OnActivate(UINT state, CWnd* other, BOOL minimized) {
 CMDIChildWnd* CMDIFrameWnd::CreateNewChild(CRuntimeClass* childClass, UINT id, HMENU menu, HACCEL accelerators) {
     CObject* made = childClass->CreateObject();
     auto* child = DYNAMIC_DOWNCAST(CMDIChildWnd, made);
-    if (child == nullptr) {
+    if (!child) {
         delete made;
         return nullptr;
     }
@@ -82,7 +82,7 @@ CMDIChildWnd* CMDIFrameWnd::CreateNewChild(CRuntimeClass* childClass, UINT id, H
 CMDIChildWnd* CMDIFrameWnd::MDIGetActive(BOOL* maximized) const {
     const auto handle = reinterpret_cast<HWND>(
         ::SendMessageA(m_hWndMDIClient, WM_MDIGETACTIVE, 0, reinterpret_cast<LPARAM>(maximized)));
-    if (handle == nullptr && maximized != nullptr) {
+    if (!handle && maximized) {
         *maximized = FALSE;
     }
     return DYNAMIC_DOWNCAST(CMDIChildWnd, CWnd::FromHandlePermanent(handle));
@@ -130,7 +130,7 @@ void CMDIFrameWnd::MDIIconArrange() {
 
 CMenu* CMDIFrameWnd::MDISetMenu(CMenu* frameMenu, CMenu*) {
     CMenu* before = GetMenu();
-    if (frameMenu != nullptr && (before == nullptr || frameMenu->m_hMenu != before->m_hMenu)) {
+    if (frameMenu && (!before || frameMenu->m_hMenu != before->m_hMenu)) {
         SetMenu(frameMenu);
     }
     return before;
@@ -138,7 +138,7 @@ CMenu* CMDIFrameWnd::MDISetMenu(CMenu* frameMenu, CMenu*) {
 
 CFrameWnd* CMDIFrameWnd::GetActiveFrame() {
     CMDIChildWnd* child = MDIGetActive();
-    return child != nullptr ? static_cast<CFrameWnd*>(child) : this;
+    return child ? static_cast<CFrameWnd*>(child) : this;
 }
 
 void CMDIFrameWnd::OnUpdateFrameTitle(BOOL addToTitle) {
@@ -147,7 +147,7 @@ void CMDIFrameWnd::OnUpdateFrameTitle(BOOL addToTitle) {
     }
     BOOL maximized = FALSE;
     CMDIChildWnd* child = MDIGetActive(&maximized);
-    if (maximized && child != nullptr) {
+    if (maximized && child) {
         CString childTitle;
         child->GetWindowText(childTitle);
         const CString text = m_strTitle + " - [" + childTitle + "]";
@@ -158,8 +158,8 @@ void CMDIFrameWnd::OnUpdateFrameTitle(BOOL addToTitle) {
         }
         return;
     }
-    const CDocument* document = child != nullptr ? child->GetActiveDocument() : nullptr;
-    if (addToTitle && document != nullptr) {
+    const CDocument* document = child ? child->GetActiveDocument() : nullptr;
+    if (addToTitle && document) {
         m_nWindow = child->m_nWindow;
         UpdateFrameTitleForDocument(document->GetTitle());
     } else {
@@ -177,8 +177,8 @@ void CMDIFrameWnd::OnUpdateFrameMenu(HMENU alternative) {
 
 HACCEL CMDIFrameWnd::GetDefaultAccelerator() {
     CMDIChildWnd* child = MDIGetActive();
-    const HACCEL childs = child != nullptr ? child->GetDefaultAccelerator() : nullptr;
-    return childs != nullptr ? childs : m_hAccelTable;
+    const HACCEL childs = child ? child->GetDefaultAccelerator() : nullptr;
+    return childs ? childs : m_hAccelTable;
 }
 
 // --- messages and commands ---
@@ -188,7 +188,7 @@ namespace {
 /// The keys of child frames: Ctrl+F4 closes, Ctrl+F6 and Ctrl+Tab go on to the next one, with Shift backwards.
 bool translateChildKeys(const CMDIFrameWnd& frame, const MSG& message) {
     const CMDIChildWnd* child = frame.MDIGetActive();
-    if (child == nullptr || message.message != WM_KEYDOWN || !isKeyDown(VK_CONTROL) || isKeyDown(VK_MENU)) {
+    if (!child || message.message != WM_KEYDOWN || !isKeyDown(VK_CONTROL) || isKeyDown(VK_MENU)) {
         return false;
     }
     switch (message.wParam) {
@@ -211,13 +211,13 @@ BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
         return CFrameWnd::PreTranslateMessage(message);
     }
     CMDIChildWnd* child = MDIGetActive();
-    if (child != nullptr && child->PreTranslateMessage(message)) {
+    if (child && child->PreTranslateMessage(message)) {
         return TRUE;
     }
     if (menuHasKeyboard()) {
         return FALSE;
     }
-    if (m_hAccelTable != nullptr && ::TranslateAcceleratorA(m_hWnd, m_hAccelTable, message)) {
+    if (m_hAccelTable && ::TranslateAcceleratorA(m_hWnd, m_hAccelTable, message)) {
         return TRUE;
     }
     return translateChildKeys(*this, *message) ? TRUE : FALSE;
@@ -226,7 +226,7 @@ BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
 BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
     // A child frame may handle the command in an OnCommand of its own; it also comes along by the routing.
     CMDIChildWnd* child = MDIGetActive();
-    if (child != nullptr && child->SendMessage(WM_COMMAND, wParam, lParam) != 0) {
+    if (child && child->SendMessage(WM_COMMAND, wParam, lParam) != 0) {
         return TRUE;
     }
     if (CFrameWnd::OnCommand(wParam, lParam)) {
@@ -238,7 +238,7 @@ BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
     }
     const Window* client = Window::from(m_hWndMDIClient);
     const std::size_t index = id - AFX_IDM_FIRST_MDICHILD;
-    if (client != nullptr && index < client->children().size()) {
+    if (client && index < client->children().size()) {
         const HWND chosen = client->children()[index]->handle();
         if (::IsIconic(chosen)) {
             ::ShowWindow(chosen, SW_RESTORE);
@@ -250,7 +250,7 @@ BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
 
 BOOL CMDIFrameWnd::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {
     CMDIChildWnd* child = MDIGetActive();
-    if (child != nullptr && child->OnCmdMsg(id, code, extra, info)) {
+    if (child && child->OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
     return CFrameWnd::OnCmdMsg(id, code, extra, info);
@@ -281,8 +281,8 @@ BOOL CMDIFrameWnd::OnMDIWindowCmd(UINT id) {
 
 void CMDIFrameWnd::OnWindowNew() {
     CMDIChildWnd* child = MDIGetActive();
-    CDocument* document = child != nullptr ? child->GetActiveDocument() : nullptr;
-    if (document == nullptr || document->GetDocTemplate() == nullptr) {
+    CDocument* document = child ? child->GetActiveDocument() : nullptr;
+    if (!document || !document->GetDocTemplate()) {
         return;
     }
     CDocTemplate* docTemplate = document->GetDocTemplate();
@@ -321,7 +321,7 @@ void CMDIFrameWnd::listChildren(CMenu& popup) const {
         }
     }
     const Window* client = Window::from(m_hWndMDIClient);
-    if (client == nullptr || client->children().empty()) {
+    if (!client || client->children().empty()) {
         return;
     }
     popup.AppendMenu(MF_SEPARATOR);
@@ -332,14 +332,14 @@ void CMDIFrameWnd::listChildren(CMenu& popup) const {
         title.Replace("&", "&&");
         CString text;
         text.Format(number < 9 ? "&%u %s" : "%u %s", number + 1, title.GetString());
-        const bool isActive = active != nullptr && active->m_hWnd == child->handle();
+        const bool isActive = active && active->m_hWnd == child->handle();
         popup.AppendMenu(MF_STRING | (isActive ? MF_CHECKED : MF_UNCHECKED), AFX_IDM_FIRST_MDICHILD + number, text);
         ++number;
     }
 }
 
 void CMDIFrameWnd::OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu) {
-    if (!systemMenu && popup != nullptr && popup->m_hMenu == GetWindowMenuPopup(::GetMenu(m_hWnd))) {
+    if (!systemMenu && popup && popup->m_hMenu == GetWindowMenuPopup(::GetMenu(m_hWnd))) {
         listChildren(*popup);
     }
     CFrameWnd::OnInitMenuPopup(popup, index, systemMenu);

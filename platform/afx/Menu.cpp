@@ -47,7 +47,7 @@ CMenu* tvx::afx::menuOf(HMENU handle) {
 }
 
 BOOL CMenu::Attach(HMENU menu) {
-    if (m_hMenu != nullptr || !IsMenu(menu)) {
+    if (m_hMenu || !IsMenu(menu)) {
         return FALSE;
     }
     m_hMenu = menu;
@@ -77,7 +77,7 @@ BOOL CMenu::LoadMenu(UINT id) {
 }
 
 BOOL CMenu::DestroyMenu() {
-    return m_hMenu != nullptr ? ::DestroyMenu(Detach()) : FALSE;
+    return m_hMenu ? ::DestroyMenu(Detach()) : FALSE;
 }
 
 BOOL CMenu::AppendMenu(UINT flags, UINT_PTR id, LPCSTR text) {
@@ -117,9 +117,7 @@ BOOL CMenu::SetDefaultItem(UINT item, BOOL byPosition) {
 }
 
 BOOL CMenu::SetMenuItemBitmaps(UINT position, UINT flags, const CBitmap* unchecked, const CBitmap* checked) {
-    const auto handleOf = [](const CBitmap* bitmap) {
-        return bitmap != nullptr ? static_cast<HBITMAP>(*bitmap) : nullptr;
-    };
+    const auto handleOf = [](const CBitmap* bitmap) { return bitmap ? static_cast<HBITMAP>(*bitmap) : nullptr; };
     return ::SetMenuItemBitmaps(m_hMenu, position, flags, handleOf(unchecked), handleOf(checked));
 }
 
@@ -151,7 +149,7 @@ CMenu* CMenu::GetSubMenu(int position) const {
 }
 
 BOOL CMenu::TrackPopupMenu(UINT flags, int x, int y, CWnd* owner, const RECT* rect) {
-    return ::TrackPopupMenu(m_hMenu, flags, x, y, 0, owner != nullptr ? owner->m_hWnd : nullptr, rect);
+    return ::TrackPopupMenu(m_hMenu, flags, x, y, 0, owner ? owner->m_hWnd : nullptr, rect);
 }
 
 // --- menus of windows ---
@@ -161,7 +159,7 @@ CMenu* CWnd::GetMenu() const {
 }
 
 BOOL CWnd::SetMenu(CMenu* menu) {
-    return ::SetMenu(m_hWnd, menu != nullptr ? menu->m_hMenu : nullptr);
+    return ::SetMenu(m_hWnd, menu ? menu->m_hMenu : nullptr);
 }
 
 void CWnd::DrawMenuBar() {

@@ -102,7 +102,7 @@ public:
         const int answer = m_loop.run();
         guarded([&] {
             hide();
-            if (before != nullptr && before->isVisible()) {
+            if (before && before->isVisible()) {
                 before->activateWindow(); // not every window manager does it
             }
         });
@@ -131,7 +131,7 @@ private:
     /// leaves room for the caption.
     void makeRoom() {
         auto* label = findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
-        if (label == nullptr) {
+        if (!label) {
             return;
         }
         constexpr int captionButtons = 110;
@@ -175,7 +175,7 @@ int reportException(const CString& text, UINT type, UINT fallback) {
 /// Tells about the file of the settings in a message box. Only the user-interface thread can show one, and only while
 /// the application lives.
 void tellAboutSettings(const std::string& text) {
-    if (AfxGetApp() != nullptr && AfxGetThread() != nullptr) {
+    if (AfxGetApp() && AfxGetThread()) {
         AfxMessageBox(text.c_str(), MB_OK | MB_ICONEXCLAMATION);
     } else {
         std::fprintf(stderr, "%s\n", text.c_str());
@@ -191,7 +191,7 @@ struct ReporterEntry {
 
 /// The text as a box shows it: what was collected line by line ends with a line end, which would be an empty line.
 std::string shown(LPCSTR text) {
-    std::string result(text != nullptr ? text : "");
+    std::string result(text ? text : "");
     result.erase(result.find_last_not_of("\r\n") + 1);
     return result;
 }
@@ -200,15 +200,15 @@ std::string shown(LPCSTR text) {
 /// manager finds the place.
 QWidget* visibleOwner(HWND owner) {
     Window* window = Window::from(owner);
-    QWidget* widget = window != nullptr ? window->topLevel()->widget() : nullptr;
-    return widget != nullptr && widget->isVisible() ? widget : nullptr;
+    QWidget* widget = window ? window->topLevel()->widget() : nullptr;
+    return widget && widget->isVisible() ? widget : nullptr;
 }
 
 } // namespace
 
 int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
-    const std::string error = caption == nullptr ? fromQt(ownText(TVX_IDS_ERROR)) : std::string();
-    caption = caption != nullptr ? caption : error.c_str();
+    const std::string error = !caption ? fromQt(ownText(TVX_IDS_ERROR)) : std::string();
+    caption = caption ? caption : error.c_str();
     if (!ensureGui()) {
         std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
         return defaultOf(type).answer;
@@ -219,7 +219,7 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
 
 int AfxMessageBox(LPCSTR text, UINT type, UINT helpId) {
     CWinApp* app = AfxGetApp();
-    return app != nullptr ? app->DoMessageBox(text, type, helpId) : ::MessageBoxA(nullptr, text, nullptr, type);
+    return app ? app->DoMessageBox(text, type, helpId) : ::MessageBoxA(nullptr, text, nullptr, type);
 }
 
 int AfxMessageBox(UINT textId, UINT type, UINT helpId) {
@@ -231,7 +231,7 @@ int AfxMessageBox(UINT textId, UINT type, UINT helpId) {
 }
 
 int CWnd::MessageBox(LPCSTR text, LPCSTR caption, UINT type) {
-    return ::MessageBoxA(m_hWnd, text, caption != nullptr ? caption : AfxGetAppName(), type);
+    return ::MessageBoxA(m_hWnd, text, caption ? caption : AfxGetAppName(), type);
 }
 
 BOOL MessageBeep(UINT) {
@@ -242,13 +242,13 @@ BOOL MessageBeep(UINT) {
 }
 
 CWaitCursorPause::CWaitCursorPause(CWinApp& app) {
-    if (QCoreApplication::instance() != nullptr && QApplication::overrideCursor() != nullptr) {
+    if (QCoreApplication::instance() && QApplication::overrideCursor()) {
         QApplication::changeOverrideCursor(Qt::ArrowCursor);
     }
 }
 
 CWaitCursorPause::~CWaitCursorPause() {
-    if (QCoreApplication::instance() != nullptr && QApplication::overrideCursor() != nullptr) {
+    if (QCoreApplication::instance() && QApplication::overrideCursor()) {
         QApplication::changeOverrideCursor(Qt::WaitCursor);
     }
 }

@@ -280,7 +280,9 @@ protected:                                                                      
         using TheBaseClass = baseClass;                                                                                \
         static const AFX_MSGMAP_ENTRY entries[] = {
 #define END_MESSAGE_MAP()                                                                                              \
-    { 0, 0, 0, 0, nullptr, nullptr }                                                                                   \
+    {                                                                                                                  \
+        0, 0, 0, 0, nullptr, nullptr                                                                                   \
+    }                                                                                                                  \
     }                                                                                                                  \
     ;                                                                                                                  \
     static const AFX_MSGMAP map = {&TheBaseClass::GetThisMessageMap, entries};                                         \

@@ -22,7 +22,7 @@ CMultiDocTemplate::~CMultiDocTemplate() {
 void CMultiDocTemplate::LoadTemplate() {
     CDocTemplate::LoadTemplate();
     const LPCSTR name = MAKEINTRESOURCE(m_nIDResource);
-    if (m_nIDResource != 0 && m_hMenuShared == nullptr) {
+    if (m_nIDResource != 0 && !m_hMenuShared) {
         m_hMenuShared = ::LoadMenuA(AfxFindResourceHandle(name, RT_MENU), name);
         m_hAccelTable = ::LoadAcceleratorsA(AfxFindResourceHandle(name, RT_ACCELERATOR), name);
     }
@@ -61,20 +61,20 @@ void CMultiDocTemplate::SetDefaultTitle(CDocument* document) {
 
 CDocument* CMultiDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
     CDocument* document = CreateNewDocument();
-    if (document == nullptr) {
+    if (!document) {
         AfxMessageBox(AFX_IDP_FAILED_TO_CREATE_DOC);
         return nullptr;
     }
     const BOOL autoDelete = std::exchange(document->m_bAutoDelete, FALSE);
     CFrameWnd* frame = CreateNewFrame(document, nullptr);
     document->m_bAutoDelete = autoDelete;
-    if (frame == nullptr) {
+    if (!frame) {
         AfxMessageBox(AFX_IDP_FAILED_TO_CREATE_DOC);
         delete document;
         return nullptr;
     }
     bool filled = false;
-    if (path == nullptr) {
+    if (!path) {
         SetDefaultTitle(document);
         filled = document->OnNewDocument() != FALSE;
         m_nUntitledCount += filled ? 1 : 0;

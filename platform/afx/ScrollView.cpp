@@ -54,7 +54,7 @@ void CScrollView::SetScrollSizes(int mapMode, SIZE total, const SIZE& page, cons
     complete(m_pageDev.cy, m_totalDev.cy, 10);
     complete(m_lineDev.cx, m_pageDev.cx, 10);
     complete(m_lineDev.cy, m_pageDev.cy, 10);
-    if (m_hWnd != nullptr) {
+    if (m_hWnd) {
         UpdateBars();
         if (oldMode != mapMode) {
             Invalidate(TRUE);
@@ -66,7 +66,7 @@ void CScrollView::SetScaleToFitSize(SIZE total) {
     m_mapMode = kScaleToFit;
     m_totalLog = total;
     m_position = CPoint(0, 0);
-    if (m_hWnd != nullptr) {
+    if (m_hWnd) {
         ShowScrollBar(SB_BOTH, FALSE);
         CRect client;
         GetClientRect(&client);
@@ -249,7 +249,7 @@ UINT trackPosition(CWnd& view, int bar, UINT code, UINT position) {
 } // namespace
 
 void CScrollView::OnHScroll(UINT code, UINT position, CScrollBar* bar) {
-    if (bar != nullptr) {
+    if (bar) {
         CView::OnHScroll(code, position, bar); // a control's, not the frame's
         return;
     }
@@ -257,7 +257,7 @@ void CScrollView::OnHScroll(UINT code, UINT position, CScrollBar* bar) {
 }
 
 void CScrollView::OnVScroll(UINT code, UINT position, CScrollBar* bar) {
-    if (bar != nullptr) {
+    if (bar) {
         CView::OnVScroll(code, position, bar);
         return;
     }
@@ -326,7 +326,7 @@ void CScrollView::ResizeParentToFit(BOOL shrinkOnly) {
     CFrameWnd* frame = GetParentFrame();
     CRect client;
     GetClientRect(&client);
-    if (frame == nullptr || m_mapMode == 0) {
+    if (!frame || m_mapMode == 0) {
         return;
     }
     CSize wanted = m_mapMode == kScaleToFit ? m_totalLog : m_totalDev;

@@ -9,7 +9,7 @@ CSingleDocTemplate::CSingleDocTemplate(UINT id, CRuntimeClass* docClass, CRuntim
     : CDocTemplate(id, docClass, frameClass, viewClass) {}
 
 CSingleDocTemplate::~CSingleDocTemplate() {
-    if (m_pOnlyDoc != nullptr) {
+    if (m_pOnlyDoc) {
         CDocTemplate::RemoveDocument(m_pOnlyDoc);
     }
 }
@@ -51,7 +51,7 @@ struct CSingleDocTemplate::Opened {
 CDocument* CSingleDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
     Opened opened;
     opened.document = m_pOnlyDoc;
-    if (opened.document != nullptr) {
+    if (opened.document) {
         if (!opened.document->SaveModified()) {
             return nullptr;
         }
@@ -60,15 +60,15 @@ CDocument* CSingleDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
         opened.document = CreateNewDocument();
         opened.isNew = true;
     }
-    if (opened.document == nullptr) {
+    if (!opened.document) {
         AfxMessageBox(AFX_IDP_FAILED_TO_CREATE_DOC);
         return nullptr;
     }
-    if (opened.frame == nullptr) {
+    if (!opened.frame) {
         const BOOL autoDelete = std::exchange(opened.document->m_bAutoDelete, FALSE);
         opened.frame = CreateNewFrame(opened.document, nullptr);
         opened.document->m_bAutoDelete = autoDelete;
-        if (opened.frame == nullptr) {
+        if (!opened.frame) {
             AfxMessageBox(AFX_IDP_FAILED_TO_CREATE_DOC);
             delete opened.document;
             return nullptr;
@@ -78,7 +78,7 @@ CDocument* CSingleDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
         return nullptr;
     }
     CWinApp* app = AfxGetApp();
-    if (opened.isNew && app != nullptr && app->m_pMainWnd == nullptr) {
+    if (opened.isNew && app && !app->m_pMainWnd) {
         app->m_pMainWnd = opened.frame;
     }
     InitialUpdateFrame(opened.frame, opened.document, makeVisible);
@@ -93,7 +93,7 @@ bool CSingleDocTemplate::fill(Opened& opened, LPCSTR path) {
         }
         return false;
     };
-    if (path == nullptr) {
+    if (!path) {
         SetDefaultTitle(&document);
         return document.OnNewDocument() || giveUp();
     }

@@ -30,7 +30,7 @@ constexpr int kPaneBorder = 10;
 
 QStatusBar* barOf(const CWnd& bar) {
     const Window* state = bar.GetState();
-    return state != nullptr ? qobject_cast<QStatusBar*>(state->widget()) : nullptr;
+    return state ? qobject_cast<QStatusBar*>(state->widget()) : nullptr;
 }
 
 QList<QLabel*> labelsOf(const QStatusBar& bar) {
@@ -39,7 +39,7 @@ QList<QLabel*> labelsOf(const QStatusBar& bar) {
 
 QLabel* labelAt(const CWnd& bar, int index) {
     const QStatusBar* widget = barOf(bar);
-    const auto labels = widget != nullptr ? labelsOf(*widget) : QList<QLabel*>();
+    const auto labels = widget ? labelsOf(*widget) : QList<QLabel*>();
     return index >= 0 && index < labels.size() ? labels[index] : nullptr;
 }
 
@@ -67,13 +67,13 @@ BOOL CStatusBar::CreateEx(CWnd* parent, DWORD, DWORD style, UINT id) {
 BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
     const QStatusBar* widget = barOf(*this);
     m_panes.assign(static_cast<std::size_t>(std::max(count, 0)), Pane());
-    for (int i = 0; ids != nullptr && i < count; ++i) {
+    for (int i = 0; ids && i < count; ++i) {
         Pane& pane = m_panes[static_cast<std::size_t>(i)];
         pane.id = ids[i];
         if (pane.id != ID_SEPARATOR) {
             pane.text.LoadString(pane.id);
         }
-        pane.width = widget != nullptr ? widget->fontMetrics().horizontalAdvance(toQt(pane.text)) : 0;
+        pane.width = widget ? widget->fontMetrics().horizontalAdvance(toQt(pane.text)) : 0;
         if (i == 0) {
             pane.style = SBPS_NOBORDERS | (pane.id == ID_SEPARATOR ? SBPS_STRETCH : 0U);
         }
@@ -85,7 +85,7 @@ BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
 
 void CStatusBar::rebuild() {
     QStatusBar* widget = barOf(*this);
-    if (widget == nullptr) {
+    if (!widget) {
         return;
     }
     guarded([&] {
@@ -115,7 +115,7 @@ void CStatusBar::rebuild() {
 void CStatusBar::showPane(int index) {
     QLabel* label = labelAt(*this, index);
     const Pane& pane = m_panes[static_cast<std::size_t>(index)];
-    if (label != nullptr) {
+    if (label) {
         guarded([&] { label->setText((pane.style & SBPS_DISABLED) != 0 ? QString() : toQt(pane.text)); });
     }
 }
@@ -135,10 +135,10 @@ UINT CStatusBar::GetItemID(int index) const {
 
 void CStatusBar::GetItemRect(int index, RECT* rect) const {
     const QLabel* label = labelAt(*this, index);
-    if (label != nullptr) {
+    if (label) {
         barOf(*this)->layout()->activate();
     }
-    *rect = label != nullptr ? fromQt(label->geometry()) : RECT(CRect(0, 0, 0, 0));
+    *rect = label ? fromQt(label->geometry()) : RECT(CRect(0, 0, 0, 0));
 }
 
 CString CStatusBar::GetPaneText(int index) const {

@@ -29,7 +29,7 @@ CWinThread* AfxGetThread() {
 
 MSG* AfxGetCurrentMessage() {
     Dispatch* current = DispatchScope::current();
-    return current != nullptr ? &current->msg : nullptr;
+    return current ? &current->msg : nullptr;
 }
 
 void AfxPostQuitMessage(int exitCode) {
@@ -57,18 +57,17 @@ int CWinThread::Run() {
 }
 
 BOOL CWinThread::PreTranslateMessage(MSG* message) {
-    if (message->hwnd == nullptr) {
+    if (!message->hwnd) {
         return DispatchThreadMessage(message);
     }
     CWnd* mainWindow = GetMainWnd();
-    const HWND stop = mainWindow != nullptr ? mainWindow->m_hWnd : nullptr;
+    const HWND stop = mainWindow ? mainWindow->m_hWnd : nullptr;
     if (CWnd::WalkPreTranslateTree(stop, message)) {
         return TRUE;
     }
     // Accelerators of the main frame work in its owned popups too, unless a modal dialog keeps the user from it.
     const CWnd* target = CWnd::FromHandle(message->hwnd);
-    if (mainWindow != nullptr && mainWindow->IsWindowEnabled() && target != nullptr &&
-        target->GetTopLevelParent() != mainWindow) {
+    if (mainWindow && mainWindow->IsWindowEnabled() && target && target->GetTopLevelParent() != mainWindow) {
         return mainWindow->PreTranslateMessage(message);
     }
     return FALSE;
@@ -76,7 +75,7 @@ BOOL CWinThread::PreTranslateMessage(MSG* message) {
 
 BOOL CWinThread::DispatchThreadMessage(MSG* message) {
     const AFX_MSGMAP_ENTRY* entry = FindMessageEntry(message->message, 0, 0);
-    if (entry == nullptr) {
+    if (!entry) {
         return FALSE;
     }
     MessageCall call;
@@ -130,7 +129,7 @@ int CWinThread::ExitInstance() {
 }
 
 CWnd* CWinThread::GetMainWnd() {
-    return m_pActiveWnd != nullptr ? m_pActiveWnd : m_pMainWnd;
+    return m_pActiveWnd ? m_pActiveWnd : m_pMainWnd;
 }
 
 BOOL CWinThread::PostThreadMessage(UINT message, WPARAM wParam, LPARAM lParam) {

@@ -35,12 +35,12 @@ constexpr int kPlaceholderWidth = 9;
 
 QToolBar* toolsOf(const CWnd& bar) {
     const Window* state = bar.GetState();
-    return state != nullptr ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
+    return state ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
 }
 
 QAction* actionAt(const CWnd& bar, int index) {
     const QToolBar* tools = toolsOf(bar);
-    const auto actions = tools != nullptr ? tools->actions() : QList<QAction*>();
+    const auto actions = tools ? tools->actions() : QList<QAction*>();
     return index >= 0 && index < actions.size() ? actions[index] : nullptr;
 }
 
@@ -85,7 +85,7 @@ BOOL CToolBar::LoadToolBar(LPCSTR name) {
     const HINSTANCE module = AfxFindResourceHandle(name, RT_TOOLBAR);
     const auto bar = tvx::parseToolBarTemplate(tvx::resourceBytes(module, name, RT_TOOLBAR));
     const HBITMAP bitmap = bar ? ::LoadBitmapA(AfxFindResourceHandle(name, RT_BITMAP), name) : nullptr;
-    if (bitmap == nullptr) {
+    if (!bitmap) {
         return FALSE;
     }
     SetSizes(CSize(bar->buttonWidth + kButtonMargin, bar->buttonHeight + kButtonMargin),
@@ -102,7 +102,7 @@ BOOL CToolBar::LoadToolBar(UINT id) {
 
 BOOL CToolBar::LoadBitmap(LPCSTR name) {
     const HBITMAP bitmap = ::LoadBitmapA(AfxFindResourceHandle(name, RT_BITMAP), name);
-    if (bitmap == nullptr) {
+    if (!bitmap) {
         return FALSE;
     }
     SetBitmap(bitmap);
@@ -121,13 +121,13 @@ BOOL CToolBar::SetBitmap(HBITMAP bitmap) {
     m_bitmap = bitmap;
     m_ownBitmap = false;
     rebuild();
-    return bitmap != nullptr ? TRUE : FALSE;
+    return bitmap ? TRUE : FALSE;
 }
 
 BOOL CToolBar::SetButtons(const UINT* ids, int count) {
     m_buttons.assign(static_cast<std::size_t>(std::max(count, 0)), Button());
     int image = 0;
-    for (int i = 0; ids != nullptr && i < count; ++i) {
+    for (int i = 0; ids && i < count; ++i) {
         Button& button = m_buttons[static_cast<std::size_t>(i)];
         button.id = ids[i];
         button.style = ids[i] == ID_SEPARATOR ? TBBS_SEPARATOR : TBBS_BUTTON;
@@ -152,7 +152,7 @@ void CToolBar::SetHeight(int height) {
 
 void CToolBar::rebuild() {
     QToolBar* tools = toolsOf(*this);
-    if (tools == nullptr) {
+    if (!tools) {
         return;
     }
     const QImage pictures = buttonImages(m_bitmap);
@@ -189,7 +189,7 @@ void CToolBar::rebuild() {
                 storing([&] {
                     armIdle();
                     const CWnd* owner = GetOwner();
-                    if (owner != nullptr) {
+                    if (owner) {
                         owner->SendMessage(WM_COMMAND, MAKEWPARAM(static_cast<int>(id), 0),
                                            reinterpret_cast<LPARAM>(m_hWnd));
                     }
@@ -205,7 +205,7 @@ void CToolBar::rebuild() {
 void CToolBar::showState(int index) {
     QAction* action = actionAt(*this, index);
     const Button& button = m_buttons[static_cast<std::size_t>(index)];
-    if (action == nullptr || (button.style & TBBS_SEPARATOR) != 0) {
+    if (!action || (button.style & TBBS_SEPARATOR) != 0) {
         return;
     }
     guarded([&] {
@@ -234,7 +234,7 @@ void CToolBar::GetItemRect(int index, RECT* rect) const {
     *rect = CRect(0, 0, 0, 0);
     QAction* action = actionAt(*this, index);
     QToolBar* tools = toolsOf(*this);
-    if (action == nullptr) {
+    if (!action) {
         return;
     }
     if (!tools->isVisible()) {
@@ -285,7 +285,7 @@ BOOL CToolBar::SetButtonText(int index, LPCSTR text) {
     if (!has(index)) {
         return FALSE;
     }
-    m_buttons[static_cast<std::size_t>(index)].text = text != nullptr ? text : "";
+    m_buttons[static_cast<std::size_t>(index)].text = text ? text : "";
     bool texts = false;
     for (const Button& button : m_buttons) {
         texts = texts || !button.text.IsEmpty();

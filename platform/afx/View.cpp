@@ -21,13 +21,13 @@ END_MESSAGE_MAP()
 // clang-format on
 
 CView::~CView() {
-    if (m_pDocument != nullptr) {
+    if (m_pDocument) {
         m_pDocument->RemoveView(this);
     }
 }
 
 BOOL CView::PreCreateWindow(CREATESTRUCT& cs) {
-    if (cs.lpszClass == nullptr) {
+    if (!cs.lpszClass) {
         cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, ::LoadCursorA(nullptr, IDC_ARROW),
                                            reinterpret_cast<HBRUSH>(static_cast<INT_PTR>(COLOR_WINDOW + 1)));
     }
@@ -47,7 +47,7 @@ int CView::OnCreate(CREATESTRUCT* cs) {
         return -1;
     }
     const auto* context = static_cast<CCreateContext*>(cs->lpCreateParams);
-    if (context != nullptr && context->m_pCurrentDoc != nullptr) {
+    if (context && context->m_pCurrentDoc) {
         context->m_pCurrentDoc->AddView(this);
     }
     return 0;
@@ -55,7 +55,7 @@ int CView::OnCreate(CREATESTRUCT* cs) {
 
 void CView::OnDestroy() {
     CFrameWnd* frame = GetParentFrame();
-    if (frame != nullptr && frame->GetActiveView() == this) {
+    if (frame && frame->GetActiveView() == this) {
         frame->SetActiveView(nullptr);
     }
     CWnd::OnDestroy();
@@ -94,13 +94,13 @@ CScrollBar* CView::GetScrollBarCtrl(int bar) const {
 
 void CView::OnActivateView(BOOL activate, CView* activated, CView* deactivated) {
     const Window* state = GetState();
-    if (!activate || state == nullptr) {
+    if (!activate || !state) {
         return;
     }
     // When its frame comes back, the keyboard goes where it was, be that a control in a bar.
     const QWidget* top = state->widget()->window();
     const Window* remembered = Window::of(top->focusWidget());
-    if (activated == deactivated && remembered != nullptr && remembered != Window::of(top)) {
+    if (activated == deactivated && remembered && remembered != Window::of(top)) {
         return;
     }
     SetFocus();
@@ -114,7 +114,7 @@ int CView::OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message) {
         return answer;
     }
     CFrameWnd* frame = GetParentFrame();
-    if (frame == nullptr) {
+    if (!frame) {
         return answer;
     }
     const HWND focus = ::GetFocus();
@@ -130,5 +130,5 @@ BOOL CView::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {
     if (CWnd::OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
-    return m_pDocument != nullptr ? m_pDocument->OnCmdMsg(id, code, extra, info) : FALSE;
+    return m_pDocument ? m_pDocument->OnCmdMsg(id, code, extra, info) : FALSE;
 }

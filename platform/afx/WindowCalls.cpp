@@ -26,21 +26,21 @@ QRect screenArea() {
 
 Window* windowOrError(HWND handle) {
     Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         SetLastError(ERROR_INVALID_WINDOW_HANDLE);
     }
     return window;
 }
 
 HWND handleOf(const Window* window) {
-    return window != nullptr ? window->handle() : nullptr;
+    return window ? window->handle() : nullptr;
 }
 
 } // namespace
 
 BOOL DestroyWindow(HWND handle) {
     Window* window = windowOrError(handle);
-    if (window == nullptr || window->isDestroyed()) {
+    if (!window || window->isDestroyed()) {
         return FALSE;
     }
     window->destroy();
@@ -51,7 +51,7 @@ BOOL DestroyWindow(HWND handle) {
 
 HWND SetParent(HWND handle, HWND parent) {
     Window* window = windowOrError(handle);
-    if (window == nullptr || (parent != nullptr && windowOrError(parent) == nullptr)) {
+    if (!window || (parent && !windowOrError(parent))) {
         return nullptr;
     }
     const HWND previous = handleOf(window->parent());
@@ -61,7 +61,7 @@ HWND SetParent(HWND handle, HWND parent) {
 
 HWND GetWindow(HWND handle, UINT relation) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return nullptr;
     }
     if (relation == GW_OWNER) {
@@ -70,7 +70,7 @@ HWND GetWindow(HWND handle, UINT relation) {
     if (relation == GW_CHILD) {
         return window->children().empty() ? nullptr : window->children().front()->handle();
     }
-    const auto& siblings = window->parent() != nullptr ? window->parent()->children() : Window::topLevels();
+    const auto& siblings = window->parent() ? window->parent()->children() : Window::topLevels();
     const auto place = std::find(siblings.begin(), siblings.end(), window);
     switch (relation) {
     case GW_HWNDFIRST:
@@ -92,17 +92,17 @@ HWND GetTopWindow(HWND handle) {
 
 HWND GetDlgItem(HWND handle, int id) {
     const Window* window = windowOrError(handle);
-    return window != nullptr ? handleOf(window->child(id)) : nullptr;
+    return window ? handleOf(window->child(id)) : nullptr;
 }
 
 int GetDlgCtrlID(HWND handle) {
     const Window* window = windowOrError(handle);
-    return window != nullptr ? window->id() : 0;
+    return window ? window->id() : 0;
 }
 
 BOOL IsChild(HWND parent, HWND handle) {
     const Window* window = Window::from(handle);
-    while (window != nullptr && window->isChild()) {
+    while (window && window->isChild()) {
         window = window->parent();
         if (handleOf(window) == parent) {
             return TRUE;
@@ -120,14 +120,14 @@ BOOL tellDescendants(const Window& parent, WNDENUMPROC callback, LPARAM param) {
         handles.push_back(window->handle());
     }
     for (const HWND handle : handles) {
-        if (Window::from(handle) == nullptr) {
+        if (!Window::from(handle)) {
             continue;
         }
         if (!callback(handle, param)) {
             return FALSE;
         }
         const Window* window = Window::from(handle);
-        if (window != nullptr && !tellDescendants(*window, callback, param)) {
+        if (window && !tellDescendants(*window, callback, param)) {
             return FALSE;
         }
     }
@@ -138,7 +138,7 @@ BOOL tellDescendants(const Window& parent, WNDENUMPROC callback, LPARAM param) {
 
 BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param) {
     const Window* window = windowOrError(parent);
-    return window != nullptr ? tellDescendants(*window, callback, param) : FALSE;
+    return window ? tellDescendants(*window, callback, param) : FALSE;
 }
 
 HWND GetDesktopWindow() {
@@ -147,8 +147,8 @@ HWND GetDesktopWindow() {
 
 HWND FindWindowA(LPCSTR className, LPCSTR text) {
     for (const Window* window : Window::topLevels()) {
-        const bool sameClass = className == nullptr || tvx::text::equalNoCase(window->className(), className);
-        if (sameClass && (text == nullptr || fromQt(window->text()) == text)) {
+        const bool sameClass = !className || tvx::text::equalNoCase(window->className(), className);
+        if (sameClass && (!text || fromQt(window->text()) == text)) {
             return window->handle();
         }
     }
@@ -162,7 +162,7 @@ HWND WindowFromPoint(POINT point) {
 
 HWND ChildWindowFromPoint(HWND parent, POINT point) {
     const Window* window = windowOrError(parent);
-    if (window == nullptr || !QRect(QPoint(), window->clientRect().size()).contains(toQt(point))) {
+    if (!window || !QRect(QPoint(), window->clientRect().size()).contains(toQt(point))) {
         return nullptr;
     }
     for (const Window* child : window->children()) {
@@ -177,17 +177,17 @@ HWND ChildWindowFromPoint(HWND parent, POINT point) {
 
 BOOL IsWindowVisible(HWND handle) {
     const Window* window = Window::from(handle);
-    return window != nullptr && window->isVisible() ? TRUE : FALSE;
+    return window && window->isVisible() ? TRUE : FALSE;
 }
 
 BOOL IsWindowEnabled(HWND handle) {
     const Window* window = Window::from(handle);
-    return window != nullptr && window->isEnabled() ? TRUE : FALSE;
+    return window && window->isEnabled() ? TRUE : FALSE;
 }
 
 BOOL EnableWindow(HWND handle, BOOL enable) {
     Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return FALSE;
     }
     const bool wasDisabled = !window->isEnabled();
@@ -199,7 +199,7 @@ BOOL EnableWindow(HWND handle, BOOL enable) {
 
 LONG_PTR GetWindowLongPtrA(HWND handle, int index) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return 0;
     }
     switch (index) {
@@ -219,7 +219,7 @@ LONG_PTR GetWindowLongPtrA(HWND handle, int index) {
 LONG_PTR SetWindowLongPtrA(HWND handle, int index, LONG_PTR value) {
     const LONG_PTR previous = GetWindowLongPtrA(handle, index);
     Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return 0;
     }
     switch (index) {
@@ -244,15 +244,14 @@ LONG_PTR SetWindowLongPtrA(HWND handle, int index, LONG_PTR value) {
 // --- text ---
 
 BOOL SetWindowTextA(HWND handle, LPCSTR text) {
-    if (windowOrError(handle) == nullptr) {
+    if (!windowOrError(handle)) {
         return FALSE;
     }
-    return SendMessageA(handle, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(text != nullptr ? text : "")) != 0 ? TRUE
-                                                                                                           : FALSE;
+    return SendMessageA(handle, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(text ? text : "")) != 0 ? TRUE : FALSE;
 }
 
 int GetWindowTextA(HWND handle, LPSTR buffer, int size) {
-    if (size <= 0 || windowOrError(handle) == nullptr) {
+    if (size <= 0 || !windowOrError(handle)) {
         return 0;
     }
     return static_cast<int>(
@@ -279,7 +278,7 @@ void placeInOrder(Window& window, HWND after) {
     }
     if (after == HWND_BOTTOM) {
         window.widget()->lower();
-    } else if (const Window* other = Window::from(after); other != nullptr && !window.widget()->isWindow()) {
+    } else if (const Window* other = Window::from(after); other && !window.widget()->isWindow()) {
         window.widget()->stackUnder(other->widget());
         window.placeAfter(Window::from(after));
     } else {
@@ -291,7 +290,7 @@ void placeInOrder(Window& window, HWND after) {
 
 BOOL SetWindowPos(HWND handle, HWND after, int x, int y, int cx, int cy, UINT flags) {
     Window* window = windowOrError(handle);
-    if (window == nullptr || window->widget() == nullptr) {
+    if (!window || !window->widget()) {
         return FALSE;
     }
     const QRect current = window->windowRect();
@@ -305,7 +304,7 @@ BOOL SetWindowPos(HWND handle, HWND after, int x, int y, int cx, int cy, UINT fl
             placeInOrder(*window, after);
         }
     });
-    if (Window::from(handle) != nullptr) {
+    if (Window::from(handle)) {
         window->tellGeometry();
     }
     const bool activate = (flags & SWP_NOACTIVATE) == 0;
@@ -327,7 +326,7 @@ BOOL GetWindowRect(HWND handle, RECT* rect) {
         return TRUE;
     }
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return FALSE;
     }
     *rect = fromQt(window->screenRect());
@@ -340,7 +339,7 @@ BOOL GetClientRect(HWND handle, RECT* rect) {
         return TRUE;
     }
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return FALSE;
     }
     const QSize size = window->clientRect().size();
@@ -350,7 +349,7 @@ BOOL GetClientRect(HWND handle, RECT* rect) {
 
 BOOL GetWindowPlacement(HWND handle, WINDOWPLACEMENT* placement) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr || window->widget() == nullptr) {
+    if (!window || !window->widget()) {
         return FALSE;
     }
     const QWidget& widget = *window->widget();
@@ -359,13 +358,13 @@ BOOL GetWindowPlacement(HWND handle, WINDOWPLACEMENT* placement) {
     placement->ptMinPosition = placement->ptMaxPosition = {-1, -1};
     placement->showCmd = SW_SHOWNORMAL;
     const Placement* place = window->placement();
-    if (place != nullptr && widget.isMinimized()) {
+    if (place && widget.isMinimized()) {
         placement->showCmd = SW_SHOWMINIMIZED;
         placement->flags = widget.isMaximized() ? WPF_RESTORETOMAXIMIZED : 0;
-    } else if (place != nullptr && widget.isMaximized()) {
+    } else if (place && widget.isMaximized()) {
         placement->showCmd = SW_SHOWMAXIMIZED;
     }
-    placement->rcNormalPosition = fromQt(place != nullptr ? place->restored() : window->windowRect());
+    placement->rcNormalPosition = fromQt(place ? place->restored() : window->windowRect());
     return TRUE;
 }
 
@@ -381,7 +380,7 @@ QRect usableRect(const RECT& rect) {
 
 void setRestoredRect(Window& window, const QRect& rect) {
     Placement* place = window.placement();
-    if (place != nullptr && window.widget()->isWindow()) {
+    if (place && window.widget()->isWindow()) {
         place->setRestored(reachableFrame(rect));
         return;
     }
@@ -395,7 +394,7 @@ void setRestoredRect(Window& window, const QRect& rect) {
 
 BOOL SetWindowPlacement(HWND handle, const WINDOWPLACEMENT* placement) {
     Window* window = windowOrError(handle);
-    if (window == nullptr || window->widget() == nullptr) {
+    if (!window || !window->widget()) {
         return FALSE;
     }
     if (placement->length != sizeof(WINDOWPLACEMENT)) {
@@ -421,7 +420,7 @@ BOOL SetWindowPlacement(HWND handle, const WINDOWPLACEMENT* placement) {
 
 BOOL ClientToScreen(HWND handle, POINT* point) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return FALSE;
     }
     *point = fromQt(window->clientToScreen(toQt(*point)));
@@ -430,7 +429,7 @@ BOOL ClientToScreen(HWND handle, POINT* point) {
 
 BOOL ScreenToClient(HWND handle, POINT* point) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr) {
+    if (!window) {
         return FALSE;
     }
     *point = fromQt(window->screenToClient(toQt(*point)));
@@ -439,10 +438,10 @@ BOOL ScreenToClient(HWND handle, POINT* point) {
 
 int MapWindowPoints(HWND from, HWND to, POINT* points, UINT count) {
     POINT offset{0, 0};
-    if (from != nullptr) {
+    if (from) {
         ClientToScreen(from, &offset);
     }
-    if (to != nullptr) {
+    if (to) {
         ScreenToClient(to, &offset);
     }
     for (UINT i = 0; i < count; ++i) {
@@ -457,11 +456,11 @@ int MapWindowPoints(HWND from, HWND to, POINT* points, UINT count) {
 BOOL RedrawWindow(HWND handle, const RECT* rect, HRGN region, UINT flags) {
     Window* window = windowOrError(handle);
     QWidget* client = peerOf(handle);
-    if (window == nullptr || client == nullptr) {
+    if (!window || !client) {
         return FALSE;
     }
     const QRect area = window->clientRect();
-    const QRect part = rect != nullptr ? toQt(*rect).translated(area.topLeft()).intersected(area) : area;
+    const QRect part = rect ? toQt(*rect).translated(area.topLeft()).intersected(area) : area;
     guarded([&] {
         if ((flags & RDW_INVALIDATE) != 0) {
             client->update(part);
@@ -484,7 +483,7 @@ BOOL InvalidateRect(HWND handle, const RECT* rect, BOOL erase) {
 
 BOOL UpdateWindow(HWND handle) {
     const Window* window = windowOrError(handle);
-    if (window == nullptr || window->widget() == nullptr) {
+    if (!window || !window->widget()) {
         return FALSE;
     }
     // The toolkit keeps what is to be repainted per top-level widget and paints it all at this request.
@@ -499,13 +498,13 @@ BOOL UpdateWindow(HWND handle) {
 // --- activation ---
 
 HWND GetActiveWindow() {
-    return QCoreApplication::instance() != nullptr ? handleOf(Window::of(QApplication::activeWindow())) : nullptr;
+    return QCoreApplication::instance() ? handleOf(Window::of(QApplication::activeWindow())) : nullptr;
 }
 
 HWND SetActiveWindow(HWND handle) {
     const HWND previous = GetActiveWindow();
     Window* window = windowOrError(handle);
-    if (window != nullptr && window->topLevel()->widget() != nullptr) {
+    if (window && window->topLevel()->widget()) {
         guarded([window] { window->topLevel()->widget()->activateWindow(); });
     }
     return previous;

@@ -17,10 +17,10 @@ IMPLEMENT_DYNCREATE(CWnd, CCmdTarget)
 
 CWnd::~CWnd() {
     // A frame whose window could not be created has deleted itself; hosts have often made it the main window before.
-    if (CWinThread* thread = AfxGetThread(); thread != nullptr && thread->m_pMainWnd == this) {
+    if (CWinThread* thread = AfxGetThread(); thread && thread->m_pMainWnd == this) {
         thread->m_pMainWnd = nullptr;
     }
-    if (m_hWnd == nullptr) {
+    if (!m_hWnd) {
         return;
     }
     // What derived classes override is gone by now, so the window ends as one without an object.
@@ -33,17 +33,17 @@ CWnd::~CWnd() {
 }
 
 HWND CWnd::HandleOf(const CWnd* window) {
-    return window != nullptr ? window->m_hWnd : nullptr;
+    return window ? window->m_hWnd : nullptr;
 }
 
 CWnd* CWnd::FromHandle(HWND handle) {
     Window* window = Window::from(handle);
-    return window != nullptr ? window->objectOrTemporary() : nullptr;
+    return window ? window->objectOrTemporary() : nullptr;
 }
 
 CWnd* CWnd::FromHandlePermanent(HWND handle) {
     const Window* window = Window::from(handle);
-    return window != nullptr ? window->object() : nullptr;
+    return window ? window->object() : nullptr;
 }
 
 namespace {
@@ -67,7 +67,7 @@ Window* CWnd::GetState() const {
 
 BOOL CWnd::Attach(HWND handle) {
     Window* window = Window::from(handle);
-    if (window == nullptr || window->object() != nullptr || m_hWnd != nullptr) {
+    if (!window || window->object() || m_hWnd) {
         return FALSE;
     }
     m_hWnd = handle;
@@ -78,7 +78,7 @@ BOOL CWnd::Attach(HWND handle) {
 HWND CWnd::Detach() {
     const HWND handle = m_hWnd;
     Window* window = Window::from(handle);
-    if (window != nullptr && window->object() == this) {
+    if (window && window->object() == this) {
         window->detach();
     }
     m_hWnd = nullptr;
@@ -86,7 +86,7 @@ HWND CWnd::Detach() {
 }
 
 BOOL CWnd::SubclassWindow(HWND handle) {
-    if (FromHandlePermanent(handle) != nullptr || Window::from(handle) == nullptr) {
+    if (FromHandlePermanent(handle) || !Window::from(handle)) {
         return FALSE;
     }
     PreSubclassWindow();
@@ -106,7 +106,7 @@ void CWnd::PreSubclassWindow() {}
 // --- creation and end ---
 
 BOOL CWnd::PreCreateWindow(CREATESTRUCT& cs) {
-    if (cs.lpszClass == nullptr) {
+    if (!cs.lpszClass) {
         cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, ::LoadCursorA(nullptr, IDC_ARROW));
     }
     return TRUE;
@@ -146,20 +146,20 @@ BOOL CWnd::CreateEx(DWORD exStyle, LPCSTR className, LPCSTR text, DWORD style, i
     // A creation that fails has sent WM_NCDESTROY when the window stood already, and PostNcDestroy with it.
     bool stood = false;
     const HWND window = createWindow(cs, this, &stood);
-    if (window == nullptr && !stood) {
+    if (!window && !stood) {
         PostNcDestroy();
     }
-    return window != nullptr ? TRUE : FALSE;
+    return window ? TRUE : FALSE;
 }
 
 BOOL CWnd::DestroyWindow() {
-    return m_hWnd != nullptr ? ::DestroyWindow(m_hWnd) : FALSE;
+    return m_hWnd ? ::DestroyWindow(m_hWnd) : FALSE;
 }
 
 void CWnd::PostNcDestroy() {}
 
 void CWnd::OnNcDestroy() {
-    if (CWinThread* thread = AfxGetThread(); thread != nullptr && thread->m_pMainWnd == this) {
+    if (CWinThread* thread = AfxGetThread(); thread && thread->m_pMainWnd == this) {
         // The main window's end is the application's end.
         thread->m_pMainWnd = nullptr;
         AfxPostQuitMessage(0);
@@ -181,17 +181,17 @@ LRESULT CWnd::WindowProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 LRESULT CWnd::DefWindowProc(UINT message, WPARAM wParam, LPARAM lParam) {
     Window* window = GetState();
-    return window != nullptr ? window->defaultProc(message, wParam, lParam) : 0;
+    return window ? window->defaultProc(message, wParam, lParam) : 0;
 }
 
 LRESULT CWnd::Default() {
     const Dispatch* current = DispatchScope::current();
-    return current != nullptr ? DefWindowProc(current->msg.message, current->msg.wParam, current->msg.lParam) : 0;
+    return current ? DefWindowProc(current->msg.message, current->msg.wParam, current->msg.lParam) : 0;
 }
 
 const MSG* CWnd::GetCurrentMessage() {
     const Dispatch* current = DispatchScope::current();
-    return current != nullptr ? &current->msg : nullptr;
+    return current ? &current->msg : nullptr;
 }
 
 BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) {
@@ -204,10 +204,10 @@ BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result)
     }
     if (message == WM_NOTIFY) {
         const auto* header = reinterpret_cast<const NMHDR*>(lParam);
-        return header != nullptr && header->hwndFrom != nullptr ? OnNotify(wParam, lParam, result) : FALSE;
+        return header && header->hwndFrom ? OnNotify(wParam, lParam, result) : FALSE;
     }
     const AFX_MSGMAP_ENTRY* entry = FindMessageEntry(message, 0, 0);
-    if (entry == nullptr) {
+    if (!entry) {
         return FALSE;
     }
     MessageCall call;
@@ -248,7 +248,7 @@ BOOL CWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
     if (id == 0) {
         return FALSE;
     }
-    if (control == nullptr) {
+    if (!control) {
         CommandTest test(id);
         OnCmdMsg(id, CN_UPDATE_COMMAND_UI, &test, nullptr);
         if (!test.enabled) {
@@ -276,7 +276,7 @@ BOOL CWnd::OnNotify(WPARAM wParam, LPARAM lParam, LRESULT* result) {
 
 BOOL CWnd::SendChildNotifyLastMsg(HWND child, UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) {
     CWnd* object = FromHandlePermanent(child);
-    return object != nullptr ? object->OnChildNotify(message, wParam, lParam, result) : FALSE;
+    return object ? object->OnChildNotify(message, wParam, lParam, result) : FALSE;
 }
 
 BOOL CWnd::OnChildNotify(UINT, WPARAM, LPARAM, LRESULT*) {
@@ -292,9 +292,9 @@ BOOL CWnd::PreTranslateMessage(MSG*) {
 }
 
 BOOL CWnd::WalkPreTranslateTree(HWND stop, MSG* message) {
-    for (HWND handle = message->hwnd; handle != nullptr; handle = ::GetParent(handle)) {
+    for (HWND handle = message->hwnd; handle; handle = ::GetParent(handle)) {
         CWnd* object = FromHandlePermanent(handle);
-        if (object != nullptr && object->PreTranslateMessage(message)) {
+        if (object && object->PreTranslateMessage(message)) {
             return TRUE;
         }
         if (handle == stop) {
@@ -311,13 +311,13 @@ void sendToDescendants(const Window& window, const MSG& msg, BOOL deep, BOOL onl
     const std::vector<Window*> children(window.children().begin(), window.children().end());
     for (const Window* child : children) {
         const HWND handle = child->handle();
-        if (Window::from(handle) == nullptr) {
+        if (!Window::from(handle)) {
             continue;
         }
-        if (!onlyPerm || child->object() != nullptr) {
+        if (!onlyPerm || child->object()) {
             ::SendMessageA(handle, msg.message, msg.wParam, msg.lParam);
         }
-        if (const Window* still = Window::from(handle); deep && still != nullptr) {
+        if (const Window* still = Window::from(handle); deep && still) {
             sendToDescendants(*still, msg, deep, onlyPerm);
         }
     }
@@ -347,7 +347,7 @@ int CWnd::RunModalLoop(DWORD) {
 }
 
 void CWnd::EndModalLoop(int result) {
-    if (m_modalLoop != nullptr) {
+    if (m_modalLoop) {
         static_cast<ModalLoop*>(m_modalLoop)->end(result);
     }
 }
@@ -362,7 +362,7 @@ LPCSTR AfxRegisterWndClass(UINT classStyle, HCURSOR cursor, HBRUSH background, H
     char name[96];
     std::snprintf(name, sizeof(name), "Afx:%x:%zx:%zx:%zx", classStyle, reinterpret_cast<std::size_t>(cursor),
                   reinterpret_cast<std::size_t>(background), reinterpret_cast<std::size_t>(icon));
-    if (findWindowClass(name) == nullptr) {
+    if (!findWindowClass(name)) {
         WindowClass entry;
         entry.name = name;
         entry.style = classStyle;
@@ -382,7 +382,7 @@ CWnd* windowOf(HWND handle) {
 
 bool isHandleOf(const CCmdTarget& target, LPARAM handle) {
     const auto* window = dynamic_cast<const CWnd*>(&target);
-    return window != nullptr && reinterpret_cast<LPARAM>(window->m_hWnd) == handle;
+    return window && reinterpret_cast<LPARAM>(window->m_hWnd) == handle;
 }
 
 } // namespace tvx::afx

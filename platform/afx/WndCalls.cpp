@@ -18,7 +18,7 @@ using namespace tvx::afx;
 namespace {
 
 HWND handleOf(const CWnd* window) {
-    return window != nullptr ? window->m_hWnd : nullptr;
+    return window ? window->m_hWnd : nullptr;
 }
 
 } // namespace
@@ -112,7 +112,7 @@ int CWnd::GetWindowTextLength() const {
 }
 
 void CWnd::SetFont(CFont* font, BOOL redraw) {
-    const auto handle = font != nullptr ? reinterpret_cast<WPARAM>(font->GetSafeHandle()) : 0;
+    const auto handle = font ? reinterpret_cast<WPARAM>(font->GetSafeHandle()) : 0;
     ::SendMessageA(m_hWnd, WM_SETFONT, handle, redraw);
 }
 
@@ -161,11 +161,11 @@ BOOL CWnd::SetWindowPlacement(const WINDOWPLACEMENT* placement) {
 
 void CWnd::CenterWindow(CWnd* other) {
     const Window* window = GetState();
-    if (window == nullptr || window->widget() == nullptr) {
+    if (!window || !window->widget()) {
         return;
     }
     CWnd* over = other;
-    if (over == nullptr) {
+    if (!over) {
         over = window->isChild() ? GetParent() : GetOwner();
     }
     const QScreen* screen = window->widget()->screen();
@@ -173,7 +173,7 @@ void CWnd::CenterWindow(CWnd* other) {
     QRect area = available;
     if (window->isChild()) {
         area = available = QRect(QPoint(), window->parent()->clientRect().size());
-    } else if (over != nullptr && over->IsWindowVisible() && !over->IsIconic()) {
+    } else if (over && over->IsWindowVisible() && !over->IsIconic()) {
         area = over->GetState()->screenRect();
     }
     QRect place(QPoint(), window->windowRect().size());
@@ -215,7 +215,7 @@ void CWnd::MapWindowPoints(CWnd* to, RECT* rect) const {
 
 void CWnd::CalcWindowRect(RECT* rect, UINT) {
     const Window* window = GetState();
-    if (window == nullptr) {
+    if (!window) {
         return;
     }
     const QSize client = window->clientRect().size();
@@ -261,17 +261,17 @@ int CWnd::ReleaseDC(CDC* dc) {
 void CWnd::ScrollWindow(int dx, int dy, const RECT* scroll, const RECT* clip) {
     const Window* window = GetState();
     QWidget* client = peerOf(m_hWnd);
-    if (client == nullptr) {
+    if (!client) {
         return;
     }
     const QRect area = window->clientRect();
     guarded([&] {
-        if (scroll == nullptr && clip == nullptr && area == client->rect()) {
+        if (!scroll && !clip && area == client->rect()) {
             client->scroll(dx, dy);
             return;
         }
-        const RECT* part = scroll != nullptr ? scroll : clip;
-        client->scroll(dx, dy, part != nullptr ? toQt(*part).translated(area.topLeft()) : area);
+        const RECT* part = scroll ? scroll : clip;
+        client->scroll(dx, dy, part ? toQt(*part).translated(area.topLeft()) : area);
     });
 }
 
@@ -286,7 +286,7 @@ CWnd* CWnd::SetParent(CWnd* parent) {
 }
 
 CWnd* CWnd::GetOwner() const {
-    return m_pOwner != nullptr ? m_pOwner : GetParent();
+    return m_pOwner ? m_pOwner : GetParent();
 }
 
 void CWnd::SetOwner(CWnd* owner) {
@@ -325,7 +325,7 @@ namespace {
 
 Window* descendant(const Window& window, int id, BOOL onlyPerm) {
     for (Window* child : window.children()) {
-        if (child->id() == id && (!onlyPerm || child->object() != nullptr)) {
+        if (child->id() == id && (!onlyPerm || child->object())) {
             return child;
         }
     }
@@ -341,8 +341,8 @@ Window* descendant(const Window& window, int id, BOOL onlyPerm) {
 
 CWnd* CWnd::GetDescendantWindow(int id, BOOL onlyPerm) const {
     const Window* window = GetState();
-    Window* found = window != nullptr ? descendant(*window, id, onlyPerm) : nullptr;
-    return found != nullptr ? found->objectOrTemporary() : nullptr;
+    Window* found = window ? descendant(*window, id, onlyPerm) : nullptr;
+    return found ? found->objectOrTemporary() : nullptr;
 }
 
 CWnd* CWnd::GetDesktopWindow() {
@@ -407,7 +407,7 @@ namespace {
 
 QScrollBar* barOf(const CWnd& window, int bar) {
     const Window* state = window.GetState();
-    if (state == nullptr || state->widget() == nullptr) {
+    if (!state || !state->widget()) {
         return nullptr;
     }
     if (const auto* plain = dynamic_cast<const PlainWindow*>(state)) {
@@ -415,7 +415,7 @@ QScrollBar* barOf(const CWnd& window, int bar) {
     }
     // Edit and list controls keep the ranges of their bars themselves.
     const auto* area = dynamic_cast<const QAbstractScrollArea*>(state->widget());
-    const bool exists = area != nullptr && (state->style() & (bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL)) != 0;
+    const bool exists = area && (state->style() & (bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL)) != 0;
     return !exists ? nullptr : bar == SB_HORZ ? area->horizontalScrollBar() : area->verticalScrollBar();
 }
 
@@ -423,7 +423,7 @@ QScrollBar* barOf(const CWnd& window, int bar) {
 
 int CWnd::SetScrollPos(int bar, int pos, BOOL) {
     QScrollBar* slider = barOf(*this, bar);
-    if (slider == nullptr) {
+    if (!slider) {
         return 0;
     }
     const int previous = slider->value();
@@ -433,7 +433,7 @@ int CWnd::SetScrollPos(int bar, int pos, BOOL) {
 
 int CWnd::GetScrollPos(int bar) const {
     const QScrollBar* slider = barOf(*this, bar);
-    return slider != nullptr ? slider->value() : 0;
+    return slider ? slider->value() : 0;
 }
 
 void CWnd::SetScrollRange(int bar, int min, int max, BOOL redraw) {
@@ -447,17 +447,17 @@ void CWnd::SetScrollRange(int bar, int min, int max, BOOL redraw) {
 
 void CWnd::GetScrollRange(int bar, int* min, int* max) const {
     const QScrollBar* slider = barOf(*this, bar);
-    *min = slider != nullptr ? slider->minimum() : 0;
-    *max = slider != nullptr ? slider->maximum() + std::max(slider->pageStep() - 1, 0) : 0;
+    *min = slider ? slider->minimum() : 0;
+    *max = slider ? slider->maximum() + std::max(slider->pageStep() - 1, 0) : 0;
 }
 
 BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     QScrollBar* slider = barOf(*this, bar);
-    if (slider == nullptr) {
+    if (!slider) {
         return FALSE;
     }
     auto* plain = dynamic_cast<PlainWindow*>(GetState());
-    if (plain == nullptr) {
+    if (!plain) {
         slider->setValue((info->fMask & SIF_POS) != 0 ? info->nPos : slider->value());
         return TRUE;
     }
@@ -486,7 +486,7 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
 
 BOOL CWnd::GetScrollInfo(int bar, SCROLLINFO* info, UINT mask) {
     const QScrollBar* slider = barOf(*this, bar);
-    if (slider == nullptr) {
+    if (!slider) {
         return FALSE;
     }
     info->fMask = mask;
@@ -499,7 +499,7 @@ BOOL CWnd::GetScrollInfo(int bar, SCROLLINFO* info, UINT mask) {
 
 void CWnd::ShowScrollBar(UINT bar, BOOL show) {
     auto* plain = dynamic_cast<PlainWindow*>(GetState());
-    if (plain == nullptr) {
+    if (!plain) {
         return;
     }
     if (bar == SB_HORZ || bar == SB_BOTH) {

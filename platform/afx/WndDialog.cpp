@@ -22,15 +22,15 @@ void CWnd::SetDlgItemText(int id, LPCSTR text) {
 
 int CWnd::GetDlgItemText(int id, LPSTR buffer, int size) const {
     const HWND item = ::GetDlgItem(m_hWnd, id);
-    if (item == nullptr && size > 0) {
+    if (!item && size > 0) {
         *buffer = '\0';
     }
-    return item != nullptr ? ::GetWindowTextA(item, buffer, size) : 0;
+    return item ? ::GetWindowTextA(item, buffer, size) : 0;
 }
 
 int CWnd::GetDlgItemText(int id, CString& text) const {
     const CWnd* item = GetDlgItem(id);
-    if (item == nullptr) {
+    if (!item) {
         text.Empty();
     } else {
         item->GetWindowText(text);
@@ -53,7 +53,7 @@ UINT CWnd::GetDlgItemInt(int id, BOOL* translated, BOOL isSigned) const {
     const long long min = isSigned ? std::numeric_limits<int>::min() : 0;
     const long long max = isSigned ? std::numeric_limits<int>::max() : std::numeric_limits<UINT>::max();
     const bool whole = error == std::errc() && end == view.data() + view.size() && number >= min && number <= max;
-    if (translated != nullptr) {
+    if (translated) {
         *translated = whole ? TRUE : FALSE;
     }
     return whole ? static_cast<UINT>(number) : 0;
@@ -89,7 +89,7 @@ LRESULT CWnd::SendDlgItemMessage(int id, UINT message, WPARAM wParam, LPARAM lPa
 namespace {
 
 CWnd* objectOf(Window* window) {
-    return window != nullptr ? CWnd::FromHandle(window->handle()) : nullptr;
+    return window ? CWnd::FromHandle(window->handle()) : nullptr;
 }
 
 Direction directionOf(BOOL previous) {
@@ -100,13 +100,13 @@ Direction directionOf(BOOL previous) {
 
 CWnd* CWnd::GetNextDlgTabItem(CWnd* from, BOOL previous) const {
     Window* dialog = GetState();
-    const Window* start = from != nullptr ? from->GetState() : nullptr;
-    return dialog != nullptr ? objectOf(nextTabItem(*dialog, start, directionOf(previous))) : nullptr;
+    const Window* start = from ? from->GetState() : nullptr;
+    return dialog ? objectOf(nextTabItem(*dialog, start, directionOf(previous))) : nullptr;
 }
 
 CWnd* CWnd::GetNextDlgGroupItem(CWnd* from, BOOL previous) const {
-    const Window* start = from != nullptr ? from->GetState() : nullptr;
-    return start != nullptr ? objectOf(nextGroupItem(*start, directionOf(previous))) : nullptr;
+    const Window* start = from ? from->GetState() : nullptr;
+    return start ? objectOf(nextGroupItem(*start, directionOf(previous))) : nullptr;
 }
 
 // --- data exchange ---
@@ -142,7 +142,7 @@ public:
         // A focused control that is disabled would keep the keyboard away from the others.
         if (!on && ::GetFocus() == m_pOther->m_hWnd) {
             CWnd* next = m_pOther->GetParent()->GetNextDlgTabItem(m_pOther);
-            if (next != nullptr && next != m_pOther) {
+            if (next && next != m_pOther) {
                 next->SetFocus();
             }
         }
@@ -170,7 +170,7 @@ public:
 
 void CWnd::UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler) {
     const Window* window = GetState();
-    if (window == nullptr) {
+    if (!window) {
         return;
     }
     const auto children = window->children();
@@ -187,6 +187,6 @@ void CWnd::UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler) {
             continue;
         }
         const auto* button = dynamic_cast<const ButtonWindow*>(child);
-        element.DoUpdate(target, disableIfNoHandler && button != nullptr && button->isPushButton());
+        element.DoUpdate(target, disableIfNoHandler && button && button->isPushButton());
     }
 }

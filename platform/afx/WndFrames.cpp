@@ -1,7 +1,7 @@
 #include "platform/afx/Frame.h"
 
 CFrameWnd* CWnd::GetParentFrame() const {
-    for (CWnd* parent = GetParent(); parent != nullptr; parent = parent->GetParent()) {
+    for (CWnd* parent = GetParent(); parent; parent = parent->GetParent()) {
         if (parent->IsFrameWnd()) {
             return static_cast<CFrameWnd*>(parent);
         }
@@ -12,7 +12,7 @@ CFrameWnd* CWnd::GetParentFrame() const {
 CFrameWnd* CWnd::GetTopLevelFrame() const {
     auto* frame = const_cast<CWnd*>(this);
     CFrameWnd* top = IsFrameWnd() ? static_cast<CFrameWnd*>(frame) : GetParentFrame();
-    if (top == nullptr) {
+    if (!top) {
         return nullptr;
     }
     while (CFrameWnd* outer = top->GetParentFrame()) {

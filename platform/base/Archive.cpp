@@ -22,8 +22,9 @@ CArchive::CArchive(CFile* file, UINT mode, int bufferSize)
 }
 
 CArchive::~CArchive() {
-    if (m_mode & bNoFlushOnDelete)
+    if (m_mode & bNoFlushOnDelete) {
         return;
+    }
     try {
         Close();
     } catch (CException* e) {
@@ -44,18 +45,21 @@ CFile* CArchive::GetFile() const noexcept {
 }
 
 void CArchive::Flush() {
-    if (!m_file)
+    if (!m_file) {
         return;
+    }
     if (IsStoring()) {
         const auto count = static_cast<UINT>(std::exchange(m_position, 0));
-        if (count > 0)
+        if (count > 0) {
             m_file->Write(m_buffer.data(), count);
+        }
         return;
     }
     const auto unread = static_cast<LONGLONG>(m_end - m_position);
     m_position = m_end = 0;
-    if (unread > 0)
+    if (unread > 0) {
         m_file->Seek(-unread, CFile::current);
+    }
 }
 
 void CArchive::Close() {
@@ -80,20 +84,23 @@ UINT CArchive::Read(void* buffer, UINT count) {
 }
 
 void CArchive::EnsureRead(void* buffer, UINT count) {
-    if (Read(buffer, count) != count)
+    if (Read(buffer, count) != count) {
         fail(CArchiveException::endOfFile);
+    }
 }
 
 void CArchive::Write(const void* buffer, UINT count) {
     requireStoring();
-    if (count > m_buffer.size() - m_position)
+    if (count > m_buffer.size() - m_position) {
         Flush();
+    }
     if (count >= m_buffer.size()) {
         m_file->Write(buffer, count);
         return;
     }
-    if (count > 0)
+    if (count > 0) {
         std::memcpy(m_buffer.data() + m_position, buffer, count);
+    }
     m_position += count;
 }
 
@@ -107,12 +114,14 @@ BOOL CArchive::ReadString(CString& line) {
     BOOL any = FALSE;
     while (Read(&character, 1) == 1) {
         any = TRUE;
-        if (character == '\n')
+        if (character == '\n') {
             break;
+        }
         line.AppendChar(character);
     }
-    if (character == '\n' && line.Right(1) == "\r")
+    if (character == '\n' && line.Right(1) == "\r") {
         line.Truncate(line.GetLength() - 1);
+    }
     return any;
 }
 
@@ -122,16 +131,18 @@ void CArchive::WriteCount(DWORD_PTR count) {
         return;
     }
     *this << WORD{0xFFFF};
-    if (count < 0xFFFFFFFF)
+    if (count < 0xFFFFFFFF) {
         *this << static_cast<DWORD>(count);
-    else
+    } else {
         *this << DWORD{0xFFFFFFFF} << static_cast<ULONGLONG>(count);
+    }
 }
 
 DWORD_PTR CArchive::ReadCount() {
     const WORD small = get<WORD>();
-    if (small != 0xFFFF)
+    if (small != 0xFFFF) {
         return small;
+    }
     const DWORD large = get<DWORD>();
     return large != 0xFFFFFFFF ? large : get<ULONGLONG>();
 }
@@ -139,8 +150,9 @@ DWORD_PTR CArchive::ReadCount() {
 template <typename Unsigned>
 CArchive& CArchive::put(Unsigned value) {
     BYTE bytes[sizeof(Unsigned)];
-    for (std::size_t i = 0; i < sizeof bytes; ++i)
+    for (std::size_t i = 0; i < sizeof bytes; ++i) {
         bytes[i] = static_cast<BYTE>(value >> (8 * i));
+    }
     Write(bytes, sizeof bytes);
     return *this;
 }
@@ -150,8 +162,9 @@ Unsigned CArchive::get() {
     BYTE bytes[sizeof(Unsigned)];
     EnsureRead(bytes, sizeof bytes);
     Unsigned value = 0;
-    for (std::size_t i = 0; i < sizeof bytes; ++i)
+    for (std::size_t i = 0; i < sizeof bytes; ++i) {
         value = static_cast<Unsigned>(value | static_cast<Unsigned>(Unsigned{bytes[i]} << (8 * i)));
+    }
     return value;
 }
 
@@ -304,8 +317,9 @@ CArchive& CArchive::operator>>(bool& value) {
 CArchive& CArchive::operator>>(CString& text) {
     int characterSize = 1;
     UINT_PTR left = AfxReadStringLength(*this, characterSize);
-    if (left > static_cast<UINT_PTR>(INT_MAX) / static_cast<UINT_PTR>(characterSize))
+    if (left > static_cast<UINT_PTR>(INT_MAX) / static_cast<UINT_PTR>(characterSize)) {
         fail(CArchiveException::genericException);
+    }
     left *= static_cast<UINT_PTR>(characterSize);
     // Never more at once than was there before: a damaged length takes no more memory than the archive has bytes.
     CString bytes;
@@ -320,8 +334,9 @@ CArchive& CArchive::operator>>(CString& text) {
         return *this;
     }
     std::u16string wide;
-    for (int i = 0; i + 1 < bytes.GetLength(); i += 2)
+    for (int i = 0; i + 1 < bytes.GetLength(); i += 2) {
         wide += static_cast<char16_t>(MAKEWORD(bytes[i], bytes[i + 1]));
+    }
     text = CString(std::string_view(tvx::text::narrow(wide)));
     return *this;
 }
@@ -344,13 +359,15 @@ CArchive& CArchive::operator>>(RECT& rect) {
 }
 
 void CArchive::requireStoring() const {
-    if (!IsStoring() || !m_file)
+    if (!IsStoring() || !m_file) {
         fail(CArchiveException::readOnly);
+    }
 }
 
 void CArchive::requireLoading() const {
-    if (!IsLoading() || !m_file)
+    if (!IsLoading() || !m_file) {
         fail(CArchiveException::writeOnly);
+    }
 }
 
 BOOL CArchive::fill() {
@@ -365,8 +382,9 @@ void CArchive::fail(int cause) const {
 }
 
 void AfxWriteStringLength(CArchive& archive, UINT_PTR length, BOOL isWide) {
-    if (isWide)
+    if (isWide) {
         archive << BYTE{0xFF} << WORD{0xFFFE};
+    }
     if (length < 0xFF) {
         archive << static_cast<BYTE>(length);
         return;
@@ -377,10 +395,11 @@ void AfxWriteStringLength(CArchive& archive, UINT_PTR length, BOOL isWide) {
         return;
     }
     archive << WORD{0xFFFF};
-    if (length < 0xFFFFFFFF)
+    if (length < 0xFFFFFFFF) {
         archive << static_cast<DWORD>(length);
-    else
+    } else {
         archive << DWORD{0xFFFFFFFF} << static_cast<ULONGLONG>(length);
+    }
 }
 
 UINT_PTR AfxReadStringLength(CArchive& archive, int& characterSize) {
@@ -388,22 +407,26 @@ UINT_PTR AfxReadStringLength(CArchive& archive, int& characterSize) {
     BYTE small = 0;
     WORD medium = 0;
     archive >> small;
-    if (small < 0xFF)
+    if (small < 0xFF) {
         return small;
+    }
     archive >> medium;
     if (medium == 0xFFFE) {
         characterSize = 2;
         archive >> small;
-        if (small < 0xFF)
+        if (small < 0xFF) {
             return small;
+        }
         archive >> medium;
     }
-    if (medium < 0xFFFF)
+    if (medium < 0xFFFF) {
         return medium;
+    }
     DWORD large = 0;
     archive >> large;
-    if (large < 0xFFFFFFFF)
+    if (large < 0xFFFFFFFF) {
         return large;
+    }
     ULONGLONG huge = 0;
     archive >> huge;
     return huge;

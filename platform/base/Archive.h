@@ -215,17 +215,19 @@ void SerializeElements(CArchive& archive, TYPE* elements, INT_PTR count) {
                       archive >> *elements;
                   }) {
         for (TYPE* element = elements; element != elements + count; ++element) {
-            if (archive.IsStoring())
+            if (archive.IsStoring()) {
                 archive << *element;
-            else
+            } else {
                 archive >> *element;
+            }
         }
     } else if constexpr (std::is_trivially_copyable_v<TYPE> && !std::is_pointer_v<TYPE>) {
         for (TYPE* element = elements; element != elements + count; ++element) {
-            if (archive.IsStoring())
+            if (archive.IsStoring()) {
                 archive.Write(element, sizeof(TYPE));
-            else
+            } else {
                 archive.EnsureRead(element, sizeof(TYPE));
+            }
         }
     } else {
         AfxThrowNotSupportedException();

@@ -31,8 +31,9 @@ struct CArchive::ClassTag {
 /// Counts the objects that are being stored or loaded inside of each other.
 struct CArchive::Nesting {
     explicit Nesting(CArchive& owner) : archive(owner) {
-        if (archive.m_depth >= deepestNesting)
+        if (archive.m_depth >= deepestNesting) {
             archive.fail(CArchiveException::genericException);
+        }
         ++archive.m_depth;
     }
     ~Nesting() {
@@ -63,15 +64,17 @@ void CArchive::WriteObject(const CObject* object) {
 
 void CArchive::WriteClass(const CRuntimeClass* runtimeClass) {
     requireStoring();
-    if (runtimeClass->m_wSchema == notSerial)
+    if (runtimeClass->m_wSchema == notSerial) {
         AfxThrowNotSupportedException();
+    }
     if (const DWORD index = known(runtimeClass)) {
         writeTag(index, classMark, bigClassMark);
         return;
     }
     const auto length = static_cast<WORD>(std::strlen(runtimeClass->m_lpszClassName));
-    if (length > longestClassName)
+    if (length > longestClassName) {
         AfxThrowNotSupportedException();
+    }
     *this << newClassTag << static_cast<WORD>(runtimeClass->m_wSchema) << length;
     Write(runtimeClass->m_lpszClassName, length);
     remember(runtimeClass);
@@ -80,13 +83,15 @@ void CArchive::WriteClass(const CRuntimeClass* runtimeClass) {
 CObject* CArchive::ReadObject(const CRuntimeClass* expected) {
     requireLoading();
     const ClassTag tag = readTag();
-    if (tag.kind == ClassTag::object)
+    if (tag.kind == ClassTag::object) {
         return loadedObject(tag.index, expected);
+    }
     const Nesting nesting(*this);
     CRuntimeClass* const runtimeClass =
         tag.kind == ClassTag::newClass ? readNewClass() : m_loaded[tag.index].runtimeClass;
-    if (expected && !runtimeClass->IsDerivedFrom(expected))
+    if (expected && !runtimeClass->IsDerivedFrom(expected)) {
         fail(CArchiveException::badClass);
+    }
     m_objectSchema = tag.kind == ClassTag::newClass ? m_loaded.back().schema : m_loaded[tag.index].schema;
     return loadNewObject(runtimeClass);
 }
@@ -94,30 +99,35 @@ CObject* CArchive::ReadObject(const CRuntimeClass* expected) {
 CRuntimeClass* CArchive::ReadClass(const CRuntimeClass* expected) {
     requireLoading();
     const ClassTag tag = readTag();
-    if (tag.kind == ClassTag::object)
+    if (tag.kind == ClassTag::object) {
         fail(CArchiveException::badClass);
+    }
     CRuntimeClass* const runtimeClass =
         tag.kind == ClassTag::newClass ? readNewClass() : m_loaded[tag.index].runtimeClass;
-    if (expected && !runtimeClass->IsDerivedFrom(expected))
+    if (expected && !runtimeClass->IsDerivedFrom(expected)) {
         fail(CArchiveException::badClass);
+    }
     m_objectSchema = tag.kind == ClassTag::newClass ? m_loaded.back().schema : m_loaded[tag.index].schema;
     return runtimeClass;
 }
 
 void CArchive::MapObject(const CObject* object) {
-    if (!object)
+    if (!object) {
         return;
-    if (IsStoring())
+    }
+    if (IsStoring()) {
         remember(object);
-    else
+    } else {
         tvx::allocating([&] { m_loaded.push_back({.object = const_cast<CObject*>(object)}); });
+    }
 }
 
 void CArchive::SerializeClass(const CRuntimeClass* runtimeClass) {
-    if (IsStoring())
+    if (IsStoring()) {
         WriteClass(runtimeClass);
-    else if (ReadClass(runtimeClass) != runtimeClass)
+    } else if (ReadClass(runtimeClass) != runtimeClass) {
         fail(CArchiveException::badClass);
+    }
 }
 
 UINT CArchive::GetObjectSchema() noexcept {
@@ -135,25 +145,28 @@ DWORD CArchive::known(const void* address) {
 }
 
 DWORD CArchive::remember(const void* address) {
-    if (m_storedCount > largestIndex)
+    if (m_storedCount > largestIndex) {
         fail(CArchiveException::badIndex);
+    }
     tvx::allocating([&] { m_stored.emplace(address, m_storedCount); });
     return m_storedCount++;
 }
 
 void CArchive::writeTag(DWORD index, WORD smallMark, DWORD bigMark) {
-    if (index < bigTag)
+    if (index < bigTag) {
         *this << static_cast<WORD>(smallMark | index);
-    else
+    } else {
         *this << bigTag << (bigMark | index);
+    }
 }
 
 /// Reads a tag. The number of a class is checked here; an object's class is not known yet.
 CArchive::ClassTag CArchive::readTag() {
     WORD small = 0;
     *this >> small;
-    if (small == newClassTag)
+    if (small == newClassTag) {
         return {ClassTag::newClass, 0};
+    }
     DWORD index = small & ~classMark;
     bool isClass = (small & classMark) != 0;
     if (small == bigTag) {
@@ -162,8 +175,9 @@ CArchive::ClassTag CArchive::readTag() {
         isClass = (big & bigClassMark) != 0;
         index = big & ~bigClassMark;
     }
-    if (index >= m_loaded.size() || (isClass && !m_loaded[index].runtimeClass))
+    if (index >= m_loaded.size() || (isClass && !m_loaded[index].runtimeClass)) {
         fail(CArchiveException::badIndex);
+    }
     return {isClass ? ClassTag::oldClass : ClassTag::object, index};
 }
 
@@ -172,26 +186,31 @@ CRuntimeClass* CArchive::readNewClass() {
     WORD length = 0;
     *this >> schema >> length;
     char name[longestClassName + 1] = {};
-    if (length > longestClassName)
+    if (length > longestClassName) {
         fail(CArchiveException::badClass);
+    }
     EnsureRead(name, length);
     CRuntimeClass* const runtimeClass = CRuntimeClass::FromName(name);
     // Only classes that were made for archives: a file must not choose among all others.
-    if (!runtimeClass || runtimeClass->m_wSchema == notSerial)
+    if (!runtimeClass || runtimeClass->m_wSchema == notSerial) {
         fail(CArchiveException::badClass);
+    }
     const bool readsOthers = (runtimeClass->m_wSchema & VERSIONABLE_SCHEMA) != 0;
-    if (!readsOthers && schema != static_cast<WORD>(runtimeClass->m_wSchema))
+    if (!readsOthers && schema != static_cast<WORD>(runtimeClass->m_wSchema)) {
         fail(CArchiveException::badSchema);
+    }
     tvx::allocating([&] { m_loaded.push_back({.runtimeClass = runtimeClass, .schema = schema}); });
     return runtimeClass;
 }
 
 CObject* CArchive::loadedObject(DWORD index, const CRuntimeClass* expected) const {
     CObject* const object = m_loaded[index].object;
-    if (index != 0 && !object)
+    if (index != 0 && !object) {
         fail(CArchiveException::badIndex);
-    if (object && expected && !object->IsKindOf(expected))
+    }
+    if (object && expected && !object->IsKindOf(expected)) {
         fail(CArchiveException::badClass);
+    }
     return object;
 }
 
@@ -199,8 +218,9 @@ CObject* CArchive::loadedObject(DWORD index, const CRuntimeClass* expected) cons
 CObject* CArchive::loadNewObject(CRuntimeClass* runtimeClass) {
     const UINT schema = m_objectSchema;
     std::unique_ptr<CObject> object(runtimeClass->CreateObject());
-    if (!object)
+    if (!object) {
         fail(CArchiveException::badClass);
+    }
     const std::size_t index = m_loaded.size();
     MapObject(object.get());
     m_objectSchema = schema;

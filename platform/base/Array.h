@@ -105,8 +105,9 @@ public:
     /// Sets an element; the array grows to hold it, with default values between.
     void SetAtGrow(INT_PTR index, ARG_TYPE element) {
         TYPE kept(element);
-        if (index >= GetSize())
+        if (index >= GetSize()) {
             SetSize(index < INTPTR_MAX ? index + 1 : index);
+        }
         m_items[checked(index)] = std::move(kept);
     }
     /// Adds an element at the end.
@@ -135,21 +136,24 @@ public:
         const std::size_t place = countOf(index);
         const std::size_t copies = countOf(count);
         const TYPE kept(element);
-        if (place > m_items.size())
+        if (place > m_items.size()) {
             SetSize(index);
+        }
         tvx::allocating([&] { m_items.insert(m_items.begin() + index, copies, kept); });
     }
     /// Inserts the elements of another array.
     void InsertAt(INT_PTR index, const CArray* other) {
         const std::vector<TYPE> items(other->m_items);
-        if (countOf(index) > m_items.size())
+        if (countOf(index) > m_items.size()) {
             SetSize(index);
+        }
         tvx::allocating([&] { m_items.insert(m_items.begin() + index, items.begin(), items.end()); });
     }
     /// Removes `count` elements, all of which must exist.
     void RemoveAt(INT_PTR index, INT_PTR count = 1) {
-        if (index < 0 || count < 0 || index > GetSize() || count > GetSize() - index)
+        if (index < 0 || count < 0 || index > GetSize() || count > GetSize() - index) {
             AfxThrowInvalidArgException();
+        }
         m_items.erase(m_items.begin() + index, m_items.begin() + index + count);
     }
 
@@ -190,13 +194,15 @@ public:
 
 private:
     static std::size_t countOf(INT_PTR number) {
-        if (number < 0)
+        if (number < 0) {
             AfxThrowInvalidArgException();
+        }
         return static_cast<std::size_t>(number);
     }
     std::size_t checked(INT_PTR index) const {
-        if (index < 0 || index >= GetSize())
+        if (index < 0 || index >= GetSize()) {
             AfxThrowInvalidArgException();
+        }
         return static_cast<std::size_t>(index);
     }
 

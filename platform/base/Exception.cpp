@@ -25,8 +25,9 @@ constexpr int buttonOk = 1;
 
 int reportToStandardError(const CString& text, UINT, UINT fallback) {
     CString shown(text);
-    if (shown.IsEmpty() && (fallback == 0 || !shown.LoadString(fallback)))
+    if (shown.IsEmpty() && (fallback == 0 || !shown.LoadString(fallback))) {
         return buttonOk;
+    }
     std::fprintf(stderr, "%s\n", shown.GetString());
     return buttonOk;
 }
@@ -142,13 +143,15 @@ CString withFileName(LPCSTR format, const CString& fileName) {
 CException::CException(BOOL autoDelete) : m_bAutoDelete(autoDelete) {}
 
 void CException::Delete() {
-    if (m_bAutoDelete)
+    if (m_bAutoDelete) {
         delete this;
+    }
 }
 
 BOOL CException::GetErrorMessage(LPTSTR text, UINT capacity, UINT* helpContext) const {
-    if (helpContext)
+    if (helpContext) {
         *helpContext = 0;
+    }
     const CString description = Describe();
     if (text && capacity > 0) {
         const std::string_view whole = description.View();
@@ -243,8 +246,9 @@ void setExceptionReporter(ExceptionReporter reporter) noexcept {
 }
 
 ExceptionLink::~ExceptionLink() {
-    if (m_exception)
+    if (m_exception) {
         m_exception->Delete();
+    }
 }
 
 void ExceptionLink::hold(CException* exception) {

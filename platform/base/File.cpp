@@ -33,20 +33,22 @@ int systemFlags(UINT openFlags) {
     default:
         flags |= O_RDONLY;
     }
-    if (openFlags & CFile::modeCreate)
+    if (openFlags & CFile::modeCreate) {
         flags |= O_CREAT | (openFlags & CFile::modeNoTruncate ? 0 : O_TRUNC);
-    if (openFlags & CFile::osWriteThrough)
+    }
+    if (openFlags & CFile::osWriteThrough) {
         flags |= O_SYNC;
+    }
     return flags;
 }
 
 /// Opens a file, but no folder, which the system would open for reading. -1 with errno set on failure.
 int openFile(const std::string& path, int flags) {
     int opened = noDescriptor;
-    do
+    do {
         opened = ::open(path.c_str(), flags, newFileMode);
-    while (opened == noDescriptor && errno == EINTR);
-    struct stat state {};
+    } while (opened == noDescriptor && errno == EINTR);
+    struct stat state{};
     if (opened != noDescriptor && ::fstat(opened, &state) == 0 && S_ISDIR(state.st_mode)) {
         ::close(opened);
         errno = EISDIR;
@@ -57,8 +59,9 @@ int openFile(const std::string& path, int flags) {
 
 std::string requiredPath(LPCTSTR name, tvx::PathUse use = tvx::PathUse::existing) {
     std::optional<std::string> path = tvx::systemPath(name ? name : "", use);
-    if (!path)
+    if (!path) {
         AfxThrowFileException(CFileException::badPath, -1, name);
+    }
     return *std::move(path);
 }
 
@@ -70,13 +73,15 @@ std::size_t nameStart(std::string_view name) {
 /// A relative name with the current folder before it, in the form that the name has.
 CString absoluteName(LPCTSTR name) {
     const std::string_view given(name);
-    if (given.empty() || given.front() == '/' || given.front() == '\\' || tvx::hasDrive(given))
+    if (given.empty() || given.front() == '/' || given.front() == '\\' || tvx::hasDrive(given)) {
         return name;
+    }
     const bool isSystemForm = given.find('\\') == std::string_view::npos;
     std::error_code error;
     const std::string folder = isSystemForm ? std::filesystem::current_path(error).string() : tvx::currentFolderName();
-    if (folder.empty())
+    if (folder.empty()) {
         return name;
+    }
     const bool isRoot = folder.back() == '/' || folder.back() == '\\';
     return CString(std::string_view(folder)) + (isRoot ? "" : isSystemForm ? "/" : "\\") + name;
 }
@@ -92,8 +97,9 @@ void fillStatus(CFileStatus& status, const struct stat& state, const CString& fu
 
 int checkedOrigin(UINT from) {
     constexpr int origins[] = {SEEK_SET, SEEK_CUR, SEEK_END};
-    if (from >= std::size(origins))
+    if (from >= std::size(origins)) {
         AfxThrowInvalidArgException();
+    }
     return origins[from];
 }
 
@@ -101,13 +107,16 @@ int checkedOrigin(UINT from) {
 
 BYTE tvx::attributesOf(const struct stat& state, std::string_view name) {
     BYTE attributes = CFile::normal;
-    if (!(state.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)))
+    if (!(state.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH))) {
         attributes |= CFile::readOnly;
-    if (S_ISDIR(state.st_mode))
+    }
+    if (S_ISDIR(state.st_mode)) {
         attributes |= CFile::directory;
+    }
     const std::string_view last = name.substr(nameStart(name));
-    if (last.starts_with('.') && last != "." && last != "..")
+    if (last.starts_with('.') && last != "." && last != "..") {
         attributes |= CFile::hidden;
+    }
     return attributes;
 }
 
@@ -117,8 +126,9 @@ BOOL AfxComparePath(LPCTSTR first, LPCTSTR second) {
 
 CFile::CFile(LPCTSTR fileName, UINT openFlags) {
     CFileException error;
-    if (!CFile::Open(fileName, openFlags, &error))
+    if (!CFile::Open(fileName, openFlags, &error)) {
         AfxThrowFileException(error.m_cause, error.m_lOsError, error.m_strFileName);
+    }
 }
 
 CFile::~CFile() {
@@ -144,8 +154,9 @@ BOOL CFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
 
 CFile* CFile::Duplicate() const {
     const int copied = ::fcntl(m_descriptor, F_DUPFD_CLOEXEC, 0);
-    if (copied == noDescriptor)
+    if (copied == noDescriptor) {
         throwLastError();
+    }
     auto* const duplicate = new CFile;
     duplicate->m_descriptor = copied;
     duplicate->m_fileName = m_fileName;
@@ -153,18 +164,21 @@ CFile* CFile::Duplicate() const {
 }
 
 void CFile::Close() {
-    if (m_descriptor == noDescriptor)
+    if (m_descriptor == noDescriptor) {
         return;
+    }
     // The system releases the number even when closing fails, so it is never closed twice.
     const bool closed = ::close(std::exchange(m_descriptor, noDescriptor)) == 0 || errno == EINTR;
-    if (!closed)
+    if (!closed) {
         throwLastError();
+    }
     m_fileName.Empty();
 }
 
 void CFile::Abort() {
-    if (m_descriptor != noDescriptor)
+    if (m_descriptor != noDescriptor) {
         ::close(std::exchange(m_descriptor, noDescriptor));
+    }
     m_fileName.Empty();
 }
 
@@ -172,12 +186,15 @@ UINT CFile::Read(void* buffer, UINT count) {
     UINT total = 0;
     while (total < count) {
         const ssize_t got = ::read(m_descriptor, static_cast<BYTE*>(buffer) + total, count - total);
-        if (got < 0 && errno == EINTR)
+        if (got < 0 && errno == EINTR) {
             continue;
-        if (got < 0)
+        }
+        if (got < 0) {
             throwLastError();
-        if (got == 0)
+        }
+        if (got == 0) {
             break;
+        }
         total += static_cast<UINT>(got);
     }
     return total;
@@ -187,26 +204,31 @@ void CFile::Write(const void* buffer, UINT count) {
     UINT total = 0;
     while (total < count) {
         const ssize_t put = ::write(m_descriptor, static_cast<const BYTE*>(buffer) + total, count - total);
-        if (put < 0 && errno == EINTR)
+        if (put < 0 && errno == EINTR) {
             continue;
-        if (put < 0)
+        }
+        if (put < 0) {
             throwLastError();
+        }
         total += static_cast<UINT>(put);
     }
 }
 
 void CFile::Flush() {
     // Pipes and terminals cannot be flushed and need not be.
-    if (m_descriptor != noDescriptor && ::fsync(m_descriptor) != 0 && errno != EINVAL && errno != EROFS)
+    if (m_descriptor != noDescriptor && ::fsync(m_descriptor) != 0 && errno != EINVAL && errno != EROFS) {
         throwLastError();
+    }
 }
 
 ULONGLONG CFile::Seek(LONGLONG offset, UINT from) {
     const off_t position = ::lseek(m_descriptor, offset, checkedOrigin(from));
-    if (position >= 0)
+    if (position >= 0) {
         return static_cast<ULONGLONG>(position);
-    if (errno == EINVAL || errno == EOVERFLOW)
+    }
+    if (errno == EINVAL || errno == EOVERFLOW) {
         AfxThrowFileException(CFileException::badSeek, errno, m_fileName);
+    }
     throwLastError();
 }
 
@@ -220,23 +242,27 @@ void CFile::SeekToBegin() {
 
 ULONGLONG CFile::GetPosition() const {
     const off_t position = ::lseek(m_descriptor, 0, SEEK_CUR);
-    if (position < 0)
+    if (position < 0) {
         throwLastError();
+    }
     return static_cast<ULONGLONG>(position);
 }
 
 ULONGLONG CFile::GetLength() const {
-    struct stat state {};
-    if (::fstat(m_descriptor, &state) != 0)
+    struct stat state{};
+    if (::fstat(m_descriptor, &state) != 0) {
         throwLastError();
+    }
     return static_cast<ULONGLONG>(state.st_size);
 }
 
 void CFile::SetLength(ULONGLONG length) {
-    if (length > static_cast<ULONGLONG>(std::numeric_limits<off_t>::max()))
+    if (length > static_cast<ULONGLONG>(std::numeric_limits<off_t>::max())) {
         AfxThrowFileException(CFileException::diskFull, EFBIG, m_fileName);
-    if (::ftruncate(m_descriptor, static_cast<off_t>(length)) != 0)
+    }
+    if (::ftruncate(m_descriptor, static_cast<off_t>(length)) != 0) {
         throwLastError();
+    }
 }
 
 CString CFile::GetFilePath() const {
@@ -258,18 +284,20 @@ void CFile::SetFilePath(LPCTSTR name) {
 }
 
 BOOL CFile::GetStatus(CFileStatus& status) const {
-    struct stat state {};
-    if (::fstat(m_descriptor, &state) != 0)
+    struct stat state{};
+    if (::fstat(m_descriptor, &state) != 0) {
         return FALSE;
+    }
     fillStatus(status, state, m_fileName);
     return TRUE;
 }
 
 BOOL CFile::GetStatus(LPCTSTR fileName, CFileStatus& status) {
     const std::optional<std::string> path = tvx::systemPath(fileName ? fileName : "");
-    struct stat state {};
-    if (!path || ::stat(path->c_str(), &state) != 0)
+    struct stat state{};
+    if (!path || ::stat(path->c_str(), &state) != 0) {
         return FALSE;
+    }
     fillStatus(status, state, absoluteName(fileName));
     return TRUE;
 }
@@ -280,18 +308,21 @@ void CFile::Rename(LPCTSTR oldName, LPCTSTR newName) {
     int result = ::renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str(), RENAME_NOREPLACE);
     // Some network file systems cannot refuse to replace; there the name is asked for first.
     if (result != 0 && errno == EINVAL) {
-        if (::access(to.c_str(), F_OK) == 0)
+        if (::access(to.c_str(), F_OK) == 0) {
             errno = EEXIST;
-        else
+        } else {
             result = ::rename(from.c_str(), to.c_str());
+        }
     }
-    if (result != 0)
+    if (result != 0) {
         CFileException::ThrowErrno(errno, oldName);
+    }
 }
 
 void CFile::Remove(LPCTSTR fileName) {
-    if (::unlink(requiredPath(fileName).c_str()) != 0)
+    if (::unlink(requiredPath(fileName).c_str()) != 0) {
         CFileException::ThrowErrno(errno, fileName);
+    }
 }
 
 BOOL CFile::IsOpen() const noexcept {

@@ -323,11 +323,12 @@ public:
     constexpr BOOL UnionRect(LPCRECT first, LPCRECT second) noexcept {
         const CRect a(first);
         const CRect b(second);
-        if (a.IsRectEmpty() || b.IsRectEmpty())
+        if (a.IsRectEmpty() || b.IsRectEmpty()) {
             *this = !a.IsRectEmpty() ? a : !b.IsRectEmpty() ? b : CRect();
-        else
+        } else {
             *this = CRect(a.left < b.left ? a.left : b.left, a.top < b.top ? a.top : b.top,
                           a.right > b.right ? a.right : b.right, a.bottom > b.bottom ? a.bottom : b.bottom);
+        }
         return !IsRectEmpty();
     }
     /// Becomes `first` without the part under `second`, where what is left is a rectangle: `second` must cover `first`
@@ -338,15 +339,17 @@ public:
         CRect rest = whole;
         if (common.IntersectRect(first, second)) {
             if (common.top == whole.top && common.bottom == whole.bottom) {
-                if (common.left == whole.left)
+                if (common.left == whole.left) {
                     rest.left = common.right;
-                else if (common.right == whole.right)
+                } else if (common.right == whole.right) {
                     rest.right = common.left;
+                }
             } else if (common.left == whole.left && common.right == whole.right) {
-                if (common.top == whole.top)
+                if (common.top == whole.top) {
                     rest.top = common.bottom;
-                else if (common.bottom == whole.bottom)
+                } else if (common.bottom == whole.bottom) {
                     rest.bottom = common.top;
+                }
             }
         }
         *this = rest.IsRectEmpty() ? CRect() : rest;

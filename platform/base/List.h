@@ -84,19 +84,22 @@ public:
     /// Puts the elements of another list, in its order, before the first one.
     void AddHead(const CList* other) {
         POSITION at = other->GetTailPosition();
-        for (INT_PTR left = other->GetCount(); left > 0; --left)
+        for (INT_PTR left = other->GetCount(); left > 0; --left) {
             AddHead(other->GetPrev(at));
+        }
     }
     /// Puts the elements of another list, in its order, behind the last one.
     void AddTail(const CList* other) {
         POSITION at = other->GetHeadPosition();
-        for (INT_PTR left = other->GetCount(); left > 0; --left)
+        for (INT_PTR left = other->GetCount(); left > 0; --left) {
             AddTail(other->GetNext(at));
+        }
     }
     /// Removes all elements; all positions end.
     void RemoveAll() noexcept {
-        while (m_head)
+        while (m_head) {
             delete std::exchange(m_head, m_head->next);
+        }
         m_tail = nullptr;
         m_count = 0;
     }
@@ -156,18 +159,21 @@ public:
     /// The first element equal to `value` behind `startAfter` (null: from the beginning), or null.
     POSITION Find(ARG_TYPE value, POSITION startAfter = nullptr) const {
         for (Node* at = startAfter ? node(startAfter).next : m_head; at; at = at->next) {
-            if (at->value == value)
+            if (at->value == value) {
                 return positionOf(at);
+            }
         }
         return nullptr;
     }
     /// The element with a number, from 0; null when there are not so many.
     POSITION FindIndex(INT_PTR index) const {
-        if (index < 0)
+        if (index < 0) {
             return nullptr;
+        }
         Node* at = m_head;
-        while (at && index-- > 0)
+        while (at && index-- > 0) {
             at = at->next;
+        }
         return positionOf(at);
     }
 
@@ -176,8 +182,9 @@ public:
         CObject::Serialize(archive);
         if (archive.IsStoring()) {
             archive.WriteCount(static_cast<DWORD_PTR>(m_count));
-            for (Node* at = m_head; at; at = at->next)
+            for (Node* at = m_head; at; at = at->next) {
                 SerializeElements(archive, &at->value, 1);
+            }
             return;
         }
         for (DWORD_PTR left = archive.ReadCount(); left > 0; --left) {
@@ -198,8 +205,9 @@ private:
         return reinterpret_cast<POSITION>(at);
     }
     static Node& node(POSITION position) {
-        if (!position)
+        if (!position) {
             AfxThrowInvalidArgException();
+        }
         return *reinterpret_cast<Node*>(position);
     }
     POSITION link(ARG_TYPE element, Node* previous, Node* next) {

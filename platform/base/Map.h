@@ -18,10 +18,11 @@
 template <typename ARG_KEY>
 UINT HashKey(ARG_KEY key) {
     using Key = std::remove_cvref_t<ARG_KEY>;
-    if constexpr (std::is_convertible_v<Key, LPCSTR>)
+    if constexpr (std::is_convertible_v<Key, LPCSTR>) {
         return static_cast<UINT>(std::hash<std::string_view>()(static_cast<LPCSTR>(key)));
-    else
+    } else {
         return static_cast<UINT>(std::hash<Key>()(key));
+    }
 }
 
 /// A hash map of values, held by whoever made it. Keys compare with ==. The order of its elements is arbitrary.
@@ -62,16 +63,18 @@ public:
     /// @return whether the key is known
     BOOL Lookup(ARG_KEY key, VALUE& value) const {
         const auto found = m_items.find(key);
-        if (found == m_items.end())
+        if (found == m_items.end()) {
             return FALSE;
+        }
         value = found->second;
         return TRUE;
     }
     /// The value of a key, which is added with a default value when it is unknown.
     VALUE& operator[](ARG_KEY key) {
         const auto found = m_items.find(key);
-        if (found != m_items.end())
+        if (found != m_items.end()) {
             return found->second;
+        }
         VALUE* added = nullptr;
         tvx::allocating([&] { added = &m_items.emplace(key, VALUE()).first->second; });
         return *added;
@@ -83,8 +86,9 @@ public:
     /// @return whether the key was known
     BOOL RemoveKey(ARG_KEY key) {
         const auto found = m_items.find(key);
-        if (found == m_items.end())
+        if (found == m_items.end()) {
             return FALSE;
+        }
         m_items.erase(found);
         return TRUE;
     }
@@ -94,8 +98,9 @@ public:
     }
     /// Prepares the map for so many elements.
     void InitHashTable(UINT size, BOOL allocateNow = TRUE) {
-        if (allocateNow)
+        if (allocateNow) {
             tvx::allocating([&] { m_items.reserve(size); });
+        }
     }
 
     /// Where an iteration over all elements begins; null for an empty map. Adding elements ends an iteration.
@@ -104,8 +109,9 @@ public:
     }
     /// The key and value at a position, which moves to the next element, null behind the last.
     void GetNextAssoc(POSITION& position, KEY& key, VALUE& value) const {
-        if (!position)
+        if (!position) {
             AfxThrowInvalidArgException();
+        }
         auto current = m_items.find(reinterpret_cast<const typename Items::value_type*>(position)->first);
         key = current->first;
         value = current->second;
@@ -151,8 +157,9 @@ private:
     using Items = std::unordered_map<KEY, VALUE, Hash, Equal>;
 
     POSITION positionOf(typename Items::const_iterator at) const {
-        if (at == m_items.end())
+        if (at == m_items.end()) {
             return nullptr;
+        }
         return reinterpret_cast<POSITION>(const_cast<typename Items::value_type*>(&*at));
     }
 

@@ -63,17 +63,20 @@ void CMemFile::Abort() {
 UINT CMemFile::Read(void* buffer, UINT count) {
     const ULONGLONG left = m_position < m_length ? m_length - m_position : 0;
     const auto read = static_cast<UINT>(std::min<ULONGLONG>(count, left));
-    if (read > 0)
+    if (read > 0) {
         std::memcpy(buffer, m_data + m_position, read);
+    }
     m_position += read;
     return read;
 }
 
 void CMemFile::Write(const void* buffer, UINT count) {
-    if (count == 0)
+    if (count == 0) {
         return;
-    if (m_position + count > m_length)
+    }
+    if (m_position + count > m_length) {
         SetLength(m_position + count);
+    }
     std::memcpy(m_data + m_position, buffer, count);
     m_position += count;
 }
@@ -81,12 +84,14 @@ void CMemFile::Write(const void* buffer, UINT count) {
 void CMemFile::Flush() {}
 
 ULONGLONG CMemFile::Seek(LONGLONG offset, UINT from) {
-    if (from > end)
+    if (from > end) {
         AfxThrowInvalidArgException();
+    }
     const ULONGLONG base = from == begin ? 0 : from == current ? m_position : m_length;
     const ULONGLONG position = base + static_cast<ULONGLONG>(offset);
-    if (position > largestFile)
+    if (position > largestFile) {
         AfxThrowFileException(CFileException::badSeek);
+    }
     return m_position = position;
 }
 
@@ -100,8 +105,9 @@ ULONGLONG CMemFile::GetLength() const {
 
 void CMemFile::SetLength(ULONGLONG length) {
     reserve(length);
-    if (length > m_length)
+    if (length > m_length) {
         std::memset(m_data + m_length, 0, length - m_length);
+    }
     m_length = length;
 }
 
@@ -110,14 +116,17 @@ BOOL CMemFile::IsOpen() const noexcept {
 }
 
 void CMemFile::reserve(ULONGLONG size) {
-    if (size <= m_capacity)
+    if (size <= m_capacity) {
         return;
-    if (m_attached || size > largestFile)
+    }
+    if (m_attached || size > largestFile) {
         AfxThrowMemoryException();
+    }
     const ULONGLONG capacity = std::max<ULONGLONG>({size, m_capacity + m_capacity / 2, 1024});
     void* const grown = std::realloc(m_own.get(), capacity);
-    if (!grown)
+    if (!grown) {
         AfxThrowMemoryException();
+    }
     static_cast<void>(m_own.release());
     m_own.reset(static_cast<BYTE*>(grown));
     m_data = m_own.get();

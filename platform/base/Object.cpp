@@ -18,8 +18,9 @@ bool isTracing() {
 }
 
 void trace(const char* text) {
-    if (isTracing())
+    if (isTracing()) {
         std::fputs(text, stderr);
+    }
 }
 
 } // namespace
@@ -43,17 +44,20 @@ CObject* CRuntimeClass::CreateObject() {
 
 BOOL CRuntimeClass::IsDerivedFrom(const CRuntimeClass* base) const {
     const CRuntimeClass* current = this;
-    while (current && current != base)
+    while (current && current != base) {
         current = current->m_pfnGetBaseClass ? current->m_pfnGetBaseClass() : nullptr;
+    }
     return current ? TRUE : FALSE;
 }
 
 CRuntimeClass* CRuntimeClass::FromName(LPCSTR name) {
-    if (!name)
+    if (!name) {
         return nullptr;
+    }
     for (CRuntimeClass* current = firstClass; current; current = current->m_pNextClass) {
-        if (std::strcmp(current->m_lpszClassName, name) == 0)
+        if (std::strcmp(current->m_lpszClassName, name) == 0) {
             return current;
+        }
     }
     return nullptr;
 }
@@ -138,8 +142,9 @@ CDumpContext& CDumpContext::operator<<(const void* address) {
 }
 
 CDumpContext& CDumpContext::operator<<(const CObject* object) {
-    if (!object)
+    if (!object) {
         return *this << "NULL";
+    }
     return *this << *object;
 }
 
@@ -157,8 +162,9 @@ void CDumpContext::SetDepth(int depth) {
 }
 
 void AfxTrace(LPCSTR format, ...) {
-    if (!isTracing())
+    if (!isTracing()) {
         return;
+    }
     std::va_list arguments;
     va_start(arguments, format);
     trace(tvx::text::formatV(format, arguments).c_str());
@@ -171,7 +177,8 @@ void AfxAssertFailed(LPCSTR condition, LPCSTR fileName, int line) {
 }
 
 void AfxAssertValidObject(const CObject* object, LPCSTR fileName, int line) {
-    if (!object)
+    if (!object) {
         AfxAssertFailed("the object is not null", fileName, line);
+    }
     object->AssertValid();
 }

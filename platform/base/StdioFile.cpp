@@ -27,8 +27,9 @@ CStdioFile::CStdioFile(std::FILE* stream) : m_pStream(stream) {
 
 CStdioFile::CStdioFile(LPCTSTR fileName, UINT openFlags) {
     CFileException error;
-    if (!CStdioFile::Open(fileName, openFlags, &error))
+    if (!CStdioFile::Open(fileName, openFlags, &error)) {
         AfxThrowFileException(error.m_cause, error.m_lOsError, error.m_strFileName);
+    }
 }
 
 CStdioFile::~CStdioFile() {
@@ -37,8 +38,9 @@ CStdioFile::~CStdioFile() {
 
 BOOL CStdioFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
     CStdioFile::Abort();
-    if (!CFile::Open(fileName, openFlags, error))
+    if (!CFile::Open(fileName, openFlags, error)) {
         return FALSE;
+    }
     m_pStream = ::fdopen(descriptor(), streamMode(openFlags));
     if (!m_pStream) {
         CFile::Abort();
@@ -54,12 +56,14 @@ CFile* CStdioFile::Duplicate() const {
 }
 
 void CStdioFile::Close() {
-    if (!m_pStream)
+    if (!m_pStream) {
         return;
+    }
     // The stream closes the file that the base knows.
     detach();
-    if (std::fclose(std::exchange(m_pStream, nullptr)) != 0)
+    if (std::fclose(std::exchange(m_pStream, nullptr)) != 0) {
         throwLastError();
+    }
     CFile::Abort();
 }
 
@@ -75,19 +79,22 @@ BOOL CStdioFile::ReadString(CString& line) {
     line.Empty();
     int character = nextCharacter();
     const bool any = character != EOF;
-    for (; character != EOF && character != '\n'; character = nextCharacter())
+    for (; character != EOF && character != '\n'; character = nextCharacter()) {
         line.AppendChar(static_cast<char>(character));
+    }
     checkReadError();
     return any;
 }
 
 LPTSTR CStdioFile::ReadString(LPTSTR buffer, UINT capacity) {
-    if (capacity == 0)
+    if (capacity == 0) {
         return nullptr;
+    }
     UINT length = 0;
     int character = 0;
-    while (length + 1 < capacity && character != '\n' && (character = nextCharacter()) != EOF)
+    while (length + 1 < capacity && character != '\n' && (character = nextCharacter()) != EOF) {
         buffer[length++] = static_cast<char>(character);
+    }
     buffer[length] = '\0';
     checkReadError();
     return length > 0 ? buffer : nullptr;
@@ -105,30 +112,35 @@ UINT CStdioFile::Read(void* buffer, UINT count) {
         return read;
     }
     UINT total = 0;
-    for (int character = 0; total < count && (character = nextCharacter()) != EOF;)
+    for (int character = 0; total < count && (character = nextCharacter()) != EOF;) {
         static_cast<char*>(buffer)[total++] = static_cast<char>(character);
+    }
     checkReadError();
     return total;
 }
 
 void CStdioFile::Write(const void* buffer, UINT count) {
     turn(Direction::writing);
-    if (std::fwrite(buffer, 1, count, stream()) != count)
+    if (std::fwrite(buffer, 1, count, stream()) != count) {
         throwLastError();
+    }
 }
 
 void CStdioFile::Flush() {
-    if (m_pStream && std::fflush(m_pStream) != 0)
+    if (m_pStream && std::fflush(m_pStream) != 0) {
         throwLastError();
+    }
 }
 
 ULONGLONG CStdioFile::Seek(LONGLONG offset, UINT from) {
     constexpr int origins[] = {SEEK_SET, SEEK_CUR, SEEK_END};
-    if (from > end)
+    if (from > end) {
         AfxThrowInvalidArgException();
+    }
     if (::fseeko(stream(), offset, origins[from]) != 0) {
-        if (errno == EINVAL || errno == EOVERFLOW)
+        if (errno == EINVAL || errno == EOVERFLOW) {
             AfxThrowFileException(CFileException::badSeek, errno, GetFilePath());
+        }
         throwLastError();
     }
     m_direction = Direction::none;
@@ -137,14 +149,16 @@ ULONGLONG CStdioFile::Seek(LONGLONG offset, UINT from) {
 
 ULONGLONG CStdioFile::GetPosition() const {
     const off_t position = ::ftello(stream());
-    if (position < 0)
+    if (position < 0) {
         throwLastError();
+    }
     return static_cast<ULONGLONG>(position);
 }
 
 ULONGLONG CStdioFile::GetLength() const {
-    if (std::fflush(stream()) != 0)
+    if (std::fflush(stream()) != 0) {
         throwLastError();
+    }
     return CFile::GetLength();
 }
 
@@ -155,21 +169,25 @@ void CStdioFile::SetLength(ULONGLONG length) {
 
 /// Between reading and writing a stream must be repositioned.
 void CStdioFile::turn(Direction direction) {
-    if (m_direction != Direction::none && m_direction != direction)
+    if (m_direction != Direction::none && m_direction != direction) {
         std::fseek(stream(), 0, SEEK_CUR);
+    }
     m_direction = direction;
 }
 
 int CStdioFile::nextCharacter() {
     turn(Direction::reading);
     const int character = std::getc(stream());
-    if (!m_text || character != '\r')
+    if (!m_text || character != '\r') {
         return character;
+    }
     const int following = std::getc(stream());
-    if (following == '\n')
+    if (following == '\n') {
         return following;
-    if (following != EOF)
+    }
+    if (following != EOF) {
         std::ungetc(following, stream());
+    }
     return character;
 }
 
@@ -181,7 +199,8 @@ void CStdioFile::checkReadError() {
 }
 
 std::FILE* CStdioFile::stream() const {
-    if (!m_pStream)
+    if (!m_pStream) {
         AfxThrowFileException(CFileException::invalidFile, EBADF);
+    }
     return m_pStream;
 }

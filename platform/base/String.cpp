@@ -43,16 +43,18 @@ Header& headerOf(const char* text) noexcept {
 constexpr std::size_t largestLength = INT_MAX - sizeof(Header) - 1;
 
 int checkedLength(std::size_t length) {
-    if (length > largestLength)
+    if (length > largestLength) {
         AfxThrowMemoryException();
+    }
     return static_cast<int>(length);
 }
 
 char* newBuffer(std::size_t length, std::size_t capacity) {
     const int checked = checkedLength(std::max(length, capacity));
     void* const memory = std::malloc(sizeof(Header) + static_cast<std::size_t>(checked) + 1);
-    if (!memory)
+    if (!memory) {
         AfxThrowMemoryException();
+    }
     auto* const header = new (memory) Header{1, static_cast<int>(length), checked};
     char* const text = reinterpret_cast<char*>(header) + sizeof(Header);
     text[length] = '\0';
@@ -60,30 +62,35 @@ char* newBuffer(std::size_t length, std::size_t capacity) {
 }
 
 char* newText(std::string_view content) {
-    if (content.empty())
+    if (content.empty()) {
         return emptyText();
+    }
     char* const text = newBuffer(content.size(), content.size());
     std::memcpy(text, content.data(), content.size());
     return text;
 }
 
 char* share(char* text) {
-    if (text == emptyText())
+    if (text == emptyText()) {
         return text;
+    }
     Header& header = headerOf(text);
-    if (header.owners.load(std::memory_order_relaxed) == locked)
+    if (header.owners.load(std::memory_order_relaxed) == locked) {
         return newText({text, static_cast<std::size_t>(header.length)});
+    }
     header.owners.fetch_add(1, std::memory_order_relaxed);
     return text;
 }
 
 void release(char* text) noexcept {
-    if (text == emptyText())
+    if (text == emptyText()) {
         return;
+    }
     Header& header = headerOf(text);
     const int owners = header.owners.load(std::memory_order_acquire);
-    if (owners == 1 || owners == locked || header.owners.fetch_sub(1, std::memory_order_acq_rel) == 1)
+    if (owners == 1 || owners == locked || header.owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
         std::free(&header);
+    }
 }
 
 /// Frees a buffer at the end of a scope, so that text which points into it can still be copied.
@@ -105,8 +112,9 @@ bool isShared(const char* text) noexcept {
 }
 
 int nonNegative(int length) {
-    if (length < 0)
+    if (length < 0) {
         AfxThrowInvalidArgException();
+    }
     return length;
 }
 
@@ -129,8 +137,9 @@ CStringT<char>::CStringT(const char* text, int length) : CStringT() {
 }
 
 CStringT<char>::CStringT(char character, int repeat) : CStringT() {
-    if (repeat > 0)
+    if (repeat > 0) {
         std::memset(GetBufferSetLength(repeat), character, static_cast<std::size_t>(repeat));
+    }
 }
 
 CStringT<char>::CStringT(const unsigned char* text) : CStringT(reinterpret_cast<const char*>(text)) {}
@@ -186,14 +195,16 @@ char CStringT<char>::GetAt(int index) const {
 }
 
 char CStringT<char>::operator[](INT_PTR index) const {
-    if (index < 0 || index > GetLength())
+    if (index < 0 || index > GetLength()) {
         AfxThrowInvalidArgException();
+    }
     return m_text[index];
 }
 
 void CStringT<char>::SetAt(int index, char character) {
-    if (index < 0 || index >= GetLength())
+    if (index < 0 || index >= GetLength()) {
         AfxThrowInvalidArgException();
+    }
     GetBuffer()[index] = character;
 }
 
@@ -221,16 +232,19 @@ char* CStringT<char>::GetBufferSetLength(int length) {
 }
 
 void CStringT<char>::ReleaseBuffer(int length) {
-    if (length < 0)
+    if (length < 0) {
         length = static_cast<int>(std::find(m_text, m_text + GetAllocLength(), '\0') - m_text);
+    }
     ReleaseBufferSetLength(length);
 }
 
 void CStringT<char>::ReleaseBufferSetLength(int length) {
-    if (length < 0 || length > GetAllocLength())
+    if (length < 0 || length > GetAllocLength()) {
         AfxThrowInvalidArgException();
-    if (m_text != emptyText())
+    }
+    if (m_text != emptyText()) {
         setLength(length);
+    }
 }
 
 char* CStringT<char>::LockBuffer() {
@@ -240,8 +254,9 @@ char* CStringT<char>::LockBuffer() {
 }
 
 void CStringT<char>::UnlockBuffer() noexcept {
-    if (headerOf(m_text).owners == locked)
+    if (headerOf(m_text).owners == locked) {
         headerOf(m_text).owners = 1;
+    }
 }
 
 void CStringT<char>::Preallocate(int length) {
@@ -249,19 +264,22 @@ void CStringT<char>::Preallocate(int length) {
 }
 
 void CStringT<char>::FreeExtra() {
-    if (GetLength() != GetAllocLength())
+    if (GetLength() != GetAllocLength()) {
         *this = CStringT(View());
+    }
 }
 
 void CStringT<char>::Truncate(int length) {
-    if (length < GetLength())
+    if (length < GetLength()) {
         GetBufferSetLength(nonNegative(length));
+    }
 }
 
 CStringT<char> CStringT<char>::join(std::string_view left, std::string_view right) {
     const std::size_t length = left.size() + right.size();
-    if (length == 0)
+    if (length == 0) {
         return {};
+    }
     char* const text = newBuffer(length, length);
     std::copy(left.begin(), left.end(), text);
     std::copy(right.begin(), right.end(), text + left.size());
@@ -273,14 +291,16 @@ void CStringT<char>::assign(std::string_view text) {
         const BufferKeeper old(std::exchange(m_text, newText(text)));
         return;
     }
-    if (!text.empty())
+    if (!text.empty()) {
         std::memmove(m_text, text.data(), text.size());
+    }
     setLength(static_cast<int>(text.size()));
 }
 
 void CStringT<char>::append(std::string_view text) {
-    if (text.empty())
+    if (text.empty()) {
         return;
+    }
     const std::size_t oldLength = static_cast<std::size_t>(GetLength());
     const int length = checkedLength(oldLength + text.size());
     if (isShared(m_text) || length > GetAllocLength()) {
@@ -299,8 +319,9 @@ void CStringT<char>::append(std::string_view text) {
 
 /// Makes the buffer this string's alone, with room for at least `capacity` bytes. The text stays.
 void CStringT<char>::makeOwn(int capacity) {
-    if (!isShared(m_text) && capacity <= GetAllocLength())
+    if (!isShared(m_text) && capacity <= GetAllocLength()) {
         return;
+    }
     const auto length = static_cast<std::size_t>(GetLength());
     char* const own = newBuffer(length, static_cast<std::size_t>(std::max(capacity, GetLength())));
     std::memcpy(own, m_text, length);

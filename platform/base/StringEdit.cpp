@@ -24,17 +24,19 @@ public:
         for (std::size_t at = 0; at < set.size();) {
             const std::size_t length = tvx::text::characterLength(set, at);
             const auto byte = static_cast<unsigned char>(set[at]);
-            if (byte < m_ascii.size())
+            if (byte < m_ascii.size()) {
                 m_ascii[byte] = true;
-            else
+            } else {
                 m_others.push_back(set.substr(at, length));
+            }
             at += length;
         }
     }
     bool contains(std::string_view character) const {
         const auto byte = static_cast<unsigned char>(character.front());
-        if (byte < m_ascii.size())
+        if (byte < m_ascii.size()) {
             return m_ascii[byte];
+        }
         return std::ranges::find(m_others, character) != m_others.end();
     }
 
@@ -51,8 +53,9 @@ std::size_t findMember(std::string_view text, std::string_view characters, Membe
     while (at < text.size()) {
         const bool isAscii = static_cast<unsigned char>(text[at]) < 0x80;
         const std::size_t length = isAscii ? 1 : tvx::text::characterLength(text, at);
-        if (set.contains(text.substr(at, length)) == (wanted == Member::yes))
+        if (set.contains(text.substr(at, length)) == (wanted == Member::yes)) {
             return at;
+        }
         at += length;
     }
     return text.size();
@@ -64,8 +67,9 @@ std::size_t trimmedEnd(std::string_view text, std::string_view characters) {
     std::size_t end = text.size();
     while (end > 0) {
         const std::size_t last = tvx::text::previousCharacter(text, end);
-        if (!set.contains(text.substr(last, end - last)))
+        if (!set.contains(text.substr(last, end - last))) {
             break;
+        }
         end = last;
     }
     return end;
@@ -112,8 +116,9 @@ CStringT<char> CStringT<char>::Mid(int first) const {
 CStringT<char> CStringT<char>::Mid(int first, int count) const {
     const int begin = std::clamp(first, 0, GetLength());
     const int length = std::clamp(count, 0, GetLength() - begin);
-    if (length == GetLength())
+    if (length == GetLength()) {
         return *this;
+    }
     return CStringT(View().substr(static_cast<std::size_t>(begin), static_cast<std::size_t>(length)));
 }
 
@@ -134,8 +139,9 @@ CStringT<char> CStringT<char>::SpanExcluding(LPCSTR set) const {
 }
 
 CStringT<char> CStringT<char>::Tokenize(LPCSTR separators, int& start) const {
-    if (start < 0)
+    if (start < 0) {
         AfxThrowInvalidArgException();
+    }
     const std::string_view set = viewOrEmpty(separators);
     const std::size_t begin = findMember(View(), set, Member::no, static_cast<std::size_t>(start));
     if (begin >= View().size()) {
@@ -184,16 +190,18 @@ void CStringT<char>::Append(LPCSTR text) {
 }
 
 void CStringT<char>::Append(LPCSTR text, int length) {
-    if (length < 0)
+    if (length < 0) {
         AfxThrowInvalidArgException();
+    }
     append(text ? std::string_view(text, static_cast<std::size_t>(length)) : std::string_view());
 }
 
 void CStringT<char>::Append(const CStringT& text) {
-    if (IsEmpty() && GetAllocLength() == 0)
+    if (IsEmpty() && GetAllocLength() == 0) {
         *this = text;
-    else
+    } else {
         append(text.View());
+    }
 }
 
 void CStringT<char>::AppendChar(char character) {
@@ -279,8 +287,9 @@ int CStringT<char>::Replace(LPCSTR before, LPCSTR after) {
     const std::string_view replacement = viewOf(after);
     const std::string_view text = View();
     std::size_t found = wanted.empty() ? std::string_view::npos : text.find(wanted);
-    if (found == std::string_view::npos)
+    if (found == std::string_view::npos) {
         return 0;
+    }
     CStringT result;
     int count = 0;
     std::size_t copied = 0;
@@ -323,24 +332,27 @@ int CStringT<char>::Delete(int index, int count) {
 void CStringT<char>::replaceRange(int index, int count, std::string_view text) {
     const auto begin = static_cast<std::size_t>(std::clamp(index, 0, GetLength()));
     const auto removed = static_cast<std::size_t>(std::clamp(count, 0, GetLength() - static_cast<int>(begin)));
-    if (removed == 0 && text.empty())
+    if (removed == 0 && text.empty()) {
         return;
+    }
     CStringT result = join(View().substr(0, begin), text);
     result.append(View().substr(begin + removed));
     *this = std::move(result);
 }
 
 void CStringT<char>::keepRange(std::size_t begin, std::size_t end) {
-    if (begin > 0 || end < View().size())
+    if (begin > 0 || end < View().size()) {
         assign(View().substr(begin, std::max(begin, end) - begin));
+    }
 }
 
 BOOL AfxExtractSubString(CString& result, LPCSTR text, int index, char separator) {
     const char* field = text;
     for (; field && index > 0; --index) {
         field = std::strchr(field, separator);
-        if (field)
+        if (field) {
             ++field;
+        }
     }
     if (!field || index < 0) {
         result.Empty();

@@ -13,8 +13,9 @@ constinit tvx::StringLoader stringLoader = nullptr;
 
 CString loadFormat(UINT id) {
     CString format;
-    if (!format.LoadString(id))
+    if (!format.LoadString(id)) {
         AfxThrowInvalidArgException();
+    }
     return format;
 }
 
@@ -64,8 +65,9 @@ BOOL CStringT<char>::LoadString(UINT id) {
 
 BOOL CStringT<char>::LoadString(HINSTANCE module, UINT id) {
     std::string text;
-    if (!tvx::loadString(module, id, text))
+    if (!tvx::loadString(module, id, text)) {
         return FALSE;
+    }
     assign(text);
     return TRUE;
 }

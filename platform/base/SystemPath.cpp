@@ -12,8 +12,9 @@ namespace tvx {
 namespace {
 
 std::optional<std::string> onlyFolder(std::string_view root) {
-    if (text::equalNoCase(root, "C:"))
+    if (text::equalNoCase(root, "C:")) {
         return "/";
+    }
     return std::nullopt;
 }
 
@@ -52,8 +53,9 @@ std::optional<DriveRoot> currentDrive() {
 
 /// A name below a folder; `rest` begins with a separator or is empty.
 std::string below(const std::string& folder, std::string_view rest) {
-    if (folder == "/")
+    if (folder == "/") {
         return rest.empty() ? folder : withSlashes(rest);
+    }
     return folder + withSlashes(rest);
 }
 
@@ -66,10 +68,12 @@ std::optional<std::string> mapped(std::string_view name) {
         return drive ? below(drive->folder, rest) : withSlashes(rest);
     }
     const std::optional<std::string> folder = rootResolver->folderOf(name.substr(0, length));
-    if (!folder)
+    if (!folder) {
         return std::nullopt;
-    if (rest.empty() || isSeparator(rest.front()))
+    }
+    if (rest.empty() || isSeparator(rest.front())) {
         return below(*folder, rest);
+    }
     const auto drive = currentDrive();
     return drive && drive->folder == *folder ? withSlashes(rest) : below(*folder, "/" + std::string(rest));
 }
@@ -80,7 +84,7 @@ bool find(Location& location) {
 }
 
 bool exists(const std::string& path) {
-    struct stat state {};
+    struct stat state{};
     return ::lstat(path.c_str(), &state) == 0;
 }
 
@@ -90,8 +94,9 @@ std::optional<std::string> findEntry(const std::string& folder, std::string_view
     std::optional<std::string> best;
     while (const dirent* entry = entries ? ::readdir(entries.get()) : nullptr) {
         const std::string_view name(entry->d_name);
-        if (text::equalNoCase(name, part) && (!best || name < *best))
+        if (text::equalNoCase(name, part) && (!best || name < *best)) {
             best = name;
+        }
     }
     return best;
 }
@@ -105,8 +110,9 @@ std::size_t withoutLastPart(std::string_view path) {
 /// Length of the longest beginning of a path that exists as it is written, up to a separator.
 std::size_t existingLength(const std::string& path) {
     std::size_t length = withoutLastPart(path);
-    while (length > 0 && !exists(path.substr(0, length)))
+    while (length > 0 && !exists(path.substr(0, length))) {
         length = withoutLastPart(std::string_view(path).substr(0, length));
+    }
     return length;
 }
 
@@ -121,8 +127,9 @@ std::string corrected(const std::string& path, PathUse use) {
         const bool isFixed =
             part.empty() || (next == path.size() && use == PathUse::creating) || exists(result + std::string(part));
         const std::optional<std::string> entry = isFixed ? std::string(part) : findEntry(result, part);
-        if (!entry)
+        if (!entry) {
             return result + path.substr(at);
+        }
         result.append(*entry).append(path, end, next - end);
         at = next;
     }
@@ -131,12 +138,14 @@ std::string corrected(const std::string& path, PathUse use) {
 
 /// The system's name that a missing one on the current drive came from, when that exists; see systemPath().
 std::optional<std::string> belowSystemRoot(std::string_view name, const std::string& missing, PathUse use) {
-    if (!isRooted(name))
+    if (!isRooted(name)) {
         return std::nullopt;
+    }
     const std::string plain = withSlashes(name.substr(rootLength(name)));
     const auto drive = plain == missing ? std::nullopt : currentDrive();
-    if (!drive || drive->folder == "/" || !missing.starts_with(drive->folder + "/"))
+    if (!drive || drive->folder == "/" || !missing.starts_with(drive->folder + "/")) {
         return std::nullopt;
+    }
     const auto wanted = [use](const std::string& path) {
         return use == PathUse::existing ? path : path.substr(0, withoutLastPart(path));
     };
@@ -155,37 +164,45 @@ bool hasDrive(std::string_view name) noexcept {
 }
 
 std::size_t rootLength(std::string_view name) noexcept {
-    if (hasDrive(name))
+    if (hasDrive(name)) {
         return 2;
-    if (!name.starts_with("\\\\"))
+    }
+    if (!name.starts_with("\\\\")) {
         return 0;
+    }
     const std::size_t server = name.find_first_of("\\/", 2);
-    if (server == std::string_view::npos)
+    if (server == std::string_view::npos) {
         return name.size();
+    }
     return std::min(name.find_first_of("\\/", server + 1), name.size());
 }
 
 std::optional<Location> locate(std::string_view name, PathUse use) {
-    if (name.empty() || name.find('\0') != std::string_view::npos)
+    if (name.empty() || name.find('\0') != std::string_view::npos) {
         return std::nullopt;
+    }
     Location location;
     if (!isRooted(name)) {
         location.path = name;
-        if (find(location))
+        if (find(location)) {
             return location;
+        }
     }
     std::optional<std::string> path = mapped(name);
-    if (!path)
+    if (!path) {
         return std::nullopt;
+    }
     location.path = *std::move(path);
-    if ((location.path != name || isRooted(name)) && find(location))
+    if ((location.path != name || isRooted(name)) && find(location)) {
         return location;
+    }
     location.path = corrected(location.path, use);
-    if (!find(location))
+    if (!find(location)) {
         if (const auto plain = belowSystemRoot(name, location.path, use)) {
             location.path = *plain;
             find(location);
         }
+    }
     return location;
 }
 
@@ -196,12 +213,14 @@ std::optional<std::string> systemPath(std::string_view name, PathUse use) {
 
 std::string driveName(std::string_view path) {
     std::string name(path);
-    if (path.find('\\') != std::string_view::npos)
+    if (path.find('\\') != std::string_view::npos) {
         return name;
+    }
     if (path.starts_with('/')) {
         const auto root = rootResolver->driveOf(path);
-        if (!root)
+        if (!root) {
             return name;
+        }
         name = root->drive + name.substr(root->folder == "/" ? 0 : root->folder.size());
         name += name.size() == root->drive.size() ? "/" : "";
     }

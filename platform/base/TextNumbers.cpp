@@ -41,8 +41,9 @@ std::string withStandardSizes(const char* format) {
     while (const char* percent = std::strchr(format, '%')) {
         result.append(format, percent);
         format = copyConversionHead(percent, result);
-        if (*format)
+        if (*format) {
             result += *format++;
+        }
     }
     return result + format;
 }
@@ -53,16 +54,18 @@ std::int32_t toInt32(const char* text, const char** end, int base) noexcept {
     // strtoll leaves the end alone for a base it does not know.
     char* stop = const_cast<char*>(text);
     const long long value = strtoll_l(text, &stop, base, detail::neutralLocale());
-    if (end)
+    if (end) {
         *end = stop;
+    }
     return clampToInt32(value);
 }
 
 double toDouble(const char* text, const char** end) noexcept {
     char* stop = const_cast<char*>(text);
     const double value = strtod_l(text, &stop, detail::neutralLocale());
-    if (end)
+    if (end) {
         *end = stop;
+    }
     return value;
 }
 
@@ -88,10 +91,12 @@ std::string formatV(const char* format, std::va_list arguments) {
     char buffer[256];
     const int length = std::vsnprintf(buffer, sizeof buffer, format, measured);
     va_end(measured);
-    if (length < 0)
+    if (length < 0) {
         AfxThrowInvalidArgException();
-    if (static_cast<std::size_t>(length) < sizeof buffer)
+    }
+    if (static_cast<std::size_t>(length) < sizeof buffer) {
         return {buffer, static_cast<std::size_t>(length)};
+    }
     std::string result(static_cast<std::size_t>(length), '\0');
     std::vsnprintf(result.data(), result.size() + 1, format, arguments);
     return result;

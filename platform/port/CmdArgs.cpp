@@ -28,12 +28,13 @@ bool isWhole(const char* text, const char* end) {
 /// read.
 bool isValue(const char* text, ValueKind kind) {
     const char* end = text;
-    if (kind == ValueKind::Integer)
+    if (kind == ValueKind::Integer) {
         tvx::text::toInt32(text, &end);
-    else if (kind == ValueKind::Real)
+    } else if (kind == ValueKind::Real) {
         tvx::text::toDouble(text, &end);
-    else
+    } else {
         return true;
+    }
     return isWhole(text, end);
 }
 
@@ -43,15 +44,17 @@ bool isOption(const char* argument) {
 }
 
 const char* valueNoun(ValueKind kind) {
-    if (kind == ValueKind::Integer)
+    if (kind == ValueKind::Integer) {
         return "a whole number";
+    }
     return kind == ValueKind::Real ? "a number" : "a text";
 }
 
 std::string listOf(const std::vector<const OptionRule*>& rules) {
     std::string list;
-    for (const OptionRule* rule : rules)
+    for (const OptionRule* rule : rules) {
         list += (list.empty() ? "-" : rule == rules.back() ? " or -" : ", -") + rule->name;
+    }
     return list;
 }
 
@@ -63,10 +66,11 @@ public:
     void run() {
         while (m_next < m_arguments.size()) {
             const char* argument = m_arguments[m_next++];
-            if (isOption(argument))
+            if (isOption(argument)) {
                 takeOption(argument);
-            else
+            } else {
                 m_plain.push_back(argument);
+            }
         }
         checkRequired();
         checkPlainCount();
@@ -82,21 +86,24 @@ public:
 private:
     void takeOption(const char* argument) {
         const auto found = m_spec.find(argument + 1);
-        if (found.empty())
+        if (found.empty()) {
             m_errors.push_back(tvx::text::format("Unknown option \"%s\".", argument));
-        else if (found.size() > 1)
+        } else if (found.size() > 1) {
             m_errors.push_back(
                 tvx::text::format("Option \"%s\" is ambiguous: it may mean %s.", argument, listOf(found).c_str()));
-        else
+        } else {
             takeKnown(*found.front());
+        }
     }
 
     void takeKnown(const OptionRule& rule) {
         m_wantsHelp = m_wantsHelp || isHelp(rule);
-        if (++m_given[&rule] == 2 && rule.times == Times::Once && !isHelp(rule))
+        if (++m_given[&rule] == 2 && rule.times == Times::Once && !isHelp(rule)) {
             m_errors.push_back(tvx::text::format("Option \"-%s\" is given more than once.", rule.name.c_str()));
-        if (rule.kind != ValueKind::None)
+        }
+        if (rule.kind != ValueKind::None) {
             takeValue(rule);
+        }
     }
 
     void takeValue(const OptionRule& rule) {
@@ -108,28 +115,32 @@ private:
             return;
         }
         ++m_next;
-        if (!isValue(value, rule.kind))
+        if (!isValue(value, rule.kind)) {
             m_errors.push_back(
                 tvx::text::format("Option \"-%s\": \"%s\" is not %s.", rule.name.c_str(), value, valueNoun(rule.kind)));
+        }
     }
 
     void checkRequired() {
-        for (const OptionRule& rule : m_spec.options)
-            if (rule.need == Need::Required && !m_given.contains(&rule))
+        for (const OptionRule& rule : m_spec.options) {
+            if (rule.need == Need::Required && !m_given.contains(&rule)) {
                 m_errors.push_back(tvx::text::format("Option \"-%s\" is required.", rule.name.c_str()));
+            }
+        }
     }
 
     void checkPlainCount() {
         const PlainRule& rule = m_spec.plain;
         const std::size_t given = m_plain.size();
-        if (given > rule.most && rule.most == 0)
+        if (given > rule.most && rule.most == 0) {
             m_errors.push_back(tvx::text::format("Unexpected argument \"%s\".", m_plain.front()));
-        else if (given > rule.most)
+        } else if (given > rule.most) {
             m_errors.push_back(tvx::text::format("Unexpected argument \"%s\": %zu <%s> allowed, %zu given.",
                                                  m_plain[rule.most], rule.most, rule.name.c_str(), given));
-        else if (given < rule.least)
+        } else if (given < rule.least) {
             m_errors.push_back(tvx::text::format("Too few arguments: %zu <%s> needed, %zu given.", rule.least,
                                                  rule.name.c_str(), given));
+        }
     }
 
     const OptionSpec& m_spec;
@@ -143,8 +154,9 @@ private:
 
 void issueUsage(const char* specification) {
     const std::unique_ptr<char, decltype(&std::free)> usage(UT_CMDOPCODES(specification).usage(), &std::free);
-    if (usage)
+    if (usage) {
         origin(__LINE__).issueStatus("%s\n", usage.get());
+    }
 }
 
 std::span<const char* const> argumentsOf(int argc, const char* const* argv, unsigned short flags) {
@@ -157,23 +169,29 @@ std::span<const char* const> argumentsOf(int argc, const char* const* argv, unsi
 UT_CMDARGS::UT_CMDARGS(int argc, const char* const* argv, const char* specification, void (*usagefunction)(),
                        unsigned short flags) {
     const OptionSpec spec = parseOptionSpec(specification ? specification : "");
-    for (const SpecProblem& problem : spec.problems)
+    for (const SpecProblem& problem : spec.problems) {
         origin(__LINE__).issueInternal("Line %zu of the option specification: %s.", problem.line,
                                        problem.reason.c_str());
+    }
     m_isError = !spec.problems.empty();
-    if (m_isError)
+    if (m_isError) {
         return;
+    }
     Checker checker(spec, argumentsOf(argc, argv, flags));
     checker.run();
     m_gaveUsage = checker.wantsHelp();
     m_isError = !m_gaveUsage && !checker.errors().empty();
-    if (m_isError)
-        for (const std::string& error : checker.errors())
+    if (m_isError) {
+        for (const std::string& error : checker.errors()) {
             origin(__LINE__).issueError("%s", error.c_str());
-    if (m_gaveUsage)
+        }
+    }
+    if (m_gaveUsage) {
         issueUsage(specification);
-    if (m_gaveUsage && usagefunction)
+    }
+    if (m_gaveUsage && usagefunction) {
         usagefunction();
+    }
 }
 
 bool UT_CMDARGS::gaveusage() const {

@@ -37,8 +37,9 @@ std::vector<const ActiveFile*>& chain() {
 
 std::string chainText() {
     std::string text;
-    for (const ActiveFile* file : chain())
+    for (const ActiveFile* file : chain()) {
         text += (text.empty() ? "" : " -> ") + file->name;
+    }
     return text;
 }
 
@@ -47,8 +48,9 @@ public:
     explicit Descriptor(const char* name)
         : m_number(::open(tvx::systemPath(name).value_or(name).c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY)) {}
     ~Descriptor() {
-        if (m_number >= 0)
+        if (m_number >= 0) {
             ::close(m_number);
+        }
     }
     Descriptor(const Descriptor&) = delete;
     Descriptor& operator=(const Descriptor&) = delete;
@@ -70,14 +72,17 @@ std::string readAll(const Descriptor& file, std::string& text) {
     std::array<char, 65536> buffer;
     for (;;) {
         const ssize_t count = ::read(file.number(), buffer.data(), buffer.size());
-        if (count == 0)
+        if (count == 0) {
             break;
-        if (count > 0)
+        }
+        if (count > 0) {
             text.append(buffer.data(), static_cast<std::size_t>(count));
-        else if (errno != EINTR)
+        } else if (errno != EINTR) {
             return systemReason();
-        if (text.size() > largestFile)
+        }
+        if (text.size() > largestFile) {
             return "it is larger than 64 MB";
+        }
     }
     return text.find('\0') == std::string::npos ? "" : "it holds zero bytes, so it is not a text in UTF-8";
 }
@@ -105,27 +110,32 @@ struct UT_CMDFILE::Impl {
         } else {
             m_words.insert(m_words.end(), found, arguments.end());
         }
-        for (std::string& word : m_words)
+        for (std::string& word : m_words) {
             m_vector.push_back(word.data());
+        }
         m_vector.push_back(nullptr);
     }
 
     void addFile(const char* name) {
         const Descriptor file(name);
-        struct stat status {};
+        struct stat status{};
         m_file.name = name;
-        if (file.number() < 0 || ::fstat(file.number(), &status) != 0)
+        if (file.number() < 0 || ::fstat(file.number(), &status) != 0) {
             return refuseUnreadable(systemReason());
+        }
         m_file.device = status.st_dev;
         m_file.inode = status.st_ino;
-        if (isBeingExpanded())
+        if (isBeingExpanded()) {
             return refuse("is being expanded already", chainText() + " -> " + m_file.name);
-        if (chain().size() >= deepestNesting)
+        }
+        if (chain().size() >= deepestNesting) {
             return refuse("is nested too deep", chainText() + " -> " + m_file.name);
+        }
         std::string text;
         const std::string reason = readAll(file, text);
-        if (!reason.empty())
+        if (!reason.empty()) {
             return refuseUnreadable(reason);
+        }
         chain().push_back(&m_file);
         addWords(text);
     }
@@ -140,8 +150,9 @@ struct UT_CMDFILE::Impl {
         Port::detail::CommandWords read = Port::detail::splitCommandText(text);
         m_words.insert(m_words.end(), std::make_move_iterator(read.words.begin()),
                        std::make_move_iterator(read.words.end()));
-        for (const std::size_t line : read.unclosedLines)
+        for (const std::size_t line : read.unclosedLines) {
             fail(tvx::text::format("Command file \"%s\", line %zu: a quote is not closed.", m_file.name.c_str(), line));
+        }
     }
 
     void refuseUnreadable(const std::string& reason) {
@@ -154,9 +165,10 @@ struct UT_CMDFILE::Impl {
 
     void fail(const std::string& message) {
         m_errors.push_back(message);
-        if (m_reporting == Reporting::Issue)
+        if (m_reporting == Reporting::Issue) {
             Port_MsgManData::createObject("Port", "platform/port/CmdFile", __LINE__, "")
                 .issueError("%s", message.c_str());
+        }
     }
 
     Reporting m_reporting;

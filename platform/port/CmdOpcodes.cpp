@@ -16,64 +16,76 @@ constexpr std::string_view helpIndent = "      ";
 
 std::string withValue(const OptionRule& rule) {
     std::string text = "-" + rule.name;
-    if (rule.kind != ValueKind::None)
+    if (rule.kind != ValueKind::None) {
         (text += ' ') += valueName(rule.kind);
+    }
     return text;
 }
 
 std::string plainForm(const PlainRule& rule) {
     std::string form = "<" + rule.name + ">";
-    if (rule.most > 1)
+    if (rule.most > 1) {
         form += " ...";
+    }
     return rule.least == 0 ? "[" + form + "]" : form;
 }
 
 /// "Usage: board -scale <number> [options] [<drawing> ...]"
 std::string firstLine(const OptionSpec& spec) {
     std::string line = std::string("Usage: ") + program_invocation_short_name;
-    for (const OptionRule& rule : spec.options)
-        if (rule.need == Need::Required)
+    for (const OptionRule& rule : spec.options) {
+        if (rule.need == Need::Required) {
             line += " " + withValue(rule);
+        }
+    }
     line += " [options]";
-    if (spec.plain.most > 0)
+    if (spec.plain.most > 0) {
         line += " " + plainForm(spec.plain);
+    }
     return line;
 }
 
 std::string_view remark(const OptionRule& rule) {
-    if (rule.need == Need::Required)
+    if (rule.need == Need::Required) {
         return rule.times == Times::Repeatable ? "  (required, repeatable)" : "  (required)";
+    }
     return rule.times == Times::Repeatable ? "  (repeatable)" : "";
 }
 
 std::string countRemark(const PlainRule& rule) {
     const std::string least = std::to_string(rule.least);
-    if (rule.most == PlainRule::Unlimited)
+    if (rule.most == PlainRule::Unlimited) {
         return rule.least == 0 ? "  (any number)" : "  (at least " + least + ")";
-    if (rule.least == rule.most)
+    }
+    if (rule.least == rule.most) {
         return "  (" + least + ")";
+    }
     return "  (" + least + " to " + std::to_string(rule.most) + ")";
 }
 
 void addEntry(std::string& text, const std::string& head, const std::string& help) {
     text += "  " + head + "\n";
-    if (!help.empty())
+    if (!help.empty()) {
         (text += helpIndent) += help + "\n";
+    }
 }
 
 std::string wrapped(std::string_view text) {
     std::string result;
-    for (const std::wstring& line : wrapText(tvx::text::widen(text), usageColumns))
+    for (const std::wstring& line : wrapText(tvx::text::widen(text), usageColumns)) {
         result += tvx::text::narrow(line) + '\n';
+    }
     return result;
 }
 
 std::string summary(const OptionSpec& spec) {
     std::string text = firstLine(spec) + "\n";
-    if (spec.plain.most > 0)
+    if (spec.plain.most > 0) {
         addEntry(text, "<" + spec.plain.name + ">" + countRemark(spec.plain), spec.plain.help);
-    for (const OptionRule& rule : spec.options)
+    }
+    for (const OptionRule& rule : spec.options) {
         addEntry(text, withValue(rule) + std::string(remark(rule)), rule.help);
+    }
     return wrapped(text);
 }
 

@@ -27,7 +27,7 @@ private:
 };
 
 bool isFile(int descriptor) {
-    struct stat status {};
+    struct stat status{};
     return ::fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode);
 }
 
@@ -49,14 +49,17 @@ Stream& File::getCerr() {
 
 Stream* File::open(const char* path, Access, Flag) {
     const std::optional<std::string> name = systemName(path);
-    if (!name)
+    if (!name) {
         return nullptr;
+    }
     // Opening a pipe must not wait for its writer.
     const int descriptor = ::open(name->c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK);
-    if (descriptor >= 0 && isFile(descriptor))
+    if (descriptor >= 0 && isFile(descriptor)) {
         return new FileStream(descriptor);
-    if (descriptor >= 0)
+    }
+    if (descriptor >= 0) {
         ::close(descriptor);
+    }
     return nullptr;
 }
 
@@ -66,9 +69,10 @@ void File::close(Stream* stream) {
 
 bool File::getdatetime(const char* path, std::int64_t& time) {
     const std::optional<std::string> name = systemName(path);
-    struct stat status {};
-    if (!name || ::stat(name->c_str(), &status) != 0)
+    struct stat status{};
+    if (!name || ::stat(name->c_str(), &status) != 0) {
         return false;
+    }
     time = status.st_mtim.tv_sec;
     return true;
 }

@@ -21,8 +21,9 @@ Port_MsgMan& builtIn() {
 
 void Port_MsgDispatcher::addMsgMan(Port_MsgMan* manager) {
     removeMsgMan(manager);
-    if (manager)
+    if (manager) {
         registered().push_back(manager);
+    }
 }
 
 void Port_MsgDispatcher::removeMsgMan(Port_MsgMan* manager) {

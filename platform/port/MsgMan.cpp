@@ -35,8 +35,9 @@ bool goesToStandardOutput(Port_MsgMan::MsgType type) {
 }
 
 std::vector<std::wstring> formatLines(Port_MsgMan::MsgType type, bool clean, int width, const wchar_t* text) {
-    if (!text || !*text)
+    if (!text || !*text) {
         return {};
+    }
     return Port::detail::wrapText((clean ? L"" : prefixOf(type)) + std::wstring(text), width);
 }
 
@@ -117,8 +118,9 @@ bool Port_MsgMan::isReady() const {
 }
 
 bool Port_MsgMan::isSwitchedOff(const Port_Msg& msg) const {
-    if (msg.type == MsgTypeFatal)
+    if (msg.type == MsgTypeFatal) {
         return false;
+    }
     const auto latest = std::find_if(m_switches.rbegin(), m_switches.rend(), [&](const Switch& known) {
         return known.module == msg.module && (known.source.empty() || known.source == msg.source) &&
                (known.line == 0 || known.line == msg.line);
@@ -127,10 +129,12 @@ bool Port_MsgMan::isSwitchedOff(const Port_Msg& msg) const {
 }
 
 void Port_MsgMan::take(const Port_Msg& msg) {
-    if (msg.type == MsgTypeFatal)
+    if (msg.type == MsgTypeFatal) {
         m_abort = msg.code != 0 ? msg.code : 1;
-    if (isSwitchedOff(msg))
+    }
+    if (isSwitchedOff(msg)) {
         return;
+    }
     ++m_counts.at(msg.type);
     const Flagged writing(m_writing);
     msgWrite(msg.type, msg.text.c_str());
@@ -159,8 +163,9 @@ void Port_MsgManDefault::setMaxLineWidth(int columns) {
 wchar_t** Port_MsgManDefault::msgFormat(MsgType type, bool clean, int width, const wchar_t* text, int* count) {
     const std::vector<std::wstring> lines = formatLines(type, clean, width, text);
     *count = static_cast<int>(lines.size());
-    if (lines.empty())
+    if (lines.empty()) {
         return nullptr;
+    }
     auto** array = new wchar_t*[lines.size()];
     std::transform(lines.begin(), lines.end(), array, newLine);
     return array;
@@ -168,7 +173,8 @@ wchar_t** Port_MsgManDefault::msgFormat(MsgType type, bool clean, int width, con
 
 void Port_MsgManDefault::msgWrite(MsgType type, const wchar_t* text) {
     std::string out;
-    for (const std::wstring& line : formatLines(type, m_clean, m_maxLineWidth, text))
+    for (const std::wstring& line : formatLines(type, m_clean, m_maxLineWidth, text)) {
         out += UT_STR::WstrToMbstr(line.c_str()) + '\n';
+    }
     (goesToStandardOutput(type) ? Port::File::getCout() : Port::File::getCerr()) << out;
 }

@@ -56,8 +56,9 @@ void Port_MsgManData::issueFatal(int code, const char* format, ...) const {
 }
 
 void Port_MsgManData::debugStub(const char* format, ...) {
-    if (!Port_Env::GetEnv("TVX_MSG_DEBUG"))
+    if (!Port_Env::GetEnv("TVX_MSG_DEBUG")) {
         return;
+    }
     std::va_list arguments;
     va_start(arguments, format);
     createObject("", "", 0, "").issue(Port_MsgMan::MsgTypeDebug, 0, format, arguments);

@@ -15,10 +15,12 @@ std::wstring UT_STR::MbstrToWstr(const char* text) {
 }
 
 void UT_STR::WDelStrings(wchar_t** lines, int count) {
-    if (!lines)
+    if (!lines) {
         return;
-    for (int i = 0; i < count; ++i)
+    }
+    for (int i = 0; i < count; ++i) {
         delete[] lines[i];
+    }
     delete[] lines;
 }
 
@@ -64,8 +66,9 @@ int UT_STR::SScanf(const char* text, const char* format, ...) {
 
 bool UT_STR::Copy(char* buffer, std::size_t size, const char* text) {
     const std::size_t length = std::strlen(text) + 1;
-    if (length > size)
+    if (length > size) {
         return false;
+    }
     std::memcpy(buffer, text, length);
     return true;
 }

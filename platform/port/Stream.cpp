@@ -31,9 +31,10 @@ public:
     }
     ~BrokenPipeGuard() {
         const timespec atOnce{};
-        if (!m_wasPending)
+        if (!m_wasPending) {
             while (sigtimedwait(&m_pipe, nullptr, &atOnce) == -1 && errno == EINTR) {
             }
+        }
         pthread_sigmask(SIG_SETMASK, &m_before, nullptr);
     }
     BrokenPipeGuard(const BrokenPipeGuard&) = delete;
@@ -48,10 +49,11 @@ private:
 void writeAll(int descriptor, std::string_view text) {
     while (!text.empty()) {
         const ssize_t written = ::write(descriptor, text.data(), text.size());
-        if (written >= 0)
+        if (written >= 0) {
             text.remove_prefix(static_cast<std::size_t>(written));
-        else if (errno != EINTR)
+        } else if (errno != EINTR) {
             return;
+        }
     }
 }
 
@@ -59,8 +61,9 @@ void writeAll(int descriptor, std::string_view text) {
 std::size_t readSome(int descriptor, char* to, std::size_t size) {
     for (;;) {
         const ssize_t got = ::read(descriptor, to, size);
-        if (got >= 0 || errno != EINTR)
+        if (got >= 0 || errno != EINTR) {
             return got > 0 ? static_cast<std::size_t>(got) : 0;
+        }
     }
 }
 
@@ -132,8 +135,9 @@ bool Stream::geteof() const {
 
 /// Reads on until @p count bytes wait, or there are no more.
 void Stream::buffer(std::size_t count) {
-    if (m_exhausted || m_input.size() - m_consumed >= count)
+    if (m_exhausted || m_input.size() - m_consumed >= count) {
         return;
+    }
     m_input.erase(0, m_consumed);
     m_consumed = 0;
     while (!m_exhausted && m_input.size() < count) {

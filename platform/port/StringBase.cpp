@@ -98,8 +98,9 @@ StringBase<char> StringBase<char>::Extract(int start, int length) const {
 bool StringBase<char>::NextTokenRange(Range& range, const char* delimiters) const {
     const std::string_view set = orEmpty(delimiters);
     const std::size_t start = m_text.find_first_not_of(set, toPosition(range.start) + toPosition(range.length));
-    if (start == std::string::npos)
+    if (start == std::string::npos) {
         return false;
+    }
     const std::size_t end = std::min(m_text.find_first_of(set, start), m_text.size());
     range = {static_cast<int>(start), static_cast<int>(end - start)};
     return true;

@@ -16,9 +16,10 @@ ResourceResult<std::vector<AcceleratorTemplate>> parseAcceleratorTemplate(Resour
         entry.key = reader.u16();
         entry.command = reader.u16();
         reader.skip(2);
-        if (!reader.ok())
+        if (!reader.ok()) {
             return ResourceError{"accelerator table ends after " + std::to_string(entries.size()) +
                                  " entries without an end mark"};
+        }
         entries.push_back(entry);
         isLast = (flags & lastEntryFlag) != 0;
     }

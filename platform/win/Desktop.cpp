@@ -47,8 +47,9 @@ bool isForeign(XConnection& x, WindowId window) {
 /// Whether the window manager has put all of these states on the window.
 bool hasStates(XConnection& x, WindowId window, std::initializer_list<xcb_atom_t> wanted) {
     xcb_ewmh_get_atoms_reply_t states;
-    if (xcb_ewmh_get_wm_state_reply(x.ewmh(), xcb_ewmh_get_wm_state(x.ewmh(), window), &states, nullptr) == 0)
+    if (xcb_ewmh_get_wm_state_reply(x.ewmh(), xcb_ewmh_get_wm_state(x.ewmh(), window), &states, nullptr) == 0) {
         return false;
+    }
     const bool has = std::ranges::all_of(wanted, [&](xcb_atom_t state) {
         return std::find(states.atoms, states.atoms + states.atoms_len, state) != states.atoms + states.atoms_len;
     });
@@ -106,8 +107,9 @@ void changeStates(XConnection& x, WindowId window, xcb_ewmh_wm_state_action_t ac
 std::vector<WindowId> managedWindows(XConnection& x) {
     xcb_ewmh_get_windows_reply_t list;
     const auto cookie = xcb_ewmh_get_client_list_stacking(x.ewmh(), x.screen());
-    if (xcb_ewmh_get_client_list_stacking_reply(x.ewmh(), cookie, &list, nullptr) == 0)
+    if (xcb_ewmh_get_client_list_stacking_reply(x.ewmh(), cookie, &list, nullptr) == 0) {
         return {};
+    }
     std::vector<WindowId> result(list.windows, list.windows + list.windows_len);
     xcb_ewmh_get_windows_reply_wipe(&list);
     return result;
@@ -132,8 +134,9 @@ bool isMaximized(WindowId window) {
 
 WindowId ownerOf(WindowId window) {
     const XSession x;
-    if (!x || !isForeign(*x, window))
+    if (!x || !isForeign(*x, window)) {
         return 0;
+    }
     // Dialogs of a whole application name the root window.
     const WindowId owner = x->number(window, XCB_ATOM_WM_TRANSIENT_FOR);
     return owner != x->root() ? owner : 0;
@@ -141,8 +144,9 @@ WindowId ownerOf(WindowId window) {
 
 std::string classNameOf(WindowId window) {
     const XSession x;
-    if (!x || !isForeign(*x, window))
+    if (!x || !isForeign(*x, window)) {
         return {};
+    }
     // Two texts, each ended by a zero: the instance's name and the class.
     const std::string names = x->text(window, XCB_ATOM_WM_CLASS);
     const std::size_t first = names.find('\0');
@@ -156,16 +160,18 @@ DWORD processOf(WindowId window) {
 
 WindowId active() {
     const XSession x;
-    if (!x)
+    if (!x) {
         return 0;
+    }
     const WindowId window = activeWindow(*x);
     return isForeign(*x, window) ? window : 0;
 }
 
 std::vector<WindowId> windows() {
     const XSession x;
-    if (!x)
+    if (!x) {
         return {};
+    }
     std::vector<WindowId> result = managedWindows(*x);
     std::erase_if(result, [&](WindowId window) { return !isForeign(*x, window); });
     std::ranges::reverse(result);
@@ -174,8 +180,9 @@ std::vector<WindowId> windows() {
 
 bool activate(WindowId window) {
     const XSession x;
-    if (!x || !isForeign(*x, window))
+    if (!x || !isForeign(*x, window)) {
         return false;
+    }
     if (!isManaged(*x)) {
         raiseAlone(*x, window);
         return true;
@@ -185,22 +192,25 @@ bool activate(WindowId window) {
                                           XCB_WINDOW_NONE);
     const bool done =
         x->await({x->root(), window}, patience, [&] { return activeWindow(*x) == window && !isIconic(*x, window); });
-    if (!done)
+    if (!done) {
         changeStates(*x, window, XCB_EWMH_WM_STATE_ADD, x->ewmh()->_NET_WM_STATE_DEMANDS_ATTENTION, XCB_ATOM_NONE);
+    }
     return done;
 }
 
 void minimize(WindowId window) {
     const XSession x;
-    if (x && isForeign(*x, window))
+    if (x && isForeign(*x, window)) {
         request(*x, window, x->atom("WM_CHANGE_STATE"), iconicState);
+    }
 }
 
 void setExtent(WindowId window, Extent extent) {
     const XSession x;
-    if (x && isForeign(*x, window))
+    if (x && isForeign(*x, window)) {
         changeStates(*x, window, extent == Extent::Maximized ? XCB_EWMH_WM_STATE_ADD : XCB_EWMH_WM_STATE_REMOVE,
                      x->ewmh()->_NET_WM_STATE_MAXIMIZED_VERT, x->ewmh()->_NET_WM_STATE_MAXIMIZED_HORZ);
+    }
 }
 
 } // namespace tvx::desktop

@@ -12,11 +12,13 @@ using Kind = DialogDataEntry::Kind;
 
 // Resource editors write these texts as numbers, byte by byte in the code page of their time.
 std::string toUtf8(std::string bytes) {
-    if (text::isWellFormed(bytes))
+    if (text::isWellFormed(bytes)) {
         return bytes;
+    }
     std::string result;
-    for (const char c : bytes)
+    for (const char c : bytes) {
         text::append(result, text::westernCodePoint(static_cast<std::uint8_t>(c)));
+    }
     return result;
 }
 
@@ -45,16 +47,19 @@ ResourceResult<std::vector<DialogDataEntry>> parseDialogData(ResourceBytes data)
         entry.kind = kindOf(entry.message);
         const ResourceBytes bytes = reader.bytes(reader.u32());
         std::string text(bytes.begin(), bytes.end());
-        if (text.ends_with('\0'))
+        if (text.ends_with('\0')) {
             text.pop_back();
+        }
         entry.text = toUtf8(std::move(text));
-        if (!reader.ok())
+        if (!reader.ok()) {
             break;
+        }
         entries.push_back(std::move(entry));
     }
-    if (!reader.ok())
+    if (!reader.ok()) {
         return ResourceError{"dialog data ends after " + std::to_string(entries.size()) +
                              " entries without an end mark"};
+    }
     return entries;
 }
 

@@ -19,8 +19,9 @@ constexpr std::uint16_t firstNumberedClass = 0x80;
 constexpr std::array<const char*, 6> numberedClasses = {"Button", "Edit", "Static", "ListBox", "ScrollBar", "ComboBox"};
 
 ResourceName readName(ByteReader& reader) {
-    if (reader.peekU16() != ordinalMark)
+    if (reader.peekU16() != ordinalMark) {
         return text::narrow(reader.zeroEndedText());
+    }
     reader.skip(2);
     return reader.u16();
 }
@@ -28,8 +29,9 @@ ResourceName readName(ByteReader& reader) {
 // A name for which the empty text means that there is none.
 ResourceName readOptionalName(ByteReader& reader) {
     ResourceName name = readName(reader);
-    if (name == ResourceName(std::string()))
+    if (name == ResourceName(std::string())) {
         return WORD{0};
+    }
     return name;
 }
 
@@ -70,8 +72,9 @@ unsigned readHead(ByteReader& reader, DialogTemplate& dialog) {
     dialog.menu = readOptionalName(reader);
     dialog.className = readOptionalName(reader);
     dialog.title = text::narrow(reader.zeroEndedText());
-    if ((dialog.style & DS_SETFONT) != 0)
+    if ((dialog.style & DS_SETFONT) != 0) {
         dialog.font = readFont(reader, dialog.extended);
+    }
     return itemCount;
 }
 
@@ -79,8 +82,9 @@ unsigned readHead(ByteReader& reader, DialogTemplate& dialog) {
 std::string readClassName(ByteReader& reader) {
     const ResourceName name = readName(reader);
     const auto* number = std::get_if<WORD>(&name);
-    if (number == nullptr)
+    if (!number) {
         return textOf(name);
+    }
     const int index = *number - firstNumberedClass;
     return index >= 0 && index < static_cast<int>(numberedClasses.size())
                ? numberedClasses[static_cast<std::size_t>(index)]
@@ -124,16 +128,19 @@ ResourceResult<DialogTemplate> parseDialogTemplate(ResourceBytes data) {
     DialogTemplate dialog;
     dialog.extended = isExtendedTemplate(data);
     const unsigned itemCount = readHead(reader, dialog);
-    if (!reader.ok())
+    if (!reader.ok()) {
         return ResourceError{"dialog template ends within its head"};
+    }
     for (unsigned i = 1; i <= itemCount; ++i) {
         reader.align(4);
         DialogItemTemplate item = readItem(reader, dialog.extended);
         const std::string place = "control " + std::to_string(i) + " of " + std::to_string(itemCount);
-        if (!reader.ok())
+        if (!reader.ok()) {
             return ResourceError{"dialog template ends within " + place};
-        if (item.className.empty())
+        }
+        if (item.className.empty()) {
             return ResourceError{"dialog template has no known class for " + place};
+        }
         dialog.items.push_back(std::move(item));
     }
     return dialog;

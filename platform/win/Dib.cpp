@@ -48,19 +48,24 @@ Header readHeader(ByteReader& reader) {
 }
 
 std::string headerFault(const Header& header) {
-    if (header.size != coreHeaderSize && header.size < infoHeaderSize)
+    if (header.size != coreHeaderSize && header.size < infoHeaderSize) {
         return "bitmap header of the unknown size " + std::to_string(header.size);
-    if (header.width < 1 || header.width > largestSide || header.height < 1 || header.height > largestSide)
+    }
+    if (header.width < 1 || header.width > largestSide || header.height < 1 || header.height > largestSide) {
         return "bitmap of impossible size " + std::to_string(header.width) + " x " + std::to_string(header.height);
+    }
     const unsigned bits = header.bitsPerPixel;
-    if (bits != 1 && bits != 4 && bits != 8 && bits != 16 && bits != 24 && bits != 32)
+    if (bits != 1 && bits != 4 && bits != 8 && bits != 16 && bits != 24 && bits != 32) {
         return "bitmap with " + std::to_string(bits) + " bits a pixel";
+    }
     const bool mayHaveMasks = bits == 16 || bits == 32;
     const bool hasMasks = header.compression == BitFields && mayHaveMasks;
-    if (header.compression != Uncompressed && !hasMasks)
+    if (header.compression != Uncompressed && !hasMasks) {
         return "compressed bitmap (method " + std::to_string(header.compression) + ")";
-    if (header.colorsUsed > 256 && bits <= 8)
+    }
+    if (header.colorsUsed > 256 && bits <= 8) {
         return "bitmap with a palette of " + std::to_string(header.colorsUsed) + " colours";
+    }
     return {};
 }
 
@@ -70,8 +75,9 @@ public:
     explicit Channel(std::uint32_t mask) : m_mask(mask), m_shift(std::countr_zero(mask)) {}
     // Its value in 8 bits.
     [[nodiscard]] std::uint32_t of(std::uint32_t pixel) const {
-        if (m_mask == 0)
+        if (m_mask == 0) {
             return 0;
+        }
         const std::uint64_t largest = m_mask >> m_shift;
         return static_cast<std::uint32_t>(((pixel & m_mask) >> m_shift) * std::uint64_t{255} / largest);
     }
@@ -97,19 +103,24 @@ public:
 
     ResourceResult<Picture> decode() {
         m_header = readHeader(m_reader);
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return ResourceError{"bitmap ends within its header"};
-        if (m_use == DibUse::IconImage)
+        }
+        if (m_use == DibUse::IconImage) {
             m_header.height /= 2;
-        if (std::string fault = headerFault(m_header); !fault.empty())
+        }
+        if (std::string fault = headerFault(m_header); !fault.empty()) {
             return ResourceError{std::move(fault)};
+        }
         readMasks();
         readPalette();
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return ResourceError{"bitmap ends within its palette"};
+        }
         const ResourceBytes rows = m_reader.bytes(rowSize(m_header.bitsPerPixel) * height());
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return ResourceError{"bitmap ends before its last row"};
+        }
         return finish(rows);
     }
 
@@ -126,8 +137,9 @@ private:
     }
 
     void readMasks() {
-        if (m_header.bitsPerPixel == 16)
+        if (m_header.bitsPerPixel == 16) {
             m_channels = {Channel(0x7C00), Channel(0x03E0), Channel(0x001F), Channel(0)};
+        }
         // Long headers hold the masks themselves, right where they would follow a short one.
         const bool hasMasks = m_header.compression == BitFields;
         std::size_t rest = m_header.size > infoHeaderSize ? m_header.size - infoHeaderSize : 0;
@@ -169,14 +181,17 @@ private:
         picture.height = static_cast<int>(height());
         picture.bitsPerPixel = static_cast<int>(m_header.bitsPerPixel);
         picture.pixels.resize(width() * height());
-        for (std::size_t y = 0; y < height(); ++y)
+        for (std::size_t y = 0; y < height(); ++y) {
             decodeRow(rows.subspan(rowFromTop(y) * rowSize(m_header.bitsPerPixel)), &picture.pixels[y * width()]);
+        }
         // An alpha channel that says nothing is visible is none.
-        if (std::ranges::all_of(picture.pixels, [](std::uint32_t pixel) { return (pixel & opaque) == 0; }))
+        if (std::ranges::all_of(picture.pixels, [](std::uint32_t pixel) { return (pixel & opaque) == 0; })) {
             setOpaque(picture);
+        }
         const bool hasOwnAlpha = m_header.bitsPerPixel == 32 && hasAlpha(picture);
-        if (m_use == DibUse::IconImage && !hasOwnAlpha && !applyMask(picture))
+        if (m_use == DibUse::IconImage && !hasOwnAlpha && !applyMask(picture)) {
             return ResourceError{"icon ends before the last row of its mask"};
+        }
         picture.hasAlpha = hasAlpha(picture);
         return picture;
     }
@@ -186,8 +201,9 @@ private:
     }
 
     void decodeRow(ResourceBytes row, std::uint32_t* pixels) const {
-        for (std::size_t x = 0; x < width(); ++x)
+        for (std::size_t x = 0; x < width(); ++x) {
             pixels[x] = pixelAt(row, x);
+        }
     }
 
     [[nodiscard]] std::uint32_t pixelAt(ResourceBytes row, std::size_t x) const {
@@ -198,10 +214,12 @@ private:
         }
         const std::size_t bytes = bits / 8;
         std::uint32_t value = 0;
-        for (std::size_t i = bytes; i-- > 0;)
+        for (std::size_t i = bytes; i-- > 0;) {
             value = value << 8 | row[x * bytes + i];
-        if (bits == 24)
+        }
+        if (bits == 24) {
             return opaque | value;
+        }
         const std::uint32_t alpha = m_channels.alpha.exists() ? m_channels.alpha.of(value) : 255;
         return alpha << 24 | m_channels.red.of(value) << 16 | m_channels.green.of(value) << 8 |
                m_channels.blue.of(value);
@@ -212,19 +230,24 @@ private:
     }
 
     static void setOpaque(Picture& picture) {
-        for (std::uint32_t& pixel : picture.pixels)
+        for (std::uint32_t& pixel : picture.pixels) {
             pixel |= opaque;
+        }
     }
 
     // A set bit of the mask lets the background through.
     bool applyMask(Picture& picture) {
         const ResourceBytes mask = m_reader.bytes(rowSize(1) * height());
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return false;
-        for (std::size_t y = 0; y < height(); ++y)
-            for (std::size_t x = 0; x < width(); ++x)
-                if ((mask[rowFromTop(y) * rowSize(1) + x / 8] >> (7 - x % 8) & 1) != 0)
+        }
+        for (std::size_t y = 0; y < height(); ++y) {
+            for (std::size_t x = 0; x < width(); ++x) {
+                if ((mask[rowFromTop(y) * rowSize(1) + x / 8] >> (7 - x % 8) & 1) != 0) {
                     picture.pixels[y * width() + x] = 0;
+                }
+            }
+        }
         return true;
     }
 

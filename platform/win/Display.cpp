@@ -7,7 +7,7 @@ namespace tvx {
 
 bool canOpenDisplay() {
     const char* name = std::getenv("DISPLAY");
-    if (name == nullptr || *name == '\0') {
+    if (!name || *name == '\0') {
         return false;
     }
     xcb_connection_t* connection = xcb_connect(nullptr, nullptr);

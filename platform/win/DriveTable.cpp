@@ -41,8 +41,9 @@ std::string unescaped(std::string_view text) {
 
 /// Of "/" nothing is taken.
 std::string_view withoutEndSlashes(std::string_view folder) {
-    while (folder.size() > 1 && folder.ends_with('/'))
+    while (folder.size() > 1 && folder.ends_with('/')) {
         folder.remove_suffix(1);
+    }
     return folder;
 }
 
@@ -50,12 +51,14 @@ std::optional<Mount> parseLine(std::string_view line) {
     constexpr int fieldsBeforePoint = 4;
     constexpr std::string_view endOfOptions = " - ";
     const std::size_t end = line.find(endOfOptions);
-    if (end == std::string_view::npos)
+    if (end == std::string_view::npos) {
         return std::nullopt;
+    }
     std::string_view left = line.substr(0, end);
     std::string_view right = line.substr(end + endOfOptions.size());
-    for (int field = 0; field < fieldsBeforePoint; ++field)
+    for (int field = 0; field < fieldsBeforePoint; ++field) {
         takeField(left, ' ');
+    }
     Mount mount{
         std::string(withoutEndSlashes(unescaped(takeField(left, ' ')))), std::string(takeField(right, ' ')), {}};
     mount.source = unescaped(takeField(right, ' '));
@@ -66,9 +69,11 @@ std::optional<Mount> parseLine(std::string_view line) {
 /// The mounts that can be reached, by mount point: of several on one point the last one lies on top.
 std::map<std::string, Mount> parseMounts(std::string_view text) {
     std::map<std::string, Mount> mounts;
-    while (!text.empty())
-        if (auto mount = parseLine(takeField(text, '\n')))
+    while (!text.empty()) {
+        if (auto mount = parseLine(takeField(text, '\n'))) {
             mounts.insert_or_assign(mount->point, *mount);
+        }
+    }
     return mounts;
 }
 
@@ -82,10 +87,12 @@ bool isNetwork(std::string_view fileSystem) {
 }
 
 std::string_view trimSlashes(std::string_view text) {
-    while (text.starts_with('/'))
+    while (text.starts_with('/')) {
         text.remove_prefix(1);
-    while (text.ends_with('/'))
+    }
+    while (text.ends_with('/')) {
         text.remove_suffix(1);
+    }
     return text;
 }
 
@@ -117,8 +124,9 @@ std::optional<Remote> parseSource(std::string_view source) {
         // The folder stands behind the last colon before it, addresses hold colons themselves.
         const std::size_t slash = source.find(":/");
         const std::size_t colon = slash == std::string_view::npos ? source.rfind(':') : slash;
-        if (colon == std::string_view::npos)
+        if (colon == std::string_view::npos) {
             return std::nullopt;
+        }
         remote.server = source.substr(0, std::min(colon, source.find(',')));
         source.remove_prefix(colon + 1);
     }
@@ -135,14 +143,16 @@ std::optional<Remote> parseSource(std::string_view source) {
 /// joined where that name is taken or would mean another folder of the share.
 std::string remoteName(const Mount& mount, const std::vector<Drive>& taken) {
     const auto remote = parseSource(mount.source);
-    if (!remote)
+    if (!remote) {
         return {};
+    }
     const std::string server = "\\\\" + remote->server + "\\";
     const std::string_view folder = remote->folder.empty() ? lastPart(mount.point) : std::string_view(remote->folder);
     std::string name = server + (remote->isShare ? joined(folder) : std::string(lastPart(folder)));
     const auto isTaken = [&](const Drive& drive) { return text::equalNoCase(drive.remoteName, name); };
-    if (std::ranges::any_of(taken, isTaken))
+    if (std::ranges::any_of(taken, isTaken)) {
         name = server + joined(folder);
+    }
     std::ranges::replace(name.begin() + static_cast<std::ptrdiff_t>(server.size()), name.end(), '\\', '-');
     return name;
 }
@@ -154,17 +164,20 @@ bool isMediaFolder(std::string_view point) {
 
 /// The drive that a mount is; nothing for one that only is a folder.
 std::optional<Drive> driveOf(const Mount& mount, const std::vector<Drive>& others, const RemovableTest& isRemovable) {
-    if (mount.point == "/")
+    if (mount.point == "/") {
         return std::nullopt;
+    }
     if (isNetwork(mount.fileSystem)) {
         Drive drive{0, mount.point, DriveKind::remote, remoteName(mount, others)};
         return drive.remoteName.empty() ? std::nullopt : std::optional(drive);
     }
-    if (!mount.source.starts_with("/dev/"))
+    if (!mount.source.starts_with("/dev/")) {
         return std::nullopt;
+    }
     const bool isDisc = mount.fileSystem == "iso9660" || mount.source.starts_with("/dev/sr");
-    if (isDisc || isMediaFolder(mount.point) || isRemovable(mount.source))
+    if (isDisc || isMediaFolder(mount.point) || isRemovable(mount.source)) {
         return Drive{0, mount.point, isDisc ? DriveKind::optical : DriveKind::removable, {}};
+    }
     return std::nullopt;
 }
 
@@ -178,8 +191,9 @@ char upper(char character) {
 
 /// Whether a name is "\\server\share" and no more: that is what names are looked up by.
 bool isShare(std::string_view name) {
-    if (!name.starts_with("\\\\"))
+    if (!name.starts_with("\\\\")) {
         return false;
+    }
     name.remove_prefix(2);
     const std::string_view server = takeField(name, '\\');
     return !server.empty() && !name.empty() && server.find('/') == std::string_view::npos &&
@@ -192,12 +206,13 @@ bool setKind(Drive& drive, std::string_view kind) {
         drive.remoteName = kind;
         return true;
     }
-    if (kind == "removable")
+    if (kind == "removable") {
         drive.kind = DriveKind::removable;
-    else if (kind == "cdrom")
+    } else if (kind == "cdrom") {
         drive.kind = DriveKind::optical;
-    else
+    } else {
         return kind.empty() || kind == "fixed";
+    }
     return true;
 }
 
@@ -205,8 +220,9 @@ std::optional<Drive> parseEntry(std::string_view entry) {
     Drive drive;
     const std::string_view letter = takeField(entry, '=');
     const std::string_view folder = withoutEndSlashes(takeField(entry, '|'));
-    if (letter.size() != 1 || !isLetter(upper(letter.front())) || !folder.starts_with('/') || !setKind(drive, entry))
+    if (letter.size() != 1 || !isLetter(upper(letter.front())) || !folder.starts_with('/') || !setKind(drive, entry)) {
         return std::nullopt;
+    }
     drive.letter = upper(letter.front());
     drive.folder = folder;
     return drive;
@@ -224,8 +240,9 @@ DriveTable DriveTable::fromMounts(std::string_view mountInfo, const RemovableTes
     char letter = 'D';
     for (const auto& [point, mount] : parseMounts(mountInfo)) {
         std::optional<Drive> drive = driveOf(mount, table.m_drives, isRemovable);
-        if (!drive || (!isLetter(letter) && drive->kind != DriveKind::remote))
+        if (!drive || (!isLetter(letter) && drive->kind != DriveKind::remote)) {
             continue;
+        }
         drive->letter = isLetter(letter) ? letter++ : '\0';
         table.m_drives.push_back(*std::move(drive));
     }
@@ -237,10 +254,11 @@ DriveTable DriveTable::fromText(std::string_view text, std::vector<std::string>&
     while (!text.empty()) {
         const std::string_view entry = takeField(text, ';');
         std::optional<Drive> drive = parseEntry(entry);
-        if (drive && !table.find(drive->letter))
+        if (drive && !table.find(drive->letter)) {
             table.m_drives.push_back(*std::move(drive));
-        else if (!entry.empty())
+        } else if (!entry.empty()) {
             mistakes.emplace_back(entry);
+        }
     }
     std::ranges::sort(table.m_drives, {}, &Drive::letter);
     return table;
@@ -261,9 +279,11 @@ const Drive* DriveTable::findShare(std::string_view remoteName) const noexcept {
 
 const Drive* DriveTable::holding(std::string_view path) const noexcept {
     const Drive* best = nullptr;
-    for (const Drive& drive : m_drives)
-        if (drive.letter && isBelow(path, drive.folder) && (!best || drive.folder.size() > best->folder.size()))
+    for (const Drive& drive : m_drives) {
+        if (drive.letter && isBelow(path, drive.folder) && (!best || drive.folder.size() > best->folder.size())) {
             best = &drive;
+        }
+    }
     return best;
 }
 

@@ -25,9 +25,11 @@ bool isRemovableDevice(std::string_view device) {
     std::error_code error;
     const std::filesystem::path name = std::filesystem::canonical(device, error).filename();
     const auto entry = std::filesystem::canonical("/sys/class/block" / name, error);
-    for (const auto& folder : {entry, entry.parent_path()})
-        if (char mark = 0; std::ifstream(folder / "removable").get(mark))
+    for (const auto& folder : {entry, entry.parent_path()}) {
+        if (char mark = 0; std::ifstream(folder / "removable").get(mark)) {
             return mark == '1';
+        }
+    }
     return false;
 }
 
@@ -36,12 +38,15 @@ class MountList {
 public:
     /// The list's text, when it is another than at the last call.
     std::optional<std::string> changed() {
-        if (m_descriptor >= 0 && !(isDue() && isSignalled()))
+        if (m_descriptor >= 0 && !(isDue() && isSignalled())) {
             return std::nullopt;
-        if (m_descriptor < 0)
+        }
+        if (m_descriptor < 0) {
             m_descriptor = ::open("/proc/self/mountinfo", O_RDONLY | O_CLOEXEC);
-        if (m_descriptor < 0)
+        }
+        if (m_descriptor < 0) {
             return std::nullopt;
+        }
         return read();
     }
 
@@ -52,8 +57,9 @@ private:
         timespec now{};
         ::clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
         const long time = now.tv_sec * 1000 + now.tv_nsec / 1000000;
-        if (time - m_asked < milliseconds)
+        if (time - m_asked < milliseconds) {
             return false;
+        }
         m_asked = time;
         return true;
     }
@@ -70,8 +76,9 @@ private:
         for (;;) {
             const ssize_t count = ::read(m_descriptor, part, sizeof(part));
             const bool isInterrupted = count < 0 && errno == EINTR;
-            if (count <= 0 && !isInterrupted)
+            if (count <= 0 && !isInterrupted) {
                 return text;
+            }
             text.append(part, static_cast<std::size_t>(std::max<ssize_t>(count, 0)));
         }
     }
@@ -90,33 +97,38 @@ public:
 
     std::shared_ptr<const DriveTable> table() {
         const std::lock_guard lock(m_mutex);
-        if (const char* text = std::getenv("TVX_DRIVES"))
+        if (const char* text = std::getenv("TVX_DRIVES")) {
             takeText(text);
-        else
+        } else {
             takeMounts();
+        }
         return m_table;
     }
 
 private:
     void takeText(const char* text) {
-        if (m_text == text)
+        if (m_text == text) {
             return;
+        }
         std::vector<std::string> mistakes;
         m_table = std::make_shared<const DriveTable>(DriveTable::fromText(text, mistakes));
         m_text = text;
-        for (const std::string& mistake : mistakes)
+        for (const std::string& mistake : mistakes) {
             std::fprintf(stderr,
                          "TVX_DRIVES: \"%s\" is left out. An entry is LETTER=/FOLDER, each letter once, with "
                          "|removable, |cdrom or |\\\\SERVER\\SHARE behind it where it is one.\n",
                          mistake.c_str());
+        }
     }
 
     void takeMounts() {
         const std::optional<std::string> mounts = m_mounts.changed();
-        if (mounts)
+        if (mounts) {
             m_mountText = *mounts;
-        if (!mounts && !m_text && m_table)
+        }
+        if (!mounts && !m_text && m_table) {
             return;
+        }
         m_table = std::make_shared<const DriveTable>(DriveTable::fromMounts(m_mountText, isRemovableDevice));
         m_text.reset();
     }
@@ -141,8 +153,9 @@ const Drive* findRoot(const DriveTable& table, std::string root) {
 }
 
 std::optional<std::string> folderOf(std::string_view root) {
-    if (isFixedDrive(root))
+    if (isFixedDrive(root)) {
         return "/";
+    }
     const auto table = currentDrives();
     const Drive* drive = findRoot(*table, std::string(root));
     return drive ? std::optional(drive->folder) : std::nullopt;
@@ -177,11 +190,13 @@ UINT typeOf(DriveKind kind) {
 /// The current folder of a drive; empty when there is no such drive.
 std::string folderOnDrive(int number) {
     std::string folder = currentFolderName();
-    if (number == 0)
+    if (number == 0) {
         return hasDrive(folder) ? folder : std::string();
+    }
     const auto letter = static_cast<char>('A' + number - 1);
-    if (number < 1 || number > 26 || !currentDrives()->find(letter))
+    if (number < 1 || number > 26 || !currentDrives()->find(letter)) {
         return {};
+    }
     return hasDrive(folder) && folder.front() == letter ? folder : std::string(1, letter) + ":\\";
 }
 
@@ -197,8 +212,9 @@ using namespace tvx::win;
 
 DWORD GetLogicalDrives() {
     DWORD letters = 0;
-    for (const auto table = currentDrives(); const Drive& drive : table->drives())
+    for (const auto table = currentDrives(); const Drive& drive : table->drives()) {
         letters |= drive.letter ? 1u << (drive.letter - 'A') : 0;
+    }
     return letters;
 }
 
@@ -221,7 +237,8 @@ char* _getdcwd(int drive, char* buffer, int size) {
         errno = folder.empty() ? EACCES : ERANGE;
         return nullptr;
     }
-    if (!buffer)
+    if (!buffer) {
         buffer = static_cast<char*>(std::malloc(std::max(needed, static_cast<std::size_t>(std::max(size, 0)))));
+    }
     return buffer ? static_cast<char*>(std::memcpy(buffer, folder.c_str(), needed)) : nullptr;
 }

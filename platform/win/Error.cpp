@@ -132,8 +132,9 @@ void SetLastError(DWORD error) {
 namespace tvx {
 
 DWORD errorFromErrno(int errnoValue) {
-    if (errnoValue == 0)
+    if (errnoValue == 0) {
         return ERROR_SUCCESS;
+    }
     const auto* found = std::ranges::find(errnoTable, errnoValue, &ErrnoEntry::errnoValue);
     return found == std::end(errnoTable) ? ERROR_GEN_FAILURE : found->error;
 }

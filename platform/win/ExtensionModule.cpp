@@ -35,27 +35,37 @@ HINSTANCE layerTranslation() {
 
 // The first module of the search that `has` what is looked for; null when none has.
 HINSTANCE search(std::predicate<HINSTANCE> auto has) {
-    for (const HINSTANCE module : {AfxGetResourceHandle(), AfxGetInstanceHandle()})
-        if (has(module))
+    for (const HINSTANCE module : {AfxGetResourceHandle(), AfxGetInstanceHandle()}) {
+        if (has(module)) {
             return module;
-    for (const CDynLinkLibrary* link : chain())
-        for (const HINSTANCE module : {link->m_hResource, link->m_hModule})
-            if (module != nullptr && has(module))
+        }
+    }
+    for (const CDynLinkLibrary* link : chain()) {
+        for (const HINSTANCE module : {link->m_hResource, link->m_hModule}) {
+            if (module && has(module)) {
                 return module;
-    for (const HINSTANCE module : {layerTranslation(), tvx::platformModule()})
-        if (module != nullptr && has(module))
+            }
+        }
+    }
+    for (const HINSTANCE module : {layerTranslation(), tvx::platformModule()}) {
+        if (module && has(module)) {
             return module;
+        }
+    }
     return nullptr;
 }
 
 bool loadStringForBase(HINSTANCE module, UINT id, std::string& text) {
-    if (module == nullptr)
+    if (!module) {
         module = AfxFindStringResourceHandle(id);
-    if (module == nullptr)
+    }
+    if (!module) {
         return false;
+    }
     auto string = tvx::resourceString(module, id);
-    if (string)
+    if (string) {
         text = std::move(*string);
+    }
     return string.has_value();
 }
 
@@ -66,8 +76,9 @@ __attribute__((constructor)) void installStringLoader() {
 } // namespace
 
 BOOL AfxInitExtensionModule(AFX_EXTENSION_MODULE& state, HMODULE module) {
-    if (state.bInitialized)
+    if (state.bInitialized) {
         return TRUE;
+    }
     state.bInitialized = TRUE;
     state.hModule = module;
     state.hResource = module;
@@ -75,12 +86,15 @@ BOOL AfxInitExtensionModule(AFX_EXTENSION_MODULE& state, HMODULE module) {
 }
 
 void AfxTermExtensionModule(AFX_EXTENSION_MODULE& state, BOOL) {
-    if (!state.bInitialized)
+    if (!state.bInitialized) {
         return;
+    }
     const auto links = chain();
-    for (CDynLinkLibrary* link : links)
-        if (link->m_hModule == state.hModule)
+    for (CDynLinkLibrary* link : links) {
+        if (link->m_hModule == state.hModule) {
             delete link; // NOLINT: the chain owns its links
+        }
+    }
     state = {};
 }
 
@@ -120,8 +134,9 @@ HINSTANCE AfxFindStringResourceHandle(UINT id) {
 }
 
 int AfxLoadString(UINT id, LPSTR buffer, UINT size) {
-    if (size > 0)
+    if (size > 0) {
         buffer[0] = '\0';
+    }
     const HINSTANCE module = AfxFindStringResourceHandle(id);
     return module && size > 0 ? LoadStringA(module, id, buffer, static_cast<int>(size)) : 0;
 }

@@ -25,16 +25,18 @@ constexpr mode_t newFileMode = 0666;
 
 /// Hands a text to a caller's buffer; see GetCurrentDirectoryA.
 DWORD copyOut(const std::string& text, DWORD size, LPSTR buffer) {
-    if (!buffer || size <= text.size())
+    if (!buffer || size <= text.size()) {
         return static_cast<DWORD>(text.size() + 1);
+    }
     std::memcpy(buffer, text.c_str(), text.size() + 1);
     return static_cast<DWORD>(text.size());
 }
 
 std::optional<std::string> pathOf(LPCSTR name, PathUse use = PathUse::existing) {
     auto path = tvx::systemPath(name ? name : "", use);
-    if (!path)
+    if (!path) {
         SetLastError(ERROR_PATH_NOT_FOUND);
+    }
     return path;
 }
 
@@ -47,8 +49,9 @@ std::optional<tvx::Location> follow(LPCSTR name) {
     }
     // Where the look-up failed, the system says why: missing, or not to be seen.
     if ((location->exists && !S_ISLNK(location->state.st_mode)) ||
-        ::stat(location->path.c_str(), &location->state) == 0)
+        ::stat(location->path.c_str(), &location->state) == 0) {
         return location;
+    }
     tvx::setLastErrorFromErrno();
     return std::nullopt;
 }
@@ -68,9 +71,10 @@ int systemFlags(DWORD access, DWORD disposition) {
 
 /// Makes an open file what CreateFileA promises; false with errno.
 bool prepare(int descriptor, DWORD share, DWORD disposition) {
-    struct stat state {};
-    if (::fstat(descriptor, &state) != 0)
+    struct stat state{};
+    if (::fstat(descriptor, &state) != 0) {
         return false;
+    }
     if (S_ISDIR(state.st_mode)) {
         errno = EISDIR;
         return false;
@@ -99,13 +103,16 @@ std::string folderOfDrive(std::string_view name) {
 std::string completed(std::string_view name) {
     const std::size_t length = tvx::rootLength(name);
     const bool isAbsolute = name.substr(length).find_first_of(separators) == 0;
-    if (length > 0 && (isAbsolute || !tvx::hasDrive(name)))
+    if (length > 0 && (isAbsolute || !tvx::hasDrive(name))) {
         return std::string(name);
-    if (length > 0)
+    }
+    if (length > 0) {
         return folderOfDrive(name) + '\\' + std::string(name.substr(length));
+    }
     const std::string folder = tvx::currentFolderName();
-    if (isAbsolute)
+    if (isAbsolute) {
         return folder.substr(0, tvx::rootLength(folder)) + std::string(name);
+    }
     return folder + '\\' + std::string(name);
 }
 
@@ -116,15 +123,17 @@ std::string resolved(std::string_view name) {
     for (std::size_t at = root; at < name.size();) {
         const std::size_t end = std::min(name.find_first_of(separators, at), name.size());
         const std::string_view part = name.substr(at, end - at);
-        if (part == ".." && !parts.empty())
+        if (part == ".." && !parts.empty()) {
             parts.pop_back();
-        else if (part != ".." && part != "." && !part.empty())
+        } else if (part != ".." && part != "." && !part.empty()) {
             parts.push_back(part);
+        }
         at = end + 1;
     }
     std::string result(name.substr(0, root));
-    for (const std::string_view part : parts)
+    for (const std::string_view part : parts) {
         result.append("\\").append(part);
+    }
     const bool isFolder = separators.find(name.back()) != std::string_view::npos;
     return isFolder || parts.empty() ? result + '\\' : result;
 }
@@ -140,11 +149,13 @@ std::string systemFullName(std::string_view name) {
 
 DWORD GetFileAttributesA(LPCSTR name) {
     const auto location = follow(name);
-    if (!location)
+    if (!location) {
         return INVALID_FILE_ATTRIBUTES;
+    }
     DWORD attributes = tvx::attributesOf(location->state, location->path);
-    if (::access(location->path.c_str(), W_OK) != 0)
+    if (::access(location->path.c_str(), W_OK) != 0) {
         attributes |= FILE_ATTRIBUTE_READONLY;
+    }
     return attributes ? attributes : FILE_ATTRIBUTE_NORMAL;
 }
 
@@ -156,28 +167,33 @@ HANDLE CreateFileA(LPCSTR name, DWORD access, DWORD share, const SECURITY_ATTRIB
     }
     const bool isExisting = disposition == OPEN_EXISTING || disposition == TRUNCATE_EXISTING;
     const auto path = pathOf(name, isExisting ? PathUse::existing : PathUse::creating);
-    if (!path)
+    if (!path) {
         return INVALID_HANDLE_VALUE;
+    }
     tvx::win::Descriptor file(::open(path->c_str(), systemFlags(access, disposition), newFileMode));
-    if (!file || !prepare(file.number(), share, disposition))
+    if (!file || !prepare(file.number(), share, disposition)) {
         return failed();
+    }
     return tvx::win::makeHandle(std::make_shared<tvx::win::KernelObject>(std::move(file)), tvx::win::Inheritance::none);
 }
 
 BOOL DeleteFileA(LPCSTR name) {
     const auto path = pathOf(name);
-    if (!path)
+    if (!path) {
         return FALSE;
-    if (::unlink(path->c_str()) == 0)
+    }
+    if (::unlink(path->c_str()) == 0) {
         return TRUE;
+    }
     tvx::setLastErrorFromErrno();
     return FALSE;
 }
 
 DWORD GetCurrentDirectoryA(DWORD size, LPSTR buffer) {
     const std::string folder = tvx::currentFolderName();
-    if (!folder.empty())
+    if (!folder.empty()) {
         return copyOut(folder, size, buffer);
+    }
     SetLastError(ERROR_FILE_NOT_FOUND);
     return 0;
 }
@@ -198,14 +214,16 @@ DWORD GetFullPathNameA(LPCSTR name, DWORD size, LPSTR buffer, LPSTR* filePart) {
 
 tvx::FileKind tvx::fileKind(LPCSTR name) {
     const auto location = follow(name);
-    if (!location)
+    if (!location) {
         return FileKind::none;
+    }
     return S_ISDIR(location->state.st_mode) ? FileKind::folder : FileKind::file;
 }
 
 std::string tvx::fullName(std::string_view name) {
-    if (name.empty())
+    if (name.empty()) {
         return {};
+    }
     const bool isSystemForm = name.front() == '/' || systemPath(name) == name;
     const std::string full = isSystemForm ? driveName(systemFullName(name)) : completed(name);
     return full.front() == '/' ? full : resolved(full);

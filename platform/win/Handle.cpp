@@ -82,8 +82,9 @@ Descriptor& Descriptor::operator=(Descriptor&& other) noexcept {
 }
 
 Descriptor::~Descriptor() {
-    if (number_ >= 0)
+    if (number_ >= 0) {
         ::close(number_);
+    }
 }
 
 int Descriptor::release() noexcept {
@@ -92,14 +93,16 @@ int Descriptor::release() noexcept {
 
 short waitReadable(int descriptor, DWORD timeout) {
     pollfd entry{descriptor, POLLIN, 0};
-    if (timeout == 0)
+    if (timeout == 0) {
         return ::poll(&entry, 1, 0) > 0 ? entry.revents : short{0};
+    }
     const auto deadline = Clock::now() + std::chrono::milliseconds(timeout);
     for (;;) {
         const timespec left = remaining(deadline);
         const int count = ::ppoll(&entry, 1, timeout == INFINITE ? nullptr : &left, nullptr);
-        if (count >= 0 || errno != EINTR)
+        if (count >= 0 || errno != EINTR) {
             return count > 0 ? entry.revents : short{0};
+        }
     }
 }
 
@@ -109,8 +112,9 @@ HANDLE makeHandle(std::shared_ptr<KernelObject> object, Inheritance inheritance)
 
 std::shared_ptr<KernelObject> objectOf(HANDLE handle) {
     std::shared_ptr<KernelObject> object = Handles::instance().find(handle).object;
-    if (!object)
+    if (!object) {
         SetLastError(ERROR_INVALID_HANDLE);
+    }
     return object;
 }
 
@@ -123,8 +127,9 @@ bool isInheritable(HANDLE handle) {
 using namespace tvx::win;
 
 BOOL CloseHandle(HANDLE handle) {
-    if (Handles::instance().take(handle).object)
+    if (Handles::instance().take(handle).object) {
         return TRUE;
+    }
     SetLastError(ERROR_INVALID_HANDLE);
     return FALSE;
 }
@@ -136,17 +141,20 @@ BOOL DuplicateHandle(HANDLE sourceProcess, HANDLE source, HANDLE targetProcess, 
         return FALSE;
     }
     std::shared_ptr<KernelObject> object = objectOf(source);
-    if (!object)
+    if (!object) {
         return FALSE;
-    if (options & DUPLICATE_CLOSE_SOURCE)
+    }
+    if (options & DUPLICATE_CLOSE_SOURCE) {
         CloseHandle(source);
+    }
     *target = makeHandle(std::move(object), inherit ? Inheritance::inheritable : Inheritance::none);
     return TRUE;
 }
 
 DWORD WaitForSingleObject(HANDLE handle, DWORD timeout) {
     const std::shared_ptr<KernelObject> object = objectOf(handle);
-    if (!object)
+    if (!object) {
         return WAIT_FAILED;
+    }
     return waitReadable(object->descriptor(), timeout) ? WAIT_OBJECT_0 : WAIT_TIMEOUT;
 }

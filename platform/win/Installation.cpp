@@ -6,9 +6,11 @@ namespace tvx {
 
 std::vector<std::string> installationRoots() {
     std::vector<std::string> roots;
-    for (const char* variable : {"MYTARVEX", "TARVEX"})
-        if (const char* root = std::getenv(variable); root != nullptr && *root != '\0')
+    for (const char* variable : {"MYTARVEX", "TARVEX"}) {
+        if (const char* root = std::getenv(variable); root && *root != '\0') {
             roots.emplace_back(root);
+        }
+    }
     return roots;
 }
 

@@ -14,9 +14,11 @@ namespace {
 constexpr LCID american = 0x0409;
 
 std::string_view localeName() {
-    for (const char* variable : {"LC_ALL", "LC_MESSAGES", "LANG"})
-        if (const char* value = std::getenv(variable); value != nullptr && *value != '\0')
+    for (const char* variable : {"LC_ALL", "LC_MESSAGES", "LANG"}) {
+        if (const char* value = std::getenv(variable); value && *value != '\0') {
             return value;
+        }
+    }
     return {};
 }
 
@@ -25,8 +27,9 @@ std::string withoutEncoding(std::string_view name) {
     const std::size_t encoding = name.find('.');
     const std::size_t modifier = name.find('@');
     std::string result(name.substr(0, std::min(encoding, modifier)));
-    if (modifier != std::string_view::npos)
+    if (modifier != std::string_view::npos) {
         result += name.substr(modifier);
+    }
     return result;
 }
 
@@ -35,8 +38,9 @@ std::string withoutEncoding(std::string_view name) {
 LCID GetUserDefaultLCID() {
     const std::string name = withoutEncoding(localeName());
     // The most frequent answers need no look into the table.
-    if (name.empty() || name == "C" || name == "POSIX")
+    if (name.empty() || name == "C" || name == "POSIX") {
         return american;
+    }
     const tvx::detail::Language* language = tvx::detail::languageNamed(name);
     return language ? language->id : american;
 }
@@ -46,10 +50,11 @@ int GetLocaleInfoA(LCID locale, LCTYPE type, LPSTR buffer, int size) {
         SetLastError(ERROR_INVALID_FLAGS);
         return 0;
     }
-    if (locale == LOCALE_USER_DEFAULT || locale == LOCALE_SYSTEM_DEFAULT)
+    if (locale == LOCALE_USER_DEFAULT || locale == LOCALE_SYSTEM_DEFAULT) {
         locale = GetUserDefaultLCID();
+    }
     const tvx::detail::Language* language = tvx::detail::languageOf(locale);
-    if (language == nullptr || size < 0 || (size > 0 && buffer == nullptr)) {
+    if (!language || size < 0 || (size > 0 && !buffer)) {
         SetLastError(ERROR_INVALID_PARAMETER);
         return 0;
     }
@@ -59,7 +64,8 @@ int GetLocaleInfoA(LCID locale, LCTYPE type, LPSTR buffer, int size) {
         SetLastError(ERROR_INSUFFICIENT_BUFFER);
         return 0;
     }
-    if (size > 0)
+    if (size > 0) {
         std::memcpy(buffer, text.data(), text.size() + 1);
+    }
     return needed;
 }

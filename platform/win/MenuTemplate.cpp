@@ -30,8 +30,9 @@ constexpr unsigned extendedEndFlag = 0x80;
 constexpr int deepestMenu = 32;
 
 Break breakOf(unsigned flags) {
-    if ((flags & barBreakFlag) != 0)
+    if ((flags & barBreakFlag) != 0) {
         return Break::Bar;
+    }
     return (flags & breakFlag) != 0 ? Break::Column : Break::None;
 }
 
@@ -43,16 +44,20 @@ public:
         const unsigned version = m_reader.u16();
         const unsigned offset = m_reader.u16();
         m_reader.skip(offset);
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return ResourceError{"menu ends within its head"};
-        if (version > 1)
+        }
+        if (version > 1) {
             return ResourceError{"menu of the unknown version " + std::to_string(version)};
+        }
         m_isExtended = version == 1;
         std::vector<MenuItemTemplate> items = readItems(0);
-        if (!m_reader.ok())
+        if (!m_reader.ok()) {
             return ResourceError{"menu ends without an end mark"};
-        if (m_isTooDeep)
+        }
+        if (m_isTooDeep) {
             return ResourceError{"menu nested deeper than " + std::to_string(deepestMenu) + " levels"};
+        }
         return items;
     }
 
@@ -63,8 +68,9 @@ private:
         m_isTooDeep = m_isTooDeep || isLast;
         while (!isLast && m_reader.ok() && !m_isTooDeep) {
             MenuItemTemplate item = m_isExtended ? readExtended(isLast) : readPlain(isLast);
-            if (item.kind == Kind::Popup)
+            if (item.kind == Kind::Popup) {
                 item.items = readItems(depth + 1);
+            }
             items.push_back(std::move(item));
         }
         return items;

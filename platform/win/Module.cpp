@@ -20,8 +20,9 @@ namespace {
 const void* loadBase(const void* address) {
     Dl_info info{};
     link_map* map = nullptr;
-    if (dladdr1(address, &info, reinterpret_cast<void**>(&map), RTLD_DL_LINKMAP) == 0)
+    if (dladdr1(address, &info, reinterpret_cast<void**>(&map), RTLD_DL_LINKMAP) == 0) {
         return nullptr;
+    }
     return map;
 }
 
@@ -45,20 +46,24 @@ std::string pathOf(const void* base) {
 // What a module is called, in lower case: "guiutilities" for /usr/lib/libGuiUtilities.so.1.
 std::string plainName(std::string_view path) {
     std::string name = plainModuleName(path);
-    if (const auto slash = name.find_last_of("/\\"); slash != std::string::npos)
+    if (const auto slash = name.find_last_of("/\\"); slash != std::string::npos) {
         name.erase(0, slash + 1);
+    }
     name = text::toLower(name);
-    for (const std::string_view extension : {".dll", ".exe"})
-        if (name.ends_with(extension))
+    for (const std::string_view extension : {".dll", ".exe"}) {
+        if (name.ends_with(extension)) {
             name.erase(name.size() - extension.size());
+        }
+    }
     return name;
 }
 
 } // namespace
 
 const std::string& Module::path() {
-    if (m_path.empty())
+    if (m_path.empty()) {
         m_path = pathOf(m_base);
+    }
     return m_path;
 }
 
@@ -73,8 +78,9 @@ void Module::remove(const void* data) {
 std::vector<const ResourceIndex*> Module::indexes() {
     std::vector<const ResourceIndex*> result;
     for (Part& part : m_parts) {
-        if (!part.index)
+        if (!part.index) {
             part.index = std::make_unique<ResourceIndex>(part.data);
+        }
         result.push_back(part.index.get());
     }
     return result;
@@ -90,8 +96,9 @@ void ModuleTable::add(const void* anchor, ResourceBytes data) {
     const void* base = loadBase(anchor);
     const std::scoped_lock lock(m_mutex);
     Module* module = byBase(base);
-    if (module == nullptr)
+    if (!module) {
         module = m_modules.emplace_back(std::make_unique<Module>(base)).get();
+    }
     module->add(data);
 }
 
@@ -99,19 +106,22 @@ void ModuleTable::remove(const void* data) {
     const void* base = loadBase(data);
     const std::scoped_lock lock(m_mutex);
     Module* module = byBase(base);
-    if (module == nullptr)
+    if (!module) {
         return;
+    }
     module->remove(data);
-    if (module->isEmpty() && base != applicationBase())
+    if (module->isEmpty() && base != applicationBase()) {
         std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+    }
 }
 
 HMODULE ModuleTable::useFile(const std::string& path) {
     const std::scoped_lock lock(m_mutex);
     const auto found = std::ranges::find_if(
         m_modules, [&](const auto& owned) { return owned->isResourceLibrary() && owned->path() == path; });
-    if (found == m_modules.end())
+    if (found == m_modules.end()) {
         return nullptr;
+    }
     ++(*found)->uses;
     return (*found)->handle();
 }
@@ -124,10 +134,12 @@ HMODULE ModuleTable::addFile(std::string path, std::vector<std::uint8_t> bytes) 
 bool ModuleTable::releaseFile(HMODULE handle) {
     const std::scoped_lock lock(m_mutex);
     Module* module = byHandle(handle);
-    if (module == nullptr || !module->isResourceLibrary())
+    if (!module || !module->isResourceLibrary()) {
         return false;
-    if (--module->uses == 0)
+    }
+    if (--module->uses == 0) {
         std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+    }
     return true;
 }
 
@@ -139,8 +151,9 @@ HMODULE ModuleTable::application() {
 HMODULE ModuleTable::fromAddress(const void* address) {
     const void* base = loadBase(address);
     const std::scoped_lock lock(m_mutex);
-    if (base != nullptr && base == applicationBase())
+    if (base && base == applicationBase()) {
         return applicationModule().handle();
+    }
     Module* module = byBase(base);
     return module ? module->handle() : nullptr;
 }
@@ -149,9 +162,11 @@ HMODULE ModuleTable::fromName(std::string_view name) {
     const std::string wanted = plainName(name);
     const std::scoped_lock lock(m_mutex);
     applicationModule();
-    for (const auto& module : m_modules)
-        if (wanted == plainName(module->path()))
+    for (const auto& module : m_modules) {
+        if (wanted == plainName(module->path())) {
             return module->handle();
+        }
+    }
     return nullptr;
 }
 
@@ -168,21 +183,24 @@ std::vector<const ResourceIndex*> ModuleTable::indexes(HMODULE handle) {
 }
 
 Module& ModuleTable::applicationModule() {
-    if (Module* module = byBase(applicationBase()))
+    if (Module* module = byBase(applicationBase())) {
         return *module;
+    }
     return *m_modules.emplace_back(std::make_unique<Module>(applicationBase()));
 }
 
 Module* ModuleTable::byBase(const void* base) {
-    if (base == nullptr)
+    if (!base) {
         return nullptr;
+    }
     const auto found = std::ranges::find_if(m_modules, [&](const auto& owned) { return owned->base() == base; });
     return found == m_modules.end() ? nullptr : found->get();
 }
 
 Module* ModuleTable::byHandle(HMODULE handle) {
-    if (handle == nullptr)
+    if (!handle) {
         return &applicationModule();
+    }
     const auto found = std::ranges::find_if(m_modules, [&](const auto& owned) { return owned->handle() == handle; });
     return found == m_modules.end() ? nullptr : found->get();
 }
@@ -207,11 +225,13 @@ std::string plainModuleName(std::string_view path) {
     std::string_view file = path.substr(folder.size());
     constexpr std::string_view prefix = "lib";
     const auto extension = text::toLower(file).find(".so");
-    if (extension == std::string::npos)
+    if (extension == std::string::npos) {
         return std::string(path);
+    }
     file = file.substr(0, extension);
-    if (text::startsWithNoCase(file, prefix))
+    if (text::startsWithNoCase(file, prefix)) {
         file.remove_prefix(prefix.size());
+    }
     return folder.append(file);
 }
 
@@ -232,22 +252,24 @@ HMODULE applicationModule() {
 HMODULE GetModuleHandleA(LPCSTR name) {
     auto& table = tvx::detail::ModuleTable::instance();
     const HMODULE module = name ? table.fromName(name) : table.application();
-    if (module == nullptr)
+    if (!module) {
         SetLastError(ERROR_MOD_NOT_FOUND);
+    }
     return module;
 }
 
 DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size) {
     const std::string path = tvx::driveName(tvx::moduleFileName(module));
-    if (path.empty() || buffer == nullptr || size == 0) {
+    if (path.empty() || !buffer || size == 0) {
         SetLastError(path.empty() ? ERROR_MOD_NOT_FOUND : ERROR_INSUFFICIENT_BUFFER);
         return 0;
     }
     const std::size_t length = std::min<std::size_t>(path.size(), size - 1);
     std::memcpy(buffer, path.data(), length);
     buffer[length] = '\0';
-    if (length == path.size())
+    if (length == path.size()) {
         return static_cast<DWORD>(length);
+    }
     SetLastError(ERROR_INSUFFICIENT_BUFFER);
     return size;
 }

@@ -91,8 +91,9 @@ private:
 /// The enumeration's next connection; null at the end.
 const Drive* nextConnection(Enumeration& enumeration) {
     const auto& drives = enumeration.table->drives();
-    while (enumeration.next < drives.size() && drives[enumeration.next].remoteName.empty())
+    while (enumeration.next < drives.size() && drives[enumeration.next].remoteName.empty()) {
         ++enumeration.next;
+    }
     return enumeration.next < drives.size() ? &drives[enumeration.next] : nullptr;
 }
 
@@ -105,10 +106,12 @@ DWORD fill(Enumeration& enumeration, DWORD& count, void* buffer, DWORD& size) {
         ++enumeration.next;
     }
     count = resources.count();
-    if (count > 0 || wanted == 0)
+    if (count > 0 || wanted == 0) {
         return NO_ERROR;
-    if (!drive)
+    }
+    if (!drive) {
         return ERROR_NO_MORE_ITEMS;
+    }
     size = static_cast<DWORD>(ResourceBuffer::sizeOf(*drive));
     return ERROR_MORE_DATA;
 }
@@ -116,17 +119,20 @@ DWORD fill(Enumeration& enumeration, DWORD& count, void* buffer, DWORD& size) {
 } // namespace
 
 DWORD WNetOpenEnumA(DWORD scope, DWORD type, DWORD /*usage*/, NETRESOURCEA* container, HANDLE* handle) {
-    if (!handle || container)
+    if (!handle || container) {
         return ERROR_INVALID_PARAMETER;
-    if (scope != RESOURCE_CONNECTED || type > RESOURCETYPE_DISK)
+    }
+    if (scope != RESOURCE_CONNECTED || type > RESOURCETYPE_DISK) {
         return ERROR_NOT_SUPPORTED;
+    }
     *handle = Enumerations::instance().open({tvx::win::currentDrives(), 0});
     return NO_ERROR;
 }
 
 DWORD WNetEnumResourceA(HANDLE handle, DWORD* count, void* buffer, DWORD* size) {
-    if (!count || !size || (!buffer && *size > 0))
+    if (!count || !size || (!buffer && *size > 0)) {
         return ERROR_INVALID_PARAMETER;
+    }
     return Enumerations::instance().with(
         handle, [&](Enumeration& enumeration) { return fill(enumeration, *count, buffer, *size); });
 }

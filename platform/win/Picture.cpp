@@ -45,13 +45,16 @@ ResourceResult<std::vector<GroupEntry>> parseGroup(ResourceBytes data, GroupKind
     const unsigned reserved = reader.u16();
     const unsigned type = reader.u16();
     const unsigned count = reader.u16();
-    if (!reader.ok() || reserved != 0 || type != static_cast<unsigned>(kind))
+    if (!reader.ok() || reserved != 0 || type != static_cast<unsigned>(kind)) {
         return ResourceError{"no list of icons or cursors"};
+    }
     std::vector<GroupEntry> entries;
-    for (unsigned i = 0; i < count && reader.ok(); ++i)
+    for (unsigned i = 0; i < count && reader.ok(); ++i) {
         entries.push_back(readGroupEntry(reader, kind));
-    if (!reader.ok() || entries.empty())
+    }
+    if (!reader.ok() || entries.empty()) {
         return ResourceError{"list of icons ends before the last of its " + std::to_string(count) + " entries"};
+    }
     return entries;
 }
 
@@ -68,11 +71,14 @@ template <class T>
 ResourceResult<T> firstReadable(HMODULE module, const std::vector<GroupEntry>& entries, LPCSTR type,
                                 ResourceResult<T> (*parse)(ResourceBytes)) {
     ResourceResult<T> first = parse(resourceBytes(module, MAKEINTRESOURCE(entries.front().id), type));
-    if (first)
+    if (first) {
         return first;
-    for (auto entry = entries.begin() + 1; entry != entries.end(); ++entry)
-        if (auto other = parse(resourceBytes(module, MAKEINTRESOURCE(entry->id), type)))
+    }
+    for (auto entry = entries.begin() + 1; entry != entries.end(); ++entry) {
+        if (auto other = parse(resourceBytes(module, MAKEINTRESOURCE(entry->id), type))) {
             return other;
+        }
+    }
     return first;
 }
 
@@ -82,8 +88,9 @@ ResourceResult<CursorPicture> parseCursorImage(ResourceBytes data) {
     cursor.hotX = reader.u16();
     cursor.hotY = reader.u16();
     auto picture = detail::decodeDib(reader.bytes(reader.remaining()), DibUse::IconImage);
-    if (!picture)
+    if (!picture) {
         return picture.error();
+    }
     cursor.picture = std::move(*picture);
     return cursor;
 }
@@ -104,22 +111,26 @@ ResourceResult<Picture> parseIconImage(ResourceBytes data) {
 
 ResourceResult<Picture> loadIconPicture(HMODULE module, LPCSTR name, int size) {
     const ResourceBytes data = resourceBytes(module, name, RT_GROUP_ICON);
-    if (data.empty())
+    if (data.empty()) {
         return notFound("icon");
+    }
     auto entries = parseGroup(data, GroupKind::Icon);
-    if (!entries)
+    if (!entries) {
         return entries.error();
+    }
     sortByFitness(*entries, size);
     return firstReadable(module, *entries, RT_ICON, parseIconImage);
 }
 
 ResourceResult<CursorPicture> loadCursorPicture(HMODULE module, LPCSTR name) {
     const ResourceBytes data = resourceBytes(module, name, RT_GROUP_CURSOR);
-    if (data.empty())
+    if (data.empty()) {
         return notFound("cursor");
+    }
     auto entries = parseGroup(data, GroupKind::Cursor);
-    if (!entries)
+    if (!entries) {
         return entries.error();
+    }
     return firstReadable(module, *entries, RT_CURSOR, parseCursorImage);
 }
 

@@ -29,12 +29,14 @@ BOOL failed(DWORD error) {
 class StandardHandles {
 public:
     StandardHandles(const STARTUPINFOA* startup, BOOL inherit) {
-        if (!startup || !(startup->dwFlags & STARTF_USESTDHANDLES))
+        if (!startup || !(startup->dwFlags & STARTF_USESTDHANDLES)) {
             return;
+        }
         const HANDLE handles[] = {startup->hStdInput, startup->hStdOutput, startup->hStdError};
         for (std::size_t index = 0; index < objects_.size(); ++index) {
-            if (inherit && isInheritable(handles[index]))
+            if (inherit && isInheritable(handles[index])) {
                 objects_[index] = objectOf<PipeObject>(handles[index]);
+            }
             descriptors_[index] = objects_[index] ? objects_[index]->descriptor() : nullDevice;
         }
     }
@@ -49,8 +51,9 @@ private:
 };
 
 Program findProgram(LPCSTR application, LPCSTR commandLine) {
-    if (!application)
+    if (!application) {
         return tvx::win::findProgram(commandLine);
+    }
     Program program = tvx::win::findProgram("\"" + std::string(application) + "\"");
     program.arguments = commandLine ? readings(commandLine).front().arguments : std::string_view();
     return program;
@@ -60,10 +63,12 @@ Program findProgram(LPCSTR application, LPCSTR commandLine) {
 class ChildArguments {
 public:
     explicit ChildArguments(const Program& program) : words_{program.name} {
-        for (const std::string& word : splitArguments(program.arguments))
+        for (const std::string& word : splitArguments(program.arguments)) {
             words_.push_back(wordForChild(word));
-        for (std::string& word : words_)
+        }
+        for (std::string& word : words_) {
             pointers_.push_back(word.data());
+        }
         pointers_.push_back(nullptr);
     }
 
@@ -83,8 +88,9 @@ StartShow showState(const STARTUPINFOA* startup) {
 
 DWORD errorOf(const SpawnResult& result) {
     const bool missing = result.error == ENOENT || result.error == ENOTDIR;
-    if (result.failedStep == SpawnStep::directory && missing)
+    if (result.failedStep == SpawnStep::directory && missing) {
         return ERROR_DIRECTORY;
+    }
     return tvx::errorFromErrno(result.error);
 }
 
@@ -115,34 +121,41 @@ void hold(SpawnResult started, PROCESS_INFORMATION& information) {
 BOOL CreateProcessA(LPCSTR application, LPSTR commandLine, const SECURITY_ATTRIBUTES* /*processAttributes*/,
                     const SECURITY_ATTRIBUTES* /*threadAttributes*/, BOOL inherit, DWORD /*flags*/, LPVOID environment,
                     LPCSTR directory, const STARTUPINFOA* startup, PROCESS_INFORMATION* information) {
-    if (environment)
+    if (environment) {
         return failed(ERROR_NOT_SUPPORTED);
+    }
     const bool blank = commandLine && readings(commandLine).empty();
-    if (blank || (!application && !commandLine))
+    if (blank || (!application && !commandLine)) {
         return failed(ERROR_INVALID_PARAMETER);
+    }
     ReleasedChildren::instance().collect();
     const std::optional<std::string> folder = directory ? tvx::systemPath(directory) : std::nullopt;
-    if (directory && !folder)
+    if (directory && !folder) {
         return failed(ERROR_DIRECTORY);
+    }
     const Program program = findProgram(application, commandLine);
-    if (program.file.empty())
+    if (program.file.empty()) {
         return failed(program.error);
+    }
     SpawnResult result = start(program, folder, startup, inherit);
-    if (!result.process)
+    if (!result.process) {
         return failed(errorOf(result));
+    }
     hold(std::move(result), *information);
     return TRUE;
 }
 
 void GetStartupInfoA(STARTUPINFOA* startup) {
     *startup = {};
-    if (askedStartShow() == StartShow::hidden)
+    if (askedStartShow() == StartShow::hidden) {
         startup->dwFlags = STARTF_USESHOWWINDOW;
+    }
 }
 
 DWORD WaitForInputIdle(HANDLE process, DWORD /*timeout*/) {
-    if (objectOf<ProcessObject>(process))
+    if (objectOf<ProcessObject>(process)) {
         SetLastError(ERROR_NOT_SUPPORTED);
+    }
     return WAIT_FAILED;
 }
 
@@ -170,8 +183,9 @@ HANDLE OpenProcess(DWORD access, BOOL /*inherit*/, DWORD processId) {
 
 BOOL GetExitCodeProcess(HANDLE process, DWORD* code) {
     const auto object = objectOf<ProcessObject>(process);
-    if (!object)
+    if (!object) {
         return FALSE;
+    }
     *code = object->exitCode();
     return TRUE;
 }
@@ -179,7 +193,8 @@ BOOL GetExitCodeProcess(HANDLE process, DWORD* code) {
 BOOL TerminateProcess(HANDLE process, UINT code) {
     const auto object = objectOf<ProcessObject>(process);
     const DWORD error = object ? object->terminate(code) : ERROR_INVALID_HANDLE;
-    if (error != ERROR_SUCCESS)
+    if (error != ERROR_SUCCESS) {
         SetLastError(error);
+    }
     return error == ERROR_SUCCESS ? TRUE : FALSE;
 }

@@ -16,12 +16,14 @@ std::string startTicks(DWORD processId) {
     const std::string stat{std::istreambuf_iterator<char>(file), {}};
     // The name is in parentheses and may hold any character, closing parentheses too.
     const auto nameEnd = stat.rfind(')');
-    if (nameEnd == std::string::npos)
+    if (nameEnd == std::string::npos) {
         return {};
+    }
     std::istringstream fields(stat.substr(nameEnd + 1));
     std::string field;
-    for (int skipped = 0; skipped < fieldsBeforeStart; ++skipped)
+    for (int skipped = 0; skipped < fieldsBeforeStart; ++skipped) {
         fields >> field;
+    }
     field.clear();
     fields >> field;
     return field;
@@ -39,14 +41,16 @@ std::string bootId() {
 std::string processMark(DWORD processId) {
     const std::string ticks = startTicks(processId);
     const std::string boot = bootId();
-    if (ticks.empty() || boot.empty())
+    if (ticks.empty() || boot.empty()) {
         return {};
+    }
     return std::to_string(processId) + " " + boot + " " + ticks;
 }
 
 bool isOtherProcess(DWORD processId, const std::string& mark) {
-    if (!mark.starts_with(std::to_string(processId) + " "))
+    if (!mark.starts_with(std::to_string(processId) + " ")) {
         return false;
+    }
     const std::string present = processMark(processId);
     return !present.empty() && present != mark;
 }

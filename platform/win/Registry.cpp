@@ -52,8 +52,9 @@ public:
         return found != m_keys.end() ? found->second : nullptr;
     }
     LSTATUS close(HKEY handle) {
-        if (handle == HKEY_CLASSES_ROOT || handle == HKEY_CURRENT_USER || handle == HKEY_LOCAL_MACHINE)
+        if (handle == HKEY_CLASSES_ROOT || handle == HKEY_CURRENT_USER || handle == HKEY_LOCAL_MACHINE) {
             return ERROR_SUCCESS;
+        }
         const std::lock_guard lock(m_mutex);
         return m_keys.erase(handle) != 0 ? ERROR_SUCCESS : ERROR_INVALID_HANDLE;
     }
@@ -82,8 +83,9 @@ LSTATUS withStore(Hive hive, Operation operation) {
         result = operation(store);
         notices = store.takeNotices();
     }
-    if (!notices.empty())
+    if (!notices.empty()) {
         deliver(notices);
+    }
     return static_cast<LSTATUS>(result);
 }
 
@@ -91,22 +93,25 @@ LSTATUS withStore(Hive hive, Operation operation) {
 template <typename Operation>
 LSTATUS withKey(HKEY handle, REGSAM rights, Operation operation) {
     const OpenKeyPointer key = HandleTable::instance().find(handle);
-    if (key == nullptr)
+    if (!key) {
         return ERROR_INVALID_HANDLE;
-    if ((key->access & rights) != rights)
+    }
+    if ((key->access & rights) != rights) {
         return ERROR_ACCESS_DENIED;
+    }
     return withStore(key->hive, [&](Store& store) { return operation(store, *key); });
 }
 
 std::string_view textOf(LPCSTR text) {
-    return text != nullptr ? text : "";
+    return text ? text : "";
 }
 
 /// The key that a call names below an open one.
 DWORD below(HKEY handle, LPCSTR subKey, REGSAM access, OpenKey& result) {
     const OpenKeyPointer key = HandleTable::instance().find(handle);
-    if (key == nullptr)
+    if (!key) {
         return ERROR_INVALID_HANDLE;
+    }
     result = {key->hive, key->path, access, key->isClass, {}, {}};
     return append(result.path, textOf(subKey));
 }
@@ -115,8 +120,9 @@ LSTATUS findKey(OpenKey& key) {
     LSTATUS result = withStore(key.hive, [&](Store& store) { return store.findKey(key.path); });
     if (result == ERROR_FILE_NOT_FOUND && key.isClass && key.hive == Hive::user) {
         result = withStore(Hive::machine, [&](Store& store) { return store.findKey(key.path); });
-        if (result == ERROR_SUCCESS)
+        if (result == ERROR_SUCCESS) {
             key.hive = Hive::machine;
+        }
     }
     const bool asksToWrite = (key.access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY)) != 0;
     return result == ERROR_SUCCESS && key.hive == Hive::machine && asksToWrite ? ERROR_ACCESS_DENIED : result;
@@ -125,23 +131,28 @@ LSTATUS findKey(OpenKey& key) {
 /// Hands a value's type and bytes to a caller by the rules of RegQueryValueExA.
 DWORD copyValue(const Value& value, LPDWORD type, LPBYTE data, LPDWORD size) {
     const auto needed = static_cast<DWORD>(value.data.size());
-    if (type != nullptr)
+    if (type) {
         *type = value.type;
-    if (size == nullptr)
+    }
+    if (!size) {
         return ERROR_SUCCESS;
+    }
     const DWORD room = *size;
     *size = needed;
-    if (data == nullptr)
+    if (!data) {
         return ERROR_SUCCESS;
-    if (room < needed)
+    }
+    if (room < needed) {
         return ERROR_MORE_DATA;
+    }
     std::ranges::copy(value.data, reinterpret_cast<char*>(data));
     return ERROR_SUCCESS;
 }
 
 DWORD copyName(const std::string& name, LPSTR buffer, DWORD& size) {
-    if (size <= name.size())
+    if (size <= name.size()) {
         return ERROR_MORE_DATA;
+    }
     std::memcpy(buffer, name.c_str(), name.size() + 1);
     size = static_cast<DWORD>(name.size());
     return ERROR_SUCCESS;
@@ -152,31 +163,39 @@ DWORD copyName(const std::string& name, LPSTR buffer, DWORD& size) {
 LSTATUS RegCreateKeyExA(HKEY key, LPCSTR subKey, DWORD, LPSTR, DWORD, REGSAM access, LPSECURITY_ATTRIBUTES,
                         PHKEY result, LPDWORD disposition) {
     OpenKey opened;
-    if (result == nullptr)
+    if (!result) {
         return ERROR_INVALID_PARAMETER;
-    if (const DWORD path = below(key, subKey, access, opened); path != ERROR_SUCCESS)
+    }
+    if (const DWORD path = below(key, subKey, access, opened); path != ERROR_SUCCESS) {
         return static_cast<LSTATUS>(path);
+    }
     bool created = false;
     LSTATUS status = findKey(opened);
-    if (status == ERROR_FILE_NOT_FOUND)
+    if (status == ERROR_FILE_NOT_FOUND) {
         status = withStore(opened.hive, [&](Store& store) { return store.createKey(opened.path, created); });
-    if (status != ERROR_SUCCESS)
+    }
+    if (status != ERROR_SUCCESS) {
         return status;
+    }
     *result = HandleTable::instance().add(std::move(opened));
-    if (disposition != nullptr)
+    if (disposition) {
         *disposition = created ? REG_CREATED_NEW_KEY : REG_OPENED_EXISTING_KEY;
+    }
     return ERROR_SUCCESS;
 }
 
 LSTATUS RegOpenKeyExA(HKEY key, LPCSTR subKey, DWORD, REGSAM access, PHKEY result) {
     OpenKey opened;
-    if (result == nullptr)
+    if (!result) {
         return ERROR_INVALID_PARAMETER;
-    if (const DWORD path = below(key, subKey, access, opened); path != ERROR_SUCCESS)
+    }
+    if (const DWORD path = below(key, subKey, access, opened); path != ERROR_SUCCESS) {
         return static_cast<LSTATUS>(path);
+    }
     const LSTATUS status = findKey(opened);
-    if (status == ERROR_SUCCESS)
+    if (status == ERROR_SUCCESS) {
         *result = HandleTable::instance().add(std::move(opened));
+    }
     return status;
 }
 
@@ -185,8 +204,9 @@ LSTATUS RegCloseKey(HKEY key) {
 }
 
 LSTATUS RegQueryValueExA(HKEY key, LPCSTR name, LPDWORD, LPDWORD type, LPBYTE data, LPDWORD size) {
-    if (data != nullptr && size == nullptr)
+    if (data && !size) {
         return ERROR_INVALID_PARAMETER;
+    }
     return withKey(key, KEY_QUERY_VALUE, [&](Store& store, const OpenKey& open) {
         std::shared_ptr<const Value> value;
         const DWORD result = store.readValue(open.path, textOf(name), value);
@@ -195,8 +215,9 @@ LSTATUS RegQueryValueExA(HKEY key, LPCSTR name, LPDWORD, LPDWORD type, LPBYTE da
 }
 
 LSTATUS RegSetValueExA(HKEY key, LPCSTR name, DWORD, DWORD type, const BYTE* data, DWORD size) {
-    if ((data == nullptr && size != 0) || !isValueName(textOf(name)))
+    if ((!data && size != 0) || !isValueName(textOf(name))) {
         return ERROR_INVALID_PARAMETER;
+    }
     return withKey(key, KEY_SET_VALUE, [&](Store& store, const OpenKey& open) {
         const std::string_view bytes(reinterpret_cast<const char*>(data), size);
         return store.writeValue(open.path, {std::string(textOf(name)), type, std::string(bytes)});
@@ -210,18 +231,22 @@ LSTATUS RegDeleteValueA(HKEY key, LPCSTR name) {
 
 LSTATUS RegDeleteKeyA(HKEY key, LPCSTR subKey) {
     OpenKey doomed;
-    if (subKey == nullptr)
+    if (!subKey) {
         return ERROR_INVALID_PARAMETER;
-    if (const DWORD path = below(key, subKey, KEY_ALL_ACCESS, doomed); path != ERROR_SUCCESS)
+    }
+    if (const DWORD path = below(key, subKey, KEY_ALL_ACCESS, doomed); path != ERROR_SUCCESS) {
         return static_cast<LSTATUS>(path);
-    if (doomed.path.folded.empty())
+    }
+    if (doomed.path.folded.empty()) {
         return ERROR_ACCESS_DENIED;
+    }
     return withStore(doomed.hive, [&](Store& store) { return store.deleteKey(doomed.path); });
 }
 
 LSTATUS RegEnumKeyExA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWORD, LPSTR, LPDWORD, PFILETIME) {
-    if (name == nullptr || nameSize == nullptr)
+    if (!name || !nameSize) {
         return ERROR_INVALID_PARAMETER;
+    }
     return withKey(key, KEY_ENUMERATE_SUB_KEYS, [&](Store& store, OpenKey& open) {
         std::string found;
         const DWORD result = store.keyAt(open.path, index, open.keyCursor, found);
@@ -231,13 +256,15 @@ LSTATUS RegEnumKeyExA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWO
 
 LSTATUS RegEnumValueA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWORD, LPDWORD type, LPBYTE data,
                       LPDWORD size) {
-    if (name == nullptr || nameSize == nullptr || (data != nullptr && size == nullptr))
+    if (!name || !nameSize || (data && !size)) {
         return ERROR_INVALID_PARAMETER;
+    }
     return withKey(key, KEY_QUERY_VALUE, [&](Store& store, OpenKey& open) {
         Value value;
         DWORD result = store.valueAt(open.path, index, open.valueCursor, value);
-        if (result == ERROR_SUCCESS)
+        if (result == ERROR_SUCCESS) {
             result = copyName(value.name, name, *nameSize);
+        }
         return result == ERROR_SUCCESS ? copyValue(value, type, data, size) : result;
     });
 }
@@ -249,14 +276,16 @@ LSTATUS RegistryTransaction::begin() {
     store.mutex.lock();
     const LSTATUS result = withStore(Hive::user, [](Store& user) { return user.begin(); });
     m_isOpen = result == ERROR_SUCCESS;
-    if (!m_isOpen)
+    if (!m_isOpen) {
         store.mutex.unlock();
+    }
     return result;
 }
 
 LSTATUS RegistryTransaction::commit() {
-    if (!m_isOpen)
+    if (!m_isOpen) {
         return ERROR_INVALID_FUNCTION;
+    }
     m_isOpen = false;
     const LSTATUS result = withStore(Hive::user, [](Store& user) { return user.commit(); });
     Store::of(Hive::user).mutex.unlock();
@@ -264,8 +293,9 @@ LSTATUS RegistryTransaction::commit() {
 }
 
 RegistryTransaction::~RegistryTransaction() {
-    if (!m_isOpen)
+    if (!m_isOpen) {
         return;
+    }
     Store& store = Store::of(Hive::user);
     store.rollback();
     store.mutex.unlock();

@@ -18,14 +18,15 @@ std::atomic<RegistryNotice> theNotice{&tellOnStandardError};
 } // namespace
 
 void setRegistryNotice(RegistryNotice notice) noexcept {
-    theNotice = notice != nullptr ? notice : &tellOnStandardError;
+    theNotice = notice ? notice : &tellOnStandardError;
 }
 
 namespace registry {
 
 void deliver(const std::vector<std::string>& notices) {
-    for (const std::string& text : notices)
+    for (const std::string& text : notices) {
         theNotice.load()(text);
+    }
 }
 
 } // namespace registry

@@ -20,9 +20,11 @@ constexpr UINT stringsPerBlock = 16;
 const ResourceEntry* findIn(const Indexes& indexes, LPCSTR type, LPCSTR name, std::optional<WORD> language) {
     const std::string typeKey = tvx::detail::resourceKey(type);
     const std::string nameKey = tvx::detail::resourceKey(name);
-    for (const ResourceIndex* index : indexes)
-        if (const ResourceEntry* entry = index->find(typeKey, nameKey, language))
+    for (const ResourceIndex* index : indexes) {
+        if (const ResourceEntry* entry = index->find(typeKey, nameKey, language)) {
             return entry;
+        }
+    }
     return nullptr;
 }
 
@@ -35,18 +37,21 @@ DWORD whyMissing(const Indexes& indexes, LPCSTR type, LPCSTR name) {
         hasData = hasData || !index->entries().empty();
         hasType = hasType || index->hasType(typeKey);
     }
-    if (!hasData)
+    if (!hasData) {
         return ERROR_RESOURCE_DATA_NOT_FOUND;
-    if (!hasType)
+    }
+    if (!hasType) {
         return ERROR_RESOURCE_TYPE_NOT_FOUND;
+    }
     return findIn(indexes, type, name, std::nullopt) ? ERROR_RESOURCE_LANG_NOT_FOUND : ERROR_RESOURCE_NAME_NOT_FOUND;
 }
 
 const ResourceEntry* findEntry(HMODULE module, LPCSTR type, LPCSTR name, std::optional<WORD> language) {
     const Indexes indexes = ModuleTable::instance().indexes(module);
     const ResourceEntry* entry = findIn(indexes, type, name, language);
-    if (entry == nullptr)
+    if (!entry) {
         SetLastError(whyMissing(indexes, type, name));
+    }
     return entry;
 }
 
@@ -69,7 +74,7 @@ HRSRC FindResourceExA(HMODULE module, LPCSTR type, LPCSTR name, WORD language) {
 }
 
 HGLOBAL LoadResource(HMODULE, HRSRC resource) {
-    if (resource == nullptr) {
+    if (!resource) {
         SetLastError(ERROR_INVALID_HANDLE);
         return nullptr;
     }
@@ -81,7 +86,7 @@ LPVOID LockResource(HGLOBAL data) {
 }
 
 DWORD SizeofResource(HMODULE, HRSRC resource) {
-    if (resource == nullptr) {
+    if (!resource) {
         SetLastError(ERROR_INVALID_HANDLE);
         return 0;
     }
@@ -94,11 +99,13 @@ BOOL FreeResource(HGLOBAL) {
 
 int LoadStringA(HINSTANCE module, UINT id, LPSTR buffer, int size) {
     const auto string = tvx::resourceString(module, id);
-    if (size <= 0 || buffer == nullptr)
+    if (size <= 0 || !buffer) {
         return string ? static_cast<int>(string->size()) : 0;
+    }
     buffer[0] = '\0';
-    if (!string)
+    if (!string) {
         return 0;
+    }
     const std::size_t length =
         tvx::text::characterStart(*string, std::min(string->size(), static_cast<std::size_t>(size) - 1));
     std::memcpy(buffer, string->data(), length);
@@ -119,20 +126,25 @@ std::optional<std::string> resourceString(HMODULE module, UINT id) {
         return std::nullopt;
     }
     detail::ByteReader reader(resourceBytes(module, MAKEINTRESOURCE(id / stringsPerBlock + 1), RT_STRING));
-    for (UINT i = 0; i < id % stringsPerBlock; ++i)
+    for (UINT i = 0; i < id % stringsPerBlock; ++i) {
         reader.skip(std::size_t{reader.u16()} * 2);
+    }
     const std::u16string string = reader.text(reader.u16());
-    if (reader.ok() && !string.empty())
+    if (reader.ok() && !string.empty()) {
         return text::narrow(string);
-    if (reader.ok())
+    }
+    if (reader.ok()) {
         SetLastError(ERROR_RESOURCE_NAME_NOT_FOUND);
+    }
     return std::nullopt;
 }
 
 std::string resourceDamage(HMODULE module) {
-    for (const ResourceIndex* index : ModuleTable::instance().indexes(module))
-        if (!index->damage().empty())
+    for (const ResourceIndex* index : ModuleTable::instance().indexes(module)) {
+        if (!index->damage().empty()) {
             return index->damage();
+        }
+    }
     return {};
 }
 

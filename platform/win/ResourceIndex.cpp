@@ -24,15 +24,17 @@ std::string keyOf(std::string_view name) {
     unsigned number = 0;
     if (name.size() > 1 && name.front() == '#') {
         const auto [end, error] = std::from_chars(name.data() + 1, name.data() + name.size(), number);
-        if (error == std::errc() && end == name.data() + name.size() && number <= 0xFFFF)
+        if (error == std::errc() && end == name.data() + name.size() && number <= 0xFFFF) {
             return keyOf(static_cast<WORD>(number));
+        }
     }
     return text::foldCase(name);
 }
 
 std::string readKey(ByteReader& reader) {
-    if (reader.peekU16() != ordinalMark)
+    if (reader.peekU16() != ordinalMark) {
         return keyOf(text::narrow(reader.zeroEndedText()));
+    }
     reader.skip(2);
     return keyOf(reader.u16());
 }
@@ -65,11 +67,13 @@ ResourceEntry readEntry(ByteReader& reader, std::string& damage) {
     header.skip(6); // data version, memory flags
     entry.language = header.u16();
     header.skip(8); // version, characteristics
-    if (!header.ok())
+    if (!header.ok()) {
         damage = damageAt("resource header without an end", start);
+    }
     entry.data = reader.bytes(dataSize);
-    if (!reader.ok())
+    if (!reader.ok()) {
         damage = damageAt("resource longer than the file", start);
+    }
     reader.align(4);
     return entry;
 }
@@ -82,8 +86,9 @@ auto keyRange(const std::vector<ResourceEntry>& entries, const std::string& type
 } // namespace
 
 std::string resourceKey(LPCSTR name) {
-    if (IS_INTRESOURCE(name))
+    if (IS_INTRESOURCE(name)) {
         return keyOf(static_cast<WORD>(reinterpret_cast<std::uintptr_t>(name)));
+    }
     return keyOf(std::string_view(name));
 }
 
@@ -94,8 +99,9 @@ ResourceIndex::ResourceIndex(ResourceBytes data) {
     }
     ByteReader reader(data);
     reader.skip(headSize);
-    while (reader.remaining() > 0 && m_damage.empty())
+    while (reader.remaining() > 0 && m_damage.empty()) {
         m_entries.push_back(readEntry(reader, m_damage));
+    }
     if (!m_damage.empty()) {
         m_entries.clear();
         return;
@@ -110,11 +116,13 @@ ResourceIndex::ResourceIndex(ResourceBytes data) {
 const ResourceEntry* ResourceIndex::find(const std::string& type, const std::string& name,
                                          std::optional<WORD> language) const {
     const auto range = keyRange(m_entries, type, name);
-    if (range.empty())
+    if (range.empty()) {
         return nullptr;
+    }
     const auto found = std::ranges::find(range, language.value_or(0), &ResourceEntry::language);
-    if (found != range.end())
+    if (found != range.end()) {
         return &*found;
+    }
     return language ? nullptr : &range.front();
 }
 

@@ -35,15 +35,17 @@ bool isAbsolute(std::string_view name) {
 
 void addFolderOf(std::vector<std::string>& folders, HMODULE module) {
     const fs::path file = tvx::moduleFileName(module);
-    if (file.is_absolute())
+    if (file.is_absolute()) {
         folders.push_back(file.parent_path());
+    }
 }
 
 std::vector<std::string> searchFolders(std::string_view name) {
     std::vector<std::string> folders;
     const std::string base(name.substr(0, name.rfind('.')));
-    if (const HMODULE module = ModuleTable::instance().fromName(base))
+    if (const HMODULE module = ModuleTable::instance().fromName(base)) {
         addFolderOf(folders, module);
+    }
     addFolderOf(folders, nullptr);
     for (const std::string& root : tvx::installationRoots()) {
         folders.push_back(root + "/lib");
@@ -61,12 +63,14 @@ std::vector<std::string> searchFolders(std::string_view name) {
 
 // The system's name of the file that is meant.
 std::optional<std::string> locate(std::string_view name) {
-    if (name.find_first_of("/\\:") != std::string_view::npos)
+    if (name.find_first_of("/\\:") != std::string_view::npos) {
         return isAbsolute(name) ? tvx::systemPath(name) : std::nullopt;
+    }
     for (const std::string& folder : searchFolders(name)) {
         auto path = tvx::systemPath(folder + '/' + std::string(name));
-        if (path && isRegularFile(*path))
+        if (path && isRegularFile(*path)) {
             return path;
+        }
     }
     return std::nullopt;
 }
@@ -92,7 +96,7 @@ std::optional<std::vector<std::uint8_t>> read(const std::string& path) {
 } // namespace
 
 HMODULE LoadLibraryA(LPCSTR name) {
-    if (name == nullptr || *name == '\0') {
+    if (!name || *name == '\0') {
         SetLastError(ERROR_INVALID_PARAMETER);
         return nullptr;
     }
@@ -104,11 +108,13 @@ HMODULE LoadLibraryA(LPCSTR name) {
     std::error_code error;
     const fs::path resolved = fs::canonical(*path, error);
     ModuleTable& table = ModuleTable::instance();
-    if (const HMODULE loaded = table.useFile(resolved.string()))
+    if (const HMODULE loaded = table.useFile(resolved.string())) {
         return loaded;
+    }
     auto bytes = read(resolved.string());
-    if (!bytes)
+    if (!bytes) {
         return nullptr;
+    }
     if (!tvx::detail::ResourceIndex(*bytes).damage().empty()) {
         SetLastError(ERROR_BAD_EXE_FORMAT);
         return nullptr;
@@ -117,8 +123,9 @@ HMODULE LoadLibraryA(LPCSTR name) {
 }
 
 BOOL FreeLibrary(HMODULE library) {
-    if (library != nullptr && ModuleTable::instance().releaseFile(library))
+    if (library && ModuleTable::instance().releaseFile(library)) {
         return TRUE;
+    }
     SetLastError(ERROR_INVALID_HANDLE);
     return FALSE;
 }
@@ -127,8 +134,9 @@ namespace tvx {
 
 HMODULE loadTranslation(HMODULE module) {
     const LCID locale = GetUserDefaultLCID();
-    if (PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH)
+    if (PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH) {
         return nullptr;
+    }
     std::array<char, 4> abbreviation{};
     GetLocaleInfoA(locale, LOCALE_SABBREVLANGNAME, abbreviation.data(), abbreviation.size());
     const fs::path file = plainModuleName(moduleFileName(module));

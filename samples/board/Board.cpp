@@ -20,8 +20,8 @@ void CBoardCommandLine::ParseParam(const char* param, BOOL isSwitch, BOOL isLast
     if (isSwitch) {
         const UT_CMDOPCODES options(GetCmdOpcodes());
         const char* name = options.optionname(param);
-        m_gridFollows = name != nullptr && std::strcmp(name, "grid") == 0;
-        m_single |= name != nullptr && std::strcmp(name, "single") == 0;
+        m_gridFollows = name && std::strcmp(name, "grid") == 0;
+        m_single |= name && std::strcmp(name, "single") == 0;
     } else if (m_gridFollows) {
         m_gridFollows = false;
         m_grid = static_cast<int>(std::clamp(std::strtol(param, nullptr, 10), 0L, 1000L));

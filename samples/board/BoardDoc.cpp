@@ -76,7 +76,7 @@ void CBoardDoc::DeleteContents() {
 BOOL CBoardDoc::OnOpenDocument(LPCSTR path) {
     CFileException error;
     CFile* file = GetFile(path, CFile::modeRead | CFile::shareDenyWrite, &error);
-    if (file == nullptr) {
+    if (!file) {
         ReportSaveLoadException(path, &error, FALSE, AFX_IDP_FAILED_TO_OPEN_DOC);
         return FALSE;
     }
@@ -123,7 +123,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
 BOOL CBoardDoc::OnSaveDocument(LPCSTR path) {
     CFileException error;
     CFile* file = GetFile(path, CFile::modeCreate | CFile::modeReadWrite | CFile::shareExclusive, &error);
-    if (file == nullptr) {
+    if (!file) {
         ReportSaveLoadException(path, &error, TRUE, AFX_IDP_INVALID_FILENAME);
         return FALSE;
     }

@@ -167,7 +167,7 @@ void CBoardView::Select(int index) {
 
 int CBoardView::HandleAt(Point point) const {
     const Shape* shape = Selected();
-    if (shape == nullptr) {
+    if (!shape) {
         return -1;
     }
     const auto corners = cornersOf(*shape);
@@ -298,7 +298,7 @@ void CBoardView::ReplaceSelected(Shape shape) {
 
 void CBoardView::OnLButtonDblClk(UINT flags, CPoint point) {
     OnLButtonDown(flags, point);
-    if (m_tool == Tool::select && Selected() != nullptr && Selected()->kind == ShapeKind::text) {
+    if (m_tool == Tool::select && Selected() && Selected()->kind == ShapeKind::text) {
         EndDrag(false);
         OnEditText();
     }
@@ -336,7 +336,7 @@ void CBoardView::OnKeyDown(UINT key, UINT repeat, UINT flags) {
     }
     const int dx = key == VK_LEFT ? -1 : key == VK_RIGHT ? 1 : 0;
     const int dy = key == VK_UP ? -1 : key == VK_DOWN ? 1 : 0;
-    if (Selected() == nullptr || (dx == 0 && dy == 0)) {
+    if (!Selected() || (dx == 0 && dy == 0)) {
         CScrollView::OnKeyDown(key, repeat, flags);
         return;
     }
@@ -359,7 +359,7 @@ void CBoardView::OnUpdateTool(CCmdUI* item) {
 
 void CBoardView::OnColor(UINT id) {
     m_color = outlineColors[id - ID_COLOR_FIRST];
-    if (Selected() != nullptr) {
+    if (Selected()) {
         Shape shape = *Selected();
         shape.color = m_color;
         ReplaceSelected(std::move(shape));
@@ -367,13 +367,13 @@ void CBoardView::OnColor(UINT id) {
 }
 
 void CBoardView::OnUpdateColor(CCmdUI* item) {
-    const Color shown = Selected() != nullptr ? Selected()->color : m_color;
+    const Color shown = Selected() ? Selected()->color : m_color;
     item->SetRadio(shown == outlineColors[item->m_nID - ID_COLOR_FIRST]);
 }
 
 void CBoardView::OnFill(UINT id) {
     m_fill = fillColors[id - ID_FILL_FIRST];
-    if (Selected() != nullptr && Selected()->kind != ShapeKind::line) {
+    if (Selected() && Selected()->kind != ShapeKind::line) {
         Shape shape = *Selected();
         shape.fill = m_fill;
         ReplaceSelected(std::move(shape));
@@ -381,7 +381,7 @@ void CBoardView::OnFill(UINT id) {
 }
 
 void CBoardView::OnUpdateFill(CCmdUI* item) {
-    const Color shown = Selected() != nullptr ? Selected()->fill : m_fill;
+    const Color shown = Selected() ? Selected()->fill : m_fill;
     item->SetRadio(shown == fillColors[item->m_nID - ID_FILL_FIRST]);
 }
 
@@ -424,7 +424,7 @@ void CBoardView::OnUpdateSelected(CCmdUI* item) {
 }
 
 void CBoardView::OnUpdateEditText(CCmdUI* item) {
-    item->Enable(Selected() != nullptr && Selected()->kind == ShapeKind::text);
+    item->Enable(Selected() && Selected()->kind == ShapeKind::text);
 }
 
 void CBoardView::OnUpdatePosition(CCmdUI* item) {

@@ -111,7 +111,7 @@ void COutputWindow::PostNcDestroy() {
 void COutputWindow::OnSize(UINT type, int width, int height) {
     CDialog::OnSize(type, width, height);
     CWnd* close = GetDlgItem(IDCANCEL);
-    if (type == SIZE_MINIMIZED || close == nullptr || m_output.m_hWnd == nullptr || m_size.cx == 0) {
+    if (type == SIZE_MINIMIZED || !close || !m_output.m_hWnd || m_size.cx == 0) {
         return;
     }
     const int moreX = width - m_size.cx;

@@ -75,7 +75,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     } catch (CException* e) {
         e->Delete();
     }
-    while (!CFuzzNode::all().empty())
+    while (!CFuzzNode::all().empty()) {
         delete *CFuzzNode::all().begin();
+    }
     return 0;
 }

@@ -23,8 +23,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     std::string again;
     std::vector<std::string> expected;
     for (const std::string& word : read.words) {
-        if (word.size() > size || word.find_first_of("\r\n") != std::string::npos)
+        if (word.size() > size || word.find_first_of("\r\n") != std::string::npos) {
             std::abort();
+        }
         if (canBeQuoted(word)) {
             again += quoted(word) + "\r\n";
             expected.push_back(word);
@@ -32,7 +33,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     }
     // What is written with quotes reads back as it was.
     const auto back = Port::detail::splitCommandText(again);
-    if (back.words != expected || !back.unclosedLines.empty())
+    if (back.words != expected || !back.unclosedLines.empty()) {
         std::abort();
+    }
     return 0;
 }

@@ -14,8 +14,9 @@
 namespace {
 
 void require(bool holds) {
-    if (!holds)
+    if (!holds) {
         std::abort();
+    }
 }
 
 /// Without network names, all but names of shares come back as they were, with backslashes.

@@ -35,8 +35,9 @@ public:
         const timespec stamps[] = {{++m_time, 0}, {m_time, 0}};
         if (::ftruncate(m_file, 0) != 0 ||
             ::pwrite(m_file, contents.data(), contents.size(), 0) != static_cast<ssize_t>(contents.size()) ||
-            ::futimens(m_file, stamps) != 0)
+            ::futimens(m_file, stamps) != 0) {
             std::abort();
+        }
     }
 
 private:
@@ -53,15 +54,18 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     installation.write(text);
     for (const char* key : {"version", "summary", "pdfViewer", "a"}) {
         const char* const value = Gui_InstallInfo::GetValue(key);
-        if (value && std::strlen(value) > 255)
+        if (value && std::strlen(value) > 255) {
             std::abort();
-        if (value && text.find(key) == std::string::npos)
+        }
+        if (value && text.find(key) == std::string::npos) {
             std::abort();
+        }
     }
     // Nothing of it stays behind.
     installation.write("\n::only=mine\n");
     const char* const value = Gui_InstallInfo::GetValue("only");
-    if (!value || std::strcmp(value, "mine") != 0 || Gui_InstallInfo::GetValue("version"))
+    if (!value || std::strcmp(value, "mine") != 0 || Gui_InstallInfo::GetValue("version")) {
         std::abort();
+    }
     return 0;
 }

@@ -25,8 +25,9 @@ void checkSpec(const std::string& text) {
     const auto spec = Port::detail::parseOptionSpec(text);
     for (const auto& rule : spec.options) {
         const auto found = spec.find(rule.name);
-        if (found.size() != 1 || found.front() != &rule)
+        if (found.size() != 1 || found.front() != &rule) {
             std::abort();
+        }
     }
     std::free(UT_CMDOPCODES(text.c_str()).usage());
 }
@@ -39,15 +40,18 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
 
     std::vector<std::string> words;
     std::istringstream stream(text);
-    for (std::string word; stream >> word;)
+    for (std::string word; stream >> word;) {
         words.push_back(word);
+    }
     std::vector<const char*> arguments;
-    for (const std::string& word : words)
+    for (const std::string& word : words) {
         arguments.push_back(word.c_str());
+    }
     const Counter counter;
     const UT_CMDARGS check(static_cast<int>(arguments.size()), arguments.data(), text.c_str(), nullptr,
                            UT_CMDARGS::NoProgramName);
-    if (check.iserror() != (counter.getErrorCount() > 0))
+    if (check.iserror() != (counter.getErrorCount() > 0)) {
         std::abort();
+    }
     return 0;
 }

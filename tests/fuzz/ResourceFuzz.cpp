@@ -19,8 +19,9 @@ using namespace tvx;
 template <auto Parse>
 void check(ResourceBytes bytes) {
     const auto outcome = Parse(bytes);
-    if (outcome.reason().empty() != static_cast<bool>(outcome))
+    if (outcome.reason().empty() != static_cast<bool>(outcome)) {
         std::abort();
+    }
 }
 
 const std::map<std::string, void (*)(ResourceBytes)> parsers = {
@@ -38,13 +39,16 @@ void readFromModule(ResourceBytes data) {
     registerResources(data.data(), data.data(), data.size());
     const detail::ResourceIndex index(data);
     for (const detail::ResourceEntry& entry : index.entries()) {
-        if (entry.type == "#14")
+        if (entry.type == "#14") {
             static_cast<void>(loadIconPicture(nullptr, entry.name.c_str(), 16));
-        if (entry.type == "#12")
+        }
+        if (entry.type == "#12") {
             static_cast<void>(loadCursorPicture(nullptr, entry.name.c_str()));
+        }
     }
-    for (UINT id = 0; id < 512; ++id)
+    for (UINT id = 0; id < 512; ++id) {
         static_cast<void>(resourceString(nullptr, id));
+    }
     unregisterResources(data.data());
 }
 
@@ -53,10 +57,13 @@ void readFromModule(ResourceBytes data) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
     const ResourceBytes data(bytes, size);
     const detail::ResourceIndex index(data);
-    for (const detail::ResourceEntry& entry : index.entries())
-        if (const auto parser = parsers.find(entry.type); parser != parsers.end())
+    for (const detail::ResourceEntry& entry : index.entries()) {
+        if (const auto parser = parsers.find(entry.type); parser != parsers.end()) {
             parser->second(entry.data);
-    if (index.damage().empty())
+        }
+    }
+    if (index.damage().empty()) {
         readFromModule(data);
+    }
     return 0;
 }

@@ -11,8 +11,9 @@
 int main(int argc, char** argv) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     testing::InitGoogleTest(&argc, argv);
-    if (!tvx::afx::ensureGui())
+    if (!tvx::afx::ensureGui()) {
         return 1;
+    }
     QApplication::setStyle(QStringLiteral("Fusion"));
     QFont font(QStringLiteral("DejaVu Sans Condensed"));
     font.setPixelSize(11);

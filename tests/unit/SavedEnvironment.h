@@ -10,8 +10,9 @@
 class SavedEnvironment {
 public:
     SavedEnvironment() {
-        for (char** variable = environ; *variable != nullptr; ++variable)
+        for (char** variable = environ; *variable; ++variable) {
             m_variables.emplace_back(*variable);
+        }
     }
     ~SavedEnvironment() {
         clearenv();

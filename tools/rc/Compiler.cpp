@@ -16,15 +16,17 @@ namespace fs = std::filesystem;
 
 std::string readFile(const fs::path& path) {
     std::ifstream file(path, std::ios::binary);
-    if (!file)
+    if (!file) {
         throw Fault{{path.string(), 0}, "cannot be read"};
+    }
     return {std::istreambuf_iterator<char>(file), {}};
 }
 
 void writeFile(const fs::path& path, const std::string& text) {
     std::ofstream file(path, std::ios::binary);
-    if (!(file << text).flush())
+    if (!(file << text).flush()) {
         throw Fault{{path.string(), 0}, "cannot be written"};
+    }
 }
 
 fs::path beside(const fs::path& output, const char* extension) {
@@ -34,15 +36,19 @@ fs::path beside(const fs::path& output, const char* extension) {
 // Paths that an `#include` line of the script may mean: with backslashes, or in another case than the file's.
 std::string withRealInclude(const std::string& line, const std::vector<fs::path>& folders) {
     const std::size_t start = line.find_first_not_of(" \t");
-    if (start == std::string::npos || line[start] != '#' || line.find("include", start) == std::string::npos)
+    if (start == std::string::npos || line[start] != '#' || line.find("include", start) == std::string::npos) {
         return line;
+    }
     const std::size_t open = line.find('"');
     const std::size_t close = open == std::string::npos ? open : line.find('"', open + 1);
-    if (close == std::string::npos)
+    if (close == std::string::npos) {
         return line;
-    for (const fs::path& folder : folders)
-        if (const fs::path found = findFile(folder, line.substr(open + 1, close - open - 1)); !found.empty())
+    }
+    for (const fs::path& folder : folders) {
+        if (const fs::path found = findFile(folder, line.substr(open + 1, close - open - 1)); !found.empty()) {
             return line.substr(0, open + 1) + found.string() + line.substr(close);
+        }
+    }
     return line;
 }
 
@@ -60,15 +66,18 @@ std::string preparedScript(const Options& options, const std::vector<fs::path>& 
 
 std::string preprocess(const Options& options, const std::vector<fs::path>& folders) {
     std::vector<std::string> command = {options.preprocessor, "-E", "-xc", "-w", "-undef", "-DRC_INVOKED"};
-    for (const std::string& definition : options.definitions)
+    for (const std::string& definition : options.definitions) {
         command.push_back("-D" + definition);
-    for (const fs::path& folder : folders)
+    }
+    for (const fs::path& folder : folders) {
         command.push_back("-I" + folder.string());
+    }
     command.emplace_back("-");
     const ChildResult result = run(command, preparedScript(options, folders));
     // The preprocessor's messages carry the author's file and line already.
-    if (result.exitCode != 0)
+    if (result.exitCode != 0) {
         throw Fault{{}, result.errors};
+    }
     return result.output;
 }
 
@@ -87,15 +96,17 @@ Place placeOfError(const Script& script, const Statement& statement, const std::
     if (got != std::string::npos) {
         const std::string word = message.substr(got + 4, message.find_last_not_of(" \n") + 1 - got - 4);
         const auto isWord = [&](const Token& token) { return token.text == word || token.text == '"' + word + '"'; };
-        if (std::ranges::count_if(statement.tokens, isWord) == 1)
+        if (std::ranges::count_if(statement.tokens, isWord) == 1) {
             line = std::ranges::find_if(statement.tokens, isWord)->line;
+        }
     }
     return script.lines[line].place;
 }
 
 std::string oneLine(std::string message) {
-    if (message.starts_with("llvm-rc: "))
+    if (message.starts_with("llvm-rc: ")) {
         message.erase(0, 9);
+    }
     std::ranges::replace(message, '\n', ' ');
     message.erase(message.find_last_not_of(' ') + 1);
     return message;
@@ -106,8 +117,9 @@ std::string oneLine(std::string message) {
     const fs::path output = beside(options.output, ".failed");
     const auto compileFirst = [&](std::size_t count) {
         std::string text;
-        for (std::size_t i = 0; i < count; ++i)
+        for (std::size_t i = 0; i < count; ++i) {
             text += texts[i];
+        }
         return compileText(options, text, output);
     };
     std::size_t good = 0;
@@ -129,16 +141,18 @@ void refuseWideIncludes(const Options& options, const Script& script) {
         char mark[2] = {};
         std::ifstream(file, std::ios::binary).read(mark, sizeof mark);
         const std::string_view bytes(mark, sizeof mark);
-        if (file != options.script && (bytes == "\xFF\xFE" || bytes == "\xFE\xFF"))
+        if (file != options.script && (bytes == "\xFF\xFE" || bytes == "\xFE\xFF")) {
             throw Fault{{file.string(), 1}, "an included file in UTF-16: save it as UTF-8"};
+        }
     }
 }
 
 std::string escapedForMake(const fs::path& path) {
     std::string text;
     for (const char c : path.string()) {
-        if (c == ' ' || c == '#')
+        if (c == ' ' || c == '#') {
             text += '\\';
+        }
         text += c == '$' ? "$$" : std::string(1, c);
     }
     return text;
@@ -146,9 +160,11 @@ std::string escapedForMake(const fs::path& path) {
 
 void writeDependencies(const Options& options, const Script& script, const Rewriter& rewriter) {
     std::string rule = escapedForMake(options.output) + ":";
-    for (const auto* files : {&script.files, &rewriter.files()})
-        for (const fs::path& file : *files)
+    for (const auto* files : {&script.files, &rewriter.files()}) {
+        for (const fs::path& file : *files) {
             rule += " \\\n  " + escapedForMake(fs::absolute(file));
+        }
+    }
     writeFile(options.dependencies, rule + "\n");
 }
 
@@ -162,14 +178,17 @@ void compile(const Options& options) {
     Rewriter rewriter(folders);
     std::vector<std::string> texts;
     std::string all;
-    for (const Statement& statement : script.statements)
+    for (const Statement& statement : script.statements) {
         all += texts.emplace_back(rewriter.rewrite(script, statement));
+    }
 
     const fs::path fresh = beside(options.output, ".new");
-    if (compileText(options, all, fresh).exitCode != 0)
+    if (compileText(options, all, fresh).exitCode != 0) {
         reportError(options, script, texts);
-    if (!options.dependencies.empty())
+    }
+    if (!options.dependencies.empty()) {
         writeDependencies(options, script, rewriter);
+    }
     fs::rename(fresh, options.output);
 }
 

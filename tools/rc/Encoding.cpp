@@ -29,10 +29,12 @@ void append(std::string& text, char32_t c) {
 }
 
 std::size_t lengthByLead(std::uint8_t lead) {
-    if (lead < 0x80)
+    if (lead < 0x80) {
         return 1;
-    if (lead < 0xC2 || lead > 0xF4)
+    }
+    if (lead < 0xC2 || lead > 0xF4) {
         return 0;
+    }
     return lead < 0xE0 ? 2 : lead < 0xF0 ? 3 : 4;
 }
 
@@ -43,9 +45,11 @@ std::size_t sequenceLength(std::string_view text, std::size_t at) {
     };
     const std::uint8_t lead = byte(0);
     const std::size_t length = lengthByLead(lead);
-    for (std::size_t i = 1; i < length; ++i)
-        if ((byte(i) & 0xC0) != 0x80)
+    for (std::size_t i = 1; i < length; ++i) {
+        if ((byte(i) & 0xC0) != 0x80) {
             return 0;
+        }
+    }
     const bool isOverlong = (lead == 0xE0 && byte(1) < 0xA0) || (lead == 0xF0 && byte(1) < 0x90);
     const bool isOutside = (lead == 0xED && byte(1) > 0x9F) || (lead == 0xF4 && byte(1) > 0x8F);
     return isOverlong || isOutside ? 0 : length;
@@ -74,8 +78,9 @@ std::string utf16ToUtf8(std::string_view bytes, bool isBigEndian) {
 bool isUtf8(std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
         const std::size_t length = sequenceLength(text, at);
-        if (length == 0)
+        if (length == 0) {
             return false;
+        }
         at += length;
     }
     return true;
@@ -86,10 +91,12 @@ std::u16string utf8ToUtf16(std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
         const std::size_t length = std::max<std::size_t>(sequenceLength(text, at), 1);
         char32_t c = static_cast<std::uint8_t>(text[at]);
-        if (length > 1)
+        if (length > 1) {
             c &= 0x7Fu >> length;
-        for (std::size_t i = 1; i < length; ++i)
+        }
+        for (std::size_t i = 1; i < length; ++i) {
             c = c << 6 | (static_cast<std::uint8_t>(text[at + i]) & 0x3F);
+        }
         at += length;
         if (c >= 0x10000) {
             result += static_cast<char16_t>(0xD800 + ((c - 0x10000) >> 10));
@@ -102,18 +109,22 @@ std::u16string utf8ToUtf16(std::string_view text) {
 
 std::string westernToUtf8(std::string_view text) {
     std::string result;
-    for (const char c : text)
+    for (const char c : text) {
         append(result, tvx::text::westernCodePoint(static_cast<std::uint8_t>(c)));
+    }
     return result;
 }
 
 std::string withoutByteOrderMark(std::string_view bytes) {
-    if (bytes.starts_with("\xFF\xFE"))
+    if (bytes.starts_with("\xFF\xFE")) {
         return utf16ToUtf8(bytes.substr(2), false);
-    if (bytes.starts_with("\xFE\xFF"))
+    }
+    if (bytes.starts_with("\xFE\xFF")) {
         return utf16ToUtf8(bytes.substr(2), true);
-    if (bytes.starts_with("\xEF\xBB\xBF"))
+    }
+    if (bytes.starts_with("\xEF\xBB\xBF")) {
         bytes.remove_prefix(3);
+    }
     return std::string(bytes);
 }
 

@@ -27,23 +27,26 @@ bool readOptions(const std::vector<std::string>& words, rc::Options& options) {
     std::vector<std::string> files;
     for (std::size_t i = 0; i < words.size(); ++i) {
         const auto found = switches.find(words[i]);
-        if (found == switches.end())
+        if (found == switches.end()) {
             files.push_back(words[i]);
-        else if (++i < words.size())
+        } else if (++i < words.size()) {
             found->second(words[i]);
-        else
+        } else {
             return false;
+        }
     }
-    if (files.size() != 2)
+    if (files.size() != 2) {
         return false;
+    }
     options.script = files[0];
     options.output = files[1];
     return true;
 }
 
 void print(const rc::Fault& fault) {
-    if (!fault.place.file.empty())
+    if (!fault.place.file.empty()) {
         std::cerr << fault.place.file << ":" << fault.place.line << ": error: ";
+    }
     std::cerr << fault.message << "\n";
 }
 

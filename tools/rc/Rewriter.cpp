@@ -27,8 +27,9 @@ public:
         word(0);
     }
     void alignToDoubleWord() {
-        if (m_words.size() % 2 != 0)
+        if (m_words.size() % 2 != 0) {
             word(0);
+        }
     }
     /// The bits `flags` are added to the word at `at`.
     void mark(std::size_t at, std::uint16_t flags) {
@@ -36,8 +37,9 @@ public:
     }
     [[nodiscard]] std::string statement(const std::string& name, int type) const {
         std::string result = name + " " + std::to_string(type) + "\nBEGIN\n";
-        for (std::size_t i = 0; i < m_words.size(); ++i)
+        for (std::size_t i = 0; i < m_words.size(); ++i) {
             result += (i > 0 ? (i % 8 == 0 ? ",\n" : ", ") : "") + std::to_string(m_words[i]);
+        }
         return result + "\nEND\n";
     }
 
@@ -52,8 +54,9 @@ constexpr int toolBarType = 241;
 
 std::string sourceText(const Script& script, const Statement& statement) {
     std::string text;
-    for (std::size_t line = statement.firstLine(); line <= statement.tokens.back().line; ++line)
+    for (std::size_t line = statement.firstLine(); line <= statement.tokens.back().line; ++line) {
         text += script.lines[line].text + "\n";
+    }
     return text;
 }
 
@@ -78,10 +81,12 @@ std::string rewriteToolBar(const Script& script, const Statement& statement) {
     }
     RawData data;
     constexpr std::uint16_t version = 1;
-    for (const std::uint16_t word : {version, width, height, static_cast<std::uint16_t>(commands.size())})
+    for (const std::uint16_t word : {version, width, height, static_cast<std::uint16_t>(commands.size())}) {
         data.word(word);
-    for (const std::uint16_t command : commands)
+    }
+    for (const std::uint16_t command : commands) {
         data.word(command);
+    }
     return data.statement(name, toolBarType);
 }
 
@@ -109,13 +114,16 @@ constexpr int lastEntryFlag = 0x80;
 // A number, a character, or the control character of one: "^A".
 std::uint16_t readKey(StatementReader& reader) {
     const Token* first = reader.peek();
-    if (first == nullptr || first->kind != Token::Kind::String)
+    if (!first || first->kind != Token::Kind::String) {
         return reader.word();
+    }
     const std::u16string text = reader.text();
-    if (text.size() == 1)
+    if (text.size() == 1) {
         return text[0];
-    if (text.size() == 2 && text[0] == u'^')
+    }
+    if (text.size() == 2 && text[0] == u'^') {
         return text[1] & 0x1F;
+    }
     reader.fail(*first, "one character");
 }
 
@@ -131,8 +139,9 @@ AcceleratorEntry readAccelerator(StatementReader& reader) {
     while (reader.accept(",") || std::ranges::any_of(options, isAhead)) {
         const auto* option = std::ranges::find_if(options, isAhead);
         const Token& word = reader.next("an option");
-        if (option == std::end(options))
+        if (option == std::end(options)) {
             reader.fail(word, "an option such as VIRTKEY or ALT");
+        }
         entry.flags = static_cast<std::uint16_t>(entry.flags | option->second);
     }
     return entry;
@@ -150,22 +159,27 @@ std::string rewriteAccelerators(const Script& script, const Statement& statement
     reader.expect("ACCELERATORS");
     reader.beginBlock();
     std::vector<AcceleratorEntry> entries;
-    while (!reader.blockEndAhead())
+    while (!reader.blockEndAhead()) {
         entries.push_back(readAccelerator(reader));
-    if (std::ranges::none_of(entries, isModifiedCharacter) || entries.empty())
+    }
+    if (std::ranges::none_of(entries, isModifiedCharacter) || entries.empty()) {
         return sourceText(script, statement);
+    }
     entries.back().flags |= lastEntryFlag;
     RawData data;
-    for (const AcceleratorEntry& entry : entries)
-        for (const std::uint16_t word : {entry.flags, entry.key, entry.command, std::uint16_t{0}})
+    for (const AcceleratorEntry& entry : entries) {
+        for (const std::uint16_t word : {entry.flags, entry.key, entry.command, std::uint16_t{0}}) {
             data.word(word);
+        }
+    }
     return data.statement(name, acceleratorType);
 }
 
 // One of the numbers behind a text of an extended menu, each of which may be left out.
 std::int64_t optionalNumber(StatementReader& reader) {
-    if (!reader.accept(",") || reader.ahead(","))
+    if (!reader.accept(",") || reader.ahead(",")) {
         return 0;
+    }
     return reader.number();
 }
 
@@ -176,8 +190,9 @@ void readMenuItems(StatementReader& reader, RawData& data) {
     std::size_t flagsAt = 0;
     while (!reader.blockEndAhead()) {
         const bool isPopup = reader.accept("POPUP");
-        if (!isPopup)
+        if (!isPopup) {
             reader.expect("MENUITEM");
+        }
         const std::u16string text = reader.text();
         const std::int64_t id = optionalNumber(reader);
         const std::int64_t type = optionalNumber(reader);
@@ -196,8 +211,9 @@ void readMenuItems(StatementReader& reader, RawData& data) {
             readMenuItems(reader, data);
         }
     }
-    if (flagsAt == 0)
+    if (flagsAt == 0) {
         reader.fail(reader.next("END"), "MENUITEM or POPUP");
+    }
     data.mark(flagsAt, lastFlag);
     reader.next("END");
 }
@@ -226,9 +242,11 @@ bool equalIgnoringCase(std::string_view left, std::string_view right) {
 
 std::filesystem::path childIgnoringCase(const std::filesystem::path& folder, const std::filesystem::path& name) {
     std::error_code error;
-    for (const auto& entry : std::filesystem::directory_iterator(folder, error))
-        if (equalIgnoringCase(entry.path().filename().string(), name.string()))
+    for (const auto& entry : std::filesystem::directory_iterator(folder, error)) {
+        if (equalIgnoringCase(entry.path().filename().string(), name.string())) {
             return entry.path();
+        }
+    }
     return {};
 }
 
@@ -236,16 +254,19 @@ std::filesystem::path childIgnoringCase(const std::filesystem::path& folder, con
 
 std::filesystem::path findFile(const std::filesystem::path& folder, std::string name) {
     // A name in a script separates folders by one backslash or, as in a C string, by two.
-    for (std::size_t at; (at = name.find("\\\\")) != std::string::npos;)
+    for (std::size_t at; (at = name.find("\\\\")) != std::string::npos;) {
         name.erase(at, 1);
+    }
     std::ranges::replace(name, '\\', '/');
-    if (std::filesystem::is_regular_file(folder / name))
+    if (std::filesystem::is_regular_file(folder / name)) {
         return folder / name;
+    }
     std::filesystem::path path = std::filesystem::path(name).is_absolute() ? "/" : folder;
     for (const auto& part : std::filesystem::path(name).relative_path()) {
         path = std::filesystem::exists(path / part) ? path / part : childIgnoringCase(path, part);
-        if (path.empty())
+        if (path.empty()) {
             return {};
+        }
     }
     return std::filesystem::is_regular_file(path) ? path : std::filesystem::path();
 }
@@ -258,27 +279,33 @@ std::string Rewriter::rewrite(const Script& script, const Statement& statement) 
                                                                          {"MENUEX", rewriteExtendedMenu}};
     const std::string type = statement.type();
     // What resource editors keep for themselves.
-    if (type == "DESIGNINFO" || type == "TEXTINCLUDE")
+    if (type == "DESIGNINFO" || type == "TEXTINCLUDE") {
         return {};
-    if (const auto found = rewrites.find(type); found != rewrites.end())
+    }
+    if (const auto found = rewrites.find(type); found != rewrites.end()) {
         return found->second(script, statement);
+    }
     const Token& last = statement.tokens.back();
-    if (type != "STRINGTABLE" && statement.tokens.size() > 2 && last.kind == Token::Kind::String)
+    if (type != "STRINGTABLE" && statement.tokens.size() > 2 && last.kind == Token::Kind::String) {
         return rewriteFile(script, statement);
+    }
     return sourceText(script, statement);
 }
 
 std::string Rewriter::rewriteFile(const Script& script, const Statement& statement) {
     const Token& last = statement.tokens.back();
     std::filesystem::path found;
-    for (auto folder = m_folders.begin(); folder != m_folders.end() && found.empty(); ++folder)
+    for (auto folder = m_folders.begin(); folder != m_folders.end() && found.empty(); ++folder) {
         found = findFile(*folder, withoutQuotes(last.text));
-    if (found.empty())
+    }
+    if (found.empty()) {
         throw Fault{script.placeOf(last), "file not found: " + withoutQuotes(last.text)};
+    }
     m_files.push_back(found);
     std::string text;
-    for (const Token& token : statement.tokens)
+    for (const Token& token : statement.tokens) {
         text += &token == &last ? "\"" + found.string() + "\"" : token.text + " ";
+    }
     return text + "\n";
 }
 

@@ -29,8 +29,9 @@ bool isHeader(const std::string& file) {
 std::string markedFile(std::string_view mark) {
     std::string result;
     for (std::size_t i = mark.find('"') + 1; i < mark.size() && mark[i] != '"'; ++i) {
-        if (mark[i] == '\\' && i + 1 < mark.size())
+        if (mark[i] == '\\' && i + 1 < mark.size()) {
             ++i;
+        }
         result += mark[i];
     }
     return result;
@@ -38,12 +39,14 @@ std::string markedFile(std::string_view mark) {
 
 // Reads `# 12 "file" flags`; answers whether the line was such a mark.
 bool readMark(std::string_view line, Place& place) {
-    if (!line.starts_with("# ") || line.find('"') == std::string_view::npos)
+    if (!line.starts_with("# ") || line.find('"') == std::string_view::npos) {
         return false;
+    }
     int number = 0;
     const auto [end, error] = std::from_chars(line.data() + 2, line.data() + line.size(), number);
-    if (error != std::errc())
+    if (error != std::errc()) {
         return false;
+    }
     place = {markedFile(line), number};
     return true;
 }
@@ -51,12 +54,16 @@ bool readMark(std::string_view line, Place& place) {
 // Old scripts are in the western code page. A file is in UTF-8 or in that page as a whole, so one line tells.
 void decodeByFile(std::vector<Line>& lines) {
     std::set<std::string> western;
-    for (const Line& line : lines)
-        if (!isUtf8(line.text))
+    for (const Line& line : lines) {
+        if (!isUtf8(line.text)) {
             western.insert(line.place.file);
-    for (Line& line : lines)
-        if (western.contains(line.place.file))
+        }
+    }
+    for (Line& line : lines) {
+        if (western.contains(line.place.file)) {
             line.text = westernToUtf8(line.text);
+        }
+    }
 }
 
 std::vector<Line> readLines(std::string_view text, std::vector<std::filesystem::path>& files) {
@@ -68,14 +75,17 @@ std::vector<Line> readLines(std::string_view text, std::vector<std::filesystem::
         std::string_view line = text.substr(0, end);
         text.remove_prefix(std::min(end + 1, text.size()));
         if (readMark(line, place)) {
-            if (!place.file.starts_with('<') && seen.insert(place.file).second)
+            if (!place.file.starts_with('<') && seen.insert(place.file).second) {
                 files.emplace_back(place.file);
+            }
             continue;
         }
-        if (line.ends_with('\r'))
+        if (line.ends_with('\r')) {
             line.remove_suffix(1);
-        if (!isHeader(place.file) && !line.starts_with('#'))
+        }
+        if (!isHeader(place.file) && !line.starts_with('#')) {
             lines.push_back({std::string(line), place});
+        }
         ++place.line;
     }
     decodeByFile(lines);
@@ -86,10 +96,11 @@ std::vector<Line> readLines(std::string_view text, std::vector<std::filesystem::
 std::size_t stringEnd(std::string_view text, std::size_t at) {
     for (++at; at < text.size(); ++at) {
         const bool isPair = at + 1 < text.size() && (text[at] == '\\' || (text[at] == '"' && text[at + 1] == '"'));
-        if (isPair)
+        if (isPair) {
             ++at;
-        else if (text[at] == '"')
+        } else if (text[at] == '"') {
             return at + 1;
+        }
     }
     return text.size();
 }
@@ -108,8 +119,9 @@ Token readToken(std::string_view text, std::size_t& at, std::size_t line) {
         at = stringEnd(text, at + (isWide ? 1 : 0));
     } else if (isWordCharacter(text[at])) {
         kind = std::isdigit(static_cast<unsigned char>(text[at])) ? Token::Kind::Number : Token::Kind::Word;
-        while (at < text.size() && isWordCharacter(text[at]))
+        while (at < text.size() && isWordCharacter(text[at])) {
             ++at;
+        }
     } else {
         ++at;
     }
@@ -119,10 +131,11 @@ Token readToken(std::string_view text, std::size_t& at, std::size_t line) {
 std::vector<Token> tokensOf(std::string_view text, std::size_t line) {
     std::vector<Token> tokens;
     for (std::size_t at = 0; at < text.size();) {
-        if (std::isspace(static_cast<unsigned char>(text[at])))
+        if (std::isspace(static_cast<unsigned char>(text[at]))) {
             ++at;
-        else
+        } else {
             tokens.push_back(readToken(text, at, line));
+        }
     }
     return tokens;
 }
@@ -133,15 +146,18 @@ public:
     explicit StatementCutter(std::vector<Statement>& statements) : m_statements(statements) {}
 
     void addLine(const std::vector<Token>& tokens) {
-        for (const Token& token : tokens)
+        for (const Token& token : tokens) {
             add(token);
-        if (m_depth == 0 && !m_current.tokens.empty() && endsWithLine())
+        }
+        if (m_depth == 0 && !m_current.tokens.empty() && endsWithLine()) {
             close();
+        }
     }
 
     void close() {
-        if (!m_current.tokens.empty())
+        if (!m_current.tokens.empty()) {
             m_statements.push_back(std::move(m_current));
+        }
         m_current = {};
         m_depth = 0;
     }
@@ -149,16 +165,19 @@ public:
 private:
     void add(const Token& token) {
         m_current.tokens.push_back(token);
-        if (token.opensBlock())
+        if (token.opensBlock()) {
             ++m_depth;
-        if (token.closesBlock() && --m_depth <= 0)
+        }
+        if (token.closesBlock() && --m_depth <= 0) {
             close();
+        }
     }
 
     [[nodiscard]] bool endsWithLine() const {
         const std::string type = m_current.type();
-        if (type == "LANGUAGE")
+        if (type == "LANGUAGE") {
             return true;
+        }
         return std::ranges::find(blockTypes, type) == blockTypes.end() && m_current.tokens.size() > 2 &&
                m_current.tokens.back().kind == Token::Kind::String;
     }
@@ -182,8 +201,9 @@ bool Token::is(std::string_view keyword) const {
 
 std::string Statement::type() const {
     const Token& first = tokens.front();
-    if (first.is("STRINGTABLE") || first.is("LANGUAGE") || tokens.size() < 2)
+    if (first.is("STRINGTABLE") || first.is("LANGUAGE") || tokens.size() < 2) {
         return upperCase(first.text);
+    }
     return upperCase(tokens[1].text);
 }
 
@@ -191,8 +211,9 @@ Script parseScript(std::string_view preprocessed) {
     Script script;
     script.lines = readLines(preprocessed, script.files);
     StatementCutter cutter(script.statements);
-    for (std::size_t i = 0; i < script.lines.size(); ++i)
+    for (std::size_t i = 0; i < script.lines.size(); ++i) {
         cutter.addLine(tokensOf(script.lines[i].text, i));
+    }
     cutter.close();
     return script;
 }

@@ -25,8 +25,9 @@ char16_t numberEscape(std::string_view text, std::size_t& at, std::size_t most, 
 // The unit of the escape whose letter stands at `at`, which moves behind it.
 char16_t escapedUnit(std::string_view text, std::size_t& at) {
     const char letter = text[at];
-    if (letter >= '0' && letter <= '7')
+    if (letter >= '0' && letter <= '7') {
         return numberEscape(text, at, 3, 8);
+    }
     ++at;
     switch (letter) {
     case 'a':
@@ -61,8 +62,9 @@ bool StatementReader::blockEndAhead() const {
 }
 
 const Token& StatementReader::next(std::string_view expected) {
-    if (!peek())
+    if (!peek()) {
         throw Fault{m_script.placeOf(m_tokens.back()), "expected " + std::string(expected) + " behind this line"};
+    }
     return m_tokens[m_at++];
 }
 
@@ -74,8 +76,9 @@ bool StatementReader::accept(std::string_view keyword) {
 
 const Token& StatementReader::expect(std::string_view keyword) {
     const Token& token = next(keyword);
-    if (!token.is(keyword))
+    if (!token.is(keyword)) {
         fail(token, keyword);
+    }
     return token;
 }
 
@@ -86,8 +89,9 @@ void StatementReader::skipMemoryFlags() {
 
 void StatementReader::beginBlock() {
     skipMemoryFlags();
-    if (const Token& token = next("BEGIN"); !token.opensBlock())
+    if (const Token& token = next("BEGIN"); !token.opensBlock()) {
         fail(token, "BEGIN");
+    }
 }
 
 std::int64_t StatementReader::number() {
@@ -112,10 +116,12 @@ std::int64_t StatementReader::sum() {
 
 std::int64_t StatementReader::operand() {
     const Token& token = next("a number");
-    if (token.is("-"))
+    if (token.is("-")) {
         return -operand();
-    if (token.is("~") || token.is("NOT"))
+    }
+    if (token.is("~") || token.is("NOT")) {
         return ~operand();
+    }
     if (token.is("(")) {
         const std::int64_t value = number();
         expect(")");
@@ -128,23 +134,26 @@ std::int64_t StatementReader::operand() {
     const auto [end, error] = std::from_chars(first, last, value, isHex ? 16 : 10);
     const std::string suffix = upperCase(std::string_view(end, last));
     if (token.kind != Token::Kind::Number || error != std::errc() ||
-        !(suffix.empty() || suffix == "L" || suffix == "UL"))
+        !(suffix.empty() || suffix == "L" || suffix == "UL")) {
         fail(token, "a number");
+    }
     return value;
 }
 
 std::uint16_t StatementReader::word() {
     const Token* first = peek();
     const std::int64_t value = number();
-    if (value < -0x8000 || value > 0xFFFF)
+    if (value < -0x8000 || value > 0xFFFF) {
         fail(*first, "a number of 16 bits");
+    }
     return static_cast<std::uint16_t>(value);
 }
 
 std::u16string StatementReader::text() {
     const Token& token = next("a text");
-    if (token.kind != Token::Kind::String)
+    if (token.kind != Token::Kind::String) {
         fail(token, "a text");
+    }
     return decodeString(token.text);
 }
 
@@ -154,8 +163,9 @@ void StatementReader::fail(const Token& token, std::string_view expected) const 
 
 std::u16string decodeString(std::string_view quoted) {
     quoted.remove_prefix(quoted.find('"') + 1);
-    if (quoted.ends_with('"'))
+    if (quoted.ends_with('"')) {
         quoted.remove_suffix(1);
+    }
     std::u16string result;
     for (std::size_t at = 0; at < quoted.size();) {
         const char c = quoted[at];

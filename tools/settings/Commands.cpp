@@ -57,15 +57,17 @@ public:
         : m_flags(flags), m_options(options) {
         bool isOver = false;
         for (auto word = words.begin(); word != words.end(); ++word) {
-            if (!isOver && *word == "--")
+            if (!isOver && *word == "--") {
                 isOver = true;
-            else if (!isOver && word->size() == 2 && word->front() == '-')
+            } else if (!isOver && word->size() == 2 && word->front() == '-') {
                 takeSwitch(word, words.end());
-            else
+            } else {
                 m_plain.push_back(std::move(*word));
+            }
         }
-        if (m_plain.size() < least || m_plain.size() > most)
+        if (m_plain.size() < least || m_plain.size() > most) {
             throw Misuse{m_plain.size() < least ? "something is missing" : "unexpected \"" + m_plain.back() + "\""};
+        }
     }
 
     [[nodiscard]] bool has(char flag) const {
@@ -89,8 +91,9 @@ private:
         if (m_flags.find(letter) != std::string_view::npos) {
             m_given += letter;
         } else if (m_options.find(letter) != std::string_view::npos) {
-            if (std::next(word) == end)
+            if (std::next(word) == end) {
                 throw Misuse{*word + " needs a word behind it"};
+            }
             m_option = *++word;
         } else {
             throw Misuse{"unknown option " + *word};
@@ -106,8 +109,9 @@ private:
 
 KeyName keyOf(const std::string& text) {
     KeyName key;
-    if (!readKeyName(text, key))
+    if (!readKeyName(text, key)) {
         key.path = text;
+    }
     return key;
 }
 
@@ -118,17 +122,19 @@ std::string nameOf(const std::string& word) {
 // --- values as a person reads and types them ---
 
 std::string shown(const Setting& setting) {
-    if (setting.type == REG_SZ || setting.type == REG_EXPAND_SZ)
+    if (setting.type == REG_SZ || setting.type == REG_EXPAND_SZ) {
         return setting.data.substr(0, setting.data.find('\0'));
+    }
     if (setting.type == REG_DWORD && setting.data.size() == sizeof(DWORD)) {
         DWORD number = 0;
         std::memcpy(&number, setting.data.data(), sizeof number);
         return std::to_string(number);
     }
     std::string bytes;
-    for (const char c : setting.data)
+    for (const char c : setting.data) {
         bytes +=
             tvx::text::format(bytes.empty() ? "%02x" : " %02x", static_cast<unsigned>(static_cast<unsigned char>(c)));
+    }
     return bytes;
 }
 
@@ -138,8 +144,9 @@ std::string numberBytes(const std::string& text) {
     const char* const first = text.data() + (isHex ? 2 : 0);
     const char* const last = text.data() + text.size();
     const auto [end, error] = std::from_chars(first, last, number, isHex ? 16 : 10);
-    if (error != std::errc() || end != last)
+    if (error != std::errc() || end != last) {
         throw Misuse{"\"" + text + "\" is no number from 0 to 4294967295"};
+    }
     return {reinterpret_cast<const char*>(&number), sizeof number};
 }
 
@@ -151,20 +158,24 @@ std::string hexBytes(const std::string& text) {
         unsigned byte = 0;
         const char* const first = digits.data() + i;
         const auto [end, error] = std::from_chars(first, first + std::min<std::size_t>(2, digits.size() - i), byte, 16);
-        if (error != std::errc() || end != first + 2)
+        if (error != std::errc() || end != first + 2) {
             throw Misuse{"bytes are pairs of hexadecimal digits, such as \"00 ff 7a\""};
+        }
         bytes += static_cast<char>(byte);
     }
     return bytes;
 }
 
 Setting typed(const std::string& type, const std::string& name, const std::string& value) {
-    if (type == "text")
+    if (type == "text") {
         return {name, REG_SZ, value + '\0'};
-    if (type == "number")
+    }
+    if (type == "number") {
         return {name, REG_DWORD, numberBytes(value)};
-    if (type == "bytes")
+    }
+    if (type == "bytes") {
         return {name, REG_BINARY, hexBytes(value)};
+    }
     throw Misuse{"unknown type \"" + type + "\"; there are text, number and bytes"};
 }
 
@@ -178,10 +189,12 @@ void list(std::vector<std::string> given, Streams& streams) {
         return;
     }
     const Key key(name, Key::Way::read);
-    for (const std::string& subKey : key.subKeys())
+    for (const std::string& subKey : key.subKeys()) {
         streams.out << writeKey(below(name, subKey));
-    for (const Setting& setting : key.settings())
+    }
+    for (const Setting& setting : key.settings()) {
         streams.out << writeSetting(setting);
+    }
 }
 
 void get(std::vector<std::string> given, Streams& streams) {
@@ -197,8 +210,9 @@ void set(std::vector<std::string> given, Streams&) {
 
 void remove(std::vector<std::string> given, Streams&) {
     const Words words(std::move(given), 1, 2, "r", "");
-    if (words.has('r') != (words.size() == 1))
+    if (words.has('r') != (words.size() == 1)) {
         throw Misuse{words.has('r') ? "-r deletes a whole key and takes no value" : "name a value, or use -r"};
+    }
     const KeyName key = keyOf(words[0]);
     if (words.has('r')) {
         Key(key, Key::Way::write); // tells when there is none
@@ -219,19 +233,23 @@ void exportText(std::vector<std::string> given, Streams& streams) {
     std::ofstream stream(file, std::ios::binary);
     stream << text;
     stream.close();
-    if (!stream)
+    if (!stream) {
         throw FileFault{file + ": " + std::strerror(errno)};
+    }
 }
 
 std::string readFile(const std::string& file, std::istream& in) {
-    if (file == "-")
+    if (file == "-") {
         return {std::istreambuf_iterator<char>(in), {}};
+    }
     std::ifstream stream(file, std::ios::binary);
     std::string text;
-    if (stream)
+    if (stream) {
         text.assign(std::istreambuf_iterator<char>(stream), {});
-    if (!stream || stream.bad())
+    }
+    if (!stream || stream.bad()) {
         throw FileFault{file + ": " + std::strerror(errno)};
+    }
     return text;
 }
 
@@ -263,21 +281,24 @@ constexpr std::array<Command, 6> commands{{
 }};
 
 void dispatch(const std::vector<std::string>& words, Streams& streams) {
-    if (words.empty())
+    if (words.empty()) {
         throw Misuse{"name a command"};
+    }
     const auto* command = std::ranges::find(commands, words.front(), &Command::name);
-    if (command == commands.end())
+    if (command == commands.end()) {
         throw Misuse{"unknown command \"" + words.front() + "\""};
+    }
     command->run({words.begin() + 1, words.end()}, streams);
 }
 
 bool answers(const std::vector<std::string>& words, std::ostream& out) {
-    if (std::ranges::find(words, "--help") != words.end())
+    if (std::ranges::find(words, "--help") != words.end()) {
         out << usage;
-    else if (words.size() == 1 && words.front() == "--version")
+    } else if (words.size() == 1 && words.front() == "--version") {
         out << "tvxsettings " TVX_VERSION "\n";
-    else
+    } else {
         return false;
+    }
     return true;
 }
 
@@ -286,8 +307,9 @@ bool answers(const std::vector<std::string>& words, std::ostream& out) {
 Outcome run(const std::vector<std::string>& words, std::istream& in, std::ostream& out, std::ostream& errors) {
     Streams streams{in, out};
     try {
-        if (!answers(words, out))
+        if (!answers(words, out)) {
             dispatch(words, streams);
+        }
         return Outcome::done;
     } catch (const Misuse& misuse) {
         errors << "tvxsettings: " << misuse.message << ". See tvxsettings --help.\n";

@@ -26,8 +26,9 @@ constexpr std::array<Root, 3> roots{{
 
 std::string fromWestern(std::string_view text) {
     std::string result;
-    for (const char c : text)
+    for (const char c : text) {
         tvx::text::append(result, tvx::text::westernCodePoint(static_cast<unsigned char>(c)));
+    }
     return result;
 }
 
@@ -37,22 +38,26 @@ public:
     explicit Reader(std::string_view text) : m_rest(text) {}
 
     std::vector<Change> read() {
-        if (!nextLine() || trimmed(m_line) != "REGEDIT4")
+        if (!nextLine() || trimmed(m_line) != "REGEDIT4") {
             fail("the first line must be REGEDIT4");
-        while (nextLine())
+        }
+        while (nextLine()) {
             readLine();
+        }
         return std::move(m_changes);
     }
 
 private:
     bool nextLine() {
-        if (m_rest.empty())
+        if (m_rest.empty()) {
             return false;
+        }
         const std::size_t end = std::min(m_rest.find('\n'), m_rest.size());
         m_line = m_rest.substr(0, end);
         m_rest.remove_prefix(std::min(end + 1, m_rest.size()));
-        if (m_line.ends_with('\r'))
+        if (m_line.ends_with('\r')) {
             m_line.remove_suffix(1);
+        }
         ++m_number;
         return true;
     }
@@ -60,46 +65,55 @@ private:
     void readLine() {
         m_line = trimmed(m_line);
         m_first = m_number;
-        if (m_line.empty() || m_line.starts_with(';'))
+        if (m_line.empty() || m_line.starts_with(';')) {
             return;
-        if (m_line.starts_with('['))
+        }
+        if (m_line.starts_with('[')) {
             readKey();
-        else
+        } else {
             readValue();
+        }
     }
 
     void readKey() {
-        if (!m_line.ends_with(']'))
+        if (!m_line.ends_with(']')) {
             fail("the ] of the key is missing");
+        }
         std::string_view name = m_line.substr(1, m_line.size() - 2);
         const bool isDeleted = name.starts_with('-');
         name.remove_prefix(isDeleted ? 1 : 0);
         KeyName key;
-        if (!readKeyName(name, key))
+        if (!readKeyName(name, key)) {
             fail("the key does not begin with a root such as HKEY_CURRENT_USER");
-        if (isDeleted && key.path.empty())
+        }
+        if (isDeleted && key.path.empty()) {
             fail("a root cannot be deleted");
+        }
         m_changes.push_back({isDeleted ? Change::Kind::deleteKey : Change::Kind::makeKey, m_first, key, {}});
         m_key = isDeleted ? std::nullopt : std::optional(key);
     }
 
     void readValue() {
-        if (!m_key)
+        if (!m_key) {
             fail(m_changes.empty() ? "a value stands before the first key" : "a value stands below a deleted key");
+        }
         Setting setting;
-        if (m_line.starts_with('@'))
+        if (m_line.starts_with('@')) {
             m_line.remove_prefix(1);
-        else if (m_line.starts_with('"'))
+        } else if (m_line.starts_with('"')) {
             setting.name = readQuoted();
-        else
+        } else {
             fail("expected a key in brackets, a name in quotes or @");
+        }
         m_line = trimmed(m_line);
-        if (!m_line.starts_with('='))
+        if (!m_line.starts_with('=')) {
             fail("expected = behind the name");
+        }
         m_line = trimmed(m_line.substr(1));
         const bool isDeleted = m_line == "-";
-        if (!isDeleted)
+        if (!isDeleted) {
             readData(setting);
+        }
         m_changes.push_back(
             {isDeleted ? Change::Kind::deleteValue : Change::Kind::setValue, m_first, *m_key, std::move(setting)});
     }
@@ -112,15 +126,17 @@ private:
             setting.type = REG_DWORD;
             const DWORD number = readHex(8, "expected up to eight hexadecimal digits behind dword:");
             expectEnd();
-            for (unsigned shift = 0; shift < 32; shift += 8)
+            for (unsigned shift = 0; shift < 32; shift += 8) {
                 setting.data += static_cast<char>(number >> shift & 0xFF);
+            }
         } else if (accept("hex:")) {
             setting.type = REG_BINARY;
             setting.data = readBytes();
         } else if (accept("hex(")) {
             setting.type = readHex(8, "expected a type in hexadecimal digits behind hex(");
-            if (!accept("):"))
+            if (!accept("):")) {
                 fail("expected ): behind the type");
+            }
             setting.data = readBytes();
         } else {
             fail("expected a text in quotes, dword:, hex: or -");
@@ -133,16 +149,18 @@ private:
         std::string result;
         m_line.remove_prefix(1);
         while (!m_line.starts_with('"')) {
-            if (m_line.empty())
+            if (m_line.empty()) {
                 fail("a quote is not closed");
+            }
             const char c = m_line.front();
             m_line.remove_prefix(1);
-            if (c != '\\')
+            if (c != '\\') {
                 result += c;
-            else if (!m_line.empty())
+            } else if (!m_line.empty()) {
                 result += readEscape();
-            else if (!nextLine())
+            } else if (!nextLine()) {
                 fail("the text goes on behind the end of the file");
+            }
         }
         m_line.remove_prefix(1);
         return result;
@@ -173,8 +191,9 @@ private:
         for (skipBreaks(); !m_line.empty(); skipBreaks()) {
             bytes += static_cast<char>(readHex(2, "expected bytes of two hexadecimal digits"));
             skipBreaks();
-            if (!m_line.empty() && !accept(","))
+            if (!m_line.empty() && !accept(",")) {
                 fail("expected a comma between the bytes");
+            }
         }
         return bytes;
     }
@@ -183,8 +202,9 @@ private:
     void skipBreaks() {
         m_line = trimmed(m_line);
         while (m_line == "\\") {
-            if (!nextLine())
+            if (!nextLine()) {
                 fail("the bytes go on behind the end of the file");
+            }
             m_line = trimmed(m_line);
         }
     }
@@ -193,8 +213,9 @@ private:
         DWORD number = 0;
         const char* const end = m_line.data() + std::min(most, m_line.size());
         const auto [last, error] = std::from_chars(m_line.data(), end, number, 16);
-        if (error != std::errc())
+        if (error != std::errc()) {
             fail(expected);
+        }
         m_line.remove_prefix(static_cast<std::size_t>(last - m_line.data()));
         return number;
     }
@@ -206,8 +227,9 @@ private:
     }
 
     void expectEnd() {
-        if (!trimmed(m_line).empty())
+        if (!trimmed(m_line).empty()) {
             fail("nothing may follow the value");
+        }
     }
 
     static std::string_view trimmed(std::string_view text) {
@@ -235,8 +257,9 @@ bool readKeyName(std::string_view text, KeyName& key) {
     const auto* root = std::ranges::find_if(roots, [&](const Root& candidate) {
         return tvx::text::equalNoCase(name, candidate.longName) || tvx::text::equalNoCase(name, candidate.shortName);
     });
-    if (root == roots.end())
+    if (root == roots.end()) {
         return false;
+    }
     key.root = reinterpret_cast<HKEY>(root->number);
     key.path = text.substr(std::min(name.size() + 1, text.size()));
     return true;
@@ -250,12 +273,15 @@ std::string writeKeyName(const KeyName& key) {
 
 std::vector<Change> readExchangeText(std::string_view text) {
     constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
-    if (text.starts_with(byteOrderMark))
+    if (text.starts_with(byteOrderMark)) {
         text.remove_prefix(byteOrderMark.size());
-    if (text.find('\0') != std::string_view::npos)
+    }
+    if (text.find('\0') != std::string_view::npos) {
         throw TextFault{1, "this is no text in UTF-8: it holds zero bytes"};
-    if (tvx::text::isWellFormed(text))
+    }
+    if (tvx::text::isWellFormed(text)) {
         return Reader(text).read();
+    }
     return Reader(fromWestern(text)).read();
 }
 

@@ -25,10 +25,11 @@ std::string quoted(std::string_view text) {
     for (std::size_t at = 0, length = 0; at < text.size(); at += length) {
         length = tvx::text::characterLength(text, at);
         const std::string_view character = text.substr(at, length);
-        if (isControl(character[0]) || !tvx::text::isWellFormed(character))
+        if (isControl(character[0]) || !tvx::text::isWellFormed(character)) {
             result += "\\x" + hexByte(character[0]);
-        else
+        } else {
             result.append(character == "\\" || character == "\"" ? "\\" : "").append(character);
+        }
     }
     return result + '"';
 }
@@ -48,16 +49,18 @@ std::string hexBytes(std::string line, std::string_view bytes) {
 
 /// Whether a text can stand between quotes: one line of characters, and a zero at its end only.
 bool isPlainText(const Setting& setting) {
-    if (setting.type != REG_SZ || setting.data.empty() || setting.data.back() != '\0')
+    if (setting.type != REG_SZ || setting.data.empty() || setting.data.back() != '\0') {
         return false;
+    }
     const std::string_view text(setting.data.data(), setting.data.size() - 1);
     return std::ranges::none_of(text, isControl) && tvx::text::isWellFormed(text);
 }
 
 std::string number(const std::string& data) {
     std::string digits;
-    for (std::size_t i = data.size(); i > 0; --i)
+    for (std::size_t i = data.size(); i > 0; --i) {
         digits += hexByte(data[i - 1]);
+    }
     return digits;
 }
 
@@ -81,10 +84,12 @@ std::string writeKey(const KeyName& key) {
 
 std::string writeSetting(const Setting& setting) {
     const std::string name = (setting.name.empty() ? "@" : quoted(setting.name)) + "=";
-    if (isPlainText(setting))
+    if (isPlainText(setting)) {
         return name + quoted(std::string_view(setting.data.data(), setting.data.size() - 1)) + "\n";
-    if (setting.type == REG_DWORD && setting.data.size() == sizeof(DWORD))
+    }
+    if (setting.type == REG_DWORD && setting.data.size() == sizeof(DWORD)) {
         return name + "dword:" + number(setting.data) + "\n";
+    }
     return hexBytes(name + typed(setting.type), setting.data) + "\n";
 }
 

@@ -9,9 +9,10 @@ std::string reason(LSTATUS result) {
 }
 
 LSTATUS openKey(const KeyName& name, Key::Way way, HKEY& key) {
-    if (way == Key::Way::create)
+    if (way == Key::Way::create) {
         return RegCreateKeyExA(name.root, name.path.c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE,
                                nullptr, &key, nullptr);
+    }
     const REGSAM access = way == Key::Way::read ? KEY_READ : KEY_READ | KEY_WRITE;
     return RegOpenKeyExA(name.root, name.path.c_str(), 0, access, &key);
 }
@@ -46,8 +47,9 @@ Failure::Failure(LSTATUS result, const std::string& subject)
 
 Key::Key(const KeyName& name, Way way) : m_name(name) {
     const LSTATUS result = openKey(name, way, m_key);
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw failure(result, {});
+    }
 }
 
 Key::~Key() {
@@ -64,10 +66,12 @@ std::vector<std::string> Key::subKeys() const {
         auto size = static_cast<DWORD>(name.size());
         const LSTATUS result = RegEnumKeyExA(m_key, static_cast<DWORD>(names.size()), name.data(), &size, nullptr,
                                              nullptr, nullptr, nullptr);
-        if (result == ERROR_NO_MORE_ITEMS)
+        if (result == ERROR_NO_MORE_ITEMS) {
             return names;
-        if (result != ERROR_SUCCESS)
+        }
+        if (result != ERROR_SUCCESS) {
             throw failure(result, {});
+        }
         names.push_back(name.substr(0, size));
     }
 }
@@ -78,10 +82,12 @@ std::vector<Setting> Key::settings() const {
         auto size = static_cast<DWORD>(name.size());
         const LSTATUS result = RegEnumValueA(m_key, static_cast<DWORD>(found.size()), name.data(), &size, nullptr,
                                              nullptr, nullptr, nullptr);
-        if (result == ERROR_NO_MORE_ITEMS)
+        if (result == ERROR_NO_MORE_ITEMS) {
             return found;
-        if (result != ERROR_SUCCESS)
+        }
+        if (result != ERROR_SUCCESS) {
             throw failure(result, {});
+        }
         found.push_back(setting(name.substr(0, size)));
     }
 }
@@ -93,11 +99,13 @@ Setting Key::setting(const std::string& name) const {
         auto size = static_cast<DWORD>(found.data.size());
         result = RegQueryValueExA(m_key, name.c_str(), nullptr, &found.type, reinterpret_cast<BYTE*>(found.data.data()),
                                   &size);
-        if (result == ERROR_SUCCESS || result == ERROR_MORE_DATA)
+        if (result == ERROR_SUCCESS || result == ERROR_MORE_DATA) {
             found.data.resize(size);
+        }
     }
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw failure(result, name.empty() ? "@" : "\"" + name + "\"");
+    }
     return found;
 }
 
@@ -105,14 +113,16 @@ void Key::set(const Setting& setting) const {
     const LSTATUS result =
         RegSetValueExA(m_key, setting.name.c_str(), 0, setting.type, reinterpret_cast<const BYTE*>(setting.data.data()),
                        static_cast<DWORD>(setting.data.size()));
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw failure(result, "\"" + setting.name + "\"");
+    }
 }
 
 void Key::remove(const std::string& name) const {
     const LSTATUS result = RegDeleteValueA(m_key, name.c_str());
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw failure(result, "\"" + name + "\"");
+    }
 }
 
 KeyName below(const KeyName& key, const std::string& name) {
@@ -120,16 +130,19 @@ KeyName below(const KeyName& key, const std::string& name) {
 }
 
 void removeTree(const KeyName& key) {
-    for (const std::string& name : Key(key, Key::Way::write).subKeys())
+    for (const std::string& name : Key(key, Key::Way::write).subKeys()) {
         removeTree(below(key, name));
+    }
     const LSTATUS result = RegDeleteKeyA(key.root, key.path.c_str());
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw Failure(result, writeKeyName(key));
+    }
 }
 
 std::string writeTree(const KeyName& name) {
-    if (!canWriteKey(name))
+    if (!canWriteKey(name)) {
         throw Failure(ERROR_INVALID_NAME, writeKeyName(name));
+    }
     const Key key(name, Key::Way::read);
     const std::vector<std::string> subKeys = key.subKeys();
     const std::vector<Setting> settings = key.settings();
@@ -137,32 +150,37 @@ std::string writeTree(const KeyName& name) {
     // A key that only holds others is made with them.
     if (!settings.empty() || subKeys.empty()) {
         text = writeKey(name);
-        for (const Setting& setting : settings)
+        for (const Setting& setting : settings) {
             text += writeSetting(setting);
+        }
         text += "\n";
     }
-    for (const std::string& subKey : subKeys)
+    for (const std::string& subKey : subKeys) {
         text += writeTree(below(name, subKey));
+    }
     return text;
 }
 
 void apply(const std::vector<Change>& changes, const std::string& place) {
     tvx::RegistryTransaction transaction;
     LSTATUS result = transaction.begin();
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw Failure(result, place);
+    }
     for (const Change& change : changes) {
         try {
             applyOne(change);
         } catch (const Failure& failure) {
-            if (!isAlreadyDone(change, failure))
+            if (!isAlreadyDone(change, failure)) {
                 throw Failure(failure.result(),
                               place + ":" + std::to_string(change.line) + ": " + writeKeyName(change.key));
+            }
         }
     }
     result = transaction.commit();
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         throw Failure(result, place);
+    }
 }
 
 } // namespace settings

@@ -15,7 +15,7 @@ namespace tvx::afx {
 namespace {
 
 bool isFrameShown(const QWidget& bar) {
-    return bar.parentWidget() != nullptr && bar.parentWidget()->window()->isVisible();
+    return bar.parentWidget() && bar.parentWidget()->window()->isVisible();
 }
 
 std::unique_ptr<Window> makeBar(const CREATESTRUCT& cs) {
@@ -80,14 +80,14 @@ QWidget* StatusBarWindow::makeWidget(QWidget* parent) {
 }
 
 void BarWindow::setWindowRect(const QRect& rect) {
-    const bool placed = qobject_cast<QMainWindow*>(widget()->parentWidget()) != nullptr && !widget()->isWindow();
+    const bool placed = qobject_cast<QMainWindow*>(widget()->parentWidget()) && !widget()->isWindow();
     if (!placed) {
         Window::setWindowRect(rect);
     }
 }
 
 void BarWindow::show(int command) {
-    if (command != SW_HIDE && widget() != nullptr && widget()->isWindow() && !isFrameShown(*widget())) {
+    if (command != SW_HIDE && widget() && widget()->isWindow() && !isFrameShown(*widget())) {
         setStyle(style() | WS_VISIBLE, exStyle());
         return;
     }
@@ -143,7 +143,7 @@ void floatToolBar(QToolBar& bar, QPoint at) {
 
 QPoint placeOfFloating(const QToolBar& bar) {
     const auto* tools = dynamic_cast<const Tools*>(&bar);
-    return tools != nullptr ? tools->place() : bar.pos();
+    return tools ? tools->place() : bar.pos();
 }
 
 void showFloating(QToolBar& bar) {

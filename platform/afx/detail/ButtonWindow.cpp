@@ -123,13 +123,13 @@ void ButtonWindow::applyType() {
         push->setAutoDefault(false);
         push->setFlat((style() & BS_FLAT) != 0);
         showAsDefault(type() == BS_DEFPUSHBUTTON);
-    } else if (button() != nullptr && (style() & BS_LEFTTEXT) != 0) {
+    } else if (button() && (style() & BS_LEFTTEXT) != 0) {
         button()->setLayoutDirection(Qt::RightToLeft);
     }
 }
 
 void ButtonWindow::applyText() {
-    if (button() == nullptr) {
+    if (!button()) {
         widget()->setAccessibleName(text());
         widget()->update();
         return;
@@ -149,7 +149,7 @@ void ButtonWindow::applyText() {
 
 void ButtonWindow::setText(const QString& text) {
     Control::setText(text);
-    if (widget() != nullptr) {
+    if (widget()) {
         applyText();
     }
 }
@@ -192,7 +192,7 @@ void ButtonWindow::applyCheck() {
         if (auto* box = dynamic_cast<QCheckBox*>(widget())) {
             const Qt::CheckState states[] = {Qt::Unchecked, Qt::Checked, Qt::PartiallyChecked};
             box->setCheckState(states[m_check]);
-        } else if (button() != nullptr && button()->isCheckable()) {
+        } else if (button() && button()->isCheckable()) {
             button()->setChecked(m_check != 0);
         }
     });
@@ -201,7 +201,7 @@ void ButtonWindow::applyCheck() {
 void ButtonWindow::checkInGroup() {
     for (Window* sibling : dialogGroup(*this)) {
         auto* other = dynamic_cast<ButtonWindow*>(sibling);
-        if (other != nullptr && other != this && other->type() == BS_AUTORADIOBUTTON) {
+        if (other && other != this && other->type() == BS_AUTORADIOBUTTON) {
             other->setCheck(BST_UNCHECKED);
         }
     }
@@ -227,7 +227,7 @@ void ButtonWindow::click() {
 
 LRESULT ButtonWindow::state() const {
     LRESULT state = m_check;
-    if (button() != nullptr && button()->isDown()) {
+    if (button() && button()->isDown()) {
         state |= BST_PUSHED;
     }
     return widget()->hasFocus() ? state | BST_FOCUS : state;
@@ -237,7 +237,7 @@ LRESULT ButtonWindow::setPicture(UINT kind, HANDLE picture) {
     const HANDLE old = std::exchange(m_picture, picture);
     const QImage image =
         kind == IMAGE_ICON ? iconImage(static_cast<HICON>(picture)) : bitmapImage(static_cast<HBITMAP>(picture));
-    if (button() != nullptr) {
+    if (button()) {
         button()->setIcon(image.isNull() ? QIcon() : QIcon(QPixmap::fromImage(image)));
         button()->setIconSize(image.isNull() ? QSize(16, 16) : image.size());
     }
@@ -283,7 +283,7 @@ LRESULT ButtonWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case BM_GETSTATE:
         return state();
     case BM_SETSTATE:
-        if (button() != nullptr) {
+        if (button()) {
             button()->setDown(wParam != 0);
         }
         return 0;
@@ -319,7 +319,7 @@ bool ButtonWindow::paintByOwner(QPainter& painter) {
     item.itemState = (button()->isDown() ? ODS_SELECTED : 0U) | (widget()->hasFocus() ? ODS_FOCUS : 0U) |
                      (isEnabled() ? 0U : ODS_DISABLED) | (m_shownAsDefault ? ODS_DEFAULT : 0U);
     drawing.draw(item);
-    if (from(self) != nullptr) {
+    if (from(self)) {
         painter.drawImage(0, 0, drawing.image());
     }
     return true;

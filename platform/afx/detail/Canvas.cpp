@@ -22,8 +22,9 @@ void fillRow(Pixel* pixels, int count, Pixel color, Rop2 rop) {
 void fillPatternRow(Pixel* row, const Span& span, const Ink& ink) {
     Pixel color = 0;
     for (int x = span.left; x < span.right; ++x) {
-        if (ink.at(x, span.y, color))
+        if (ink.at(x, span.y, color)) {
             row[x] = combine(ink.rop, color, row[x]);
+        }
     }
 }
 
@@ -35,8 +36,9 @@ Span cut(const Span& span, const QRect& area) {
 
 bool Ink::at(int x, int y, Pixel& pixel) const {
     pixel = color;
-    if (!pattern)
+    if (!pattern) {
         return true;
+    }
     const int column = wrapped(std::int64_t{x} - patternOrigin.x(), pattern->width());
     const int line = wrapped(std::int64_t{y} - patternOrigin.y(), pattern->height());
     pixel = reinterpret_cast<const Pixel*>(pattern->constScanLine(line))[column];
@@ -45,30 +47,34 @@ bool Ink::at(int x, int y, Pixel& pixel) const {
 
 void Canvas::fillClipped(const QRect& area, const Ink& ink) {
     for (int y = area.top(); y <= area.bottom(); ++y) {
-        if (ink.pattern)
+        if (ink.pattern) {
             fillPatternRow(row(y), {y, area.left(), area.right() + 1}, ink);
-        else
+        } else {
             fillRow(row(y) + area.left(), area.width(), ink.color, ink.rop);
+        }
     }
     touched_ |= area;
 }
 
 void Canvas::fill(const QRect& area, const Ink& ink) {
     for (const QRect& visible : clip) {
-        if (const QRect part = visible & area; !part.isEmpty())
+        if (const QRect part = visible & area; !part.isEmpty()) {
             fillClipped(part, ink);
+        }
     }
 }
 
 void Canvas::fill(const Spans& spans, const Ink& ink) {
-    if (spans.empty())
+    if (spans.empty()) {
         return;
+    }
     for (const QRect& visible : clip) {
         const auto top = std::ranges::lower_bound(spans, visible.top(), {}, &Span::y);
         for (auto span = top; span != spans.end() && span->y <= visible.bottom(); ++span) {
             const Span part = cut(*span, visible);
-            if (part.left < part.right)
+            if (part.left < part.right) {
                 fillClipped(QRect(part.left, part.y, part.right - part.left, 1), ink);
+            }
         }
     }
 }
@@ -78,19 +84,23 @@ void Canvas::plot(QPoint point, const Ink& ink) {
 }
 
 void Canvas::plot(std::span<const QPoint> points, const Ink& ink) {
-    if (points.empty())
+    if (points.empty()) {
         return;
+    }
     QRect around(points.front(), points.front());
-    for (const QPoint& point : points)
+    for (const QPoint& point : points) {
         around |= QRect(point, point);
+    }
     const PenOperation operation(ink.rop, ink.color);
     for (const QRect& visible : clip) {
-        if (!visible.intersects(around))
+        if (!visible.intersects(around)) {
             continue;
+        }
         const bool whole = visible.contains(around);
         for (const QPoint& point : points) {
-            if (whole || visible.contains(point))
+            if (whole || visible.contains(point)) {
                 plotVisible(point, ink, operation);
+            }
         }
         touched_ |= visible & around;
     }
@@ -99,10 +109,11 @@ void Canvas::plot(std::span<const QPoint> points, const Ink& ink) {
 void Canvas::plotVisible(QPoint point, const Ink& ink, const PenOperation& operation) {
     Pixel& pixel = row(point.y())[point.x()];
     Pixel color = 0;
-    if (!ink.pattern)
+    if (!ink.pattern) {
         pixel = operation(pixel);
-    else if (ink.at(point.x(), point.y(), color))
+    } else if (ink.at(point.x(), point.y(), color)) {
         pixel = combine(ink.rop, color, pixel);
+    }
 }
 
 namespace {
@@ -119,8 +130,9 @@ void blitRow(Pixel* to, const Pixel* from, const Span& span, Rop3 rop, const Ink
     }
     Pixel pattern = 0;
     for (int x = span.left; x < span.right; ++x) {
-        if (!brush.at(x, span.y, pattern))
+        if (!brush.at(x, span.y, pattern)) {
             pattern = to[x];
+        }
         to[x] = combine(rop, pattern, from[x], to[x]);
     }
 }

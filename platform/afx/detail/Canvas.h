@@ -26,8 +26,9 @@ enum class PixelFormat { color, monochrome };
 
 /// The colour nearest to `pixel` in a format: black or white by brightness in a monochrome one.
 constexpr Pixel nearest(Pixel pixel, PixelFormat format) {
-    if (format == PixelFormat::color)
+    if (format == PixelFormat::color) {
         return pixel | kOpaque;
+    }
     const unsigned brightness = ((pixel >> 16) & 0xFF) * 299 + ((pixel >> 8) & 0xFF) * 587 + (pixel & 0xFF) * 114;
     return brightness >= 128 * 1000 ? kWhitePixel : kBlackPixel;
 }

@@ -16,7 +16,7 @@ HWND focusTold = nullptr;
 
 HWND focusNow() {
     const Window* window = Window::of(QApplication::focusWidget());
-    return window != nullptr ? window->handle() : nullptr;
+    return window ? window->handle() : nullptr;
 }
 
 } // namespace
@@ -65,9 +65,9 @@ HWND GetCapture() {
 
 HWND SetCapture(HWND window) {
     const HWND previous = capturing;
-    if (Window::from(window) != nullptr) {
+    if (Window::from(window)) {
         capturing = window;
-        if (previous != nullptr && previous != window) {
+        if (previous && previous != window) {
             SendMessageA(previous, WM_CAPTURECHANGED, 0, reinterpret_cast<LPARAM>(window));
         }
     }
@@ -82,15 +82,15 @@ BOOL ReleaseCapture() {
 }
 
 HWND GetFocus() {
-    return QCoreApplication::instance() != nullptr ? focusNow() : nullptr;
+    return QCoreApplication::instance() ? focusNow() : nullptr;
 }
 
 HWND SetFocus(HWND handle) {
     const HWND previous = GetFocus();
     Window* window = Window::from(handle);
-    if (window != nullptr && window->widget() != nullptr) {
+    if (window && window->widget()) {
         guarded([window] { window->focusWidget()->setFocus(Qt::OtherFocusReason); });
-    } else if (handle == nullptr && QCoreApplication::instance() != nullptr) {
+    } else if (!handle && QCoreApplication::instance()) {
         if (QWidget* focused = QApplication::focusWidget()) {
             guarded([focused] { focused->clearFocus(); });
         }

@@ -146,7 +146,7 @@ ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
     : Control(cs), m_model(std::make_unique<ComboModel>(*this)), m_openHeight(cs.cy) {}
 
 ComboBoxWindow::~ComboBoxWindow() {
-    if (box() != nullptr) {
+    if (box()) {
         box()->disconnect();
         box()->setModel(m_noLines); // the widget outlives the lines it showed
     }
@@ -166,7 +166,7 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
         QObject::connect(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
             const HWND self = handle();
             notify(CBN_EDITUPDATE);
-            if (from(self) != nullptr) {
+            if (from(self)) {
                 notify(CBN_EDITCHANGE);
             }
         });
@@ -219,21 +219,21 @@ void ComboBoxWindow::applyHeights() {
 
 void ComboBoxWindow::setWindowRect(const QRect& rect) {
     // A move alone comes with the closed height and leaves the list's as it was.
-    if (widget() != nullptr && rect.height() > widget()->height()) {
+    if (widget() && rect.height() > widget()->height()) {
         m_openHeight = rect.height();
     }
     Window::setWindowRect(rect);
-    if (widget() != nullptr) {
+    if (widget()) {
         applyHeights();
     }
 }
 
 QString ComboBoxWindow::text() const {
-    return box() != nullptr ? box()->currentText() : Control::text();
+    return box() ? box()->currentText() : Control::text();
 }
 
 void ComboBoxWindow::setText(const QString& text) {
-    if (box() != nullptr && isEditable()) {
+    if (box() && isEditable()) {
         guarded([&] { field()->setText(text); });
     }
 }
@@ -242,8 +242,7 @@ UINT ComboBoxWindow::dialogCode(const MSG* msg) const {
     UINT code = DLGC_WANTARROWS | DLGC_WANTCHARS;
     // Enter and Esc close an open list first.
     const bool open = box()->view()->isVisible();
-    return open && msg != nullptr && (msg->wParam == VK_RETURN || msg->wParam == VK_ESCAPE) ? code | DLGC_WANTALLKEYS
-                                                                                            : code;
+    return open && msg && (msg->wParam == VK_RETURN || msg->wParam == VK_ESCAPE) ? code | DLGC_WANTALLKEYS : code;
 }
 
 UINT ComboBoxWindow::colorMessage() const {
@@ -264,7 +263,7 @@ void ComboBoxWindow::chosen(int) {
     const HWND self = handle();
     m_chosenWhileOpen = true;
     notify(CBN_SELENDOK);
-    if (from(self) != nullptr) {
+    if (from(self)) {
         notify(CBN_SELCHANGE);
     }
 }
@@ -279,7 +278,7 @@ void ComboBoxWindow::listShown(bool shown) {
     if (!m_chosenWhileOpen) {
         notify(CBN_SELENDCANCEL);
     }
-    if (from(self) != nullptr) {
+    if (from(self)) {
         notify(CBN_CLOSEUP);
     }
 }
@@ -329,7 +328,7 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
 }
 
 void ComboBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || parent() == nullptr) {
+    if (!isOwnerDrawn() || !parent()) {
         return;
     }
     DELETEITEMSTRUCT gone{ODT_COMBOBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),

@@ -60,7 +60,7 @@ void Control::fontChanged() {
 
 void Control::notify(int code) {
     armIdle();
-    if (parent() != nullptr && !isDestroyed()) {
+    if (parent() && !isDestroyed()) {
         SendMessageA(parent()->handle(), WM_COMMAND, MAKEWPARAM(id(), code), reinterpret_cast<LPARAM>(handle()));
     }
 }
@@ -78,7 +78,7 @@ UINT Control::colorMessage() const {
 Control::Colors Control::chosenColors() const {
     const HDC dc = colorContext();
     const auto context = findContext(dc);
-    if (parent() == nullptr || !context) {
+    if (!parent() || !context) {
         return {};
     }
     const QPalette palette = QApplication::palette(widget());
@@ -102,7 +102,7 @@ Control::Colors Control::chosenColors() const {
 void Control::askColors() {
     const HWND self = handle();
     const Colors colors = chosenColors();
-    if (from(self) == nullptr || colors == m_colors) {
+    if (!from(self) || colors == m_colors) {
         return;
     }
     m_colors = colors;
@@ -125,7 +125,7 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_PAINT: {
         const HWND self = handle();
         askColors();
-        if (from(self) != nullptr) {
+        if (from(self)) {
             passEvent(*this, message);
         }
         return 0;
@@ -139,7 +139,7 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_KILLFOCUS: {
         const HWND self = handle();
         tellDialogFocus(*this, message == WM_SETFOCUS);
-        if (from(self) != nullptr) {
+        if (from(self)) {
             focusMoved(message == WM_SETFOCUS);
         }
         return 0;
@@ -157,13 +157,13 @@ OwnerPainting::OwnerPainting(Control& control, QSize size, const QColor& backgro
     m_bitmap = addBitmap(image);
     m_dc = CreateCompatibleDC(nullptr);
     m_oldBitmap = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(m_bitmap));
-    if (control.font != nullptr) {
+    if (control.font) {
         m_oldFont = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(control.font));
     }
 }
 
 OwnerPainting::~OwnerPainting() {
-    if (m_oldFont != nullptr) {
+    if (m_oldFont) {
         SelectObject(m_dc, m_oldFont);
     }
     SelectObject(m_dc, m_oldBitmap);
@@ -173,7 +173,7 @@ OwnerPainting::~OwnerPainting() {
 
 void OwnerPainting::draw(DRAWITEMSTRUCT item) {
     const Window* parent = m_control.parent();
-    if (parent == nullptr) {
+    if (!parent) {
         return;
     }
     item.CtlID = static_cast<UINT>(m_control.id());
@@ -188,8 +188,8 @@ QImage OwnerPainting::image() const {
 }
 
 std::string resourceText(const char* name) {
-    if (name == nullptr || !IS_INTRESOURCE(name)) {
-        return name != nullptr ? name : "";
+    if (!name || !IS_INTRESOURCE(name)) {
+        return name ? name : "";
     }
     return "#" + std::to_string(reinterpret_cast<std::uintptr_t>(name));
 }

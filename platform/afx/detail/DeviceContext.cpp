@@ -49,8 +49,9 @@ DeviceContext::DeviceContext(DcKind kind, std::unique_ptr<DrawTarget> target) : 
 }
 
 DeviceContext::~DeviceContext() {
-    if (MemoryTarget* own = memory())
+    if (MemoryTarget* own = memory()) {
         own->bitmap->selectedInto = nullptr;
+    }
 }
 
 MemoryTarget* DeviceContext::memory() const {
@@ -60,8 +61,9 @@ MemoryTarget* DeviceContext::memory() const {
 std::shared_ptr<const RealizedFont> DeviceContext::font() const {
     LOGFONTA device = state.font->description;
     const QSize size = state.mapping.sizeToDevice({std::abs(device.lfWidth), std::abs(device.lfHeight)});
-    if (device.lfHeight != 0)
+    if (device.lfHeight != 0) {
         device.lfHeight = device.lfHeight < 0 ? -std::max(1, size.height()) : std::max(1, size.height());
+    }
     device.lfWidth = size.width();
     return realizeFont(device);
 }
@@ -72,8 +74,9 @@ Ink DeviceContext::ink(COLORREF color, Rop2 rop) const {
 
 std::optional<Ink> DeviceContext::penInk() const {
     const LOGPEN& pen = state.pen->description;
-    if (pen.lopnStyle == PS_NULL)
+    if (pen.lopnStyle == PS_NULL) {
         return std::nullopt;
+    }
     return ink(pen.lopnColor, rop2FromCode(state.rop2));
 }
 
@@ -109,8 +112,9 @@ bool onHatchLine(int hatch, int x, int y) {
 QImage hatchImage(int hatch, Pixel line, Pixel between) {
     QImage image(kHatchSize, kHatchSize, QImage::Format_ARGB32);
     for (int y = 0; y < kHatchSize; ++y) {
-        for (int x = 0; x < kHatchSize; ++x)
+        for (int x = 0; x < kHatchSize; ++x) {
             reinterpret_cast<Pixel*>(image.scanLine(y))[x] = onHatchLine(hatch, x, y) ? line : between;
+        }
     }
     return image;
 }
@@ -129,19 +133,22 @@ QImage recolored(const QImage& image, Pixel black, Pixel white) {
 
 std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, QImage& pattern) const {
     const LOGBRUSH& description = brush.description;
-    if (description.lbStyle == BS_NULL)
+    if (description.lbStyle == BS_NULL) {
         return std::nullopt;
+    }
     const COLORREF color = brush.systemColor >= 0 ? GetSysColor(brush.systemColor) : description.lbColor;
     Ink result = ink(color, rop);
-    if (description.lbStyle == BS_SOLID)
+    if (description.lbStyle == BS_SOLID) {
         return result;
+    }
     const Pixel back = ink(state.backColor).color;
-    if (description.lbStyle == BS_HATCHED)
+    if (description.lbStyle == BS_HATCHED) {
         pattern = hatchImage(static_cast<int>(description.lbHatch), result.color, state.backMode == OPAQUE ? back : 0);
-    else if (brush.patternFormat == PixelFormat::monochrome)
+    } else if (brush.patternFormat == PixelFormat::monochrome) {
         pattern = recolored(brush.pattern, ink(state.textColor).color, back);
-    else
+    } else {
         pattern = brush.pattern;
+    }
     result.pattern = &pattern;
     result.patternOrigin = state.brushOrigin;
     return result;
@@ -157,8 +164,9 @@ std::shared_ptr<DeviceContext> findContext(HDC dc) {
 
 bool removeContext(HDC dc) {
     const auto context = contexts().take(reinterpret_cast<std::uintptr_t>(dc));
-    if (context)
+    if (context) {
         context->target->release();
+    }
     return context != nullptr;
 }
 
@@ -167,13 +175,15 @@ std::size_t contextCount() {
 }
 
 Drawing::Drawing(DeviceContext& context) : context_(context), open_(context.target->open(canvas)) {
-    if (open_ && context.state.clip)
+    if (open_ && context.state.clip) {
         canvas.clip &= *context.state.clip;
+    }
 }
 
 Drawing::~Drawing() {
-    if (open_)
+    if (open_) {
         context_.target->close(canvas.touched());
+    }
 }
 
 } // namespace tvx::afx

@@ -46,7 +46,7 @@ bool hasClientEdge(const std::string& className) {
 
 std::string captionOf(const ResourceName& name) {
     const auto* number = std::get_if<WORD>(&name);
-    if (number == nullptr) {
+    if (!number) {
         return std::get<std::string>(name);
     }
     return *number != 0 ? "#" + std::to_string(*number) : std::string();
@@ -70,7 +70,7 @@ QWidget* DialogWindow::makeWidget(QWidget* parent) {
     if (isChild()) {
         return new QWidget(parent);
     }
-    QWidget* over = owner() != nullptr ? owner()->widget() : nullptr;
+    QWidget* over = owner() ? owner()->widget() : nullptr;
     // The dialog flag lets the window manager keep it over its owner, without entries of its own in task lists.
     return new QWidget(over, windowFlags(style(), exStyle()) | Qt::Dialog);
 }
@@ -97,7 +97,7 @@ void DialogWindow::fixSize() {
 }
 
 void DialogWindow::setWindowRect(const QRect& rect) {
-    if (isChild() || widget() == nullptr) {
+    if (isChild() || !widget()) {
         Window::setWindowRect(rect);
         return;
     }
@@ -109,9 +109,9 @@ void DialogWindow::setWindowRect(const QRect& rect) {
 
 QMargins DialogWindow::expectedBorders() const {
     const bool framed = !isChild() && (style() & WS_CAPTION) == WS_CAPTION;
-    const QWidget* over = framed && owner() != nullptr ? owner()->widget() : nullptr;
-    const QWindow* native = over != nullptr && over->isVisible() ? over->windowHandle() : nullptr;
-    return native != nullptr ? native->frameMargins() : QMargins();
+    const QWidget* over = framed && owner() ? owner()->widget() : nullptr;
+    const QWindow* native = over && over->isVisible() ? over->windowHandle() : nullptr;
+    return native ? native->frameMargins() : QMargins();
 }
 
 void DialogWindow::setClientSize(QPoint corner, QSize inside) {
@@ -147,14 +147,14 @@ void DialogWindow::show(int command) {
     if (visible != before) {
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
-    if (from(self) == nullptr) {
+    if (!from(self)) {
         return;
     }
     if (visible && !before) {
         keepOnScreen();
     }
     guarded([&] { showTopLevel(*this, command); });
-    if (from(self) != nullptr) {
+    if (from(self)) {
         tellGeometry();
     }
 }
@@ -191,17 +191,17 @@ void DialogWindow::setDefaultId(int id) {
 
 void DialogWindow::showDefault(const Window* focused) {
     const auto* pushed = dynamic_cast<const ButtonWindow*>(focused);
-    const bool focusDecides = pushed != nullptr && pushed->isPushButton();
+    const bool focusDecides = pushed && pushed->isPushButton();
     for (Window* child : children()) {
         auto* button = dynamic_cast<ButtonWindow*>(child);
-        if (button != nullptr && button->isPushButton()) {
+        if (button && button->isPushButton()) {
             button->showAsDefault(focusDecides ? button == pushed : m_defaultId != 0 && button->id() == m_defaultId);
         }
     }
 }
 
 void tellDialogFocus(Window& control, bool got) {
-    for (Window* window = control.parent(); window != nullptr; window = window->parent()) {
+    for (Window* window = control.parent(); window; window = window->parent()) {
         if (auto* dialog = dynamic_cast<DialogWindow*>(window)) {
             dialog->showDefault(got ? &control : nullptr);
             dialog->lastFocus = got ? control.handle() : dialog->lastFocus;
@@ -220,7 +220,7 @@ void DialogWindow::askColor() {
         const COLORREF chosen = brush->systemColor >= 0 ? GetSysColor(brush->systemColor) : brush->description.lbColor;
         color = qRgb(GetRValue(chosen), GetGValue(chosen), GetBValue(chosen));
     }
-    if (color == m_color || widget() == nullptr) {
+    if (color == m_color || !widget()) {
         return;
     }
     m_color = color;
@@ -236,11 +236,11 @@ void DialogWindow::askColor() {
 
 void DialogWindow::pressCancel() {
     const Window* button = child(IDCANCEL);
-    if (button != nullptr && !button->isEnabled()) {
+    if (button && !button->isEnabled()) {
         QApplication::beep();
         return;
     }
-    const HWND control = button != nullptr ? button->handle() : nullptr;
+    const HWND control = button ? button->handle() : nullptr;
     call(WM_COMMAND, MAKEWPARAM(IDCANCEL, BN_CLICKED), reinterpret_cast<LPARAM>(control));
 }
 
@@ -263,14 +263,14 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_PAINT: {
         const HWND self = handle();
         askColor();
-        if (from(self) != nullptr) {
+        if (from(self)) {
             passEvent(*this, message);
         }
         return 0;
     }
     case WM_SETFOCUS:
         // The keyboard belongs to a control; it comes here when the dialog becomes active again.
-        if (from(lastFocus) != nullptr && lastFocus != handle()) {
+        if (from(lastFocus) && lastFocus != handle()) {
             SetFocus(lastFocus);
         }
         return 0;
@@ -310,7 +310,7 @@ bool makeControls(DialogWindow& dialog, const DialogTemplate& description) {
     bool complete = true;
     for (const DialogItemTemplate& item : description.items) {
         const HWND control = makeControl(dialog, item);
-        if (control == nullptr) {
+        if (!control) {
             complete = false;
             continue;
         }
@@ -322,7 +322,7 @@ bool makeControls(DialogWindow& dialog, const DialogTemplate& description) {
             ShowWindow(control, SW_SHOWNA);
         }
         const auto* button = dynamic_cast<const ButtonWindow*>(Window::from(control));
-        if (button != nullptr && button->type() == BS_DEFPUSHBUTTON && dialog.defaultId() == 0) {
+        if (button && button->type() == BS_DEFPUSHBUTTON && dialog.defaultId() == 0) {
             dialog.setDefaultId(static_cast<int>(item.id));
         }
     }

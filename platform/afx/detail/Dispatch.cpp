@@ -45,7 +45,7 @@ DispatchScope::DispatchScope(Dispatch& dispatch) {
 
 DispatchScope::~DispatchScope() {
     innermost = innermost->outer;
-    if (innermost == nullptr && !graveyard().empty()) {
+    if (!innermost && !graveyard().empty()) {
         const auto ended = std::move(graveyard());
         graveyard().clear();
     }
@@ -76,8 +76,8 @@ bool takePassing(const QEvent* event) {
 
 bool passEvent(const Window& window, UINT message) {
     Dispatch* current = innermost;
-    if (current == nullptr || current->source == nullptr || current->window != &window ||
-        current->msg.message != message || current->source->passed) {
+    if (!current || !current->source || current->window != &window || current->msg.message != message ||
+        current->source->passed) {
         return false;
     }
     passToToolkit(*current->source);
@@ -89,7 +89,7 @@ bool preTranslate(MSG& msg) {
         return false;
     }
     CWinThread* thread = AfxGetThread();
-    return thread != nullptr && thread->PreTranslateMessage(&msg) != FALSE;
+    return thread && thread->PreTranslateMessage(&msg) != FALSE;
 }
 
 LRESULT dispatch(const MSG& msg, EventSource* source) {
@@ -97,7 +97,7 @@ LRESULT dispatch(const MSG& msg, EventSource* source) {
         return callTimer(msg);
     }
     Window* window = Window::from(msg.hwnd);
-    if (window == nullptr) {
+    if (!window) {
         return 0;
     }
     Dispatch current;
@@ -110,7 +110,7 @@ LRESULT dispatch(const MSG& msg, EventSource* source) {
 
 void noteIdle(MSG& msg) {
     CWinThread* thread = AfxGetThread();
-    if (thread == nullptr || thread->IsIdleMessage(&msg)) {
+    if (!thread || thread->IsIdleMessage(&msg)) {
         armIdle();
     }
 }
@@ -137,7 +137,7 @@ void armIdle() {
 
 void runIdle() {
     CWinThread* thread = AfxGetThread();
-    if (!idleDue || thread == nullptr || ExceptionCarrier::isPending() || EventCapture::instance().isCollecting() ||
+    if (!idleDue || !thread || ExceptionCarrier::isPending() || EventCapture::instance().isCollecting() ||
         !MessageQueue::instance().isEmpty()) {
         return;
     }
@@ -161,11 +161,11 @@ using namespace tvx::afx;
 
 LRESULT SendMessageA(HWND handle, UINT message, WPARAM wParam, LPARAM lParam) {
     Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return 0;
     }
     MessageQueue& queue = MessageQueue::instance();
-    if (QThread::currentThread() == queue.thread() || QCoreApplication::instance() == nullptr) {
+    if (QThread::currentThread() == queue.thread() || !QCoreApplication::instance()) {
         return window->call(message, wParam, lParam);
     }
     LRESULT result = 0;
@@ -183,7 +183,7 @@ BOOL PostMessageA(HWND handle, UINT message, WPARAM wParam, LPARAM lParam) {
     }
     // Other threads cannot look into the table of windows; a stale handle is found when the message arrives.
     const bool ownThread = QThread::currentThread() == MessageQueue::instance().thread();
-    if (ownThread && handle != nullptr && Window::from(handle) == nullptr) {
+    if (ownThread && handle && !Window::from(handle)) {
         return FALSE;
     }
     if (message == WM_QUIT) {
@@ -261,16 +261,16 @@ DWORD GetTickCount() {
 }
 
 DWORD GetMessagePos() {
-    const POINT position = DispatchScope::current() != nullptr ? DispatchScope::current()->msg.pt : pointer;
+    const POINT position = DispatchScope::current() ? DispatchScope::current()->msg.pt : pointer;
     return static_cast<DWORD>(MAKELONG(position.x, position.y));
 }
 
 LONG GetMessageTime() {
-    return DispatchScope::current() != nullptr ? static_cast<LONG>(DispatchScope::current()->msg.time) : 0;
+    return DispatchScope::current() ? static_cast<LONG>(DispatchScope::current()->msg.time) : 0;
 }
 
 UINT RegisterWindowMessageA(LPCSTR name) {
-    if (name == nullptr || *name == '\0') {
+    if (!name || *name == '\0') {
         return 0;
     }
     static std::map<std::string, UINT, tvx::text::LessNoCase> numbers;

@@ -63,7 +63,7 @@ void EditWindow::widgetMade() {
 
 QWidget* EditWindow::clientWidget() const {
     auto* area = dynamic_cast<QAbstractScrollArea*>(widget());
-    return area != nullptr ? area->viewport() : widget();
+    return area ? area->viewport() : widget();
 }
 
 void EditWindow::applyStyle() {
@@ -91,7 +91,7 @@ void EditWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 }
 
 QString EditWindow::text() const {
-    if (m_field == nullptr || widget() == nullptr) {
+    if (!m_field || !widget()) {
         return Control::text();
     }
     QString text = m_field->text();
@@ -99,7 +99,7 @@ QString EditWindow::text() const {
 }
 
 void EditWindow::setText(const QString& text) {
-    if (m_field == nullptr || widget() == nullptr) {
+    if (!m_field || !widget()) {
         return;
     }
     // Many lines set by the program are no change that the program is told of.
@@ -115,7 +115,7 @@ void EditWindow::changed() {
     }
     const HWND self = handle();
     notify(EN_UPDATE);
-    if (from(self) != nullptr) {
+    if (from(self)) {
         notify(EN_CHANGE);
     }
 }
@@ -126,7 +126,7 @@ void EditWindow::focusMoved(bool got) {
 
 UINT EditWindow::dialogCode(const MSG* msg) const {
     UINT code = DLGC_HASSETSEL | DLGC_WANTCHARS | DLGC_WANTARROWS;
-    if (!isMultiLine() || msg == nullptr) {
+    if (!isMultiLine() || !msg) {
         return code;
     }
     const bool control = isKeyDown(VK_CONTROL);
@@ -163,7 +163,7 @@ void EditWindow::insert(QString text, Source source, Undo undo) {
             text.truncate(units);
             const HWND self = handle();
             notify(EN_MAXTEXT);
-            if (from(self) == nullptr || text.isEmpty()) {
+            if (!from(self) || text.isEmpty()) {
                 return;
             }
         }

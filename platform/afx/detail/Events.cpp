@@ -112,7 +112,7 @@ bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
         return true;
     }
     const HWND target = window.handle();
-    if (isConsumed(event, msg) || Window::from(target) == nullptr) {
+    if (isConsumed(event, msg) || !Window::from(target)) {
         event.accept();
         return true;
     }
@@ -122,7 +122,7 @@ bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
     if (makesCharacters) {
         // A widget inserts the character at this one event, so it gets it where the framework would insert it.
         dispatch(msg);
-        if (Window::from(handle) != nullptr) {
+        if (Window::from(handle)) {
             deliverCharacters(window, event, source);
         }
     } else {
@@ -201,7 +201,7 @@ Window* mouseTarget(Window* under) {
     if (Window* capturing = Window::from(captureWindow())) {
         return capturing;
     }
-    while (under != nullptr && under->passesMouse() && under->parent() != nullptr) {
+    while (under && under->passesMouse() && under->parent()) {
         under = under->parent();
     }
     return under;
@@ -210,15 +210,15 @@ Window* mouseTarget(Window* under) {
 /// Lets windows choose the cursor, and views and child frames become active, before they see the press itself.
 void announceMouse(const Window& window, UINT message) {
     const HWND handle = window.handle();
-    if (captureWindow() == nullptr) {
+    if (!captureWindow()) {
         noteCursorWindow(handle);
         SendMessageA(handle, WM_SETCURSOR, reinterpret_cast<WPARAM>(handle),
                      MAKELPARAM(HTCLIENT, static_cast<int>(message)));
     }
     const bool press = message == WM_LBUTTONDOWN || message == WM_RBUTTONDOWN || message == WM_MBUTTONDOWN;
-    if (press && captureWindow() == nullptr) {
+    if (press && !captureWindow()) {
         Window* current = Window::from(handle);
-        const HWND top = current != nullptr ? current->topLevel()->handle() : nullptr;
+        const HWND top = current ? current->topLevel()->handle() : nullptr;
         SendMessageA(handle, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(top),
                      MAKELPARAM(HTCLIENT, static_cast<int>(message)));
     }
@@ -229,7 +229,7 @@ bool onMouse(Window& under, QObject* receiver, QMouseEvent& event) {
     notePointer(fromQt(screen));
     const UINT message = event.type() == QEvent::MouseMove ? static_cast<UINT>(WM_MOUSEMOVE) : buttonMessage(event);
     Window* target = mouseTarget(&under);
-    if (message == WM_NULL || target == nullptr) {
+    if (message == WM_NULL || !target) {
         return false;
     }
     altAlone = false;
@@ -238,7 +238,7 @@ bool onMouse(Window& under, QObject* receiver, QMouseEvent& event) {
         announceMouse(*target, message);
     }
     target = Window::from(handle);
-    if (target == nullptr) {
+    if (!target) {
         event.accept();
         return true;
     }
@@ -258,7 +258,7 @@ bool onMouse(Window& under, QObject* receiver, QMouseEvent& event) {
 
 bool onWheel(Window& under, QObject* receiver, QWheelEvent& event) {
     Window* target = mouseTarget(&under);
-    if (target == nullptr || event.angleDelta().y() == 0) {
+    if (!target || event.angleDelta().y() == 0) {
         return false;
     }
     const QPoint screen = event.globalPosition().toPoint();
@@ -316,7 +316,7 @@ bool onCloseRequest(Window& window, QEvent& event) {
 
 void onActivation(Window& window, bool active) {
     Window* other = Window::of(QApplication::activeWindow());
-    const auto otherHandle = reinterpret_cast<LPARAM>(other != nullptr && other != &window ? other->handle() : nullptr);
+    const auto otherHandle = reinterpret_cast<LPARAM>(other && other != &window ? other->handle() : nullptr);
     const HWND handle = window.handle();
     armIdle();
     SendMessageA(handle, WM_NCACTIVATE, active ? TRUE : FALSE, 0);
@@ -338,7 +338,7 @@ bool onAfterwards(Window& window, QObject* receiver, QEvent& event, bool& result
     passToToolkit(source);
     result = true;
     Window* current = Window::from(handle);
-    if (current == nullptr) {
+    if (!current) {
         return true;
     }
     const bool outermost = receiver == current->widget();
@@ -465,11 +465,11 @@ bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     const bool input = isInput(event->type());
     // The toolkit forwards wheel and key events between widgets by sending them again; only the user's count. An
     // open menu or drop-down list has all input to itself.
-    if (input && (!event->spontaneous() || QApplication::activePopupWidget() != nullptr)) {
+    if (input && (!event->spontaneous() || QApplication::activePopupWidget())) {
         return false;
     }
     Window* window = Window::of(receiver);
-    if (window == nullptr || window->isDestroyed()) {
+    if (!window || window->isDestroyed()) {
         return false;
     }
     return input ? translateInput(*window, receiver, event) : translateOther(*window, receiver, event, result);

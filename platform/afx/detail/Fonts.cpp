@@ -58,15 +58,17 @@ const Substitute kSubstitutes[] = {
 
 QString firstInstalled(const Choices& choices) {
     for (const char* family : choices) {
-        if (QFontDatabase::hasFamily(QString::fromLatin1(family)))
+        if (QFontDatabase::hasFamily(QString::fromLatin1(family))) {
             return QString::fromLatin1(family);
+        }
     }
     return QGuiApplication::font().family();
 }
 
 const Choices& choicesByFamily(BYTE pitchAndFamily) {
-    if ((pitchAndFamily & 0xF0) == FF_MODERN || (pitchAndFamily & 3) == FIXED_PITCH)
+    if ((pitchAndFamily & 0xF0) == FF_MODERN || (pitchAndFamily & 3) == FIXED_PITCH) {
         return kFixed;
+    }
     return (pitchAndFamily & 0xF0) == FF_ROMAN ? kSerif : kInterface;
 }
 
@@ -78,8 +80,9 @@ std::string_view faceName(const LOGFONTA& description) {
 
 QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
     QString wanted = QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
-    if (!faceName.empty() && QFontDatabase::hasFamily(wanted))
+    if (!faceName.empty() && QFontDatabase::hasFamily(wanted)) {
         return wanted;
+    }
     const auto* found = std::ranges::find_if(
         kSubstitutes, [&](const Substitute& substitute) { return text::equalNoCase(substitute.face, faceName); });
     return firstInstalled(found != std::end(kSubstitutes) ? found->choices : choicesByFamily(pitchAndFamily));
@@ -95,29 +98,33 @@ constexpr int kLargestHeight = 4096;
 void fitCell(QFont& font, int cellHeight) {
     int size = cellHeight;
     font.setPixelSize(size);
-    while (size > 1 && QFontMetrics(font).height() > cellHeight)
+    while (size > 1 && QFontMetrics(font).height() > cellHeight) {
         font.setPixelSize(--size);
+    }
 }
 
 void setHeight(QFont& font, int height) {
     height = std::clamp(height, -kLargestHeight, kLargestHeight);
-    if (height < 0)
+    if (height < 0) {
         font.setPixelSize(-height);
-    else
+    } else {
         fitCell(font, height == 0 ? kDefaultCellHeight : height);
+    }
 }
 
 QFont::Weight weightOf(LONG weight) {
-    if (weight <= 0)
+    if (weight <= 0) {
         return QFont::Normal;
+    }
     return static_cast<QFont::Weight>(std::clamp<LONG>(weight, QFont::Thin, QFont::Black));
 }
 
 /// Stretches the face until its average character has the width asked for.
 void setWidth(QFont& font, int width) {
     const int natural = QFontMetrics(font).averageCharWidth();
-    if (width != 0 && natural > 0)
+    if (width != 0 && natural > 0) {
         font.setStretch(std::clamp(scaled(std::abs(width), 100, natural), 1, 4000));
+    }
 }
 
 QFont::StyleStrategy styleStrategy(BYTE quality) {
@@ -156,12 +163,14 @@ FontKey keyOf(const LOGFONTA& font) {
 std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
     // Fonts must not outlive the connection to the desktop; a host has few different ones.
     static std::map<FontKey, std::shared_ptr<const RealizedFont>> fonts;
-    if (!ensureGui())
+    if (!ensureGui()) {
         return nullptr;
+    }
     static const auto cleared = QObject::connect(qGuiApp, &QObject::destroyed, [] { fonts.clear(); });
     constexpr std::size_t kMostFonts = 256;
-    if (fonts.size() > kMostFonts)
+    if (fonts.size() > kMostFonts) {
         fonts.clear();
+    }
     auto& kept = fonts[keyOf(description)];
     if (!kept) {
         auto font = std::make_shared<RealizedFont>(makeFont(description));

@@ -27,8 +27,9 @@ DWORD GdiObject::type() const {
 }
 
 HBITMAP addBitmap(int width, int height, PixelFormat format) {
-    if (width <= 0 || height <= 0 || std::int64_t{width} * height > kMostPixels)
+    if (width <= 0 || height <= 0 || std::int64_t{width} * height > kMostPixels) {
         return nullptr;
+    }
     QImage image(width, height, QImage::Format_RGB32);
     image.fill(Qt::black);
     return addBitmap(image, format);
@@ -37,8 +38,9 @@ HBITMAP addBitmap(int width, int height, PixelFormat format) {
 HBITMAP addBitmap(const QImage& image, PixelFormat format) {
     // The pixels may be the caller's own memory, and their unused byte anything.
     QImage pixels = image.format() == QImage::Format_RGB32 ? image.copy() : image.convertToFormat(QImage::Format_RGB32);
-    if (pixels.isNull())
+    if (pixels.isNull()) {
         return nullptr;
+    }
     for (int y = 0; y < pixels.height(); ++y) {
         auto* row = reinterpret_cast<Pixel*>(pixels.scanLine(y));
         std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | kOpaque; });
@@ -57,8 +59,9 @@ HandleTable<IconObject>& icons() {
 }
 
 HICON addIcon(const QImage& image, QPoint hotSpot) {
-    if (image.isNull())
+    if (image.isNull()) {
         return nullptr;
+    }
     auto icon = std::make_shared<IconObject>(IconObject{image.convertToFormat(QImage::Format_ARGB32), hotSpot});
     return reinterpret_cast<HICON>(icons().add(std::move(icon)));
 }

@@ -79,8 +79,9 @@ template <class T>
 template <class T>
 [[nodiscard]] Tool<T> findTool(HGDIOBJ handle) {
     auto object = gdiObjects().find(reinterpret_cast<std::uintptr_t>(handle));
-    if (!object || !std::holds_alternative<T>(object->value))
+    if (!object || !std::holds_alternative<T>(object->value)) {
         return {};
+    }
     return {handle, std::move(object)};
 }
 

@@ -53,18 +53,18 @@ DWORD threadOfWindows = 0;
 
 bool askDisplay() {
     const char* plugin = std::getenv("QT_QPA_PLATFORM");
-    if (plugin != nullptr && *plugin != '\0') {
+    if (plugin && *plugin != '\0') {
         return true;
     }
     const char* wayland = std::getenv("WAYLAND_DISPLAY");
-    return (wayland != nullptr && *wayland != '\0') || canOpenDisplay();
+    return (wayland && *wayland != '\0') || canOpenDisplay();
 }
 
 /// The toolkit's own texts (menus of text fields, lists of files) in the user's language, where they are installed.
 void translateToolkit() {
     const LCID locale = GetUserDefaultLCID();
     const tvx::detail::Language* language = tvx::detail::languageOf(locale);
-    if (language == nullptr || PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH) {
+    if (!language || PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH) {
         return;
     }
     auto* translator = new QTranslator(QCoreApplication::instance());
@@ -119,7 +119,7 @@ bool wasDisplayMissed() {
 }
 
 bool ensureGui() {
-    if (QCoreApplication::instance() == nullptr) {
+    if (!QCoreApplication::instance()) {
         if (!hasDisplay()) {
             return false;
         }

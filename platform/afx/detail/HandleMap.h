@@ -11,8 +11,9 @@ template <class Object>
 class HandleMap {
 public:
     [[nodiscard]] Object* find(const void* handle) const {
-        if (const auto own = permanent_.find(handle); own != permanent_.end())
+        if (const auto own = permanent_.find(handle); own != permanent_.end()) {
             return own->second;
+        }
         const auto made = temporary_.find(handle);
         return made != temporary_.end() ? made->second.get() : nullptr;
     }
@@ -27,8 +28,9 @@ public:
     /// Takes the handle out if it stands for `object`.
     void removePermanent(const void* handle, const Object& object) {
         const auto own = permanent_.find(handle);
-        if (own != permanent_.end() && own->second == &object)
+        if (own != permanent_.end() && own->second == &object) {
             permanent_.erase(own);
+        }
     }
     Object* addTemporary(const void* handle, std::unique_ptr<Object> object) {
         return (temporary_[handle] = std::move(object)).get();
@@ -38,13 +40,15 @@ public:
     void deleteTemporaries(Release release) {
         auto dying = std::move(temporary_);
         temporary_.clear();
-        for (auto& [handle, object] : dying)
+        for (auto& [handle, object] : dying) {
             release(*object);
+        }
     }
     template <class Release>
     void deleteTemporary(const void* handle, Release release) {
-        if (auto node = temporary_.extract(handle))
+        if (auto node = temporary_.extract(handle)) {
             release(*node.mapped());
+        }
     }
 
 private:

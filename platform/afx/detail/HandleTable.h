@@ -22,8 +22,9 @@ public:
     /// Keeps `object` and answers its number, 0 when the table is full.
     [[nodiscard]] std::uintptr_t add(std::shared_ptr<T> object) {
         const std::uint32_t slot = freeSlot();
-        if (slot > kSlotMask)
+        if (slot > kSlotMask) {
             return 0;
+        }
         slots_[slot].object = std::move(object);
         return tag_ | (static_cast<std::uint32_t>(slots_[slot].generation) << kGenerationShift) | slot;
     }
@@ -37,8 +38,9 @@ public:
     /// Forgets the number. The result is what it stood for, null when it stood for nothing.
     std::shared_ptr<T> take(std::uintptr_t number) {
         auto* slot = const_cast<Slot*>(slotOf(number));
-        if (!slot)
+        if (!slot) {
             return nullptr;
+        }
         ++slot->generation;
         freed_.push_back(static_cast<std::uint32_t>(number & kSlotMask));
         return std::exchange(slot->object, nullptr);
@@ -66,16 +68,18 @@ private:
             freed_.pop_front();
             return slot;
         }
-        if (slots_.size() > kSlotMask)
+        if (slots_.size() > kSlotMask) {
             return kSlotMask + 1;
+        }
         slots_.emplace_back();
         return static_cast<std::uint32_t>(slots_.size() - 1);
     }
 
     const Slot* slotOf(std::uintptr_t number) const {
         const std::size_t index = number & kSlotMask;
-        if (number >> 32 || index >= slots_.size() || (number & (0xFU << kTagShift)) != tag_)
+        if (number >> 32 || index >= slots_.size() || (number & (0xFU << kTagShift)) != tag_) {
             return nullptr;
+        }
         const Slot& slot = slots_[index];
         return slot.object && slot.generation == ((number >> kGenerationShift) & 0xFF) ? &slot : nullptr;
     }

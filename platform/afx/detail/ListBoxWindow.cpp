@@ -131,16 +131,16 @@ void ListBoxWindow::measure() {
 }
 
 QWidget* ListBoxWindow::clientWidget() const {
-    return widget() != nullptr ? m_area->viewport() : nullptr;
+    return widget() ? m_area->viewport() : nullptr;
 }
 
 QRect ListBoxWindow::clientRect() const {
-    return widget() != nullptr ? m_area->viewport()->rect() : QRect();
+    return widget() ? m_area->viewport()->rect() : QRect();
 }
 
 void ListBoxWindow::setWindowRect(const QRect& rect) {
     QRect whole = rect;
-    if ((style() & LBS_NOINTEGRALHEIGHT) == 0 && m_area != nullptr) {
+    if ((style() & LBS_NOINTEGRALHEIGHT) == 0 && m_area) {
         const int frame = 2 * m_area->frameWidth();
         const int rows = (rect.height() - frame) / m_rowHeight;
         whole.setHeight(rows > 0 ? rows * m_rowHeight + frame : rect.height());
@@ -167,7 +167,7 @@ void ListBoxWindow::applyColors(QPalette& palette, const QColor& text, const QCo
 // --- rows and scrolling ---
 
 void ListBoxWindow::applyRange() {
-    if (widget() == nullptr) {
+    if (!widget()) {
         return;
     }
     guarded([this] {
@@ -248,7 +248,7 @@ LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
 
 /// Hosts free what the data of an owner-drawn line points to when they are told of its end.
 void ListBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || parent() == nullptr) {
+    if (!isOwnerDrawn() || !parent()) {
         return;
     }
     DELETEITEMSTRUCT gone{ODT_LISTBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
@@ -668,7 +668,7 @@ void ListBoxWindow::paintRow(QPainter& painter, int index) const {
 void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
     const HWND self = handle();
     OwnerPainting drawing(*this, m_area->viewport()->size(), m_area->viewport()->palette().color(QPalette::Base));
-    for (int row = first; row <= last && row < m_items.count() && from(self) != nullptr; ++row) {
+    for (int row = first; row <= last && row < m_items.count() && from(self); ++row) {
         DRAWITEMSTRUCT item{};
         item.CtlType = ODT_LISTBOX;
         item.itemID = static_cast<UINT>(row);
@@ -679,7 +679,7 @@ void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
                          (isEnabled() ? 0U : ODS_DISABLED);
         drawing.draw(item);
     }
-    if (from(self) != nullptr) {
+    if (from(self)) {
         painter.drawImage(0, 0, drawing.image());
     }
 }

@@ -51,7 +51,7 @@ int ModalLoop::run() {
         m_running = false;
         current.guards = guards;
         current.innermost = m_outer;
-        if (current.quitting && m_outer != nullptr) {
+        if (current.quitting && m_outer) {
             m_outer->m_loop.exit();
         }
         ExceptionCarrier::rethrow();
@@ -74,7 +74,7 @@ void ExceptionCarrier::store(std::exception_ptr error) noexcept {
     if (!current.pending) {
         current.pending = std::move(error);
     }
-    if (current.guards == 0 && current.innermost != nullptr) {
+    if (current.guards == 0 && current.innermost) {
         current.innermost->m_loop.exit();
     }
 }
@@ -101,7 +101,7 @@ void requestQuit(int exitCode) {
     LoopState& current = state();
     current.quitting = true;
     current.exitCode = exitCode;
-    if (current.innermost != nullptr) {
+    if (current.innermost) {
         MessageQueue::instance().wake();
     }
 }

@@ -8,15 +8,17 @@
 namespace tvx::afx {
 
 int scaled(std::int64_t value, int by, int per) {
-    if (by == per)
+    if (by == per) {
         return saturated(value);
+    }
     __extension__ using Wide = __int128;
     const Wide sign = per < 0 ? -1 : 1;
     const Wide numerator = sign * (Wide{2} * value * by + per);
     const Wide denominator = sign * 2 * per;
     Wide quotient = numerator / denominator;
-    if (numerator % denominator < 0)
+    if (numerator % denominator < 0) {
         --quotient;
+    }
     return static_cast<int>(std::clamp<Wide>(quotient, INT_MIN, INT_MAX));
 }
 
@@ -47,8 +49,9 @@ bool Mapping::hasFreeExtents() const {
 }
 
 bool Mapping::setMode(int mode) {
-    if (mode < MM_TEXT || mode > MM_ANISOTROPIC)
+    if (mode < MM_TEXT || mode > MM_ANISOTROPIC) {
         return false;
+    }
     const int units = unitsPerInch(mode == MM_ISOTROPIC ? MM_LOMETRIC : mode);
     if (units != 0) {
         windowExtent_ = {units, units};
@@ -61,36 +64,40 @@ bool Mapping::setMode(int mode) {
 }
 
 bool Mapping::setWindowExtent(QSize extent) {
-    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0)
+    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
         return false;
+    }
     windowExtent_ = extent;
     keepIsotropic();
     return true;
 }
 
 bool Mapping::setViewportExtent(QSize extent) {
-    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0)
+    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
         return false;
+    }
     viewportExtent_ = extent;
     keepIsotropic();
     return true;
 }
 
 void Mapping::keepIsotropic() {
-    if (mode_ != MM_ISOTROPIC)
+    if (mode_ != MM_ISOTROPIC) {
         return;
+    }
     const std::int64_t width = std::abs(std::int64_t{viewportExtent_.width()});
     const std::int64_t height = std::abs(std::int64_t{viewportExtent_.height()});
     const int unitsWide = std::abs(windowExtent_.width());
     const int unitsHigh = std::abs(windowExtent_.height());
     const auto signedLike = [](int value, int sign) { return sign < 0 ? -value : value; };
     // A pixel stands for as many units down as across: the extent with pixels to spare gives them up.
-    if (width * unitsHigh > height * unitsWide)
+    if (width * unitsHigh > height * unitsWide) {
         viewportExtent_.setWidth(
             signedLike(std::max(1, scaled(height, unitsWide, unitsHigh)), viewportExtent_.width()));
-    else
+    } else {
         viewportExtent_.setHeight(
             signedLike(std::max(1, scaled(width, unitsHigh, unitsWide)), viewportExtent_.height()));
+    }
 }
 
 namespace {

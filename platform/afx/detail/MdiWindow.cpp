@@ -45,7 +45,7 @@ protected:
 } // namespace
 
 std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs) {
-    if (dynamic_cast<MdiClientWindow*>(Window::from(cs.hwndParent)) == nullptr) {
+    if (!dynamic_cast<MdiClientWindow*>(Window::from(cs.hwndParent))) {
         return std::make_unique<PlainWindow>(cs);
     }
     return std::make_unique<MdiChildWindow>(cs);
@@ -77,22 +77,22 @@ QMdiArea* MdiClientWindow::area() const {
 }
 
 QWidget* MdiClientWindow::clientWidget() const {
-    return widget() != nullptr ? area()->viewport() : nullptr;
+    return widget() ? area()->viewport() : nullptr;
 }
 
 void MdiClientWindow::follow(const QMdiSubWindow* sub) {
     // Without a sub-window the main frame has only been deactivated; its active child stays that.
-    if (sub != nullptr && !m_activating && !isDestroyed()) {
+    if (sub && !m_activating && !isDestroyed()) {
         activate(dynamic_cast<MdiChildWindow*>(Window::of(sub)));
     }
 }
 
 void MdiClientWindow::activate(MdiChildWindow* child) {
-    if (child != nullptr && child->isDestroyed()) {
+    if (child && child->isDestroyed()) {
         return;
     }
     MdiChildWindow* old = std::exchange(m_active, child);
-    if (child != nullptr) {
+    if (child) {
         std::erase(m_history, child);
         m_history.push_back(child);
         m_activating = true;
@@ -102,10 +102,10 @@ void MdiClientWindow::activate(MdiChildWindow* child) {
     if (old == child) {
         return;
     }
-    const HWND oldHandle = old != nullptr ? old->handle() : nullptr;
-    const HWND newHandle = child != nullptr ? child->handle() : nullptr;
+    const HWND oldHandle = old ? old->handle() : nullptr;
+    const HWND newHandle = child ? child->handle() : nullptr;
     for (const HWND told : {oldHandle, newHandle}) {
-        if (from(told) != nullptr) {
+        if (from(told)) {
             SendMessageA(told, WM_NCACTIVATE, told == newHandle ? TRUE : FALSE, 0);
             SendMessageA(told, WM_MDIACTIVATE, reinterpret_cast<WPARAM>(oldHandle),
                          reinterpret_cast<LPARAM>(newHandle));
@@ -129,7 +129,7 @@ std::vector<MdiChildWindow*> MdiClientWindow::shownChildren() const {
     std::vector<MdiChildWindow*> shown;
     for (Window* window : children()) {
         auto* child = dynamic_cast<MdiChildWindow*>(window);
-        if (child != nullptr && !child->isDestroyed() && !child->widget()->isHidden()) {
+        if (child && !child->isDestroyed() && !child->widget()->isHidden()) {
             shown.push_back(child);
         }
     }
@@ -180,9 +180,9 @@ LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
     switch (message) {
     case WM_MDIGETACTIVE:
         if (lParam != 0) {
-            *reinterpret_cast<BOOL*>(lParam) = m_active != nullptr && m_active->widget()->isMaximized() ? TRUE : FALSE;
+            *reinterpret_cast<BOOL*>(lParam) = m_active && m_active->widget()->isMaximized() ? TRUE : FALSE;
         }
-        return m_active != nullptr ? reinterpret_cast<LRESULT>(m_active->handle()) : 0;
+        return m_active ? reinterpret_cast<LRESULT>(m_active->handle()) : 0;
     case WM_MDIACTIVATE:
         activate(child);
         return 0;
@@ -191,12 +191,12 @@ LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
         return 0;
     case WM_MDIMAXIMIZE:
     case WM_MDIRESTORE:
-        if (child != nullptr) {
+        if (child) {
             child->show(message == WM_MDIMAXIMIZE ? SW_SHOWMAXIMIZED : SW_RESTORE);
         }
         return 0;
     case WM_MDIDESTROY:
-        if (child != nullptr) {
+        if (child) {
             child->destroy();
         }
         return 0;
@@ -255,7 +255,7 @@ void MdiChildWindow::widgetMade() {
 }
 
 void MdiChildWindow::iconChanged() {
-    const QImage image = iconImage(smallIcon != nullptr ? smallIcon : bigIcon);
+    const QImage image = iconImage(smallIcon ? smallIcon : bigIcon);
     if (!image.isNull()) {
         widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
     }
@@ -263,7 +263,7 @@ void MdiChildWindow::iconChanged() {
 
 void MdiChildWindow::setText(const QString& text) {
     Window::setText(text);
-    if (widget() != nullptr) {
+    if (widget()) {
         guarded([&] { widget()->setWindowTitle(text); });
     }
 }
@@ -285,7 +285,7 @@ void MdiChildWindow::show(int command) {
         forgetToldSize();
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
-    if (from(self) == nullptr) {
+    if (!from(self)) {
         return;
     }
     guarded([&] {
@@ -310,7 +310,7 @@ void MdiChildWindow::show(int command) {
             break;
         }
     });
-    if (from(self) != nullptr) {
+    if (from(self)) {
         tellGeometry();
     }
 }

@@ -30,8 +30,8 @@ void sendSelect(HWND owner, UINT item, UINT flags, HMENU menu) {
 void applyState(QAction& action, const MenuItem& item) {
     action.setEnabled(item.isEnabled());
     const bool checked = (item.flags & MF_CHECKED) != 0;
-    const HBITMAP picture = checked && item.checked != nullptr ? item.checked : item.unchecked;
-    if (picture != nullptr) {
+    const HBITMAP picture = checked && item.checked ? item.checked : item.unchecked;
+    if (picture) {
         action.setIcon(buttonIcon(picture));
         action.setIconVisibleInMenu(true);
     }
@@ -87,7 +87,7 @@ void PopupMenu::closed() {
     m_prepared = false;
     if (m_host.notifies) {
         SendMessageA(m_host.owner, WM_UNINITMENUPOPUP, reinterpret_cast<WPARAM>(m_menu), 0);
-        if (qobject_cast<QMenu*>(parentWidget()) == nullptr) {
+        if (!qobject_cast<QMenu*>(parentWidget())) {
             sendSelect(m_host.owner, 0, 0xFFFF, nullptr);
         }
     }
@@ -100,7 +100,7 @@ void PopupMenu::fill() {
         child->deleteLater();
     }
     const Menu* menu = menuFrom(m_menu);
-    if (menu == nullptr) {
+    if (!menu) {
         return;
     }
     for (std::size_t i = 0; i < menu->items.size(); ++i) {
@@ -114,7 +114,7 @@ void PopupMenu::addItem(const MenuItem& item, int index) {
         return;
     }
     QAction* action = nullptr;
-    if (item.popup != nullptr) {
+    if (item.popup) {
         action = addMenu(new PopupMenu(item.popup, index, m_host, this));
         action->setText(QString::fromStdString(item.text));
     } else {
@@ -136,7 +136,7 @@ void PopupMenu::hovered(QAction* action) {
     }
     const MenuItem& item = place.item();
     const UINT system = m_host.systemMenu ? MF_SYSMENU : 0U;
-    if (item.popup != nullptr) {
+    if (item.popup) {
         sendSelect(m_host.owner, static_cast<UINT>(indexOf(*action)), MF_POPUP | MF_HILITE | system, m_menu);
     } else {
         sendSelect(m_host.owner, item.id, (item.flags & 0xFFU) | MF_HILITE | system, m_menu);
@@ -175,7 +175,7 @@ void FrameMenuBar::rebuild() {
         popup->deleteLater();
     }
     const Menu* menu = menuFrom(m_menu);
-    if (menu == nullptr) {
+    if (!menu) {
         return;
     }
     for (std::size_t i = 0; i < menu->items.size(); ++i) {
@@ -188,7 +188,7 @@ void FrameMenuBar::addEntry(const MenuItem& item, int index) {
         return;
     }
     QAction* action = nullptr;
-    if (item.popup != nullptr) {
+    if (item.popup) {
         auto* popup = new PopupMenu(item.popup, index, m_host, this);
         connect(popup, &QMenu::aboutToShow, popup, [this] {
             storing([this] { SendMessageA(m_host.owner, WM_INITMENU, reinterpret_cast<WPARAM>(m_menu), 0); });
@@ -223,11 +223,10 @@ bool FrameMenuBar::openByKey(char32_t key) {
     const auto entries = actions();
     for (QAction* entry : entries) {
         const auto index = static_cast<std::size_t>(indexOf(*entry));
-        if (menu == nullptr || index >= menu->items.size() || accessKey(menu->items[index].text) != key ||
-            !entry->isEnabled()) {
+        if (!menu || index >= menu->items.size() || accessKey(menu->items[index].text) != key || !entry->isEnabled()) {
             continue;
         }
-        if (entry->menu() == nullptr) {
+        if (!entry->menu()) {
             m_host.choose(menu->items[index].id);
             return true;
         }
@@ -235,7 +234,7 @@ bool FrameMenuBar::openByKey(char32_t key) {
             setActiveAction(entry);
             // Opened by a key, a menu shows its first item as chosen.
             QKeyEvent first(QEvent::KeyPress, Qt::Key_Down, Qt::NoModifier);
-            if (entry->menu()->isVisible() && entry->menu()->activeAction() == nullptr) {
+            if (entry->menu()->isVisible() && !entry->menu()->activeAction()) {
                 QCoreApplication::sendEvent(entry->menu(), &first);
             }
         });
@@ -245,8 +244,7 @@ bool FrameMenuBar::openByKey(char32_t key) {
 }
 
 bool menuHasKeyboard() {
-    return QApplication::activePopupWidget() != nullptr ||
-           qobject_cast<QMenuBar*>(QApplication::focusWidget()) != nullptr;
+    return QApplication::activePopupWidget() || qobject_cast<QMenuBar*>(QApplication::focusWidget());
 }
 
 void postMenuCommand(HWND owner, UINT id, bool systemMenu) {
@@ -283,12 +281,11 @@ QPoint placeOf(const QMenu& popup, UINT flags, QPoint at) {
 UINT track(HMENU menu, UINT flags, QPoint at, Tracking& tracking) {
     Window* window = Window::from(tracking.host.owner);
     tracking.host.choose = [&tracking](UINT id) { tracking.chosen = id; };
-    QPointer<PopupMenu> popup =
-        new PopupMenu(menu, 0, tracking.host, window != nullptr ? window->topLevel()->widget() : nullptr);
+    QPointer<PopupMenu> popup = new PopupMenu(menu, 0, tracking.host, window ? window->topLevel()->widget() : nullptr);
     struct Closer {
         QPointer<PopupMenu>& popup;
         ~Closer() {
-            if (popup != nullptr) {
+            if (popup) {
                 popup->disconnect();
                 popup->close();
                 popup->deleteLater();
@@ -299,11 +296,11 @@ UINT track(HMENU menu, UINT flags, QPoint at, Tracking& tracking) {
     QObject::connect(popup, &QMenu::aboutToHide, popup, [&loop] { loop.end(0); });
     guarded([&] {
         storing([&] { popup->prepare(); });
-        if (popup != nullptr && !popup->actions().isEmpty()) {
+        if (popup && !popup->actions().isEmpty()) {
             popup->popup(placeOf(*popup, flags, at));
         }
     });
-    if (popup != nullptr && popup->isVisible()) {
+    if (popup && popup->isVisible()) {
         loop.run();
     }
     return tracking.chosen;
@@ -347,7 +344,7 @@ void forgetEnded() {
 void updateSystemMenu(HWND handle) {
     const HMENU menu = GetSystemMenu(handle, FALSE);
     const Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return;
     }
     const bool zoomed = IsZoomed(handle) != FALSE;
@@ -384,8 +381,8 @@ void openMenuByKey(Window& window, char32_t key) {
         }
     }
     auto* frame = qobject_cast<QMainWindow*>(window.widget());
-    auto* bar = frame != nullptr ? dynamic_cast<FrameMenuBar*>(frame->menuWidget()) : nullptr;
-    if (bar != nullptr) {
+    auto* bar = frame ? dynamic_cast<FrameMenuBar*>(frame->menuWidget()) : nullptr;
+    if (bar) {
         bar->openByKey(key < 0x80 ? static_cast<char32_t>(QChar::toLower(static_cast<char16_t>(key)))
                                   : QChar::toLower(key));
     }
@@ -396,12 +393,12 @@ void openMenuByKey(Window& window, char32_t key) {
 using namespace tvx::afx;
 
 BOOL TrackPopupMenu(HMENU menu, UINT flags, int x, int y, int, HWND owner, const RECT*) {
-    if (menuFrom(menu) == nullptr || !ensureGui()) {
+    if (!menuFrom(menu) || !ensureGui()) {
         return FALSE;
     }
     Tracking tracking;
     tracking.host.owner = owner;
-    tracking.host.notifies = (flags & TPM_NONOTIFY) == 0 && owner != nullptr;
+    tracking.host.notifies = (flags & TPM_NONOTIFY) == 0 && owner;
     if (tracking.host.notifies) {
         SendMessageA(owner, WM_INITMENU, reinterpret_cast<WPARAM>(menu), 0);
     }
@@ -417,12 +414,12 @@ BOOL TrackPopupMenu(HMENU menu, UINT flags, int x, int y, int, HWND owner, const
 
 HMENU GetMenu(HWND handle) {
     const Window* window = Window::from(handle);
-    return window != nullptr ? window->menu() : nullptr;
+    return window ? window->menu() : nullptr;
 }
 
 BOOL SetMenu(HWND handle, HMENU menu) {
     Window* window = Window::from(handle);
-    if (window == nullptr || window->isChild() || (menu != nullptr && menuFrom(menu) == nullptr)) {
+    if (!window || window->isChild() || (menu && !menuFrom(menu))) {
         return FALSE;
     }
     window->setMenu(menu);
@@ -430,12 +427,12 @@ BOOL SetMenu(HWND handle, HMENU menu) {
 }
 
 BOOL DrawMenuBar(HWND handle) {
-    return Window::from(handle) != nullptr ? TRUE : FALSE;
+    return Window::from(handle) ? TRUE : FALSE;
 }
 
 HMENU GetSystemMenu(HWND handle, BOOL revert) {
     const Window* window = Window::from(handle);
-    if (window == nullptr) {
+    if (!window) {
         return nullptr;
     }
     forgetEnded();
@@ -448,7 +445,7 @@ HMENU GetSystemMenu(HWND handle, BOOL revert) {
         return nullptr;
     }
     HMENU& menu = systemMenus()[key];
-    if (menuFrom(menu) == nullptr) {
+    if (!menuFrom(menu)) {
         menu = makeSystemMenu(*window);
     }
     return menu;

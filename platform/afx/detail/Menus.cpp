@@ -46,7 +46,7 @@ MenuItem makeItem(UINT flags, UINT_PTR id, LPCSTR text) {
         item.id = static_cast<UINT>(id);
     }
     const bool plain = (flags & (MF_BITMAP | MF_OWNERDRAW | MF_SEPARATOR)) == 0;
-    if (plain && text != nullptr) {
+    if (plain && text) {
         item.text = text;
     } else if (plain && (flags & MF_POPUP) == 0) {
         item.flags |= MF_SEPARATOR; // an item without a text is drawn as one
@@ -82,12 +82,12 @@ char32_t firstCharacter(const std::string& text) {
 
 MenuPlace findCommand(HMENU handle, UINT id) {
     Menu* menu = menuFrom(handle);
-    if (menu == nullptr) {
+    if (!menu) {
         return {};
     }
     for (std::size_t i = 0; i < menu->items.size(); ++i) {
         const MenuItem& item = menu->items[i];
-        if (item.popup == nullptr && item.id == id && !item.isSeparator()) {
+        if (!item.popup && item.id == id && !item.isSeparator()) {
             return {menu, i};
         }
     }
@@ -110,7 +110,7 @@ MenuPlace findItem(HMENU handle, UINT item, UINT flags) {
         return findCommand(handle, item);
     }
     Menu* menu = menuFrom(handle);
-    return menu != nullptr && item < menu->items.size() ? MenuPlace{menu, item} : MenuPlace{};
+    return menu && item < menu->items.size() ? MenuPlace{menu, item} : MenuPlace{};
 }
 
 bool contains(HMENU outer, HMENU inner) {
@@ -118,9 +118,8 @@ bool contains(HMENU outer, HMENU inner) {
         return true;
     }
     const Menu* menu = menuFrom(outer);
-    return menu != nullptr && std::any_of(menu->items.begin(), menu->items.end(), [inner](const MenuItem& item) {
-               return item.popup != nullptr && contains(item.popup, inner);
-           });
+    return menu && std::any_of(menu->items.begin(), menu->items.end(),
+                               [inner](const MenuItem& item) { return item.popup && contains(item.popup, inner); });
 }
 
 char32_t accessKey(const std::string& text) {
@@ -180,7 +179,7 @@ BOOL DestroyMenu(HMENU handle) {
         return FALSE;
     }
     for (const MenuItem& item : menu->items) {
-        if (item.popup != nullptr) {
+        if (item.popup) {
             DestroyMenu(item.popup);
         }
     }
@@ -189,7 +188,7 @@ BOOL DestroyMenu(HMENU handle) {
 }
 
 BOOL IsMenu(HMENU menu) {
-    return menuFrom(menu) != nullptr ? TRUE : FALSE;
+    return menuFrom(menu) ? TRUE : FALSE;
 }
 
 // --- items ---
@@ -201,7 +200,7 @@ BOOL AppendMenuA(HMENU menu, UINT flags, UINT_PTR id, LPCSTR text) {
 BOOL InsertMenuA(HMENU handle, UINT position, UINT flags, UINT_PTR id, LPCSTR text) {
     Menu* menu = menuFrom(handle);
     const auto popup = (flags & MF_POPUP) != 0 ? reinterpret_cast<HMENU>(id) : nullptr;
-    if (menu == nullptr || ((flags & MF_POPUP) != 0 && (menuFrom(popup) == nullptr || contains(popup, handle)))) {
+    if (!menu || ((flags & MF_POPUP) != 0 && (!menuFrom(popup) || contains(popup, handle)))) {
         return FALSE;
     }
     MenuPlace place = findItem(handle, position, flags);
@@ -221,12 +220,12 @@ BOOL ModifyMenuA(HMENU handle, UINT position, UINT flags, UINT_PTR id, LPCSTR te
     }
     MenuItem item = makeItem(flags, id, text);
     const HMENU old = place.item().popup;
-    if (item.popup != nullptr && item.popup != old && contains(item.popup, handle)) {
+    if (item.popup && item.popup != old && contains(item.popup, handle)) {
         return FALSE;
     }
     place.item() = std::move(item);
     const HMENU changed = place.menu->handle;
-    if (old != nullptr && old != place.item().popup) {
+    if (old && old != place.item().popup) {
         DestroyMenu(old);
     }
     tellMenuChanged(changed);
@@ -250,7 +249,7 @@ BOOL DeleteMenu(HMENU handle, UINT position, UINT flags) {
     }
     const HMENU popup = place.item().popup;
     RemoveMenu(handle, position, flags);
-    if (popup != nullptr) {
+    if (popup) {
         DestroyMenu(popup);
     }
     return TRUE;
@@ -305,7 +304,7 @@ BOOL CheckMenuRadioItem(HMENU menu, UINT first, UINT last, UINT checked, UINT fl
 
 BOOL SetMenuDefaultItem(HMENU handle, UINT item, UINT byPosition) {
     Menu* menu = menuFrom(handle);
-    if (menu == nullptr) {
+    if (!menu) {
         return FALSE;
     }
     const MenuPlace place = findItem(handle, item, byPosition != 0 ? MF_BYPOSITION : MF_BYCOMMAND);
@@ -334,12 +333,12 @@ BOOL SetMenuItemBitmaps(HMENU menu, UINT position, UINT flags, HBITMAP unchecked
 
 int GetMenuItemCount(HMENU handle) {
     const Menu* menu = menuFrom(handle);
-    return menu != nullptr ? static_cast<int>(menu->items.size()) : -1;
+    return menu ? static_cast<int>(menu->items.size()) : -1;
 }
 
 UINT GetMenuItemID(HMENU menu, int position) {
     const MenuPlace place = findItem(menu, static_cast<UINT>(position), MF_BYPOSITION);
-    if (!place || place.item().popup != nullptr) {
+    if (!place || place.item().popup) {
         return kNoItem;
     }
     return place.item().isSeparator() ? 0 : place.item().id;
@@ -351,7 +350,7 @@ UINT GetMenuState(HMENU menu, UINT item, UINT flags) {
         return kNoItem;
     }
     const MenuItem& found = place.item();
-    if (found.popup == nullptr) {
+    if (!found.popup) {
         return found.flags;
     }
     const auto count = static_cast<UINT>(std::max(0, GetMenuItemCount(found.popup)));
@@ -361,7 +360,7 @@ UINT GetMenuState(HMENU menu, UINT item, UINT flags) {
 int GetMenuStringA(HMENU menu, UINT item, LPSTR buffer, int size, UINT flags) {
     const MenuPlace place = findItem(menu, item, flags);
     const std::string text = place ? place.item().text : std::string();
-    if (buffer == nullptr || size <= 0) {
+    if (!buffer || size <= 0) {
         return static_cast<int>(text.size());
     }
     const std::size_t room = std::min(text.size(), static_cast<std::size_t>(size) - 1);

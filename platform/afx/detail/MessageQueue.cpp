@@ -16,13 +16,13 @@ const QEvent::Type wakeType = static_cast<QEvent::Type>(QEvent::registerEventTyp
 
 bool matches(const MSG& msg, HWND window, UINT first, UINT last) {
     const bool inRange = (first == 0 && last == 0) || (msg.message >= first && msg.message <= last);
-    return inRange && (window == nullptr || msg.hwnd == window);
+    return inRange && (!window || msg.hwnd == window);
 }
 
 } // namespace
 
 MessageQueue::MessageQueue() {
-    if (QCoreApplication::instance() != nullptr) {
+    if (QCoreApplication::instance()) {
         moveToThread(QCoreApplication::instance()->thread());
     }
 }
@@ -129,13 +129,13 @@ void MessageQueue::runBatch() {
 }
 
 void MessageQueue::endLoopIfQuitting() {
-    if (isQuitting() && ModalLoop::innermost() != nullptr) {
+    if (isQuitting() && ModalLoop::innermost()) {
         ModalLoop::innermost()->quit();
     }
 }
 
 void CapturedEvent::redeliver() {
-    if (receiver == nullptr) {
+    if (!receiver) {
         return;
     }
     bool& flag = EventCapture::instance().m_redelivering;

@@ -98,7 +98,7 @@ BOOL MirrorFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
 
 bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
     const auto fail = [&](int number) {
-        if (error != nullptr) {
+        if (error) {
             error->m_cause = CFileException::ErrnoToException(number);
             error->m_lOsError = number;
             error->m_strFileName = fileName;
@@ -112,7 +112,7 @@ bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
     std::error_code ignored;
     const fs::path resolved = fs::weakly_canonical(*named, ignored);
     const fs::path target = ignored ? fs::path(*named) : resolved;
-    struct stat status {};
+    struct stat status{};
     const bool exists = ::stat(target.c_str(), &status) == 0;
     if (exists && !S_ISREG(status.st_mode)) {
         return CFile::Open(fileName, modeCreate | modeReadWrite, error) != FALSE; // a device or the like

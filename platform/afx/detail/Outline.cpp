@@ -33,11 +33,13 @@ std::span<const int> dashPattern(UINT style) {
 constexpr int kDashPeriod = 24;
 
 bool isOn(std::span<const int> pattern, int phase) {
-    if (pattern.empty())
+    if (pattern.empty()) {
         return true;
+    }
     std::size_t part = 0;
-    for (phase %= kDashPeriod; phase >= pattern[part % pattern.size()]; ++part)
+    for (phase %= kDashPeriod; phase >= pattern[part % pattern.size()]; ++part) {
         phase -= pattern[part % pattern.size()];
+    }
     return part % 2 == 0;
 }
 
@@ -54,10 +56,12 @@ Outline::Outline(const DeviceContext& context, Canvas& canvas)
       ink_(context.penInk()),
       style_(context.state.pen->description.lopnStyle),
       width_(deviceWidth(context)) {
-    if (isWide() && style_ != PS_INSIDEFRAME)
+    if (isWide() && style_ != PS_INSIDEFRAME) {
         style_ = PS_SOLID;
-    if (ink_ && context.state.backMode == OPAQUE)
+    }
+    if (ink_ && context.state.backMode == OPAQUE) {
         gap_ = context.ink(context.state.backColor, ink_->rop);
+    }
 }
 
 void Outline::addPixel(QPoint point, int phase) {
@@ -66,8 +70,9 @@ void Outline::addPixel(QPoint point, int phase) {
 
 void Outline::plotPixels() {
     canvas_.plot(on_, *ink_);
-    if (gap_)
+    if (gap_) {
         canvas_.plot(off_, *gap_);
+    }
     on_.clear();
     off_.clear();
 }
@@ -94,8 +99,9 @@ void Outline::wide(const QPainterPath& path) {
 }
 
 void Outline::line(const QPolygon& points, LastPoint last) {
-    if (!ink_ || points.isEmpty())
+    if (!ink_ || points.isEmpty()) {
         return;
+    }
     if (isWide()) {
         QPainterPath path;
         path.addPolygon(QPolygonF(points));
@@ -103,14 +109,16 @@ void Outline::line(const QPolygon& points, LastPoint last) {
         return;
     }
     thin(points);
-    if (last == LastPoint::drawn)
+    if (last == LastPoint::drawn) {
         addPixel(points.last(), phase_);
+    }
     plotPixels();
 }
 
 void Outline::closed(const QPolygon& points) {
-    if (!ink_ || points.isEmpty())
+    if (!ink_ || points.isEmpty()) {
         return;
+    }
     if (isWide()) {
         QPainterPath path;
         path.addPolygon(QPolygonF(points));
@@ -124,20 +132,23 @@ void Outline::closed(const QPolygon& points) {
 }
 
 void Outline::rectangle(const QRect& box) {
-    if (isWide())
+    if (isWide()) {
         rounded(box, {}, {});
-    else if (box.width() == 1 || box.height() == 1)
+    } else if (box.width() == 1 || box.height() == 1) {
         line(QPolygon({box.topLeft(), box.bottomRight()}), LastPoint::drawn);
-    else
+    } else {
         closed(QPolygon({box.topLeft(), box.topRight(), box.bottomRight(), box.bottomLeft()}));
+    }
 }
 
 void Outline::rounded(const QRect& box, QSize corner, const Spans& rows) {
-    if (!ink_ || box.isEmpty())
+    if (!ink_ || box.isEmpty()) {
         return;
+    }
     if (!isWide()) {
-        for (const QPoint& point : outlineOf(rows))
+        for (const QPoint& point : outlineOf(rows)) {
             addPixel(point, phase_++);
+        }
         plotPixels();
         return;
     }

@@ -43,7 +43,7 @@ QWidget& Placement::widget() const {
 
 QMargins Placement::borders() const {
     const QWindow* native = widget().isWindow() ? widget().windowHandle() : nullptr;
-    return native != nullptr ? native->frameMargins() : QMargins();
+    return native ? native->frameMargins() : QMargins();
 }
 
 bool Placement::isNormal() const {
@@ -124,7 +124,7 @@ QRect Placement::restored() const {
 
 void Placement::aboutToShow() {
     QWindow* native = widget().windowHandle();
-    if (!m_wish || widget().isVisible() || native == nullptr || native->handle() == nullptr) {
+    if (!m_wish || widget().isVisible() || !native || !native->handle()) {
         return;
     }
     // A window that exists already would be put with its inside at the place. The toolkit leaves it alone when it
@@ -138,7 +138,7 @@ void Placement::changed() {
 }
 
 void Placement::settle() {
-    if (m_window.isDestroyed() || m_window.widget() == nullptr || !widget().isVisible()) {
+    if (m_window.isDestroyed() || !m_window.widget() || !widget().isVisible()) {
         return;
     }
     if (!isNormal()) {
@@ -179,7 +179,7 @@ void Placement::grant() {
 }
 
 void Placement::lookBack() {
-    if (!m_wish || m_window.isDestroyed() || m_window.widget() == nullptr || !isNormal()) {
+    if (!m_wish || m_window.isDestroyed() || !m_window.widget() || !isNormal()) {
         return;
     }
     const bool done = !awaitsBorders() && m_wish->attempts > 0 && wishedFrame() == frameRect();
@@ -192,7 +192,7 @@ void Placement::lookBack() {
 }
 
 void Placement::remember() {
-    if (m_wish || m_window.isDestroyed() || m_window.widget() == nullptr) {
+    if (m_wish || m_window.isDestroyed() || !m_window.widget()) {
         return;
     }
     const QRect now = m_window.windowRect();

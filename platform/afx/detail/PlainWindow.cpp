@@ -57,7 +57,7 @@ std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs) {
 }
 
 bool eraseBackground(Window& window, HDC dc) {
-    if (window.classBrush == nullptr) {
+    if (!window.classBrush) {
         return false;
     }
     const QRect area = window.clientRect();
@@ -77,7 +77,7 @@ QWidget* PlainWindow::makeWidget(QWidget* parent) {
 }
 
 QWidget* PlainWindow::clientWidget() const {
-    return widget() != nullptr ? m_area->viewport() : nullptr;
+    return widget() ? m_area->viewport() : nullptr;
 }
 
 void PlainWindow::applyStyle() {
@@ -187,7 +187,7 @@ private:
     /// Menus tell of their items by WM_MENUSELECT.
     void showTip(const QString& tip) {
         const Window* window = Window::of(this);
-        if (window == nullptr || menuHasKeyboard()) {
+        if (!window || menuHasKeyboard()) {
             return;
         }
         const std::string text = fromQt(tip);
@@ -217,7 +217,7 @@ TopLevelWindow::~TopLevelWindow() {
 }
 
 QWidget* TopLevelWindow::makeWidget(QWidget*) {
-    QWidget* over = owner() != nullptr ? owner()->widget() : nullptr;
+    QWidget* over = owner() ? owner()->widget() : nullptr;
     QMainWindow* frame = makeMainWidget(over, windowFlags(style(), exStyle()));
     frame->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
     if ((style() & WS_OVERLAPPEDWINDOW) == WS_OVERLAPPEDWINDOW) {
@@ -229,17 +229,17 @@ QWidget* TopLevelWindow::makeWidget(QWidget*) {
 void TopLevelWindow::widgetMade() {
     widget()->setWindowTitle(Window::text());
     iconChanged();
-    if (m_menu != nullptr) {
+    if (m_menu) {
         setMenu(m_menu);
     }
 }
 
 QString TopLevelWindow::text() const {
-    return widget() != nullptr ? widget()->windowTitle() : Window::text();
+    return widget() ? widget()->windowTitle() : Window::text();
 }
 
 void TopLevelWindow::iconChanged() {
-    const QImage image = iconImage(bigIcon != nullptr ? bigIcon : smallIcon);
+    const QImage image = iconImage(bigIcon ? bigIcon : smallIcon);
     if (!image.isNull()) {
         widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
     }
@@ -249,11 +249,11 @@ void TopLevelWindow::setMenu(HMENU menu) {
     m_menu = menu;
     auto* bar = dynamic_cast<FrameMenuBar*>(mainWindow()->menuWidget());
     guarded([&] {
-        if (bar == nullptr && menu != nullptr) {
+        if (!bar && menu) {
             bar = new FrameMenuBar(handle(), mainWindow());
             mainWindow()->setMenuBar(bar);
         }
-        if (bar != nullptr) {
+        if (bar) {
             bar->setMenu(menu);
             bar->setVisible(menu != nullptr);
         }
@@ -268,7 +268,7 @@ QMainWindow* TopLevelWindow::mainWindow() const {
 QRect frameClientRect(const QMainWindow& main) {
     QRect area = main.contentsRect();
     const QWidget* bar = main.menuWidget();
-    if (bar != nullptr && !bar->isHidden()) {
+    if (bar && !bar->isHidden()) {
         const int height = bar->hasHeightForWidth() ? bar->heightForWidth(area.width()) : bar->sizeHint().height();
         area.setTop(area.top() + height);
     }
@@ -276,7 +276,7 @@ QRect frameClientRect(const QMainWindow& main) {
 }
 
 void TopLevelWindow::setWindowRect(const QRect& rect) {
-    if (placement() != nullptr) {
+    if (placement()) {
         placement()->moveFrame(rect, Measured::Frame);
     } else {
         Window::setWindowRect(rect);
@@ -284,7 +284,7 @@ void TopLevelWindow::setWindowRect(const QRect& rect) {
 }
 
 QRect TopLevelWindow::clientRect() const {
-    return widget() != nullptr ? frameClientRect(*mainWindow()) : QRect();
+    return widget() ? frameClientRect(*mainWindow()) : QRect();
 }
 
 void TopLevelWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
@@ -316,7 +316,7 @@ void TopLevelWindow::applySizeLimits() {
 
 void showTopLevel(Window& window, int command) {
     QWidget& widget = *window.widget();
-    if (command != SW_HIDE && window.placement() != nullptr) {
+    if (command != SW_HIDE && window.placement()) {
         window.placement()->aboutToShow();
     }
     const bool activate = command != SW_SHOWNOACTIVATE && command != SW_SHOWNA && command != SW_SHOWMINNOACTIVE;
@@ -365,10 +365,10 @@ void TopLevelWindow::show(int command) {
         }
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
-    if (from(self) != nullptr) {
+    if (from(self)) {
         guarded([&] { showTopLevel(*this, command); });
     }
-    if (from(self) != nullptr) {
+    if (from(self)) {
         tellGeometry();
     }
 }
@@ -384,7 +384,7 @@ LRESULT TopLevelWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
     case WM_ERASEBKGND:
         return eraseBackground(*this, reinterpret_cast<HDC>(wParam)) ? TRUE : FALSE;
     case WM_PAINT:
-        if (classBrush == nullptr) {
+        if (!classBrush) {
             passEvent(*this, message);
         } else {
             PAINTSTRUCT paint;

@@ -50,8 +50,9 @@ namespace {
 
 /// How many pixels each end of row `row` of an ellipse of `size` lies inside the box.
 int ellipseInset(QSize size, int row) {
-    if (row == (size.height() - 1) / 2 || row == size.height() / 2)
+    if (row == (size.height() - 1) / 2 || row == size.height() / 2) {
         return 0; // the middle touches the box, however flat the ellipse is
+    }
     const double width = size.width();
     const double height = size.height();
     const double y = (2.0 * row + 1.0 - height) / height;
@@ -68,17 +69,19 @@ Spans ellipseSpans(const QRect& box) {
 
 Spans roundRectSpans(const QRect& box, QSize corner) {
     Spans rows;
-    if (box.isEmpty())
+    if (box.isEmpty()) {
         return rows;
+    }
     corner = corner.boundedTo(box.size());
     const int straight = box.height() - corner.height();
     rows.reserve(static_cast<std::size_t>(box.height()));
     for (int row = 0; row < box.height(); ++row) {
         int inset = 0;
-        if (!corner.isEmpty() && row < corner.height() / 2)
+        if (!corner.isEmpty() && row < corner.height() / 2) {
             inset = ellipseInset(corner, row);
-        else if (!corner.isEmpty() && row >= corner.height() / 2 + straight)
+        } else if (!corner.isEmpty() && row >= corner.height() / 2 + straight) {
             inset = ellipseInset(corner, row - straight);
+        }
         rows.push_back({box.top() + row, box.left() + inset, box.right() + 1 - inset});
     }
     return rows;
@@ -86,22 +89,26 @@ Spans roundRectSpans(const QRect& box, QSize corner) {
 
 std::vector<QPoint> framePixels(const QRect& box, const QRect& bounds) {
     std::vector<QPoint> pixels;
-    if (box.isEmpty())
+    if (box.isEmpty()) {
         return pixels;
+    }
     const QRect inside = box & bounds;
     const auto add = [&](QPoint point) {
-        if (bounds.contains(point))
+        if (bounds.contains(point)) {
             pixels.push_back(point);
+        }
     };
     for (int x = inside.left(); x <= inside.right(); ++x) {
         add({x, box.top()});
-        if (box.height() > 1)
+        if (box.height() > 1) {
             add({x, box.bottom()});
+        }
     }
     for (int y = std::max(inside.top(), box.top() + 1); y <= std::min(inside.bottom(), box.bottom() - 1); ++y) {
         add({box.left(), y});
-        if (box.width() > 1)
+        if (box.width() > 1) {
             add({box.right(), y});
+        }
     }
     return pixels;
 }
@@ -116,20 +123,24 @@ public:
     std::vector<QPoint> walk() {
         const int last = static_cast<int>(rows_.size()) - 1;
         run(rows_.front().y, rows_.front().left, rows_.front().right - 1);
-        for (int row = 1; row < last; ++row)
+        for (int row = 1; row < last; ++row) {
             rightEnd(row);
-        if (last > 0)
+        }
+        if (last > 0) {
             run(rows_.back().y, rows_.back().right - 1, rows_.back().left);
-        for (int row = last - 1; row > 0; --row)
+        }
+        for (int row = last - 1; row > 0; --row) {
             leftEnd(row);
+        }
         return std::move(outline_);
     }
 
 private:
     void run(int y, int from, int to) {
         const int step = from <= to ? 1 : -1;
-        for (int x = from; x != to + step; x += step)
+        for (int x = from; x != to + step; x += step) {
             outline_.emplace_back(x, y);
+        }
     }
     [[nodiscard]] const Span& row(int index) const {
         return rows_[static_cast<std::size_t>(index)];
@@ -138,21 +149,24 @@ private:
         const int end = row(index).right - 1;
         const int above = row(index - 1).right;
         const int below = row(index + 1).right;
-        if (above <= end)
+        if (above <= end) {
             run(row(index).y, above, end);
-        else
+        } else {
             run(row(index).y, end, std::min(end, below));
+        }
     }
     void leftEnd(int index) {
         const Span& span = row(index);
-        if (span.right - span.left == 1)
+        if (span.right - span.left == 1) {
             return; // the right side had it
+        }
         const int above = row(index - 1).left - 1;
         const int below = row(index + 1).left - 1;
-        if (below >= span.left)
+        if (below >= span.left) {
             run(span.y, below, span.left);
-        else
+        } else {
             run(span.y, span.left, std::max(span.left, above));
+        }
     }
 
     const Spans& rows_;
@@ -186,11 +200,13 @@ std::vector<Edge> edgesOf(std::span<const QPolygonF> polygons) {
         for (qsizetype i = 0; i < polygon.size(); ++i) {
             QPointF from = polygon[i];
             QPointF to = polygon[(i + 1) % polygon.size()];
-            if (from.y() == to.y())
+            if (from.y() == to.y()) {
                 continue;
+            }
             const int direction = from.y() < to.y() ? 1 : -1;
-            if (direction < 0)
+            if (direction < 0) {
                 std::swap(from, to);
+            }
             edges.push_back({from.y(), to.y(), from.x(), (to.x() - from.x()) / (to.y() - from.y()), direction});
         }
     }
@@ -213,12 +229,14 @@ void appendRow(Spans& spans, int y, std::span<const Crossing> crossings, FillRul
         winding += rule == FillRule::winding ? crossings[i].direction : (winding ? -1 : 1);
         const int left = firstPixel(crossings[i].x, bounds);
         const int right = firstPixel(crossings[i + 1].x, bounds);
-        if (winding == 0 || left >= right)
+        if (winding == 0 || left >= right) {
             continue;
-        if (!spans.empty() && spans.back().y == y && spans.back().right == left)
+        }
+        if (!spans.empty() && spans.back().y == y && spans.back().right == left) {
             spans.back().right = right;
-        else
+        } else {
             spans.push_back({y, left, right});
+        }
     }
 }
 
@@ -232,14 +250,17 @@ Spans polygonSpans(std::span<const QPolygonF> polygons, FillRule rule, const QRe
     std::size_t next = 0;
     for (int y = bounds.top(); y <= bounds.bottom(); ++y) {
         const double middle = y + 0.5;
-        while (next < edges.size() && edges[next].top <= middle)
+        while (next < edges.size() && edges[next].top <= middle) {
             active.push_back(&edges[next++]);
+        }
         std::erase_if(active, [&](const Edge* edge) { return edge->bottom <= middle; });
-        if (active.empty() && next == edges.size())
+        if (active.empty() && next == edges.size()) {
             break;
+        }
         crossings.clear();
-        for (const Edge* edge : active)
+        for (const Edge* edge : active) {
             crossings.push_back({edge->at(middle), edge->direction});
+        }
         std::ranges::sort(crossings, {}, &Crossing::x);
         appendRow(spans, y, crossings, rule, bounds);
     }

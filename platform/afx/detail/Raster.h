@@ -59,8 +59,9 @@ private:
 
 template <class Plot>
 void LinePixels::forEach(Range range, Plot plot) const {
-    if (range.first >= range.last)
+    if (range.first >= range.last) {
         return;
+    }
     // The rest of the division that `at` does, carried on from pixel to pixel.
     const QPoint start = at(range.first) - from_;
     const std::int64_t whole = 2 * std::int64_t{count_};

@@ -43,14 +43,18 @@ constexpr Rop2 rop2FromRop3(Rop3 rop) {
 constexpr Pixel combine(Rop2 rop, Pixel pen, Pixel destination) {
     const auto table = static_cast<unsigned>(rop);
     Pixel result = kOpaque;
-    if (table & 1)
+    if (table & 1) {
         result |= ~pen & ~destination;
-    if (table & 2)
+    }
+    if (table & 2) {
         result |= ~pen & destination;
-    if (table & 4)
+    }
+    if (table & 4) {
         result |= pen & ~destination;
-    if (table & 8)
+    }
+    if (table & 8) {
         result |= pen & destination;
+    }
     return result;
 }
 

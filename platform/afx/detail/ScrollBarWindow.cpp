@@ -52,7 +52,7 @@ QWidget* ScrollBarWindow::makeWidget(QWidget* parent) {
     QObject::connect(bar, &QScrollBar::sliderReleased, bar, [this, bar] {
         const HWND self = handle();
         tell(SB_THUMBPOSITION, bar->sliderPosition());
-        if (from(self) != nullptr) {
+        if (from(self)) {
             tell(SB_ENDSCROLL, 0);
         }
     });
@@ -65,7 +65,7 @@ QScrollBar* ScrollBarWindow::bar() const {
 
 void ScrollBarWindow::tell(int code, int position) {
     armIdle();
-    if (parent() != nullptr) {
+    if (parent()) {
         const UINT message = (style() & SBS_VERT) != 0 ? WM_VSCROLL : WM_HSCROLL;
         SendMessageA(parent()->handle(), message, MAKEWPARAM(code, position), reinterpret_cast<LPARAM>(handle()));
     }

@@ -58,7 +58,7 @@ void StaticWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 
 void StaticWindow::setText(const QString& text) {
     Control::setText(text);
-    if (widget() != nullptr) {
+    if (widget()) {
         widget()->setAccessibleName(text);
         widget()->update();
     }
@@ -187,7 +187,7 @@ void StaticWindow::paintByOwner(QPainter& painter) {
     item.rcItem = fromQt(widget()->rect());
     item.itemState = isEnabled() ? 0 : ODS_DISABLED;
     drawing.draw(item);
-    if (from(self) != nullptr) {
+    if (from(self)) {
         painter.drawImage(0, 0, drawing.image());
     }
 }

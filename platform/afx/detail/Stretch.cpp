@@ -50,18 +50,22 @@ public:
     void add(Pixel pixel) {
         all_ &= pixel;
         any_ |= pixel;
-        for (int channel = 0; channel < 3; ++channel)
+        for (int channel = 0; channel < 3; ++channel) {
             sums_[channel] += (pixel >> (8 * channel)) & 0xFF;
+        }
         ++count_;
     }
     [[nodiscard]] Pixel result() const {
-        if (mode_ == BLACKONWHITE)
+        if (mode_ == BLACKONWHITE) {
             return kOpaque | all_;
-        if (mode_ == WHITEONBLACK)
+        }
+        if (mode_ == WHITEONBLACK) {
             return kOpaque | any_;
+        }
         Pixel mean = kOpaque;
-        for (int channel = 0; channel < 3; ++channel)
+        for (int channel = 0; channel < 3; ++channel) {
             mean |= static_cast<Pixel>((sums_[channel] + count_ / 2) / count_) << (8 * channel);
+        }
         return mean;
     }
 
@@ -76,8 +80,9 @@ private:
 Pixel combinedPixel(const PartReader& reader, StretchAxis::Range columns, StretchAxis::Range rows, int mode) {
     PixelSum sum(mode);
     for (int y = rows.first; y <= rows.last; ++y) {
-        for (int x = columns.first; x <= columns.last; ++x)
+        for (int x = columns.first; x <= columns.last; ++x) {
             sum.add(reader.at(x, y));
+        }
     }
     return sum.result();
 }

@@ -38,8 +38,9 @@ std::vector<std::string_view> paragraphs(std::string_view text) {
     while (true) {
         const std::size_t end = text.find_first_of("\r\n");
         all.push_back(text.substr(0, end));
-        if (end == std::string_view::npos)
+        if (end == std::string_view::npos) {
             return all;
+        }
         text.remove_prefix(end + (text.substr(end, 2) == "\r\n" ? 2 : 1));
     }
 }
@@ -66,8 +67,9 @@ private:
         for (std::size_t end = at; end < text.size();) {
             end = std::min(text.find(' ', std::min(text.find_first_not_of(' ', end), text.size())), text.size());
             const std::string_view line = std::string_view(text).substr(at, end - at);
-            if (layoutWidth(dc_, line, style_) > style_.width && fitting != std::string::npos)
+            if (layoutWidth(dc_, line, style_) > style_.width && fitting != std::string::npos) {
                 return fitting;
+            }
             fitting = end;
         }
         return text.size();
@@ -88,8 +90,9 @@ private:
 };
 
 void dropMnemonicBeyond(LayoutLine& line, std::size_t kept) {
-    if (line.mnemonic != std::string::npos && line.mnemonic + line.mnemonicLength > kept)
+    if (line.mnemonic != std::string::npos && line.mnemonic + line.mnemonicLength > kept) {
         line.mnemonic = std::string::npos;
+    }
 }
 
 /// Cuts characters off the end until the rest fits with an ellipsis; one character stays in any case.
@@ -124,8 +127,9 @@ int layoutWidth(const CDC& dc, std::string_view text, const TextLayoutStyle& sty
     const auto size = static_cast<int>(text.size());
     // The size goes along, so nothing depends on a zero behind the text.
     // NOLINTBEGIN(bugprone-suspicious-stringview-data-usage)
-    if ((style.format & DT_EXPANDTABS) == 0)
+    if ((style.format & DT_EXPANDTABS) == 0) {
         return dc.GetTextExtent(text.data(), size).cx;
+    }
     return dc.GetTabbedTextExtent(text.data(), size, 1, &style.tabWidth).cx;
     // NOLINTEND(bugprone-suspicious-stringview-data-usage)
 }
@@ -142,10 +146,11 @@ TextLayout layOutText(const CDC& dc, std::string_view text, const TextLayoutStyl
         layout.lines.insert(layout.lines.end(), lines.begin(), lines.end());
     }
     for (LayoutLine& line : layout.lines) {
-        if (style.format & DT_PATH_ELLIPSIS)
+        if (style.format & DT_PATH_ELLIPSIS) {
             shortenPath(line, dc, style);
-        else if (style.format & (DT_END_ELLIPSIS | DT_WORD_ELLIPSIS))
+        } else if (style.format & (DT_END_ELLIPSIS | DT_WORD_ELLIPSIS)) {
             shortenEnd(line, dc, style);
+        }
         line.width = layoutWidth(dc, line.text, style);
     }
     return layout;

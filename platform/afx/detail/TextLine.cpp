@@ -17,8 +17,9 @@ QString shownText(std::string_view text) {
     constexpr char32_t kStrayByte = 0xDC00;
     for (std::size_t at = 0; at < text.size();) {
         char32_t character = tvx::text::decode(text, at);
-        if (character >= kStrayByte + 0x80 && character <= kStrayByte + 0xFF)
+        if (character >= kStrayByte + 0x80 && character <= kStrayByte + 0xFF) {
             character -= kStrayByte;
+        }
         shown += QString::fromUcs4(&character, 1);
     }
     return shown;
@@ -35,8 +36,9 @@ void TextLine::setAdvances(std::vector<int> advances) {
 }
 
 int TextLine::width() const {
-    if (!advances_.empty())
+    if (!advances_.empty()) {
         return std::accumulate(advances_.begin(), advances_.end(), 0);
+    }
     return font_.metrics.horizontalAdvance(text_);
 }
 
@@ -53,13 +55,15 @@ void TextLine::fillBackground(Canvas& canvas, QPoint left, const Ink& ink) const
 }
 
 void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
-    if (text_.isEmpty() || canvas.clip.isEmpty())
+    if (text_.isEmpty() || canvas.clip.isEmpty()) {
         return;
+    }
     QPainter painter(canvas.image);
     painter.setClipRegion(canvas.clip.translated(canvas.origin));
     QFont font = font_.font;
-    if (canvas.format == PixelFormat::monochrome)
+    if (canvas.format == PixelFormat::monochrome) {
         font.setStyleStrategy(static_cast<QFont::StyleStrategy>(QFont::NoAntialias | QFont::PreferNoShaping));
+    }
     painter.setFont(font);
     painter.setPen(QColor::fromRgb(color));
     painter.translate(left + canvas.origin);
@@ -82,16 +86,18 @@ void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
 }
 
 TabStops::TabStops(int count, const int* stops, int averageWidth) : every_(std::max(1, 8 * averageWidth)) {
-    if (count == 1 && stops && stops[0] != 0)
+    if (count == 1 && stops && stops[0] != 0) {
         every_ = std::abs(stops[0]);
-    else if (count > 1 && stops)
+    } else if (count > 1 && stops) {
         stops_.assign(stops, stops + count);
+    }
 }
 
 int TabStops::after(int x) const {
     const auto stop = std::ranges::find_if(stops_, [x](int stop) { return std::abs(stop) > x; });
-    if (stop != stops_.end())
+    if (stop != stops_.end()) {
         return std::abs(*stop);
+    }
     const int whole = x >= 0 ? x / every_ : (x - every_ + 1) / every_;
     return (whole + 1) * every_;
 }

@@ -31,7 +31,7 @@ public:
     }
 
     UINT_PTR start(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback) {
-        if (window == nullptr) {
+        if (!window) {
             id = find(window, id) != m_timers.end() ? id : ++m_lastId;
         }
         stop(window, id);
@@ -96,7 +96,7 @@ void forgetTimers(HWND window) {
 using namespace tvx::afx;
 
 UINT_PTR SetTimer(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback) {
-    if (!ensureGui() || (window != nullptr && Window::from(window) == nullptr)) {
+    if (!ensureGui() || (window && !Window::from(window))) {
         return 0;
     }
     return Timers::instance().start(window, id, elapse, callback);

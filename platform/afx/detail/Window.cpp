@@ -68,7 +68,7 @@ const WindowClass* findWindowClass(const char* name) {
 }
 
 QString toQt(const char* text) {
-    const std::string_view bytes = text != nullptr ? text : "";
+    const std::string_view bytes = text ? text : "";
     return text::isWellFormed(bytes) ? QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()))
                                      : QString::fromStdU16String(text::widen16(bytes));
 }
@@ -79,7 +79,7 @@ std::string fromQt(const QString& text) {
 
 QWidget* peerOf(HWND handle) {
     const Window* window = Window::from(handle);
-    return window != nullptr ? window->clientWidget() : nullptr;
+    return window ? window->clientWidget() : nullptr;
 }
 
 // --- creation ---
@@ -93,7 +93,7 @@ Window::Window(const CREATESTRUCT& cs)
     if (isChild()) {
         m_parent = other;
         m_id = static_cast<int>(reinterpret_cast<std::intptr_t>(cs.hMenu));
-    } else if (other != nullptr) {
+    } else if (other) {
         m_owner = other->topLevel();
     }
 }
@@ -101,7 +101,7 @@ Window::Window(const CREATESTRUCT& cs)
 Window::~Window() = default;
 
 void Window::realize(const CREATESTRUCT& cs) {
-    m_widget = makeWidget(m_parent != nullptr ? m_parent->childHost() : nullptr);
+    m_widget = makeWidget(m_parent ? m_parent->childHost() : nullptr);
     if (!m_widget->isWindow()) {
         m_widget->hide(); // else it would come up with its parent
     }
@@ -109,7 +109,7 @@ void Window::realize(const CREATESTRUCT& cs) {
     m_handle = newHandle(*m_widget, !isChild());
     tables().byHandle[reinterpret_cast<std::uintptr_t>(m_handle)] = this;
     tables().byWidget[m_widget] = this;
-    if (m_parent != nullptr) {
+    if (m_parent) {
         m_parent->m_children.push_back(this);
     } else {
         tables().topLevels.push_back(this);
@@ -141,16 +141,16 @@ bool Window::start(const CREATESTRUCT& cs) {
     const HWND handle = m_handle;
     const auto parameter = reinterpret_cast<LPARAM>(&cs);
     if (call(WM_CREATE, 0, parameter) == -1) {
-        if (from(handle) != nullptr) {
+        if (from(handle)) {
             destroy();
         }
         return false;
     }
-    if (from(handle) != nullptr) {
+    if (from(handle)) {
         m_creating = false;
         tellGeometry();
     }
-    if (from(handle) != nullptr && (m_style & WS_VISIBLE) != 0) {
+    if (from(handle) && (m_style & WS_VISIBLE) != 0) {
         show((m_style & WS_MAXIMIZE) != 0 ? SW_SHOWMAXIMIZED : SW_SHOW);
     }
     return from(handle) != nullptr;
@@ -158,28 +158,28 @@ bool Window::start(const CREATESTRUCT& cs) {
 
 HWND createWindow(const CREATESTRUCT& cs, CWnd* object, bool* stood) {
     const WindowClass* windowClass = findWindowClass(cs.lpszClass);
-    if (windowClass != nullptr && !ensureGui()) {
+    if (windowClass && !ensureGui()) {
         tellMissingDisplay();
     }
-    if (windowClass == nullptr || !ensureGui()) {
-        SetLastError(windowClass == nullptr ? ERROR_CANNOT_FIND_WND_CLASS : ERROR_INVALID_WINDOW_HANDLE);
+    if (!windowClass || !ensureGui()) {
+        SetLastError(!windowClass ? ERROR_CANNOT_FIND_WND_CLASS : ERROR_INVALID_WINDOW_HANDLE);
         return nullptr;
     }
-    if ((cs.style & WS_CHILD) != 0 && Window::from(cs.hwndParent) == nullptr) {
+    if ((cs.style & WS_CHILD) != 0 && !Window::from(cs.hwndParent)) {
         SetLastError(ERROR_INVALID_WINDOW_HANDLE);
         return nullptr;
     }
-    const WindowFactory factory = windowClass->factory != nullptr ? windowClass->factory : &makePlainWindow;
+    const WindowFactory factory = windowClass->factory ? windowClass->factory : &makePlainWindow;
     Window* window = factory(cs).release();
     window->classCursor = windowClass->cursor;
     window->classBrush = windowClass->background;
     window->bigIcon = windowClass->icon;
     guarded([&] { window->realize(cs); });
-    if (object != nullptr) {
+    if (object) {
         object->PreSubclassWindow();
         object->Attach(window->handle());
     }
-    if (stood != nullptr) {
+    if (stood) {
         *stood = true;
     }
     const HWND handle = window->handle();
@@ -196,7 +196,7 @@ Window* Window::from(HWND handle) {
 
 Window* Window::of(const QObject* object) {
     const auto& table = tables().byWidget;
-    while (object != nullptr && object->isWidgetType()) {
+    while (object && object->isWidgetType()) {
         const auto found = table.find(object);
         if (found != table.end()) {
             return found->second;
@@ -215,7 +215,7 @@ const std::vector<Window*>& Window::topLevels() {
 
 Window* Window::topLevel() {
     Window* window = this;
-    while (window->m_parent != nullptr) {
+    while (window->m_parent) {
         window = window->m_parent;
     }
     return window;
@@ -228,7 +228,7 @@ Window* Window::child(int id) const {
 }
 
 void Window::placeAfter(Window* after) {
-    if (m_parent == nullptr) {
+    if (!m_parent) {
         return;
     }
     auto& siblings = m_parent->m_children;
@@ -238,27 +238,27 @@ void Window::placeAfter(Window* after) {
 }
 
 void Window::setParent(Window* parent) {
-    if (m_parent != nullptr) {
+    if (m_parent) {
         std::erase(m_parent->m_children, this);
     } else {
         std::erase(tables().topLevels, this);
     }
     m_parent = parent;
-    const bool shown = m_widget != nullptr && !m_widget->isHidden();
+    const bool shown = m_widget && !m_widget->isHidden();
     const QRect place = m_widget->geometry();
     guarded([&] {
-        m_widget->setParent(parent != nullptr ? parent->childHost() : nullptr);
+        m_widget->setParent(parent ? parent->childHost() : nullptr);
         keepPlace();
         m_widget->setGeometry(place);
         m_widget->setVisible(shown);
     });
-    (parent != nullptr ? parent->m_children : tables().topLevels).push_back(this);
+    (parent ? parent->m_children : tables().topLevels).push_back(this);
 }
 
 // --- the attached object ---
 
 CWnd* Window::objectOrTemporary() {
-    if (m_object != nullptr) {
+    if (m_object) {
         return m_object;
     }
     if (!m_temporary) {
@@ -291,7 +291,7 @@ QWidget* Window::clientWidget() const {
 
 QRect Window::clientRect() const {
     const QWidget* client = clientWidget();
-    return client != nullptr ? client->rect() : QRect();
+    return client ? client->rect() : QRect();
 }
 
 QWidget* Window::focusWidget() const {
@@ -305,7 +305,7 @@ QWidget* Window::childHost() const {
 void Window::setStyle(DWORD style, DWORD exStyle) {
     const DWORD oldStyle = std::exchange(m_style, style);
     const DWORD oldExStyle = std::exchange(m_exStyle, exStyle);
-    if (m_widget != nullptr && (oldStyle != style || oldExStyle != exStyle)) {
+    if (m_widget && (oldStyle != style || oldExStyle != exStyle)) {
         styleChanged(oldStyle, oldExStyle);
     }
 }
@@ -318,7 +318,7 @@ void Window::iconChanged() {}
 
 void Window::setText(const QString& text) {
     m_text = text;
-    if (m_widget != nullptr && m_widget->isWindow()) {
+    if (m_widget && m_widget->isWindow()) {
         m_widget->setWindowTitle(text);
     }
 }
@@ -338,30 +338,30 @@ void Window::setEnabled(bool enabled) {
 // --- place and size ---
 
 QRect Window::windowRect() const {
-    if (m_widget == nullptr) {
+    if (!m_widget) {
         return {};
     }
     if (m_widget->isWindow()) {
-        return m_placement != nullptr ? m_placement->frameRect() : m_widget->frameGeometry();
+        return m_placement ? m_placement->frameRect() : m_widget->frameGeometry();
     }
-    const QPoint origin = m_parent != nullptr ? m_parent->clientRect().topLeft() : QPoint();
+    const QPoint origin = m_parent ? m_parent->clientRect().topLeft() : QPoint();
     return m_widget->geometry().translated(-origin);
 }
 
 void Window::setWindowRect(const QRect& rect) {
-    if (m_widget == nullptr) {
+    if (!m_widget) {
         return;
     }
-    if (m_widget->isWindow() && m_placement != nullptr) {
+    if (m_widget->isWindow() && m_placement) {
         m_placement->moveFrame(rect, Measured::Client);
         return;
     }
-    const QPoint origin = m_parent != nullptr ? m_parent->clientRect().topLeft() : QPoint();
+    const QPoint origin = m_parent ? m_parent->clientRect().topLeft() : QPoint();
     m_widget->setGeometry(rect.translated(origin));
 }
 
 QRect Window::screenRect() const {
-    if (m_widget == nullptr || m_widget->isWindow()) {
+    if (!m_widget || m_widget->isWindow()) {
         return windowRect();
     }
     return {m_widget->mapToGlobal(QPoint(0, 0)), m_widget->size()};
@@ -369,16 +369,16 @@ QRect Window::screenRect() const {
 
 QPoint Window::clientToScreen(const QPoint& point) const {
     const QWidget* client = clientWidget();
-    return client != nullptr ? client->mapToGlobal(point + clientRect().topLeft()) : point;
+    return client ? client->mapToGlobal(point + clientRect().topLeft()) : point;
 }
 
 QPoint Window::screenToClient(const QPoint& point) const {
     const QWidget* client = clientWidget();
-    return client != nullptr ? client->mapFromGlobal(point) - clientRect().topLeft() : point;
+    return client ? client->mapFromGlobal(point) - clientRect().topLeft() : point;
 }
 
 void Window::show(int command) {
-    if (m_widget == nullptr) {
+    if (!m_widget) {
         return;
     }
     const bool visible = command != SW_HIDE;
@@ -388,13 +388,13 @@ void Window::show(int command) {
     if (visible != before) {
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
-    if (from(handle) != nullptr) {
+    if (from(handle)) {
         guarded([&] { m_widget->setVisible(visible); });
     }
 }
 
 bool Window::isVisible() const {
-    for (const Window* window = this; window != nullptr; window = window->m_parent) {
+    for (const Window* window = this; window; window = window->m_parent) {
         if ((window->m_style & WS_VISIBLE) == 0) {
             return false;
         }
@@ -417,10 +417,10 @@ UINT sizeState(const QWidget& widget) {
 } // namespace
 
 void Window::tellGeometry() {
-    if (m_placement != nullptr) {
+    if (m_placement) {
         m_placement->changed();
     }
-    if (m_creating || m_destroyed || m_widget == nullptr) {
+    if (m_creating || m_destroyed || !m_widget) {
         return;
     }
     const QSize size = clientRect().size();
@@ -432,7 +432,7 @@ void Window::tellGeometry() {
     if (resized) {
         call(WM_SIZE, state, MAKELPARAM(size.width(), size.height()));
     }
-    if (moved && from(handle) != nullptr) {
+    if (moved && from(handle)) {
         call(WM_MOVE, 0, MAKELPARAM(place.x(), place.y()));
     }
 }
@@ -450,7 +450,7 @@ void Window::destroy() {
         }
     }
     markDestroyed();
-    if (m_widget != nullptr && !m_widget->isHidden()) {
+    if (m_widget && !m_widget->isHidden()) {
         guarded([this] { m_widget->hide(); });
     }
     tellDestroy();
@@ -500,14 +500,14 @@ void silence(QWidget& widget) {
 } // namespace
 
 void Window::unlink() {
-    if (m_object != nullptr) {
+    if (m_object) {
         m_object->m_hWnd = nullptr;
         m_object = nullptr;
     }
     dropTemporary();
     m_placement.reset();
     tables().byHandle.erase(reinterpret_cast<std::uintptr_t>(m_handle));
-    if (m_parent != nullptr) {
+    if (m_parent) {
         std::erase(m_parent->m_children, this);
     } else {
         std::erase(tables().topLevels, this);
@@ -517,7 +517,7 @@ void Window::unlink() {
             window->m_owner = nullptr;
         }
     }
-    if (m_widget != nullptr) {
+    if (m_widget) {
         tables().byWidget.erase(m_widget);
         silence(*m_widget);
         m_widget->hide();

@@ -18,7 +18,7 @@ LRESULT Window::call(UINT message, WPARAM wParam, LPARAM lParam) {
 }
 
 LRESULT Window::deliver(UINT message, WPARAM wParam, LPARAM lParam) {
-    return m_object != nullptr ? m_object->WindowProc(message, wParam, lParam) : defaultProc(message, wParam, lParam);
+    return m_object ? m_object->WindowProc(message, wParam, lParam) : defaultProc(message, wParam, lParam);
 }
 
 LRESULT Window::textProc(UINT message, WPARAM wParam, LPARAM lParam) {
@@ -31,7 +31,7 @@ LRESULT Window::textProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return static_cast<LRESULT>(content.size());
     }
     auto* buffer = reinterpret_cast<char*>(lParam);
-    if (buffer == nullptr || wParam == 0) {
+    if (!buffer || wParam == 0) {
         return 0;
     }
     const std::size_t length = text::characterStart(content, std::min<std::size_t>(wParam - 1, content.size()));
@@ -79,7 +79,7 @@ LRESULT Window::reflect(UINT message, WPARAM wParam, LPARAM lParam) {
         control = from(reinterpret_cast<HWND>(lParam));
     }
     LRESULT result = 0;
-    if (control != nullptr && control->m_object != nullptr) {
+    if (control && control->m_object) {
         control->m_object->OnChildNotify(message, wParam, lParam, &result);
     }
     return result;
@@ -116,16 +116,16 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return TRUE;
     case WM_SETCURSOR:
         // The parent may choose for its children; the innermost class cursor is the last word.
-        if (m_parent != nullptr && SendMessageA(m_parent->m_handle, message, wParam, lParam) != 0) {
+        if (m_parent && SendMessageA(m_parent->m_handle, message, wParam, lParam) != 0) {
             return TRUE;
         }
         return showClassCursor(wParam) ? TRUE : FALSE;
     case WM_MOUSEACTIVATE:
-        return m_parent != nullptr ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : MA_ACTIVATE;
+        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : MA_ACTIVATE;
     case WM_CONTEXTMENU:
-        return m_parent != nullptr ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : 0;
+        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : 0;
     case WM_MOUSEWHEEL:
-        if (!passEvent(*this, message) && m_parent != nullptr) {
+        if (!passEvent(*this, message) && m_parent) {
             return SendMessageA(m_parent->m_handle, message, wParam, lParam);
         }
         return 0;

@@ -15,7 +15,7 @@ struct Location {
     std::string path;
     bool exists = false;
     /// What lstat says of it: a link is a link. Only when it exists.
-    struct stat state {};
+    struct stat state{};
 };
 
 /// As systemPath(), with what the look-up learned.

@@ -19,13 +19,15 @@ bool isWhite(char character) {
 class WordReader {
 public:
     explicit WordReader(std::string_view text) : m_rest(text) {
-        if (m_rest.starts_with(byteOrderMark))
+        if (m_rest.starts_with(byteOrderMark)) {
             m_rest.remove_prefix(byteOrderMark.size());
+        }
     }
 
     CommandWords read() {
-        while (skipToWord())
+        while (skipToWord()) {
             m_result.words.push_back(takeWord());
+        }
         return std::move(m_result);
     }
 
@@ -33,20 +35,22 @@ private:
     /// Skips white space and comments; whether a word follows.
     bool skipToWord() {
         while (!m_rest.empty()) {
-            if (m_rest.front() == '#')
+            if (m_rest.front() == '#') {
                 m_rest.remove_prefix(std::min(m_rest.find_first_of("\r\n"), m_rest.size()));
-            else if (isWhite(m_rest.front()))
+            } else if (isWhite(m_rest.front())) {
                 skipWhite();
-            else
+            } else {
                 return true;
+            }
         }
         return false;
     }
 
     void skipWhite() {
         const bool isPair = m_rest.starts_with("\r\n");
-        if (isLineEnd(m_rest.front()))
+        if (isLineEnd(m_rest.front())) {
             ++m_line;
+        }
         m_rest.remove_prefix(isPair ? 2 : 1);
     }
 
@@ -56,8 +60,9 @@ private:
             const std::size_t plain = std::min(m_rest.find_first_of(" \t\v\f\r\n\"'"), m_rest.size());
             word += m_rest.substr(0, plain);
             m_rest.remove_prefix(plain);
-            if (m_rest.starts_with('"') || m_rest.starts_with('\''))
+            if (m_rest.starts_with('"') || m_rest.starts_with('\'')) {
                 takeQuoted(word);
+            }
         }
         return word;
     }
@@ -69,8 +74,9 @@ private:
         word += m_rest.substr(0, end);
         const bool isClosed = end < m_rest.size() && m_rest[end] == ends[0];
         m_rest.remove_prefix(isClosed ? end + 1 : end);
-        if (!isClosed)
+        if (!isClosed) {
             m_result.unclosedLines.push_back(m_line);
+        }
     }
 
     std::string_view m_rest;

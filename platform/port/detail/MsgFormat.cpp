@@ -52,16 +52,20 @@ public:
         : m_text(text), m_width(width), m_lines(lines) {
         m_indentLength = std::min(text.find_first_not_of(L" \t"), text.size());
         int columns = 0;
-        for (std::size_t i = 0; i < m_indentLength; ++i)
+        for (std::size_t i = 0; i < m_indentLength; ++i) {
             columns = columnAfter(columns, text[i]);
-        if (columns * 2 > width)
+        }
+        if (columns * 2 > width) {
             m_indentLength = 0;
+        }
     }
 
     void run() {
-        if (m_width > 0)
-            for (std::size_t i = 0; i < m_text.size();)
+        if (m_width > 0) {
+            for (std::size_t i = 0; i < m_text.size();) {
                 i = step(i);
+            }
+        }
         emit(m_text.size());
     }
 
@@ -75,8 +79,9 @@ private:
         const wchar_t character = m_text[i];
         noteBreak(i);
         const int column = columnAfter(m_column, character);
-        if (column > m_width && m_hasWord && !isBlank(character))
+        if (column > m_width && m_hasWord && !isBlank(character)) {
             return endLine(i);
+        }
         m_column = column;
         m_hasWord = m_hasWord || !isBlank(character);
         return i + 1;
@@ -84,13 +89,15 @@ private:
 
     /// Notes where the line may end: before a blank that follows a word, and beside a wide character.
     void noteBreak(std::size_t i) {
-        if (!m_hasWord)
+        if (!m_hasWord) {
             return;
+        }
         const wchar_t character = m_text[i];
         const wchar_t before = m_text[i - 1];
         if (isBlank(character)) {
-            if (!isBlank(before))
+            if (!isBlank(before)) {
                 m_breakEnd = i;
+            }
         } else if (isBlank(before)) {
             m_breakNext = i;
         } else if ((columnsOf(character) == 2 || columnsOf(before) == 2) && columnsOf(character) > 0 &&
@@ -105,8 +112,9 @@ private:
         m_start = hasBreak ? m_breakNext : i;
         m_hasWord = false;
         m_column = 0;
-        for (std::size_t k = 0; k < m_indentLength; ++k)
+        for (std::size_t k = 0; k < m_indentLength; ++k) {
             m_column = columnAfter(m_column, m_text[k]);
+        }
         return m_start;
     }
 
@@ -132,12 +140,15 @@ private:
 } // namespace
 
 int columnsOf(wchar_t character) {
-    if (character < 0x20 || character == 0x7F)
+    if (character < 0x20 || character == 0x7F) {
         return 0;
-    if (character < 0x300)
+    }
+    if (character < 0x300) {
         return 1;
-    if (isIn(markRanges, character))
+    }
+    if (isIn(markRanges, character)) {
         return 0;
+    }
     return isIn(wideRanges, character) ? 2 : 1;
 }
 
@@ -146,8 +157,9 @@ std::vector<std::wstring> wrapText(std::wstring_view text, int width) {
     while (!text.empty()) {
         const std::size_t end = std::min(text.find(L'\n'), text.size());
         std::wstring_view line = text.substr(0, end);
-        if (line.ends_with(L'\r'))
+        if (line.ends_with(L'\r')) {
             line.remove_suffix(1);
+        }
         LineWrapper(line, width, lines).run();
         text.remove_prefix(std::min(end + 1, text.size()));
     }

@@ -14,8 +14,9 @@ constexpr std::string_view blanks = " \t\r\f\v";
 
 std::string_view trim(std::string_view text) {
     const std::size_t first = text.find_first_not_of(blanks);
-    if (first == std::string_view::npos)
+    if (first == std::string_view::npos) {
         return {};
+    }
     return text.substr(first, text.find_last_not_of(blanks) - first + 1);
 }
 
@@ -55,17 +56,20 @@ std::optional<ValueKind> kindOf(std::string_view word) {
                               {"text", ValueKind::Text},
                               {"integer", ValueKind::Integer},
                               {"real", ValueKind::Real}};
-    for (const Kind& known : kinds)
-        if (tvx::text::equalNoCase(word, known.word))
+    for (const Kind& known : kinds) {
+        if (tvx::text::equalNoCase(word, known.word)) {
             return known.kind;
+        }
+    }
     return std::nullopt;
 }
 
 std::optional<std::size_t> toCount(std::string_view text) {
     std::size_t count = 0;
     const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), count);
-    if (text.empty() || error != std::errc() || end != text.data() + text.size())
+    if (text.empty() || error != std::errc() || end != text.data() + text.size()) {
         return std::nullopt;
+    }
     return count;
 }
 
@@ -79,24 +83,27 @@ public:
             const std::size_t lineEnd = text.substr(end).starts_with("\r\n") ? 2 : 1;
             text.remove_prefix(std::min(end + lineEnd, text.size()));
         }
-        if (!isKnown("help"))
+        if (!isKnown("help")) {
             m_spec.options.push_back({"help", ValueKind::None, Need::Optional, Times::Once, "Show this summary."});
+        }
         return std::move(m_spec);
     }
 
 private:
     void readLine(std::string_view line) {
-        if (line.empty() || line.front() == '#')
+        if (line.empty() || line.front() == '#') {
             return;
+        }
         const std::size_t colon = std::min(line.find(':'), line.size());
         const std::string_view help = colon < line.size() ? trim(line.substr(colon + 1)) : std::string_view();
         std::string_view declaration = trim(line.substr(0, colon));
-        if (declaration.empty())
+        if (declaration.empty()) {
             refuse("there is nothing before \":\"");
-        else if (declaration.front() == '<')
+        } else if (declaration.front() == '<') {
             readPlain(declaration, help);
-        else
+        } else {
             readOption(declaration, help);
+        }
     }
 
     void readOption(std::string_view declaration, std::string_view help) {
@@ -104,31 +111,38 @@ private:
         rule.name = takeWord(declaration);
         rule.help = help;
         const std::string_view kind = takeWord(declaration);
-        if (!isName(rule.name))
+        if (!isName(rule.name)) {
             return refuse(quoted(rule.name) + " cannot be the name of an option");
-        if (meansHelp(rule.name) || tvx::text::equalNoCase(rule.name, "f"))
+        }
+        if (meansHelp(rule.name) || tvx::text::equalNoCase(rule.name, "f")) {
             return refuse(quoted(rule.name) + " has a fixed meaning on every command line");
-        if (isKnown(rule.name))
+        }
+        if (isKnown(rule.name)) {
             return refuse("option " + quoted(rule.name) + " is there already");
-        if (kind.empty())
+        }
+        if (kind.empty()) {
             return refuse("option " + quoted(rule.name) + " has no value kind (none, text, integer, real)");
-        if (!kindOf(kind))
+        }
+        if (!kindOf(kind)) {
             return refuse(quoted(kind) + " is no value kind (none, text, integer, real)");
+        }
         rule.kind = *kindOf(kind);
-        if (!readAttributes(declaration, rule))
+        if (!readAttributes(declaration, rule)) {
             return;
-        if (isHelp(rule) && (rule.kind != ValueKind::None || rule.need == Need::Required))
+        }
+        if (isHelp(rule) && (rule.kind != ValueKind::None || rule.need == Need::Required)) {
             return refuse("option \"help\" cannot take a value or be required");
+        }
         m_spec.options.push_back(std::move(rule));
     }
 
     bool readAttributes(std::string_view declaration, OptionRule& rule) {
         for (std::string_view word = takeWord(declaration); !word.empty(); word = takeWord(declaration)) {
-            if (tvx::text::equalNoCase(word, "required"))
+            if (tvx::text::equalNoCase(word, "required")) {
                 rule.need = Need::Required;
-            else if (tvx::text::equalNoCase(word, "repeatable"))
+            } else if (tvx::text::equalNoCase(word, "repeatable")) {
                 rule.times = Times::Repeatable;
-            else {
+            } else {
                 refuse(quoted(word) + " is neither \"required\" nor \"repeatable\" (help texts begin with \":\")");
                 return false;
             }
@@ -138,19 +152,23 @@ private:
 
     void readPlain(std::string_view declaration, std::string_view help) {
         const std::size_t close = declaration.find('>');
-        if (close == std::string_view::npos)
+        if (close == std::string_view::npos) {
             return refuse("\">\" is missing");
+        }
         const std::string_view name = trim(declaration.substr(1, close - 1));
-        if (name.empty())
+        if (name.empty()) {
             return refuse("the plain arguments have no name between \"<\" and \">\"");
-        if (!m_spec.plain.name.empty())
+        }
+        if (!m_spec.plain.name.empty()) {
             return refuse("the plain arguments are there already");
+        }
         PlainRule rule;
         rule.name = name;
         rule.help = help;
         const std::string_view range = trim(declaration.substr(close + 1));
-        if (!readRange(range, rule))
+        if (!readRange(range, rule)) {
             return refuse(quoted(range) + " is no count range such as \"1\", \"0..3\" or \"1..*\"");
+        }
         m_spec.plain = std::move(rule);
     }
 
@@ -160,8 +178,9 @@ private:
         const std::string_view to = dots == std::string_view::npos ? from : trim(range.substr(dots + 2));
         const auto least = toCount(from);
         const auto most = to == "*" ? PlainRule::Unlimited : toCount(to);
-        if (!least || !most || *least > *most)
+        if (!least || !most || *least > *most) {
             return false;
+        }
         rule.least = *least;
         rule.most = *most;
         return true;
@@ -183,14 +202,17 @@ private:
 } // namespace
 
 std::vector<const OptionRule*> OptionSpec::find(std::string_view word) const {
-    if (meansHelp(word))
+    if (meansHelp(word)) {
         word = "help";
+    }
     std::vector<const OptionRule*> found;
     for (const OptionRule& rule : options) {
-        if (tvx::text::equalNoCase(rule.name, word))
+        if (tvx::text::equalNoCase(rule.name, word)) {
             return {&rule};
-        if (!word.empty() && tvx::text::startsWithNoCase(rule.name, word))
+        }
+        if (!word.empty() && tvx::text::startsWithNoCase(rule.name, word)) {
             found.push_back(&rule);
+        }
     }
     return found;
 }

@@ -49,8 +49,9 @@ public:
 
     /// The next `count` bytes, empty when fewer are left.
     ResourceBytes bytes(std::size_t count) {
-        if (!m_ok || count > remaining())
+        if (!m_ok || count > remaining()) {
             return fail();
+        }
         const ResourceBytes result = m_bytes.subspan(m_position, count);
         m_position += count;
         return result;
@@ -74,16 +75,18 @@ public:
             return result;
         }
         result.reserve(count);
-        for (std::size_t i = 0; i < count; ++i)
+        for (std::size_t i = 0; i < count; ++i) {
             result.push_back(static_cast<char16_t>(u16()));
+        }
         return result;
     }
 
     /// UTF-16 units up to a zero, which is consumed.
     std::u16string zeroEndedText() {
         std::u16string result;
-        while (const std::uint16_t unit = u16())
+        while (const std::uint16_t unit = u16()) {
             result.push_back(static_cast<char16_t>(unit));
+        }
         return result;
     }
 
@@ -91,8 +94,9 @@ private:
     std::uint32_t number(std::size_t size) {
         const ResourceBytes raw = bytes(size);
         std::uint32_t value = 0;
-        for (std::size_t i = raw.size(); i-- > 0;)
+        for (std::size_t i = raw.size(); i-- > 0;) {
             value = value << 8 | raw[i];
+        }
         return value;
     }
     ResourceBytes fail() {

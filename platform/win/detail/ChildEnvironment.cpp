@@ -20,8 +20,9 @@ std::vector<std::string> bundleVariables() {
     std::vector<std::string> names;
     while (!list.empty()) {
         const std::size_t end = std::min(list.find(':'), list.size());
-        if (end > 0)
+        if (end > 0) {
             names.emplace_back(list.substr(0, end));
+        }
         list.remove_prefix(std::min(end + 1, list.size()));
     }
     return names;
@@ -29,8 +30,9 @@ std::vector<std::string> bundleVariables() {
 
 bool isKept(std::string_view variable, const std::vector<std::string>& changed) {
     const std::string_view name = variable.substr(0, variable.find('='));
-    if (name == changedByBundle || name == startHidden)
+    if (name == changedByBundle || name == startHidden) {
         return false;
+    }
     return std::ranges::none_of(changed, [name](const std::string& other) {
         return name == other || (name.starts_with(usersValue) && name.substr(usersValue.size()) == other);
     });
@@ -41,15 +43,18 @@ bool isKept(std::string_view variable, const std::vector<std::string>& changed) 
 ChildEnvironment::ChildEnvironment(StartShow show) {
     const std::vector<std::string> changed = bundleVariables();
     for (char** variable = environ; variable && *variable; ++variable) {
-        if (isKept(*variable, changed))
+        if (isKept(*variable, changed)) {
             block_.push_back(*variable);
+        }
     }
     for (const std::string& name : changed) {
-        if (const char* value = std::getenv((std::string(usersValue) + name).c_str()))
+        if (const char* value = std::getenv((std::string(usersValue) + name).c_str())) {
             add(name + "=" + value);
+        }
     }
-    if (show == StartShow::hidden)
+    if (show == StartShow::hidden) {
         add(std::string(startHidden) + "=1");
+    }
     block_.push_back(nullptr);
 }
 

@@ -34,8 +34,9 @@ public:
         word.clear();
         bool quoted = false;
         const bool found = at_ < text_.size();
-        while (at_ < text_.size() && (quoted || !isBlank(text_[at_])))
+        while (at_ < text_.size() && (quoted || !isBlank(text_[at_]))) {
             take(word, quoted);
+        }
         return found;
     }
 
@@ -45,18 +46,20 @@ private:
         const bool beforeQuote = at_ + slashes < text_.size() && text_[at_ + slashes] == '"';
         word.append(beforeQuote ? slashes / 2 : slashes, '\\');
         at_ += slashes;
-        if (beforeQuote)
+        if (beforeQuote) {
             takeQuote(word, quoted, slashes % 2 != 0);
-        else if (slashes == 0)
+        } else if (slashes == 0) {
             word += text_[at_++];
+        }
     }
 
     void takeQuote(std::string& word, bool& quoted, bool ordinary) {
         const bool twice = quoted && !ordinary && text_.substr(at_ + 1).starts_with('"');
-        if (ordinary || twice)
+        if (ordinary || twice) {
             word += '"';
-        else
+        } else {
             quoted = !quoted;
+        }
         at_ += twice ? 2 : 1;
     }
 
@@ -95,23 +98,27 @@ std::string encoded(std::string_view path) {
     std::string result;
     for (const char character : path) {
         const auto byte = static_cast<unsigned char>(character);
-        if (kept.find(character) != std::string_view::npos)
+        if (kept.find(character) != std::string_view::npos) {
             result += character;
-        else
+        } else {
             result.append({'%', digits[byte >> 4], digits[byte & 15]});
+        }
     }
     return result;
 }
 
 /// The name in a file address of the platform, "C:\a" for "file:///C|\a".
 std::optional<std::string> nameInAddress(const std::string& word) {
-    if (!text::equalNoCase(std::string_view(word).substr(0, 5), "file:"))
+    if (!text::equalNoCase(std::string_view(word).substr(0, 5), "file:")) {
         return std::nullopt;
+    }
     std::string name = word.substr(5);
-    if (name.starts_with("///"))
+    if (name.starts_with("///")) {
         name.erase(0, 3);
-    if (name.size() > 2 && name[1] == '|')
+    }
+    if (name.size() > 2 && name[1] == '|') {
         name[1] = ':';
+    }
     return isAbsolute(name) ? std::optional(name) : std::nullopt;
 }
 
@@ -124,8 +131,9 @@ std::string addressOf(std::string_view path, std::string_view rest) {
 std::string addressForChild(const std::string& name, const std::string& word) {
     std::error_code error;
     const std::optional<std::string> plain = systemPath(name);
-    if (!plain || std::filesystem::exists(*plain, error))
+    if (!plain || std::filesystem::exists(*plain, error)) {
         return plain ? addressOf(*plain, {}) : word;
+    }
     const std::size_t place = std::min(name.find_first_of("?#"), name.size());
     const std::optional<std::string> path = systemPath(decoded(std::string_view(name).substr(0, place)));
     return path ? addressOf(*path, std::string_view(name).substr(place)) : word;
@@ -143,8 +151,9 @@ std::vector<CommandLine> readings(std::string_view line) {
     for (std::size_t end = 0; end < line.size() && end < PATH_MAX;) {
         end = std::min(line.find_first_of(blanks, end), line.size());
         found.push_back({line.substr(0, end), line.substr(end)});
-        if (!hasFolder(found.front().program))
+        if (!hasFolder(found.front().program)) {
             break;
+        }
         end = std::min(line.find_first_not_of(blanks, end), line.size());
     }
     return found;
@@ -153,14 +162,16 @@ std::vector<CommandLine> readings(std::string_view line) {
 std::vector<std::string> splitArguments(std::string_view arguments) {
     std::vector<std::string> words;
     WordReader reader(arguments);
-    for (std::string word; reader.next(word);)
+    for (std::string word; reader.next(word);) {
         words.push_back(word);
+    }
     return words;
 }
 
 std::string wordForChild(const std::string& word) {
-    if (isAbsolute(word))
+    if (isAbsolute(word)) {
         return systemPath(word).value_or(word);
+    }
     const std::optional<std::string> name = nameInAddress(word);
     return name ? addressForChild(*name, word) : word;
 }

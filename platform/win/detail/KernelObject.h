@@ -79,7 +79,8 @@ bool isInheritable(HANDLE handle);
 template <class Object>
 std::shared_ptr<Object> tvx::win::objectOf(HANDLE handle) {
     auto object = std::dynamic_pointer_cast<Object>(objectOf(handle));
-    if (!object)
+    if (!object) {
         SetLastError(ERROR_INVALID_HANDLE);
+    }
     return object;
 }

@@ -57,10 +57,12 @@ std::span<const Language> languages() {
 }
 
 const Language* languageNamed(std::string_view name) {
-    if (const Language* language = exactly(name))
+    if (const Language* language = exactly(name)) {
         return language;
-    if (const Language* language = exactly(name.substr(0, name.find('@'))))
+    }
+    if (const Language* language = exactly(name.substr(0, name.find('@')))) {
         return language;
+    }
     const std::string start = std::string(name.substr(0, name.find_first_of("_@"))) + '_';
     const auto* found = std::ranges::find_if(
         table, [&](const Language& language) { return std::string_view(language.name).starts_with(start); });

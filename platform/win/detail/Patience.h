@@ -14,8 +14,9 @@ public:
     /// Waits a little. Answers whether waiting makes sense any more: not after five seconds.
     bool wait() {
         const auto now = Clock::now();
-        if (now >= m_end)
+        if (now >= m_end) {
             return false;
+        }
         // A writer holds the store for some hundred microseconds; who waits for longer waits for something else.
         const bool isShort = now < m_end - longest + std::chrono::milliseconds(500);
         std::uniform_int_distribution<int> step(isShort ? 20 : 500, isShort ? 200 : 2000);

@@ -31,8 +31,9 @@ bool hasEnded(int process) {
 } // namespace
 
 DWORD exitCodeOf(const siginfo_t& status) {
-    if (status.si_code == CLD_EXITED)
+    if (status.si_code == CLD_EXITED) {
         return static_cast<DWORD>(status.si_status) & 0xFF;
+    }
     switch (status.si_status) {
     case SIGINT:
         return STATUS_CONTROL_C_EXIT;
@@ -55,22 +56,25 @@ ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
     : KernelObject(std::move(process)), kinship_(kinship) {}
 
 ProcessObject::~ProcessObject() {
-    if (kinship_ == Kinship::child && exitCode() == STILL_ACTIVE && !code_)
+    if (kinship_ == Kinship::child && exitCode() == STILL_ACTIVE && !code_) {
         ReleasedChildren::instance().add(std::move(descriptor_));
+    }
     ReleasedChildren::instance().collect();
 }
 
 DWORD ProcessObject::exitCode() {
     const std::lock_guard lock(mutex_);
-    if (!code_ && hasEnded(descriptor()))
+    if (!code_ && hasEnded(descriptor())) {
         code_ = collect();
+    }
     return code_.value_or(STILL_ACTIVE);
 }
 
 DWORD ProcessObject::collect() {
     siginfo_t status;
-    if (kinship_ == Kinship::stranger || !collectStatus(descriptor(), status))
+    if (kinship_ == Kinship::stranger || !collectStatus(descriptor(), status)) {
         return signalBase;
+    }
     // A child that was faster than the order to end keeps its own code.
     const bool killed = status.si_code == CLD_KILLED && status.si_status == SIGKILL;
     return killed && ordered_ ? *ordered_ : exitCodeOf(status);
@@ -78,13 +82,16 @@ DWORD ProcessObject::collect() {
 
 DWORD ProcessObject::terminate(DWORD code) {
     const std::lock_guard lock(mutex_);
-    if (kinship_ == Kinship::stranger || code_ || hasEnded(descriptor()))
+    if (kinship_ == Kinship::stranger || code_ || hasEnded(descriptor())) {
         return ERROR_ACCESS_DENIED;
-    if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0)
+    }
+    if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0) {
         return errorFromErrno(errno);
+    }
     // The first order is the one that ends the child.
-    if (!ordered_)
+    if (!ordered_) {
         ordered_ = code;
+    }
     return ERROR_SUCCESS;
 }
 
@@ -108,8 +115,9 @@ void ReleasedChildren::collect() {
     std::erase_if(running_, [](const Descriptor& process) {
         siginfo_t status;
         const bool ended = hasEnded(process.number());
-        if (ended)
+        if (ended) {
             collectStatus(process.number(), status);
+        }
         return ended;
     });
 }

@@ -22,10 +22,12 @@ constexpr std::string_view extension = ".exe";
 DWORD checkProgram(const std::string& file) {
     std::error_code error;
     const fs::file_status status = fs::status(file, error);
-    if (status.type() == fs::file_type::regular)
+    if (status.type() == fs::file_type::regular) {
         return ::access(file.c_str(), X_OK) == 0 ? ERROR_SUCCESS : ERROR_ACCESS_DENIED;
-    if (status.type() != fs::file_type::not_found)
+    }
+    if (status.type() != fs::file_type::not_found) {
         return ERROR_ACCESS_DENIED;
+    }
     const fs::path folder = fs::path(file).parent_path();
     return folder.empty() || fs::is_directory(folder, error) ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
 }
@@ -34,8 +36,9 @@ DWORD checkProgram(const std::string& file) {
 std::vector<std::string> spellings(const std::string& name) {
     std::vector<std::string> names{name};
     if (name.size() > extension.size() &&
-        text::equalNoCase(std::string_view(name).substr(name.size() - extension.size()), extension))
+        text::equalNoCase(std::string_view(name).substr(name.size() - extension.size()), extension)) {
         names.push_back(name.substr(0, name.size() - extension.size()));
+    }
     return names;
 }
 
@@ -71,11 +74,13 @@ void consider(Program& program, const std::string& file, const std::string& name
 void findByPath(Program& program, const std::string& name) {
     for (const std::string& spelling : spellings(name)) {
         const std::optional<std::string> file = systemPath(spelling);
-        if (program.file.empty() && file)
+        if (program.file.empty() && file) {
             consider(program, *file, *file);
+        }
     }
-    if (program.file.empty() && program.error == ERROR_SUCCESS)
+    if (program.file.empty() && program.error == ERROR_SUCCESS) {
         program.error = ERROR_PATH_NOT_FOUND; // an unknown drive or share
+    }
 }
 
 void findByName(Program& program, const std::string& name) {
@@ -83,13 +88,15 @@ void findByName(Program& program, const std::string& name) {
         for (const std::string& spelling : spellings(name)) {
             std::string file = folder.empty() ? "" : folder + '/';
             consider(program, file.append(spelling), spelling);
-            if (!program.file.empty())
+            if (!program.file.empty()) {
                 return;
+            }
         }
     }
     // Folders of PATH that are missing say nothing about the program.
-    if (program.error == ERROR_PATH_NOT_FOUND)
+    if (program.error == ERROR_PATH_NOT_FOUND) {
         program.error = ERROR_FILE_NOT_FOUND;
+    }
 }
 
 } // namespace
@@ -99,15 +106,18 @@ Program findProgram(std::string_view commandLine) {
     for (const CommandLine& reading : readings(commandLine)) {
         const std::string name(reading.program);
         program.arguments = reading.arguments;
-        if (name.find_first_of("\\/") != std::string::npos || hasDrive(name))
+        if (name.find_first_of("\\/") != std::string::npos || hasDrive(name)) {
             findByPath(program, name);
-        else if (!name.empty())
+        } else if (!name.empty()) {
             findByName(program, name);
-        if (!program.file.empty())
+        }
+        if (!program.file.empty()) {
             return program;
+        }
     }
-    if (program.error == ERROR_SUCCESS)
+    if (program.error == ERROR_SUCCESS) {
         program.error = ERROR_FILE_NOT_FOUND;
+    }
     return program;
 }
 

@@ -43,24 +43,26 @@ constexpr std::array<const char*, static_cast<std::size_t>(Sql::count_)> stateme
 /// Called by the database while another process writes; `tries` begins anew with each wait.
 int waitForOthers(void* context, int tries) {
     auto& patience = *static_cast<std::optional<Patience>*>(context);
-    if (tries == 0 || !patience)
+    if (tries == 0 || !patience) {
         patience.emplace();
+    }
     return patience->wait() ? 1 : 0;
 }
 
 } // namespace
 
 Query& Query::bind(std::string_view text) {
-    sqlite3_bind_text(m_statement, ++m_bound, text.data() != nullptr ? text.data() : "", static_cast<int>(text.size()),
+    sqlite3_bind_text(m_statement, ++m_bound, text.data() ? text.data() : "", static_cast<int>(text.size()),
                       SQLITE_STATIC);
     return *this;
 }
 
 Query& Query::bindBytes(std::string_view bytes) {
-    if (bytes.empty())
+    if (bytes.empty()) {
         sqlite3_bind_zeroblob(m_statement, ++m_bound, 0);
-    else
+    } else {
         sqlite3_bind_blob64(m_statement, ++m_bound, bytes.data(), bytes.size(), SQLITE_STATIC);
+    }
     return *this;
 }
 
@@ -72,13 +74,13 @@ Query& Query::bind(std::int64_t number) {
 std::string_view Query::bytes(int column) const {
     const void* data = sqlite3_column_blob(m_statement, column);
     const int size = sqlite3_column_bytes(m_statement, column);
-    return data != nullptr ? std::string_view(static_cast<const char*>(data), static_cast<std::size_t>(size))
-                           : std::string_view();
+    return data ? std::string_view(static_cast<const char*>(data), static_cast<std::size_t>(size)) : std::string_view();
 }
 
 Connection::~Connection() {
-    for (sqlite3_stmt* statement : m_statements)
+    for (sqlite3_stmt* statement : m_statements) {
         sqlite3_finalize(statement);
+    }
     sqlite3_close(m_database);
 }
 
@@ -86,8 +88,9 @@ int Connection::open(const std::string& file) {
     // A file that may not be written is opened for reading by the database itself.
     const int result = sqlite3_open_v2(file.c_str(), &m_database,
                                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_PRIVATECACHE, nullptr);
-    if (result != SQLITE_OK)
+    if (result != SQLITE_OK) {
         return result;
+    }
     sqlite3_extended_result_codes(m_database, 1);
     sqlite3_busy_handler(m_database, &waitForOthers, &m_patience);
     sqlite3_db_config(m_database, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
@@ -101,11 +104,13 @@ int Connection::execute(const char* sql) {
 
 std::optional<std::int64_t> Connection::number(const char* sql) {
     sqlite3_stmt* statement = nullptr;
-    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK)
+    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK) {
         return std::nullopt;
+    }
     std::optional<std::int64_t> answer;
-    if (sqlite3_step(statement) == SQLITE_ROW)
+    if (sqlite3_step(statement) == SQLITE_ROW) {
         answer = sqlite3_column_int64(statement, 0);
+    }
     sqlite3_finalize(statement);
     return answer;
 }
@@ -114,8 +119,9 @@ std::string Connection::text(const char* sql) {
     sqlite3_stmt* statement = nullptr;
     std::string answer;
     if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) == SQLITE_OK &&
-        sqlite3_step(statement) == SQLITE_ROW)
+        sqlite3_step(statement) == SQLITE_ROW) {
         answer = reinterpret_cast<const char*>(sqlite3_column_text(statement, 0));
+    }
     sqlite3_finalize(statement);
     return answer;
 }
@@ -123,25 +129,28 @@ std::string Connection::text(const char* sql) {
 Query Connection::query(Sql sql) {
     const auto index = static_cast<std::size_t>(sql);
     sqlite3_stmt*& statement = m_statements[index];
-    if (statement == nullptr)
+    if (!statement) {
         sqlite3_prepare_v3(m_database, statements[index], -1, SQLITE_PREPARE_PERSISTENT, &statement, nullptr);
+    }
     return Query(statement);
 }
 
 void Connection::forEachRow(const char* sql, const std::function<void(const Query& row)>& take) {
     sqlite3_stmt* statement = nullptr;
-    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK)
+    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK) {
         return;
+    }
     {
         Query rows(statement);
-        while (rows.step() == SQLITE_ROW)
+        while (rows.step() == SQLITE_ROW) {
             take(rows);
+        }
     }
     sqlite3_finalize(statement);
 }
 
 int Query::step() {
-    return m_statement != nullptr ? sqlite3_step(m_statement) : SQLITE_SCHEMA;
+    return m_statement ? sqlite3_step(m_statement) : SQLITE_SCHEMA;
 }
 
 bool Connection::shareLog() {
@@ -149,8 +158,8 @@ bool Connection::shareLog() {
     sqlite3_file* file = nullptr;
     void* region = nullptr;
     const bool hasMemory =
-        sqlite3_file_control(m_database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK && file != nullptr &&
-        file->pMethods != nullptr && file->pMethods->iVersion >= 2 && text("PRAGMA journal_mode") == "wal" &&
+        sqlite3_file_control(m_database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK && file &&
+        file->pMethods && file->pMethods->iVersion >= 2 && text("PRAGMA journal_mode") == "wal" &&
         file->pMethods->xShmMap(file, 0, regionSize, 0, const_cast<void volatile**>(&region)) == SQLITE_OK;
     m_log = hasMemory ? static_cast<const volatile std::uint32_t*>(region) : nullptr;
     return m_log != nullptr;
@@ -158,8 +167,9 @@ bool Connection::shareLog() {
 
 LogHead Connection::logHead() const {
     LogHead head;
-    for (std::size_t i = 0; i < head.size(); ++i)
+    for (std::size_t i = 0; i < head.size(); ++i) {
         head[i] = m_log[i];
+    }
     std::atomic_thread_fence(std::memory_order_acquire);
     return head;
 }

@@ -37,8 +37,9 @@ class Query {
 public:
     explicit Query(sqlite3_stmt* statement) : m_statement(statement) {}
     ~Query() {
-        if (m_statement == nullptr)
+        if (!m_statement) {
             return; // could not be prepared: a file of another version
+        }
         sqlite3_reset(m_statement);
         sqlite3_clear_bindings(m_statement);
     }

@@ -30,22 +30,25 @@ constexpr int longestLinkChain = 40; // that of the system
 
 std::string_view environment(const char* name) {
     const char* value = std::getenv(name);
-    return value != nullptr ? value : "";
+    return value ? value : "";
 }
 
 std::string home() {
-    if (const std::string_view named = environment("HOME"); named.starts_with('/'))
+    if (const std::string_view named = environment("HOME"); named.starts_with('/')) {
         return std::string(named);
+    }
     const passwd* user = getpwuid(getuid());
-    return user != nullptr && user->pw_dir != nullptr ? user->pw_dir : "";
+    return user && user->pw_dir ? user->pw_dir : "";
 }
 
 std::string userFile() {
-    if (const std::string_view named = environment("TVX_REGISTRY"); !named.empty())
+    if (const std::string_view named = environment("TVX_REGISTRY"); !named.empty()) {
         return fs::absolute(named).string();
+    }
     // Relative names in these variables are to be ignored.
-    if (const std::string_view folder = environment("XDG_CONFIG_HOME"); folder.starts_with('/'))
+    if (const std::string_view folder = environment("XDG_CONFIG_HOME"); folder.starts_with('/')) {
         return (fs::path(folder) / fileName).string();
+    }
     const std::string folder = home();
     return folder.empty() ? std::string() : (fs::path(folder) / ".config" / fileName).string();
 }
@@ -58,18 +61,21 @@ std::string machineFile() {
         const fs::path folder(folders.substr(0, end));
         folders.remove_prefix(std::min(end + 1, folders.size()));
         std::error_code error;
-        if (const fs::path file = folder / fileName; folder.is_absolute() && fs::exists(file, error))
+        if (const fs::path file = folder / fileName; folder.is_absolute() && fs::exists(file, error)) {
             return file.string();
+        }
     }
     return {};
 }
 
 DWORD makeFolders(const fs::path& folder) {
     std::error_code error;
-    if (folder.empty() || fs::is_directory(folder, error))
+    if (folder.empty() || fs::is_directory(folder, error)) {
         return ERROR_SUCCESS;
-    if (const DWORD result = makeFolders(folder.parent_path()); result != ERROR_SUCCESS)
+    }
+    if (const DWORD result = makeFolders(folder.parent_path()); result != ERROR_SUCCESS) {
         return result;
+    }
     return mkdir(folder.c_str(), 0700) == 0 || errno == EEXIST ? ERROR_SUCCESS : errorFromErrno(errno);
 }
 
@@ -87,8 +93,9 @@ std::string asideName(const fs::path& file) {
     const std::string stem = (file.parent_path() / file.stem()).string() + "-damaged-" + timeText();
     std::string name = stem + file.extension().string();
     std::error_code error;
-    for (int i = 2; fs::exists(name, error); ++i)
+    for (int i = 2; fs::exists(name, error); ++i) {
         name = stem + "-" + std::to_string(i) + file.extension().string();
+    }
     return name;
 }
 
@@ -98,10 +105,11 @@ std::array<std::string, 4> copyPlaces() {
 }
 
 std::string makeCopyFolder(const std::string& place) {
-    if (!place.starts_with('/'))
+    if (!place.starts_with('/')) {
         return {};
+    }
     std::string folder = place + "/tvx-settings-XXXXXX";
-    return mkdtemp(folder.data()) != nullptr ? folder : std::string();
+    return mkdtemp(folder.data()) ? folder : std::string();
 }
 
 } // namespace
@@ -121,23 +129,26 @@ std::string resolve(const std::string& name) {
 }
 
 FileKind kindOf(const std::string& file) {
-    struct stat status {};
-    if (stat(file.c_str(), &status) == 0)
+    struct stat status{};
+    if (stat(file.c_str(), &status) == 0) {
         return S_ISREG(status.st_mode) ? FileKind::regular : FileKind::other;
+    }
     return errno == ENOENT ? FileKind::missing : FileKind::unreachable;
 }
 
 FileIdentity identityOf(const std::string& file) {
-    struct stat status {};
-    if (stat(file.c_str(), &status) != 0)
+    struct stat status{};
+    if (stat(file.c_str(), &status) != 0) {
         return {};
+    }
     return {status.st_dev, status.st_ino};
 }
 
 FileStamp stampOf(const std::string& file) {
-    struct stat status {};
-    if (stat(file.c_str(), &status) != 0)
+    struct stat status{};
+    if (stat(file.c_str(), &status) != 0) {
         return {};
+    }
     return {
         {status.st_dev, status.st_ino}, status.st_size, status.st_mtim.tv_sec * 1'000'000'000 + status.st_mtim.tv_nsec};
 }
@@ -158,9 +169,10 @@ bool allowsSharedMemory(const std::string& file) {
         0x0BD00BD0, // Lustre
         0x01161970, // GFS2
     };
-    struct statfs status {};
-    if (statfs(file.c_str(), &status) != 0)
+    struct statfs status{};
+    if (statfs(file.c_str(), &status) != 0) {
         return false;
+    }
     return std::ranges::find(remote, static_cast<std::uint32_t>(status.f_type)) == remote.end();
 }
 
@@ -170,8 +182,9 @@ DWORD makeFolderOf(const std::string& file) {
 
 DWORD makeFile(const std::string& file) {
     const int descriptor = ::open(file.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
-    if (descriptor < 0)
+    if (descriptor < 0) {
         return errno == EEXIST ? ERROR_SUCCESS : errorFromErrno(errno);
+    }
     ::close(descriptor);
     return ERROR_SUCCESS;
 }
@@ -180,25 +193,30 @@ FolderLock::FolderLock(const std::string& file)
     : m_folder(::open(fs::path(file).parent_path().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)) {
     for (Patience patience; m_folder >= 0 && !m_isHeld;) {
         m_isHeld = flock(m_folder, LOCK_EX | LOCK_NB) == 0;
-        if (!m_isHeld && (errno != EWOULDBLOCK || !patience.wait()))
+        if (!m_isHeld && (errno != EWOULDBLOCK || !patience.wait())) {
             return;
+        }
     }
 }
 
 FolderLock::~FolderLock() {
-    if (m_folder >= 0)
+    if (m_folder >= 0) {
         ::close(m_folder);
+    }
 }
 
 std::optional<std::string> setAside(const std::string& file) {
     std::string aside = asideName(file);
-    if (std::rename(file.c_str(), aside.c_str()) != 0)
+    if (std::rename(file.c_str(), aside.c_str()) != 0) {
         return std::nullopt;
+    }
     // The log belongs to the file it stood beside: with another one it would do harm.
-    if (std::rename((file + "-wal").c_str(), (aside + "-wal").c_str()) != 0)
+    if (std::rename((file + "-wal").c_str(), (aside + "-wal").c_str()) != 0) {
         unlink((file + "-wal").c_str());
-    if (std::rename((file + "-journal").c_str(), (aside + "-journal").c_str()) != 0)
+    }
+    if (std::rename((file + "-journal").c_str(), (aside + "-journal").c_str()) != 0) {
         unlink((file + "-journal").c_str());
+    }
     unlink((file + "-shm").c_str());
     return aside;
 }
@@ -206,13 +224,15 @@ std::optional<std::string> setAside(const std::string& file) {
 FileCopy::FileCopy(const std::string& file) {
     for (const std::string& place : copyPlaces()) {
         m_folder = makeCopyFolder(place);
-        if (m_folder.empty())
+        if (m_folder.empty()) {
             continue;
+        }
         std::error_code error;
         const std::string copy = m_folder + "/registry.db";
         for (const char* part : {"", "-wal", "-journal"}) {
-            if (!error && (*part == '\0' || fs::exists(file + part)))
+            if (!error && (*part == '\0' || fs::exists(file + part))) {
                 fs::copy_file(file + part, copy + part, error);
+            }
         }
         if (!error) {
             m_name = copy;
@@ -224,8 +244,9 @@ FileCopy::FileCopy(const std::string& file) {
 
 FileCopy::~FileCopy() {
     std::error_code error;
-    if (!m_name.empty())
+    if (!m_name.empty()) {
         fs::remove_all(m_folder, error);
+    }
 }
 
 } // namespace tvx::registry

@@ -20,8 +20,9 @@ struct Store::Memory {
     /// What may be answered from memory. Must be called before the database is asked, so that what is kept is at least
     /// as new as the head it is kept under.
     Replies* current(const Connection& connection) {
-        if (watch == Watch::none)
+        if (watch == Watch::none) {
             return nullptr;
+        }
         if (const LogHead now = watch == Watch::log ? connection.logHead() : head;
             now != head || replies.size() > most) {
             replies.clear();

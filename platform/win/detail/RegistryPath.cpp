@@ -20,12 +20,15 @@ DWORD append(KeyPath& path, std::string_view subKey) {
         const std::size_t end = std::min(subKey.find('\\'), subKey.size());
         const std::string_view part = subKey.substr(0, end);
         subKey.remove_prefix(std::min(end + 1, subKey.size()));
-        if (part.empty())
+        if (part.empty()) {
             continue;
-        if (text::characterCount(part) > longestPart || path.spelled.size() + part.size() > longestPath)
+        }
+        if (text::characterCount(part) > longestPart || path.spelled.size() + part.size() > longestPath) {
             return ERROR_INVALID_PARAMETER;
-        if (!path.spelled.empty())
+        }
+        if (!path.spelled.empty()) {
             path.spelled += '\\';
+        }
         path.spelled += part;
     }
     path.folded = text::foldCase(path.spelled);

@@ -23,21 +23,24 @@ struct Salvage {
 Salvage read(const std::string& file) {
     Salvage result;
     Connection damaged;
-    if (damaged.open(file) != SQLITE_OK)
+    if (damaged.open(file) != SQLITE_OK) {
         return result;
+    }
     damaged.keepLogOnClose();
     for (const char* sql :
-         {"SELECT id, path, name FROM key ORDER BY id", "SELECT id, path, name FROM key ORDER BY id DESC"})
+         {"SELECT id, path, name FROM key ORDER BY id", "SELECT id, path, name FROM key ORDER BY id DESC"}) {
         damaged.forEachRow(sql, [&](const Query& row) {
             result.keys.try_emplace(row.number(0), Salvage::Key{std::string(row.bytes(1)), std::string(row.bytes(2))});
         });
+    }
     for (const char* sql : {"SELECT key, folded, name, type, data FROM value ORDER BY key, folded",
-                            "SELECT key, folded, name, type, data FROM value ORDER BY key DESC, folded DESC"})
+                            "SELECT key, folded, name, type, data FROM value ORDER BY key DESC, folded DESC"}) {
         damaged.forEachRow(sql, [&](const Query& row) {
             result.values.try_emplace(
                 {row.number(0), std::string(row.bytes(1))},
                 Value{std::string(row.bytes(2)), static_cast<DWORD>(row.number(3)), std::string(row.bytes(4))});
         });
+    }
     return result;
 }
 
@@ -45,8 +48,9 @@ Salvage read(const std::string& file) {
 
 std::size_t Store::takeOver(const std::string& damaged) {
     const Salvage salvage = read(damaged);
-    if (salvage.values.empty() || ensureOpen(Intent::write) != ERROR_SUCCESS || m_mode != Mode::shared)
+    if (salvage.values.empty() || ensureOpen(Intent::write) != ERROR_SUCCESS || m_mode != Mode::shared) {
         return 0;
+    }
     std::size_t saved = 0;
     const DWORD result = together([&] {
         for (const auto& [id, key] : salvage.keys) {
@@ -56,8 +60,9 @@ std::size_t Store::takeOver(const std::string& damaged) {
         }
         for (const auto& [id, value] : salvage.values) {
             const auto key = salvage.keys.find(id.first);
-            if (key == salvage.keys.end() || askValue(key->second.path, id.second).result != ERROR_FILE_NOT_FOUND)
+            if (key == salvage.keys.end() || askValue(key->second.path, id.second).result != ERROR_FILE_NOT_FOUND) {
                 continue; // nobody knows whose it is, or somebody has written a newer one
+            }
             saved += insertValue(key->second.path, id.second, value) == ERROR_SUCCESS ? 1 : 0;
         }
         return ERROR_SUCCESS;

@@ -33,10 +33,12 @@ DWORD Store::run(Intent intent, Operation operation) {
     DWORD result = ERROR_REGISTRY_CORRUPT;
     for (int attempt = 0; attempt < 2 && result == ERROR_REGISTRY_CORRUPT; ++attempt) {
         result = ensureOpen(intent);
-        if (result == ERROR_SUCCESS)
+        if (result == ERROR_SUCCESS) {
             result = operation();
-        if (result == ERROR_REGISTRY_CORRUPT && (m_inTransaction || replaceDamaged() != ERROR_SUCCESS))
+        }
+        if (result == ERROR_REGISTRY_CORRUPT && (m_inTransaction || replaceDamaged() != ERROR_SUCCESS)) {
             break;
+        }
     }
     return result;
 }
@@ -45,23 +47,28 @@ DWORD Store::run(Intent intent, Operation operation) {
 template <typename Operation>
 DWORD Store::change(Operation operation) {
     const DWORD result = run(Intent::write, [&] { return m_mode == Mode::shared ? operation() : m_writeError; });
-    if (result == ERROR_DISK_FULL || result == ERROR_BUSY || result == ERROR_REGISTRY_IO_FAILED)
+    if (result == ERROR_DISK_FULL || result == ERROR_BUSY || result == ERROR_REGISTRY_IO_FAILED) {
         tell(Fault::notSaved, "Settings could not be saved in " + m_file + ". " + errorText(result));
+    }
     return result;
 }
 
 /// Does several changes, all or none.
 DWORD Store::together(const std::function<DWORD()>& operation) {
-    if (m_inTransaction)
+    if (m_inTransaction) {
         return operation();
+    }
     DWORD result = failed(m_connection->query(Sql::begin).step());
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         return result;
+    }
     result = operation();
-    if (result == ERROR_SUCCESS)
+    if (result == ERROR_SUCCESS) {
         result = failed(m_connection->query(Sql::commit).step());
-    if (result != ERROR_SUCCESS)
+    }
+    if (result != ERROR_SUCCESS) {
         (void)m_connection->query(Sql::rollback).step();
+    }
     return result;
 }
 
@@ -72,16 +79,19 @@ Store::Replies* Store::replies() {
 template <typename Question>
 Store::Reply Store::remembered(std::string_view subject, std::string_view detail, Question question) {
     Replies* known = replies();
-    if (known == nullptr)
+    if (!known) {
         return question();
+    }
     std::string key;
     key.reserve(subject.size() + detail.size() + 1);
     key.append(subject).append(1, '\0').append(detail);
-    if (const auto found = known->find(key); found != known->end())
+    if (const auto found = known->find(key); found != known->end()) {
         return found->second;
+    }
     Reply reply = question();
-    if (reply.result == ERROR_SUCCESS || reply.result == ERROR_FILE_NOT_FOUND || reply.result == ERROR_KEY_DELETED)
+    if (reply.result == ERROR_SUCCESS || reply.result == ERROR_FILE_NOT_FOUND || reply.result == ERROR_KEY_DELETED) {
         known->emplace(std::move(key), reply);
+    }
     return reply;
 }
 
@@ -98,8 +108,9 @@ Store::Reply Store::askValue(std::string_view path, std::string_view folded) {
                 std::make_shared<Value>(Value{std::string(query.bytes(0)), static_cast<DWORD>(query.number(1)),
                                               std::string(query.bytes(2))})};
     }
-    if (step != SQLITE_DONE)
+    if (step != SQLITE_DONE) {
         return {failed(step), nullptr};
+    }
     const DWORD keyResult = askKey(path).result;
     return {keyResult == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED
             : keyResult == 0                  ? ERROR_FILE_NOT_FOUND
@@ -108,8 +119,9 @@ Store::Reply Store::askValue(std::string_view path, std::string_view folded) {
 }
 
 DWORD Store::findKey(const KeyPath& key) {
-    if (key.folded.empty())
+    if (key.folded.empty()) {
         return ERROR_SUCCESS; // a root is there before its file
+    }
     // No value has a zero in its name, so this cannot be mistaken for one.
     constexpr std::string_view noValue("\0", 1);
     return run(Intent::read,
@@ -128,8 +140,9 @@ DWORD Store::readValue(const KeyPath& key, std::string_view name, std::shared_pt
 DWORD Store::createKey(const KeyPath& key, bool& created) {
     created = false;
     const DWORD found = findKey(key);
-    if (found != ERROR_FILE_NOT_FOUND)
+    if (found != ERROR_FILE_NOT_FOUND) {
         return found;
+    }
     return change([&] {
         const DWORD result = together([&] { return addLevels(key); });
         created = result == ERROR_SUCCESS;
@@ -144,16 +157,18 @@ DWORD Store::addLevels(const KeyPath& key) {
                              .bind(level.folded)
                              .bind(lastPart(level.spelled))
                              .step();
-        if (step != SQLITE_DONE)
+        if (step != SQLITE_DONE) {
             return failed(step);
+        }
     }
     return ERROR_SUCCESS;
 }
 
 DWORD Store::deleteKey(const KeyPath& key) {
     const DWORD found = findKey(key);
-    if (found != ERROR_SUCCESS)
+    if (found != ERROR_SUCCESS) {
         return found;
+    }
     return change([&] { return together([&] { return removeKey(key); }); });
 }
 
@@ -161,14 +176,17 @@ DWORD Store::removeKey(const KeyPath& key) {
     {
         Query query = m_connection->query(Sql::hasSubKeys);
         const int step = query.bind(key.folded).step();
-        if (step != SQLITE_ROW)
+        if (step != SQLITE_ROW) {
             return failed(step);
-        if (query.number(0) != 0)
+        }
+        if (query.number(0) != 0) {
             return ERROR_ACCESS_DENIED;
+        }
     }
     int step = m_connection->query(Sql::deleteValues).bind(key.folded).step();
-    if (step == SQLITE_DONE)
+    if (step == SQLITE_DONE) {
         step = m_connection->query(Sql::deleteKey).bind(key.folded).step();
+    }
     return step == SQLITE_DONE && m_connection->changes() == 0 ? ERROR_FILE_NOT_FOUND : failed(step);
 }
 
@@ -191,8 +209,9 @@ DWORD Store::insertValue(std::string_view path, std::string_view folded, const V
 DWORD Store::deleteValue(const KeyPath& key, std::string_view name) {
     std::shared_ptr<const Value> value;
     const DWORD found = readValue(key, name, value);
-    if (found != ERROR_SUCCESS)
+    if (found != ERROR_SUCCESS) {
         return found;
+    }
     const std::string folded = text::foldCase(name);
     return change([&] {
         const int step = m_connection->query(Sql::deleteValue).bind(key.folded).bind(folded).step();
@@ -218,15 +237,17 @@ DWORD endOfMissing(DWORD result) {
 
 DWORD Store::keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string& name) {
     const DWORD found = findKey(key);
-    if (found != ERROR_SUCCESS)
+    if (found != ERROR_SUCCESS) {
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
+    }
     const DWORD result = run(Intent::read, [&] {
         const std::string last = cursor.folded;
         Query query = m_connection->query(follows(cursor, index) ? Sql::keyAfter : Sql::keyAt);
         query.bind(key.folded);
         const int step = (follows(cursor, index) ? query.bind(last) : query.bind(std::int64_t{index})).step();
-        if (step != SQLITE_ROW)
+        if (step != SQLITE_ROW) {
             return step == SQLITE_DONE ? ERROR_NO_MORE_ITEMS : failed(step);
+        }
         name = query.bytes(0);
         cursor = {index, std::string(query.bytes(1)), true};
         return ERROR_SUCCESS;
@@ -236,15 +257,17 @@ DWORD Store::keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string&
 
 DWORD Store::valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& value) {
     const DWORD found = findKey(key);
-    if (found != ERROR_SUCCESS)
+    if (found != ERROR_SUCCESS) {
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
+    }
     const DWORD result = run(Intent::read, [&] {
         const std::string last = cursor.folded;
         Query query = m_connection->query(follows(cursor, index) ? Sql::valueAfter : Sql::valueAt);
         query.bind(key.folded);
         const int step = (follows(cursor, index) ? query.bind(last) : query.bind(std::int64_t{index})).step();
-        if (step != SQLITE_ROW)
+        if (step != SQLITE_ROW) {
             return step == SQLITE_DONE ? ERROR_NO_MORE_ITEMS : failed(step);
+        }
         value = {std::string(query.bytes(0)), static_cast<DWORD>(query.number(1)), std::string(query.bytes(2))};
         cursor = {index, std::string(query.bytes(3)), true};
         return ERROR_SUCCESS;
@@ -255,8 +278,9 @@ DWORD Store::valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& val
 // --- transactions ---
 
 DWORD Store::begin() {
-    if (m_inTransaction)
+    if (m_inTransaction) {
         return ERROR_INVALID_FUNCTION;
+    }
     return change([&] {
         const DWORD result = failed(m_connection->query(Sql::begin).step());
         m_inTransaction = result == ERROR_SUCCESS;
@@ -265,18 +289,21 @@ DWORD Store::begin() {
 }
 
 DWORD Store::commit() {
-    if (!m_inTransaction || m_isLost)
+    if (!m_inTransaction || m_isLost) {
         return ERROR_INVALID_FUNCTION;
+    }
     const DWORD result = failed(m_connection->query(Sql::commit).step());
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         (void)m_connection->query(Sql::rollback).step();
+    }
     m_inTransaction = false;
     return result;
 }
 
 void Store::rollback() {
-    if (m_inTransaction && !m_isLost)
+    if (m_inTransaction && !m_isLost) {
         (void)m_connection->query(Sql::rollback).step();
+    }
     m_inTransaction = false;
 }
 
@@ -313,8 +340,9 @@ DWORD Store::failed(int result) {
 }
 
 void Store::tell(Fault fault, std::string text) {
-    if (m_told.emplace(fault, m_name).second)
+    if (m_told.emplace(fault, m_name).second) {
         m_notices.push_back(std::move(text));
+    }
 }
 
 std::vector<std::string> Store::takeNotices() {

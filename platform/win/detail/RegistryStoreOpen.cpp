@@ -41,8 +41,9 @@ void beforeFork() {
 }
 
 void afterForkInParent() {
-    for (Store* store : {&stores().user, &stores().machine})
+    for (Store* store : {&stores().user, &stores().machine}) {
         store->mutex.unlock();
+    }
 }
 
 void afterForkInChild() {
@@ -79,10 +80,12 @@ void closeStores() {
 }
 
 void Store::close(Log log) {
-    if (m_inTransaction)
+    if (m_inTransaction) {
         return;
-    if (m_connection != nullptr)
+    }
+    if (m_connection) {
         closeConnection(log);
+    }
     m_memory->replies.clear();
     m_memory->watch = Memory::Watch::none;
     m_copy.reset();
@@ -93,10 +96,12 @@ void Store::closeConnection(Log log) {
     // Merging deletes the log by its name. Where another file has taken the place, or takes it right now, that would be
     // the other file's.
     std::optional<FolderLock> lock;
-    if (log == Log::merge && m_mode == Mode::shared)
+    if (log == Log::merge && m_mode == Mode::shared) {
         lock.emplace(m_file);
-    if (!lock || !lock->isHeld() || !isCurrent())
+    }
+    if (!lock || !lock->isHeld() || !isCurrent()) {
         m_connection->keepLogOnClose();
+    }
     m_connection.reset();
 }
 
@@ -116,10 +121,12 @@ bool Store::isCurrent() const {
 }
 
 DWORD Store::ensureOpen(Intent intent) {
-    if (m_isLost || (intent == Intent::write && m_hive == Hive::machine))
+    if (m_isLost || (intent == Intent::write && m_hive == Hive::machine)) {
         return ERROR_ACCESS_DENIED;
-    if (m_inTransaction)
+    }
+    if (m_inTransaction) {
         return ERROR_SUCCESS;
+    }
     // What could not be written before may have become possible.
     const bool isEnough = m_mode == Mode::shared || intent == Intent::read;
     return isEnough && isCurrent() ? ERROR_SUCCESS : open(intent);
@@ -128,15 +135,18 @@ DWORD Store::ensureOpen(Intent intent) {
 DWORD Store::open(Intent intent) {
     close();
     m_name = locate(m_hive);
-    if (m_name.empty())
+    if (m_name.empty()) {
         return intent == Intent::read ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
+    }
     m_file = resolve(m_name);
     const FileKind kind = kindOf(m_file);
     if (kind == FileKind::missing) {
-        if (intent == Intent::read)
+        if (intent == Intent::read) {
             return ERROR_FILE_NOT_FOUND;
-        if (const DWORD result = createFile(); result != ERROR_SUCCESS)
+        }
+        if (const DWORD result = createFile(); result != ERROR_SUCCESS) {
             return result;
+        }
     } else if (kind != FileKind::regular) {
         tell(Fault::unusable, "The settings cannot be used: " + m_name +
                                   (kind == FileKind::other ? " is no file." : " cannot be reached."));
@@ -153,19 +163,22 @@ DWORD Store::createFile() {
         const FolderLock lock(m_file); // not while a damaged one and its log are being set aside
         result = makeFile(m_file);
     }
-    if (result != ERROR_SUCCESS)
+    if (result != ERROR_SUCCESS) {
         tell(Fault::notSaved, "Settings cannot be saved: " + m_file + " cannot be made. " + errorText(result));
+    }
     return result;
 }
 
 DWORD Store::openFile(Intent intent) {
     m_writeError = ERROR_ACCESS_DENIED;
     const DWORD result = connect(m_file);
-    if (result == ERROR_SUCCESS || result == ERROR_REGISTRY_CORRUPT)
+    if (result == ERROR_SUCCESS || result == ERROR_REGISTRY_CORRUPT) {
         return result;
+    }
     close(Log::keep);
-    if (m_identity == FileIdentity{} || m_identity != identityOf(m_name))
+    if (m_identity == FileIdentity{} || m_identity != identityOf(m_name)) {
         return open(intent); // somebody has set it aside just now
+    }
     const bool isPlaceBad =
         result == ERROR_ACCESS_DENIED || result == ERROR_DISK_FULL || result == ERROR_REGISTRY_IO_FAILED;
     return isPlaceBad ? openCopy(result) : result;
@@ -175,11 +188,13 @@ DWORD Store::connect(const std::string& file) {
     m_identity = identityOf(m_name); // first: should another file come in between, it is noticed by the next call
     m_connection = std::make_unique<Connection>();
     DWORD result = failed(m_connection->open(file));
-    if (result == ERROR_SUCCESS)
+    if (result == ERROR_SUCCESS) {
         result = checkSchema();
-    if (result != ERROR_SUCCESS)
+    }
+    if (result != ERROR_SUCCESS) {
         return result;
-    m_memory->watch = m_copy != nullptr          ? Memory::Watch::nothing
+    }
+    m_memory->watch = m_copy                     ? Memory::Watch::nothing
                       : m_connection->shareLog() ? Memory::Watch::log
                                                  : Memory::Watch::none;
     return ERROR_SUCCESS;
@@ -188,23 +203,26 @@ DWORD Store::connect(const std::string& file) {
 DWORD Store::checkSchema() {
     const auto id = m_connection->number("PRAGMA application_id");
     const auto version = id ? m_connection->number("PRAGMA user_version") : std::nullopt;
-    if (!version)
+    if (!version) {
         return failed(m_connection->error());
+    }
     const bool isNew = *id == 0 && isEmptyDatabase();
     if (*id != applicationId && !isNew) {
         tell(Fault::unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
         return ERROR_BAD_FORMAT;
     }
     const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::machine || isOfNewerVersion(*version);
-    m_mode = m_copy != nullptr ? Mode::copy : isForReading ? Mode::readOnly : Mode::shared;
-    if (m_mode == Mode::shared)
+    m_mode = m_copy ? Mode::copy : isForReading ? Mode::readOnly : Mode::shared;
+    if (m_mode == Mode::shared) {
         chooseJournal();
+    }
     return isNew ? initialise() : ERROR_SUCCESS;
 }
 
 bool Store::isOfNewerVersion(std::int64_t version) {
-    if (version <= schemaVersion)
+    if (version <= schemaVersion) {
         return false;
+    }
     tell(Fault::newer, "The settings in " + m_file +
                            " were written by a newer version of this software. They are read as far as possible and "
                            "not changed.");
@@ -217,23 +235,28 @@ bool Store::isEmptyDatabase() {
 
 void Store::chooseJournal() {
     const char* wanted = allowsSharedMemory(m_file) ? "wal" : "delete";
-    if (m_connection->text("PRAGMA journal_mode") == wanted)
+    if (m_connection->text("PRAGMA journal_mode") == wanted) {
         return;
+    }
     // Where the file is in use this fails, and it stays as it is: every kind is safe, some are only slower.
     (void)m_connection->execute((std::string("PRAGMA journal_mode = ") + wanted).c_str());
 }
 
 DWORD Store::initialise() {
-    if (m_mode != Mode::shared)
+    if (m_mode != Mode::shared) {
         return ERROR_FILE_NOT_FOUND;
+    }
     const FolderLock lock(m_file);
-    if (!lock.isHeld())
+    if (!lock.isHeld()) {
         return ERROR_BUSY;
-    if (!isEmptyDatabase())
+    }
+    if (!isEmptyDatabase()) {
         return ERROR_SUCCESS; // another process was faster
+    }
     const int result = m_connection->execute(schema);
-    if (result != SQLITE_OK)
+    if (result != SQLITE_OK) {
         (void)m_connection->execute("ROLLBACK");
+    }
     return failed(result);
 }
 
@@ -241,11 +264,13 @@ DWORD Store::openCopy(DWORD reason) {
     m_writeError = reason;
     m_stamp = stampOf(m_file);
     m_logStamp = stampOf(m_file + "-wal");
-    if (m_stamp.size == 0)
+    if (m_stamp.size == 0) {
         return reason; // there is nothing to be read
+    }
     m_copy = std::make_unique<FileCopy>(m_file);
-    if (!m_copy->name().empty() && connect(m_copy->name()) == ERROR_SUCCESS && isCurrent())
+    if (!m_copy->name().empty() && connect(m_copy->name()) == ERROR_SUCCESS && isCurrent()) {
         return ERROR_SUCCESS;
+    }
     close();
     tell(Fault::unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
     return reason;
@@ -253,13 +278,14 @@ DWORD Store::openCopy(DWORD reason) {
 
 DWORD Store::replaceDamaged() {
     const FileIdentity damaged = m_identity;
-    const bool isOurs = m_hive == Hive::user && m_copy == nullptr;
+    const bool isOurs = m_hive == Hive::user && !m_copy;
     close(Log::keep);
     std::optional<std::string> aside;
     if (isOurs) {
         const FolderLock lock(m_file);
-        if (lock.isHeld() && identityOf(m_name) != damaged)
+        if (lock.isHeld() && identityOf(m_name) != damaged) {
             return ERROR_SUCCESS; // another process has set it aside already
+        }
         aside = lock.isHeld() ? setAside(m_file) : std::nullopt;
     }
     if (!aside) {

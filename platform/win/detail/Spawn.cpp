@@ -28,10 +28,12 @@ constexpr std::size_t stackSize = 64 * 1024;
 void resetSignals() {
     for (int number = 1; number < NSIG; ++number) {
         struct sigaction action = {};
-        if (::sigaction(number, nullptr, &action) != 0 || action.sa_handler == SIG_DFL)
+        if (::sigaction(number, nullptr, &action) != 0 || action.sa_handler == SIG_DFL) {
             continue;
-        if (action.sa_handler == SIG_IGN && number != SIGPIPE && number != SIGCHLD)
+        }
+        if (action.sa_handler == SIG_IGN && number != SIGPIPE && number != SIGCHLD) {
             continue;
+        }
         action = {};
         ::sigaction(number, &action, nullptr);
     }
@@ -45,35 +47,40 @@ int openStandard(int descriptor) {
 
 bool placeStandard(const std::array<int, 3>& standard) {
     std::array<int, 3> sources{};
-    for (std::size_t index = 0; index < standard.size(); ++index)
+    for (std::size_t index = 0; index < standard.size(); ++index) {
         sources[index] = openStandard(standard[index]);
+    }
     for (std::size_t index = 0; index < standard.size(); ++index) {
         // What this process itself does not have, the child does not get.
-        if (sources[index] < 0)
+        if (sources[index] < 0) {
             ::close(static_cast<int>(index));
-        else if (::dup2(sources[index], static_cast<int>(index)) < 0)
+        } else if (::dup2(sources[index], static_cast<int>(index)) < 0) {
             return false;
+        }
     }
     return true;
 }
 
 void closeOthers() {
-    if (::close_range(3, ~0U, 0) == 0)
+    if (::close_range(3, ~0U, 0) == 0) {
         return;
+    }
     rlimit limit{};
     ::getrlimit(RLIMIT_NOFILE, &limit);
-    for (rlim_t descriptor = 3; descriptor < limit.rlim_cur; ++descriptor)
+    for (rlim_t descriptor = 3; descriptor < limit.rlim_cur; ++descriptor) {
         ::close(static_cast<int>(descriptor));
+    }
 }
 
 bool prepare(Start& start) {
     resetSignals();
     ::setsid();
-    if (!placeStandard(start.request.standard))
+    if (!placeStandard(start.request.standard)) {
         return false;
+    }
     closeOthers();
     start.step = SpawnStep::directory;
-    return start.request.directory == nullptr || ::chdir(start.request.directory) == 0;
+    return !start.request.directory || ::chdir(start.request.directory) == 0;
 }
 
 /// Runs in the child, on a stack of its own.
@@ -127,14 +134,16 @@ SpawnResult spawn(const SpawnRequest& request) {
                             &process);
         result.error = result.id < 0 ? errno : start.error;
     }
-    if (result.id < 0)
+    if (result.id < 0) {
         return result;
+    }
     Descriptor held(process);
     result.failedStep = start.step;
-    if (result.error != 0)
+    if (result.error != 0) {
         collectFailed(held.number());
-    else
+    } else {
         result.process = std::move(held);
+    }
     return result;
 }
 

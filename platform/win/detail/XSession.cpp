@@ -9,13 +9,15 @@ namespace tvx::detail {
 
 XConnection::XConnection(std::string display)
     : m_display(std::move(display)), m_xcb(xcb_connect(m_display.c_str(), &m_screen)) {
-    if (xcb_connection_has_error(m_xcb) == 0)
+    if (xcb_connection_has_error(m_xcb) == 0) {
         m_ready = xcb_ewmh_init_atoms_replies(&m_ewmh, xcb_ewmh_init_atoms(m_xcb, &m_ewmh), nullptr) != 0;
+    }
 }
 
 XConnection::~XConnection() {
-    if (m_ready)
+    if (m_ready) {
         xcb_ewmh_connection_wipe(&m_ewmh);
+    }
     xcb_disconnect(m_xcb);
 }
 
@@ -32,8 +34,9 @@ xcb_atom_t XConnection::atom(const char* name) const {
 std::uint32_t XConnection::number(xcb_window_t window, xcb_atom_t property) const {
     const std::string bytes = text(window, property);
     std::uint32_t value = 0;
-    if (bytes.size() >= sizeof value)
+    if (bytes.size() >= sizeof value) {
         std::memcpy(&value, bytes.data(), sizeof value);
+    }
     return value;
 }
 
@@ -41,8 +44,9 @@ std::string XConnection::text(xcb_window_t window, xcb_atom_t property) const {
     constexpr std::uint32_t mostWords = 256;
     const auto cookie = xcb_get_property(m_xcb, 0, window, property, XCB_GET_PROPERTY_TYPE_ANY, 0, mostWords);
     const XReply<xcb_get_property_reply_t> reply(xcb_get_property_reply(m_xcb, cookie, nullptr));
-    if (!reply)
+    if (!reply) {
         return {};
+    }
     const auto* bytes = static_cast<const char*>(xcb_get_property_value(reply.get()));
     return {bytes, static_cast<std::size_t>(xcb_get_property_value_length(reply.get()))};
 }
@@ -58,8 +62,9 @@ xcb_timestamp_t XConnection::now() {
     xcb_flush(m_xcb);
     while (const XReply<xcb_generic_event_t> event{xcb_wait_for_event(m_xcb)}) {
         const auto* change = reinterpret_cast<const xcb_property_notify_event_t*>(event.get());
-        if ((event->response_type & 0x7F) == XCB_PROPERTY_NOTIFY && change->window == window)
+        if ((event->response_type & 0x7F) == XCB_PROPERTY_NOTIFY && change->window == window) {
             return change->time;
+        }
     }
     return XCB_CURRENT_TIME;
 }
@@ -69,8 +74,9 @@ bool XConnection::await(std::initializer_list<xcb_window_t> windows, std::chrono
     const auto end = std::chrono::steady_clock::now() + longest;
     listen(windows, XCB_EVENT_MASK_PROPERTY_CHANGE);
     bool held = holds();
-    while (!held && waitForEvent(end))
+    while (!held && waitForEvent(end)) {
         held = holds();
+    }
     listen(windows, XCB_EVENT_MASK_NO_EVENT);
     return held;
 }
@@ -79,19 +85,22 @@ bool XConnection::waitForEvent(std::chrono::steady_clock::time_point end) {
     using std::chrono::milliseconds;
     bool any = false;
     for (;;) {
-        while (const XReply<xcb_generic_event_t> event{xcb_poll_for_event(m_xcb)})
+        while (const XReply<xcb_generic_event_t> event{xcb_poll_for_event(m_xcb)}) {
             any = true;
+        }
         const auto left = std::chrono::ceil<milliseconds>(end - std::chrono::steady_clock::now());
-        if (any || left <= milliseconds::zero() || xcb_connection_has_error(m_xcb) != 0)
+        if (any || left <= milliseconds::zero() || xcb_connection_has_error(m_xcb) != 0) {
             return any;
+        }
         pollfd waiting{xcb_get_file_descriptor(m_xcb), POLLIN, 0};
         poll(&waiting, 1, static_cast<int>(left.count()));
     }
 }
 
 void XConnection::listen(std::initializer_list<xcb_window_t> windows, std::uint32_t events) {
-    for (const xcb_window_t window : windows)
+    for (const xcb_window_t window : windows) {
         xcb_change_window_attributes(m_xcb, window, XCB_CW_EVENT_MASK, &events);
+    }
     xcb_flush(m_xcb);
 }
 
@@ -106,10 +115,12 @@ std::mutex& connectionMutex() {
 XConnection* connection() {
     static std::unique_ptr<XConnection> kept;
     const char* display = std::getenv("DISPLAY");
-    if (display == nullptr || *display == '\0')
+    if (!display || *display == '\0') {
         return nullptr;
-    if (!kept || !kept->works() || kept->display() != display)
+    }
+    if (!kept || !kept->works() || kept->display() != display) {
         kept = std::make_unique<XConnection>(display);
+    }
     return kept->works() ? kept.get() : nullptr;
 }
 

@@ -15,8 +15,9 @@
 inline bool becomesTrue(const std::function<bool()>& holds) {
     const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(10);
     while (!holds()) {
-        if (std::chrono::steady_clock::now() > end)
+        if (std::chrono::steady_clock::now() > end) {
             return false;
+        }
         poll(nullptr, 0, 5);
     }
     return true;
@@ -28,8 +29,9 @@ public:
     Peer() {
         int input[2];
         int output[2];
-        if (pipe2(input, O_CLOEXEC) != 0 || pipe2(output, O_CLOEXEC) != 0)
+        if (pipe2(input, O_CLOEXEC) != 0 || pipe2(output, O_CLOEXEC) != 0) {
             return;
+        }
         posix_spawn_file_actions_t actions;
         posix_spawn_file_actions_init(&actions);
         posix_spawn_file_actions_adddup2(&actions, input[0], 0);
@@ -43,8 +45,9 @@ public:
         m_input = input[1];
         FILE* written = fdopen(output[0], "r");
         std::size_t number = 0;
-        if (std::fscanf(written, "%zu", &number) == 1)
+        if (std::fscanf(written, "%zu", &number) == 1) {
             window = reinterpret_cast<HWND>(number);
+        }
         std::fclose(written);
         shown = becomesTrue([this] { return GetForegroundWindow() == window; });
     }
@@ -56,8 +59,9 @@ public:
 
     /// Ends the process and waits for its end.
     void end() {
-        if (m_input < 0)
+        if (m_input < 0) {
             return;
+        }
         close(m_input);
         m_input = -1;
         waitpid(process, nullptr, 0);

@@ -16,13 +16,15 @@ public:
     BOOL InitInstance() override {
         auto* frame = new CFrameWnd;
         m_pMainWnd = frame;
-        if (!frame->Create(nullptr, "Peer", WS_OVERLAPPEDWINDOW, CRect(40, 40, 340, 240)))
+        if (!frame->Create(nullptr, "Peer", WS_OVERLAPPEDWINDOW, CRect(40, 40, 340, 240))) {
             return FALSE;
+        }
         frame->ShowWindow(SW_SHOW);
         m_input = std::make_unique<QSocketNotifier>(0, QSocketNotifier::Read);
         QObject::connect(m_input.get(), &QSocketNotifier::activated, [] {
-            if (std::getchar() == EOF)
+            if (std::getchar() == EOF) {
                 AfxPostQuitMessage(0);
+            }
         });
         std::printf("%zu\n", reinterpret_cast<std::size_t>(frame->m_hWnd));
         std::fflush(stdout);

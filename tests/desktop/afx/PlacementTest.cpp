@@ -83,7 +83,7 @@ protected:
     }
     bool framed() const {
         const QWindow* native = frame->GetState()->widget()->windowHandle();
-        return native != nullptr && native->isExposed() && native->frameMargins().top() > 0;
+        return native && native->isExposed() && native->frameMargins().top() > 0;
     }
     /// The frame as the display server tells it.
     CRect onScreen() const {

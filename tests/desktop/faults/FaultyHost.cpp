@@ -32,39 +32,46 @@ private:
 FaultyApp theFaultyApp;
 
 [[noreturn]] void fail() {
-    if (theFaultyApp.m_how == "port")
+    if (theFaultyApp.m_how == "port") {
         throw Port::Exception("The layer table is damaged.");
-    if (theFaultyApp.m_how == "framework")
+    }
+    if (theFaultyApp.m_how == "framework") {
         AfxThrowMemoryException();
-    if (theFaultyApp.m_how == "number")
+    }
+    if (theFaultyApp.m_how == "number") {
         throw 42;
+    }
     throw std::runtime_error("The table of shapes has no entry 7.");
 }
 
 void failIn(const char* place) {
-    if (theFaultyApp.m_where == place)
+    if (theFaultyApp.m_where == place) {
         fail();
+    }
 }
 
 class FaultyFrame : public CFrameWnd {
 protected:
     afx_msg void OnFault() {
         failIn("command");
-        if (theFaultyApp.m_where == "box")
+        if (theFaultyApp.m_where == "box") {
             SetTimer(1, 10, nullptr);
+        }
         MessageBox("A question meanwhile?", "Question", MB_YESNO);
     }
     // Both fail again and again, also while the user reads why.
     afx_msg void OnTimer(UINT_PTR) {
-        if (theFaultyApp.m_where == "paint")
+        if (theFaultyApp.m_where == "paint") {
             Invalidate();
-        else
+        } else {
             fail();
+        }
     }
     afx_msg void OnPaint() {
         CPaintDC dc(this);
-        if (theFaultyApp.m_where != "paint")
+        if (theFaultyApp.m_where != "paint") {
             return;
+        }
         SetTimer(1, 10, nullptr);
         fail();
     }
@@ -96,13 +103,16 @@ BOOL FaultyApp::InitInstance() {
     m_how = line.Mid(m_where.GetLength()).TrimLeft();
     auto* frame = new FaultyFrame;
     m_pMainWnd = frame;
-    if (!frame->Create(nullptr, "Faulty", WS_OVERLAPPEDWINDOW, CRect(200, 150, 800, 550)))
+    if (!frame->Create(nullptr, "Faulty", WS_OVERLAPPEDWINDOW, CRect(200, 150, 800, 550))) {
         return FALSE;
+    }
     frame->ShowWindow(m_nCmdShow);
-    if (m_where == "command" || m_where == "box")
+    if (m_where == "command" || m_where == "box") {
         frame->PostMessage(WM_COMMAND, idFault);
-    if (m_where == "timer")
+    }
+    if (m_where == "timer") {
         frame->SetTimer(1, 10, nullptr);
+    }
     return TRUE;
 }
 

@@ -68,8 +68,9 @@ TEST_F(SurfaceOnScreen, ShowsDrawingOfAContextThatIsKeptOpen) {
 
 int main(int argc, char** argv) {
     testing::InitGoogleTest(&argc, argv);
-    if (GTEST_FLAG_GET(list_tests))
+    if (GTEST_FLAG_GET(list_tests)) {
         return RUN_ALL_TESTS(); // which has to work without a display
+    }
     const QApplication application(argc, argv);
     return RUN_ALL_TESTS();
 }

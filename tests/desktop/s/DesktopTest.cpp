@@ -37,8 +37,9 @@ TEST(Desktop, BringsAWindowForwardFromAnApplicationWithWindowsOfItsOwn) {
     const auto isInFront = [&](HWND window) {
         return becomesTrue([window] {
             MSG message;
-            while (PeekMessage(&message, nullptr, 0, 0, PM_REMOVE))
+            while (PeekMessage(&message, nullptr, 0, 0, PM_REMOVE)) {
                 DispatchMessage(&message);
+            }
             return GetForegroundWindow() == window;
         });
     };
@@ -57,8 +58,9 @@ TEST(Desktop, KnowsNoWindowWhereThereIsNone) {
     const unsigned long closed = idOf(peer.window);
     peer.end();
     ASSERT_TRUE(becomesTrue([closed] { return Gui_Desktop::ShowWindow(closed) == 0; }));
-    for (const unsigned long garbage : {0UL, 1UL, 0xFFFFFFFFUL, 0x80000000UL, ~0UL, 0x100000000UL + closed})
+    for (const unsigned long garbage : {0UL, 1UL, 0xFFFFFFFFUL, 0x80000000UL, ~0UL, 0x100000000UL + closed}) {
         EXPECT_EQ(Gui_Desktop::ShowWindow(garbage), 0) << garbage;
+    }
     EXPECT_EQ(Gui_Desktop::GetMainWindowID(), 0u);
     EXPECT_EQ(Gui_Desktop::GetDisplay(), nullptr);
 }

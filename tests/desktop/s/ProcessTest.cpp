@@ -17,10 +17,12 @@ public:
         started = process.Run("\"" TVX_TEST_PEER "\"", nullptr, 1, 0) == 1;
         CString text;
         // It writes its window's handle.
-        while (text.Find('\n') < 0 && process.IsActive())
+        while (text.Find('\n') < 0 && process.IsActive()) {
             process.GetOutput(text);
-        if (text.Find('\n') > 0)
+        }
+        if (text.Find('\n') > 0) {
             window = reinterpret_cast<HWND>(std::stoul(text.GetString()));
+        }
         shown = becomesTrue([this] { return GetForegroundWindow() == window; });
     }
 

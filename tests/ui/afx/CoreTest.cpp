@@ -31,9 +31,9 @@ public:
 
     BOOL create(const char* called, CWnd* parent = nullptr) {
         name = called;
-        const DWORD style = parent != nullptr ? WS_CHILD | WS_VISIBLE : WS_OVERLAPPEDWINDOW | WS_VISIBLE;
+        const DWORD style = parent ? WS_CHILD | WS_VISIBLE : WS_OVERLAPPEDWINDOW | WS_VISIBLE;
         return CreateEx(0, AfxRegisterWndClass(CS_DBLCLKS), called, style, 10, 10, 200, 120,
-                        parent != nullptr ? parent->m_hWnd : nullptr, nullptr);
+                        parent ? parent->m_hWnd : nullptr, nullptr);
     }
     QWidget* widget() const {
         return tvx::afx::peerOf(m_hWnd);

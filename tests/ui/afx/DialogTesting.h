@@ -72,7 +72,7 @@ public:
     /// The identifier of the control that has the keyboard, 0 for none.
     int focus() const {
         const CWnd* control = GetFocus();
-        return control != nullptr ? control->GetDlgCtrlID() : 0;
+        return control ? control->GetDlgCtrlID() : 0;
     }
 
 protected:
@@ -96,7 +96,7 @@ protected:
         if (script) {
             script();
         }
-        if (m_hWnd != nullptr && IsWindowVisible()) {
+        if (m_hWnd && IsWindowVisible()) {
             EndDialog(scriptDone);
         }
         return 0;
@@ -109,7 +109,7 @@ public:
     BoxAnswer() {
         QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this] {
             auto* box = dynamic_cast<QMessageBox*>(QApplication::activeModalWidget());
-            if (box != nullptr && box->isActiveWindow() && text.empty()) {
+            if (box && box->isActiveWindow() && text.empty()) {
                 text = box->text().toStdString();
                 QTest::keyClick(box, Qt::Key_Enter);
                 m_timer.stop();

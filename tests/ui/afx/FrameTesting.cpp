@@ -146,7 +146,7 @@ void FrameTest::SetUp() {
 void FrameTest::TearDown() {
     CWinApp& app = *AfxGetApp();
     app.CloseAllDocuments(FALSE);
-    if (app.m_pMainWnd != nullptr) {
+    if (app.m_pMainWnd) {
         app.m_pMainWnd->DestroyWindow();
     }
     settle();
@@ -211,7 +211,7 @@ void settle() {
 
 void key(Qt::Key key, Qt::KeyboardModifiers modifiers) {
     QWidget* target = QApplication::activePopupWidget();
-    target = target != nullptr ? target : QApplication::focusWidget();
+    target = target ? target : QApplication::focusWidget();
     ASSERT_NE(target, nullptr);
     // To the window, as the display server sends keys: only so does the toolkit ask for shortcuts first.
     QTest::keyClick(target->window()->windowHandle(), key, modifiers);
@@ -266,7 +266,7 @@ void write(const std::filesystem::path& path, const std::string& text) {
 BoxAnswer::BoxAnswer(const QString& button) {
     QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this, button] {
         auto* box = dynamic_cast<QMessageBox*>(QApplication::activeModalWidget());
-        if (box == nullptr || !box->isVisible()) {
+        if (!box || !box->isVisible()) {
             return;
         }
         const auto buttons = box->buttons();
@@ -290,7 +290,7 @@ void inDialog(std::function<void()> act) {
     QObject::connect(timer, &QTimer::timeout, timer, [timer, act = std::move(act)] {
         const QWidget* dialog = QApplication::activeModalWidget();
         const QWidget* focus = QApplication::focusWidget();
-        if (dialog != nullptr && focus != nullptr && focus->window() == dialog) {
+        if (dialog && focus && focus->window() == dialog) {
             timer->stop();
             timer->deleteLater();
             act();

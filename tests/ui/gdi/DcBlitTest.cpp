@@ -70,8 +70,9 @@ class Blit : public testing::Test {
 protected:
     Blit() {
         const COLORREF colors[] = {0, RGB(255, 0, 0), RGB(0, 255, 0), RGB(0, 0, 255), RGB(255, 255, 255)};
-        for (int x = 0; x < 5; ++x)
+        for (int x = 0; x < 5; ++x) {
             source.SetPixelV(x, 0, colors[x]);
+        }
     }
     MemoryDc source{5, 1};
     MemoryDc target{10, 2};
@@ -107,8 +108,9 @@ TEST_F(Blit, StretchesAndMirrors) {
 TEST_F(Blit, ShrinksByTheStretchingMode) {
     MemoryDc wide(6, 1), narrow(3, 1);
     const COLORREF colors[] = {0, kMask, kMask, kMask, RGB(255, 0, 0), RGB(0, 0, 255)};
-    for (int x = 0; x < 6; ++x)
+    for (int x = 0; x < 6; ++x) {
         wide.SetPixelV(x, 0, colors[x]);
+    }
     narrow.StretchBlt(0, 0, 3, 1, &wide, 0, 0, 6, 1, SRCCOPY); // black prevails
     EXPECT_EQ(narrow.picture(), "#.#\n");
     narrow.SetStretchBltMode(WHITEONBLACK);

@@ -18,8 +18,9 @@ CRect inkBox(MemoryDc& dc) {
     CRect box(dc.width, dc.height, 0, 0);
     for (int y = 0; y < dc.height; ++y) {
         for (int x = 0; x < dc.width; ++x) {
-            if (dc.GetPixel(x, y) == RGB(255, 255, 255))
+            if (dc.GetPixel(x, y) == RGB(255, 255, 255)) {
                 continue;
+            }
             box.left = std::min(box.left, x);
             box.top = std::min(box.top, y);
             box.right = std::max(box.right, x + 1);
@@ -313,8 +314,9 @@ TEST_F(DrawTextCall, BreaksBetweenWords) {
     EXPECT_EQ(dc.DrawText("one two three incomprehensibilities x", -1, &rect, DT_WORDBREAK | DT_NOCLIP),
               4 * lineHeight);
     const char* lines[] = {"one two", "three", "incomprehensibilities", "x"};
-    for (int i = 0; i < 4; ++i)
+    for (int i = 0; i < 4; ++i) {
         expected.TextOut(10, 10 + i * lineHeight, lines[i], -1);
+    }
     expectSame();
 }
 
@@ -356,10 +358,12 @@ TEST(Advances, AreThoseOfTheToolkit) {
     for (const char* face : {"MS Sans Serif", "System", "Courier"}) {
         LOGFONT description = pointFont(100, face);
         const auto font = realizeFont(description);
-        for (const std::string_view sample : samples)
+        for (const std::string_view sample : samples) {
             EXPECT_EQ(font->advances.widthOf(sample), font->metrics.horizontalAdvance(shownText(sample))) << sample;
-        for (const std::string_view whole : {"e\xCC\x81", "\xD8\xB3\xD9\x84\xD8\xA7\xD9\x85", "a\tb", "\xFF"})
+        }
+        for (const std::string_view whole : {"e\xCC\x81", "\xD8\xB3\xD9\x84\xD8\xA7\xD9\x85", "a\tb", "\xFF"}) {
             EXPECT_FALSE(font->advances.widthOf(whole)) << "a text whose characters depend on each other";
+        }
     }
 }
 

@@ -38,8 +38,9 @@ protected:
     void OnPaint() {
         CPaintDC dc(this);
         ++paints;
-        if (onPaint)
+        if (onPaint) {
             onPaint(dc);
+        }
     }
     DECLARE_MESSAGE_MAP()
 };

@@ -124,8 +124,9 @@ TEST(DeviceIndependentBits, ThatAreNotUnderstoodAreRefused) {
     size.header().biSize = 12;
     packed.header().biCompression = 1;
     colors.header().biClrUsed = 0xFFFFFFFF;
-    for (DeviceIndependentBits* bad : {&size, &depth, &packed, &empty, &huge, &colors})
+    for (DeviceIndependentBits* bad : {&size, &depth, &packed, &empty, &huge, &colors}) {
         EXPECT_EQ(bad->create(bits), nullptr);
+    }
     EXPECT_EQ(CreateDIBitmap(nullptr, nullptr, CBM_INIT, bits.data(), good.info(), DIB_RGB_COLORS), nullptr);
     EXPECT_EQ(CreateDIBitmap(nullptr, &good.header(), CBM_INIT, nullptr, good.info(), DIB_RGB_COLORS), nullptr);
     EXPECT_EQ(CreateDIBitmap(nullptr, &good.header(), CBM_INIT, bits.data(), good.info(), 7), nullptr);

@@ -269,8 +269,9 @@ TEST(SystemColors, FollowThePalette) {
     QApplication::setPalette(before);
     EXPECT_EQ(GetSysColor(-1), 0U);
     EXPECT_EQ(GetSysColorBrush(99), nullptr);
-    for (int i = 0; i <= 1; ++i)
+    for (int i = 0; i <= 1; ++i) {
         EXPECT_GT(GetSystemMetrics(i), 0);
+    }
 }
 
 TEST(Region, CombinesAreas) {

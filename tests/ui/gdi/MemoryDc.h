@@ -26,8 +26,9 @@ public:
         SetViewportOrg(0, 0);
         std::string text;
         for (int y = rect.top; y < rect.bottom; ++y) {
-            for (int x = rect.left; x < rect.right; ++x)
+            for (int x = rect.left; x < rect.right; ++x) {
                 text += character(GetPixel(x, y));
+            }
             text += '\n';
         }
         RestoreDC(saved);
@@ -39,8 +40,9 @@ public:
     /// Number of pixels that are not white.
     int inked() {
         int count = 0;
-        for (const char c : picture())
+        for (const char c : picture()) {
             count += c != '.' && c != '\n';
+        }
         return count;
     }
 

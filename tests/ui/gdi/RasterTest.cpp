@@ -12,8 +12,9 @@ namespace {
 
 std::vector<QPoint> pixelsOf(const LinePixels& line) {
     std::vector<QPoint> points;
-    for (int i = 0; i < line.count(); ++i)
+    for (int i = 0; i < line.count(); ++i) {
         points.push_back(line.at(i));
+    }
     return points;
 }
 
@@ -29,8 +30,9 @@ PointSet setOf(const std::vector<QPoint>& points) {
 PointSet setOf(const Spans& spans) {
     PointSet points(&isBefore);
     for (const Span& span : spans) {
-        for (int x = span.left; x < span.right; ++x)
+        for (int x = span.left; x < span.right; ++x) {
             points.emplace(x, span.y);
+        }
     }
     return points;
 }
@@ -117,13 +119,15 @@ TEST(PolygonSpans, OfNeighboursNeitherOverlapNorLeaveGaps) {
     std::map<std::pair<int, int>, int> covered;
     for (const auto& triangle :
          {QPolygonF({a, b, middle}), QPolygonF({b, c, middle}), QPolygonF({c, d, middle}), QPolygonF({d, a, middle})}) {
-        for (const QPoint point : setOf(fill({triangle}, FillRule::winding)))
+        for (const QPoint point : setOf(fill({triangle}, FillRule::winding))) {
             ++covered[{point.x(), point.y()}];
+        }
     }
     const PointSet whole = setOf(fill({QPolygonF({a, b, c, d})}, FillRule::winding));
     EXPECT_EQ(covered.size(), whole.size());
-    for (const auto& [point, times] : covered)
+    for (const auto& [point, times] : covered) {
         EXPECT_EQ(times, 1) << point.first << ',' << point.second;
+    }
 }
 
 TEST(PolygonSpans, FollowTheFillRule) {

@@ -37,10 +37,11 @@ public:
 protected:
     void paintEvent(QPaintEvent* event) override {
         ++paints;
-        if (onPaint)
+        if (onPaint) {
             onPaint(event->region());
-        else
+        } else {
             QPainter(this).fillRect(rect(), QColor(0, 255, 0));
+        }
     }
 };
 
@@ -184,8 +185,9 @@ TEST_F(Surface, LeavesChildWindowsAlone) {
     clear.setGeometry(100, 50, 20, 20);
     QGroupBox box(&window);
     box.setGeometry(0, 100, 100, 50);
-    for (QWidget* widget : {static_cast<QWidget*>(&child), &clear, static_cast<QWidget*>(&box)})
+    for (QWidget* widget : {static_cast<QWidget*>(&child), &clear, static_cast<QWidget*>(&box)}) {
         widget->show();
+    }
     settle();
     {
         WidgetDc dc(window);

@@ -30,9 +30,11 @@ public:
         number(info, 1, 2);
         number(info, shape.bits, 2);
         info.append(24, '\0');
-        if (shape.bits <= 8)
-            for (int i = 0; i < 1 << shape.bits; ++i)
+        if (shape.bits <= 8) {
+            for (int i = 0; i < 1 << shape.bits; ++i) {
                 number(info, palette[i % 4]);
+            }
+        }
         bytes = "BM";
         number(bytes, static_cast<std::int64_t>(14 + info.size() + shape.pixels.size()));
         number(bytes, 0);
@@ -48,8 +50,9 @@ public:
 
 private:
     static void number(std::string& bytes, std::int64_t value, int size = 4) {
-        for (int i = 0; i < size; ++i)
+        for (int i = 0; i < size; ++i) {
             bytes += static_cast<char>(value >> 8 * i);
+        }
     }
     static constexpr std::int64_t palette[] = {0x000000, 0xFF0000, 0x00FF00, 0xFFFFFF}; // blue lowest
 };

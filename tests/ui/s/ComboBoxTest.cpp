@@ -23,14 +23,16 @@ public:
         CStringList items;
         EXPECT_EQ(combo.GetContents(items), combo.GetCount());
         std::string all;
-        for (POSITION at = items.GetHeadPosition(); at;)
+        for (POSITION at = items.GetHeadPosition(); at;) {
             all += std::string(items.GetNext(at)) + ' ';
+        }
         return all;
     }
     void merge(std::initializer_list<const char*> texts, int (*compare)(const CString*, const CString*)) {
         CStringList items;
-        for (const char* text : texts)
+        for (const char* text : texts) {
             items.AddTail(text);
+        }
         combo.AddStringList(items, compare);
     }
     /// The items that the open list shows at once.

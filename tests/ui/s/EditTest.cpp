@@ -154,10 +154,12 @@ TEST(Edit, GetsALimitWhereItHasNone) {
 
     protected:
         LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
-            if (message == EM_GETLIMITTEXT)
+            if (message == EM_GETLIMITTEXT) {
                 return given;
-            if (message == EM_SETLIMITTEXT)
+            }
+            if (message == EM_SETLIMITTEXT) {
                 given = static_cast<UINT>(wParam);
+            }
             return Gui_Edit::WindowProc(message, wParam, lParam);
         }
     };
@@ -258,10 +260,11 @@ TEST(Edit, CountsBytesThroughEveryChange) {
         const int length = window.edit.GetTextLength();
         const int start = static_cast<int>((random >> 8) % static_cast<unsigned>(length + 1));
         window.edit.SetSel(start, std::min(start + static_cast<int>(random >> 4) % 9, length));
-        if (random % 7 == 0)
+        if (random % 7 == 0) {
             window.edit.Undo();
-        else
+        } else {
             window.edit.ReplaceSel(pieces[(random >> 16) % std::size(pieces)], TRUE);
+        }
         const std::string text = window.text();
         ASSERT_EQ(window.edit.GetTextLength(), static_cast<int>(text.size())) << i;
         const int line = window.edit.LineFromChar(-1);

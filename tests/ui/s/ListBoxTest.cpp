@@ -20,8 +20,9 @@ public:
         list.Create(WS_CHILD | WS_VISIBLE | WS_VSCROLL | WS_HSCROLL | style, CRect(0, 0, 200, 160), this, 1);
     }
     void fill(std::initializer_list<const char*> items) {
-        for (const char* item : items)
+        for (const char* item : items) {
             list.AddString(item);
+        }
     }
     std::string contents() {
         CStringList items;
@@ -35,13 +36,15 @@ public:
     }
     static std::string joined(const CStringList& items) {
         std::string all;
-        for (POSITION at = items.GetHeadPosition(); at;)
+        for (POSITION at = items.GetHeadPosition(); at;) {
             all += std::string(items.GetNext(at)) + ' ';
+        }
         return all;
     }
     static void add(CStringList& items, std::initializer_list<const char*> texts) {
-        for (const char* text : texts)
+        for (const char* text : texts) {
             items.AddTail(text);
+        }
     }
     int merge(std::initializer_list<const char*> texts, int (*compare)(const CString*, const CString*)) {
         CStringList items;
@@ -174,8 +177,9 @@ TEST(ListBox, ScrollsAsFarAsTheWidestItemReaches) {
 TEST(ListBox, HoldsAsManyItemsAsHostsGive) {
     ListWindow window(LBS_EXTENDEDSEL);
     CStringList items;
-    for (int i = 0; i < 65535; ++i)
+    for (int i = 0; i < 65535; ++i) {
         items.AddTail(std::to_string(i * 7919 % 65535).c_str());
+    }
     window.list.AddStringList(items, byNumber);
     EXPECT_EQ(window.list.GetCount(), 65535);
     window.list.SelItemRange(TRUE, 1000, 60999);

@@ -158,8 +158,9 @@ TEST(ProcessOutput, IsNotCutInCharactersAndLineEnds) {
         LogWindow window;
         const std::string script = std::string("printf '") + first + "'; cat " + gate + "; printf '" + second + "'";
         ASSERT_EQ(window.process.Run(("sh -c \"" + script + "\"").c_str(), nullptr, 1, 1), 1);
-        while (!window.process.AppendOutput(window.edit, nullptr))
+        while (!window.process.AppendOutput(window.edit, nullptr)) {
             window.process.Wait(1);
+        }
         EXPECT_EQ(window.text(), shown);
         std::ofstream(gate).flush();
         window.process.Wait(0xFFFFFFFF);

@@ -43,12 +43,14 @@ protected:
         return result;
     }
     LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
-        if (message != WM_APP)
+        if (message != WM_APP) {
             return Gui_QueryDlg::WindowProc(message, wParam, lParam);
+        }
         EXPECT_TRUE(waitForActive(*this));
         script();
-        if (m_hWnd && IsWindowVisible())
+        if (m_hWnd && IsWindowVisible()) {
             EndDialog(99);
+        }
         return 0;
     }
 };

@@ -120,15 +120,17 @@ TEST(Translation, OfEveryDialogFitsIntoItsControls) {
                           GUI_IDD_TOPICS, GUI_IDD_BROWSER, GUI_IDD_PROPERTIES, AFX_IDD_NEWTYPEDLG}) {
         const Frame owner;
         CDialog dialog;
-        if (!dialog.Create(id, owner.get()))
+        if (!dialog.Create(id, owner.get())) {
             continue; // a control of a class that is not there
+        }
         dialog.ShowWindow(SW_SHOW);
         for (CWnd* control = dialog.GetWindow(GW_CHILD); control; control = control->GetWindow(GW_HWNDNEXT)) {
             char className[32] = "";
             GetClassNameA(control->m_hWnd, className, sizeof className);
             const std::string text = textOf(*control);
-            if (std::string(className) != "Static" && std::string(className) != "Button")
+            if (std::string(className) != "Static" && std::string(className) != "Button") {
                 continue;
+            }
             const QSize over = excess(*control, className, text);
             EXPECT_LE(over.width(), 0) << "dialog " << id << ", \"" << text << "\"";
             EXPECT_LE(over.height(), 0) << "dialog " << id << ", \"" << text << "\"";
@@ -144,15 +146,18 @@ TEST(Translation, OfMessageBoxesWithItsMnemonics) {
     QElapsedTimer waiting;
     QObject::connect(&timer, &QTimer::timeout, [&] {
         auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
-        if (box == nullptr || !box->isActiveWindow())
-            return;
-        if (!buttons.empty()) {
-            if (waiting.hasExpired(5000)) // the mnemonic has done nothing
-                box->buttons().back()->click();
+        if (!box || !box->isActiveWindow()) {
             return;
         }
-        for (const QAbstractButton* button : box->buttons())
+        if (!buttons.empty()) {
+            if (waiting.hasExpired(5000)) { // the mnemonic has done nothing
+                box->buttons().back()->click();
+            }
+            return;
+        }
+        for (const QAbstractButton* button : box->buttons()) {
             buttons.append(button->text());
+        }
         waiting.start();
         QTest::keyClick(QApplication::focusWidget(), yes.at(language()), Qt::AltModifier);
     });
@@ -173,8 +178,9 @@ TEST(Translation, OfSystemMenus) {
 int main(int argc, char** argv) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     testing::InitGoogleTest(&argc, argv);
-    if (!tvx::afx::ensureGui())
+    if (!tvx::afx::ensureGui()) {
         return 1;
+    }
     QApplication::setStyle(QStringLiteral("Fusion"));
     return RUN_ALL_TESTS();
 }

@@ -20,8 +20,9 @@ void parse(CCommandLineInfo& info, const std::vector<std::string>& words) {
 class SwallowsLastWord : public CCommandLineInfo {
 public:
     void ParseParam(const char* param, BOOL isSwitch, BOOL isLast) override {
-        if (isSwitch && std::strcmp(param, "own") == 0)
+        if (isSwitch && std::strcmp(param, "own") == 0) {
             return;
+        }
         CCommandLineInfo::ParseParam(param, isSwitch, isLast);
     }
 };

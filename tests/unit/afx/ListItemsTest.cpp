@@ -94,8 +94,9 @@ TEST(ListItems, AgreeWithAPlainTableThroughEveryChange) {
         }
     }
     ASSERT_EQ(items.count(), std::ssize(table));
-    for (int index = 0; index < items.count(); ++index)
+    for (int index = 0; index < items.count(); ++index) {
         ASSERT_EQ(items.at(index).text, table[static_cast<std::size_t>(index)]) << index;
+    }
 }
 
 } // namespace

@@ -70,8 +70,9 @@ int causeOf(const std::string& bytes, const std::function<void(CArchive&)>& read
 void readNode(CArchive& archive) {
     CArchiveNode* node = nullptr;
     archive >> node;
-    while (node && node->m_next != node)
+    while (node && node->m_next != node) {
         delete std::exchange(node, node->m_next);
+    }
     delete node;
 }
 
@@ -131,8 +132,9 @@ TEST(Archive, TextsHaveLengthsOfOneThreeOrSevenBytes) {
     for (const auto& [length, prefix] : {std::pair(0, 1), std::pair(254, 1), std::pair(255, 3), std::pair(65533, 3),
                                          std::pair(65534, 7), std::pair(300000, 7)}) {
         CString text('t', length);
-        if (length > 1)
+        if (length > 1) {
             text.SetAt(1, '\0');
+        }
         const std::string bytes = stored([&](CArchive& archive) { archive << text; });
         EXPECT_EQ(static_cast<std::size_t>(length + prefix), bytes.size());
         loadFrom(bytes, [&](CArchive& archive) {
@@ -199,17 +201,20 @@ TEST(Archive, NumbersBeyondTheSmallTagStillFindTheirObjects) {
     constexpr int count = 40000;
     std::vector<CArchiveNode> nodes(count);
     const std::string bytes = stored([&](CArchive& archive) {
-        for (const CArchiveNode& node : nodes)
+        for (const CArchiveNode& node : nodes) {
             archive << &node;
+        }
         archive << &nodes[count - 1];
     });
     loadFrom(bytes, [](CArchive& archive) {
         CObArray loaded;
-        for (int i = 0; i <= count; ++i)
+        for (int i = 0; i <= count; ++i) {
             loaded.Add(archive.ReadObject(RUNTIME_CLASS(CArchiveNode)));
+        }
         EXPECT_EQ(loaded[count - 1], loaded[count]);
-        for (int i = 0; i < count; ++i)
+        for (int i = 0; i < count; ++i) {
             delete loaded[i];
+        }
     });
 }
 
@@ -257,8 +262,9 @@ TEST(Archive, EveryTruncationIsNoticed) {
     first.m_next = &second;
     second.m_name = "second";
     const std::string bytes = stored([&](CArchive& archive) { archive << &first; });
-    for (std::size_t length = 0; length < bytes.size(); ++length)
+    for (std::size_t length = 0; length < bytes.size(); ++length) {
         EXPECT_EQ(CArchiveException::endOfFile, causeOf(bytes.substr(0, length), readNode)) << length;
+    }
     EXPECT_EQ(-1, causeOf(bytes, readNode));
 }
 
@@ -297,8 +303,9 @@ TEST(Archive, PromisedSizesTakeNoMemory) {
 
 TEST(Archive, NestingWithoutEndIsRefused) {
     std::string bytes = bytesOf({0xFF, 0xFF, 3, 0, 12, 0}) + "CArchiveNode" + bytesOf({0});
-    for (int i = 0; i < 100000; ++i)
+    for (int i = 0; i < 100000; ++i) {
         bytes += bytesOf({1, 0x80, 0});
+    }
     EXPECT_EQ(CArchiveException::genericException, causeOf(bytes, readNode));
 }
 
@@ -329,8 +336,9 @@ TEST(Archive, ReadsLines) {
     loadFrom("one\r\ntwo\nlast", [](CArchive& archive) {
         CString line;
         CString all;
-        while (archive.ReadString(line))
+        while (archive.ReadString(line)) {
             all += "<" + line + ">";
+        }
         EXPECT_EQ("<one><two><last>", all);
     });
 }

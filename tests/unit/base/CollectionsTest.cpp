@@ -9,15 +9,17 @@ namespace {
 template <typename Collection>
 CString joined(const Collection& list) {
     CString result;
-    for (POSITION at = list.GetHeadPosition(); at;)
+    for (POSITION at = list.GetHeadPosition(); at;) {
         result += list.GetNext(at) + ",";
+    }
     return result;
 }
 
 CString joined(const CStringArray& array) {
     CString result;
-    for (const CString& element : array)
+    for (const CString& element : array) {
         result += element + ",";
+    }
     return result;
 }
 
@@ -54,8 +56,9 @@ TEST(Array, GrowsAndShrinksAnywhere) {
 TEST(Array, TakesItsOwnElementsAsArguments) {
     CStringArray array;
     array.Add("a");
-    for (int i = 0; i < 20; ++i)
+    for (int i = 0; i < 20; ++i) {
         array.Add(array[0]);
+    }
     array.InsertAt(0, array[20], 3);
     array.SetAtGrow(100, array[0]);
     EXPECT_EQ("a", array[100]);
@@ -97,15 +100,17 @@ TEST(List, LinksAtBothEndsAndBetween) {
     list.AddHead(&list);
     EXPECT_EQ("b,c,b,c,b,c,b,c,", joined(list));
     CString backwards;
-    for (POSITION at = list.GetTailPosition(); at;)
+    for (POSITION at = list.GetTailPosition(); at;) {
         backwards += list.GetPrev(at);
+    }
     EXPECT_EQ("cbcbcbcb", backwards);
 }
 
 TEST(List, Finds) {
     CStringList list;
-    for (const char* element : {"a", "b", "a"})
+    for (const char* element : {"a", "b", "a"}) {
         list.AddTail(element);
+    }
     const POSITION first = list.Find("a");
     EXPECT_EQ(list.GetHeadPosition(), first);
     EXPECT_EQ(list.GetTailPosition(), list.Find("a", first));
@@ -126,12 +131,14 @@ TEST(List, RefusesWhatIsNotThere) {
 
 TEST(List, ElementsMayBeRemovedWhileIterating) {
     CList<int, int> list;
-    for (int i = 0; i < 10; ++i)
+    for (int i = 0; i < 10; ++i) {
         list.AddTail(i);
+    }
     for (POSITION at = list.GetHeadPosition(); at;) {
         const POSITION current = at;
-        if (list.GetNext(at) % 2)
+        if (list.GetNext(at) % 2) {
             list.RemoveAt(current);
+        }
     }
     EXPECT_EQ(5, list.GetCount());
     EXPECT_EQ(8, list.GetTail());
@@ -183,8 +190,9 @@ TEST(TypedCollections, KnowWhatTheirPointersPointTo) {
     list.AddHead(&first);
     list.AddTail(&second);
     int sum = 0;
-    for (POSITION at = list.GetHeadPosition(); at;)
+    for (POSITION at = list.GetHeadPosition(); at;) {
         sum = sum * 10 + list.GetNext(at)->id;
+    }
     EXPECT_EQ(12, sum);
     EXPECT_EQ(list.GetTailPosition(), list.Find(&second));
 }

@@ -72,7 +72,7 @@ TEST(Exception, SharedOnesOutliveDelete) {
         try {
             AfxThrowMemoryException();
         } catch (CMemoryException* e) {
-            EXPECT_TRUE(first == nullptr || first == e);
+            EXPECT_TRUE(!first || first == e);
             first = e;
             e->Delete();
         }

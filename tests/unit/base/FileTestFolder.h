@@ -21,8 +21,9 @@ protected:
     }
 
     static void put(const std::string& name, const std::string& contents = "") {
-        if (const auto folder = std::filesystem::path(name).parent_path(); !folder.empty())
+        if (const auto folder = std::filesystem::path(name).parent_path(); !folder.empty()) {
             std::filesystem::create_directories(folder);
+        }
         std::ofstream(name, std::ios::binary) << contents;
     }
     static std::string get(const std::string& name) {
@@ -32,8 +33,9 @@ protected:
     /// A name below the folder in the framework's form.
     std::string drive(const std::string& rest) const {
         std::string name = "C:" + m_folder + "/" + rest;
-        for (char& character : name)
+        for (char& character : name) {
             character = character == '/' ? '\\' : character;
+        }
         return name;
     }
 

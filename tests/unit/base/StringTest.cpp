@@ -62,8 +62,9 @@ TEST(CString, TakesPartsOfItselfAsArguments) {
     text.Format("<%s|%s>", text.GetString(), text.GetString() + 2);
     EXPECT_EQ("<abab|ab>", text);
     text = "x";
-    for (int i = 0; i < 12; ++i)
+    for (int i = 0; i < 12; ++i) {
         text.Append(text.GetString(), text.GetLength());
+    }
     EXPECT_EQ(CString('x', 4096), text);
 }
 
@@ -167,8 +168,9 @@ TEST(CString, SplitsIntoFields) {
     const CString text = ";;a;b c;";
     CString fields;
     int start = 0;
-    for (CString field = text.Tokenize("; ", start); start != -1; field = text.Tokenize("; ", start))
+    for (CString field = text.Tokenize("; ", start); start != -1; field = text.Tokenize("; ", start)) {
         fields += "<" + field + ">";
+    }
     EXPECT_EQ("<a><b><c>", fields);
     expectRaised<CInvalidArgException>([&] { static_cast<void>(text.Tokenize(";", start)); });
     start = 0;
@@ -221,8 +223,9 @@ TEST(CString, KeepsRoomForWhatIsAppended) {
     CString text = "a";
     text.Preallocate(1000);
     const char* const buffer = text;
-    for (int i = 0; i < 999; ++i)
+    for (int i = 0; i < 999; ++i) {
         text.AppendChar('b');
+    }
     EXPECT_EQ(buffer, text.GetString());
     text.Truncate(2);
     text.FreeExtra();
@@ -245,8 +248,9 @@ TEST(CString, LoadsStringsFromWhoeverHoldsThem) {
     CString text = "before";
     EXPECT_FALSE(text.LoadString(7));
     tvx::setStringLoader([](HINSTANCE, UINT id, std::string& loaded) {
-        if (id == 7)
+        if (id == 7) {
             loaded = "%d of %d";
+        }
         return id == 7;
     });
     EXPECT_FALSE(text.LoadString(8));

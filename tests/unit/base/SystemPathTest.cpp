@@ -76,13 +76,15 @@ protected:
 
 private:
     static std::optional<std::string> folderOf(std::string_view root) {
-        if (root == "C:")
+        if (root == "C:") {
             return "/";
+        }
         return root == "D:" || root == "\\\\server\\share" ? std::optional(folder) : std::nullopt;
     }
     static std::optional<tvx::DriveRoot> driveOf(std::string_view path) {
-        if (path == folder || path.starts_with(folder + "/"))
+        if (path == folder || path.starts_with(folder + "/")) {
             return tvx::DriveRoot{"D:", folder};
+        }
         return tvx::DriveRoot{"C:", "/"};
     }
 };

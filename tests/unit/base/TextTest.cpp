@@ -25,8 +25,9 @@ std::string randomBytes(std::mt19937& generator) {
     // Bytes that take part in sequences come often.
     static const std::string pool = "aZ\x80\xBF\xC3\xA4\xE2\x82\xAC\xED\xA0\xF0\x9F\x98\x80\xF4\x90\xFF";
     std::string result(generator() % 12, '\0');
-    for (char& byte : result)
+    for (char& byte : result) {
         byte = pool[generator() % pool.size()];
+    }
     return result;
 }
 
@@ -71,13 +72,15 @@ TEST(Text, FindsPrefixesWithoutCase) {
 TEST(Text, StepsOverWholeSequencesAndSingleBrokenBytes) {
     const std::string mixed = "aä€😀\x80\xC3";
     std::vector<std::size_t> lengths;
-    for (std::size_t at = 0; at < mixed.size(); at += lengths.back())
+    for (std::size_t at = 0; at < mixed.size(); at += lengths.back()) {
         lengths.push_back(text::characterLength(mixed, at));
+    }
     EXPECT_EQ((std::vector<std::size_t>{1, 2, 3, 4, 1, 1}), lengths);
     EXPECT_EQ(6u, text::characterCount(mixed));
     EXPECT_EQ(0u, text::characterLength(mixed, mixed.size()));
-    for (const std::string& broken : brokenTexts)
+    for (const std::string& broken : brokenTexts) {
         EXPECT_FALSE(text::isWellFormed(broken));
+    }
     EXPECT_EQ(3u, text::characterCount("\xED\xA0\x80"));
 }
 
@@ -88,8 +91,9 @@ TEST(Text, StepsBackToWhereSteppingForwardCameFrom) {
         for (std::size_t at = 0; at < bytes.size();) {
             const std::size_t next = at + text::characterLength(bytes, at);
             EXPECT_EQ(at, text::previousCharacter(bytes, next)) << testing::PrintToString(bytes);
-            for (std::size_t inside = at; inside < next; ++inside)
+            for (std::size_t inside = at; inside < next; ++inside) {
                 EXPECT_EQ(at, text::characterStart(bytes, inside));
+            }
             at = next;
         }
     }
@@ -157,8 +161,9 @@ TEST(Text, NumbersIgnoreTheProcessLocale) {
     std::filesystem::create_directories(folder);
     const std::string command =
         "localedef -i de_DE -f ISO-8859-1 '" + (folder / "de_DE.ISO-8859-1").string() + "' 2>/dev/null";
-    if (std::system(command.c_str()) != 0)
+    if (std::system(command.c_str()) != 0) {
         GTEST_SKIP() << "this machine cannot make a locale with a decimal comma";
+    }
     ::setenv("LOCPATH", folder.c_str(), 1);
     ASSERT_NE(nullptr, std::setlocale(LC_ALL, "de_DE.ISO-8859-1"));
     char byTheLocale[16];

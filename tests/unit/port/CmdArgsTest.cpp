@@ -171,8 +171,9 @@ TEST(CmdOpcodes, UsageShowsEveryOptionWithItsHelp) {
 
 TEST(CmdOpcodes, UsageWrapsAtEightyColumnsUnderTheHelp) {
     std::string help;
-    for (int i = 0; i < 40; ++i)
+    for (int i = 0; i < 40; ++i) {
         help += "word" + std::to_string(i) + ' ';
+    }
     std::istringstream lines(usage(("scale real : " + help).c_str()));
     int indented = 0;
     for (std::string line; std::getline(lines, line);) {

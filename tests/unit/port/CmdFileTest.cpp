@@ -63,11 +63,13 @@ protected:
     static void expandInto(Words& words, const std::string& name) {
         const char* vector[] = {"exe", "-f", name.c_str()};
         const UT_CMDFILE file(3, vector);
-        for (int i = 1; i < file.getargc(); ++i)
-            if (std::strcmp(file.getargv()[i], "-f") == 0 && i + 1 < file.getargc())
+        for (int i = 1; i < file.getargc(); ++i) {
+            if (std::strcmp(file.getargv()[i], "-f") == 0 && i + 1 < file.getargc()) {
                 expandInto(words, file.getargv()[++i]);
-            else
+            } else {
                 words.emplace_back(file.getargv()[i]);
+            }
+        }
     }
     static Words expand(const std::string& name) {
         Words words;
@@ -76,8 +78,9 @@ protected:
     }
 
     std::string onlyError() const {
-        if (m_messages.messages.size() != 1 || m_messages.messages[0].type != Port_MsgMan::MsgTypeError)
+        if (m_messages.messages.size() != 1 || m_messages.messages[0].type != Port_MsgMan::MsgTypeError) {
             return std::to_string(m_messages.messages.size()) + " messages";
+        }
         return m_messages.messages[0].text;
     }
 
@@ -130,8 +133,9 @@ TEST_F(CmdFile, RefusesCyclesWhateverTheName) {
 }
 
 TEST_F(CmdFile, RefusesNestingWithoutBound) {
-    for (int i = 0; i < 100; ++i)
+    for (int i = 0; i < 100; ++i) {
         write(std::to_string(i), "x -f " + path(std::to_string(i + 1)));
+    }
     EXPECT_EQ(expand(path("0")).size(), 64u);
     EXPECT_NE(onlyError().find("is nested too deep"), std::string::npos);
 }
@@ -177,8 +181,9 @@ TEST_F(CmdFile, SilentObjectsOnlyAnswer) {
 
 TEST_F(CmdFile, TakesManyArgumentsAndLongLines) {
     std::string text;
-    for (int i = 0; i < 100'000; ++i)
+    for (int i = 0; i < 100'000; ++i) {
         text += "word" + std::to_string(i) + ' ';
+    }
     text += '"' + std::string(1 << 20, 'x') + '"';
     const Words words = expand(write("many", text));
     ASSERT_EQ(words.size(), 100'001u);

@@ -20,8 +20,9 @@ public:
 
     std::vector<std::string> texts() const {
         std::vector<std::string> result;
-        for (const Message& message : messages)
+        for (const Message& message : messages) {
             result.push_back(message.text);
+        }
         return result;
     }
 

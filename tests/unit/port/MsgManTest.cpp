@@ -24,8 +24,9 @@ Lines format(Port_MsgMan::MsgType type, const std::string& text, int width = 80,
     wchar_t** lines =
         Port_MsgManDefault::msgFormat(type, clean, width, UT_STR::MbstrToWstr(text.c_str()).c_str(), &count);
     Lines result;
-    for (int i = 0; i < count; ++i)
+    for (int i = 0; i < count; ++i) {
         result.push_back(UT_STR::WstrToMbstr(lines[i]));
+    }
     UT_STR::WDelStrings(lines, count);
     return result;
 }
@@ -104,8 +105,9 @@ TEST(MsgFormat, LosesNothingWhateverTheWidth) {
     std::erase_if(dense, [](char c) { return c == ' ' || c == '\t'; });
     for (int width = 1; width < 70; ++width) {
         std::string joined;
-        for (const std::string& line : wrap(text, width))
+        for (const std::string& line : wrap(text, width)) {
             joined += line;
+        }
         std::erase_if(joined, [](char c) { return c == ' ' || c == '\t' || c == '\n'; });
         EXPECT_EQ(joined, dense) << width;
     }
@@ -182,8 +184,9 @@ TEST(MsgMan, ErrorClassIsFourToSix) {
     origin().issueInternal("i");
     origin().issueFatal(2, "f");
     ASSERT_EQ(collector.messages.size(), 3u);
-    for (int i = 0; i < 3; ++i)
+    for (int i = 0; i < 3; ++i) {
         EXPECT_EQ(collector.messages[i].type, 4 + i);
+    }
     EXPECT_EQ(collector.getErrorCount(), 3);
     collector.resetMsgCounts();
     EXPECT_EQ(collector.getErrorCount(), 0);

@@ -110,8 +110,9 @@ TEST_F(Reading, CutsNoCharacterAndKeepsBrokenOnes) {
 
 TEST_F(Reading, PassesOverTheBoundsOfItsBuffer) {
     std::string text;
-    for (int i = 0; i < 40000; ++i)
+    for (int i = 0; i < 40000; ++i) {
         text += std::to_string(i) + "\r\n";
+    }
     Stream* stream = Port::File::open(write(text).c_str(), Port::File::AccessRead, Port::File::FlagText);
     char line[256];
     for (int i = 0; i < 40000; ++i) {

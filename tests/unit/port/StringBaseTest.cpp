@@ -17,8 +17,9 @@ TEST(StringBase, TrimsAndSplits) {
     line.Trim(" \t");
     EXPECT_EQ(line, Text("topic 1001  view"));
     std::vector<Text> words;
-    for (Text::Range range; line.NextTokenRange(range, " ");)
+    for (Text::Range range; line.NextTokenRange(range, " ");) {
         words.push_back(line.Extract(range));
+    }
     EXPECT_EQ(words, (std::vector<Text>{"topic", "1001", "view"}));
 
     Text blank("  ");
@@ -62,8 +63,10 @@ TEST(StringBase, ReplacesAndFormats) {
 }
 
 TEST(Str, WideConversionLosesNothing) {
-    for (const std::string& text : {std::string("Grüße 図面 😀"), std::string("\x80\xFF\xC0\xAF \xED\xB2\x80 \xE2\x82")})
+    for (const std::string& text :
+         {std::string("Grüße 図面 😀"), std::string("\x80\xFF\xC0\xAF \xED\xB2\x80 \xE2\x82")}) {
         EXPECT_EQ(UT_STR::WstrToMbstr(UT_STR::MbstrToWstr(text.c_str()).c_str()), text);
+    }
     EXPECT_EQ(UT_STR::WstrToMbstr(nullptr), "");
     EXPECT_EQ(UT_STR::MbstrToWstr(nullptr), L"");
     UT_STR::WDelStrings(nullptr, 3);

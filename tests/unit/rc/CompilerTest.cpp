@@ -43,8 +43,9 @@ protected:
             compile(script);
             return {};
         } catch (const rc::Fault& fault) {
-            if (fault.place.line == 0)
+            if (fault.place.line == 0) {
                 return fault.message;
+            }
             EXPECT_EQ(fs::path(fault.place.file).filename(), m_faultyFile);
             return std::to_string(fault.place.line) + ": " + fault.message;
         }
@@ -103,8 +104,9 @@ TEST_F(CompilerTest, EveryFileThatWasReadIsADependency) {
     compile("#include \"My Ids.h\"\nFIVE RCDATA \"data\\\\notes.TXT\"\n");
     EXPECT_TRUE(outputHolds("notes"));
     const std::string rule = read("host.d");
-    for (const char* name : {"host.rc", "my\\ ids.h", "Data/Notes.txt"})
+    for (const char* name : {"host.rc", "my\\ ids.h", "Data/Notes.txt"}) {
         EXPECT_NE(rule.find(name), std::string::npos) << name << " in " << rule;
+    }
 }
 
 TEST_F(CompilerTest, TextsAreReadInTheirEncoding) {
@@ -116,8 +118,9 @@ TEST_F(CompilerTest, TextsAreReadInTheirEncoding) {
     compile("STRINGTABLE BEGIN 1 \"\xE4\x80\" END\n");
     EXPECT_TRUE(outputHolds(std::string("\xE4\0\xAC\x20", 4)));
     std::string wide = "\xFF\xFE";
-    for (const char c : std::string("5 RCDATA BEGIN \"wide\" END\r\n"))
+    for (const char c : std::string("5 RCDATA BEGIN \"wide\" END\r\n")) {
         wide += {c, '\0'};
+    }
     compile(wide);
     EXPECT_TRUE(outputHolds("wide"));
 }

@@ -58,8 +58,9 @@ protected:
         theApp.start(words, [&] {
             theApp.ParseCommandLine(outcome.info);
             Gui_CmdLineArgsArray arguments;
-            if (arguments.GetVector())
+            if (arguments.GetVector()) {
                 outcome.collected.assign(arguments.GetVector(), arguments.GetVector() + arguments.GetCount());
+            }
             outcome.result = theApp.ProcessCommandLine(outcome.info);
         });
     }
@@ -78,8 +79,9 @@ protected:
     }
     static int timesIn(const std::string& text, const std::string& part) {
         int count = 0;
-        for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
+        for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
             ++count;
+        }
         return count;
     }
 
@@ -267,8 +269,9 @@ TEST_F(CommandLineInfo, ProblemsReachTheUserWithoutTheCheck) {
 
 TEST_F(CommandLineInfo, ManyWordsOfAFileArriveWhole) {
     std::string text;
-    for (int i = 0; i < 100000; ++i)
+    for (int i = 0; i < 100000; ++i) {
         text += "drawing" + std::to_string(i) + ".brd ";
+    }
     Outcome outcome;
     start(outcome, {"-f", file("many.cmd", "-nosplash " + text)});
     EXPECT_EQ(outcome.result, 1);

@@ -12,8 +12,9 @@ TEST(Desktop, KnowsNoOtherWindowsWithoutAnX11Display) {
     const SavedEnvironment environment;
     for (const char* session : {"wayland-0", ""}) {
         setenv("WAYLAND_DISPLAY", session, 1);
-        for (const unsigned long window : {0UL, 0x400006UL, 0x80000001UL, ~0UL})
+        for (const unsigned long window : {0UL, 0x400006UL, 0x80000001UL, ~0UL}) {
             EXPECT_EQ(Gui_Desktop::ShowWindow(window), 0) << session << ' ' << window;
+        }
         EXPECT_EQ(GetForegroundWindow(), nullptr);
         EXPECT_TRUE(EnumWindows([](HWND, LPARAM) -> BOOL { return FALSE; }, 0)) << "there is a window";
     }

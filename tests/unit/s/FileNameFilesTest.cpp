@@ -17,8 +17,9 @@ namespace {
 class FileNameFiles : public FileTestFolder {
 protected:
     FileNameFiles() {
-        for (const char* folder : {"work", "stick", "disc", "data"})
+        for (const char* folder : {"work", "stick", "disc", "data"}) {
             std::filesystem::create_directory(folder);
+        }
         m_table = "C=/;D=" + m_folder + "/work;E=" + m_folder + "/stick|removable;F=" + m_folder +
                   "/disc|cdrom;X=" + m_folder + "/data|\\\\Srv\\Data";
         ::setenv("TVX_DRIVES", m_table.c_str(), 1);
@@ -91,13 +92,14 @@ TEST_F(FileNameFiles, TheTextOfTheConversionStays) {
 
 TEST_F(FileNameFiles, LongFoldersAreKeptWhole) {
     std::string path = m_folder;
-    for (int i = 0; i < 8; ++i)
+    for (int i = 0; i < 8; ++i) {
         std::filesystem::current_path([&] {
             const std::string part(100, static_cast<char>('a' + i));
             std::filesystem::create_directory(part);
             path += "/" + part;
             return part;
         }());
+    }
     std::ranges::replace(path, '/', '\\');
     EXPECT_EQ(full("f"), ("C:" + path + "\\f").c_str());
     put("f");
@@ -132,8 +134,9 @@ TEST_F(FileNameFiles, AreShortenedForDisplay) {
     EXPECT_EQ(Gui_FileName("\\one\\two\\x").GetAbbreviatedName(9, 1), "\\...\\x") << "the mount as it is: none";
     // A great many folders take no time worth waiting for.
     std::string deep = "C:";
-    for (int i = 0; i < 100000; ++i)
+    for (int i = 0; i < 100000; ++i) {
         deep += "\\x";
+    }
     EXPECT_EQ(Gui_FileName((deep + "\\f").c_str()).GetAbbreviatedName(12, 0), "C:\\...\\x\\x\\f");
 }
 
@@ -184,8 +187,9 @@ TEST_F(FileNameFiles, TheMappingTellsWhetherItHolds) {
 TEST_F(FileNameFiles, NamesOfConnectionsMayBeOfAnyLength) {
     const std::string share = "\\\\server\\" + std::string(5000, 'S');
     std::string table = "C=/;D=/d|" + share + ";E=/e|\\\\server\\short";
-    for (char letter = 'F'; letter <= 'Z'; ++letter)
+    for (char letter = 'F'; letter <= 'Z'; ++letter) {
         table += std::string(";") + letter + "=/f|\\\\server\\" + std::string(150, letter);
+    }
     ::setenv("TVX_DRIVES", table.c_str(), 1);
     EXPECT_EQ(Gui_FileName("D:\\").GetMount().GetLength(), static_cast<int>(share.size()));
     EXPECT_EQ(Gui_FileName("E:\\").GetMount(), "\\\\server\\short");
@@ -276,8 +280,9 @@ TEST_F(FileNameFiles, ProgramsAreToldByTheirExtension) {
     put("work/tool.cmd");
     put("work/tool");
     EXPECT_EQ(Gui_FileName("D:\\tool.Exe").IsExecutable(), 1);
-    for (const char* name : {"D:\\tool.cmd", "D:\\tool", "D:\\missing.exe"})
+    for (const char* name : {"D:\\tool.cmd", "D:\\tool", "D:\\missing.exe"}) {
         EXPECT_EQ(Gui_FileName(name).IsExecutable(), 0) << name;
+    }
 }
 
 TEST_F(FileNameFiles, NoTextBreaksAnyQuestion) {
@@ -285,8 +290,9 @@ TEST_F(FileNameFiles, NoTextBreaksAnyQuestion) {
     const std::string alphabet = "\\\\\\//:..cdeXq\xC3\xA4\xFF srvdata";
     for (int round = 0; round < 3000; ++round) {
         std::string text(random() % 20, ' ');
-        for (char& character : text)
+        for (char& character : text) {
             character = alphabet[random() % alphabet.size()];
+        }
         const Gui_FileName name(text.c_str());
         const CString whole = name.GetFullName();
         // Once completed, completing changes nothing more, except that network names get their separators in order.

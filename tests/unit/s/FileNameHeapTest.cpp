@@ -15,7 +15,7 @@ thread_local int allocationsLeft = -1;
 /// exception.
 /// @return how often it failed
 int failuresOf(const std::function<void()>& function) {
-    for (int allocations = 0;; ++allocations)
+    for (int allocations = 0;; ++allocations) {
         try {
             allocationsLeft = allocations;
             function();
@@ -28,14 +28,16 @@ int failuresOf(const std::function<void()>& function) {
             allocationsLeft = -1;
             ADD_FAILURE() << "the standard exception, after allocation " << allocations;
         }
+    }
 }
 
 } // namespace
 
 [[gnu::noinline]] void* operator new(std::size_t size) {
     void* memory = allocationsLeft == 0 ? nullptr : std::malloc(size ? size : 1);
-    if (!memory)
+    if (!memory) {
         throw std::bad_alloc();
+    }
     allocationsLeft -= allocationsLeft > 0;
     return memory;
 }

@@ -96,8 +96,9 @@ TEST_F(FileName, SettersCompleteTheirPart) {
     name.SetMount("\\\\server\\share");
     EXPECT_EQ(name.GetName(), "\\\\server\\sharenew.brd");
     for (const auto set :
-         {&Gui_FileName::SetMount, &Gui_FileName::SetPath, &Gui_FileName::SetBase, &Gui_FileName::SetExtension})
+         {&Gui_FileName::SetMount, &Gui_FileName::SetPath, &Gui_FileName::SetBase, &Gui_FileName::SetExtension}) {
         (name.*set)(nullptr);
+    }
     EXPECT_EQ(name.IsEmpty(), 1);
     EXPECT_EQ(partsOf(Gui_FileName("c", "p", nullptr, "e")), (Parts{"c:", "p\\", "", ".e"}));
 }
@@ -136,10 +137,12 @@ TEST_F(FileName, AnswersAboutItsParts) {
     EXPECT_EQ(name.HasAbsolutePath(), 0);
     EXPECT_EQ(name.HasRelativePath(), 1);
     EXPECT_EQ(Gui_FileName("x").HasRelativePath(), 1);
-    for (const char* extension : {"TXT", ".Txt", "txt"})
+    for (const char* extension : {"TXT", ".Txt", "txt"}) {
         EXPECT_EQ(name.HasExtension(extension), 1) << extension;
-    for (const char* extension : {"tx", "txtx", ".", "", static_cast<const char*>(nullptr)})
+    }
+    for (const char* extension : {"tx", "txtx", ".", "", static_cast<const char*>(nullptr)}) {
         EXPECT_EQ(name.HasExtension(extension), 0);
+    }
     EXPECT_EQ(Gui_FileName("dir.d\\a").HasExtension(""), 1);
     EXPECT_EQ(Gui_FileName("a.").HasExtension(""), 0);
     EXPECT_EQ(Gui_FileName("a.").HasExtension("."), 1);
@@ -200,11 +203,13 @@ TEST_F(FileName, AnyTextIsKeptWhole) {
     const std::string alphabet = "\\\\//::..aB \xC3\xA4\xFF";
     for (int round = 0; round < 20000; ++round) {
         std::string text(random() % 24, ' ');
-        for (char& character : text)
+        for (char& character : text) {
             character = alphabet[random() % alphabet.size()];
+        }
         std::string expected = text;
-        for (char& character : expected)
+        for (char& character : expected) {
             character = character == '/' ? '\\' : character;
+        }
         const Gui_FileName name(text.c_str());
         const CString composed = name.GetName();
         if (!text.starts_with("\\\\")) {

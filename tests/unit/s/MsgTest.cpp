@@ -10,8 +10,9 @@ namespace {
 
 std::string expand(const char* format, std::initializer_list<const char*> parameters) {
     Gui_Msg message(format);
-    for (const char* parameter : parameters)
+    for (const char* parameter : parameters) {
         message << parameter;
+    }
     return std::string(message.GetValue().View());
 }
 

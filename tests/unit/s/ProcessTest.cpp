@@ -33,8 +33,9 @@ std::string drain(Gui_Process& process) {
     std::string text;
     CString piece;
     while (process.IsActive() || process.HasOutput()) {
-        while (process.GetOutput(piece))
+        while (process.GetOutput(piece)) {
             text += std::string(piece.GetString(), static_cast<std::size_t>(piece.GetLength()));
+        }
         process.Wait(2);
     }
     return text;
@@ -45,21 +46,24 @@ std::string firstLine(Gui_Process& process) {
     std::string text;
     CString piece;
     while (text.find('\n') == std::string::npos && (process.IsActive() || process.HasOutput())) {
-        if (process.GetOutput(piece))
+        if (process.GetOutput(piece)) {
             text += piece.GetString();
+        }
     }
     return text.substr(0, text.find('\n'));
 }
 
 void awaitEnd(unsigned long processId) {
-    while (Gui_Process::IsActive(processId))
+    while (Gui_Process::IsActive(processId)) {
         ::usleep(1000);
+    }
 }
 
 std::size_t openDescriptors() {
     std::size_t count = 0;
-    for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator("/proc/self/fd"))
+    for ([[maybe_unused]] const auto& entry : std::filesystem::directory_iterator("/proc/self/fd")) {
         ++count;
+    }
     return count;
 }
 
@@ -231,11 +235,13 @@ TEST(Process, HundredsOfChildrenLeaveNothingBehind) {
     const std::size_t before = openDescriptors();
     for (int index = 0; index < 400; ++index) {
         Gui_Process process;
-        if (index % 2 == 0)
+        if (index % 2 == 0) {
             process.SetReleasePolicy(Gui_Process::LeaveRunning, 0);
+        }
         ASSERT_EQ(process.Run(index % 3 == 0 ? "sleep 0.05" : "true", nullptr, index % 4 == 0, 0), 1) << index;
-        if (index % 5 == 0)
+        if (index % 5 == 0) {
             process.Wait(0xFFFFFFFF);
+        }
     }
     awaitReleased();
     EXPECT_FALSE(hasChildren());
@@ -252,8 +258,9 @@ TEST(Process, OutlivesTheHostAndItsTerminal) {
         process.RunWaitForWindow("sleep 1000", nullptr, 0);
         const unsigned long id = process.GetProcessId();
         [[maybe_unused]] const auto written = ::write(pipe[1], &id, sizeof id);
-        for (;;)
+        for (;;) {
             ::pause();
+        }
     }
     unsigned long id = 0;
     ASSERT_EQ(::read(pipe[0], &id, sizeof id), static_cast<ssize_t>(sizeof id));
@@ -281,8 +288,9 @@ TEST(ProcessLiveness, EndedProcessIsNotAlive) {
 TEST(ProcessLiveness, KnowsProcessesOfOthersAndNumbersThatAreNone) {
     EXPECT_EQ(Gui_Process::IsActive(static_cast<unsigned long>(::getpid())), 1);
     EXPECT_EQ(Gui_Process::IsActive(1), 1);
-    for (const unsigned long none : {0UL, 0x7FFFFFFFUL, 0xFFFFFFFFUL, std::numeric_limits<unsigned long>::max()})
+    for (const unsigned long none : {0UL, 0x7FFFFFFFUL, 0xFFFFFFFFUL, std::numeric_limits<unsigned long>::max()}) {
         EXPECT_EQ(Gui_Process::IsActive(none), 0) << none;
+    }
     // Numbers of threads are drawn from the same row.
     std::thread([] { EXPECT_EQ(Gui_Process::IsActive(static_cast<unsigned long>(::gettid())), 0); }).join();
 }
@@ -290,8 +298,9 @@ TEST(ProcessLiveness, KnowsProcessesOfOthersAndNumbersThatAreNone) {
 TEST(ProcessExitCodes, AreClassified) {
     EXPECT_EQ(Gui_Process::IsAbortExitCode(0xC000013A), 1);
     EXPECT_EQ(Gui_Process::IsCrashExitCode(0xC000013A), 0);
-    for (const unsigned long crash : {0xC0000005UL, 0x80000003UL, 0x40000000UL})
+    for (const unsigned long crash : {0xC0000005UL, 0x80000003UL, 0x40000000UL}) {
         EXPECT_EQ(Gui_Process::IsCrashExitCode(crash), 1) << crash;
+    }
     for (const unsigned long code : {0x3FFFFFFFUL, 0UL, 1UL}) {
         EXPECT_EQ(Gui_Process::IsCrashExitCode(code), 0) << code;
         EXPECT_EQ(Gui_Process::IsAbortExitCode(code), 0) << code;

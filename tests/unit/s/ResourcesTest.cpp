@@ -65,8 +65,9 @@ const std::uint8_t* find(LPCSTR name, LPCSTR type, DWORD& size) {
 
 int number(const std::uint8_t* bytes, int size) {
     int value = 0;
-    for (int i = size; i-- > 0;)
+    for (int i = size; i-- > 0;) {
         value = value << 8 | bytes[i];
+    }
     return value;
 }
 
@@ -96,8 +97,9 @@ TEST(Resources, EveryStringIsThereAndNoOther) {
 
 TEST(Resources, EveryDialogAndTheMenuAreThere) {
     DWORD size = 0;
-    for (int id = GUI_IDD_SPLASH; id <= GUI_IDD_PROPERTIES; ++id)
+    for (int id = GUI_IDD_SPLASH; id <= GUI_IDD_PROPERTIES; ++id) {
         EXPECT_NE(find(MAKEINTRESOURCE(id), RT_DIALOG, size), nullptr) << id;
+    }
     EXPECT_NE(find(MAKEINTRESOURCE(GUI_IDM_CONSOLE), RT_MENU, size), nullptr);
 }
 

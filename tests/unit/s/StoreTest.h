@@ -25,8 +25,9 @@ protected:
     /// A text as the store holds it, or what it holds instead.
     static std::string stored(const std::string& path, const char* name) {
         HKEY key = nullptr;
-        if (RegOpenKeyExA(HKEY_CURRENT_USER, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS)
+        if (RegOpenKeyExA(HKEY_CURRENT_USER, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS) {
             return "<no key>";
+        }
         char text[100] = {};
         DWORD size = sizeof text;
         DWORD type = REG_NONE;

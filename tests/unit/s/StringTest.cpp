@@ -14,8 +14,9 @@ enum Quotes { Heed = 0, Ignore = 1 };
 Fields split(const Gui_String& text, const char* separators, Empty empty, Quotes quotes) {
     const std::unique_ptr<CStringArray> array(text.GetStringArray(separators, empty, quotes));
     Fields fields;
-    for (INT_PTR i = 0; i < array->GetSize(); ++i)
+    for (INT_PTR i = 0; i < array->GetSize(); ++i) {
         fields.emplace_back(array->GetAt(i).View());
+    }
     return fields;
 }
 
@@ -34,8 +35,9 @@ TEST(String, IntegersMustBeTheWholeText) {
     EXPECT_EQ(number(" 42", 10), 42);
     EXPECT_EQ(number("-42", 10), -42);
     EXPECT_EQ(number("", 10), 0);
-    for (const char* text : {"42 ", "4x2", "x", " ", "0x1A", "+", "1.5"})
+    for (const char* text : {"42 ", "4x2", "x", " ", "0x1A", "+", "1.5"}) {
         EXPECT_EQ(number(text, 10), -77) << text;
+    }
     int value = 5;
     EXPECT_EQ(Gui_String("42\0", 3).GetIntValue(value, 10), 0);
     EXPECT_EQ(value, 5);

@@ -21,8 +21,9 @@ public:
     void start(std::vector<std::string> words, std::function<void()> body) {
         words.insert(words.begin(), "testapp");
         std::vector<char*> arguments;
-        for (std::string& word : words)
+        for (std::string& word : words) {
             arguments.push_back(word.data());
+        }
         boxes.clear();
         m_body = std::move(body);
         AfxWinMain(static_cast<int>(arguments.size()), arguments.data());

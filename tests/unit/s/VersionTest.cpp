@@ -173,8 +173,9 @@ TEST_F(InstallInfo, SaysEachTimeWhatIsMissing) {
 TEST_F(InstallInfo, RefusesRootsThatAreTooLong) {
     // The longest root that fits: its path and the zero fill 516 bytes.
     std::string root = m_root;
-    while (root.size() + 2 <= 503)
+    while (root.size() + 2 <= 503) {
         root += "/.";
+    }
     root.resize(503, '/');
     write("::key=value\n");
     ::setenv("TARVEX", root.c_str(), 1);

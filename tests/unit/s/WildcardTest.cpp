@@ -19,20 +19,23 @@ int match(const std::string& text, const std::string& pattern) {
 
 /// One row of the table of what begins where: which ends of the text the pattern so far can reach.
 bool referenceMatch(std::string_view text, std::string_view pattern) {
-    if (std::ranges::count(pattern, '*') > 10)
+    if (std::ranges::count(pattern, '*') > 10) {
         return false;
+    }
     std::vector<bool> reached(text.size() + 1);
     reached[0] = true;
     for (const char wanted : pattern) {
         std::vector<bool> next(text.size() + 1);
         for (std::size_t at = 0; at <= text.size(); ++at) {
             const std::size_t length = at < text.size() ? tvx::text::characterLength(text, at) : 0;
-            if (!reached[at])
+            if (!reached[at]) {
                 continue;
+            }
             if (wanted == '*') {
                 next[at] = true;
-                if (length != 0)
+                if (length != 0) {
                     reached[at + length] = true;
+                }
             } else if (length != 0 && (wanted == '?' || text[at] == wanted)) {
                 next[at + (wanted == '?' ? length : 1)] = true;
             }
@@ -45,10 +48,12 @@ bool referenceMatch(std::string_view text, std::string_view pattern) {
 } // namespace
 
 TEST(Wildcard, MatchesWholeTexts) {
-    for (const char* pattern : {"*.cpp", "m?in.*", "*", "main.cpp", "*main.cpp*", "m*.*p", "????????", "m*i*.*p*"})
+    for (const char* pattern : {"*.cpp", "m?in.*", "*", "main.cpp", "*main.cpp*", "m*.*p", "????????", "m*i*.*p*"}) {
         EXPECT_EQ(match("main.cpp", pattern), 1) << pattern;
-    for (const char* pattern : {"*.CPP", "main", "", "?", "main.cpp?", "ain.cpp", "m*x*p", "*.cppx", "main.cpp*p"})
+    }
+    for (const char* pattern : {"*.CPP", "main", "", "?", "main.cpp?", "ain.cpp", "m*x*p", "*.cppx", "main.cpp*p"}) {
         EXPECT_EQ(match("main.cpp", pattern), 0) << pattern;
+    }
     EXPECT_EQ(match("", ""), 1);
     EXPECT_EQ(match("", "***"), 1);
     EXPECT_EQ(match("", "?"), 0);
@@ -83,8 +88,9 @@ TEST(Wildcard, AgreesWithTheTableOfAllWays) {
     const std::vector<std::string> signs = {"a", "b", "é", "*", "?", "*a", "**", "\xA9"};
     const auto build = [&](const std::vector<std::string>& parts, unsigned most) {
         std::string built;
-        for (unsigned left = random() % (most + 1); left > 0; --left)
+        for (unsigned left = random() % (most + 1); left > 0; --left) {
             built += parts[random() % parts.size()];
+        }
         return built;
     };
     int matched = 0;

@@ -77,8 +77,9 @@ TEST(WinAppFiles, TemplatesBringTheirEntriesAndTheDefaultExtension) {
     EXPECT_TRUE(theApp.GetFilterForFileDialog(nullptr, 0).IsEmpty());
 
     auto* const notes = new Template("Notes", ".nts");
-    for (CDocTemplate* added : {new Template("Drawings", ".brd"), new Template("Console", ""), notes})
+    for (CDocTemplate* added : {new Template("Drawings", ".brd"), new Template("Console", ""), notes}) {
         theApp.AddDocTemplate(added);
+    }
     EXPECT_EQ(theApp.GetFilterForFileDialog(nullptr, 0).View(), "Drawings\0*.brd\0Notes\0*.nts\0\0"s);
     EXPECT_TRUE(theApp.GetFilterForFileDialog(nullptr, 1).View().ends_with("*.nts\0All Files (*.*)\0*.*\0\0"s));
     EXPECT_EQ(theApp.GetFilterForFileDialog(notes, 0).View(), "Notes\0*.nts\0\0"s);

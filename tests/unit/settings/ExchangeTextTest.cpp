@@ -99,8 +99,9 @@ TEST(ExchangeText, TakesOtherTextsForTheWesternCodePage) {
 
 TEST(ExchangeText, GivesBackWhatWasWritten) {
     std::string allBytes;
-    for (int i = 0; i < 600; ++i)
+    for (int i = 0; i < 600; ++i) {
         allBytes += static_cast<char>(i % 256);
+    }
     const std::vector<Setting> settings = {
         {"", REG_SZ, std::string("x\0", 2)},
         {"quoted \"\\ name\n\x7F\xFF", REG_SZ, std::string("\"C:\\größe\\\"\0", 14)},
@@ -116,8 +117,9 @@ TEST(ExchangeText, GivesBackWhatWasWritten) {
         {"several", REG_MULTI_SZ, std::string("a\0b\0\0", 5)},
     };
     std::string text = writeHeader() + writeKey({HKEY_CURRENT_USER, "a ] b"});
-    for (const Setting& setting : settings)
+    for (const Setting& setting : settings) {
         text += writeSetting(setting);
+    }
     const auto changes = readExchangeText(text);
     ASSERT_EQ(changes.size(), settings.size() + 1);
     EXPECT_EQ(changes[0].key.path, "a ] b");

@@ -14,8 +14,9 @@ public:
     explicit ChildProcess(const std::function<void(ChildProcess&)>& body) {
         int report[2];
         int order[2];
-        if (pipe(report) != 0 || pipe(order) != 0)
+        if (pipe(report) != 0 || pipe(order) != 0) {
             std::abort();
+        }
         m_id = fork();
         const bool isChild = m_id == 0;
         m_read = isChild ? order[0] : report[0];
@@ -28,8 +29,9 @@ public:
         }
     }
     ~ChildProcess() {
-        if (m_id > 0)
+        if (m_id > 0) {
             kill();
+        }
         close(m_read);
         close(m_write);
     }
@@ -38,8 +40,9 @@ public:
 
     /// To the other side.
     void send(int number) const {
-        if (::write(m_write, &number, sizeof number) != sizeof number)
+        if (::write(m_write, &number, sizeof number) != sizeof number) {
             _exit(3);
+        }
     }
     /// From the other side; -1 when it has ended.
     [[nodiscard]] int receive() const {

@@ -30,15 +30,17 @@ TEST(CommandLine, SplitsByThePlatformsRules) {
         {R"("open end)", {"open end"}},
         {R"(tail\)", {R"(tail\)"}},
     };
-    for (const auto& [line, words] : cases)
+    for (const auto& [line, words] : cases) {
         EXPECT_EQ(splitArguments(line), words) << line;
+    }
 }
 
 TEST(CommandLine, FindsTheProgramsName) {
     const auto programs = [](std::string_view line) {
         Words names;
-        for (const CommandLine& reading : readings(line))
+        for (const CommandLine& reading : readings(line)) {
             names.emplace_back(reading.program);
+        }
         return names;
     };
     EXPECT_EQ(programs("  "), Words());
@@ -65,6 +67,7 @@ TEST(CommandLine, NamesReachTheChildInTheSystemsForm) {
     EXPECT_EQ(wordForChild("file:///C:" + name + "/a%20b/y.htm#part 2"), "file://" + name + "/a%20b/y.htm#part 2");
     EXPECT_EQ(wordForChild("file:///C|" + name + "\\a b\\x%20#1.htm"), "file://" + name + "/a%20b/x%2520%231.htm");
     for (const char* kept : {"C:", "C:y.htm", "-o", "/opt/x", "a\\b", "\\\\d+\\w", "Q:\\x", "file:///opt/a b.htm",
-                             "file:", "http://C|/x", "50%", ""})
+                             "file:", "http://C|/x", "50%", ""}) {
         EXPECT_EQ(wordForChild(kept), kept);
+    }
 }

@@ -71,8 +71,9 @@ TEST(DriveTable, SharesAreNamedAfterServerAndFolder) {
     EXPECT_EQ(shareOf("fuse.davfs", "https://cloud.example/dav/me"), "\\\\cloud.example\\me");
     EXPECT_EQ(shareOf("fuse.sshfs", "me@files:a/odd:/work"), "\\\\files-a-odd\\work");
     EXPECT_EQ(shareOf("ceph", "10.0.0.1:6789,10.0.0.2:6789:/vol"), "\\\\10.0.0.1-6789\\vol");
-    for (const char* source : {"nothing", ":/x", "//", "@:/x"})
+    for (const char* source : {"nothing", ":/x", "//", "@:/x"}) {
         EXPECT_EQ(shareOf("nfs", source), "") << source;
+    }
 }
 
 TEST(DriveTable, SharesOfOneServerHaveDifferentNames) {
@@ -82,8 +83,9 @@ TEST(DriveTable, SharesOfOneServerHaveDifferentNames) {
 
 TEST(DriveTable, SharesWithoutALetterAreStillConnected) {
     std::string mounts;
-    for (int i = 100; i < 130; ++i)
+    for (int i = 100; i < 130; ++i) {
         mounts += "1 1 0:9 / /mnt/" + std::to_string(i) + " rw - nfs s:/" + std::to_string(i) + " rw\n";
+    }
     const DriveTable table = fromMounts(mounts);
     EXPECT_EQ(table.find('Z')->folder, "/mnt/122");
     ASSERT_NE(table.findShare("\\\\S\\129"), nullptr);

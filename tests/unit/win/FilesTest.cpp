@@ -18,8 +18,9 @@ namespace {
 class Files : public FileTestFolder {
 protected:
     Files() {
-        for (const char* folder : {"work", "stick", "disc", "data"})
+        for (const char* folder : {"work", "stick", "disc", "data"}) {
             std::filesystem::create_directory(folder);
+        }
         const std::string table = "C=/;D=" + m_folder + "/work;E=" + m_folder + "/stick|removable;F=" + m_folder +
                                   "/disc|cdrom;X=" + m_folder + "/data|\\\\Srv\\Data";
         ::setenv("TVX_DRIVES", table.c_str(), 1);
@@ -49,8 +50,9 @@ TEST_F(Files, DrivesAreOfTheirKind) {
     EXPECT_EQ(GetDriveTypeA("\\\\SRV\\data\\"), DRIVE_REMOTE);
     EXPECT_EQ(GetDriveTypeA("\\\\srv/data"), DRIVE_REMOTE);
     EXPECT_EQ(GetDriveTypeA(nullptr), DRIVE_FIXED);
-    for (const char* name : {"G:\\", "\\\\srv\\other", "\\\\", "", "stick", "\\"})
+    for (const char* name : {"G:\\", "\\\\srv\\other", "\\\\", "", "stick", "\\"}) {
         EXPECT_EQ(GetDriveTypeA(name), DRIVE_NO_ROOT_DIR) << name;
+    }
 }
 
 TEST_F(Files, WithoutATableThereIsTheSystemsRoot) {
@@ -73,8 +75,9 @@ TEST_F(Files, TheCurrentFolderIsSeenThroughTheTable) {
     EXPECT_EQ(_getdcwd(4, buffer, 6), nullptr);
     EXPECT_EQ(errno, ERANGE);
     EXPECT_STREQ(_getdcwd(5, buffer, 7), "E:\\");
-    for (const int none : {1, 27, -1})
+    for (const int none : {1, 27, -1}) {
         EXPECT_EQ(_getdcwd(none, buffer, 7), nullptr) << none;
+    }
     const std::unique_ptr<char, void (*)(void*)> made(_getdcwd(0, nullptr, 0), &std::free);
     EXPECT_STREQ(made.get(), "D:\\sub");
     std::filesystem::current_path("..");
@@ -110,8 +113,9 @@ TEST_F(Files, AttributesTellWhatIsThere) {
     EXPECT_EQ(failing(GetFileAttributesA("dangling")), ERROR_FILE_NOT_FOUND);
     EXPECT_EQ(failing(GetFileAttributesA("D:\\missing")), ERROR_FILE_NOT_FOUND);
     EXPECT_EQ(failing(GetFileAttributesA("D:\\a.txt\\below")), ERROR_PATH_NOT_FOUND);
-    for (const char* name : {"Q:\\a", "\\\\none\\here", "", static_cast<const char*>(nullptr)})
+    for (const char* name : {"Q:\\a", "\\\\none\\here", "", static_cast<const char*>(nullptr)}) {
         EXPECT_EQ(failing(GetFileAttributesA(name)), ERROR_PATH_NOT_FOUND);
+    }
 }
 
 TEST_F(Files, AreCreatedAndKeptFromOthers) {

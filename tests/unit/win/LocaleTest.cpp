@@ -20,8 +20,9 @@ class Locale : public testing::Test {
 void setLanguage(const char* all, const char* messages = nullptr, const char* lang = nullptr) {
     const std::pair<const char*, const char*> variables[] = {
         {"LC_ALL", all}, {"LC_MESSAGES", messages}, {"LANG", lang}};
-    for (const auto& [name, value] : variables)
+    for (const auto& [name, value] : variables) {
         value ? setenv(name, value, 1) : unsetenv(name);
+    }
 }
 
 LCID localeFor(const char* name) {
@@ -47,8 +48,9 @@ TEST_F(Locale, ComesFromTheEnvironment) {
     EXPECT_EQ(localeFor("pt"), 0x0416u);
     EXPECT_EQ(localeFor("sr_RS.UTF-8@latin"), 0x081Au);
     EXPECT_EQ(localeFor("sr_RS@elsewhere"), 0x0C1Au);
-    for (const char* english : {"C", "C.UTF-8", "POSIX", "eo", "xx_YY", "@", "_", ".", "de.", "DE"})
+    for (const char* english : {"C", "C.UTF-8", "POSIX", "eo", "xx_YY", "@", "_", ".", "de.", "DE"}) {
         EXPECT_EQ(localeFor(english), std::string_view(english) == "de." ? 0x0407u : 0x0409u) << english;
+    }
 }
 
 TEST_F(Locale, TakesTheFirstVariableThatIsNotEmpty) {

@@ -27,8 +27,9 @@ struct BitmapData {
         bytes.resize(40);
     }
     BitmapData& number(std::uint32_t value, int size) {
-        for (int i = 0; i < size; ++i)
+        for (int i = 0; i < size; ++i) {
             bytes.push_back(static_cast<std::uint8_t>(value >> 8 * i));
+        }
         return *this;
     }
 };

@@ -61,8 +61,9 @@ public:
         std::string text;
         char buffer[4096];
         DWORD count = 0;
-        while (std::ranges::count(text, '\n') < lines && ReadFile(output_, buffer, sizeof buffer, &count, nullptr))
+        while (std::ranges::count(text, '\n') < lines && ReadFile(output_, buffer, sizeof buffer, &count, nullptr)) {
             text.append(buffer, count);
+        }
         return text;
     }
 
@@ -105,8 +106,9 @@ protected:
 std::string lineWith(const std::string& text, const std::string& start) {
     std::istringstream lines(text);
     for (std::string line; std::getline(lines, line);) {
-        if (line.starts_with(start))
+        if (line.starts_with(start)) {
             return line;
+        }
     }
     return {};
 }
@@ -229,8 +231,9 @@ TEST(ProcessInheritance, OnlyTheThreeDescriptorsAreInherited) {
 
 TEST(ProcessInheritance, StandardDescriptorsMayBeClosedHere) {
     const int kept[] = {::dup(0), ::dup(1), ::dup(2)};
-    for (int descriptor = 0; descriptor < 3; ++descriptor)
+    for (int descriptor = 0; descriptor < 3; ++descriptor) {
         ::close(descriptor);
+    }
     // What is made now gets their numbers at first.
     std::optional<Child> child(std::in_place,
                                shell("echo out; echo err >&2; readlink /proc/self/fd/0; exec sleep 1000"));
@@ -302,8 +305,9 @@ TEST(ProcessInheritance, OnlyInheritableEndsReachTheChild) {
     EXPECT_EQ(WaitForSingleObject(child.hProcess, INFINITE), WAIT_OBJECT_0);
     EXPECT_FALSE(PeekNamedPipe(readEnd, nullptr, 0, nullptr, nullptr, nullptr));
     EXPECT_EQ(GetLastError(), ERROR_BROKEN_PIPE);
-    for (const HANDLE handle : {readEnd, child.hProcess, child.hThread})
+    for (const HANDLE handle : {readEnd, child.hProcess, child.hThread}) {
         EXPECT_TRUE(CloseHandle(handle));
+    }
 }
 
 TEST(Handles, StaleAndForeignOnesAreRefused) {
@@ -340,8 +344,9 @@ TEST(ProcessEnd, IsSeenWhenAHandlerOfTheHostCollectsAllChildren) {
 TEST(ProcessEnd, RingsTheBellOfReleasedChildren) {
     auto& released = tvx::win::ReleasedChildren::instance();
     // Children of other tests that run in this process.
-    for (; released.count() > 0; released.collect())
+    for (; released.count() > 0; released.collect()) {
         tvx::win::waitReadable(released.bell(), INFINITE);
+    }
     DWORD id = 0;
     {
         const Child child("sleep 1000");

@@ -29,8 +29,9 @@ protected:
         tvx::setRegistryNotice([](const std::string& text) { notices.push_back(text); });
     }
     ~RegistryFaults() override {
-        if (geteuid() != getuid() && seteuid(getuid()) != 0)
+        if (geteuid() != getuid() && seteuid(getuid()) != 0) {
             std::abort();
+        }
         tvx::setRegistryNotice(nullptr);
     }
 
@@ -52,20 +53,26 @@ protected:
     }
     [[nodiscard]] std::vector<fs::path> setAside() const {
         std::vector<fs::path> found;
-        for (const auto& entry : fs::directory_iterator(m_sandbox.file.parent_path()))
-            if (entry.path().filename().string().starts_with("registry-damaged-") && entry.path().extension() == ".db")
+        for (const auto& entry : fs::directory_iterator(m_sandbox.file.parent_path())) {
+            if (entry.path().filename().string().starts_with("registry-damaged-") &&
+                entry.path().extension() == ".db") {
                 found.push_back(entry.path());
+            }
+        }
         return found;
     }
     /// Goes on as a user whom the modes of files hold back, where the tests run as one whom they do not.
     void becomeOrdinary() const {
         tvx::registry::closeStores();
-        if (geteuid() != 0)
+        if (geteuid() != 0) {
             return;
-        for (fs::path folder = m_sandbox.folder; folder != "/"; folder = folder.parent_path())
+        }
+        for (fs::path folder = m_sandbox.folder; folder != "/"; folder = folder.parent_path()) {
             fs::permissions(folder, fs::perms::group_exec | fs::perms::others_exec, fs::perm_options::add);
-        for (const auto& entry : fs::recursive_directory_iterator(m_sandbox.folder))
+        }
+        for (const auto& entry : fs::recursive_directory_iterator(m_sandbox.folder)) {
             ASSERT_EQ(chown(entry.path().c_str(), nobody, nobody), 0);
+        }
         ASSERT_EQ(chown(m_sandbox.folder.c_str(), nobody, nobody), 0);
         ASSERT_EQ(seteuid(nobody), 0);
     }
@@ -86,8 +93,9 @@ TEST_F(RegistryFaults, DamagedFileIsSetAsideAndToldOnce) {
         EXPECT_EQ(key.read("a"), "1");
         ASSERT_EQ(setAside().size(), before + 1);
         std::vector<std::string> kept;
-        for (const fs::path& file : setAside())
+        for (const fs::path& file : setAside()) {
             kept.push_back(contents(file));
+        }
         EXPECT_TRUE(std::ranges::find(kept, bytes) != kept.end());
     }
 }
@@ -97,8 +105,9 @@ TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
         const TestKey key(path);
         tvx::RegistryTransaction transaction;
         ASSERT_EQ(transaction.begin(), 0);
-        for (int i = 0; i < 3000; ++i)
+        for (int i = 0; i < 3000; ++i) {
             key.write(std::to_string(10000 + i).c_str(), std::string(50, 'v'));
+        }
         ASSERT_EQ(transaction.commit(), 0);
     }
     tvx::registry::closeStores();
@@ -110,8 +119,9 @@ TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
     const TestKey key(path, TestKey::Way::open);
     ASSERT_EQ(key.result, 0);
     int found = 0;
-    for (int i = 0; i < 3000; ++i)
+    for (int i = 0; i < 3000; ++i) {
         found += key.read(std::to_string(10000 + i).c_str()) == std::string(50, 'v') ? 1 : 0;
+    }
     EXPECT_GT(found, 2500) << "only what was on the damaged page is lost";
     EXPECT_LT(found, 3000);
     EXPECT_EQ(notices.size(), 1u);
@@ -123,21 +133,25 @@ TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
 TEST_F(RegistryFaults, OneOfSeveralProcessesSetsADamagedFileAside) {
     put(std::string(5000, 'x'));
     std::vector<std::unique_ptr<ChildProcess>> children;
-    for (int i = 0; i < 4; ++i)
+    for (int i = 0; i < 4; ++i) {
         children.push_back(std::make_unique<ChildProcess>([i](ChildProcess& parent) {
             (void)parent.receive();
             const LSTATUS result = TestKey(path).write(std::to_string(i).c_str(), "1");
             parent.send(result != 0 ? 100 : static_cast<int>(notices.size()));
         }));
-    for (const auto& child : children)
+    }
+    for (const auto& child : children) {
         child->send(0);
+    }
     int told = 0;
-    for (const auto& child : children)
+    for (const auto& child : children) {
         told += child->receive();
+    }
     EXPECT_EQ(told, 1);
     EXPECT_EQ(setAside().size(), 1u);
-    for (int i = 0; i < 4; ++i)
+    for (int i = 0; i < 4; ++i) {
         EXPECT_EQ(TestKey(path).read(std::to_string(i).c_str()), "1");
+    }
 }
 
 TEST_F(RegistryFaults, LinkStaysALink) {
@@ -259,8 +273,9 @@ protected:
         m_disk = m_sandbox.folder / "disk";
         fs::create_directories(m_disk);
         if (unshare(CLONE_NEWNS) != 0 || mount(nullptr, "/", nullptr, MS_REC | MS_PRIVATE, nullptr) != 0 ||
-            mount("none", m_disk.c_str(), "tmpfs", 0, "size=256k,mode=0700") != 0)
+            mount("none", m_disk.c_str(), "tmpfs", 0, "size=256k,mode=0700") != 0) {
             GTEST_SKIP() << "disks cannot be mounted here";
+        }
         RegistrySandbox::use(m_disk / "registry.db");
     }
     void TearDown() override {
@@ -279,13 +294,15 @@ protected:
 TEST_F(RegistryOnFullDisk, WhatDoesNotFitIsToldOnceAndTheRestStays) {
     const TestKey key(path);
     int kept = 0;
-    while (kept < 1000 && key.write(std::to_string(kept).c_str(), std::string(2000, 'v')) == 0)
+    while (kept < 1000 && key.write(std::to_string(kept).c_str(), std::string(2000, 'v')) == 0) {
         ++kept;
+    }
     ASSERT_LT(kept, 1000);
     EXPECT_EQ(key.write("another", std::string(9000, 'v')), LSTATUS{ERROR_DISK_FULL});
     EXPECT_EQ(notices.size(), 1u);
-    for (int i = 0; i < kept; ++i)
+    for (int i = 0; i < kept; ++i) {
         EXPECT_EQ(key.read(std::to_string(i).c_str()), std::string(2000, 'v'));
+    }
 }
 
 TEST_F(RegistryOnFullDisk, StartsOnADiskThatIsFull) {

@@ -48,8 +48,9 @@ public:
                                     : RegOpenKeyExA(root, path.c_str(), 0, access, &handle);
     }
     ~TestKey() {
-        if (handle != nullptr)
+        if (handle) {
             RegCloseKey(handle);
+        }
     }
     TestKey(const TestKey&) = delete;
     TestKey& operator=(const TestKey&) = delete;
@@ -64,14 +65,18 @@ public:
         DWORD kind = 0;
         LSTATUS answer = RegQueryValueExA(handle, name, nullptr, &kind, nullptr, &size);
         std::string bytes(size, '\0');
-        if (answer == ERROR_SUCCESS)
+        if (answer == ERROR_SUCCESS) {
             answer = RegQueryValueExA(handle, name, nullptr, &kind, reinterpret_cast<BYTE*>(bytes.data()), &size);
-        if (answer != ERROR_SUCCESS)
+        }
+        if (answer != ERROR_SUCCESS) {
             return "<" + std::to_string(answer) + ">";
-        if (kind == REG_SZ && bytes.ends_with('\0'))
+        }
+        if (kind == REG_SZ && bytes.ends_with('\0')) {
             bytes.pop_back();
-        if (type != nullptr)
+        }
+        if (type) {
             *type = kind;
+        }
         return bytes;
     }
 

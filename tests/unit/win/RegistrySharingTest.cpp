@@ -23,10 +23,12 @@ TEST_F(RegistrySharing, SeesWhatAnotherProcessWroteAtOnce) {
         const TestKey own(path);
         for (int i = parent.receive(); i >= 0; i = parent.receive()) {
             own.write("a", std::to_string(i));
-            if (i % 5 == 0)
+            if (i % 5 == 0) {
                 RegDeleteValueA(own.handle, "a");
-            if (i % 7 == 0)
+            }
+            if (i % 7 == 0) {
                 tvx::registry::closeStores(); // as if it were another process each time
+            }
             parent.send(i);
         }
     });
@@ -55,7 +57,7 @@ TEST_F(RegistrySharing, LosesNoWriteOfSeveralProcesses) {
     constexpr int processes = 4;
     constexpr int writes = 150;
     std::vector<std::unique_ptr<ChildProcess>> writers;
-    for (int process = 0; process < processes; ++process)
+    for (int process = 0; process < processes; ++process) {
         writers.push_back(std::make_unique<ChildProcess>([process](ChildProcess& parent) {
             (void)parent.receive(); // all begin together, with a store that does not exist
             int failures = 0;
@@ -66,17 +68,21 @@ TEST_F(RegistrySharing, LosesNoWriteOfSeveralProcesses) {
             }
             parent.send(failures);
         }));
-    for (const auto& writer : writers)
+    }
+    for (const auto& writer : writers) {
         writer->send(0);
+    }
     for (const auto& writer : writers) {
         EXPECT_EQ(writer->receive(), 0);
         EXPECT_TRUE(writer->end());
     }
-    for (int process = 0; process < processes; ++process)
-        for (int i = 0; i < writes; ++i)
+    for (int process = 0; process < processes; ++process) {
+        for (int i = 0; i < writes; ++i) {
             EXPECT_EQ(TestKey(std::string(path) + "\\" + std::to_string(i % 10))
                           .read((std::to_string(process) + "." + std::to_string(i)).c_str()),
                       "x");
+        }
+    }
     const std::string last = TestKey(std::string(path) + "\\0").read("everybody's");
     EXPECT_EQ(last, std::string(2000, last[0])) << "half a value";
 }
@@ -86,18 +92,21 @@ TEST_F(RegistrySharing, KeepsWhatWasWrittenBeforeAProcessWasKilled) {
         ChildProcess writer([](ChildProcess& parent) {
             const TestKey own(path);
             for (int i = 1;; ++i) {
-                if (own.write("a", std::to_string(i)) != 0 || own.write("b", std::string(i % 9000, 'b')) != 0)
+                if (own.write("a", std::to_string(i)) != 0 || own.write("b", std::string(i % 9000, 'b')) != 0) {
                     std::_Exit(2);
+                }
                 parent.send(i);
             }
         });
         int acknowledged = 0;
-        while (acknowledged < 3 + 7 * round)
+        while (acknowledged < 3 + 7 * round) {
             acknowledged = writer.receive();
+        }
         ASSERT_GT(acknowledged, 0);
         writer.kill();
-        for (int i = writer.receive(); i >= 0; i = writer.receive())
+        for (int i = writer.receive(); i >= 0; i = writer.receive()) {
             acknowledged = i;
+        }
         const int kept = std::stoi(TestKey(path).read("a"));
         EXPECT_GE(kept, acknowledged);
         EXPECT_LE(kept, acknowledged + 1);

@@ -15,8 +15,9 @@ protected:
         std::array<char, 256> name{};
         for (DWORD i = 0, size = name.size();
              RegEnumKeyExA(key, i, name.data(), &size, nullptr, nullptr, nullptr, nullptr) == ERROR_SUCCESS;
-             ++i, size = name.size())
+             ++i, size = name.size()) {
             names.emplace_back(name.data(), size);
+        }
         return names;
     }
     static std::vector<std::string> values(HKEY key) {
@@ -24,8 +25,9 @@ protected:
         std::array<char, 256> name{};
         for (DWORD i = 0, size = name.size();
              RegEnumValueA(key, i, name.data(), &size, nullptr, nullptr, nullptr, nullptr) == ERROR_SUCCESS;
-             ++i, size = name.size())
+             ++i, size = name.size()) {
             names.emplace_back(name.data(), size);
+        }
         return names;
     }
 
@@ -156,7 +158,7 @@ TEST_F(Registry, MakesFileAndFolderPrivateAndOnlyWhenSomethingIsWritten) {
     EXPECT_FALSE(std::filesystem::exists(m_sandbox.file.parent_path()));
     umask(0);
     TestKey("Software").write("a", "1");
-    struct stat status {};
+    struct stat status{};
     ASSERT_EQ(stat(m_sandbox.file.c_str(), &status), 0);
     EXPECT_EQ(status.st_mode & 0777, 0600u);
     ASSERT_EQ(stat((m_sandbox.file.string() + "-wal").c_str(), &status), 0);

@@ -24,9 +24,11 @@ TEST(ResourceIndex, HoldsEveryResourceOnce) {
     const ResourceIndex index(data);
     EXPECT_EQ(index.damage(), "");
     std::set<std::string> dialogs;
-    for (const auto& entry : index.entries())
-        if (entry.type == "#5")
+    for (const auto& entry : index.entries()) {
+        if (entry.type == "#5") {
             dialogs.insert(entry.name);
+        }
+    }
     EXPECT_EQ(dialogs, (std::set<std::string>{"#130", "#131"}));
     EXPECT_TRUE(index.hasType("#240"));
     EXPECT_FALSE(index.hasType("#3000"));
@@ -40,10 +42,11 @@ TEST(ResourceIndex, TruncatedFilesAreRefused) {
         const ExactBytes part(tvx::ResourceBytes(data).first(length));
         const ResourceIndex index(part.view());
         // A file cut between two resources is a shorter file.
-        if (index.damage().empty())
+        if (index.damage().empty()) {
             EXPECT_LT(index.entries().size(), complete + (data.size() - length < 4 ? 1 : 0)) << length;
-        else
+        } else {
             EXPECT_TRUE(index.entries().empty()) << length;
+        }
     }
 }
 
@@ -54,8 +57,9 @@ TEST(ResourceIndex, DamagedSizesDoNotReadOutside) {
     for (std::size_t bit = 0; bit < data.size() * 8; ++bit) {
         copy.flip(bit);
         const ResourceIndex index(copy.view());
-        for (const auto& entry : index.entries())
+        for (const auto& entry : index.entries()) {
             ASSERT_LE(entry.data.data() + entry.data.size(), last);
+        }
         copy.flip(bit);
     }
 }

@@ -28,8 +28,9 @@ fs::path built() {
 class ResourceLibrary : public FileTestFolder {
 protected:
     ResourceLibrary() {
-        for (const char* folder : {"mine/lib", "mine/share/locale", "all/lib", "all/share/locale", "path", "last"})
+        for (const char* folder : {"mine/lib", "mine/share/locale", "all/lib", "all/share/locale", "path", "last"}) {
             fs::create_directories(folder);
+        }
         setenv("MYTARVEX", (m_folder + "/mine").c_str(), 1);
         setenv("TARVEX", (m_folder + "/all").c_str(), 1);
         setenv("TVX_RESOURCE_PATH", (":path:" + m_folder + "/path:" + m_folder + "/last:").c_str(), 1);
@@ -40,8 +41,9 @@ protected:
     /// Where it is found, below the test's folder; empty when it is not.
     std::string found(const char* name) const {
         const HMODULE library = LoadLibraryA(name);
-        if (library == nullptr)
+        if (!library) {
             return {};
+        }
         const std::string file = tvx::moduleFileName(library);
         EXPECT_TRUE(FreeLibrary(library));
         return fs::relative(file, fs::canonical(m_folder));
@@ -119,8 +121,9 @@ TEST_F(ResourceLibrary, IsRefusedWhenItIsDamaged) {
 }
 
 TEST_F(ResourceLibrary, IsRefusedWhenItCannotBeRead) {
-    if (geteuid() == 0)
+    if (geteuid() == 0) {
         GTEST_SKIP() << "everything can be read by root";
+    }
     place("path/host.DEU");
     fs::permissions("path/host.DEU", fs::perms::none);
     EXPECT_EQ(found("host.DEU"), "");

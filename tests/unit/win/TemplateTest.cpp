@@ -142,8 +142,9 @@ TEST(MenuTemplate, DamagedOnesAreRefused) {
     }
     // Popups without an end, each inside the one before.
     std::vector<std::uint8_t> deep(4);
-    for (int i = 0; i < 100000; ++i)
+    for (int i = 0; i < 100000; ++i) {
         deep.insert(deep.end(), {0x10, 0, 'a', 0, 0, 0});
+    }
     EXPECT_EQ(parseMenuTemplate(deep).reason(), "menu nested deeper than 32 levels");
     const std::vector<std::uint8_t> newer = {2, 0, 0, 0};
     EXPECT_EQ(parseMenuTemplate(newer).reason(), "menu of the unknown version 2");
