@@ -1,8 +1,8 @@
 // Posted messages through the queue, pre-translation and a message map, beside the toolkit's own posted events.
 
 #include "afxwin.h"
-#include "platform/afx/detail/Gui.h"
-#include "platform/afx/detail/Loop.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QCoreApplication>
 #include <QEvent>

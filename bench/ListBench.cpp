@@ -2,8 +2,8 @@
 // widths are measured. Each run ends with the list painted.
 
 #include "afxwin.h"
-#include "platform/afx/detail/Gui.h"
-#include "platform/afx/detail/Window.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/toolkit/detail/Gui.h"
 #include "s/ListBox.h"
 
 #include <QApplication>

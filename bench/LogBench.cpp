@@ -2,8 +2,8 @@
 // visible logs are painted once every hundred lines.
 
 #include "afxwin.h"
-#include "platform/afx/detail/Gui.h"
-#include "platform/afx/detail/Window.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/toolkit/detail/Gui.h"
 #include "s/Edit.h"
 
 #include <QApplication>

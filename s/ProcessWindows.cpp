@@ -1,6 +1,6 @@
 // What a process object does with windows: its child's, and those that show its output.
 #include "afxwin.h"
-#include "platform/afx/HandleWatch.h"
+#include "platform/afx/core/HandleWatch.h"
 #include "platform/win/Error.h"
 #include "platform/win/Process.h"
 #include "s/Edit.h"

@@ -3,5 +3,5 @@
 /// @file
 /// Controls of dialogs.
 
-#include "platform/afx/Controls.h"
+#include "platform/afx/controls/Controls.h"
 #include "platform/include/afxwin.h"

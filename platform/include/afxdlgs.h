@@ -4,4 +4,4 @@
 /// The framework's ready-made dialogs.
 
 #include "afxwin.h"
-#include "platform/afx/FileDialog.h"
+#include "platform/afx/dialogs/FileDialog.h"

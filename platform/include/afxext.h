@@ -4,7 +4,7 @@
 /// The framework's bars.
 
 #include "afxwin.h"
-#include "platform/afx/ControlBar.h"
-#include "platform/afx/DockState.h"
-#include "platform/afx/StatusBar.h"
-#include "platform/afx/ToolBar.h"
+#include "platform/afx/frames/ControlBar.h"
+#include "platform/afx/frames/DockState.h"
+#include "platform/afx/frames/StatusBar.h"
+#include "platform/afx/frames/ToolBar.h"

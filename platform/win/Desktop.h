@@ -2,8 +2,8 @@
 
 /// @file
 /// The windows that other processes show on the desktop, as X windows under the window manager's rules. The calls that
-/// hosts know (`IsWindow`, `ShowWindow`, `EnumThreadWindows`, ...) are in platform/afx/WindowCalls.h: they answer for
-/// this process's own windows themselves and ask here about all others.
+/// hosts know (`IsWindow`, `ShowWindow`, `EnumThreadWindows`, ...) are in platform/afx/core/WindowCalls.h: they answer
+/// for this process's own windows themselves and ask here about all others.
 ///
 /// Every function answers "no such window" (false, 0, empty) where no X display answers, as in a pure Wayland session,
 /// and for this process's own windows. Any thread may call them.

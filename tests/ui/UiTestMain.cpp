@@ -1,4 +1,4 @@
-#include "platform/afx/detail/Gui.h"
+#include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QApplication>
 #include <QFont>

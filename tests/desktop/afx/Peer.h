@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/afx/WindowCalls.h"
+#include "platform/afx/core/WindowCalls.h"
 
 #include <chrono>
 #include <cstdio>

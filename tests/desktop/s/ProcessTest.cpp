@@ -1,7 +1,7 @@
 // Windows of children, under a real window manager.
 #include "s/Process.h"
 
-#include "platform/afx/WindowCalls.h"
+#include "platform/afx/core/WindowCalls.h"
 #include "tests/desktop/afx/Peer.h"
 
 #include <gtest/gtest.h>

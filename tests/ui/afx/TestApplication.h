@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/afx/App.h"
+#include "platform/afx/core/App.h"
 
 #include <utility>
 #include <vector>

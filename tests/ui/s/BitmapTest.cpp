@@ -2,7 +2,7 @@
 #include "s/Bitmap.h"
 
 #include "afxwin.h"
-#include "tests/ui/gdi/MemoryDc.h"
+#include "tests/ui/afx/gdi/MemoryDc.h"
 
 #include <gtest/gtest.h>
 

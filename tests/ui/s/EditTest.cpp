@@ -2,7 +2,7 @@
 #include "s/Edit.h"
 
 #include "afxwin.h"
-#include "tests/ui/afx/DialogTesting.h"
+#include "tests/ui/afx/dialogs/DialogTesting.h"
 
 #include <gtest/gtest.h>
 

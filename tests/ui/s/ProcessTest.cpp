@@ -1,12 +1,12 @@
 // Children whose output is shown as it comes.
 #include "s/Process.h"
 
-#include "platform/afx/HandleWatch.h"
+#include "platform/afx/core/HandleWatch.h"
 #include "platform/win/Error.h"
 #include "platform/win/Pipe.h"
 #include "platform/win/detail/ProcessObject.h"
 #include "s/Edit.h"
-#include "tests/ui/afx/DialogTesting.h"
+#include "tests/ui/afx/dialogs/DialogTesting.h"
 
 #include <gtest/gtest.h>
 

@@ -2,8 +2,8 @@
 #include "s/Profile.h"
 
 #include "afxext.h"
-#include "tests/ui/afx/SettingsFolder.h"
 #include "tests/ui/afx/TestApplication.h"
+#include "tests/ui/afx/frames/SettingsFolder.h"
 
 #include <gtest/gtest.h>
 

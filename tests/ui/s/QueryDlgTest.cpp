@@ -3,8 +3,8 @@
 
 #include "afxwin.h"
 #include "res/resource.h"
-#include "tests/ui/afx/DialogTesting.h"
 #include "tests/ui/afx/TestApplication.h"
+#include "tests/ui/afx/dialogs/DialogTesting.h"
 
 #include <gtest/gtest.h>
 

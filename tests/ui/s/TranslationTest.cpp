@@ -1,6 +1,6 @@
 // What a user sees in a session in German, Japanese or English: this program runs once in each.
-#include "platform/afx/detail/Gui.h"
-#include "platform/afx/detail/Window.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/toolkit/detail/Gui.h"
 #include "res/resource.h"
 #include "s/WinApp.h"
 

@@ -1,5 +1,0 @@
-#include "platform/afx/App.h"
-
-int main(int argc, char** argv) {
-    return AfxWinMain(argc, argv);
-}

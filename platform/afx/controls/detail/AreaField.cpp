@@ -1,0 +1,178 @@
+#include "platform/afx/controls/detail/HostText.h"
+#include "platform/afx/controls/detail/TextField.h"
+
+#include <QAbstractTextDocumentLayout>
+#include <QPlainTextEdit>
+#include <QScrollBar>
+#include <QTextBlock>
+#include <QTextLayout>
+
+namespace tvx::afx {
+
+namespace {
+
+Qt::ScrollBarPolicy policy(bool bar) {
+    return bar ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
+}
+
+class AreaField : public TextField {
+public:
+    AreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed)
+        : m_edit(new QPlainTextEdit(parent)), m_wraps(options.wraps) {
+        count(0, 0);
+        QObject::connect(m_edit->document(), &QTextDocument::contentsChange, m_edit,
+                         [this](int position, int, int added) { count(position, added); });
+        m_edit->setTabChangesFocus(false);
+        m_edit->setLineWrapMode(options.wraps ? QPlainTextEdit::WidgetWidth : QPlainTextEdit::NoWrap);
+        m_edit->setVerticalScrollBarPolicy(policy(options.verticalBar));
+        m_edit->setHorizontalScrollBarPolicy(policy(options.horizontalBar));
+        m_edit->document()->setDocumentMargin(2);
+        QObject::connect(m_edit, &QPlainTextEdit::textChanged, m_edit, [changed = std::move(changed)] { changed(); });
+    }
+    QWidget* widget() const override {
+        return m_edit;
+    }
+    QString text() const override {
+        return m_edit->toPlainText();
+    }
+    void setText(const QString& text) override {
+        m_edit->setPlainText(text);
+    }
+    TextRange selection() const override {
+        const QTextCursor cursor = m_edit->textCursor();
+        return {cursor.anchor(), cursor.position()};
+    }
+    void select(const TextRange& range) override {
+        QTextCursor cursor = m_edit->textCursor();
+        cursor.setPosition(range.anchor);
+        cursor.setPosition(range.caret, QTextCursor::KeepAnchor);
+        m_edit->setTextCursor(cursor);
+    }
+    void insert(const QString& text, Undo undo) override {
+        if (undo == Undo::Forget) {
+            forgetUndo();
+            m_edit->setUndoRedoEnabled(false);
+        }
+        m_edit->textCursor().insertText(text);
+        m_edit->setUndoRedoEnabled(true);
+        // A program that only deletes goes on with something else; the view need not go there and back.
+        if (undo == Undo::Keep || !text.isEmpty()) {
+            m_edit->ensureCursorVisible();
+        }
+    }
+    void undo() override {
+        m_edit->document()->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
+    }
+    bool canUndo() const override {
+        return m_edit->document()->isUndoAvailable() || m_edit->document()->isRedoAvailable();
+    }
+    void forgetUndo() override {
+        m_edit->document()->clearUndoRedoStacks();
+    }
+    bool isModified() const override {
+        return m_edit->document()->isModified();
+    }
+    void setModified(bool modified) override {
+        m_edit->document()->setModified(modified);
+    }
+    void setReadOnly(bool readOnly) override {
+        m_edit->setReadOnly(readOnly);
+    }
+    void setPassword(bool) override {}
+    void setAlignment(Qt::Alignment alignment) override {
+        QTextOption option = m_edit->document()->defaultTextOption();
+        option.setAlignment(alignment);
+        m_edit->document()->setDefaultTextOption(option);
+    }
+    void setFrame(bool frame) override {
+        m_edit->setFrameStyle(frame ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
+    }
+    void cut() override {
+        m_edit->cut();
+    }
+    void copy() override {
+        m_edit->copy();
+    }
+    int bytes() const override {
+        return m_bytes.total();
+    }
+    int bytesAt(int position) const override {
+        const QTextBlock block = m_edit->document()->findBlock(position);
+        return block.isValid()
+                   ? m_bytes.before(block.blockNumber()) + hostBytes(block.text(), position - block.position())
+                   : m_bytes.total();
+    }
+    int positionAt(int bytes) const override {
+        const ParagraphBytes::Place place = m_bytes.find(bytes);
+        const QTextBlock block = m_edit->document()->findBlockByNumber(place.paragraph);
+        return block.position() + toolkitUnits(block.text(), place.bytes);
+    }
+    int lineCount() const override {
+        layOut();
+        return m_edit->document()->lineCount();
+    }
+    int lineAt(int position) const override {
+        layOut();
+        const QTextBlock block = m_edit->document()->findBlock(position);
+        const QTextLine line = block.layout()->lineForTextPosition(position - block.position());
+        return block.firstLineNumber() + (line.isValid() ? line.lineNumber() : 0);
+    }
+    Line line(int number) const override {
+        layOut();
+        const QTextBlock block = m_edit->document()->findBlockByLineNumber(number);
+        if (!m_wraps || block.layout()->lineCount() == 0) {
+            return {block.position(), block.text()};
+        }
+        const QTextLine line = block.layout()->lineAt(number - block.firstLineNumber());
+        return {block.position() + line.textStart(), block.text().mid(line.textStart(), line.textLength())};
+    }
+    int firstVisibleLine() const override {
+        return m_edit->verticalScrollBar()->value();
+    }
+    void scrollLines(int lines) override {
+        m_edit->verticalScrollBar()->setValue(m_edit->verticalScrollBar()->value() + lines);
+    }
+    void showCaret() override {
+        m_edit->ensureCursorVisible();
+    }
+    QMenu* makeMenu() override {
+        return m_edit->createStandardContextMenu();
+    }
+
+private:
+    /// Wrapped lines are known of paragraphs only that have been laid out.
+    void layOut() const {
+        if (!m_wraps) {
+            return;
+        }
+        QAbstractTextDocumentLayout* layouts = m_edit->document()->documentLayout();
+        for (QTextBlock block = m_edit->document()->firstBlock(); block.isValid(); block = block.next()) {
+            layouts->blockBoundingRect(block);
+        }
+    }
+    /// Counts the paragraphs again that a change has touched.
+    void count(int position, int added) {
+        const QTextDocument& document = *m_edit->document();
+        const int last = document.findBlock(std::min(position + added, document.characterCount() - 1)).blockNumber();
+        const int behind = document.blockCount() - 1 - last;
+        QTextBlock block = document.findBlock(std::min(position, document.characterCount() - 1));
+        const int first = std::min(block.blockNumber(), m_bytes.count());
+        std::vector<int> sizes;
+        for (int number = first; number <= last; ++number, block = block.next()) {
+            sizes.push_back(hostBytes(block.text()) + ParagraphBytes::lineEnd);
+        }
+        m_bytes.replace(first, std::max(m_bytes.count() - behind - first, 0), sizes);
+    }
+
+    QPlainTextEdit* m_edit;
+    bool m_wraps;
+    ParagraphBytes m_bytes;
+};
+
+} // namespace
+
+std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed) {
+    return std::make_unique<AreaField>(parent, options, std::move(changed));
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,522 @@
+#include "platform/afx/controls/detail/ComboBoxWindow.h"
+
+#include "platform/afx/controls/detail/EditWindow.h"
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+
+#include <QAbstractItemView>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QPainter>
+#include <QScopedValueRollback>
+#include <QStringListModel>
+#include <QStylePainter>
+#include <QStyledItemDelegate>
+#include <QWheelEvent>
+
+#include <cstring>
+
+namespace tvx::afx {
+
+/// Shows the box's lines to the toolkit without copying them.
+class ComboModel : public QAbstractListModel {
+public:
+    explicit ComboModel(const ComboBoxWindow& window) : m_window(window) {}
+
+    int rowCount(const QModelIndex& parent) const override {
+        return parent.isValid() ? 0 : m_window.items().count();
+    }
+    QVariant data(const QModelIndex& index, int role) const override {
+        if (role == Qt::DisplayRole || role == Qt::EditRole) {
+            return toQt(m_window.items().at(index.row()).text.c_str());
+        }
+        return {};
+    }
+    template <class Change>
+    void insertAt(int row, const Change& change) {
+        beginInsertRows({}, row, row);
+        change();
+        endInsertRows();
+    }
+    template <class Change>
+    void removeAt(int row, const Change& change) {
+        beginRemoveRows({}, row, row);
+        change();
+        endRemoveRows();
+    }
+    template <class Change>
+    void replaceAll(const Change& change) {
+        beginResetModel();
+        change();
+        endResetModel();
+    }
+
+private:
+    const ComboBoxWindow& m_window;
+};
+
+namespace {
+
+class ItemDelegate : public QStyledItemDelegate {
+public:
+    ItemDelegate(QObject* parent, ComboBoxWindow& window) : QStyledItemDelegate(parent), m_window(window) {}
+    QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override {
+        const QSize size = QStyledItemDelegate::sizeHint(option, index);
+        return {size.width(), m_window.itemHeight()};
+    }
+    void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override {
+        if (!m_window.isOwnerDrawn()) {
+            QStyledItemDelegate::paint(painter, option, index);
+            return;
+        }
+        const UINT state = (option.state & QStyle::State_Selected) != 0 ? ODS_SELECTED : 0U;
+        painter->drawImage(option.rect, m_window.paintItem(index.row(), option.rect.size(), state));
+    }
+
+private:
+    ComboBoxWindow& m_window;
+};
+
+class ComboFace : public QComboBox {
+public:
+    ComboFace(QWidget* parent, ComboBoxWindow& window) : QComboBox(parent), m_window(window) {}
+    void showPopup() override {
+        if (!m_open) {
+            m_open = true;
+            m_window.listShown(true);
+        }
+        QComboBox::showPopup();
+    }
+    void hidePopup() override {
+        QComboBox::hidePopup();
+        if (m_open) {
+            m_open = false;
+            m_window.listShown(false);
+        }
+    }
+
+protected:
+    /// Some styles open boxes that are not typed into as menus, which show all lines however many were asked for. A box
+    /// that says it can be typed into opens as a list.
+    void initStyleOption(QStyleOptionComboBox* option) const override {
+        QComboBox::initStyleOption(option);
+        option->editable = option->editable || !m_painting;
+    }
+    void paintEvent(QPaintEvent* event) override {
+        const QScopedValueRollback painting(m_painting, true);
+        if (!m_window.isOwnerDrawn() || m_window.isEditable()) {
+            QComboBox::paintEvent(event);
+            return;
+        }
+        QStylePainter painter(this);
+        QStyleOptionComboBox option;
+        initStyleOption(&option);
+        painter.drawComplexControl(QStyle::CC_ComboBox, option);
+        const QRect field = style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this);
+        if (currentIndex() >= 0) {
+            const UINT state = ODS_COMBOBOXEDIT | (hasFocus() ? ODS_FOCUS : 0U) | (isEnabled() ? 0U : ODS_DISABLED);
+            painter.drawImage(field, m_window.paintItem(currentIndex(), field.size(), state));
+        }
+    }
+    void wheelEvent(QWheelEvent* event) override {
+        // A page that is scrolled over a box must not change what is chosen in it.
+        if (hasFocus()) {
+            QComboBox::wheelEvent(event);
+        } else {
+            event->ignore();
+        }
+    }
+
+private:
+    ComboBoxWindow& m_window;
+    bool m_open = false;
+    bool m_painting = false;
+};
+
+std::unique_ptr<Window> makeComboBox(const CREATESTRUCT& cs) {
+    return std::make_unique<ComboBoxWindow>(cs);
+}
+
+const WindowClassEntry comboBoxEntry("ComboBox", &makeComboBox);
+
+} // namespace
+
+ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
+    : Control(cs), m_model(std::make_unique<ComboModel>(*this)), m_openHeight(cs.cy) {}
+
+ComboBoxWindow::~ComboBoxWindow() {
+    if (box()) {
+        box()->disconnect();
+        box()->setModel(m_noLines); // the widget outlives the lines it showed
+    }
+}
+
+QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
+    auto* face = new ComboFace(parent, *this);
+    face->setModel(m_model.get());
+    m_noLines = new QStringListModel(face);
+    face->setItemDelegate(new ItemDelegate(face, *this));
+    face->setInsertPolicy(QComboBox::NoInsert);
+    face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
+    QObject::connect(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
+    if (isEditable()) {
+        face->setEditable(true);
+        face->setCompleter(nullptr);
+        QObject::connect(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
+            const HWND self = handle();
+            notify(CBN_EDITUPDATE);
+            if (from(self)) {
+                notify(CBN_EDITCHANGE);
+            }
+        });
+    }
+    return face;
+}
+
+QComboBox* ComboBoxWindow::box() const {
+    return static_cast<QComboBox*>(widget());
+}
+
+QLineEdit* ComboBoxWindow::field() const {
+    return box()->lineEdit();
+}
+
+void ComboBoxWindow::widgetMade() {
+    const QString text = Control::text();
+    Control::widgetMade();
+    if (isEditable()) {
+        const QSignalBlocker quiet(field());
+        field()->setText(text);
+    }
+}
+
+void ComboBoxWindow::fontChanged() {
+    Control::fontChanged();
+    if (!isOwnerDrawn()) {
+        m_itemHeight = widget()->fontMetrics().height() + 2;
+    }
+    applyHeights();
+}
+
+void ComboBoxWindow::measure() {
+    MEASUREITEMSTRUCT item{};
+    item.CtlType = ODT_COMBOBOX;
+    item.CtlID = static_cast<UINT>(id());
+    item.itemHeight = static_cast<UINT>(m_itemHeight);
+    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    m_itemHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    applyHeights();
+}
+
+void ComboBoxWindow::applyHeights() {
+    const int closed = std::max(widget()->fontMetrics().height(), m_itemHeight) + 8;
+    guarded([&] {
+        widget()->setFixedHeight(closed);
+        box()->setMaxVisibleItems(std::clamp((m_openHeight - closed) / m_itemHeight, 1, 100));
+    });
+}
+
+void ComboBoxWindow::setWindowRect(const QRect& rect) {
+    // A move alone comes with the closed height and leaves the list's as it was.
+    if (widget() && rect.height() > widget()->height()) {
+        m_openHeight = rect.height();
+    }
+    Window::setWindowRect(rect);
+    if (widget()) {
+        applyHeights();
+    }
+}
+
+QString ComboBoxWindow::text() const {
+    return box() ? box()->currentText() : Control::text();
+}
+
+void ComboBoxWindow::setText(const QString& text) {
+    if (box() && isEditable()) {
+        guarded([&] { field()->setText(text); });
+    }
+}
+
+UINT ComboBoxWindow::dialogCode(const MSG* msg) const {
+    UINT code = DLGC_WANTARROWS | DLGC_WANTCHARS;
+    // Enter and Esc close an open list first.
+    const bool open = box()->view()->isVisible();
+    return open && msg && (msg->wParam == VK_RETURN || msg->wParam == VK_ESCAPE) ? code | DLGC_WANTALLKEYS : code;
+}
+
+UINT ComboBoxWindow::colorMessage() const {
+    return isEditable() ? WM_CTLCOLOREDIT : WM_CTLCOLORLISTBOX;
+}
+
+void ComboBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
+    palette.setColor(QPalette::Active, QPalette::Text, text);
+    palette.setColor(QPalette::Inactive, QPalette::Text, text);
+    palette.setColor(QPalette::Base, background);
+}
+
+void ComboBoxWindow::focusMoved(bool got) {
+    notify(got ? CBN_SETFOCUS : CBN_KILLFOCUS);
+}
+
+void ComboBoxWindow::chosen(int) {
+    const HWND self = handle();
+    m_chosenWhileOpen = true;
+    notify(CBN_SELENDOK);
+    if (from(self)) {
+        notify(CBN_SELCHANGE);
+    }
+}
+
+void ComboBoxWindow::listShown(bool shown) {
+    const HWND self = handle();
+    if (shown) {
+        m_chosenWhileOpen = false;
+        notify(CBN_DROPDOWN);
+        return;
+    }
+    if (!m_chosenWhileOpen) {
+        notify(CBN_SELENDCANCEL);
+    }
+    if (from(self)) {
+        notify(CBN_CLOSEUP);
+    }
+}
+
+QImage ComboBoxWindow::paintItem(int index, QSize size, UINT state) {
+    OwnerPainting drawing(*this, size, widget()->palette().color(QPalette::Base));
+    DRAWITEMSTRUCT item{};
+    item.CtlType = ODT_COMBOBOX;
+    item.itemID = static_cast<UINT>(index);
+    item.itemData = static_cast<ULONG_PTR>(m_items.at(index).data);
+    item.itemState = state;
+    item.rcItem = {0, 0, size.width(), size.height()};
+    drawing.draw(item);
+    return drawing.image();
+}
+
+// --- lines ---
+
+LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
+    if (index < -1 || index > m_items.count()) {
+        return CB_ERR;
+    }
+    ListItems::Item item;
+    if (hasStrings()) {
+        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
+    } else {
+        item.data = text;
+    }
+    int place = 0;
+    guarded([&] {
+        // The toolkit chooses the first line of an empty box by itself; here only the user and the program choose.
+        const int current = box()->currentIndex();
+        const QString typed = box()->currentText();
+        if (sorted) {
+            m_model->replaceAll([&] { place = m_items.insertSorted(std::move(item)); });
+        } else {
+            place = index < 0 ? m_items.count() : static_cast<int>(index);
+            m_model->insertAt(place, [&] { m_items.insert(place, std::move(item)); });
+        }
+        box()->setCurrentIndex(current >= place ? current + 1 : current);
+        if (isEditable()) {
+            const QSignalBlocker quiet(field());
+            field()->setText(typed);
+        }
+    });
+    return place;
+}
+
+void ComboBoxWindow::tellDeleted(int index) {
+    if (!isOwnerDrawn() || !parent()) {
+        return;
+    }
+    DELETEITEMSTRUCT gone{ODT_COMBOBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
+                          static_cast<ULONG_PTR>(m_items.at(index).data)};
+    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
+}
+
+LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
+    if (!m_items.isValid(index)) {
+        return CB_ERR;
+    }
+    const int row = static_cast<int>(index);
+    tellDeleted(row);
+    guarded([&] {
+        const int current = box()->currentIndex();
+        m_model->removeAt(row, [&] { m_items.remove(row); });
+        box()->setCurrentIndex(current == row ? -1 : current > row ? current - 1 : current);
+    });
+    return m_items.count();
+}
+
+void ComboBoxWindow::reset() {
+    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
+        tellDeleted(row);
+    }
+    guarded([&] {
+        m_model->replaceAll([&] { m_items.clear(); });
+        box()->setCurrentIndex(-1);
+        if (isEditable()) {
+            field()->clear();
+        }
+    });
+}
+
+LRESULT ComboBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
+    const auto start = static_cast<int>(after);
+    if (!hasStrings()) {
+        return m_items.findData(text, start);
+    }
+    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : CB_ERR;
+}
+
+LRESULT ComboBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
+    const auto row = static_cast<int>(index);
+    if (!m_items.isValid(row)) {
+        return CB_ERR;
+    }
+    const auto& item = m_items.at(row);
+    if (!hasStrings()) {
+        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
+        return sizeof(item.data);
+    }
+    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
+    return static_cast<LRESULT>(item.text.size());
+}
+
+LRESULT ComboBoxWindow::setCurrent(LONG_PTR index) {
+    const bool exists = m_items.isValid(index);
+    guarded([&] {
+        box()->setCurrentIndex(exists ? static_cast<int>(index) : -1);
+        if (!exists && isEditable()) {
+            field()->clear();
+        }
+    });
+    return exists ? index : CB_ERR;
+}
+
+LRESULT ComboBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    const auto row = static_cast<int>(wParam);
+    switch (message) {
+    case CB_ADDSTRING:
+        return add(-1, lParam, (style() & CBS_SORT) != 0 && hasStrings());
+    case CB_INSERTSTRING:
+        return add(row, lParam, false);
+    case CB_DELETESTRING:
+        return removeItem(row);
+    case CB_RESETCONTENT:
+        reset();
+        return CB_OKAY;
+    case CB_GETCOUNT:
+        return m_items.count();
+    case CB_GETLBTEXT:
+        return copyText(wParam, lParam);
+    case CB_GETLBTEXTLEN:
+        if (!m_items.isValid(row)) {
+            return CB_ERR;
+        }
+        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+    case CB_GETITEMDATA:
+        return m_items.isValid(row) ? m_items.at(row).data : CB_ERR;
+    case CB_SETITEMDATA:
+        if (!m_items.isValid(row)) {
+            return CB_ERR;
+        }
+        m_items.at(row).data = lParam;
+        return CB_OKAY;
+    case CB_FINDSTRING:
+        return find(wParam, lParam, ListItems::Match::Prefix);
+    case CB_FINDSTRINGEXACT:
+        return find(wParam, lParam, ListItems::Match::Whole);
+    case CB_SELECTSTRING: {
+        const LRESULT found = find(wParam, lParam, ListItems::Match::Prefix);
+        return found >= 0 ? setCurrent(found) : CB_ERR;
+    }
+    case CB_GETCURSEL:
+        return box()->currentIndex();
+    case CB_SETCURSEL:
+        return setCurrent(row);
+    default:
+        return listProc(message, wParam, lParam, known);
+    }
+}
+
+LRESULT ComboBoxWindow::listProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    switch (message) {
+    case CB_SHOWDROPDOWN:
+        guarded([&] { wParam != 0 ? box()->showPopup() : box()->hidePopup(); });
+        return TRUE;
+    case CB_GETDROPPEDSTATE:
+        return box()->view()->isVisible() ? TRUE : FALSE;
+    case CB_GETDROPPEDCONTROLRECT: {
+        QRect rect = screenRect();
+        rect.setHeight(std::max(rect.height(), m_openHeight));
+        *reinterpret_cast<RECT*>(lParam) = fromQt(rect);
+        return TRUE;
+    }
+    case CB_GETITEMHEIGHT:
+        return m_itemHeight;
+    case CB_SETITEMHEIGHT:
+        m_itemHeight = std::clamp(static_cast<int>(lParam), 1, 1000);
+        applyHeights();
+        return CB_OKAY;
+    case CB_SETDROPPEDWIDTH:
+        box()->view()->setMinimumWidth(static_cast<int>(wParam));
+        return static_cast<LRESULT>(wParam);
+    default:
+        return fieldProc(message, wParam, lParam, known);
+    }
+}
+
+LRESULT ComboBoxWindow::fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    const bool fieldMessage = message == CB_LIMITTEXT || message == CB_SETEDITSEL || message == CB_GETEDITSEL;
+    known = fieldMessage;
+    if (!fieldMessage || !isEditable()) {
+        return CB_ERR;
+    }
+    const QString text = field()->text();
+    if (message == CB_LIMITTEXT) {
+        field()->setMaxLength(wParam == 0 ? 32767 : static_cast<int>(std::min<WPARAM>(wParam, 32767)));
+        return TRUE;
+    }
+    if (message == CB_SETEDITSEL) {
+        const int first = static_cast<SHORT>(LOWORD(static_cast<std::uintptr_t>(lParam)));
+        const int last = static_cast<SHORT>(HIWORD(static_cast<std::uintptr_t>(lParam)));
+        const int from = toolkitUnits(text, std::max(first, 0));
+        const int to = last < 0 ? static_cast<int>(text.size()) : toolkitUnits(text, last);
+        field()->setSelection(from, to - from);
+        return TRUE;
+    }
+    const bool selected = field()->hasSelectedText();
+    const int first = hostBytes(text, selected ? field()->selectionStart() : field()->cursorPosition());
+    const int last = hostBytes(text, selected ? field()->selectionEnd() : field()->cursorPosition());
+    if (wParam != 0) {
+        *reinterpret_cast<DWORD*>(wParam) = static_cast<DWORD>(first);
+    }
+    if (lParam != 0) {
+        *reinterpret_cast<DWORD*>(lParam) = static_cast<DWORD>(last);
+    }
+    return MAKELONG(first, last);
+}
+
+LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message >= CB_GETEDITSEL && message <= CB_SETDROPPEDWIDTH) {
+        bool known = true;
+        const LRESULT result = itemProc(message, wParam, lParam, known);
+        return known ? result : CB_ERR;
+    }
+    if (message == WM_CREATE && isOwnerDrawn()) {
+        measure(); // only now the control's own object can answer
+        return 0;
+    }
+    if (message == WM_DESTROY) {
+        for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
+            tellDeleted(row);
+        }
+        return 0;
+    }
+    return Control::defaultProc(message, wParam, lParam);
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,81 @@
+#pragma once
+
+/// @file
+/// Combo boxes.
+
+#include "platform/afx/controls/detail/Control.h"
+#include "platform/afx/controls/detail/ListItems.h"
+
+class QAbstractItemModel;
+class QComboBox;
+class QLineEdit;
+
+namespace tvx::afx {
+
+class ComboModel;
+
+/// The "ComboBox" class. Its height in templates and calls is that of the opened box; closed it is one line high. A box
+/// whose list is always open (CBS_SIMPLE) opens its list like the others.
+class TVX_PLATFORM_API ComboBoxWindow : public Control {
+public:
+    explicit ComboBoxWindow(const CREATESTRUCT& cs);
+    ~ComboBoxWindow() override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    void setWindowRect(const QRect& rect) override;
+    QString text() const override;
+    void setText(const QString& text) override;
+    UINT dialogCode(const MSG* msg) const override;
+    UINT colorMessage() const override;
+
+    bool isOwnerDrawn() const {
+        return (style() & (CBS_OWNERDRAWFIXED | CBS_OWNERDRAWVARIABLE)) != 0;
+    }
+    bool hasStrings() const {
+        return !isOwnerDrawn() || (style() & CBS_HASSTRINGS) != 0;
+    }
+    bool isEditable() const {
+        return (style() & 3U) != CBS_DROPDOWNLIST;
+    }
+    const ListItems& items() const {
+        return m_items;
+    }
+    int itemHeight() const {
+        return m_itemHeight;
+    }
+    /// Has the parent paint line `index` into a picture of this size.
+    QImage paintItem(int index, QSize size, UINT state);
+    /// The user opened or closed the list.
+    void listShown(bool shown);
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void widgetMade() override;
+    void fontChanged() override;
+    void focusMoved(bool got) override;
+    void applyColors(QPalette& palette, const QColor& text, const QColor& background) const override;
+
+private:
+    QComboBox* box() const;
+    QLineEdit* field() const;
+    void measure();
+    void applyHeights();
+    void chosen(int index);
+    LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
+    LRESULT removeItem(LONG_PTR index);
+    void reset();
+    void tellDeleted(int index);
+    LRESULT find(WPARAM after, LPARAM text, ListItems::Match match) const;
+    LRESULT copyText(WPARAM index, LPARAM buffer) const;
+    LRESULT setCurrent(LONG_PTR index);
+    LRESULT itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+    LRESULT listProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+    LRESULT fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+    ListItems m_items;
+    std::unique_ptr<ComboModel> m_model;
+    QAbstractItemModel* m_noLines = nullptr; ///< Of the widget, for the time after this window.
+    int m_itemHeight = 15;
+    int m_openHeight = 0;
+    bool m_chosenWhileOpen = false;
+};
+
+} // namespace tvx::afx

@@ -1,0 +1,225 @@
+#include "platform/afx/controls/detail/Control.h"
+
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/dialogs/detail/DialogWindow.h"
+#include "platform/afx/gdi/Dc.h"
+#include "platform/afx/gdi/Gdi.h"
+#include "platform/afx/gdi/detail/DeviceContext.h"
+
+#include <QApplication>
+#include <QFrame>
+
+namespace tvx::afx {
+
+namespace {
+
+QColor fromColorRef(COLORREF color) {
+    return QColor(GetRValue(color), GetGValue(color), GetBValue(color));
+}
+
+COLORREF toColorRef(const QColor& color) {
+    return RGB(color.red(), color.green(), color.blue());
+}
+
+/// The context that parents set colours in; nothing is ever drawn with it.
+HDC colorContext() {
+    static const HDC dc = CreateCompatibleDC(nullptr);
+    return dc;
+}
+
+} // namespace
+
+QFont toolkitFont(HFONT font) {
+    const auto tool = findTool<FontObject>(reinterpret_cast<HGDIOBJ>(font));
+    return controlFont(tool ? tool->description : pointFont(80, "MS Shell Dlg"));
+}
+
+void Control::widgetMade() {
+    // Earlier controls lie over later ones, unlike in the toolkit: a group box must not cover what stands before it.
+    widget()->lower();
+    applyFocusPolicy();
+    fontChanged();
+}
+
+void Control::applyFocusPolicy() {
+    const bool tab = (style() & WS_TABSTOP) != 0;
+    QWidget* target = focusWidget();
+    target->setFocusPolicy(!takesFocus() ? Qt::NoFocus : tab ? Qt::StrongFocus : Qt::ClickFocus);
+}
+
+void Control::styleChanged(DWORD oldStyle, DWORD) {
+    if (((oldStyle ^ style()) & WS_TABSTOP) != 0) {
+        applyFocusPolicy();
+    }
+}
+
+void Control::fontChanged() {
+    guarded([this] { widget()->setFont(toolkitFont(font)); });
+}
+
+void Control::notify(int code) {
+    armIdle();
+    if (parent() && !isDestroyed()) {
+        SendMessageA(parent()->handle(), WM_COMMAND, MAKEWPARAM(id(), code), reinterpret_cast<LPARAM>(handle()));
+    }
+}
+
+UINT Control::dialogCode(const MSG*) const {
+    return DLGC_STATIC;
+}
+
+UINT Control::colorMessage() const {
+    return WM_CTLCOLORSTATIC;
+}
+
+// --- colours ---
+
+Control::Colors Control::chosenColors() const {
+    const HDC dc = colorContext();
+    const auto context = findContext(dc);
+    if (!parent() || !context) {
+        return {};
+    }
+    const QPalette palette = QApplication::palette(widget());
+    context->state.textColor = toColorRef(palette.color(QPalette::WindowText));
+    context->state.backColor = toColorRef(palette.color(QPalette::Window));
+    context->state.backMode = OPAQUE;
+    const LRESULT answer = SendMessageA(parent()->handle(), colorMessage(), reinterpret_cast<WPARAM>(dc),
+                                        reinterpret_cast<LPARAM>(handle()));
+    const auto brush = findTool<BrushObject>(reinterpret_cast<HGDIOBJ>(answer));
+    if (!brush) {
+        return {};
+    }
+    Colors colors{true, fromColorRef(context->state.textColor).rgb(), 0};
+    if (brush->description.lbStyle == BS_SOLID) {
+        const bool system = brush->systemColor >= 0;
+        colors.background = fromColorRef(system ? GetSysColor(brush->systemColor) : brush->description.lbColor).rgb();
+    }
+    return colors;
+}
+
+void Control::askColors() {
+    const HWND self = handle();
+    const Colors colors = chosenColors();
+    if (!from(self) || colors == m_colors) {
+        return;
+    }
+    m_colors = colors;
+    QPalette palette;
+    if (colors.chosen) {
+        palette = QApplication::palette(colorWidget());
+        applyColors(palette, QColor(colors.text), QColor::fromRgba(colors.background));
+    }
+    guarded([&] { colorWidget()->setPalette(palette); });
+}
+
+void Control::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
+    palette.setColor(QPalette::Active, QPalette::WindowText, text);
+    palette.setColor(QPalette::Inactive, QPalette::WindowText, text);
+    palette.setColor(QPalette::Window, background);
+}
+
+LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_PAINT: {
+        const HWND self = handle();
+        askColors();
+        if (from(self)) {
+            passEvent(*this, message);
+        }
+        return 0;
+    }
+    case WM_GETDLGCODE:
+        return static_cast<LRESULT>(dialogCode(reinterpret_cast<const MSG*>(lParam)));
+    case WM_SETREDRAW:
+        guarded([&] { widget()->setUpdatesEnabled(wParam != 0); });
+        return 0;
+    case WM_SETFOCUS:
+    case WM_KILLFOCUS: {
+        const HWND self = handle();
+        tellDialogFocus(*this, message == WM_SETFOCUS);
+        if (from(self)) {
+            focusMoved(message == WM_SETFOCUS);
+        }
+        return 0;
+    }
+    default:
+        return Window::defaultProc(message, wParam, lParam);
+    }
+}
+
+// --- owner drawing ---
+
+OwnerPainting::OwnerPainting(Control& control, QSize size, const QColor& background) : m_control(control) {
+    QImage image(size.expandedTo(QSize(1, 1)), QImage::Format_RGB32);
+    image.fill(background);
+    m_bitmap = addBitmap(image);
+    m_dc = CreateCompatibleDC(nullptr);
+    m_oldBitmap = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(m_bitmap));
+    if (control.font) {
+        m_oldFont = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(control.font));
+    }
+}
+
+OwnerPainting::~OwnerPainting() {
+    if (m_oldFont) {
+        SelectObject(m_dc, m_oldFont);
+    }
+    SelectObject(m_dc, m_oldBitmap);
+    DeleteDC(m_dc);
+    DeleteObject(reinterpret_cast<HGDIOBJ>(m_bitmap));
+}
+
+void OwnerPainting::draw(DRAWITEMSTRUCT item) {
+    const Window* parent = m_control.parent();
+    if (!parent) {
+        return;
+    }
+    item.CtlID = static_cast<UINT>(m_control.id());
+    item.itemAction = ODA_DRAWENTIRE;
+    item.hwndItem = m_control.handle();
+    item.hDC = m_dc;
+    SendMessageA(parent->handle(), WM_DRAWITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+}
+
+QImage OwnerPainting::image() const {
+    return bitmapImage(m_bitmap);
+}
+
+std::string resourceText(const char* name) {
+    if (!name || !IS_INTRESOURCE(name)) {
+        return name ? name : "";
+    }
+    return "#" + std::to_string(reinterpret_cast<std::uintptr_t>(name));
+}
+
+// --- controls that bring no behaviour yet ---
+
+namespace {
+
+/// Stands for a control of an unknown class, so that the rest of a dialog can be used: an empty frame.
+class EmptyPane : public Control {
+public:
+    using Control::Control;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override {
+        auto* frame = new QFrame(parent);
+        frame->setFrameStyle(hasBorder() ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
+        return frame;
+    }
+    bool takesFocus() const override {
+        return false;
+    }
+};
+
+std::unique_ptr<Window> makeEmptyPane(const CREATESTRUCT& cs) {
+    return std::make_unique<EmptyPane>(cs);
+}
+
+const WindowClassEntry emptyPaneEntry(emptyPaneClass, &makeEmptyPane);
+
+} // namespace
+
+} // namespace tvx::afx

@@ -1,0 +1,699 @@
+#include "platform/afx/controls/detail/ListBoxWindow.h"
+
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/dialogs/detail/DialogWindow.h"
+#include "platform/base/Text.h"
+
+#include <QAbstractScrollArea>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QScrollBar>
+#include <QStyle>
+#include <QStyleOption>
+
+#include <cstring>
+
+namespace tvx::afx {
+
+namespace {
+
+/// Distance of a line's text from the left edge.
+constexpr int textIndent = 3;
+
+class ListArea : public QAbstractScrollArea {
+public:
+    ListArea(QWidget* parent, ListBoxWindow& window) : QAbstractScrollArea(parent), m_window(window) {
+        viewport()->setBackgroundRole(QPalette::Base);
+        viewport()->setAutoFillBackground(true);
+    }
+
+protected:
+    void paintEvent(QPaintEvent* event) override {
+        QPainter painter(viewport());
+        m_window.paint(painter, event->rect());
+    }
+    void mousePressEvent(QMouseEvent* event) override {
+        m_window.press(*event, false);
+    }
+    void mouseDoubleClickEvent(QMouseEvent* event) override {
+        m_window.press(*event, true);
+    }
+    void mouseMoveEvent(QMouseEvent* event) override {
+        m_window.drag(*event);
+    }
+    void keyPressEvent(QKeyEvent* event) override {
+        event->setAccepted(m_window.key(*event));
+    }
+    void resizeEvent(QResizeEvent* event) override {
+        QAbstractScrollArea::resizeEvent(event);
+        m_window.applyRange();
+    }
+    void focusInEvent(QFocusEvent* event) override {
+        QAbstractScrollArea::focusInEvent(event);
+        viewport()->update();
+    }
+    void focusOutEvent(QFocusEvent* event) override {
+        QAbstractScrollArea::focusOutEvent(event);
+        viewport()->update();
+    }
+    void scrollContentsBy(int, int) override {
+        viewport()->update();
+    }
+
+private:
+    ListBoxWindow& m_window;
+};
+
+/// The toolkit repaints a bar whose page it is told, changed or not.
+void setPage(QScrollBar& bar, int page) {
+    if (bar.pageStep() != page) {
+        bar.setPageStep(page);
+    }
+}
+
+std::unique_ptr<Window> makeListBox(const CREATESTRUCT& cs) {
+    return std::make_unique<ListBoxWindow>(cs);
+}
+
+const WindowClassEntry listBoxEntry("ListBox", &makeListBox);
+
+} // namespace
+
+// --- making ---
+
+QWidget* ListBoxWindow::makeWidget(QWidget* parent) {
+    m_area = new ListArea(parent, *this);
+    return m_area;
+}
+
+void ListBoxWindow::widgetMade() {
+    applyBars();
+    Control::widgetMade();
+    // The height is rounded to whole lines only now that their height is known.
+    setWindowRect(windowRect());
+}
+
+void ListBoxWindow::applyBars() {
+    const bool always = (style() & LBS_DISABLENOSCROLL) != 0;
+    const auto policy = [&](DWORD bit) {
+        return (style() & bit) == 0 ? Qt::ScrollBarAlwaysOff : always ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAsNeeded;
+    };
+    m_area->setVerticalScrollBarPolicy(policy(WS_VSCROLL));
+    m_area->setHorizontalScrollBarPolicy(policy(WS_HSCROLL));
+    m_area->setFrameStyle(hasBorder() ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
+}
+
+void ListBoxWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
+    Control::styleChanged(oldStyle, oldExStyle);
+    guarded([this] { applyBars(); });
+}
+
+void ListBoxWindow::fontChanged() {
+    Control::fontChanged();
+    if (!isOwnerDrawn()) {
+        m_rowHeight = m_area->fontMetrics().height() + 2;
+    }
+    applyRange();
+}
+
+/// The parent says how high its lines are.
+void ListBoxWindow::measure() {
+    MEASUREITEMSTRUCT item{};
+    item.CtlType = ODT_LISTBOX;
+    item.CtlID = static_cast<UINT>(id());
+    item.itemHeight = static_cast<UINT>(m_area->fontMetrics().height() + 2);
+    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    m_rowHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    applyRange();
+}
+
+QWidget* ListBoxWindow::clientWidget() const {
+    return widget() ? m_area->viewport() : nullptr;
+}
+
+QRect ListBoxWindow::clientRect() const {
+    return widget() ? m_area->viewport()->rect() : QRect();
+}
+
+void ListBoxWindow::setWindowRect(const QRect& rect) {
+    QRect whole = rect;
+    if ((style() & LBS_NOINTEGRALHEIGHT) == 0 && m_area) {
+        const int frame = 2 * m_area->frameWidth();
+        const int rows = (rect.height() - frame) / m_rowHeight;
+        whole.setHeight(rows > 0 ? rows * m_rowHeight + frame : rect.height());
+    }
+    Window::setWindowRect(whole);
+}
+
+UINT ListBoxWindow::dialogCode(const MSG*) const {
+    return DLGC_WANTARROWS | DLGC_WANTCHARS;
+}
+
+void ListBoxWindow::focusMoved(bool got) {
+    if ((style() & LBS_NOTIFY) != 0) {
+        notify(got ? LBN_SETFOCUS : LBN_KILLFOCUS);
+    }
+}
+
+void ListBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
+    palette.setColor(QPalette::Active, QPalette::Text, text);
+    palette.setColor(QPalette::Inactive, QPalette::Text, text);
+    palette.setColor(QPalette::Base, background);
+}
+
+// --- rows and scrolling ---
+
+void ListBoxWindow::applyRange() {
+    if (!widget()) {
+        return;
+    }
+    guarded([this] {
+        QScrollBar* vertical = m_area->verticalScrollBar();
+        const int last = std::max(m_items.count() - visibleRows(), 0);
+        // A bar that only grows or shrinks needs no new layout: lists are filled line by line.
+        const QSignalBlocker quiet((vertical->maximum() > 0) == (last > 0) ? vertical : nullptr);
+        setPage(*vertical, visibleRows());
+        vertical->setRange(0, last);
+        QScrollBar* horizontal = m_area->horizontalScrollBar();
+        const int width = m_area->viewport()->width();
+        setPage(*horizontal, width);
+        horizontal->setSingleStep(10);
+        horizontal->setRange(0, std::max(m_extent - width, 0));
+    });
+}
+
+void ListBoxWindow::refresh() {
+    m_area->viewport()->update();
+}
+
+void ListBoxWindow::contentChanged() {
+    // While filling, the bar's range changes with every line: cheap enough, and nothing is painted before the loop.
+    applyRange();
+    refresh();
+}
+
+int ListBoxWindow::top() const {
+    return m_area->verticalScrollBar()->value();
+}
+
+void ListBoxWindow::setTop(int index) {
+    guarded([&] { m_area->verticalScrollBar()->setValue(index); });
+}
+
+int ListBoxWindow::visibleRows() const {
+    return std::max(m_area->viewport()->height() / m_rowHeight, 1);
+}
+
+int ListBoxWindow::rowAt(int y) const {
+    const int row = top() + (y >= 0 ? y / m_rowHeight : -1);
+    return std::clamp(row, -1, m_items.count() - 1);
+}
+
+QRect ListBoxWindow::rowRect(int index) const {
+    const int scrolled = m_area->horizontalScrollBar()->value();
+    const int width = std::max(m_extent, m_area->viewport()->width());
+    return {-scrolled, (index - top()) * m_rowHeight, width, m_rowHeight};
+}
+
+void ListBoxWindow::showRow(int index) {
+    if (index < top()) {
+        setTop(index);
+    } else if (index >= top() + visibleRows()) {
+        setTop(index - visibleRows() + 1);
+    }
+}
+
+// --- lines ---
+
+LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
+    ListItems::Item item;
+    if (hasStrings()) {
+        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
+    } else {
+        item.data = text;
+    }
+    if (index < -1 || index > m_items.count()) {
+        return LB_ERR;
+    }
+    const int place = sorted ? m_items.insertSorted(std::move(item)) : m_items.insert(index, std::move(item));
+    m_current += m_current >= place ? 1 : 0;
+    m_caret += m_caret >= place ? 1 : 0;
+    m_anchor += m_anchor >= place ? 1 : 0;
+    contentChanged();
+    return place;
+}
+
+/// Hosts free what the data of an owner-drawn line points to when they are told of its end.
+void ListBoxWindow::tellDeleted(int index) {
+    if (!isOwnerDrawn() || !parent()) {
+        return;
+    }
+    DELETEITEMSTRUCT gone{ODT_LISTBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
+                          static_cast<ULONG_PTR>(m_items.at(index).data)};
+    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
+}
+
+LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
+    if (!m_items.isValid(index)) {
+        return LB_ERR;
+    }
+    const int row = static_cast<int>(index);
+    tellDeleted(row);
+    m_items.remove(row);
+    m_current = m_current == row ? -1 : m_current > row ? m_current - 1 : m_current;
+    m_caret = std::min(m_caret > row ? m_caret - 1 : m_caret, m_items.count() - 1);
+    m_anchor = std::min(m_anchor > row ? m_anchor - 1 : m_anchor, m_items.count() - 1);
+    contentChanged();
+    return m_items.count();
+}
+
+void ListBoxWindow::reset() {
+    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
+        tellDeleted(row);
+    }
+    m_items.clear();
+    m_current = m_caret = m_anchor = -1;
+    contentChanged();
+}
+
+LRESULT ListBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
+    const auto start = static_cast<int>(after);
+    if (!hasStrings()) {
+        return m_items.findData(text, start);
+    }
+    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : LB_ERR;
+}
+
+LRESULT ListBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
+    const auto row = static_cast<int>(index);
+    if (!m_items.isValid(row)) {
+        return LB_ERR;
+    }
+    const auto& item = m_items.at(row);
+    if (!hasStrings()) {
+        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
+        return sizeof(item.data);
+    }
+    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
+    return static_cast<LRESULT>(item.text.size());
+}
+
+LRESULT ListBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    const auto row = static_cast<int>(wParam);
+    switch (message) {
+    case LB_ADDSTRING:
+        return add(-1, lParam, (style() & LBS_SORT) != 0 && hasStrings());
+    case LB_INSERTSTRING:
+        return add(row, lParam, false);
+    case LB_DELETESTRING:
+        return removeRow(row);
+    case LB_RESETCONTENT:
+        reset();
+        return 0;
+    case LB_GETCOUNT:
+        return m_items.count();
+    case LB_GETTEXT:
+        return copyText(wParam, lParam);
+    case LB_GETTEXTLEN:
+        if (!m_items.isValid(row)) {
+            return LB_ERR;
+        }
+        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+    case LB_GETITEMDATA:
+        return m_items.isValid(row) ? m_items.at(row).data : LB_ERR;
+    case LB_SETITEMDATA:
+        if (!m_items.isValid(row)) {
+            return LB_ERR;
+        }
+        m_items.at(row).data = lParam;
+        return LB_OKAY;
+    case LB_FINDSTRING:
+        return find(wParam, lParam, ListItems::Match::Prefix);
+    case LB_FINDSTRINGEXACT:
+        return find(wParam, lParam, ListItems::Match::Whole);
+    case LB_SELECTSTRING: {
+        const LRESULT found = find(wParam, lParam, ListItems::Match::Prefix);
+        if (found >= 0) {
+            setCurrent(found);
+        }
+        return found;
+    }
+    case LB_INITSTORAGE:
+        m_items.reserve(wParam);
+        return static_cast<LRESULT>(wParam);
+    default:
+        return selectionProc(message, wParam, lParam, known);
+    }
+}
+
+// --- selection ---
+
+LRESULT ListBoxWindow::setCurrent(LONG_PTR index) {
+    if (isMultiple()) {
+        return LB_ERR;
+    }
+    if (!m_items.isValid(index)) {
+        m_current = -1;
+        refresh();
+        return LB_ERR; // for -1 as well, which takes the selection away
+    }
+    m_current = m_caret = m_anchor = static_cast<int>(index);
+    showRow(m_current);
+    refresh();
+    return index;
+}
+
+void ListBoxWindow::selectRange(int first, int last, bool selected) {
+    for (int row = std::max(std::min(first, last), 0); row <= std::max(first, last) && row < m_items.count(); ++row) {
+        m_items.at(row).selected = selected;
+    }
+    refresh();
+}
+
+void ListBoxWindow::selectOnly(int first, int last) {
+    selectRange(0, m_items.count() - 1, false);
+    selectRange(first, last, true);
+}
+
+LRESULT ListBoxWindow::setSelected(bool selected, LONG_PTR index) {
+    if (!isMultiple() || (index != -1 && !m_items.isValid(index))) {
+        return LB_ERR;
+    }
+    if (index == -1) {
+        selectRange(0, m_items.count() - 1, selected);
+    } else {
+        const int row = static_cast<int>(index);
+        m_items.at(row).selected = selected;
+        m_caret = row;
+        m_anchor = selected ? row : m_anchor;
+        refresh();
+    }
+    return LB_OKAY;
+}
+
+LRESULT ListBoxWindow::selectedItems(int capacity, int* indices) const {
+    int stored = 0;
+    for (int row = 0; row < m_items.count() && stored < capacity; ++row) {
+        if (m_items.at(row).selected) {
+            indices[stored++] = row;
+        }
+    }
+    return stored;
+}
+
+LRESULT ListBoxWindow::selectionProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    const auto row = static_cast<int>(wParam);
+    switch (message) {
+    case LB_SETCURSEL:
+        return setCurrent(row);
+    case LB_GETCURSEL:
+        return isMultiple() ? m_caret : m_current;
+    case LB_SETSEL:
+        return setSelected(wParam != 0, static_cast<int>(lParam));
+    case LB_GETSEL:
+        if (!m_items.isValid(row)) {
+            return LB_ERR;
+        }
+        return (isMultiple() ? m_items.at(row).selected : m_current == row) ? TRUE : FALSE;
+    case LB_GETSELCOUNT:
+        return isMultiple() ? m_items.selectedCount() : LB_ERR;
+    case LB_GETSELITEMS:
+        return isMultiple() ? selectedItems(row, reinterpret_cast<int*>(lParam)) : LB_ERR;
+    case LB_SELITEMRANGE:
+        if (!isMultiple()) {
+            return LB_ERR;
+        }
+        selectRange(LOWORD(lParam), HIWORD(lParam), wParam != 0);
+        return LB_OKAY;
+    case LB_SELITEMRANGEEX: {
+        const auto last = static_cast<int>(lParam);
+        if (!isMultiple()) {
+            return LB_ERR;
+        }
+        selectRange(row, last, row <= last);
+        return LB_OKAY;
+    }
+    case LB_SETANCHORINDEX:
+        m_anchor = row;
+        return LB_OKAY;
+    case LB_GETANCHORINDEX:
+        return m_anchor;
+    case LB_SETCARETINDEX:
+        if (!m_items.isValid(row)) {
+            return LB_ERR;
+        }
+        m_caret = row;
+        showRow(row);
+        refresh();
+        return LB_OKAY;
+    case LB_GETCARETINDEX:
+        return m_caret;
+    default:
+        return layoutProc(message, wParam, lParam, known);
+    }
+}
+
+LRESULT ListBoxWindow::layoutProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
+    const auto row = static_cast<int>(wParam);
+    switch (message) {
+    case LB_GETTOPINDEX:
+        return top();
+    case LB_SETTOPINDEX:
+        setTop(row);
+        return LB_OKAY;
+    case LB_GETITEMHEIGHT:
+        return m_rowHeight;
+    case LB_SETITEMHEIGHT:
+        m_rowHeight = std::clamp(static_cast<int>(LOWORD(lParam)), 1, 1000);
+        contentChanged();
+        return LB_OKAY;
+    case LB_GETITEMRECT:
+        if (!m_items.isValid(row)) {
+            return LB_ERR;
+        }
+        *reinterpret_cast<RECT*>(lParam) = fromQt(rowRect(row));
+        return LB_OKAY;
+    case LB_ITEMFROMPOINT: {
+        const QPoint point(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam));
+        const bool outside = !clientRect().contains(point) || top() + point.y() / m_rowHeight >= m_items.count();
+        return MAKELONG(std::max(rowAt(point.y()), 0), outside ? 1 : 0);
+    }
+    case LB_GETHORIZONTALEXTENT:
+        return m_extent;
+    case LB_SETHORIZONTALEXTENT:
+        m_extent = row;
+        applyRange();
+        return 0;
+    case LB_SETTABSTOPS: {
+        const auto* stops = reinterpret_cast<const int*>(lParam);
+        m_tabStops.clear();
+        for (int i = 0; i < row; ++i) {
+            m_tabStops.push_back(stops[i] * dialogBaseUnits(widget()->font()).width() / 4);
+        }
+        refresh();
+        return TRUE;
+    }
+    default:
+        known = false;
+        return 0;
+    }
+}
+
+LRESULT ListBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message >= LB_ADDSTRING && message <= LB_ITEMFROMPOINT) {
+        bool known = true;
+        const LRESULT result = itemProc(message, wParam, lParam, known);
+        return known ? result : LB_ERR;
+    }
+    if (message == WM_CREATE && isOwnerDrawn()) {
+        measure(); // only now the control's own object can answer
+        return 0;
+    }
+    if (message == WM_DESTROY) {
+        reset();
+        return 0;
+    }
+    return Control::defaultProc(message, wParam, lParam);
+}
+
+// --- the user ---
+
+void ListBoxWindow::tellSelection() {
+    if ((style() & LBS_NOTIFY) != 0) {
+        notify(LBN_SELCHANGE);
+    }
+}
+
+/// Goes to a line as the user does.
+/// @param extend keep the anchor and select up to here. @param toggle change this line only.
+void ListBoxWindow::moveCaret(int index, bool extend, bool toggle) {
+    if (!m_items.isValid(index) || (style() & LBS_NOSEL) != 0) {
+        return;
+    }
+    const int before = m_current;
+    m_caret = index;
+    if (!isMultiple()) {
+        m_current = m_anchor = index;
+    } else if (extend && isExtended()) {
+        m_anchor = m_anchor < 0 ? index : m_anchor;
+        selectOnly(m_anchor, index);
+    } else if (toggle) {
+        m_items.at(index).selected = !m_items.at(index).selected;
+        m_anchor = index;
+    } else if (isExtended()) {
+        m_anchor = index;
+        selectOnly(index, index);
+    }
+    showRow(index);
+    refresh();
+    if (isMultiple() || before != m_current) {
+        tellSelection();
+    }
+}
+
+void ListBoxWindow::press(const QMouseEvent& event, bool twice) {
+    if (event.button() != Qt::LeftButton) {
+        return;
+    }
+    const int row = rowAt(event.position().toPoint().y());
+    m_pressed = true;
+    if (twice) {
+        if ((style() & LBS_NOTIFY) != 0) {
+            notify(LBN_DBLCLK);
+        }
+        return;
+    }
+    const bool control = event.modifiers().testFlag(Qt::ControlModifier);
+    const bool shift = event.modifiers().testFlag(Qt::ShiftModifier);
+    const bool toggle = (style() & LBS_MULTIPLESEL) != 0 ? !isExtended() || control : control;
+    moveCaret(row, shift, toggle);
+}
+
+void ListBoxWindow::drag(const QMouseEvent& event) {
+    const int row = rowAt(event.position().toPoint().y());
+    const bool selects = !isMultiple() || isExtended();
+    if (event.buttons().testFlag(Qt::LeftButton) && selects && row >= 0 && row != m_caret) {
+        moveCaret(row, isExtended(), false);
+    }
+}
+
+bool ListBoxWindow::search(const QString& text) {
+    const int found = m_items.find(fromQt(text), m_caret, ListItems::Match::Prefix);
+    if (found >= 0) {
+        moveCaret(found, false, false);
+    }
+    return found >= 0;
+}
+
+bool ListBoxWindow::key(const QKeyEvent& event) {
+    const int page = std::max(visibleRows() - 1, 1);
+    const int last = m_items.count() - 1;
+    int target = m_caret;
+    switch (event.key()) {
+    case Qt::Key_Up:
+    case Qt::Key_Left:
+        target = std::max(m_caret - 1, 0);
+        break;
+    case Qt::Key_Down:
+    case Qt::Key_Right:
+        target = std::min(m_caret + 1, last);
+        break;
+    case Qt::Key_PageUp:
+        target = std::max(m_caret - page, 0);
+        break;
+    case Qt::Key_PageDown:
+        target = std::min(m_caret + page, last);
+        break;
+    case Qt::Key_Home:
+        target = 0;
+        break;
+    case Qt::Key_End:
+        target = last;
+        break;
+    case Qt::Key_Space:
+        if (isMultiple()) {
+            moveCaret(m_caret, false, !isExtended() || event.modifiers().testFlag(Qt::ControlModifier));
+            return true;
+        }
+        [[fallthrough]];
+    default:
+        return !event.text().isEmpty() && event.text().at(0).isPrint() && hasStrings() && search(event.text());
+    }
+    moveCaret(target, event.modifiers().testFlag(Qt::ShiftModifier), false);
+    return true;
+}
+
+// --- painting ---
+
+void ListBoxWindow::paintText(QPainter& painter, const QRect& rect, const QString& text) const {
+    if ((style() & LBS_USETABSTOPS) == 0 || !text.contains(QLatin1Char('\t'))) {
+        painter.drawText(rect, Qt::AlignLeft | Qt::AlignVCenter | Qt::TextSingleLine, text);
+        return;
+    }
+    // Tab stops stand where the list was told, then at the distance of 32 dialog units.
+    const int distance =
+        m_tabStops.size() == 1 ? m_tabStops.front() : std::max(32 * dialogBaseUnits(widget()->font()).width() / 4, 1);
+    int x = 0;
+    for (const QString& part : text.split(QLatin1Char('\t'))) {
+        painter.drawText(rect.adjusted(x, 0, 0, 0), Qt::AlignLeft | Qt::AlignVCenter | Qt::TextSingleLine, part);
+        x += painter.fontMetrics().horizontalAdvance(part) + 1;
+        const auto stop = std::upper_bound(m_tabStops.begin(), m_tabStops.end(), x);
+        x = m_tabStops.size() > 1 && stop != m_tabStops.end() ? *stop : (x / distance + 1) * distance;
+    }
+}
+
+void ListBoxWindow::paintRow(QPainter& painter, int index) const {
+    const QRect rect = rowRect(index);
+    const auto& item = m_items.at(index);
+    const bool selected = isMultiple() ? item.selected : m_current == index;
+    const auto group = isEnabled() ? QPalette::Active : QPalette::Disabled;
+    const QPalette& palette = m_area->viewport()->palette();
+    if (selected) {
+        painter.fillRect(rect, palette.brush(group, QPalette::Highlight));
+    }
+    painter.setPen(palette.color(group, selected ? QPalette::HighlightedText : QPalette::Text));
+    paintText(painter, rect.adjusted(textIndent, 0, 0, 0), toQt(item.text.c_str()));
+    if (index == m_caret && m_area->hasFocus()) {
+        QStyleOptionFocusRect option;
+        option.initFrom(m_area->viewport());
+        option.rect = rect;
+        option.backgroundColor = palette.color(selected ? QPalette::Highlight : QPalette::Base);
+        m_area->style()->drawPrimitive(QStyle::PE_FrameFocusRect, &option, &painter, m_area);
+    }
+}
+
+void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
+    const HWND self = handle();
+    OwnerPainting drawing(*this, m_area->viewport()->size(), m_area->viewport()->palette().color(QPalette::Base));
+    for (int row = first; row <= last && row < m_items.count() && from(self); ++row) {
+        DRAWITEMSTRUCT item{};
+        item.CtlType = ODT_LISTBOX;
+        item.itemID = static_cast<UINT>(row);
+        item.itemData = static_cast<ULONG_PTR>(m_items.at(row).data);
+        item.rcItem = fromQt(rowRect(row));
+        const bool selected = isMultiple() ? m_items.at(row).selected : m_current == row;
+        item.itemState = (selected ? ODS_SELECTED : 0U) | (row == m_caret && m_area->hasFocus() ? ODS_FOCUS : 0U) |
+                         (isEnabled() ? 0U : ODS_DISABLED);
+        drawing.draw(item);
+    }
+    if (from(self)) {
+        painter.drawImage(0, 0, drawing.image());
+    }
+}
+
+void ListBoxWindow::paint(QPainter& painter, const QRect& exposed) {
+    const int first = std::max(top() + exposed.top() / m_rowHeight, 0);
+    const int last = std::min(top() + exposed.bottom() / m_rowHeight, m_items.count() - 1);
+    if (isOwnerDrawn()) {
+        paintOwnerRows(painter, first, last);
+        return;
+    }
+    for (int row = first; row <= last; ++row) {
+        paintRow(painter, row);
+    }
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,101 @@
+#pragma once
+
+/// @file
+/// List boxes.
+
+#include "platform/afx/controls/detail/Control.h"
+#include "platform/afx/controls/detail/ListItems.h"
+
+class QAbstractScrollArea;
+class QKeyEvent;
+class QMouseEvent;
+
+namespace tvx::afx {
+
+/// The "ListBox" class: lines of one height over a flat table, so that filling costs no measuring and painting only
+/// looks at what is seen. Several columns (LBS_MULTICOLUMN) and lines of different heights are not offered: such lists
+/// show one column, and the height asked for line 0.
+class TVX_PLATFORM_API ListBoxWindow : public Control {
+public:
+    using Control::Control;
+    ~ListBoxWindow() override = default;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    QWidget* clientWidget() const override;
+    QRect clientRect() const override;
+    void setWindowRect(const QRect& rect) override;
+    UINT dialogCode(const MSG* msg) const override;
+    UINT colorMessage() const override {
+        return WM_CTLCOLORLISTBOX;
+    }
+
+    // --- what the widget hands on ---
+    void paint(QPainter& painter, const QRect& exposed);
+    void press(const QMouseEvent& event, bool twice);
+    void drag(const QMouseEvent& event);
+    bool key(const QKeyEvent& event);
+    void applyRange();
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void widgetMade() override;
+    void fontChanged() override;
+    void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
+    void focusMoved(bool got) override;
+    void applyColors(QPalette& palette, const QColor& text, const QColor& background) const override;
+
+private:
+    bool isMultiple() const {
+        return (style() & (LBS_MULTIPLESEL | LBS_EXTENDEDSEL)) != 0;
+    }
+    bool isExtended() const {
+        return (style() & LBS_EXTENDEDSEL) != 0;
+    }
+    bool isOwnerDrawn() const {
+        return (style() & (LBS_OWNERDRAWFIXED | LBS_OWNERDRAWVARIABLE)) != 0;
+    }
+    bool hasStrings() const {
+        return !isOwnerDrawn() || (style() & LBS_HASSTRINGS) != 0;
+    }
+    void applyBars();
+    void measure();
+    void contentChanged();
+    void refresh();
+    int top() const;
+    void setTop(int index);
+    int visibleRows() const;
+    int rowAt(int y) const;
+    QRect rowRect(int index) const;
+    void showRow(int index);
+    LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
+    LRESULT removeRow(LONG_PTR index);
+    void reset();
+    void tellDeleted(int index);
+    LRESULT find(WPARAM after, LPARAM text, ListItems::Match match) const;
+    LRESULT copyText(WPARAM index, LPARAM buffer) const;
+    LRESULT setCurrent(LONG_PTR index);
+    LRESULT setSelected(bool selected, LONG_PTR index);
+    void selectRange(int first, int last, bool selected);
+    void selectOnly(int first, int last);
+    LRESULT selectedItems(int capacity, int* indices) const;
+    void moveCaret(int index, bool extend, bool toggle);
+    void tellSelection();
+    bool search(const QString& text);
+    void paintRow(QPainter& painter, int index) const;
+    void paintText(QPainter& painter, const QRect& rect, const QString& text) const;
+    void paintOwnerRows(QPainter& painter, int first, int last);
+    LRESULT itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+    LRESULT selectionProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+    LRESULT layoutProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
+
+    QAbstractScrollArea* m_area = nullptr;
+    ListItems m_items;
+    int m_current = -1; ///< the selected line of a single selection
+    int m_caret = -1;
+    int m_anchor = -1;
+    int m_rowHeight = 15;
+    int m_extent = 0;
+    std::vector<int> m_tabStops; ///< pixels
+    bool m_pressed = false;
+};
+
+} // namespace tvx::afx

@@ -1,0 +1,209 @@
+#pragma once
+
+/// @file
+/// The application object and the state of the running module.
+
+#include "platform/afx/core/CommandLineInfo.h"
+#include "platform/afx/core/Thread.h"
+#include "platform/base/List.h"
+#include "platform/win/ExtensionModule.h"
+#include "platform/win/Registry.h"
+
+class CDocManager;
+class CDocTemplate;
+class CDocument;
+
+/// What the framework knows about the running module.
+struct AFX_MODULE_STATE {
+    HINSTANCE m_hCurrentInstanceHandle = nullptr;
+    HINSTANCE m_hCurrentResourceHandle = nullptr;
+    /// The name given to the application object's constructor, or the program's base name.
+    LPCSTR m_lpszCurrentAppName = nullptr;
+    class CWinApp* m_pCurrentWinApp = nullptr;
+};
+
+/// The one application object of a process.
+///
+/// A host derives a class, defines one global object of it and overrides InitInstance. It has no `main`: the entry
+/// point that tvx_add_application links calls InitApplication, InitInstance and, when that answered TRUE, Run.
+///
+/// @code
+/// class CMyApp : public CWinApp {
+/// public:
+///     CMyApp() : CWinApp("MyApp") {}
+///     BOOL InitInstance() override;
+/// };
+/// CMyApp theApp;
+/// @endcode
+class TVX_PLATFORM_API CWinApp : public CWinThread {
+    DECLARE_DYNAMIC(CWinApp)
+
+public:
+    /// @param appName the name used for captions and files; null: the title string of the resources, else the
+    /// program's name.
+    explicit CWinApp(LPCSTR appName = nullptr);
+    ~CWinApp() override;
+    CWinApp(const CWinApp&) = delete;
+    CWinApp& operator=(const CWinApp&) = delete;
+
+    HINSTANCE m_hInstance = nullptr;
+    /// The command line after the program's name, words with blanks quoted.
+    LPSTR m_lpCmdLine = nullptr;
+    /// The show state the main window is to begin with.
+    int m_nCmdShow = SW_SHOWNORMAL;
+    /// Display name: the caption of message boxes. Owned; replaced with free() and strdup().
+    LPCSTR m_pszAppName = nullptr;
+    /// The program's file name without directory and extension.
+    LPCSTR m_pszExeName = nullptr;
+    /// Full name of the help file.
+    LPCSTR m_pszHelpFilePath = nullptr;
+    /// Name of the application's part of the settings below m_pszRegistryKey.
+    LPCSTR m_pszProfileName = nullptr;
+    /// The maker's part of the settings; null until SetRegistryKey.
+    LPCSTR m_pszRegistryKey = nullptr;
+    CDocManager* m_pDocManager = nullptr;
+
+    virtual BOOL InitApplication();
+    BOOL InitInstance() override;
+    int Run() override;
+    BOOL OnIdle(LONG count) override;
+    int ExitInstance() override;
+
+    /// Hands each word of the command line to `info`, without its leading "-" or "/" when it is a switch.
+    ///
+    /// A word that begins with "/" and names an existing file or folder is that file, not a switch.
+    void ParseCommandLine(CCommandLineInfo& info);
+    /// Does what the command line asked for: a new document, opening the named file, ... FALSE when that failed or
+    /// when the application is to end.
+    BOOL ProcessShellCommand(CCommandLineInfo& info);
+
+    /// Settings. Each is an entry of a section of the application's part of the user's settings, which is the key
+    /// "Software\<maker>\<profile name>", or "Software\<profile name>" before SetRegistryKey was called. Code that sets
+    /// m_pszProfileName for a while reaches the settings of that name. Nothing is kept in memory: what another process
+    /// writes is seen by the next call. docs/settings.md tells where the file is.
+    /// @{
+
+    /// Makes `key` the maker's part of the settings; the application's part is its program name.
+    void SetRegistryKey(LPCSTR key);
+    void SetRegistryKey(UINT id);
+
+    /// The number of an entry, or `defaultValue` where there is no entry or it is no number.
+    virtual UINT GetProfileInt(LPCSTR section, LPCSTR entry, int defaultValue);
+    /// The text of an entry, or `defaultValue` (null: the empty text) where there is no entry or it is no text.
+    virtual CString GetProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR defaultValue = nullptr);
+    CString GetProfileString(LPCSTR section, LPCSTR entry, LPCSTR defaultValue = nullptr) {
+        return GetProfileStringA(section, entry, defaultValue);
+    }
+    /// The bytes of an entry.
+    /// @param data  receives a copy, which the caller frees with delete[]; null where the call fails
+    /// @return whether there is such an entry of bytes
+    virtual BOOL GetProfileBinary(LPCSTR section, LPCSTR entry, LPBYTE* data, UINT* size);
+    /// Writes a number. FALSE when that failed, as in the other calls that write.
+    virtual BOOL WriteProfileInt(LPCSTR section, LPCSTR entry, int value);
+    /// Writes a text.
+    /// @param entry  null removes the whole section
+    /// @param value  null removes the entry
+    virtual BOOL WriteProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR value);
+    BOOL WriteProfileString(LPCSTR section, LPCSTR entry, LPCSTR value) {
+        return WriteProfileStringA(section, entry, value);
+    }
+    /// Writes bytes.
+    virtual BOOL WriteProfileBinary(LPCSTR section, LPCSTR entry, LPBYTE data, UINT size);
+    /// @}
+
+    /// Documents.
+    /// @{
+
+    void AddDocTemplate(CDocTemplate* docTemplate);
+    POSITION GetFirstDocTemplatePosition() const;
+    CDocTemplate* GetNextDocTemplate(POSITION& position) const;
+    /// Opens a document, or activates it when it is open already. Null when that failed (the user has been told).
+    virtual CDocument* OpenDocumentFile(LPCSTR fileName);
+    /// Asks for each modified document whether it is to be saved. FALSE when the user cancelled.
+    virtual BOOL SaveAllModified();
+    void CloseAllDocuments(BOOL endSession);
+    int GetOpenDocumentCount();
+    /// Asks for a file name with the document manager's dialog.
+    BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog, CDocTemplate* docTemplate);
+    /// @}
+
+    /// Resources.
+    /// @{
+
+    HICON LoadIcon(LPCSTR name) const;
+    HICON LoadIcon(UINT id) const;
+    HICON LoadStandardIcon(LPCSTR name) const;
+    HCURSOR LoadCursor(LPCSTR name) const;
+    HCURSOR LoadCursor(UINT id) const;
+    HCURSOR LoadStandardCursor(LPCSTR name) const;
+    /// @}
+
+    /// What a derived class may change.
+    /// @{
+
+    /// Shows a message box; AfxMessageBox calls this.
+    /// @param helpId context of the box's help, 0 for none.
+    virtual int DoMessageBox(LPCSTR text, UINT type, UINT helpId);
+    /// Shows (1), ends (-1) or shows again (0) the wait cursor.
+    virtual void DoWaitCursor(int code);
+    /// Every help request of the framework ends here. The base version has no viewer and answers nothing.
+    virtual void WinHelpA(DWORD_PTR data, UINT command = HELP_CONTEXT);
+    /// Help requests of the framework's own windows; calls WinHelpA.
+    virtual void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT);
+
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    /// @}
+
+    /// Commands.
+    /// @{
+
+    afx_msg void OnFileNew();
+    afx_msg void OnFileOpen();
+    afx_msg void OnAppExit();
+    afx_msg void OnHelp();
+    afx_msg void OnHelpIndex();
+    afx_msg void OnHelpFinder();
+    afx_msg void OnHelpUsing();
+    afx_msg void OnContextHelp();
+
+    /// Hides the main window: the first step of the end.
+    void HideApplication();
+
+    DECLARE_MESSAGE_MAP()
+    /// @}
+private:
+    friend int AfxWinMain(int argc, char** argv);
+    void rememberCommandLine(int argc, char** argv);
+    void DeleteDocManager();
+    CString profilePath() const;
+    LSTATUS writeEntry(LPCSTR section, LPCSTR entry, DWORD type, std::string_view bytes);
+    int m_waitDepth = 0;
+};
+
+/// The text behind the mark of a word that is a switch, null for a plain word. Switches begin with "-" or "/"; a word
+/// that begins with "/" and names an existing file or folder is that file.
+TVX_PLATFORM_API const char* AfxSwitchOf(const char* word);
+
+/// The application object, null before its constructor ran.
+TVX_PLATFORM_API CWinApp* AfxGetApp();
+/// The application's main window, null when there is none.
+TVX_PLATFORM_API CWnd* AfxGetMainWnd();
+TVX_PLATFORM_API AFX_MODULE_STATE* AfxGetModuleState();
+TVX_PLATFORM_API LPCSTR AfxGetAppName();
+
+/// Shows a message box with the application's display name as caption and answers the button (IDOK, ...).
+///
+/// Without a display caption and text go to standard error and the default button is answered.
+/// @param type MB_...: buttons, icon and default button.
+/// @param helpId context of the box's help, 0 for none.
+TVX_PLATFORM_API int AfxMessageBox(LPCSTR text, UINT type = MB_OK, UINT helpId = 0);
+/// The same with a string resource.
+TVX_PLATFORM_API int AfxMessageBox(UINT textId, UINT type = MB_OK, UINT helpId = static_cast<UINT>(-1));
+/// A message box with a caption of its own over `owner` (may be null).
+TVX_PLATFORM_API int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type);
+TVX_PLATFORM_API BOOL MessageBeep(UINT type);
+/// Puts `first` and `second` into the places "%1" and "%2" of a format.
+TVX_PLATFORM_API void AfxFormatString1(CString& result, UINT formatId, LPCSTR first);
+TVX_PLATFORM_API void AfxFormatString2(CString& result, UINT formatId, LPCSTR first, LPCSTR second);
+/// What the entry point runs: the application object's life from InitApplication to its exit code.
+TVX_PLATFORM_API int AfxWinMain(int argc, char** argv);

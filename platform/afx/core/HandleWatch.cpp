@@ -1,0 +1,155 @@
+#include "platform/afx/core/HandleWatch.h"
+
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/HandleWatches.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/win/detail/KernelObject.h"
+#include "platform/win/detail/ProcessObject.h"
+
+#include <QCoreApplication>
+#include <QSocketNotifier>
+#include <QTimer>
+
+#include <algorithm>
+#include <chrono>
+#include <memory>
+#include <vector>
+
+namespace tvx::afx {
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+constexpr std::chrono::milliseconds frame{16};
+
+using Objects = std::vector<std::shared_ptr<win::KernelObject>>;
+
+/// One window's request. It stays when it was answered, to know when that was.
+class Watch : public QObject {
+public:
+    Watch(HWND window, UINT message) : m_window(window), m_message(message) {
+        m_nextFrame.setSingleShot(true);
+        m_nextFrame.setTimerType(Qt::PreciseTimer);
+        connect(&m_nextFrame, &QTimer::timeout, this, &Watch::post);
+    }
+    ~Watch() override {
+        disarm();
+    }
+
+    HWND window() const {
+        return m_window;
+    }
+    bool isFor(HWND window, UINT message) const {
+        return window == m_window && message == m_message;
+    }
+    bool waitsFor(HANDLE handle) const {
+        return std::ranges::find(m_handles, handle) != m_handles.end();
+    }
+
+    void arm(std::span<const HANDLE> handles, Objects objects) {
+        disarm();
+        m_handles.assign(handles.begin(), handles.end());
+        m_objects = std::move(objects);
+        for (const auto& object : m_objects) {
+            auto* notifier = new QSocketNotifier(object->descriptor(), QSocketNotifier::Read, this);
+            connect(notifier, &QSocketNotifier::activated, this, &Watch::signalled);
+            m_notifiers.push_back(notifier);
+        }
+    }
+
+    void disarm() {
+        m_nextFrame.stop();
+        m_handles.clear();
+        forgetObjects();
+    }
+
+private:
+    void signalled() {
+        forgetObjects();
+        const auto wait = std::chrono::ceil<std::chrono::milliseconds>(m_lastPost + frame - Clock::now());
+        if (wait.count() > 0) {
+            m_nextFrame.start(wait);
+        } else {
+            post();
+        }
+    }
+
+    void post() {
+        m_handles.clear();
+        m_lastPost = Clock::now();
+        PostMessage(m_window, m_message, 0, 0);
+    }
+
+    void forgetObjects() {
+        for (QSocketNotifier* notifier : m_notifiers) {
+            notifier->setEnabled(false);
+            // One of them may be calling now.
+            notifier->deleteLater();
+        }
+        m_notifiers.clear();
+        m_objects.clear();
+    }
+
+    const HWND m_window;
+    const UINT m_message;
+    std::vector<HANDLE> m_handles;
+    Objects m_objects;
+    std::vector<QSocketNotifier*> m_notifiers;
+    QTimer m_nextFrame;
+    Clock::time_point m_lastPost = Clock::now() - frame;
+};
+
+/// All requests, those of the windows that live.
+std::vector<std::unique_ptr<Watch>>& watches() {
+    // Never destroyed: windows may be taken down by static destructors.
+    static auto* all = new std::vector<std::unique_ptr<Watch>>;
+    return *all;
+}
+
+Watch& watchOf(HWND window, UINT message) {
+    const auto found =
+        std::ranges::find_if(watches(), [&](const auto& watch) { return watch->isFor(window, message); });
+    if (found != watches().end()) {
+        return **found;
+    }
+    return *watches().emplace_back(std::make_unique<Watch>(window, message));
+}
+
+} // namespace
+
+void forgetHandleWatches(HWND window) {
+    std::erase_if(watches(), [window](const auto& watch) { return watch->window() == window; });
+}
+
+void watchReleasedChildren() {
+    auto& children = win::ReleasedChildren::instance();
+    if (children.bell() < 0) {
+        return;
+    }
+    auto* notifier = new QSocketNotifier(children.bell(), QSocketNotifier::Read, QCoreApplication::instance());
+    QObject::connect(notifier, &QSocketNotifier::activated, [&children] { children.collect(); });
+}
+
+} // namespace tvx::afx
+
+using namespace tvx::afx;
+
+bool tvx::postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT message) {
+    Objects objects;
+    for (const HANDLE handle : handles) {
+        objects.push_back(win::objectOf(handle));
+    }
+    if (!Window::from(window) || std::ranges::find(objects, nullptr) != objects.end()) {
+        return false;
+    }
+    watchOf(window, message).arm(handles, std::move(objects));
+    return true;
+}
+
+void tvx::cancelPosts(HANDLE handle) {
+    for (const auto& watch : watches()) {
+        if (watch->waitsFor(handle)) {
+            watch->disarm();
+        }
+    }
+}

@@ -1,0 +1,146 @@
+#pragma once
+
+/// @file
+/// The calls that work on bare window handles. A handle that is no window (any more) makes them answer 0 and do
+/// nothing.
+///
+/// Under X11 the handle of a top-level window is its X id, which means the same window to every process. The calls
+/// `IsWindow`, `IsIconic`, `IsZoomed`, `ShowWindow`, `GetParent`, `GetClassNameA`, `GetWindowThreadProcessId` and
+/// `SetForegroundWindow` take windows of other processes too. In a Wayland session they do not exist: handles of other
+/// processes are no windows there.
+
+#include "platform/afx/core/Message.h"
+
+/// Windows: their tree, state, place and painting. Each call is the CWnd member of the same name.
+/// @{
+TVX_PLATFORM_API BOOL IsWindow(HWND window);
+TVX_PLATFORM_API BOOL DestroyWindow(HWND window);
+/// The parent of a child, the owner of a popup or dialog.
+TVX_PLATFORM_API HWND GetParent(HWND window);
+TVX_PLATFORM_API HWND SetParent(HWND window, HWND parent);
+TVX_PLATFORM_API HWND GetWindow(HWND window, UINT relation);
+TVX_PLATFORM_API HWND GetTopWindow(HWND window);
+TVX_PLATFORM_API HWND GetDlgItem(HWND window, int id);
+TVX_PLATFORM_API int GetDlgCtrlID(HWND window);
+TVX_PLATFORM_API BOOL IsChild(HWND parent, HWND window);
+TVX_PLATFORM_API BOOL IsWindowVisible(HWND window);
+TVX_PLATFORM_API BOOL IsWindowEnabled(HWND window);
+TVX_PLATFORM_API BOOL EnableWindow(HWND window, BOOL enable);
+TVX_PLATFORM_API BOOL IsIconic(HWND window);
+TVX_PLATFORM_API BOOL IsZoomed(HWND window);
+/// The result tells whether the window was visible before. Windows of other processes are minimised, restored,
+/// maximised and brought to the front; SW_HIDE leaves them as they are.
+TVX_PLATFORM_API BOOL ShowWindow(HWND window, int command);
+TVX_PLATFORM_API BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint);
+TVX_PLATFORM_API BOOL SetWindowPos(HWND window, HWND after, int x, int y, int cx, int cy, UINT flags);
+TVX_PLATFORM_API BOOL BringWindowToTop(HWND window);
+TVX_PLATFORM_API BOOL GetWindowRect(HWND window, RECT* rect);
+TVX_PLATFORM_API BOOL GetClientRect(HWND window, RECT* rect);
+TVX_PLATFORM_API BOOL GetWindowPlacement(HWND window, WINDOWPLACEMENT* placement);
+TVX_PLATFORM_API BOOL SetWindowPlacement(HWND window, const WINDOWPLACEMENT* placement);
+TVX_PLATFORM_API BOOL ClientToScreen(HWND window, POINT* point);
+TVX_PLATFORM_API BOOL ScreenToClient(HWND window, POINT* point);
+/// Null stands for the screen.
+TVX_PLATFORM_API int MapWindowPoints(HWND from, HWND to, POINT* points, UINT count);
+TVX_PLATFORM_API BOOL InvalidateRect(HWND window, const RECT* rect, BOOL erase);
+TVX_PLATFORM_API BOOL UpdateWindow(HWND window);
+TVX_PLATFORM_API BOOL RedrawWindow(HWND window, const RECT* rect, HRGN region, UINT flags);
+/// @}
+
+/// Keyboard, mouse and activation: which window has them. The setting calls answer the window that had them before.
+/// @{
+TVX_PLATFORM_API HWND GetFocus();
+TVX_PLATFORM_API HWND SetFocus(HWND window);
+TVX_PLATFORM_API HWND GetCapture();
+TVX_PLATFORM_API HWND SetCapture(HWND window);
+TVX_PLATFORM_API BOOL ReleaseCapture();
+TVX_PLATFORM_API HWND GetActiveWindow();
+TVX_PLATFORM_API HWND SetActiveWindow(HWND window);
+/// @}
+/// The active window, this process's or another one's; null when there is none.
+TVX_PLATFORM_API HWND GetForegroundWindow();
+/// Brings a window to the front and makes it the active one. FALSE when it is no window, or when the window manager
+/// refuses another process's: that one asks for attention then.
+TVX_PLATFORM_API BOOL SetForegroundWindow(HWND window);
+/// The screen's own window; its rectangle is the primary screen's.
+TVX_PLATFORM_API HWND GetDesktopWindow();
+TVX_PLATFORM_API HWND WindowFromPoint(POINT point);
+TVX_PLATFORM_API HWND ChildWindowFromPoint(HWND parent, POINT point);
+TVX_PLATFORM_API HWND FindWindowA(LPCSTR className, LPCSTR text);
+/// Calls `callback` for all descendants of a window until it answers FALSE.
+TVX_PLATFORM_API BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param);
+/// Calls `callback` for each top-level window until it answers FALSE: this process's in the order of their creation,
+/// then those of other processes that the window manager lists, the topmost first.
+TVX_PLATFORM_API BOOL EnumWindows(WNDENUMPROC callback, LPARAM param);
+/// The same for the windows of one thread. Of another process all windows belong to its first thread, whose number is
+/// the process's own.
+TVX_PLATFORM_API BOOL EnumThreadWindows(DWORD thread, WNDENUMPROC callback, LPARAM param);
+/// The thread that a window lives on; 0 when it is no window, or one of another machine.
+/// @param process receives the window's process; may be null; unchanged when the result is 0
+TVX_PLATFORM_API DWORD GetWindowThreadProcessId(HWND window, DWORD* process);
+/// Kept for hosts that attach to the foreground window's thread before they activate a window. The display has one
+/// input for all, so nothing has to be attached. FALSE for equal threads and for 0.
+TVX_PLATFORM_API BOOL AttachThreadInput(DWORD from, DWORD to, BOOL attach);
+
+/// Texts and numbers of a window; buffers are always ended by NUL.
+/// @{
+TVX_PLATFORM_API BOOL SetWindowTextA(HWND window, LPCSTR text);
+TVX_PLATFORM_API int GetWindowTextA(HWND window, LPSTR buffer, int size);
+TVX_PLATFORM_API int GetWindowTextLengthA(HWND window);
+TVX_PLATFORM_API int GetClassNameA(HWND window, LPSTR buffer, int size);
+/// Style, extended style, identifier or user data (GWL_...).
+TVX_PLATFORM_API LONG_PTR GetWindowLongPtrA(HWND window, int index);
+TVX_PLATFORM_API LONG_PTR SetWindowLongPtrA(HWND window, int index, LONG_PTR value);
+/// @}
+
+TVX_PLATFORM_API BOOL GetCursorPos(POINT* point);
+TVX_PLATFORM_API BOOL SetCursorPos(int x, int y);
+/// Shows a cursor over the window that the pointer is in; meant for WM_SETCURSOR handlers. Answers the previous one.
+TVX_PLATFORM_API HCURSOR SetCursor(HCURSOR cursor);
+/// One of the system's cursors (IDC_ARROW, ...; null module) or one of a module's own.
+TVX_PLATFORM_API HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name);
+/// The state of a key or mouse button (VK_...): negative when down, bit 0 set when a lock key is on.
+TVX_PLATFORM_API SHORT GetKeyState(int key);
+TVX_PLATFORM_API SHORT GetAsyncKeyState(int key);
+
+/// The dialog units of the system font (SYSTEM_FONT), in pixels: width in the low half, height in the high one. A
+/// horizontal dialog unit is a quarter of the width, a vertical one an eighth of the height.
+TVX_PLATFORM_API LONG GetDialogBaseUnits();
+
+/// Starts a timer. With a null window the identifier is chosen and answered.
+TVX_PLATFORM_API UINT_PTR SetTimer(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback);
+TVX_PLATFORM_API BOOL KillTimer(HWND window, UINT_PTR id);
+
+/// The same calls by the names without their suffix.
+/// @{
+inline LONG_PTR GetWindowLong(HWND window, int index) {
+    return GetWindowLongPtrA(window, index);
+}
+inline LONG_PTR SetWindowLong(HWND window, int index, LONG_PTR value) {
+    return SetWindowLongPtrA(window, index, value);
+}
+inline BOOL SetWindowText(HWND window, LPCSTR text) {
+    return SetWindowTextA(window, text);
+}
+inline int GetWindowText(HWND window, LPSTR buffer, int size) {
+    return GetWindowTextA(window, buffer, size);
+}
+inline HCURSOR LoadCursor(HINSTANCE module, LPCSTR name) {
+    return LoadCursorA(module, name);
+}
+/// @}
+
+// The system's cursors
+#define IDC_ARROW MAKEINTRESOURCE(32512)
+#define IDC_IBEAM MAKEINTRESOURCE(32513)
+#define IDC_WAIT MAKEINTRESOURCE(32514)
+#define IDC_CROSS MAKEINTRESOURCE(32515)
+#define IDC_SIZENWSE MAKEINTRESOURCE(32642)
+#define IDC_SIZENESW MAKEINTRESOURCE(32643)
+#define IDC_SIZEWE MAKEINTRESOURCE(32644)
+#define IDC_SIZENS MAKEINTRESOURCE(32645)
+#define IDC_SIZEALL MAKEINTRESOURCE(32646)
+#define IDC_NO MAKEINTRESOURCE(32648)
+#define IDC_HAND MAKEINTRESOURCE(32649)
+#define IDC_APPSTARTING MAKEINTRESOURCE(32650)
+#define IDC_HELP MAKEINTRESOURCE(32651)

@@ -1,0 +1,436 @@
+#pragma once
+
+/// @file
+/// CWnd, the object around a window handle, and the calls that work on bare handles.
+
+#include "platform/afx/core/CmdTarget.h"
+#include "platform/afx/core/MessageMap.h"
+#include "platform/afx/core/WindowCalls.h"
+
+class CDC;
+class CDataExchange;
+class CFont;
+class CFrameWnd;
+class CMenu;
+class CRgn;
+class CScrollBar;
+class CWinThread;
+
+namespace tvx::afx {
+class Window;
+}
+
+/// A window: a top-level frame, a dialog, a view, a control.
+///
+/// Derive a class, give it a message map, make the object and create its window:
+///
+/// @code
+/// auto* view = new CMyView;              // deletes itself in PostNcDestroy, or is a member of its parent
+/// view->Create(nullptr, nullptr, WS_CHILD | WS_VISIBLE, rect, parent, AFX_IDW_PANE_FIRST);
+/// @endcode
+///
+/// The object and its window are two things: the window ends with DestroyWindow (the object's destructor calls it if
+/// the window still lives), the object when its owner deletes it. Objects that delete themselves do so in
+/// PostNcDestroy. FromHandle answers the object of a window, or a temporary one that must not be kept: it is gone when
+/// the application is next idle.
+///
+/// Coordinates are pixels: of the screen for window rectangles, of the parent's client area for moving children, of the
+/// own client area for drawing and mouse messages. Texts are UTF-8. Members that need a window answer 0 or do nothing
+/// when there is none.
+class TVX_PLATFORM_API CWnd : public CCmdTarget {
+    DECLARE_DYNCREATE(CWnd)
+
+public:
+    /// The window's handle, null when there is no window.
+    HWND m_hWnd = nullptr;
+
+    CWnd() = default;
+    /// Destroys the window if it still lives; it gets no PostNcDestroy any more.
+    ~CWnd() override;
+    CWnd(const CWnd&) = delete;
+    CWnd& operator=(const CWnd&) = delete;
+
+    /// The handle of an object that may be null.
+    HWND GetSafeHwnd() const {
+        return HandleOf(this);
+    }
+    operator HWND() const {
+        return m_hWnd;
+    }
+
+    /// Objects and handles.
+    /// @{
+
+    /// The object of a window, or a temporary one; null for a null handle.
+    static CWnd* FromHandle(HWND window);
+    /// The object of a window, or null when it has none of its own.
+    static CWnd* FromHandlePermanent(HWND window);
+    /// Deletes the temporary objects made since the last call. The idle loop does this.
+    static void DeleteTempMap();
+    /// Makes this object the one of an existing window that has none. The window's messages go to this object's map.
+    BOOL Attach(HWND window);
+    /// Gives up the window without destroying it and answers its handle.
+    HWND Detach();
+    /// Like Attach; PreSubclassWindow is called first.
+    BOOL SubclassWindow(HWND window);
+    /// Attaches to the control `id` of `parent`. FALSE when there is none or it has an object already.
+    BOOL SubclassDlgItem(UINT id, CWnd* parent);
+    HWND UnsubclassWindow();
+    /// @}
+
+    /// Creation and end.
+    /// @{
+
+    /// Creates a child window.
+    /// @param className a registered class ("Edit", AfxRegisterWndClass, ...); null for the framework's plain class.
+    virtual BOOL Create(LPCSTR className, LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id,
+                        struct CCreateContext* context = nullptr);
+    /// Creates any window. `rect` is in the parent's client coordinates for children, else in screen coordinates.
+    BOOL CreateEx(DWORD exStyle, LPCSTR className, LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id,
+                  LPVOID param = nullptr);
+    /// The same with single numbers; CW_USEDEFAULT leaves place or size to the window manager.
+    BOOL CreateEx(DWORD exStyle, LPCSTR className, LPCSTR text, DWORD style, int x, int y, int width, int height,
+                  HWND parent, HMENU menuOrId, LPVOID param = nullptr);
+    /// Destroys the window and its children: WM_DESTROY parents first, WM_NCDESTROY children first.
+    virtual BOOL DestroyWindow();
+    /// Last chance to change the class and styles a window is created with. FALSE gives up the creation.
+    virtual BOOL PreCreateWindow(CREATESTRUCT& cs);
+    /// Called before an object is attached to a window, by creation and by subclassing.
+    virtual void PreSubclassWindow();
+    /// Called when the window is gone; the place for `delete this`.
+    virtual void PostNcDestroy();
+    /// @}
+
+    /// Messages.
+    /// @{
+
+    LRESULT SendMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
+        return ::SendMessageA(m_hWnd, message, wParam, lParam);
+    }
+    BOOL PostMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
+        return ::PostMessageA(m_hWnd, message, wParam, lParam);
+    }
+    LRESULT SendMessageA(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
+        return ::SendMessageA(m_hWnd, message, wParam, lParam);
+    }
+    /// Sends a message to every child, and to theirs when `deep`. With `onlyPerm` only to windows with an object.
+    void SendMessageToDescendants(UINT message, WPARAM wParam = 0, LPARAM lParam = 0, BOOL deep = TRUE,
+                                  BOOL onlyPerm = FALSE);
+    /// Looks at a message before it is dispatched, this window being its target or an ancestor of it. TRUE consumes it.
+    virtual BOOL PreTranslateMessage(MSG* message);
+    /// Handles every message of the window: the message map first, then DefWindowProc.
+    virtual LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam);
+    /// What happens with a message that no handler took.
+    virtual LRESULT DefWindowProc(UINT message, WPARAM wParam, LPARAM lParam);
+    /// DefWindowProc with the message now being handled; what the On... members of this class do.
+    LRESULT Default();
+    /// The message now being handled by any window of this thread.
+    static const MSG* GetCurrentMessage();
+    /// Offers a message to PreTranslateMessage of its target and of each ancestor up to `stop`.
+    static BOOL WalkPreTranslateTree(HWND stop, MSG* message);
+    /// Handles the keys of a dialog (Tab, arrows, Enter, Esc, mnemonics). TRUE when the message was one.
+    BOOL PreTranslateInput(MSG* message);
+    /// The first WM_COMMAND/WM_NOTIFY handler of the parent's; called with notifications of this window before them.
+    virtual BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result);
+    /// @}
+
+    /// State.
+    /// @{
+
+    DWORD GetStyle() const;
+    DWORD GetExStyle() const;
+    /// Removes and adds style bits. `swpFlags` other than 0 redraws the frame. Answers whether anything changed.
+    BOOL ModifyStyle(DWORD remove, DWORD add, UINT swpFlags = 0);
+    BOOL ModifyStyleEx(DWORD remove, DWORD add, UINT swpFlags = 0);
+    int GetDlgCtrlID() const;
+    int SetDlgCtrlID(int id);
+    /// Enables or disables input. Answers whether the window was disabled before.
+    BOOL EnableWindow(BOOL enable = TRUE);
+    BOOL IsWindowEnabled() const;
+    /// Shows, hides, minimises, maximises or restores (SW_...). Answers whether the window was visible before.
+    BOOL ShowWindow(int command);
+    /// Whether the window and all its ancestors are shown.
+    BOOL IsWindowVisible() const;
+    BOOL IsIconic() const;
+    BOOL IsZoomed() const;
+    /// @}
+
+    /// Text and font.
+    /// @{
+
+    /// Sets the caption of a frame, the text of a control.
+    void SetWindowText(LPCSTR text);
+    void SetWindowTextA(LPCSTR text) {
+        SetWindowText(text);
+    }
+    /// Copies at most size - 1 bytes, never half a character, and answers how many.
+    int GetWindowText(LPSTR buffer, int size) const;
+    void GetWindowText(CString& text) const;
+    int GetWindowTextLength() const;
+    /// Sets the font a control draws with; it stays the caller's and must live as long as the control uses it.
+    void SetFont(CFont* font, BOOL redraw = TRUE);
+    /// The font set last, null for the system's.
+    CFont* GetFont() const;
+    /// Gives a frame its icon; `bigIcon` selects the one for task lists. Answers the previous one.
+    HICON SetIcon(HICON icon, BOOL bigIcon);
+    HICON GetIcon(BOOL bigIcon) const;
+    /// @}
+
+    /// Place and size.
+    /// @{
+
+    void GetWindowRect(RECT* rect) const;
+    /// The client area, with its left top corner at 0, 0.
+    void GetClientRect(RECT* rect) const;
+    void MoveWindow(int x, int y, int width, int height, BOOL repaint = TRUE);
+    void MoveWindow(const RECT* rect, BOOL repaint = TRUE);
+    /// Moves, sizes, reorders, shows or hides in one step (SWP_...).
+    BOOL SetWindowPos(const CWnd* insertAfter, int x, int y, int cx, int cy, UINT flags);
+    BOOL GetWindowPlacement(WINDOWPLACEMENT* placement) const;
+    BOOL SetWindowPlacement(const WINDOWPLACEMENT* placement);
+    /// Centres over `other`, over the owner, or on the screen, keeping the window on the screen.
+    void CenterWindow(CWnd* other = nullptr);
+    void BringWindowToTop();
+    void ClientToScreen(POINT* point) const;
+    void ClientToScreen(RECT* rect) const;
+    void ScreenToClient(POINT* point) const;
+    void ScreenToClient(RECT* rect) const;
+    void MapWindowPoints(CWnd* to, POINT* points, UINT count) const;
+    void MapWindowPoints(CWnd* to, RECT* rect) const;
+    /// The window rectangle that gives the client rectangle `rect`, for this window's styles.
+    virtual void CalcWindowRect(RECT* rect, UINT adjustType = 0);
+    /// @}
+
+    /// Painting.
+    /// @{
+
+    /// Requests a repaint of the whole client area.
+    void Invalidate(BOOL erase = TRUE);
+    /// Requests a repaint of a rectangle of the client area; null for all of it.
+    void InvalidateRect(const RECT* rect, BOOL erase = TRUE);
+    /// Paints what has been requested, now.
+    void UpdateWindow();
+    BOOL RedrawWindow(const RECT* rect = nullptr, CRgn* region = nullptr,
+                      UINT flags = RDW_INVALIDATE | RDW_UPDATENOW | RDW_ERASE);
+    /// Suspends or resumes painting while contents change.
+    void SetRedraw(BOOL redraw = TRUE);
+    /// A context over the client area, to be given back with ReleaseDC. It draws at once, also outside WM_PAINT.
+    CDC* GetDC();
+    CDC* GetWindowDC();
+    int ReleaseDC(CDC* dc);
+    /// Moves the contents (and the children) by an offset and requests the uncovered strip.
+    void ScrollWindow(int dx, int dy, const RECT* scroll = nullptr, const RECT* clip = nullptr);
+    /// @}
+
+    /// The tree of windows.
+    /// @{
+
+    CWnd* GetParent() const;
+    /// Makes the window a child of another and answers the previous parent.
+    CWnd* SetParent(CWnd* parent);
+    /// The window a dialog or popup stands over.
+    CWnd* GetOwner() const;
+    void SetOwner(CWnd* owner);
+    CWnd* GetTopLevelParent() const;
+    CFrameWnd* GetParentFrame() const;
+    CFrameWnd* GetTopLevelFrame() const;
+    CWnd* GetWindow(UINT relation) const;
+    CWnd* GetTopWindow() const;
+    CWnd* GetNextWindow(UINT relation = GW_HWNDNEXT) const {
+        return GetWindow(relation);
+    }
+    BOOL IsChild(const CWnd* other) const;
+    /// The child with an identifier; temporary when it has no object, null when there is none.
+    CWnd* GetDlgItem(int id) const;
+    void GetDlgItem(int id, HWND* handle) const;
+    /// The same among all descendants; with `onlyPerm` only windows with an object.
+    CWnd* GetDescendantWindow(int id, BOOL onlyPerm = FALSE) const;
+    static CWnd* GetDesktopWindow();
+    static CWnd* FindWindow(LPCSTR className, LPCSTR text);
+    static CWnd* WindowFromPoint(POINT point);
+    /// @}
+
+    /// Activation, focus, capture.
+    /// @{
+
+    CWnd* SetActiveWindow();
+    static CWnd* GetActiveWindow();
+    BOOL SetForegroundWindow();
+    static CWnd* GetForegroundWindow();
+    /// Gives the window the keyboard and answers the window that had it.
+    CWnd* SetFocus();
+    static CWnd* GetFocus();
+    /// Sends all mouse messages here until ReleaseCapture, wherever the pointer is.
+    CWnd* SetCapture();
+    static CWnd* GetCapture();
+    /// @}
+
+    /// Timers.
+    /// @{
+
+    /// Starts or restarts a timer that sends WM_TIMER (or calls `callback`) every `elapse` milliseconds.
+    UINT_PTR SetTimer(UINT_PTR id, UINT elapse, TIMERPROC callback = nullptr);
+    BOOL KillTimer(UINT_PTR id);
+    /// @}
+
+    /// Scroll bars of the window's frame.
+    /// @{
+
+    int SetScrollPos(int bar, int pos, BOOL redraw = TRUE);
+    int GetScrollPos(int bar) const;
+    void SetScrollRange(int bar, int min, int max, BOOL redraw = TRUE);
+    void GetScrollRange(int bar, int* min, int* max) const;
+    BOOL SetScrollInfo(int bar, SCROLLINFO* info, BOOL redraw = TRUE);
+    BOOL GetScrollInfo(int bar, SCROLLINFO* info, UINT mask = SIF_ALL);
+    void ShowScrollBar(UINT bar, BOOL show = TRUE);
+    void EnableScrollBarCtrl(int bar, BOOL enable = TRUE);
+    virtual CScrollBar* GetScrollBarCtrl(int bar) const;
+    /// @}
+
+    /// Menus.
+    /// @{
+
+    CMenu* GetMenu() const;
+    BOOL SetMenu(CMenu* menu);
+    void DrawMenuBar();
+    /// The window menu; with `revert` it gets its original items back.
+    CMenu* GetSystemMenu(BOOL revert) const;
+    /// @}
+
+    /// Dialog items.
+    /// @{
+
+    void SetDlgItemText(int id, LPCSTR text);
+    int GetDlgItemText(int id, LPSTR buffer, int size) const;
+    int GetDlgItemText(int id, CString& text) const;
+    void SetDlgItemInt(int id, UINT value, BOOL isSigned = TRUE);
+    /// The number in an item's text. `translated` tells whether the text was a number of 32 bits.
+    UINT GetDlgItemInt(int id, BOOL* translated = nullptr, BOOL isSigned = TRUE) const;
+    void CheckDlgButton(int id, UINT check);
+    void CheckRadioButton(int first, int last, int checked);
+    UINT IsDlgButtonChecked(int id) const;
+    int GetCheckedRadioButton(int first, int last) const;
+    LRESULT SendDlgItemMessage(int id, UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
+    /// The control that Tab (Shift+Tab with `previous`) reaches from `from`, the first one when `from` is null.
+    CWnd* GetNextDlgTabItem(CWnd* from, BOOL previous = FALSE) const;
+    /// The control of the same group that the arrow keys reach.
+    CWnd* GetNextDlgGroupItem(CWnd* from, BOOL previous = FALSE) const;
+    /// Moves data between the controls and the members, through DoDataExchange. FALSE when validation failed.
+    /// @param save TRUE from the controls into the members.
+    BOOL UpdateData(BOOL save = TRUE);
+    /// Updates the controls' states through their ON_UPDATE_COMMAND_UI handlers.
+    void UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler);
+    int MessageBox(LPCSTR text, LPCSTR caption = nullptr, UINT type = MB_OK);
+    /// Accepts files dropped from other programs (WM_DROPFILES).
+    void DragAcceptFiles(BOOL accept = TRUE);
+    /// Passes a help request on to the application.
+    virtual void WinHelpA(DWORD_PTR data, UINT command = HELP_CONTEXT);
+    virtual void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT);
+
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    /// Whether WindowProc's caller should treat the window as a frame.
+    virtual BOOL IsFrameWnd() const;
+    /// Ends a modal loop that runs on this window.
+    virtual void EndModalLoop(int result);
+
+    /// The state behind the handle; null when there is no window. For the layer itself.
+    tvx::afx::Window* GetState() const;
+    /// @}
+
+    /// Handlers of messages; the base versions do what happens by default.
+    /// @{
+
+    afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);
+    afx_msg void OnActivateApp(BOOL active, DWORD threadId);
+    afx_msg void OnCancelMode();
+    afx_msg void OnCaptureChanged(CWnd* other);
+    afx_msg void OnClose();
+    afx_msg void OnContextMenu(CWnd* window, CPoint point);
+    afx_msg int OnCreate(CREATESTRUCT* cs);
+    afx_msg HBRUSH OnCtlColor(CDC* dc, CWnd* control, UINT kind);
+    afx_msg void OnDestroy();
+    afx_msg void OnDrawItem(int id, DRAWITEMSTRUCT* item);
+    afx_msg void OnDropFiles(HANDLE drop);
+    afx_msg void OnEnable(BOOL enabled);
+    afx_msg void OnEndSession(BOOL ending);
+    afx_msg void OnEnterIdle(UINT reason, CWnd* who);
+    afx_msg BOOL OnEraseBkgnd(CDC* dc);
+    afx_msg UINT OnGetDlgCode();
+    afx_msg void OnGetMinMaxInfo(MINMAXINFO* info);
+    afx_msg BOOL OnHelpInfo(HELPINFO* info);
+    afx_msg void OnHScroll(UINT code, UINT position, CScrollBar* bar);
+    afx_msg void OnVScroll(UINT code, UINT position, CScrollBar* bar);
+    afx_msg void OnInitMenu(CMenu* menu);
+    afx_msg void OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu);
+    afx_msg void OnKeyDown(UINT key, UINT repeat, UINT flags);
+    afx_msg void OnKeyUp(UINT key, UINT repeat, UINT flags);
+    afx_msg void OnChar(UINT character, UINT repeat, UINT flags);
+    afx_msg void OnSysKeyDown(UINT key, UINT repeat, UINT flags);
+    afx_msg void OnSysKeyUp(UINT key, UINT repeat, UINT flags);
+    afx_msg void OnSysChar(UINT character, UINT repeat, UINT flags);
+    afx_msg void OnSysCommand(UINT command, LPARAM parameter);
+    afx_msg void OnKillFocus(CWnd* next);
+    afx_msg void OnSetFocus(CWnd* previous);
+    afx_msg void OnLButtonDown(UINT flags, CPoint point);
+    afx_msg void OnLButtonUp(UINT flags, CPoint point);
+    afx_msg void OnLButtonDblClk(UINT flags, CPoint point);
+    afx_msg void OnRButtonDown(UINT flags, CPoint point);
+    afx_msg void OnRButtonUp(UINT flags, CPoint point);
+    afx_msg void OnRButtonDblClk(UINT flags, CPoint point);
+    afx_msg void OnMButtonDown(UINT flags, CPoint point);
+    afx_msg void OnMButtonUp(UINT flags, CPoint point);
+    afx_msg void OnMouseMove(UINT flags, CPoint point);
+    afx_msg void OnMouseLeave();
+    afx_msg BOOL OnMouseWheel(UINT flags, short delta, CPoint point);
+    afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);
+    afx_msg void OnMDIActivate(BOOL activate, CWnd* activated, CWnd* deactivated);
+    afx_msg void OnMeasureItem(int id, MEASUREITEMSTRUCT* item);
+    afx_msg void OnMenuSelect(UINT item, UINT flags, HMENU menu);
+    afx_msg void OnMove(int x, int y);
+    afx_msg BOOL OnNcActivate(BOOL active);
+    afx_msg void OnNcDestroy();
+    afx_msg LRESULT OnNcHitTest(CPoint point);
+    afx_msg void OnNcLButtonDblClk(UINT hitTest, CPoint point);
+    afx_msg void OnNcLButtonDown(UINT hitTest, CPoint point);
+    afx_msg void OnNcLButtonUp(UINT hitTest, CPoint point);
+    afx_msg void OnNcMouseMove(UINT hitTest, CPoint point);
+    afx_msg void OnNcRButtonUp(UINT hitTest, CPoint point);
+    afx_msg void OnNcPaint();
+    afx_msg void OnPaint();
+    afx_msg BOOL OnQueryEndSession();
+    afx_msg BOOL OnSetCursor(CWnd* window, UINT hitTest, UINT message);
+    afx_msg void OnSettingChange(UINT flags, LPCSTR section);
+    afx_msg void OnShowWindow(BOOL shown, UINT status);
+    afx_msg void OnSize(UINT type, int cx, int cy);
+    afx_msg void OnSysColorChange();
+    afx_msg void OnTimer(UINT_PTR id);
+    /// @}
+protected:
+    friend class tvx::afx::Window;
+    /// Looks a message up in the map and calls its handler. FALSE when there is none.
+    virtual BOOL OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result);
+    /// A command from a menu, an accelerator or a control. FALSE when nobody handled it.
+    virtual BOOL OnCommand(WPARAM wParam, LPARAM lParam);
+    /// A WM_NOTIFY from a control. FALSE when nobody handled it.
+    virtual BOOL OnNotify(WPARAM wParam, LPARAM lParam, LRESULT* result);
+    /// Binds members to controls; see CDataExchange.
+    virtual void DoDataExchange(CDataExchange* dx);
+    /// Offers a control's message to the control's own object first.
+    static BOOL SendChildNotifyLastMsg(HWND child, UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result);
+    /// Runs a loop until EndModalLoop; answers its result, -1 when the application is quitting.
+    int RunModalLoop(DWORD flags = 0);
+
+    DECLARE_MESSAGE_MAP()
+
+private:
+    // Out of line, where the compiler cannot conclude that the object is not null.
+    static HWND HandleOf(const CWnd* window);
+    CWnd* m_pOwner = nullptr;
+    void* m_modalLoop = nullptr;
+    bool m_continueModal = false;
+};
+
+/// Registers (or finds) a window class with these properties and answers its name.
+/// @param cursor null for the arrow. @param background null for a window that paints all of itself.
+TVX_PLATFORM_API LPCSTR AfxRegisterWndClass(UINT classStyle, HCURSOR cursor = nullptr, HBRUSH background = nullptr,
+                                            HICON icon = nullptr);

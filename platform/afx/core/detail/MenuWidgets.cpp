@@ -1,0 +1,452 @@
+#include "platform/afx/core/detail/MenuWidgets.h"
+
+#include "platform/afx/core/Message.h"
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/OwnText.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/frames/detail/MdiWindow.h"
+#include "platform/afx/gdi/detail/ButtonImages.h"
+#include "platform/afx/toolkit/detail/Gui.h"
+#include "platform/win/FrameworkIds.h"
+
+#include <QActionGroup>
+#include <QApplication>
+#include <QKeyEvent>
+#include <QMainWindow>
+
+#include <unordered_map>
+
+namespace tvx::afx {
+
+namespace {
+
+void sendSelect(HWND owner, UINT item, UINT flags, HMENU menu) {
+    SendMessageA(owner, WM_MENUSELECT, MAKEWPARAM(static_cast<int>(item), static_cast<int>(flags)),
+                 reinterpret_cast<LPARAM>(menu));
+}
+
+void applyState(QAction& action, const MenuItem& item) {
+    action.setEnabled(item.isEnabled());
+    const bool checked = (item.flags & MF_CHECKED) != 0;
+    const HBITMAP picture = checked && item.checked ? item.checked : item.unchecked;
+    if (picture) {
+        action.setIcon(buttonIcon(picture));
+        action.setIconVisibleInMenu(true);
+    }
+    if (!checked) {
+        return; // an item that could be checked must not show an empty box
+    }
+    action.setCheckable(true);
+    action.setChecked(true);
+    if (item.mark == MenuItem::Mark::radio) {
+        auto* group = new QActionGroup(&action); // the style draws members of exclusive groups with a round mark
+        group->setExclusive(true);
+        group->addAction(&action);
+    }
+}
+
+/// The index in the menu's list that an action was made for.
+int indexOf(const QAction& action) {
+    return action.data().toInt();
+}
+
+} // namespace
+
+// --- popups ---
+
+PopupMenu::PopupMenu(HMENU menu, int index, const MenuHost& host, QWidget* parent)
+    : QMenu(parent), m_menu(menu), m_index(index), m_host(host) {
+    connect(this, &QMenu::aboutToShow, this, [this] { storing([this] { opened(); }); });
+    connect(this, &QMenu::aboutToHide, this, [this] { storing([this] { closed(); }); });
+    connect(this, &QMenu::hovered, this, [this](QAction* action) { storing([this, action] { hovered(action); }); });
+    fill();
+}
+
+void PopupMenu::opened() {
+    if (!m_prepared) {
+        prepare();
+    }
+}
+
+void PopupMenu::prepare() {
+    m_prepared = true;
+    armIdle();
+    if (m_host.systemMenu) {
+        updateSystemMenu(m_host.owner);
+    }
+    if (m_host.notifies) {
+        SendMessageA(m_host.owner, WM_INITMENUPOPUP, reinterpret_cast<WPARAM>(m_menu),
+                     MAKELPARAM(m_index, m_host.systemMenu ? TRUE : FALSE));
+    }
+    fill();
+}
+
+void PopupMenu::closed() {
+    m_prepared = false;
+    if (m_host.notifies) {
+        SendMessageA(m_host.owner, WM_UNINITMENUPOPUP, reinterpret_cast<WPARAM>(m_menu), 0);
+        if (!qobject_cast<QMenu*>(parentWidget())) {
+            sendSelect(m_host.owner, 0, 0xFFFF, nullptr);
+        }
+    }
+}
+
+void PopupMenu::fill() {
+    const auto children = findChildren<PopupMenu*>(QString(), Qt::FindDirectChildrenOnly);
+    clear();
+    for (PopupMenu* child : children) {
+        child->deleteLater();
+    }
+    const Menu* menu = menuFrom(m_menu);
+    if (!menu) {
+        return;
+    }
+    for (std::size_t i = 0; i < menu->items.size(); ++i) {
+        addItem(menu->items[i], static_cast<int>(i));
+    }
+}
+
+void PopupMenu::addItem(const MenuItem& item, int index) {
+    if (item.isSeparator()) {
+        addSeparator();
+        return;
+    }
+    QAction* action = nullptr;
+    if (item.popup) {
+        action = addMenu(new PopupMenu(item.popup, index, m_host, this));
+        action->setText(QString::fromStdString(item.text));
+    } else {
+        action = addAction(QString::fromStdString(item.text));
+        connect(action, &QAction::triggered, this, [this, action] { storing([this, action] { chosen(action); }); });
+    }
+    action->setMenuRole(QAction::NoRole);
+    action->setData(index);
+    applyState(*action, item);
+    if (item.isDefault) {
+        setDefaultAction(action);
+    }
+}
+
+void PopupMenu::hovered(QAction* action) {
+    const MenuPlace place = findItem(m_menu, static_cast<UINT>(indexOf(*action)), MF_BYPOSITION);
+    if (!place || !m_host.notifies || action->isSeparator()) {
+        return;
+    }
+    const MenuItem& item = place.item();
+    const UINT system = m_host.systemMenu ? MF_SYSMENU : 0U;
+    if (item.popup) {
+        sendSelect(m_host.owner, static_cast<UINT>(indexOf(*action)), MF_POPUP | MF_HILITE | system, m_menu);
+    } else {
+        sendSelect(m_host.owner, item.id, (item.flags & 0xFFU) | MF_HILITE | system, m_menu);
+    }
+}
+
+void PopupMenu::chosen(QAction* action) {
+    if (const MenuPlace place = findItem(m_menu, static_cast<UINT>(indexOf(*action)), MF_BYPOSITION)) {
+        m_host.choose(place.item().id);
+    }
+}
+
+// --- bars ---
+
+FrameMenuBar::FrameMenuBar(HWND owner, QWidget* parent) : QMenuBar(parent) {
+    setNativeMenuBar(false);
+    m_host.owner = owner;
+    m_host.choose = [owner](UINT id) { postMenuCommand(owner, id, false); };
+}
+
+void FrameMenuBar::setMenu(HMENU menu) {
+    m_menu = menu;
+    rebuild();
+}
+
+void FrameMenuBar::menuChanged(HMENU menu) {
+    if (menu == m_menu) {
+        rebuild();
+    }
+}
+
+void FrameMenuBar::rebuild() {
+    const auto popups = findChildren<PopupMenu*>(QString(), Qt::FindDirectChildrenOnly);
+    clear();
+    for (PopupMenu* popup : popups) {
+        popup->deleteLater();
+    }
+    const Menu* menu = menuFrom(m_menu);
+    if (!menu) {
+        return;
+    }
+    for (std::size_t i = 0; i < menu->items.size(); ++i) {
+        addEntry(menu->items[i], static_cast<int>(i));
+    }
+}
+
+void FrameMenuBar::addEntry(const MenuItem& item, int index) {
+    if (item.isSeparator()) {
+        return;
+    }
+    QAction* action = nullptr;
+    if (item.popup) {
+        auto* popup = new PopupMenu(item.popup, index, m_host, this);
+        connect(popup, &QMenu::aboutToShow, popup, [this] {
+            storing([this] { SendMessageA(m_host.owner, WM_INITMENU, reinterpret_cast<WPARAM>(m_menu), 0); });
+        });
+        action = addMenu(popup);
+        action->setText(QString::fromStdString(item.text));
+    } else {
+        action = addAction(QString::fromStdString(item.text));
+        const UINT id = item.id;
+        connect(action, &QAction::triggered, this, [this, id] { m_host.choose(id); });
+    }
+    action->setData(index);
+    action->setEnabled(item.isEnabled());
+}
+
+bool FrameMenuBar::openByKey(char32_t key) {
+    if (!isVisible()) {
+        return false;
+    }
+    if (key == 0) {
+        // The toolkit gives the bar the keyboard when it sees Alt go down and up; both are taken from it by the
+        // translation into messages.
+        QKeyEvent down(QEvent::ShortcutOverride, Qt::Key_Alt, Qt::NoModifier); // as it is before the key counts
+        QKeyEvent up(QEvent::KeyRelease, Qt::Key_Alt, Qt::NoModifier);
+        guarded([&] {
+            eventFilter(this, &down);
+            eventFilter(this, &up);
+        });
+        return true;
+    }
+    const Menu* menu = menuFrom(m_menu);
+    const auto entries = actions();
+    for (QAction* entry : entries) {
+        const auto index = static_cast<std::size_t>(indexOf(*entry));
+        if (!menu || index >= menu->items.size() || accessKey(menu->items[index].text) != key || !entry->isEnabled()) {
+            continue;
+        }
+        if (!entry->menu()) {
+            m_host.choose(menu->items[index].id);
+            return true;
+        }
+        guarded([&] {
+            setActiveAction(entry);
+            // Opened by a key, a menu shows its first item as chosen.
+            QKeyEvent first(QEvent::KeyPress, Qt::Key_Down, Qt::NoModifier);
+            if (entry->menu()->isVisible() && !entry->menu()->activeAction()) {
+                QCoreApplication::sendEvent(entry->menu(), &first);
+            }
+        });
+        return true;
+    }
+    return false;
+}
+
+bool menuHasKeyboard() {
+    return QApplication::activePopupWidget() || qobject_cast<QMenuBar*>(QApplication::focusWidget());
+}
+
+void postMenuCommand(HWND owner, UINT id, bool systemMenu) {
+    // Posted, so that the menu is gone and the keyboard back where it was when the command begins.
+    armIdle();
+    PostMessageA(owner, systemMenu ? WM_SYSCOMMAND : WM_COMMAND, MAKEWPARAM(static_cast<int>(id), 0), 0);
+}
+
+// --- popups that are waited for ---
+
+namespace {
+
+struct Tracking {
+    MenuHost host;
+    UINT chosen = 0;
+};
+
+QPoint placeOf(const QMenu& popup, UINT flags, QPoint at) {
+    const QSize size = popup.sizeHint();
+    if ((flags & TPM_CENTERALIGN) != 0) {
+        at.rx() -= size.width() / 2;
+    } else if ((flags & TPM_RIGHTALIGN) != 0) {
+        at.rx() -= size.width();
+    }
+    if ((flags & TPM_VCENTERALIGN) != 0) {
+        at.ry() -= size.height() / 2;
+    } else if ((flags & TPM_BOTTOMALIGN) != 0) {
+        at.ry() -= size.height();
+    }
+    return at;
+}
+
+/// Shows a popup until it closes and answers the chosen command, 0 for none.
+UINT track(HMENU menu, UINT flags, QPoint at, Tracking& tracking) {
+    Window* window = Window::from(tracking.host.owner);
+    tracking.host.choose = [&tracking](UINT id) { tracking.chosen = id; };
+    QPointer<PopupMenu> popup = new PopupMenu(menu, 0, tracking.host, window ? window->topLevel()->widget() : nullptr);
+    struct Closer {
+        QPointer<PopupMenu>& popup;
+        ~Closer() {
+            if (popup) {
+                popup->disconnect();
+                popup->close();
+                popup->deleteLater();
+            }
+        }
+    } closer{popup};
+    ModalLoop loop;
+    QObject::connect(popup, &QMenu::aboutToHide, popup, [&loop] { loop.end(0); });
+    guarded([&] {
+        storing([&] { popup->prepare(); });
+        if (popup && !popup->actions().isEmpty()) {
+            popup->popup(placeOf(*popup, flags, at));
+        }
+    });
+    if (popup && popup->isVisible()) {
+        loop.run();
+    }
+    return tracking.chosen;
+}
+
+std::unordered_map<std::uintptr_t, HMENU>& systemMenus() {
+    static auto* menus = new std::unordered_map<std::uintptr_t, HMENU>;
+    return *menus;
+}
+
+HMENU makeSystemMenu(const Window& window) {
+    const HMENU menu = CreatePopupMenu();
+    const auto state = [&window](DWORD bit) { return (window.style() & bit) != 0 ? MF_ENABLED : MF_GRAYED; };
+    const auto append = [menu](UINT flags, UINT command, UINT text) {
+        AppendMenuA(menu, MF_STRING | flags, command, fromQt(ownText(text)).c_str());
+    };
+    append(0, SC_RESTORE, TVX_IDS_SYS_RESTORE);
+    append(0, SC_MOVE, TVX_IDS_SYS_MOVE);
+    append(state(WS_THICKFRAME), SC_SIZE, TVX_IDS_SYS_SIZE);
+    append(state(WS_MINIMIZEBOX), SC_MINIMIZE, TVX_IDS_SYS_MINIMIZE);
+    append(state(WS_MAXIMIZEBOX), SC_MAXIMIZE, TVX_IDS_SYS_MAXIMIZE);
+    AppendMenuA(menu, MF_SEPARATOR, 0, nullptr);
+    append(0, SC_CLOSE, window.isChild() ? TVX_IDS_SYS_CLOSE_CHILD : TVX_IDS_SYS_CLOSE);
+    SetMenuDefaultItem(menu, SC_CLOSE, 0);
+    return menu;
+}
+
+/// Menus of windows that have ended go with the next one that is asked for.
+void forgetEnded() {
+    std::erase_if(systemMenus(), [](const auto& entry) {
+        const bool ended = Window::from(reinterpret_cast<HWND>(entry.first)) == nullptr;
+        if (ended) {
+            DestroyMenu(entry.second);
+        }
+        return ended;
+    });
+}
+
+} // namespace
+
+void updateSystemMenu(HWND handle) {
+    const HMENU menu = GetSystemMenu(handle, FALSE);
+    const Window* window = Window::from(handle);
+    if (!window) {
+        return;
+    }
+    const bool zoomed = IsZoomed(handle) != FALSE;
+    const bool iconic = IsIconic(handle) != FALSE;
+    const auto enable = [menu](UINT id, bool on) { EnableMenuItem(menu, id, on ? MF_ENABLED : MF_GRAYED); };
+    enable(SC_RESTORE, zoomed || iconic);
+    // Child frames are moved and sized with the mouse only.
+    enable(SC_MOVE, !zoomed && !window->isChild());
+    enable(SC_SIZE, !zoomed && !window->isChild() && (window->style() & WS_THICKFRAME) != 0);
+    enable(SC_MAXIMIZE, !zoomed && (window->style() & WS_MAXIMIZEBOX) != 0);
+    enable(SC_MINIMIZE, !iconic && (window->style() & WS_MINIMIZEBOX) != 0);
+}
+
+void showSystemMenu(Window& window, POINT at) {
+    const HWND owner = window.handle();
+    Tracking tracking;
+    tracking.host.owner = owner;
+    tracking.host.systemMenu = true;
+    if (const UINT id = track(GetSystemMenu(owner, FALSE), TPM_LEFTALIGN, toQt(at), tracking)) {
+        postMenuCommand(owner, id, true);
+    }
+}
+
+void openMenuByKey(Window& window, char32_t key) {
+    if (key == U' ') {
+        const QPoint corner = window.clientToScreen(QPoint(0, 0));
+        showSystemMenu(window, fromQt(corner));
+        return;
+    }
+    if (key == U'-') {
+        if (Window* child = activeMdiChild(window)) {
+            showSystemMenu(*child, fromQt(child->clientToScreen(QPoint(0, 0))));
+            return;
+        }
+    }
+    auto* frame = qobject_cast<QMainWindow*>(window.widget());
+    auto* bar = frame ? dynamic_cast<FrameMenuBar*>(frame->menuWidget()) : nullptr;
+    if (bar) {
+        bar->openByKey(key < 0x80 ? static_cast<char32_t>(QChar::toLower(static_cast<char16_t>(key)))
+                                  : QChar::toLower(key));
+    }
+}
+
+} // namespace tvx::afx
+
+using namespace tvx::afx;
+
+BOOL TrackPopupMenu(HMENU menu, UINT flags, int x, int y, int, HWND owner, const RECT*) {
+    if (!menuFrom(menu) || !ensureGui()) {
+        return FALSE;
+    }
+    Tracking tracking;
+    tracking.host.owner = owner;
+    tracking.host.notifies = (flags & TPM_NONOTIFY) == 0 && owner;
+    if (tracking.host.notifies) {
+        SendMessageA(owner, WM_INITMENU, reinterpret_cast<WPARAM>(menu), 0);
+    }
+    const UINT id = track(menu, flags, QPoint(x, y), tracking);
+    if ((flags & TPM_RETURNCMD) != 0) {
+        return static_cast<BOOL>(id);
+    }
+    if (id != 0) {
+        postMenuCommand(owner, id, false);
+    }
+    return TRUE;
+}
+
+HMENU GetMenu(HWND handle) {
+    const Window* window = Window::from(handle);
+    return window ? window->menu() : nullptr;
+}
+
+BOOL SetMenu(HWND handle, HMENU menu) {
+    Window* window = Window::from(handle);
+    if (!window || window->isChild() || (menu && !menuFrom(menu))) {
+        return FALSE;
+    }
+    window->setMenu(menu);
+    return TRUE;
+}
+
+BOOL DrawMenuBar(HWND handle) {
+    return Window::from(handle) ? TRUE : FALSE;
+}
+
+HMENU GetSystemMenu(HWND handle, BOOL revert) {
+    const Window* window = Window::from(handle);
+    if (!window) {
+        return nullptr;
+    }
+    forgetEnded();
+    const auto key = reinterpret_cast<std::uintptr_t>(handle);
+    if (revert) {
+        if (const auto found = systemMenus().find(key); found != systemMenus().end()) {
+            DestroyMenu(found->second);
+            systemMenus().erase(found);
+        }
+        return nullptr;
+    }
+    HMENU& menu = systemMenus()[key];
+    if (!menuFrom(menu)) {
+        menu = makeSystemMenu(*window);
+    }
+    return menu;
+}

@@ -1,0 +1,400 @@
+#include "platform/afx/core/detail/PlainWindow.h"
+
+#include "platform/win/FrameworkIds.h"
+
+#include "platform/afx/controls/detail/ScrollBarWindow.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/MenuWidgets.h"
+#include "platform/afx/frames/detail/MdiWindow.h"
+#include "platform/afx/gdi/Dc.h"
+#include "platform/afx/gdi/detail/GdiObjects.h"
+
+#include <QAbstractScrollArea>
+#include <QKeyEvent>
+#include <QMainWindow>
+#include <QMenuBar>
+#include <QScrollBar>
+#include <QWheelEvent>
+
+namespace tvx::afx {
+
+namespace {
+
+/// Everything the toolkit would do by itself in a scroll area is the window's business here.
+class Area : public QAbstractScrollArea {
+public:
+    explicit Area(QWidget* parent) : QAbstractScrollArea(parent) {
+        setFocusPolicy(Qt::NoFocus);
+        setAttribute(Qt::WA_InputMethodEnabled);
+        setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+        setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+        // The window paints each pixel that it asks to be repainted; the toolkit must not paint before it.
+        viewport()->setAutoFillBackground(false);
+        viewport()->setAttribute(Qt::WA_OpaquePaintEvent);
+        viewport()->setAttribute(Qt::WA_NoSystemBackground);
+        viewport()->setMouseTracking(true);
+    }
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        event->ignore();
+    }
+    void wheelEvent(QWheelEvent* event) override {
+        event->ignore();
+    }
+    void scrollContentsBy(int, int) override {}
+};
+
+} // namespace
+
+std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs) {
+    if ((static_cast<DWORD>(cs.style) & WS_CHILD) != 0) {
+        const bool childFrame = (cs.dwExStyle & WS_EX_MDICHILD) != 0;
+        return childFrame ? makeMdiChild(cs) : std::make_unique<PlainWindow>(cs);
+    }
+    return std::make_unique<TopLevelWindow>(cs);
+}
+
+bool eraseBackground(Window& window, HDC dc) {
+    if (!window.classBrush) {
+        return false;
+    }
+    const QRect area = window.clientRect();
+    const RECT rect{0, 0, area.width(), area.height()};
+    FillRect(dc, &rect, window.classBrush);
+    return true;
+}
+
+// --- children ---
+
+QWidget* PlainWindow::makeWidget(QWidget* parent) {
+    m_area = new Area(parent);
+    applyStyle();
+    connectBar(SB_HORZ);
+    connectBar(SB_VERT);
+    return m_area;
+}
+
+QWidget* PlainWindow::clientWidget() const {
+    return widget() ? m_area->viewport() : nullptr;
+}
+
+void PlainWindow::applyStyle() {
+    if ((exStyle() & WS_EX_CLIENTEDGE) != 0) {
+        m_area->setFrameStyle(QFrame::StyledPanel | QFrame::Sunken);
+    } else if ((style() & WS_BORDER) != 0) {
+        m_area->setFrameStyle(QFrame::Box | QFrame::Plain);
+    } else {
+        m_area->setFrameStyle(QFrame::NoFrame);
+    }
+    const auto policy = [this](DWORD bit) {
+        return (style() & bit) != 0 ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
+    };
+    m_area->setHorizontalScrollBarPolicy(policy(WS_HSCROLL));
+    m_area->setVerticalScrollBarPolicy(policy(WS_VSCROLL));
+    m_area->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
+}
+
+void PlainWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
+    guarded([this] { applyStyle(); });
+    tellGeometry();
+}
+
+QScrollBar* PlainWindow::scrollBar(int bar) const {
+    return bar == SB_HORZ ? m_area->horizontalScrollBar() : m_area->verticalScrollBar();
+}
+
+void PlainWindow::showScrollBar(int bar, bool show) {
+    const DWORD bit = bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL;
+    setStyle(show ? (style() | bit) : (style() & ~bit), exStyle());
+}
+
+void PlainWindow::connectBar(int bar) {
+    QScrollBar* slider = scrollBar(bar);
+    const UINT message = bar == SB_HORZ ? WM_HSCROLL : WM_VSCROLL;
+    // The toolkit would move the slider by itself; here the window decides, by SetScrollPos. Its own idea is put back
+    // before it acts on it.
+    QObject::connect(slider, &QScrollBar::actionTriggered, slider, [this, slider, message](int action) {
+        const int code = scrollCodeOf(action);
+        const int position = slider->sliderPosition();
+        if (code != SB_THUMBTRACK) {
+            slider->setSliderPosition(slider->value());
+        }
+        armIdle();
+        call(message, MAKEWPARAM(code, position));
+    });
+    QObject::connect(slider, &QScrollBar::sliderReleased, slider, [this, slider, message] {
+        call(message, MAKEWPARAM(SB_THUMBPOSITION, slider->sliderPosition()));
+        call(message, MAKEWPARAM(SB_ENDSCROLL, 0));
+    });
+}
+
+LRESULT PlainWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_ERASEBKGND:
+        return eraseBackground(*this, reinterpret_cast<HDC>(wParam)) ? TRUE : FALSE;
+    case WM_PAINT: {
+        PAINTSTRUCT paint;
+        BeginPaint(handle(), &paint);
+        EndPaint(handle(), &paint);
+        return 0;
+    }
+    default:
+        return Window::defaultProc(message, wParam, lParam);
+    }
+}
+
+// --- top-level windows ---
+
+Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle) {
+    Qt::WindowFlags flags = (exStyle & WS_EX_TOOLWINDOW) != 0 ? Qt::Tool : Qt::Window;
+    if ((exStyle & WS_EX_TOPMOST) != 0) {
+        flags |= Qt::WindowStaysOnTopHint;
+    }
+    if ((style & WS_CAPTION) != WS_CAPTION) {
+        return flags | Qt::FramelessWindowHint;
+    }
+    flags |= Qt::CustomizeWindowHint | Qt::WindowTitleHint;
+    if ((style & WS_SYSMENU) != 0) {
+        flags |= Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
+    }
+    if ((style & WS_MINIMIZEBOX) != 0) {
+        flags |= Qt::WindowMinimizeButtonHint;
+    }
+    if ((style & WS_MAXIMIZEBOX) != 0) {
+        flags |= Qt::WindowMaximizeButtonHint;
+    }
+    return flags;
+}
+
+namespace {
+
+class MainWidget : public QMainWindow {
+public:
+    using QMainWindow::QMainWindow;
+
+protected:
+    bool event(QEvent* event) override {
+        if (event->type() == QEvent::StatusTip) {
+            showTip(static_cast<QStatusTipEvent*>(event)->tip());
+            return true;
+        }
+        return QMainWindow::event(event);
+    }
+
+private:
+    /// Menus tell of their items by WM_MENUSELECT.
+    void showTip(const QString& tip) {
+        const Window* window = Window::of(this);
+        if (!window || menuHasKeyboard()) {
+            return;
+        }
+        const std::string text = fromQt(tip);
+        SendMessageA(window->handle(), WM_SETMESSAGESTRING, text.empty() ? AFX_IDS_IDLEMESSAGE : 0,
+                     reinterpret_cast<LPARAM>(text.empty() ? nullptr : text.c_str()));
+    }
+};
+
+} // namespace
+
+QMainWindow* makeMainWidget(QWidget* parent, Qt::WindowFlags flags) {
+    auto* frame = new MainWidget(parent, flags);
+    frame->setContextMenuPolicy(Qt::PreventContextMenu); // the toolkit's list of tool bars
+    frame->setMouseTracking(true);
+    frame->setAnimated(false);
+    return frame;
+}
+
+QMainWindow* mainWindowOf(const Window& window) {
+    return qobject_cast<QMainWindow*>(window.clientWidget());
+}
+
+TopLevelWindow::TopLevelWindow(const CREATESTRUCT& cs) : Window(cs), m_menu(cs.hMenu) {}
+
+TopLevelWindow::~TopLevelWindow() {
+    DestroyMenu(m_menu);
+}
+
+QWidget* TopLevelWindow::makeWidget(QWidget*) {
+    QWidget* over = owner() ? owner()->widget() : nullptr;
+    QMainWindow* frame = makeMainWidget(over, windowFlags(style(), exStyle()));
+    frame->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
+    if ((style() & WS_OVERLAPPEDWINDOW) == WS_OVERLAPPEDWINDOW) {
+        frame->resize(frame->screen()->availableSize() * 3 / 4);
+    }
+    return frame;
+}
+
+void TopLevelWindow::widgetMade() {
+    widget()->setWindowTitle(Window::text());
+    iconChanged();
+    if (m_menu) {
+        setMenu(m_menu);
+    }
+}
+
+QString TopLevelWindow::text() const {
+    return widget() ? widget()->windowTitle() : Window::text();
+}
+
+void TopLevelWindow::iconChanged() {
+    const QImage image = iconImage(bigIcon ? bigIcon : smallIcon);
+    if (!image.isNull()) {
+        widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
+    }
+}
+
+void TopLevelWindow::setMenu(HMENU menu) {
+    m_menu = menu;
+    auto* bar = dynamic_cast<FrameMenuBar*>(mainWindow()->menuWidget());
+    guarded([&] {
+        if (!bar && menu) {
+            bar = new FrameMenuBar(handle(), mainWindow());
+            mainWindow()->setMenuBar(bar);
+        }
+        if (bar) {
+            bar->setMenu(menu);
+            bar->setVisible(menu != nullptr);
+        }
+    });
+    tellGeometry();
+}
+
+QMainWindow* TopLevelWindow::mainWindow() const {
+    return static_cast<QMainWindow*>(widget());
+}
+
+QRect frameClientRect(const QMainWindow& main) {
+    QRect area = main.contentsRect();
+    const QWidget* bar = main.menuWidget();
+    if (bar && !bar->isHidden()) {
+        const int height = bar->hasHeightForWidth() ? bar->heightForWidth(area.width()) : bar->sizeHint().height();
+        area.setTop(area.top() + height);
+    }
+    return area;
+}
+
+void TopLevelWindow::setWindowRect(const QRect& rect) {
+    if (placement()) {
+        placement()->moveFrame(rect, Measured::Frame);
+    } else {
+        Window::setWindowRect(rect);
+    }
+}
+
+QRect TopLevelWindow::clientRect() const {
+    return widget() ? frameClientRect(*mainWindow()) : QRect();
+}
+
+void TopLevelWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
+    const Qt::WindowFlags flags = windowFlags(style(), exStyle());
+    widget()->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
+    if (flags != windowFlags(oldStyle, oldExStyle)) {
+        const bool shown = !widget()->isHidden();
+        guarded([&] {
+            widget()->setWindowFlags(flags);
+            widget()->setVisible(shown);
+        });
+    }
+}
+
+void TopLevelWindow::applySizeLimits() {
+    constexpr int unlimited = 32767;
+    MINMAXINFO limits{};
+    limits.ptMaxTrackSize = {unlimited, unlimited};
+    call(WM_GETMINMAXINFO, 0, reinterpret_cast<LPARAM>(&limits));
+    const QSize frame = widget()->frameGeometry().size() - widget()->geometry().size();
+    widget()->setMinimumSize((toQt(limits.ptMinTrackSize).isNull()
+                                  ? QSize(0, 0)
+                                  : QSize(limits.ptMinTrackSize.x, limits.ptMinTrackSize.y) - frame)
+                                 .expandedTo(QSize(0, 0)));
+    if (limits.ptMaxTrackSize.x < unlimited || limits.ptMaxTrackSize.y < unlimited) {
+        widget()->setMaximumSize(QSize(limits.ptMaxTrackSize.x, limits.ptMaxTrackSize.y) - frame);
+    }
+}
+
+void showTopLevel(Window& window, int command) {
+    QWidget& widget = *window.widget();
+    if (command != SW_HIDE && window.placement()) {
+        window.placement()->aboutToShow();
+    }
+    const bool activate = command != SW_SHOWNOACTIVATE && command != SW_SHOWNA && command != SW_SHOWMINNOACTIVE;
+    widget.setAttribute(Qt::WA_ShowWithoutActivating, !activate);
+    switch (command) {
+    case SW_HIDE:
+        widget.hide();
+        return;
+    case SW_SHOWMINIMIZED:
+    case SW_MINIMIZE:
+    case SW_SHOWMINNOACTIVE:
+        widget.showMinimized();
+        return;
+    case SW_SHOWMAXIMIZED:
+        widget.showMaximized();
+        break;
+    case SW_SHOWNORMAL:
+    case SW_RESTORE:
+    case SW_SHOWNOACTIVATE:
+        if (widget.isMinimized() && widget.isMaximized()) {
+            widget.setWindowState(widget.windowState() & ~Qt::WindowMinimized);
+            widget.show();
+        } else {
+            widget.showNormal();
+        }
+        break;
+    default:
+        widget.show();
+        break;
+    }
+    if (activate) {
+        widget.raise();
+        widget.activateWindow();
+    }
+}
+
+void TopLevelWindow::show(int command) {
+    const bool visible = command != SW_HIDE;
+    const bool before = !widget()->isHidden();
+    const HWND self = handle();
+    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
+    if (visible != before) {
+        if (visible) {
+            applySizeLimits();
+            forgetToldSize();
+        }
+        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
+    }
+    if (from(self)) {
+        guarded([&] { showTopLevel(*this, command); });
+    }
+    if (from(self)) {
+        tellGeometry();
+    }
+}
+
+LRESULT TopLevelWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_SYSCOMMAND:
+        if ((wParam & 0xFFF0U) == SC_KEYMENU) {
+            openMenuByKey(*this, static_cast<char32_t>(lParam));
+            return 0;
+        }
+        return Window::defaultProc(message, wParam, lParam);
+    case WM_ERASEBKGND:
+        return eraseBackground(*this, reinterpret_cast<HDC>(wParam)) ? TRUE : FALSE;
+    case WM_PAINT:
+        if (!classBrush) {
+            passEvent(*this, message);
+        } else {
+            PAINTSTRUCT paint;
+            BeginPaint(handle(), &paint);
+            EndPaint(handle(), &paint);
+        }
+        return 0;
+    default:
+        return Window::defaultProc(message, wParam, lParam);
+    }
+}
+
+} // namespace tvx::afx

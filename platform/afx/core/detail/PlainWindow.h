@@ -1,0 +1,83 @@
+#pragma once
+
+/// @file
+/// Windows without behaviour of their own: views, panes, frames. What they show and do is their CWnd's affair.
+
+#include "platform/afx/core/detail/Window.h"
+
+class QAbstractScrollArea;
+class QMainWindow;
+class QScrollBar;
+
+namespace tvx::afx {
+
+/// A child window: an area to draw on, with a border and scroll bars where its style asks for them.
+class TVX_PLATFORM_API PlainWindow : public Window {
+public:
+    using Window::Window;
+    QWidget* clientWidget() const override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    /// The scroll bar of the window's frame, SB_HORZ or SB_VERT.
+    QScrollBar* scrollBar(int bar) const;
+    void showScrollBar(int bar, bool show);
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
+
+private:
+    void applyStyle();
+    void connectBar(int bar);
+    QAbstractScrollArea* m_area = nullptr;
+};
+
+/// A top-level window: a frame with caption, menu bar, tool bars and a central pane, or a bare popup.
+class TVX_PLATFORM_API TopLevelWindow : public Window {
+public:
+    explicit TopLevelWindow(const CREATESTRUCT& cs);
+    /// Destroys the menu it has at the end.
+    ~TopLevelWindow() override;
+    /// The area below the menu bar.
+    QRect clientRect() const override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    void show(int command) override;
+    void setWindowRect(const QRect& rect) override;
+    /// What the caption shows; a maximised child frame adds its name to it.
+    QString text() const override;
+    HMENU menu() const override {
+        return m_menu;
+    }
+    void setMenu(HMENU menu) override;
+    QMainWindow* mainWindow() const;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void widgetMade() override;
+    void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
+    void iconChanged() override;
+
+private:
+    void applySizeLimits();
+    HMENU m_menu = nullptr;
+};
+
+/// The toolkit's main window around the client area of a frame of any kind; null for windows that are no frames.
+TVX_PLATFORM_API QMainWindow* mainWindowOf(const Window& window);
+/// A main window as frames have it: the prompts of bars under the pointer go to the frame's status line.
+QMainWindow* makeMainWidget(QWidget* parent, Qt::WindowFlags flags);
+/// The client area of a frame: what the menu bar leaves of its main window.
+QRect frameClientRect(const QMainWindow& main);
+
+/// A PlainWindow for a child, a TopLevelWindow otherwise.
+TVX_PLATFORM_API std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs);
+
+/// The toolkit's window flags for a framework window's styles.
+TVX_PLATFORM_API Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle);
+
+/// Does what a show command (SW_...) says with a top-level window's widget.
+TVX_PLATFORM_API void showTopLevel(Window& window, int command);
+
+/// Paints a window's background with its class brush. False when the class has none.
+bool eraseBackground(Window& window, HDC dc);
+
+} // namespace tvx::afx

@@ -1,0 +1,173 @@
+#include "platform/afx/core/detail/Capture.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Window.h"
+
+#include "platform/afx/core/Wnd.h"
+#include "platform/base/Text.h"
+
+#include <cstring>
+
+namespace tvx::afx {
+
+LRESULT Window::call(UINT message, WPARAM wParam, LPARAM lParam) {
+    Dispatch current;
+    current.msg = makeMessage(m_handle, message, wParam, lParam);
+    current.window = this;
+    const DispatchScope scope(current);
+    return deliver(message, wParam, lParam);
+}
+
+LRESULT Window::deliver(UINT message, WPARAM wParam, LPARAM lParam) {
+    return m_object ? m_object->WindowProc(message, wParam, lParam) : defaultProc(message, wParam, lParam);
+}
+
+LRESULT Window::textProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_SETTEXT) {
+        setText(toQt(reinterpret_cast<const char*>(lParam)));
+        return TRUE;
+    }
+    const std::string content = fromQt(text());
+    if (message == WM_GETTEXTLENGTH) {
+        return static_cast<LRESULT>(content.size());
+    }
+    auto* buffer = reinterpret_cast<char*>(lParam);
+    if (!buffer || wParam == 0) {
+        return 0;
+    }
+    const std::size_t length = text::characterStart(content, std::min<std::size_t>(wParam - 1, content.size()));
+    std::memcpy(buffer, content.data(), length);
+    buffer[length] = '\0';
+    return static_cast<LRESULT>(length);
+}
+
+/// What happens with mouse messages that nobody took: the widget gets the event, and what it does not know goes on.
+LRESULT Window::mouseProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    passEvent(*this, message);
+    if (message == WM_RBUTTONUP && !m_destroyed) {
+        const QPoint screen = clientToScreen(QPoint(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam)));
+        return call(WM_CONTEXTMENU, reinterpret_cast<WPARAM>(m_handle), MAKELPARAM(screen.x(), screen.y()));
+    }
+    return 0;
+}
+
+LRESULT Window::systemCommand(UINT command, LPARAM lParam) {
+    switch (command & 0xFFF0U) {
+    case SC_CLOSE:
+        return call(WM_CLOSE);
+    case SC_MINIMIZE:
+        show(SW_MINIMIZE);
+        return 0;
+    case SC_MAXIMIZE:
+        show(SW_SHOWMAXIMIZED);
+        return 0;
+    case SC_RESTORE:
+        show(SW_RESTORE);
+        return 0;
+    default:
+        return 0;
+    }
+}
+
+/// Questions of controls that their parent left unanswered go back to the control's own object.
+LRESULT Window::reflect(UINT message, WPARAM wParam, LPARAM lParam) {
+    Window* control = nullptr;
+    if (message == WM_DRAWITEM) {
+        control = from(reinterpret_cast<const DRAWITEMSTRUCT*>(lParam)->hwndItem);
+    } else if (message == WM_MEASUREITEM || message == WM_DELETEITEM) {
+        control = child(static_cast<int>(wParam));
+    } else {
+        control = from(reinterpret_cast<HWND>(lParam));
+    }
+    LRESULT result = 0;
+    if (control && control->m_object) {
+        control->m_object->OnChildNotify(message, wParam, lParam, &result);
+    }
+    return result;
+}
+
+LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_SETTEXT:
+    case WM_GETTEXT:
+    case WM_GETTEXTLENGTH:
+        return textProc(message, wParam, lParam);
+    case WM_SETFONT:
+        font = reinterpret_cast<HFONT>(wParam);
+        fontChanged();
+        return 0;
+    case WM_GETFONT:
+        return reinterpret_cast<LRESULT>(font);
+    case WM_SETICON: {
+        HICON& place = wParam == ICON_BIG ? bigIcon : smallIcon;
+        const HICON old = std::exchange(place, reinterpret_cast<HICON>(lParam));
+        iconChanged();
+        return reinterpret_cast<LRESULT>(old);
+    }
+    case WM_GETICON:
+        return reinterpret_cast<LRESULT>(wParam == ICON_BIG ? bigIcon : smallIcon);
+    case WM_CLOSE:
+        destroy();
+        return 0;
+    case WM_SYSCOMMAND:
+        return systemCommand(static_cast<UINT>(wParam), lParam);
+    case WM_QUERYENDSESSION:
+        return TRUE;
+    case WM_NCACTIVATE:
+        return TRUE;
+    case WM_SETCURSOR:
+        // The parent may choose for its children; the innermost class cursor is the last word.
+        if (m_parent && SendMessageA(m_parent->m_handle, message, wParam, lParam) != 0) {
+            return TRUE;
+        }
+        return showClassCursor(wParam) ? TRUE : FALSE;
+    case WM_MOUSEACTIVATE:
+        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : MA_ACTIVATE;
+    case WM_CONTEXTMENU:
+        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : 0;
+    case WM_MOUSEWHEEL:
+        if (!passEvent(*this, message) && m_parent) {
+            return SendMessageA(m_parent->m_handle, message, wParam, lParam);
+        }
+        return 0;
+    case WM_CTLCOLORMSGBOX:
+    case WM_CTLCOLOREDIT:
+    case WM_CTLCOLORLISTBOX:
+    case WM_CTLCOLORBTN:
+    case WM_CTLCOLORSCROLLBAR:
+    case WM_CTLCOLORSTATIC:
+    case WM_DRAWITEM:
+    case WM_MEASUREITEM:
+    case WM_DELETEITEM:
+        return reflect(message, wParam, lParam);
+    case WM_CANCELMODE:
+        cancelModes();
+        return 0;
+    case WM_SYSKEYUP:
+    case WM_SYSCHAR:
+    case WM_SYSKEYDOWN:
+        return systemKey(message, wParam, lParam);
+    default:
+        if (message >= WM_MOUSEFIRST && message <= WM_MOUSELAST) {
+            return mouseProc(message, wParam, lParam);
+        }
+        passEvent(*this, message);
+        return 0;
+    }
+}
+
+/// Keys with Alt that nobody took belong to the menu of the top-level window.
+LRESULT Window::systemKey(UINT message, WPARAM wParam, LPARAM lParam) {
+    const HWND top = topLevel()->m_handle;
+    const bool menuKey =
+        (message == WM_SYSKEYUP && wParam == VK_MENU) || (message == WM_SYSKEYDOWN && wParam == VK_F10);
+    if (menuKey) {
+        return SendMessageA(top, WM_SYSCOMMAND, SC_KEYMENU, 0);
+    }
+    if (message == WM_SYSCHAR) {
+        return SendMessageA(top, WM_SYSCOMMAND, SC_KEYMENU, static_cast<LPARAM>(wParam));
+    }
+    passEvent(*this, message);
+    return 0;
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,362 @@
+#include "platform/afx/dialogs/detail/DialogWindow.h"
+
+#include "platform/afx/controls/detail/ButtonWindow.h"
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/Wnd.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/PlainWindow.h"
+#include "platform/afx/gdi/Dc.h"
+#include "platform/afx/gdi/Gdi.h"
+#include "platform/afx/gdi/detail/DeviceContext.h"
+#include "platform/afx/toolkit/detail/Gui.h"
+#include "platform/base/Text.h"
+#include "platform/win/ExtensionModule.h"
+#include "platform/win/Resource.h"
+
+#include <QApplication>
+#include <QFontMetrics>
+#include <QScreen>
+#include <QWindow>
+
+#include <cstdio>
+
+namespace tvx::afx {
+
+namespace {
+
+std::unique_ptr<Window> makeDialog(const CREATESTRUCT& cs) {
+    return std::make_unique<DialogWindow>(cs);
+}
+
+const WindowClassEntry dialogEntry(dialogClass, &makeDialog);
+
+/// number * numerator / denominator, rounded half away from zero.
+int mulDiv(int number, int numerator, int denominator) {
+    const long long product = static_cast<long long>(number) * numerator;
+    const long long half = product < 0 ? -denominator / 2 : denominator / 2;
+    return static_cast<int>((product + half) / denominator);
+}
+
+/// Controls that show their edge sunken in dialogs, whatever the template says of it.
+bool hasClientEdge(const std::string& className) {
+    return text::equalNoCase(className, "Edit") || text::equalNoCase(className, "ListBox") ||
+           text::equalNoCase(className, "SysTreeView32") || text::equalNoCase(className, "SysListView32");
+}
+
+std::string captionOf(const ResourceName& name) {
+    const auto* number = std::get_if<WORD>(&name);
+    if (!number) {
+        return std::get<std::string>(name);
+    }
+    return *number != 0 ? "#" + std::to_string(*number) : std::string();
+}
+
+} // namespace
+
+QSize dialogBaseUnits(const QFont& font) {
+    static const QString letters = QStringLiteral("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz");
+    const QFontMetrics metrics(font);
+    return {(metrics.horizontalAdvance(letters) / 26 + 1) / 2, metrics.height()};
+}
+
+DialogWindow::~DialogWindow() {
+    DeleteObject(reinterpret_cast<HGDIOBJ>(m_ownFont));
+}
+
+// --- the window ---
+
+QWidget* DialogWindow::makeWidget(QWidget* parent) {
+    if (isChild()) {
+        return new QWidget(parent);
+    }
+    QWidget* over = owner() ? owner()->widget() : nullptr;
+    // The dialog flag lets the window manager keep it over its owner, without entries of its own in task lists.
+    return new QWidget(over, windowFlags(style(), exStyle()) | Qt::Dialog);
+}
+
+void DialogWindow::widgetMade() {
+    if (!isChild()) {
+        widget()->setWindowTitle(text());
+        fixSize();
+    }
+    widget()->setMouseTracking(true);
+}
+
+void DialogWindow::styleChanged(DWORD oldStyle, DWORD) {
+    if (!isChild() && ((oldStyle ^ style()) & WS_THICKFRAME) != 0) {
+        fixSize();
+    }
+}
+
+/// A dialog without a sizing border has the size it was given.
+void DialogWindow::fixSize() {
+    const bool sizable = (style() & WS_THICKFRAME) != 0;
+    widget()->setMinimumSize(sizable ? QSize(0, 0) : widget()->size());
+    widget()->setMaximumSize(sizable ? QSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX) : widget()->size());
+}
+
+void DialogWindow::setWindowRect(const QRect& rect) {
+    if (isChild() || !widget()) {
+        Window::setWindowRect(rect);
+        return;
+    }
+    widget()->setMinimumSize(0, 0);
+    widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
+    Window::setWindowRect(rect);
+    fixSize();
+}
+
+QMargins DialogWindow::expectedBorders() const {
+    const bool framed = !isChild() && (style() & WS_CAPTION) == WS_CAPTION;
+    const QWidget* over = framed && owner() ? owner()->widget() : nullptr;
+    const QWindow* native = over && over->isVisible() ? over->windowHandle() : nullptr;
+    return native ? native->frameMargins() : QMargins();
+}
+
+void DialogWindow::setClientSize(QPoint corner, QSize inside) {
+    const QMargins around = isChild() ? QMargins() : expectedBorders();
+    setWindowRect(QRect(corner, inside + QSize(around.left() + around.right(), around.top() + around.bottom())));
+}
+
+void DialogWindow::keepOnScreen() {
+    // The window manager's frame is unknown until the dialog is shown.
+    constexpr QMargins frame(0, 0, 8, 32);
+    const bool isGuess = (style() & WS_CAPTION) != 0 && expectedBorders().isNull();
+    const QRect area = widget()->screen()->availableGeometry() - (isGuess ? frame : QMargins());
+    const QRect now = windowRect();
+    QRect place = now;
+    place.moveRight(std::min(place.right(), area.right()));
+    place.moveBottom(std::min(place.bottom(), area.bottom()));
+    place.moveLeft(std::max(place.left(), area.left()));
+    place.moveTop(std::max(place.top(), area.top()));
+    if (place != now) {
+        setWindowRect(place);
+    }
+}
+
+void DialogWindow::show(int command) {
+    if (isChild()) {
+        Window::show(command);
+        return;
+    }
+    const bool visible = command != SW_HIDE;
+    const bool before = !widget()->isHidden();
+    const HWND self = handle();
+    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
+    if (visible != before) {
+        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
+    }
+    if (!from(self)) {
+        return;
+    }
+    if (visible && !before) {
+        keepOnScreen();
+    }
+    guarded([&] { showTopLevel(*this, command); });
+    if (from(self)) {
+        tellGeometry();
+    }
+}
+
+// --- units and fonts ---
+
+void DialogWindow::useFont(const DialogTemplate& description) {
+    LOGFONTA font = pointFont(description.font ? description.font->pointSize * 10 : 80,
+                              description.font ? description.font->faceName : "MS Shell Dlg");
+    if (description.font && description.extended) {
+        font.lfWeight = description.font->weight;
+        font.lfItalic = description.font->italic ? 1 : 0;
+    }
+    const HFONT old = std::exchange(m_ownFont, CreateFontIndirectA(&font));
+    SendMessageA(handle(), WM_SETFONT, reinterpret_cast<WPARAM>(m_ownFont), FALSE);
+    DeleteObject(reinterpret_cast<HGDIOBJ>(old));
+    const QFont shown = controlFont(font);
+    widget()->setFont(shown);
+    m_baseUnits = dialogBaseUnits(shown);
+}
+
+QRect DialogWindow::map(const DialogRect& rect) const {
+    const int left = mulDiv(rect.x, m_baseUnits.width(), 4);
+    const int top = mulDiv(rect.y, m_baseUnits.height(), 8);
+    return {left, top, mulDiv(rect.width, m_baseUnits.width(), 4), mulDiv(rect.height, m_baseUnits.height(), 8)};
+}
+
+// --- the default button ---
+
+void DialogWindow::setDefaultId(int id) {
+    m_defaultId = id;
+    showDefault(from(GetFocus()));
+}
+
+void DialogWindow::showDefault(const Window* focused) {
+    const auto* pushed = dynamic_cast<const ButtonWindow*>(focused);
+    const bool focusDecides = pushed && pushed->isPushButton();
+    for (Window* child : children()) {
+        auto* button = dynamic_cast<ButtonWindow*>(child);
+        if (button && button->isPushButton()) {
+            button->showAsDefault(focusDecides ? button == pushed : m_defaultId != 0 && button->id() == m_defaultId);
+        }
+    }
+}
+
+void tellDialogFocus(Window& control, bool got) {
+    for (Window* window = control.parent(); window; window = window->parent()) {
+        if (auto* dialog = dynamic_cast<DialogWindow*>(window)) {
+            dialog->showDefault(got ? &control : nullptr);
+            dialog->lastFocus = got ? control.handle() : dialog->lastFocus;
+        }
+    }
+}
+
+// --- messages ---
+
+void DialogWindow::askColor() {
+    static const HDC dc = CreateCompatibleDC(nullptr);
+    const LRESULT answer = call(WM_CTLCOLORDLG, reinterpret_cast<WPARAM>(dc), reinterpret_cast<LPARAM>(handle()));
+    const auto brush = findTool<BrushObject>(reinterpret_cast<HGDIOBJ>(answer));
+    QRgb color = 0;
+    if (brush && brush->description.lbStyle == BS_SOLID) {
+        const COLORREF chosen = brush->systemColor >= 0 ? GetSysColor(brush->systemColor) : brush->description.lbColor;
+        color = qRgb(GetRValue(chosen), GetGValue(chosen), GetBValue(chosen));
+    }
+    if (color == m_color || !widget()) {
+        return;
+    }
+    m_color = color;
+    QPalette palette = QApplication::palette(widget());
+    if (color != 0) {
+        palette.setColor(QPalette::Window, QColor(color));
+    }
+    guarded([&] {
+        widget()->setAutoFillBackground(color != 0);
+        widget()->setPalette(palette);
+    });
+}
+
+void DialogWindow::pressCancel() {
+    const Window* button = child(IDCANCEL);
+    if (button && !button->isEnabled()) {
+        QApplication::beep();
+        return;
+    }
+    const HWND control = button ? button->handle() : nullptr;
+    call(WM_COMMAND, MAKEWPARAM(IDCANCEL, BN_CLICKED), reinterpret_cast<LPARAM>(control));
+}
+
+LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case DM_GETDEFID:
+        return m_defaultId != 0 ? MAKELONG(m_defaultId, DC_HASDEFID) : 0;
+    case DM_SETDEFID:
+        setDefaultId(static_cast<int>(wParam));
+        return TRUE;
+    case WM_CLOSE:
+        pressCancel();
+        return 0;
+    case WM_ERASEBKGND: {
+        const QSize size = clientRect().size();
+        const RECT rect{0, 0, size.width(), size.height()};
+        FillRect(reinterpret_cast<HDC>(wParam), &rect, GetSysColorBrush(COLOR_BTNFACE));
+        return TRUE;
+    }
+    case WM_PAINT: {
+        const HWND self = handle();
+        askColor();
+        if (from(self)) {
+            passEvent(*this, message);
+        }
+        return 0;
+    }
+    case WM_SETFOCUS:
+        // The keyboard belongs to a control; it comes here when the dialog becomes active again.
+        if (from(lastFocus) && lastFocus != handle()) {
+            SetFocus(lastFocus);
+        }
+        return 0;
+    default:
+        return Window::defaultProc(message, wParam, lParam);
+    }
+}
+
+// --- templates ---
+
+namespace {
+
+HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
+    const std::string caption = captionOf(item.title);
+    const QRect place = dialog.map(item.rect);
+    CREATESTRUCT cs{};
+    const bool known = findWindowClass(item.className.c_str()) != nullptr;
+    cs.lpszClass = known ? item.className.c_str() : emptyPaneClass;
+    cs.lpszName = caption.c_str();
+    const DWORD later = WS_VISIBLE | (known ? 0U : DWORD{WS_TABSTOP});
+    cs.style = static_cast<LONG>((item.style | WS_CHILD) & ~later);
+    const bool edge = hasClientEdge(item.className) && (item.style & WS_BORDER) != 0;
+    cs.dwExStyle = item.extendedStyle | (edge ? DWORD{WS_EX_CLIENTEDGE} : 0);
+    cs.x = place.x();
+    cs.y = place.y();
+    cs.cx = place.width();
+    cs.cy = place.height();
+    cs.hwndParent = dialog.handle();
+    cs.hMenu = reinterpret_cast<HMENU>(static_cast<UINT_PTR>(item.id));
+    cs.hInstance = AfxGetInstanceHandle();
+    return createWindow(cs, nullptr);
+}
+
+} // namespace
+
+bool makeControls(DialogWindow& dialog, const DialogTemplate& description) {
+    bool complete = true;
+    for (const DialogItemTemplate& item : description.items) {
+        const HWND control = makeControl(dialog, item);
+        if (!control) {
+            complete = false;
+            continue;
+        }
+        SendMessageA(control, WM_SETFONT, reinterpret_cast<WPARAM>(dialog.font), FALSE);
+        // The font has changed the height of lines, and with it that of boxes that show whole lines only.
+        const QRect place = dialog.map(item.rect);
+        Window::from(control)->setWindowRect(place);
+        if ((item.style & WS_VISIBLE) != 0) {
+            ShowWindow(control, SW_SHOWNA);
+        }
+        const auto* button = dynamic_cast<const ButtonWindow*>(Window::from(control));
+        if (button && button->type() == BS_DEFPUSHBUTTON && dialog.defaultId() == 0) {
+            dialog.setDefaultId(static_cast<int>(item.id));
+        }
+    }
+    return complete;
+}
+
+bool fillControls(DialogWindow& dialog, LPCSTR name) {
+    const auto bytes = resourceBytes(AfxFindResourceHandle(name, RT_DLGINIT), name, RT_DLGINIT);
+    if (bytes.empty()) {
+        return true;
+    }
+    const auto entries = parseDialogData(bytes);
+    if (!entries) {
+        std::fprintf(stderr, "The first contents of a dialog were refused: %s.\n", entries.reason().c_str());
+        return false;
+    }
+    for (const DialogDataEntry& entry : *entries) {
+        UINT message = entry.message;
+        if (entry.kind != DialogDataEntry::Kind::Other) {
+            message = entry.kind == DialogDataEntry::Kind::AddToListBox ? LB_ADDSTRING : CB_ADDSTRING;
+        }
+        SendMessageA(GetDlgItem(dialog.handle(), entry.controlId), message, 0,
+                     reinterpret_cast<LPARAM>(entry.text.c_str()));
+    }
+    return true;
+}
+
+} // namespace tvx::afx
+
+LONG GetDialogBaseUnits() {
+    if (!tvx::afx::ensureGui()) {
+        return 0;
+    }
+    const QFont font = tvx::afx::toolkitFont(static_cast<HFONT>(GetStockObject(SYSTEM_FONT)));
+    const QSize units = tvx::afx::dialogBaseUnits(font);
+    return static_cast<LONG>(MAKELONG(units.width(), units.height()));
+}

@@ -1,0 +1,73 @@
+#pragma once
+
+/// @file
+/// Dialog windows, and what makes controls from templates.
+
+#include "platform/afx/core/detail/Window.h"
+#include "platform/win/DialogTemplate.h"
+
+namespace tvx::afx {
+
+/// The class of dialogs.
+inline constexpr const char* dialogClass = "#32770";
+/// The class that stands for control classes nobody has registered: an empty frame.
+inline constexpr const char* emptyPaneClass = "TvxEmptyPane";
+
+/// The size of 4 by 8 dialog units in pixels, for a font.
+TVX_PLATFORM_API QSize dialogBaseUnits(const QFont& font);
+
+/// The "#32770" class: a top-level dialog with the desktop's decoration, or a child dialog (property pages, form
+/// views, dialog bars).
+class TVX_PLATFORM_API DialogWindow : public Window {
+public:
+    using Window::Window;
+    ~DialogWindow() override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    void setWindowRect(const QRect& rect) override;
+    /// Those of the owner, which has a caption as most dialogs do: sizes that a host computes for the whole window
+    /// then come out right before the desktop has told them.
+    QMargins expectedBorders() const override;
+    /// Gives the area inside a size, and the window a corner.
+    void setClientSize(QPoint corner, QSize inside);
+    void show(int command) override;
+
+    /// Takes the template's font: it gives the dialog its units, and its controls their text.
+    void useFont(const DialogTemplate& description);
+    QSize baseUnits() const {
+        return m_baseUnits;
+    }
+    /// Pixels for dialog units.
+    QRect map(const DialogRect& rect) const;
+    void setDefaultId(int id);
+    int defaultId() const {
+        return m_defaultId;
+    }
+    /// Shows the default look at the button that Enter presses now: the focused push button, else the default one.
+    void showDefault(const Window* focused);
+    /// The control that had the keyboard last, null when it is gone.
+    HWND lastFocus = nullptr;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void widgetMade() override;
+    void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
+
+private:
+    void askColor();
+    void keepOnScreen();
+    void fixSize();
+    void pressCancel();
+    HFONT m_ownFont = nullptr;
+    QSize m_baseUnits{6, 13};
+    int m_defaultId = 0;
+    QRgb m_color = 0;
+};
+
+/// Makes the controls of a template in a dialog that stands. False when one could not be made.
+TVX_PLATFORM_API bool makeControls(DialogWindow& dialog, const DialogTemplate& description);
+/// Fills list and combo boxes with the first contents that resources (type 240) give the dialog `name`.
+TVX_PLATFORM_API bool fillControls(DialogWindow& dialog, LPCSTR name);
+/// Tells the dialog around a control that the keyboard came to the control or left it.
+void tellDialogFocus(Window& control, bool got);
+
+} // namespace tvx::afx

@@ -1,0 +1,48 @@
+#pragma once
+
+/// @file
+/// CDocManager: the templates of an application, and the commands that make and open documents.
+
+#include "platform/afx/frames/DocTemplate.h"
+#include "platform/base/List.h"
+
+/// Holds the document templates. The application object makes one when its first template is added, unless a class
+/// derived from it stands in CWinApp::m_pDocManager already; it deletes it in its destructor.
+class TVX_PLATFORM_API CDocManager : public CObject {
+    DECLARE_DYNCREATE(CDocManager)
+
+public:
+    CDocManager() = default;
+    /// Deletes the templates.
+    ~CDocManager() override;
+
+    /// Takes a template over. Adding one a second time changes nothing.
+    virtual void AddDocTemplate(CDocTemplate* docTemplate);
+    virtual POSITION GetFirstDocTemplatePosition() const;
+    virtual CDocTemplate* GetNextDocTemplate(POSITION& position) const;
+    /// File New: makes a document; where several templates have a name for File New, the user chooses.
+    virtual void OnFileNew();
+    /// File Open: asks for a file and opens it.
+    virtual void OnFileOpen();
+    /// Asks the user for a file name.
+    /// @param fileName   in: the name shown first; out: the chosen one, unchanged when the user cancelled
+    /// @param titleId    string that becomes the dialog's title
+    /// @param flags      OFN_... bits
+    /// @param openDialog TRUE to open a file, FALSE to save one
+    /// @param docTemplate whose filter is offered; null for those of all templates
+    /// @return whether a name was chosen
+    virtual BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog,
+                                  CDocTemplate* docTemplate);
+    /// Opens a file with the template that fits it best, or activates it when it is open already. Null when it failed.
+    virtual CDocument* OpenDocumentFile(LPCSTR fileName);
+    virtual BOOL SaveAllModified();
+    virtual void CloseAllDocuments(BOOL endSession);
+    virtual int GetOpenDocumentCount();
+
+protected:
+    std::vector<CDocTemplate*> m_templates;
+
+private:
+    CDocTemplate* bestTemplate(LPCSTR fileName, CDocument*& open) const;
+    CDocTemplate* chooseTemplate() const;
+};

@@ -1,0 +1,132 @@
+#pragma once
+
+/// @file
+/// Frames with child frames: CMDIFrameWnd is the main window, CMDIChildWnd a document's frame inside it.
+
+#include "platform/afx/frames/Frame.h"
+
+class CMDIChildWnd;
+
+// WM_MDITILE
+#define MDITILE_VERTICAL 0x0000
+#define MDITILE_HORIZONTAL 0x0001
+#define MDITILE_SKIPDISABLED 0x0002
+
+/// The main window of an application with several documents. Its client area holds the child frames; while one is
+/// active, its menu and accelerators replace the frame's own. The popup with the Window commands (ID_WINDOW_...) also
+/// lists the child frames. Commands go to the active child first.
+class TVX_PLATFORM_API CMDIFrameWnd : public CFrameWnd {
+    DECLARE_DYNCREATE(CMDIFrameWnd)
+
+public:
+    CMDIFrameWnd() = default;
+
+    /// The window that holds the child frames.
+    HWND m_hWndMDIClient = nullptr;
+
+    /// The active child frame, null when there is none.
+    /// @param maximized receives whether it is maximised; may be null
+    CMDIChildWnd* MDIGetActive(BOOL* maximized = nullptr) const;
+    void MDIActivate(CWnd* child);
+    void MDINext();
+    void MDIPrev();
+    void MDIMaximize(CWnd* child);
+    void MDIRestore(CWnd* child);
+    void MDICascade();
+    void MDICascade(int type);
+    void MDITile();
+    /// @param type MDITILE_VERTICAL (side by side) or MDITILE_HORIZONTAL (one above the other)
+    void MDITile(int type);
+    void MDIIconArrange();
+    /// Shows another menu and answers the one shown before; null leaves it.
+    /// @param windowMenu the popup that lists the child frames, null finds it
+    CMenu* MDISetMenu(CMenu* frameMenu, CMenu* windowMenu);
+
+    /// Creates the client window. Called from OnCreateClient.
+    virtual BOOL CreateClient(CREATESTRUCT* cs, CMenu* windowMenu);
+    /// Makes a new child frame without a document.
+    /// @param childClass a class derived from CMDIChildWnd; id: its resources
+    CMDIChildWnd* CreateNewChild(CRuntimeClass* childClass, UINT id, HMENU menu = nullptr,
+                                 HACCEL accelerators = nullptr);
+    /// The popup that lists the child frames, null when `menuBar` has none.
+    virtual HMENU GetWindowMenuPopup(HMENU menuBar);
+
+    BOOL OnCreateClient(CREATESTRUCT* cs, CCreateContext* context) override;
+    BOOL PreTranslateMessage(MSG* message) override;
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    CFrameWnd* GetActiveFrame() override;
+    void OnUpdateFrameTitle(BOOL addToTitle) override;
+    void OnUpdateFrameMenu(HMENU alternative) override;
+    HACCEL GetDefaultAccelerator() override;
+
+    afx_msg void OnDestroy();
+    afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);
+    afx_msg void OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu);
+    afx_msg void OnUpdateMDIWindowCmd(CCmdUI* item);
+    afx_msg BOOL OnMDIWindowCmd(UINT id);
+    afx_msg void OnWindowNew();
+
+protected:
+    friend class CMDIChildWnd;
+    BOOL OnCommand(WPARAM wParam, LPARAM lParam) override;
+
+    DECLARE_MESSAGE_MAP()
+
+private:
+    void listChildren(CMenu& popup) const;
+};
+
+/// A document's frame inside a CMDIFrameWnd. It has no menu of its own: that of its document template stands in the
+/// main frame while it is active.
+class TVX_PLATFORM_API CMDIChildWnd : public CFrameWnd {
+    DECLARE_DYNCREATE(CMDIChildWnd)
+
+public:
+    CMDIChildWnd() = default;
+
+    /// Creates the window in a main frame.
+    /// @param className null for the framework's own class
+    virtual BOOL Create(LPCSTR className, LPCSTR title, DWORD style = WS_CHILD | WS_VISIBLE | WS_OVERLAPPEDWINDOW,
+                        const RECT& rect = rectDefault, CMDIFrameWnd* parent = nullptr,
+                        CCreateContext* context = nullptr);
+    using CFrameWnd::Create;
+    /// Creates the window from the resources with the number `id`. A menu given by SetHandles or the context's template
+    /// is taken, otherwise loaded.
+    BOOL LoadFrame(UINT id, DWORD style = WS_CHILD | WS_VISIBLE | WS_OVERLAPPEDWINDOW | FWS_ADDTOTITLE,
+                   CWnd* parent = nullptr, CCreateContext* context = nullptr) override;
+    /// The menu and accelerators in force while this frame is active; they stay the caller's.
+    void SetHandles(HMENU menu, HACCEL accelerators);
+
+    CMDIFrameWnd* GetMDIFrame() const;
+    /// Closes without asking. The document is asked by WM_CLOSE.
+    void MDIDestroy();
+    void MDIActivate();
+    void MDIMaximize();
+    void MDIRestore();
+
+    BOOL PreCreateWindow(CREATESTRUCT& cs) override;
+    BOOL PreTranslateMessage(MSG* message) override;
+    BOOL DestroyWindow() override;
+    void ActivateFrame(int command = -1) override;
+    void OnUpdateFrameMenu(HMENU alternative) override;
+    virtual void OnUpdateFrameMenu(BOOL activate, CWnd* activated, HMENU alternative);
+    void OnUpdateFrameTitle(BOOL addToTitle) override;
+    HACCEL GetDefaultAccelerator() override;
+    CWnd* GetMessageBar() override;
+    /// The menu shown while this frame is active, null for the main frame's own.
+    HMENU GetMenuShared() const {
+        return m_hMenuShared;
+    }
+
+    afx_msg void OnMDIActivate(BOOL activate, CWnd* activated, CWnd* deactivated);
+    afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);
+    afx_msg void OnDestroy();
+    afx_msg void OnSize(UINT type, int cx, int cy);
+
+protected:
+    DECLARE_MESSAGE_MAP()
+
+private:
+    HMENU m_hMenuShared = nullptr;
+    bool m_ownMenu = false;
+};

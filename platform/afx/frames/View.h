@@ -1,0 +1,71 @@
+#pragma once
+
+/// @file
+/// CView: the window that shows a document.
+
+#include "platform/afx/frames/Frame.h"
+
+class CBrush;
+class CDocument;
+struct CPrintInfo;
+
+/// Shows (part of) a document and takes the user's input for it. Its document's template makes it with its frame; the
+/// object deletes itself when its window has ended.
+///
+/// A derived class draws in OnDraw, reacts to changes in OnUpdate, and handles commands in its message map; those it
+/// does not handle go to the document.
+///
+/// @code
+/// void CBoardView::OnDraw(CDC* dc) {
+///     for (const Shape& shape : GetDocument()->shapes()) shape.draw(*dc);
+/// }
+/// @endcode
+class TVX_PLATFORM_API CView : public CWnd {
+    DECLARE_DYNAMIC(CView)
+
+public:
+    ~CView() override;
+
+    /// The document, null for a view without one.
+    CDocument* GetDocument() const {
+        return m_pDocument;
+    }
+
+    /// Draws the document. The context is prepared by OnPrepareDC.
+    virtual void OnDraw(CDC* dc) = 0;
+    /// Called once the view stands in its frame, before it is shown. The base calls OnUpdate.
+    virtual void OnInitialUpdate();
+    /// Called when the document has changed. The base repaints the whole view.
+    /// @param sender the view that made the change, null for none; it is not called itself
+    /// @param hint,object what CDocument::UpdateAllViews was given
+    virtual void OnUpdate(CView* sender, LPARAM hint, CObject* object);
+    /// Sets up a context for OnDraw: mapping mode, origin.
+    /// @param info null: there is no printing here
+    virtual void OnPrepareDC(CDC* dc, CPrintInfo* info = nullptr);
+    /// Called when the view becomes its frame's active one, or ceases to be. The base gives it the keyboard.
+    virtual void OnActivateView(BOOL activate, CView* activated, CView* deactivated);
+    /// Called when the frame is activated or deactivated.
+    virtual void OnActivateFrame(UINT state, CFrameWnd* frame);
+    /// Whether an object is selected in the view. The base answers FALSE.
+    virtual BOOL IsSelected(const CObject* item) const;
+
+    BOOL PreCreateWindow(CREATESTRUCT& cs) override;
+    void PostNcDestroy() override;
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    CScrollBar* GetScrollBarCtrl(int bar) const override;
+
+    afx_msg int OnCreate(CREATESTRUCT* cs);
+    afx_msg void OnDestroy();
+    afx_msg void OnPaint();
+    afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);
+    afx_msg LRESULT OnInitialUpdateMessage(WPARAM, LPARAM);
+
+protected:
+    CView() = default;
+    friend class CDocument;
+    friend class CFrameWnd;
+
+    CDocument* m_pDocument = nullptr;
+
+    DECLARE_MESSAGE_MAP()
+};

@@ -1,0 +1,155 @@
+#include "platform/afx/frames/detail/BarWindow.h"
+
+#include "platform/afx/frames/Frame.h"
+
+#include <QMainWindow>
+#include <QMoveEvent>
+#include <QStatusBar>
+#include <QToolBar>
+
+#include <algorithm>
+#include <iterator>
+
+namespace tvx::afx {
+
+namespace {
+
+bool isFrameShown(const QWidget& bar) {
+    return bar.parentWidget() && bar.parentWidget()->window()->isVisible();
+}
+
+std::unique_ptr<Window> makeBar(const CREATESTRUCT& cs) {
+    return std::make_unique<BarWindow>(cs);
+}
+
+std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
+    return std::make_unique<StatusBarWindow>(cs);
+}
+
+/// A tool bar that knows where it floats. While a window manager takes in a new window, the place that it tells can be
+/// the screen's corner; only what is told after the first painting counts.
+class Tools : public QToolBar {
+public:
+    using QToolBar::QToolBar;
+
+    QPoint place() const {
+        return isVisible() ? m_place : pos();
+    }
+
+protected:
+    void showEvent(QShowEvent* event) override {
+        if (!event->spontaneous()) {
+            m_place = pos();
+            m_painted = false;
+        }
+        QToolBar::showEvent(event);
+    }
+    void paintEvent(QPaintEvent* event) override {
+        m_painted = true;
+        QToolBar::paintEvent(event);
+    }
+    void moveEvent(QMoveEvent* event) override {
+        if (m_painted || !event->spontaneous()) {
+            m_place = event->pos();
+        }
+        QToolBar::moveEvent(event);
+    }
+
+private:
+    QPoint m_place;
+    bool m_painted = false;
+};
+
+const WindowClassEntry barEntry("ToolbarWindow32", &makeBar);
+const WindowClassEntry statusBarEntry("msctls_statusbar32", &makeStatusBar);
+
+} // namespace
+
+QWidget* BarWindow::makeWidget(QWidget* parent) {
+    auto* bar = new Tools(text(), parent);
+    // Layouts are remembered under this name.
+    bar->setObjectName(QStringLiteral("bar%1").arg(id()));
+    bar->setMovable(false);
+    return bar;
+}
+
+QWidget* StatusBarWindow::makeWidget(QWidget* parent) {
+    auto* bar = new QStatusBar(parent);
+    bar->setObjectName(QStringLiteral("bar%1").arg(id()));
+    return bar;
+}
+
+void BarWindow::setWindowRect(const QRect& rect) {
+    const bool placed = qobject_cast<QMainWindow*>(widget()->parentWidget()) && !widget()->isWindow();
+    if (!placed) {
+        Window::setWindowRect(rect);
+    }
+}
+
+void BarWindow::show(int command) {
+    if (command != SW_HIDE && widget() && widget()->isWindow() && !isFrameShown(*widget())) {
+        setStyle(style() | WS_VISIBLE, exStyle());
+        return;
+    }
+    Window::show(command);
+}
+
+void attachStatusBar(QMainWindow& main, QWidget* widget) {
+    if (auto* bar = qobject_cast<QStatusBar*>(widget)) {
+        main.setStatusBar(bar);
+    }
+}
+
+namespace {
+
+struct Side {
+    UINT dockBar;
+    Qt::ToolBarArea area;
+    DWORD bit;
+};
+
+constexpr Side sides[] = {{AFX_IDW_DOCKBAR_TOP, Qt::TopToolBarArea, CBRS_ALIGN_TOP},
+                          {AFX_IDW_DOCKBAR_LEFT, Qt::LeftToolBarArea, CBRS_ALIGN_LEFT},
+                          {AFX_IDW_DOCKBAR_RIGHT, Qt::RightToolBarArea, CBRS_ALIGN_RIGHT},
+                          {AFX_IDW_DOCKBAR_BOTTOM, Qt::BottomToolBarArea, CBRS_ALIGN_BOTTOM}};
+
+} // namespace
+
+UINT dockBarOf(Qt::ToolBarArea area) {
+    const auto* side = std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.area == area; });
+    return side != std::end(sides) ? side->dockBar : 0;
+}
+
+Qt::ToolBarArea areaOf(UINT dockBar) {
+    const auto* side =
+        std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.dockBar == dockBar; });
+    return side != std::end(sides) ? side->area : Qt::TopToolBarArea;
+}
+
+DWORD sideOfDockBar(UINT dockBar) {
+    const auto* side =
+        std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.dockBar == dockBar; });
+    return side != std::end(sides) ? side->bit : 0;
+}
+
+void floatToolBar(QToolBar& bar, QPoint at) {
+    const bool shown = !bar.isHidden();
+    bar.setWindowFlags(Qt::Tool | Qt::FramelessWindowHint);
+    bar.setAttribute(Qt::WA_ShowWithoutActivating); // the frame keeps the keyboard
+    bar.move(at);
+    bar.adjustSize();
+    bar.setVisible(shown && isFrameShown(bar));
+}
+
+QPoint placeOfFloating(const QToolBar& bar) {
+    const auto* tools = dynamic_cast<const Tools*>(&bar);
+    return tools ? tools->place() : bar.pos();
+}
+
+void showFloating(QToolBar& bar) {
+    if (bar.isFloating() && bar.isHidden() && isFrameShown(bar)) {
+        bar.show();
+    }
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,50 @@
+#pragma once
+
+/// @file
+/// The windows of control bars: tool bars and status bars of the toolkit.
+
+#include "platform/afx/core/detail/Window.h"
+
+class QMainWindow;
+class QToolBar;
+
+namespace tvx::afx {
+
+/// A bar at the edge of a frame, which the frame's layout places and sizes.
+class TVX_PLATFORM_API BarWindow : public Window {
+public:
+    using Window::Window;
+    void setWindowRect(const QRect& rect) override;
+    /// A floating bar of a frame that is not shown waits for it; see showFloating.
+    void show(int command) override;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+};
+
+class TVX_PLATFORM_API StatusBarWindow : public BarWindow {
+public:
+    using BarWindow::BarWindow;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+};
+
+/// A side of a frame under its three names: the dock bar's identifier, the toolkit's area, the CBRS_ALIGN_... bit. What
+/// is no side is 0, and the area at the top.
+/// @{
+[[nodiscard]] UINT dockBarOf(Qt::ToolBarArea area);
+[[nodiscard]] Qt::ToolBarArea areaOf(UINT dockBar);
+[[nodiscard]] DWORD sideOfDockBar(UINT dockBar);
+/// @}
+
+/// Gives a frame its status bar, if the widget is one.
+void attachStatusBar(QMainWindow& main, QWidget* widget);
+/// Makes a tool bar a small window at a point of the screen. It comes up when the frame does.
+void floatToolBar(QToolBar& bar, QPoint at);
+/// Where a floating tool bar stands on the screen. One that the desktop is about to show is where it was asked to be.
+[[nodiscard]] QPoint placeOfFloating(const QToolBar& bar);
+/// Shows a floating tool bar that waited for its frame.
+void showFloating(QToolBar& bar);
+
+} // namespace tvx::afx

@@ -1,0 +1,334 @@
+#include "platform/afx/frames/detail/MdiWindow.h"
+
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/PlainWindow.h"
+#include "platform/afx/frames/MdiFrame.h"
+#include "platform/afx/gdi/detail/GdiObjects.h"
+
+#include <QCloseEvent>
+#include <QIcon>
+#include <QMainWindow>
+#include <QMdiArea>
+#include <QMdiSubWindow>
+
+#include <algorithm>
+
+namespace tvx::afx {
+
+namespace {
+
+std::unique_ptr<Window> makeClient(const CREATESTRUCT& cs) {
+    return std::make_unique<MdiClientWindow>(cs);
+}
+
+const WindowClassEntry clientEntry("MDICLIENT", &makeClient);
+
+/// Asks its frame before it closes.
+class SubWindow : public QMdiSubWindow {
+public:
+    using QMdiSubWindow::QMdiSubWindow;
+
+protected:
+    void closeEvent(QCloseEvent* event) override {
+        event->ignore();
+        if (const Window* window = Window::of(this)) {
+            storing([window] {
+                armIdle();
+                PostMessageA(window->handle(), WM_SYSCOMMAND, SC_CLOSE, 0);
+            });
+        }
+    }
+};
+
+} // namespace
+
+std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs) {
+    if (!dynamic_cast<MdiClientWindow*>(Window::from(cs.hwndParent))) {
+        return std::make_unique<PlainWindow>(cs);
+    }
+    return std::make_unique<MdiChildWindow>(cs);
+}
+
+Window* activeMdiChild(const Window& frame) {
+    for (Window* child : frame.children()) {
+        if (const auto* client = dynamic_cast<MdiClientWindow*>(child)) {
+            return client->active();
+        }
+    }
+    return nullptr;
+}
+
+// --- the client ---
+
+QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
+    auto* area = new QMdiArea(parent);
+    area->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+    area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+    area->setActivationOrder(QMdiArea::ActivationHistoryOrder);
+    QObject::connect(area, &QMdiArea::subWindowActivated, area,
+                     [this](const QMdiSubWindow* sub) { storing([&] { follow(sub); }); });
+    return area;
+}
+
+QMdiArea* MdiClientWindow::area() const {
+    return static_cast<QMdiArea*>(widget());
+}
+
+QWidget* MdiClientWindow::clientWidget() const {
+    return widget() ? area()->viewport() : nullptr;
+}
+
+void MdiClientWindow::follow(const QMdiSubWindow* sub) {
+    // Without a sub-window the main frame has only been deactivated; its active child stays that.
+    if (sub && !m_activating && !isDestroyed()) {
+        activate(dynamic_cast<MdiChildWindow*>(Window::of(sub)));
+    }
+}
+
+void MdiClientWindow::activate(MdiChildWindow* child) {
+    if (child && child->isDestroyed()) {
+        return;
+    }
+    MdiChildWindow* old = std::exchange(m_active, child);
+    if (child) {
+        std::erase(m_history, child);
+        m_history.push_back(child);
+        m_activating = true;
+        guarded([&] { area()->setActiveSubWindow(child->subWindow()); });
+        m_activating = false;
+    }
+    if (old == child) {
+        return;
+    }
+    const HWND oldHandle = old ? old->handle() : nullptr;
+    const HWND newHandle = child ? child->handle() : nullptr;
+    for (const HWND told : {oldHandle, newHandle}) {
+        if (from(told)) {
+            SendMessageA(told, WM_NCACTIVATE, told == newHandle ? TRUE : FALSE, 0);
+            SendMessageA(told, WM_MDIACTIVATE, reinterpret_cast<WPARAM>(oldHandle),
+                         reinterpret_cast<LPARAM>(newHandle));
+        }
+    }
+}
+
+void MdiClientWindow::forget(const MdiChildWindow& child) {
+    std::erase(m_history, &child);
+    if (m_active != &child) {
+        return;
+    }
+    if (isDestroyed() || topLevel()->isDestroyed()) {
+        m_active = nullptr;
+        return;
+    }
+    activate(m_history.empty() ? nullptr : m_history.back());
+}
+
+std::vector<MdiChildWindow*> MdiClientWindow::shownChildren() const {
+    std::vector<MdiChildWindow*> shown;
+    for (Window* window : children()) {
+        auto* child = dynamic_cast<MdiChildWindow*>(window);
+        if (child && !child->isDestroyed() && !child->widget()->isHidden()) {
+            shown.push_back(child);
+        }
+    }
+    return shown;
+}
+
+void MdiClientWindow::step(int direction) {
+    const auto shown = shownChildren();
+    const auto at = std::find(shown.begin(), shown.end(), m_active);
+    if (shown.size() < 2 || at == shown.end()) {
+        return;
+    }
+    const auto count = static_cast<std::ptrdiff_t>(shown.size());
+    activate(shown[static_cast<std::size_t>((at - shown.begin() + direction + count) % count)]);
+}
+
+QRect MdiClientWindow::nextPlace() {
+    constexpr int offset = 26;
+    constexpr int steps = 8;
+    QSize room = area()->viewport()->size();
+    if (!area()->isVisible()) {
+        room = room.expandedTo(topLevel()->clientRect().size());
+    }
+    const int shift = (m_placed++ % steps) * offset;
+    return {QPoint(shift, shift), room * 2 / 3};
+}
+
+void MdiClientWindow::arrange(UINT type) {
+    auto shown = shownChildren();
+    std::erase_if(shown, [](const MdiChildWindow* child) { return child->widget()->isMinimized(); });
+    const auto count = static_cast<int>(shown.size());
+    const QSize room = area()->viewport()->size();
+    for (int i = 0; i < count; ++i) {
+        QRect place(QPoint(0, room.height() * i / count), QPoint(room.width(), room.height() * (i + 1) / count));
+        if ((type & MDITILE_HORIZONTAL) == 0) {
+            place = QRect(QPoint(room.width() * i / count, 0), QPoint(room.width() * (i + 1) / count, room.height()));
+        }
+        place.adjust(0, 0, -1, -1);
+        guarded([&] {
+            shown[static_cast<std::size_t>(i)]->subWindow()->showNormal();
+            shown[static_cast<std::size_t>(i)]->subWindow()->setGeometry(place);
+        });
+    }
+}
+
+LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    auto* child = dynamic_cast<MdiChildWindow*>(from(reinterpret_cast<HWND>(wParam)));
+    switch (message) {
+    case WM_MDIGETACTIVE:
+        if (lParam != 0) {
+            *reinterpret_cast<BOOL*>(lParam) = m_active && m_active->widget()->isMaximized() ? TRUE : FALSE;
+        }
+        return m_active ? reinterpret_cast<LRESULT>(m_active->handle()) : 0;
+    case WM_MDIACTIVATE:
+        activate(child);
+        return 0;
+    case WM_MDINEXT:
+        step(lParam != 0 ? -1 : 1);
+        return 0;
+    case WM_MDIMAXIMIZE:
+    case WM_MDIRESTORE:
+        if (child) {
+            child->show(message == WM_MDIMAXIMIZE ? SW_SHOWMAXIMIZED : SW_RESTORE);
+        }
+        return 0;
+    case WM_MDIDESTROY:
+        if (child) {
+            child->destroy();
+        }
+        return 0;
+    case WM_MDITILE:
+        arrange(static_cast<UINT>(wParam));
+        return TRUE;
+    case WM_MDICASCADE:
+        guarded([this] { area()->cascadeSubWindows(); });
+        return TRUE;
+    default:
+        return Window::defaultProc(message, wParam, lParam);
+    }
+}
+
+// --- child frames ---
+
+MdiChildWindow::MdiChildWindow(const CREATESTRUCT& cs) : Window(cs), m_defaultPlace(cs.x == CW_USEDEFAULT) {}
+
+QMdiSubWindow* MdiChildWindow::subWindow() const {
+    return static_cast<QMdiSubWindow*>(widget());
+}
+
+MdiClientWindow& MdiChildWindow::client() const {
+    return static_cast<MdiClientWindow&>(*parent());
+}
+
+QWidget* MdiChildWindow::clientWidget() const {
+    return m_main;
+}
+
+QWidget* MdiChildWindow::childHost() const {
+    return m_main;
+}
+
+QWidget* MdiChildWindow::makeWidget(QWidget*) {
+    auto* sub = new SubWindow;
+    m_main = makeMainWidget(sub, Qt::Widget);
+    // The toolkit's main window makes itself a top-level window whatever it is told at first.
+    m_main->setWindowFlags(Qt::Widget);
+    sub->setWidget(m_main);
+    guarded([&] { client().area()->addSubWindow(sub); });
+    sub->hide();
+    return sub;
+}
+
+void MdiChildWindow::widgetMade() {
+    subWindow()->setWindowTitle(text());
+    iconChanged();
+    m_systemMenu.owner = handle();
+    m_systemMenu.systemMenu = true;
+    m_systemMenu.choose = [self = handle()](UINT id) { postMenuCommand(self, id, true); };
+    // The toolkit's own has items that frames do not have, and a shortcut.
+    guarded([this] {
+        subWindow()->setSystemMenu(new PopupMenu(GetSystemMenu(handle(), FALSE), 0, m_systemMenu, subWindow()));
+    });
+}
+
+void MdiChildWindow::iconChanged() {
+    const QImage image = iconImage(smallIcon ? smallIcon : bigIcon);
+    if (!image.isNull()) {
+        widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
+    }
+}
+
+void MdiChildWindow::setText(const QString& text) {
+    Window::setText(text);
+    if (widget()) {
+        guarded([&] { widget()->setWindowTitle(text); });
+    }
+}
+
+void MdiChildWindow::setWindowRect(const QRect& rect) {
+    if (std::exchange(m_defaultPlace, false)) {
+        Window::setWindowRect(client().nextPlace());
+        return;
+    }
+    Window::setWindowRect(rect);
+}
+
+void MdiChildWindow::show(int command) {
+    const bool visible = command != SW_HIDE;
+    const bool before = !widget()->isHidden();
+    const HWND self = handle();
+    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
+    if (visible != before) {
+        forgetToldSize();
+        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
+    }
+    if (!from(self)) {
+        return;
+    }
+    guarded([&] {
+        switch (command) {
+        case SW_HIDE:
+            widget()->hide();
+            break;
+        case SW_SHOWMAXIMIZED:
+            widget()->showMaximized();
+            break;
+        case SW_SHOWMINIMIZED:
+        case SW_MINIMIZE:
+        case SW_SHOWMINNOACTIVE:
+            widget()->showMinimized();
+            break;
+        case SW_SHOWNORMAL:
+        case SW_RESTORE:
+            widget()->showNormal();
+            break;
+        default:
+            widget()->show();
+            break;
+        }
+    });
+    if (from(self)) {
+        tellGeometry();
+    }
+}
+
+LRESULT MdiChildWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_DESTROY) {
+        client().forget(*this);
+    }
+    if (message == WM_SYSCOMMAND) {
+        switch (wParam & 0xFFF0U) {
+        case SC_NEXTWINDOW:
+        case SC_PREVWINDOW:
+            return SendMessageA(client().handle(), WM_MDINEXT, 0, (wParam & 0xFFF0U) == SC_PREVWINDOW ? 1 : 0);
+        default:
+            break;
+        }
+    }
+    return Window::defaultProc(message, wParam, lParam);
+}
+
+} // namespace tvx::afx

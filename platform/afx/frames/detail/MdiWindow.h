@@ -1,0 +1,77 @@
+#pragma once
+
+/// @file
+/// Child frames in a main frame: the client window that holds them and the child frames' windows.
+
+#include "platform/afx/core/detail/MenuWidgets.h"
+#include "platform/afx/core/detail/Window.h"
+
+class QMainWindow;
+class QMdiArea;
+class QMdiSubWindow;
+
+namespace tvx::afx {
+
+class MdiChildWindow;
+
+/// The area that child frames stand in. Controlled by WM_MDI... messages.
+class TVX_PLATFORM_API MdiClientWindow : public Window {
+public:
+    using Window::Window;
+    QWidget* clientWidget() const override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    QMdiArea* area() const;
+    /// The active child frame, null when there is none.
+    MdiChildWindow* active() const {
+        return m_active;
+    }
+    /// Makes a child frame the active one (null: none) and tells both.
+    void activate(MdiChildWindow* child);
+    /// Chooses another active child frame when one ends.
+    void forget(const MdiChildWindow& child);
+    /// Where a new child frame goes that asks for no place: each a little lower and further right than the last.
+    QRect nextPlace();
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+
+private:
+    void follow(const QMdiSubWindow* sub);
+    void step(int direction);
+    void arrange(UINT type);
+    std::vector<MdiChildWindow*> shownChildren() const;
+    MdiChildWindow* m_active = nullptr;
+    std::vector<MdiChildWindow*> m_history; ///< The latest active one last.
+    bool m_activating = false;
+    int m_placed = 0;
+};
+
+/// A child frame: a caption of the toolkit's around a main window of its own, with bars and a pane.
+class TVX_PLATFORM_API MdiChildWindow : public Window {
+public:
+    explicit MdiChildWindow(const CREATESTRUCT& cs);
+    QWidget* clientWidget() const override;
+    QWidget* childHost() const override;
+    void show(int command) override;
+    void setText(const QString& text) override;
+    void setWindowRect(const QRect& rect) override;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    QMdiSubWindow* subWindow() const;
+    MdiClientWindow& client() const;
+
+protected:
+    QWidget* makeWidget(QWidget* parent) override;
+    void widgetMade() override;
+    void iconChanged() override;
+
+private:
+    QPointer<QMainWindow> m_main;
+    MenuHost m_systemMenu;
+    bool m_defaultPlace;
+};
+
+[[nodiscard]] std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs);
+/// The active child frame's window of a main frame, null when there is none.
+[[nodiscard]] Window* activeMdiChild(const Window& frame);
+
+} // namespace tvx::afx

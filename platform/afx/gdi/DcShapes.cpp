@@ -1,0 +1,350 @@
+#include "platform/afx/gdi/Dc.h"
+#include "platform/afx/gdi/detail/DeviceContext.h"
+#include "platform/afx/gdi/detail/Outline.h"
+#include "platform/afx/gdi/detail/Regions.h"
+
+#include <QPainterPath>
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <numbers>
+#include <vector>
+
+using namespace tvx::afx;
+
+namespace {
+
+/// The context and its opened pixels for one shape; false when nothing is to be drawn.
+class Shape {
+public:
+    explicit Shape(HDC handle) : dc(findContext(handle)) {
+        if (dc) {
+            drawing.emplace(*dc);
+        }
+    }
+    /// What a drawing call answers: whether the context was valid.
+    [[nodiscard]] BOOL valid() const {
+        return dc != nullptr;
+    }
+    [[nodiscard]] bool visible() const {
+        return drawing && *drawing;
+    }
+    [[nodiscard]] Canvas& canvas() {
+        return drawing->canvas;
+    }
+    [[nodiscard]] const Mapping& mapping() const {
+        return dc->state.mapping;
+    }
+    /// Fills with the brush. @param area spans or a rectangle
+    template <class Area>
+    void fill(const Area& area) {
+        QImage pattern;
+        if (const auto ink = dc->brushInk(pattern)) {
+            canvas().fill(area, *ink);
+        }
+    }
+
+    std::shared_ptr<DeviceContext> dc;
+
+private:
+    std::optional<Drawing> drawing;
+};
+
+QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
+    QPolygon result;
+    result.reserve(count);
+    for (int i = 0; i < count; ++i) {
+        result << mapping.toPixel(pointOf(points[i]));
+    }
+    return result;
+}
+
+} // namespace
+
+// Lines
+
+BOOL CDC::LineTo(int x, int y) {
+    const CPoint from = GetCurrentPosition();
+    const POINT points[] = {from, {x, y}};
+    if (!Polyline(points, 2)) {
+        return FALSE;
+    }
+    MoveTo(x, y);
+    return TRUE;
+}
+
+BOOL CDC::LineTo(POINT point) {
+    return LineTo(point.x, point.y);
+}
+
+BOOL CDC::Polyline(const POINT* points, int count) {
+    if (!points || count < 2) {
+        return FALSE;
+    }
+    Shape shape(m_hDC);
+    if (shape.visible()) {
+        Outline(*shape.dc, shape.canvas()).line(devicePoints(shape.mapping(), points, count));
+    }
+    return shape.valid();
+}
+
+BOOL CDC::PolylineTo(const POINT* points, int count) {
+    if (!points || count < 1) {
+        return FALSE;
+    }
+    std::vector<POINT> all = {GetCurrentPosition()};
+    all.insert(all.end(), points, points + count);
+    if (!Polyline(all.data(), count + 1)) {
+        return FALSE;
+    }
+    MoveTo(points[count - 1]);
+    return TRUE;
+}
+
+// Rectangles and ellipses
+
+namespace {
+
+/// Pixels of a rectangular shape's box in which its outline and filling go. Without an outline the right and bottom
+/// pixels stay free, as with it they belong to the outline.
+QRect shapeBox(const Shape& shape, const RECT& rect) {
+    const QRect box = shape.mapping().toPixels(rect);
+    return shape.dc->penInk() ? box : box.adjusted(0, 0, -1, -1);
+}
+
+/// Shapes larger than this are drawn as polygons: going through all of their rows and pixels, of which few can be seen,
+/// would take too long.
+constexpr int kLargestByPixels = 1 << 14;
+
+bool isLarge(const QRect& box) {
+    return std::max(box.width(), box.height()) > kLargestByPixels;
+}
+
+QPolygon roundedPolygon(const QRect& box, QSize corner) {
+    QPainterPath path;
+    path.addRoundedRect(QRectF(box.topLeft(), box.bottomRight()), corner.width() / 2.0, corner.height() / 2.0);
+    QPolygon polygon = path.toFillPolygon().toPolygon();
+    polygon.removeLast(); // the first one again
+    return polygon;
+}
+
+void drawRounded(Shape& shape, const QRect& box, QSize corner) {
+    const Spans rows = roundRectSpans(box, corner);
+    shape.fill(rows);
+    Outline(*shape.dc, shape.canvas()).rounded(box, corner, rows);
+}
+
+void drawLargeRounded(Shape& shape, const QRect& box, QSize corner) {
+    const QPolygon polygon = roundedPolygon(box, corner);
+    const std::array polygons = {QPolygonF(polygon)};
+    shape.fill(polygonSpans(polygons, FillRule::winding, shape.canvas().bounds()));
+    Outline(*shape.dc, shape.canvas()).closed(polygon);
+}
+
+void drawRectangle(Shape& shape, const QRect& box) {
+    shape.fill(box);
+    Outline(*shape.dc, shape.canvas()).rectangle(box);
+}
+
+BOOL drawRounded(HDC handle, const RECT& rect, QSize corner) {
+    Shape shape(handle);
+    if (!shape.visible()) {
+        return shape.valid();
+    }
+    const QRect box = shapeBox(shape, rect);
+    if (box.isEmpty()) {
+        return TRUE;
+    }
+    if (corner.isEmpty()) {
+        drawRectangle(shape, box);
+    } else if (isLarge(box)) {
+        drawLargeRounded(shape, box, corner);
+    } else {
+        drawRounded(shape, box, corner);
+    }
+    return TRUE;
+}
+
+} // namespace
+
+BOOL CDC::Rectangle(int left, int top, int right, int bottom) {
+    return drawRounded(m_hDC, {left, top, right, bottom}, {});
+}
+
+BOOL CDC::Rectangle(const RECT* rect) {
+    return rect ? drawRounded(m_hDC, *rect, {}) : FALSE;
+}
+
+BOOL CDC::RoundRect(int left, int top, int right, int bottom, int cornerWidth, int cornerHeight) {
+    const auto dc = findContext(m_hDC);
+    return dc &&
+           drawRounded(m_hDC, {left, top, right, bottom}, dc->state.mapping.sizeToDevice({cornerWidth, cornerHeight}));
+}
+
+BOOL CDC::RoundRect(const RECT* rect, POINT corner) {
+    return rect ? RoundRect(rect->left, rect->top, rect->right, rect->bottom, corner.x, corner.y) : FALSE;
+}
+
+BOOL CDC::Ellipse(int left, int top, int right, int bottom) {
+    const auto dc = findContext(m_hDC);
+    const RECT rect = {left, top, right, bottom};
+    return dc && drawRounded(m_hDC, rect, dc->state.mapping.toPixels(rect).size());
+}
+
+BOOL CDC::Ellipse(const RECT* rect) {
+    return rect ? Ellipse(rect->left, rect->top, rect->right, rect->bottom) : FALSE;
+}
+
+// Parts of ellipses
+
+namespace {
+
+enum class ArcShape { arc, pie, chord };
+
+/// A stretch of an ellipse's outline, found by the directions from its centre to two points.
+class ArcPixels {
+public:
+    ArcPixels(const QRect& box, QPoint start, QPoint end, int direction)
+        : box_(box),
+          counterClockwise_(direction == AD_COUNTERCLOCKWISE),
+          start_(angle(start)),
+          sweep_(turn(start_, angle(end))) {
+        if (sweep_ == 0) {
+            sweep_ = 2 * std::numbers::pi;
+        }
+    }
+
+    /// The pixels in drawing order, from start to end.
+    [[nodiscard]] QPolygon pixels() const {
+        if (isLarge(box_)) {
+            return corners();
+        }
+        std::vector<QPoint> all = outlineOf(ellipseSpans(box_));
+        std::erase_if(all, [&](QPoint point) { return turn(start_, angle(point)) > sweep_; });
+        std::ranges::sort(all, {}, [&](QPoint point) { return turn(start_, angle(point)); });
+        return QPolygon(QList<QPoint>(all.begin(), all.end()));
+    }
+    [[nodiscard]] QPoint centre() const {
+        return box_.center();
+    }
+
+private:
+    /// Corners of a polygon that stands for a large ellipse's pixels.
+    [[nodiscard]] QPolygon corners() const {
+        constexpr int kCorners = 4096;
+        QPolygon result;
+        for (int i = 0; i <= kCorners; ++i) {
+            const double direction = start_ + (counterClockwise_ ? -1 : 1) * sweep_ * i / kCorners;
+            const double x = box_.left() + (box_.width() - 1) * (1 + std::cos(direction)) / 2;
+            const double y = box_.top() + (box_.height() - 1) * (1 + std::sin(direction)) / 2;
+            result << QPoint(static_cast<int>(std::lround(x)), static_cast<int>(std::lround(y)));
+        }
+        return result;
+    }
+    /// Direction of a point in a picture where the ellipse is a circle: 0 right, growing clockwise.
+    [[nodiscard]] double angle(QPoint point) const {
+        const double x = 2.0 * (point.x() - box_.left()) + 1 - box_.width();
+        const double y = 2.0 * (point.y() - box_.top()) + 1 - box_.height();
+        return std::atan2(y / box_.height(), x / box_.width());
+    }
+    /// How far it is from one direction to another, in the direction of drawing: 0 .. 2 pi.
+    [[nodiscard]] double turn(double from, double to) const {
+        const double turned = counterClockwise_ ? from - to : to - from;
+        return turned < 0 ? turned + 2 * std::numbers::pi : turned;
+    }
+
+    QRect box_;
+    bool counterClockwise_;
+    double start_;
+    double sweep_;
+};
+
+/// A polygon over pixels is filled as the area between the pixels' centres; its outline covers the rest.
+Spans areaOf(const QPolygon& corners, FillRule rule, const QRect& bounds) {
+    const std::array polygons = {QPolygonF(corners)};
+    return polygonSpans(polygons, rule, bounds);
+}
+
+BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, ArcShape kind) {
+    Shape shape(handle);
+    if (!shape.visible()) {
+        return shape.valid();
+    }
+    const QRect box = shape.mapping().toPixels(rect);
+    if (box.isEmpty()) {
+        return TRUE;
+    }
+    const ArcPixels arc(box, shape.mapping().toPixel(pointOf(rays[0])), shape.mapping().toPixel(pointOf(rays[1])),
+                        shape.dc->state.arcDirection);
+    QPolygon outline = arc.pixels();
+    if (kind == ArcShape::pie) {
+        outline << arc.centre();
+    }
+    if (kind != ArcShape::arc) {
+        shape.fill(areaOf(outline, FillRule::winding, shape.canvas().bounds()));
+    }
+    Outline pen(*shape.dc, shape.canvas());
+    if (kind == ArcShape::arc) {
+        pen.line(outline, Outline::LastPoint::drawn);
+    } else {
+        pen.closed(outline);
+    }
+    return TRUE;
+}
+
+} // namespace
+
+BOOL CDC::Arc(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::arc);
+}
+
+BOOL CDC::Arc(const RECT* rect, POINT start, POINT end) {
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::arc) : FALSE;
+}
+
+BOOL CDC::Pie(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::pie);
+}
+
+BOOL CDC::Pie(const RECT* rect, POINT start, POINT end) {
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::pie) : FALSE;
+}
+
+BOOL CDC::Chord(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::chord);
+}
+
+BOOL CDC::Chord(const RECT* rect, POINT start, POINT end) {
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::chord) : FALSE;
+}
+
+// Polygons
+
+BOOL CDC::Polygon(const POINT* points, int count) {
+    return PolyPolygon(points, &count, 1);
+}
+
+BOOL CDC::PolyPolygon(const POINT* points, const int* counts, int count) {
+    if (!points || !counts || count < 1 ||
+        std::any_of(counts, counts + count, [](int corners) { return corners < 2; })) {
+        return FALSE;
+    }
+    Shape shape(m_hDC);
+    if (!shape.visible()) {
+        return shape.valid();
+    }
+    std::vector<QPolygonF> areas;
+    std::vector<QPolygon> outlines;
+    for (int i = 0; i < count; points += counts[i++]) {
+        outlines.push_back(devicePoints(shape.mapping(), points, counts[i]));
+        areas.emplace_back(outlines.back());
+    }
+    const FillRule rule = shape.dc->state.polyFillMode == WINDING ? FillRule::winding : FillRule::alternate;
+    shape.fill(polygonSpans(areas, rule, shape.canvas().bounds()));
+    Outline pen(*shape.dc, shape.canvas());
+    for (const QPolygon& outline : outlines) {
+        pen.closed(outline);
+    }
+    return TRUE;
+}

@@ -1,0 +1,189 @@
+#include "platform/afx/gdi/detail/DeviceContext.h"
+
+#include <algorithm>
+#include <array>
+
+namespace tvx::afx {
+
+namespace {
+
+constexpr std::uint32_t kContextTag = 2;
+
+HandleTable<DeviceContext>& contexts() {
+    // Never destroyed, like the tools.
+    static auto& table = *new HandleTable<DeviceContext>(kContextTag);
+    return table;
+}
+
+} // namespace
+
+bool MemoryTarget::open(Canvas& canvas) {
+    canvas.image = &bitmap->image;
+    canvas.origin = {};
+    canvas.clip = bitmap->image.rect();
+    canvas.format = bitmap->format;
+    return true;
+}
+
+QSize MemoryTarget::size() const {
+    return bitmap->image.size();
+}
+
+PixelFormat MemoryTarget::format() const {
+    return bitmap->format;
+}
+
+Tool<BitmapObject> MemoryTarget::select(Tool<BitmapObject> next) {
+    std::swap(bitmap, next);
+    return next;
+}
+
+QSize ScreenTarget::size() const {
+    return {GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN)};
+}
+
+DeviceContext::DeviceContext(DcKind kind, std::unique_ptr<DrawTarget> target) : kind(kind), target(std::move(target)) {
+    state.pen = stockTool<PenObject>(BLACK_PEN);
+    state.brush = stockTool<BrushObject>(WHITE_BRUSH);
+    state.font = stockTool<FontObject>(SYSTEM_FONT);
+}
+
+DeviceContext::~DeviceContext() {
+    if (MemoryTarget* own = memory()) {
+        own->bitmap->selectedInto = nullptr;
+    }
+}
+
+MemoryTarget* DeviceContext::memory() const {
+    return kind == DcKind::memory ? static_cast<MemoryTarget*>(target.get()) : nullptr;
+}
+
+std::shared_ptr<const RealizedFont> DeviceContext::font() const {
+    LOGFONTA device = state.font->description;
+    const QSize size = state.mapping.sizeToDevice({std::abs(device.lfWidth), std::abs(device.lfHeight)});
+    if (device.lfHeight != 0) {
+        device.lfHeight = device.lfHeight < 0 ? -std::max(1, size.height()) : std::max(1, size.height());
+    }
+    device.lfWidth = size.width();
+    return realizeFont(device);
+}
+
+Ink DeviceContext::ink(COLORREF color, Rop2 rop) const {
+    return {nearest(pixelOf(color), target->format()), rop, nullptr, {}};
+}
+
+std::optional<Ink> DeviceContext::penInk() const {
+    const LOGPEN& pen = state.pen->description;
+    if (pen.lopnStyle == PS_NULL) {
+        return std::nullopt;
+    }
+    return ink(pen.lopnColor, rop2FromCode(state.rop2));
+}
+
+std::optional<Ink> DeviceContext::brushInk(QImage& pattern) const {
+    return brushInk(*state.brush, rop2FromCode(state.rop2), pattern);
+}
+
+namespace {
+
+constexpr int kHatchSize = 8;
+
+bool onHatchLine(int hatch, int x, int y) {
+    const bool horizontal = y == 3;
+    const bool vertical = x == 4;
+    const bool falling = x == y;
+    const bool rising = x + y == kHatchSize - 1;
+    switch (hatch) {
+    case HS_HORIZONTAL:
+        return horizontal;
+    case HS_VERTICAL:
+        return vertical;
+    case HS_FDIAGONAL:
+        return falling;
+    case HS_BDIAGONAL:
+        return rising;
+    case HS_CROSS:
+        return horizontal || vertical;
+    default:
+        return falling || rising;
+    }
+}
+
+QImage hatchImage(int hatch, Pixel line, Pixel between) {
+    QImage image(kHatchSize, kHatchSize, QImage::Format_ARGB32);
+    for (int y = 0; y < kHatchSize; ++y) {
+        for (int x = 0; x < kHatchSize; ++x) {
+            reinterpret_cast<Pixel*>(image.scanLine(y))[x] = onHatchLine(hatch, x, y) ? line : between;
+        }
+    }
+    return image;
+}
+
+QImage recolored(const QImage& image, Pixel black, Pixel white) {
+    QImage result = image.copy();
+    for (int y = 0; y < result.height(); ++y) {
+        auto* row = reinterpret_cast<Pixel*>(result.scanLine(y));
+        std::transform(row, row + result.width(), row,
+                       [&](Pixel pixel) { return pixel == kWhitePixel ? white : black; });
+    }
+    return result;
+}
+
+} // namespace
+
+std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, QImage& pattern) const {
+    const LOGBRUSH& description = brush.description;
+    if (description.lbStyle == BS_NULL) {
+        return std::nullopt;
+    }
+    const COLORREF color = brush.systemColor >= 0 ? GetSysColor(brush.systemColor) : description.lbColor;
+    Ink result = ink(color, rop);
+    if (description.lbStyle == BS_SOLID) {
+        return result;
+    }
+    const Pixel back = ink(state.backColor).color;
+    if (description.lbStyle == BS_HATCHED) {
+        pattern = hatchImage(static_cast<int>(description.lbHatch), result.color, state.backMode == OPAQUE ? back : 0);
+    } else if (brush.patternFormat == PixelFormat::monochrome) {
+        pattern = recolored(brush.pattern, ink(state.textColor).color, back);
+    } else {
+        pattern = brush.pattern;
+    }
+    result.pattern = &pattern;
+    result.patternOrigin = state.brushOrigin;
+    return result;
+}
+
+HDC addContext(std::shared_ptr<DeviceContext> context) {
+    return reinterpret_cast<HDC>(contexts().add(std::move(context)));
+}
+
+std::shared_ptr<DeviceContext> findContext(HDC dc) {
+    return contexts().find(reinterpret_cast<std::uintptr_t>(dc));
+}
+
+bool removeContext(HDC dc) {
+    const auto context = contexts().take(reinterpret_cast<std::uintptr_t>(dc));
+    if (context) {
+        context->target->release();
+    }
+    return context != nullptr;
+}
+
+std::size_t contextCount() {
+    return contexts().size();
+}
+
+Drawing::Drawing(DeviceContext& context) : context_(context), open_(context.target->open(canvas)) {
+    if (open_ && context.state.clip) {
+        canvas.clip &= *context.state.clip;
+    }
+}
+
+Drawing::~Drawing() {
+    if (open_) {
+        context_.target->close(canvas.touched());
+    }
+}
+
+} // namespace tvx::afx

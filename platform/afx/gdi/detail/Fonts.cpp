@@ -1,0 +1,196 @@
+#include "platform/afx/gdi/detail/Fonts.h"
+
+#include "platform/afx/gdi/detail/Mapping.h"
+#include "platform/afx/toolkit/detail/Gui.h"
+#include "platform/base/Text.h"
+
+#include <QFontDatabase>
+#include <QGuiApplication>
+
+#include <algorithm>
+#include <array>
+#include <cstring>
+#include <map>
+#include <string>
+#include <tuple>
+
+namespace tvx::afx {
+
+namespace {
+
+/// Families in order of preference; the first one that is installed is taken.
+using Choices = std::array<const char*, 3>;
+
+/// For labels and dialogs. At 8 points the condensed face has the average width (6) and height (13) that dialog
+/// templates were laid out for; the normal one is a fifth wider, so that texts would be cut.
+constexpr Choices kInterface = {"DejaVu Sans Condensed", "DejaVu Sans", "Noto Sans"};
+/// For documents: faces with the same advances as the ones named, then any of the kind.
+constexpr Choices kSans = {"Liberation Sans", "Nimbus Sans", "DejaVu Sans"};
+constexpr Choices kSerif = {"Liberation Serif", "Nimbus Roman", "DejaVu Serif"};
+/// Terminal faces had drawn pixels and no outlines; of the fixed ones this one is the most legible at small sizes.
+constexpr Choices kFixed = {"DejaVu Sans Mono", "Liberation Mono", "Nimbus Mono PS"};
+constexpr Choices kTypewriter = {"Liberation Mono", "DejaVu Sans Mono", "Nimbus Mono PS"};
+
+struct Substitute {
+    std::string_view face;
+    const Choices& choices;
+};
+
+const Substitute kSubstitutes[] = {
+    {"MS Sans Serif", kInterface},
+    {"MS Shell Dlg", kInterface},
+    {"MS Shell Dlg 2", kInterface},
+    {"Microsoft Sans Serif", kInterface},
+    {"System", kInterface},
+    {"Tahoma", kInterface},
+    {"Helv", kInterface},
+    {"Arial", kSans},
+    {"Helvetica", kSans},
+    {"Times New Roman", kSerif},
+    {"Times", kSerif},
+    {"Tms Rmn", kSerif},
+    {"MS Serif", kSerif},
+    {"Courier", kFixed},
+    {"FixedSys", kFixed},
+    {"Terminal", kFixed},
+    {"Courier New", kTypewriter},
+};
+
+QString firstInstalled(const Choices& choices) {
+    for (const char* family : choices) {
+        if (QFontDatabase::hasFamily(QString::fromLatin1(family))) {
+            return QString::fromLatin1(family);
+        }
+    }
+    return QGuiApplication::font().family();
+}
+
+const Choices& choicesByFamily(BYTE pitchAndFamily) {
+    if ((pitchAndFamily & 0xF0) == FF_MODERN || (pitchAndFamily & 3) == FIXED_PITCH) {
+        return kFixed;
+    }
+    return (pitchAndFamily & 0xF0) == FF_ROMAN ? kSerif : kInterface;
+}
+
+std::string_view faceName(const LOGFONTA& description) {
+    return {description.lfFaceName, strnlen(description.lfFaceName, LF_FACESIZE)};
+}
+
+} // namespace
+
+QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
+    QString wanted = QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
+    if (!faceName.empty() && QFontDatabase::hasFamily(wanted)) {
+        return wanted;
+    }
+    const auto* found = std::ranges::find_if(
+        kSubstitutes, [&](const Substitute& substitute) { return text::equalNoCase(substitute.face, faceName); });
+    return firstInstalled(found != std::end(kSubstitutes) ? found->choices : choicesByFamily(pitchAndFamily));
+}
+
+namespace {
+
+/// Cell height in pixels that a description without a height gets.
+constexpr int kDefaultCellHeight = 16;
+constexpr int kLargestHeight = 4096;
+
+/// The largest em size whose characters fit cells of `cellHeight`.
+void fitCell(QFont& font, int cellHeight) {
+    int size = cellHeight;
+    font.setPixelSize(size);
+    while (size > 1 && QFontMetrics(font).height() > cellHeight) {
+        font.setPixelSize(--size);
+    }
+}
+
+void setHeight(QFont& font, int height) {
+    height = std::clamp(height, -kLargestHeight, kLargestHeight);
+    if (height < 0) {
+        font.setPixelSize(-height);
+    } else {
+        fitCell(font, height == 0 ? kDefaultCellHeight : height);
+    }
+}
+
+QFont::Weight weightOf(LONG weight) {
+    if (weight <= 0) {
+        return QFont::Normal;
+    }
+    return static_cast<QFont::Weight>(std::clamp<LONG>(weight, QFont::Thin, QFont::Black));
+}
+
+/// Stretches the face until its average character has the width asked for.
+void setWidth(QFont& font, int width) {
+    const int natural = QFontMetrics(font).averageCharWidth();
+    if (width != 0 && natural > 0) {
+        font.setStretch(std::clamp(scaled(std::abs(width), 100, natural), 1, 4000));
+    }
+}
+
+QFont::StyleStrategy styleStrategy(BYTE quality) {
+    // Subpixel rendering follows the desktop's settings; pixels are to be the same on every machine. Scripts that can
+    // do without shaping do without: a ligature is drawn otherwise than its characters one by one.
+    const int edges = quality == NONANTIALIASED_QUALITY ? QFont::NoAntialias : QFont::NoSubpixelAntialias;
+    return static_cast<QFont::StyleStrategy>(edges | QFont::PreferNoShaping);
+}
+
+QFont makeFont(const LOGFONTA& description) {
+    QFont font(familyFor(faceName(description), description.lfPitchAndFamily));
+    font.setStyleStrategy(styleStrategy(description.lfQuality));
+    font.setHintingPreference(QFont::PreferFullHinting);
+    font.setKerning(false);
+    font.setWeight(weightOf(description.lfWeight));
+    font.setItalic(description.lfItalic != 0);
+    font.setUnderline(description.lfUnderline != 0);
+    font.setStrikeOut(description.lfStrikeOut != 0);
+    setHeight(font, description.lfHeight);
+    setWidth(font, description.lfWidth);
+    return font;
+}
+
+using FontKey = std::tuple<int, int, int, int, bool, bool, bool, BYTE, BYTE, std::string>;
+
+FontKey keyOf(const LOGFONTA& font) {
+    return {font.lfHeight,         font.lfWidth,
+            font.lfEscapement,     font.lfWeight,
+            font.lfItalic != 0,    font.lfUnderline != 0,
+            font.lfStrikeOut != 0, font.lfQuality,
+            font.lfPitchAndFamily, std::string(faceName(font))};
+}
+
+} // namespace
+
+std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
+    // Fonts must not outlive the connection to the desktop; a host has few different ones.
+    static std::map<FontKey, std::shared_ptr<const RealizedFont>> fonts;
+    if (!ensureGui()) {
+        return nullptr;
+    }
+    static const auto cleared = QObject::connect(qGuiApp, &QObject::destroyed, [] { fonts.clear(); });
+    constexpr std::size_t kMostFonts = 256;
+    if (fonts.size() > kMostFonts) {
+        fonts.clear();
+    }
+    auto& kept = fonts[keyOf(description)];
+    if (!kept) {
+        auto font = std::make_shared<RealizedFont>(makeFont(description));
+        font->angle = (description.lfEscapement % 3600) / 10.0;
+        kept = std::move(font);
+    }
+    return kept;
+}
+
+QFont controlFont(const LOGFONTA& description) {
+    return makeFont(description);
+}
+
+LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
+    LOGFONTA font{};
+    font.lfHeight = -scaled(tenthsOfPoint, kPixelsPerInch, 720);
+    font.lfCharSet = DEFAULT_CHARSET;
+    const std::size_t length = text::characterStart(faceName, std::min<std::size_t>(faceName.size(), LF_FACESIZE - 1));
+    std::memcpy(font.lfFaceName, faceName.data(), length);
+    return font;
+}
+
+} // namespace tvx::afx

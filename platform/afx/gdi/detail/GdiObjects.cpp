@@ -1,0 +1,74 @@
+#include "platform/afx/gdi/detail/GdiObjects.h"
+
+#include <algorithm>
+#include <array>
+#include <utility>
+
+namespace tvx::afx {
+
+namespace {
+
+constexpr std::uint32_t kObjectTag = 1;
+constexpr std::uint32_t kIconTag = 3;
+/// More pixels than this are refused: 1 GiB.
+constexpr std::int64_t kMostPixels = std::int64_t{1} << 28;
+
+} // namespace
+
+HandleTable<GdiObject>& gdiObjects() {
+    // Never destroyed: static objects of hosts still hold tools when the process ends.
+    static auto& table = *new HandleTable<GdiObject>(kObjectTag);
+    return table;
+}
+
+DWORD GdiObject::type() const {
+    constexpr std::array<DWORD, 5> types = {OBJ_PEN, OBJ_BRUSH, OBJ_FONT, OBJ_BITMAP, OBJ_REGION};
+    return types[value.index()];
+}
+
+HBITMAP addBitmap(int width, int height, PixelFormat format) {
+    if (width <= 0 || height <= 0 || std::int64_t{width} * height > kMostPixels) {
+        return nullptr;
+    }
+    QImage image(width, height, QImage::Format_RGB32);
+    image.fill(Qt::black);
+    return addBitmap(image, format);
+}
+
+HBITMAP addBitmap(const QImage& image, PixelFormat format) {
+    // The pixels may be the caller's own memory, and their unused byte anything.
+    QImage pixels = image.format() == QImage::Format_RGB32 ? image.copy() : image.convertToFormat(QImage::Format_RGB32);
+    if (pixels.isNull()) {
+        return nullptr;
+    }
+    for (int y = 0; y < pixels.height(); ++y) {
+        auto* row = reinterpret_cast<Pixel*>(pixels.scanLine(y));
+        std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | kOpaque; });
+    }
+    return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(pixels), format, nullptr}));
+}
+
+QImage bitmapImage(HBITMAP bitmap) {
+    const auto tool = findTool<BitmapObject>(bitmap);
+    return tool ? tool->image.copy() : QImage();
+}
+
+HandleTable<IconObject>& icons() {
+    static auto& table = *new HandleTable<IconObject>(kIconTag);
+    return table;
+}
+
+HICON addIcon(const QImage& image, QPoint hotSpot) {
+    if (image.isNull()) {
+        return nullptr;
+    }
+    auto icon = std::make_shared<IconObject>(IconObject{image.convertToFormat(QImage::Format_ARGB32), hotSpot});
+    return reinterpret_cast<HICON>(icons().add(std::move(icon)));
+}
+
+QImage iconImage(HICON icon) {
+    const auto object = icons().find(reinterpret_cast<std::uintptr_t>(icon));
+    return object ? object->image : QImage();
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,147 @@
+#include "platform/afx/gdi/detail/Mapping.h"
+
+#include "platform/afx/gdi/GdiTypes.h"
+
+#include <algorithm>
+#include <cstdlib>
+
+namespace tvx::afx {
+
+int scaled(std::int64_t value, int by, int per) {
+    if (by == per) {
+        return saturated(value);
+    }
+    __extension__ using Wide = __int128;
+    const Wide sign = per < 0 ? -1 : 1;
+    const Wide numerator = sign * (Wide{2} * value * by + per);
+    const Wide denominator = sign * 2 * per;
+    Wide quotient = numerator / denominator;
+    if (numerator % denominator < 0) {
+        --quotient;
+    }
+    return static_cast<int>(std::clamp<Wide>(quotient, INT_MIN, INT_MAX));
+}
+
+namespace {
+
+/// Logical units to an inch of the modes with fixed extents.
+int unitsPerInch(int mode) {
+    switch (mode) {
+    case MM_LOMETRIC:
+        return 254;
+    case MM_HIMETRIC:
+        return 2540;
+    case MM_LOENGLISH:
+        return 100;
+    case MM_HIENGLISH:
+        return 1000;
+    case MM_TWIPS:
+        return 1440;
+    default:
+        return 0;
+    }
+}
+
+} // namespace
+
+bool Mapping::hasFreeExtents() const {
+    return mode_ == MM_ISOTROPIC || mode_ == MM_ANISOTROPIC;
+}
+
+bool Mapping::setMode(int mode) {
+    if (mode < MM_TEXT || mode > MM_ANISOTROPIC) {
+        return false;
+    }
+    const int units = unitsPerInch(mode == MM_ISOTROPIC ? MM_LOMETRIC : mode);
+    if (units != 0) {
+        windowExtent_ = {units, units};
+        viewportExtent_ = {kPixelsPerInch, -kPixelsPerInch};
+    } else if (mode == MM_TEXT) {
+        windowExtent_ = viewportExtent_ = {1, 1};
+    }
+    mode_ = mode;
+    return true;
+}
+
+bool Mapping::setWindowExtent(QSize extent) {
+    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
+        return false;
+    }
+    windowExtent_ = extent;
+    keepIsotropic();
+    return true;
+}
+
+bool Mapping::setViewportExtent(QSize extent) {
+    if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
+        return false;
+    }
+    viewportExtent_ = extent;
+    keepIsotropic();
+    return true;
+}
+
+void Mapping::keepIsotropic() {
+    if (mode_ != MM_ISOTROPIC) {
+        return;
+    }
+    const std::int64_t width = std::abs(std::int64_t{viewportExtent_.width()});
+    const std::int64_t height = std::abs(std::int64_t{viewportExtent_.height()});
+    const int unitsWide = std::abs(windowExtent_.width());
+    const int unitsHigh = std::abs(windowExtent_.height());
+    const auto signedLike = [](int value, int sign) { return sign < 0 ? -value : value; };
+    // A pixel stands for as many units down as across: the extent with pixels to spare gives them up.
+    if (width * unitsHigh > height * unitsWide) {
+        viewportExtent_.setWidth(
+            signedLike(std::max(1, scaled(height, unitsWide, unitsHigh)), viewportExtent_.width()));
+    } else {
+        viewportExtent_.setHeight(
+            signedLike(std::max(1, scaled(width, unitsHigh, unitsWide)), viewportExtent_.height()));
+    }
+}
+
+namespace {
+
+int converted(int value, int fromOrigin, int by, int per, int toOrigin) {
+    const std::int64_t distance = std::int64_t{value} - fromOrigin;
+    return saturated(std::int64_t{scaled(distance, by, per)} + toOrigin);
+}
+
+} // namespace
+
+QPoint Mapping::toDevice(QPoint logical) const {
+    return {
+        converted(logical.x(), windowOrigin.x(), viewportExtent_.width(), windowExtent_.width(), viewportOrigin.x()),
+        converted(logical.y(), windowOrigin.y(), viewportExtent_.height(), windowExtent_.height(), viewportOrigin.y())};
+}
+
+QPoint Mapping::toLogical(QPoint device) const {
+    return {
+        converted(device.x(), viewportOrigin.x(), windowExtent_.width(), viewportExtent_.width(), windowOrigin.x()),
+        converted(device.y(), viewportOrigin.y(), windowExtent_.height(), viewportExtent_.height(), windowOrigin.y())};
+}
+
+QPoint Mapping::toPixel(QPoint logical) const {
+    const QPoint device = toDevice(logical);
+    return {std::clamp(device.x(), -kFarthestPixel, kFarthestPixel),
+            std::clamp(device.y(), -kFarthestPixel, kFarthestPixel)};
+}
+
+QRect Mapping::toPixels(const RECT& logical) const {
+    const QPoint first = toPixel(QPoint(logical.left, logical.top));
+    const QPoint second = toPixel(QPoint(logical.right, logical.bottom));
+    const QPoint corner(std::min(first.x(), second.x()), std::min(first.y(), second.y()));
+    return {corner, QSize(std::abs(second.x() - first.x()), std::abs(second.y() - first.y()))};
+}
+
+QSize Mapping::sizeToDevice(QSize logical) const {
+    return {std::abs(scaled(logical.width(), viewportExtent_.width(), windowExtent_.width())),
+            std::abs(scaled(logical.height(), viewportExtent_.height(), windowExtent_.height()))};
+}
+
+QSize Mapping::sizeToLogical(QSize device) const {
+    return {std::abs(scaled(device.width(), windowExtent_.width(), viewportExtent_.width())),
+            std::abs(scaled(device.height(), windowExtent_.height(), viewportExtent_.height()))};
+}
+
+} // namespace tvx::afx

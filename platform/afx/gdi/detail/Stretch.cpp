@@ -1,0 +1,114 @@
+#include "platform/afx/gdi/detail/Stretch.h"
+
+#include "platform/afx/gdi/GdiTypes.h"
+#include "platform/afx/gdi/detail/RasterOps.h"
+
+#include <algorithm>
+#include <cstdint>
+
+namespace tvx::afx {
+
+StretchAxis::Range StretchAxis::sources(int index) const {
+    const std::int64_t place = mirrored ? to - 1 - index : index;
+    const auto first = static_cast<int>(place * from / to);
+    const auto last = static_cast<int>(((place + 1) * from - 1) / to);
+    return {first, std::max(first, to >= from ? first : last)};
+}
+
+int StretchAxis::middle(int index) const {
+    const std::int64_t place = mirrored ? to - 1 - index : index;
+    return static_cast<int>((2 * place + 1) * from / (2 * std::int64_t{to}));
+}
+
+StretchAxis::Range StretchAxis::targets(int first, int last) const {
+    const auto left = static_cast<int>((std::int64_t{first} * to + from - 1) / from);
+    const auto right = static_cast<int>(((std::int64_t{last} + 1) * to + from - 1) / from - 1);
+    return mirrored ? Range{to - 1 - right, to - 1 - left} : Range{left, right};
+}
+
+namespace {
+
+/// The pixels of a part of a source, by their places in the whole.
+class PartReader {
+public:
+    PartReader(const QImage& part, QPoint offset) : part_(part), area_(offset, part.size()) {}
+    [[nodiscard]] Pixel at(int x, int y) const {
+        const int column = std::clamp(x, area_.left(), area_.right()) - area_.left();
+        const int row = std::clamp(y, area_.top(), area_.bottom()) - area_.top();
+        return reinterpret_cast<const Pixel*>(part_.constScanLine(row))[column];
+    }
+
+private:
+    const QImage& part_;
+    QRect area_;
+};
+
+/// Makes one pixel out of several.
+class PixelSum {
+public:
+    explicit PixelSum(int mode) : mode_(mode) {}
+    void add(Pixel pixel) {
+        all_ &= pixel;
+        any_ |= pixel;
+        for (int channel = 0; channel < 3; ++channel) {
+            sums_[channel] += (pixel >> (8 * channel)) & 0xFF;
+        }
+        ++count_;
+    }
+    [[nodiscard]] Pixel result() const {
+        if (mode_ == BLACKONWHITE) {
+            return kOpaque | all_;
+        }
+        if (mode_ == WHITEONBLACK) {
+            return kOpaque | any_;
+        }
+        Pixel mean = kOpaque;
+        for (int channel = 0; channel < 3; ++channel) {
+            mean |= static_cast<Pixel>((sums_[channel] + count_ / 2) / count_) << (8 * channel);
+        }
+        return mean;
+    }
+
+private:
+    int mode_;
+    Pixel all_ = kWhitePixel;
+    Pixel any_ = 0;
+    std::uint64_t sums_[3] = {};
+    std::uint64_t count_ = 0;
+};
+
+Pixel combinedPixel(const PartReader& reader, StretchAxis::Range columns, StretchAxis::Range rows, int mode) {
+    PixelSum sum(mode);
+    for (int y = rows.first; y <= rows.last; ++y) {
+        for (int x = columns.first; x <= columns.last; ++x) {
+            sum.add(reader.at(x, y));
+        }
+    }
+    return sum.result();
+}
+
+} // namespace
+
+QRect Stretch::placeOf(const QRect& part) const {
+    const StretchAxis::Range columns = across.targets(part.left(), part.right());
+    const StretchAxis::Range rows = down.targets(part.top(), part.bottom());
+    return {QPoint(columns.first, rows.first), QPoint(columns.last, rows.last)};
+}
+
+QImage Stretch::apply(const QImage& part, QPoint offset) const {
+    const QRect place = placeOf(QRect(offset, part.size()));
+    QImage result(place.size(), QImage::Format_RGB32);
+    const PartReader reader(part, offset);
+    for (int y = 0; y < result.height(); ++y) {
+        auto* row = reinterpret_cast<Pixel*>(result.scanLine(y));
+        for (int x = 0; x < result.width(); ++x) {
+            const int column = place.left() + x;
+            const int line = place.top() + y;
+            row[x] = mode == COLORONCOLOR ? reader.at(across.middle(column), down.middle(line))
+                                          : combinedPixel(reader, across.sources(column), down.sources(line), mode);
+        }
+    }
+    return result;
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,131 @@
+#include "platform/afx/toolkit/detail/Gui.h"
+
+#include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/HandleWatches.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/MessageQueue.h"
+#include "platform/win/Display.h"
+#include "platform/win/Module.h"
+#include "platform/win/ResourceConstants.h"
+#include "platform/win/Thread.h"
+#include "platform/win/detail/LanguageTable.h"
+
+#include <QAbstractEventDispatcher>
+#include <QApplication>
+#include <QLibraryInfo>
+#include <QLocale>
+#include <QThread>
+#include <QTranslator>
+
+#include <clocale>
+#include <cstdio>
+#include <cstdlib>
+#include <cxxabi.h>
+#include <utility>
+
+namespace tvx::afx {
+
+namespace {
+
+/// Sees every event once, with its deepest receiver, and turns it into messages. Event filters would see an ignored
+/// event again at every ancestor, and exceptions could not be caught in them.
+class GuiApplication : public QApplication {
+public:
+    GuiApplication(int& argc, char** argv) : QApplication(argc, argv) {}
+
+    bool notify(QObject* receiver, QEvent* event) override {
+        try {
+            bool result = true;
+            if (translateEvent(receiver, event, result)) {
+                return result;
+            }
+            return QApplication::notify(receiver, event);
+        } catch (abi::__forced_unwind&) {
+            throw;
+        } catch (...) {
+            ExceptionCarrier::store(std::current_exception());
+            return true;
+        }
+    }
+};
+
+DWORD threadOfWindows = 0;
+
+bool askDisplay() {
+    const char* plugin = std::getenv("QT_QPA_PLATFORM");
+    if (plugin && *plugin != '\0') {
+        return true;
+    }
+    const char* wayland = std::getenv("WAYLAND_DISPLAY");
+    return (wayland && *wayland != '\0') || canOpenDisplay();
+}
+
+/// The toolkit's own texts (menus of text fields, lists of files) in the user's language, where they are installed.
+void translateToolkit() {
+    const LCID locale = GetUserDefaultLCID();
+    const tvx::detail::Language* language = tvx::detail::languageOf(locale);
+    if (!language || PRIMARYLANGID(LANGIDFROMLCID(locale)) == LANG_ENGLISH) {
+        return;
+    }
+    auto* translator = new QTranslator(QCoreApplication::instance());
+    const QString folder = QLibraryInfo::path(QLibraryInfo::TranslationsPath);
+    if (translator->load(QLocale(QLatin1String(language->name)), QStringLiteral("qtbase"), QStringLiteral("_"),
+                         folder)) {
+        QCoreApplication::installTranslator(translator);
+    }
+}
+
+void makeApplication() {
+    static int argc = 1;
+    static std::string name = moduleFileName(nullptr);
+    static char* argv[] = {name.data(), nullptr};
+    auto* application = new GuiApplication(argc, argv);
+    threadOfWindows = GetCurrentThreadId();
+    QApplication::setQuitOnLastWindowClosed(false);
+    QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, application,
+                     &runIdle);
+    translateToolkit();
+    // The toolkit has taken the process's locale from the environment; numbers keep their point.
+    std::setlocale(LC_NUMERIC, "C");
+    MessageQueue::instance().moveToThread(application->thread());
+    watchReleasedChildren();
+}
+
+} // namespace
+
+DWORD guiThread() {
+    return threadOfWindows;
+}
+
+bool hasDisplay() {
+    static const bool answer = askDisplay();
+    return answer;
+}
+
+namespace {
+
+bool displayMissed = false;
+
+} // namespace
+
+void tellMissingDisplay() {
+    if (!std::exchange(displayMissed, true)) {
+        std::fputs("There is no display to show windows on: set DISPLAY to one that answers.\n", stderr);
+    }
+}
+
+bool wasDisplayMissed() {
+    return displayMissed;
+}
+
+bool ensureGui() {
+    if (!QCoreApplication::instance()) {
+        if (!hasDisplay()) {
+            return false;
+        }
+        makeApplication();
+    }
+    return true;
+}
+
+} // namespace tvx::afx

@@ -1,0 +1,510 @@
+#include <gtest/gtest.h>
+
+#include "platform/afx/controls/detail/EditWindow.h"
+#include "platform/afx/gdi/Dc.h"
+#include "platform/afx/gdi/Gdi.h"
+#include "tests/ui/afx/dialogs/DialogTesting.h"
+
+#include <QClipboard>
+#include <QPlainTextEdit>
+
+namespace {
+
+constexpr int controlId = 500;
+constexpr DWORD shown = WS_CHILD | WS_VISIBLE | WS_TABSTOP;
+
+/// A dialog that one control is put into and tried out in.
+template <class Control>
+class ControlTest : public testing::Test {
+protected:
+    /// Runs `use` with the control made and focused.
+    void with(DWORD style, const std::function<void()>& use) {
+        dialog.prepare = [&, style] { make(style); };
+        dialog.script = [&] {
+            control.SetFocus();
+            dialog.commands.clear();
+            use();
+        };
+        EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
+    }
+    virtual void make(DWORD style) = 0;
+    int told(int code) const {
+        return dialog.codes(controlId, code);
+    }
+
+    ScriptedDialog dialog{IDD_EMPTY};
+    Control control;
+    const CRect place{10, 10, 210, 110};
+};
+
+// --- edit ---
+
+class EditTest : public ControlTest<CEdit> {
+protected:
+    void make(DWORD style) override {
+        ASSERT_TRUE(control.Create(shown | WS_BORDER | style, place, &dialog, controlId));
+    }
+    std::pair<int, int> selection() const {
+        int start = 0;
+        int end = 0;
+        control.GetSel(start, end);
+        return {start, end};
+    }
+};
+
+TEST_F(EditTest, TellsWhatIsTyped) {
+    with(ES_AUTOHSCROLL, [&] {
+        type("ab");
+        EXPECT_EQ(textOf(&control), "ab");
+        EXPECT_EQ(told(EN_UPDATE), 2);
+        EXPECT_EQ(told(EN_CHANGE), 2);
+        EXPECT_TRUE(control.GetModify());
+        control.SetWindowText("program");
+        EXPECT_EQ(told(EN_CHANGE), 3);
+        EXPECT_FALSE(control.GetModify());
+        key(Qt::Key_Backspace);
+        EXPECT_EQ(textOf(&control), "program"); // the caret stands at the beginning
+        key(Qt::Key_Delete);
+        EXPECT_EQ(textOf(&control), "rogram");
+    });
+}
+
+TEST_F(EditTest, CountsPositionsInBytes) {
+    with(ES_AUTOHSCROLL, [&] {
+        control.SetWindowText("aä€😀z");
+        EXPECT_EQ(control.GetWindowTextLength(), 11);
+        control.SetSel(1, 6);
+        control.ReplaceSel("-");
+        EXPECT_EQ(textOf(&control), "a-😀z");
+        control.SetSel(2, 6);
+        EXPECT_EQ(selection(), std::pair(2, 6));
+        control.SetSel(3, 5); // within a character: moved to its beginning
+        EXPECT_EQ(selection(), std::pair(2, 2));
+        control.SetSel(0, -1);
+        EXPECT_EQ(selection(), std::pair(0, 7));
+        control.SetSel(-1, 0);
+        EXPECT_EQ(selection(), std::pair(7, 7));
+    });
+}
+
+TEST_F(EditTest, LimitsTypingAndPastingButNotThePrograms) {
+    with(ES_AUTOHSCROLL, [&] {
+        EXPECT_EQ(control.GetLimitText(), 30000U);
+        control.SetLimitText(5);
+        type("abä");
+        type("ö"); // two bytes, and one is left
+        EXPECT_EQ(textOf(&control), "abä");
+        EXPECT_EQ(told(EN_MAXTEXT), 1);
+        QApplication::clipboard()->setText("12345");
+        control.Paste();
+        EXPECT_EQ(textOf(&control), "abä1");
+        control.SetWindowText("longer than five");
+        EXPECT_EQ(textOf(&control), "longer than five");
+    });
+}
+
+TEST_F(EditTest, ChangesCaseAndRefusesLetters) {
+    with(ES_UPPERCASE | ES_AUTOHSCROLL, [&] {
+        type("aé1");
+        EXPECT_EQ(textOf(&control), "AÉ1");
+    });
+    with(ES_NUMBER | ES_AUTOHSCROLL, [&] {
+        type("1a2.");
+        EXPECT_EQ(textOf(&control), "12");
+        QApplication::clipboard()->setText("3x4");
+        key(Qt::Key_V, Qt::ControlModifier);
+        EXPECT_EQ(textOf(&control), "1234");
+    });
+}
+
+TEST_F(EditTest, ReadOnlyOnesKeepTheirText) {
+    with(ES_READONLY | ES_AUTOHSCROLL, [&] {
+        control.SetWindowText("fixed");
+        type("x");
+        key(Qt::Key_Delete);
+        EXPECT_EQ(textOf(&control), "fixed");
+        control.SetSel(0, -1);
+        key(Qt::Key_C, Qt::ControlModifier);
+        EXPECT_EQ(QApplication::clipboard()->text(), "fixed");
+        control.SetReadOnly(FALSE);
+        type("x");
+        EXPECT_EQ(textOf(&control), "x");
+        control.Undo();
+        EXPECT_EQ(textOf(&control), "fixed");
+    });
+}
+
+TEST_F(EditTest, ManyLinesEndInCarriageReturnAndLineFeed) {
+    with(ES_MULTILINE | ES_WANTRETURN | ES_AUTOHSCROLL | ES_AUTOVSCROLL | WS_VSCROLL, [&] {
+        control.SetWindowText("first\r\nzweite ä\r\n\r\nlast");
+        EXPECT_EQ(textOf(&control), "first\r\nzweite ä\r\n\r\nlast");
+        EXPECT_EQ(told(EN_CHANGE), 0);
+        EXPECT_EQ(control.GetLineCount(), 4);
+        EXPECT_EQ(control.LineIndex(1), 7);
+        EXPECT_EQ(control.LineIndex(2), 18);
+        EXPECT_EQ(control.LineIndex(4), -1);
+        EXPECT_EQ(control.LineLength(8), 9);
+        EXPECT_EQ(control.LineFromChar(18), 2);
+        char line[16] = "";
+        EXPECT_EQ(control.GetLine(1, line, sizeof(line)), 9);
+        EXPECT_EQ(std::string(line, 9), "zweite ä");
+        EXPECT_EQ(control.GetLine(1, line, 8), 7); // no half character
+        control.SetSel(5, 5);
+        key(Qt::Key_Return);
+        EXPECT_EQ(textOf(&control).substr(0, 9), "first\r\n\r\n");
+        EXPECT_EQ(told(EN_CHANGE), 1);
+        EXPECT_EQ(selection(), std::pair(7, 7));
+    });
+}
+
+TEST_F(EditTest, WithoutWantReturnEnterIsTheDialogs) {
+    dialog.prepare = [&] { make(ES_MULTILINE); };
+    dialog.script = [&] {
+        control.SetFocus();
+        key(Qt::Key_Return);
+    };
+    EXPECT_EQ(dialog.DoModal(), IDOK);
+    EXPECT_EQ(dialog.codes(IDOK, BN_CLICKED), 1);
+}
+
+// --- list box ---
+
+class ListBoxTest : public ControlTest<CListBox> {
+protected:
+    void make(DWORD style) override {
+        ASSERT_TRUE(control.Create(shown | WS_BORDER | WS_VSCROLL | LBS_NOTIFY | style, place, &dialog, controlId));
+        for (const char* line : lines) {
+            control.AddString(line);
+        }
+    }
+    QPoint middle(int index) const {
+        CRect rect;
+        control.GetItemRect(index, &rect);
+        return {20, rect.CenterPoint().y};
+    }
+    std::vector<int> selected() const {
+        std::vector<int> indices(static_cast<std::size_t>(control.GetCount()));
+        indices.resize(static_cast<std::size_t>(control.GetSelItems(control.GetCount(), indices.data())));
+        return indices;
+    }
+    std::vector<const char*> lines{"pear", "Apple", "fig", "apricot", "Zebra"};
+};
+
+TEST_F(ListBoxTest, SortsAndFindsWithoutCase) {
+    with(LBS_SORT, [&] {
+        CString text;
+        control.GetText(0, text);
+        EXPECT_STREQ(text, "Apple");
+        control.GetText(4, text);
+        EXPECT_STREQ(text, "Zebra");
+        EXPECT_EQ(control.FindString(-1, "AP"), 0);
+        EXPECT_EQ(control.FindString(0, "ap"), 1);
+        EXPECT_EQ(control.FindString(1, "ap"), 0); // around
+        EXPECT_EQ(control.FindStringExact(-1, "ap"), LB_ERR);
+        EXPECT_EQ(control.AddString("banana"), 2);
+        EXPECT_EQ(control.InsertString(0, "zz"), 0);
+        control.SetItemData(3, 77);
+        EXPECT_EQ(control.DeleteString(1), 6);
+        EXPECT_EQ(control.GetItemData(2), 77U);
+        EXPECT_EQ(control.GetTextLen(99), LB_ERR);
+        EXPECT_EQ(control.DeleteString(99), LB_ERR);
+    });
+}
+
+TEST_F(ListBoxTest, TellsWhatTheUserChooses) {
+    with(0, [&] {
+        control.SetCurSel(1);
+        EXPECT_EQ(told(LBN_SELCHANGE), 0);
+        click(&control, middle(2));
+        EXPECT_EQ(control.GetCurSel(), 2);
+        EXPECT_EQ(told(LBN_SELCHANGE), 1);
+        key(Qt::Key_Down);
+        EXPECT_EQ(control.GetCurSel(), 3);
+        type("z");
+        EXPECT_EQ(control.GetCurSel(), 4);
+        key(Qt::Key_Home);
+        EXPECT_EQ(control.GetCurSel(), 0);
+        EXPECT_EQ(told(LBN_SELCHANGE), 4);
+        QTest::mouseDClick(tvx::afx::peerOf(control.m_hWnd), Qt::LeftButton, {}, middle(1));
+        EXPECT_EQ(told(LBN_DBLCLK), 1);
+        control.SetCurSel(-1);
+        EXPECT_EQ(control.GetCurSel(), LB_ERR);
+    });
+}
+
+TEST_F(ListBoxTest, ExtendedSelectionsFollowShiftAndControl) {
+    with(LBS_EXTENDEDSEL, [&] {
+        click(&control, middle(1));
+        click(&control, middle(3), Qt::ShiftModifier);
+        EXPECT_EQ(selected(), (std::vector<int>{1, 2, 3}));
+        click(&control, middle(2), Qt::ControlModifier);
+        EXPECT_EQ(selected(), (std::vector<int>{1, 3}));
+        click(&control, middle(4));
+        EXPECT_EQ(selected(), (std::vector<int>{4}));
+        key(Qt::Key_Up, Qt::ShiftModifier);
+        EXPECT_EQ(selected(), (std::vector<int>{3, 4}));
+        control.SelItemRange(TRUE, 0, 1);
+        EXPECT_EQ(control.GetSelCount(), 4);
+        control.SetSel(-1, FALSE);
+        EXPECT_EQ(control.GetSelCount(), 0);
+        EXPECT_EQ(control.SetCurSel(1), LB_ERR);
+    });
+    with(LBS_MULTIPLESEL, [&] {
+        click(&control, middle(0));
+        click(&control, middle(2));
+        EXPECT_EQ(selected(), (std::vector<int>{0, 2}));
+        key(Qt::Key_Space);
+        EXPECT_EQ(selected(), (std::vector<int>{0}));
+    });
+}
+
+TEST_F(ListBoxTest, ScrollsThroughManyLines) {
+    with(0, [&] {
+        control.ResetContent();
+        for (int line = 0; line < 1000; ++line) {
+            control.AddString(std::to_string(line).c_str());
+        }
+        control.SetCurSel(500);
+        CRect client;
+        CRect rect;
+        control.GetClientRect(&client);
+        control.GetItemRect(500, &rect);
+        EXPECT_TRUE(rect.top >= 0 && rect.bottom <= client.bottom);
+        control.SetTopIndex(300);
+        EXPECT_EQ(control.GetTopIndex(), 300);
+        BOOL outside = TRUE;
+        EXPECT_EQ(control.ItemFromPoint(CPoint(5, 1), outside), 300U);
+        EXPECT_FALSE(outside);
+        key(Qt::Key_End);
+        EXPECT_EQ(control.GetCurSel(), 999);
+    });
+}
+
+/// Paints its lines itself and keeps count of their ends.
+class OwnerList : public CListBox {
+public:
+    int deleted = 0;
+
+protected:
+    void MeasureItem(MEASUREITEMSTRUCT* item) override {
+        item->itemHeight = 20;
+    }
+    void DrawItem(DRAWITEMSTRUCT* item) override {
+        const CBrush brush((item->itemState & ODS_SELECTED) != 0 ? RGB(255, 0, 0)
+                                                                 : static_cast<COLORREF>(item->itemData));
+        ::FillRect(item->hDC, &item->rcItem, brush);
+    }
+    void DeleteItem(DELETEITEMSTRUCT*) override {
+        ++deleted;
+    }
+};
+
+TEST(OwnerDrawnList, IsPaintedByItsObject) {
+    ScriptedDialog dialog(IDD_EMPTY);
+    OwnerList list;
+    dialog.prepare = [&] {
+        const DWORD style = shown | WS_VSCROLL | LBS_OWNERDRAWFIXED | LBS_NOINTEGRALHEIGHT | LBS_NOTIFY;
+        ASSERT_TRUE(list.Create(style, CRect(10, 10, 110, 110), &dialog, controlId));
+        for (const COLORREF color : {RGB(0, 0, 255), RGB(0, 255, 0)}) {
+            list.SendMessage(LB_ADDSTRING, 0, static_cast<LPARAM>(color)); // data instead of a text
+        }
+    };
+    dialog.script = [&] {
+        EXPECT_EQ(list.GetItemHeight(0), 20);
+        EXPECT_EQ(list.GetItemData(1), static_cast<DWORD_PTR>(RGB(0, 255, 0)));
+        const auto colorAt = [&](int y) { return tvx::afx::peerOf(list.m_hWnd)->grab().toImage().pixelColor(50, y); };
+        EXPECT_EQ(colorAt(5), QColor(0, 0, 255));
+        EXPECT_EQ(colorAt(25), QColor(0, 255, 0));
+        click(&list, {50, 5});
+        EXPECT_EQ(colorAt(5), QColor(255, 0, 0));
+        list.DeleteString(0);
+        EXPECT_EQ(list.deleted, 1);
+    };
+    dialog.DoModal();
+    EXPECT_EQ(list.deleted, 2); // the list's end is its lines' end
+}
+
+// --- combo box ---
+
+class ComboBoxTest : public ControlTest<CComboBox> {
+protected:
+    void make(DWORD style) override {
+        ASSERT_TRUE(control.Create(shown | WS_VSCROLL | style, place, &dialog, controlId));
+        for (const char* line : {"pear", "Apple", "fig"}) {
+            control.AddString(line);
+        }
+    }
+};
+
+TEST_F(ComboBoxTest, ChoosesOnlyWhatItIsTold) {
+    with(CBS_DROPDOWNLIST | CBS_SORT, [&] {
+        EXPECT_EQ(control.GetCurSel(), CB_ERR);
+        EXPECT_EQ(control.GetCount(), 3);
+        CString text;
+        control.GetLBText(0, text);
+        EXPECT_STREQ(text, "Apple");
+        control.SetCurSel(1);
+        EXPECT_EQ(textOf(&control), "fig");
+        EXPECT_EQ(told(CBN_SELCHANGE), 0);
+        key(Qt::Key_Down);
+        EXPECT_EQ(control.GetCurSel(), 2);
+        EXPECT_EQ(told(CBN_SELCHANGE), 1);
+        EXPECT_EQ(control.AddString("blackberry"), 1);
+        EXPECT_EQ(textOf(&control), "pear"); // what is chosen stays chosen
+        control.SetItemData(0, 42);
+        EXPECT_EQ(control.GetItemData(0), 42U);
+        EXPECT_EQ(control.SelectString(-1, "FI"), 2);
+        control.DeleteString(2);
+        EXPECT_EQ(control.GetCurSel(), CB_ERR);
+        control.ResetContent();
+        EXPECT_EQ(control.GetCount(), 0);
+    });
+}
+
+TEST_F(ComboBoxTest, OpensItsList) {
+    with(CBS_DROPDOWNLIST, [&] {
+        CRect closed;
+        control.GetWindowRect(&closed);
+        EXPECT_LT(closed.Height(), 30);
+        control.ShowDropDown();
+        EXPECT_TRUE(control.GetDroppedState());
+        EXPECT_EQ(told(CBN_DROPDOWN), 1);
+        key(Qt::Key_Escape);
+        EXPECT_FALSE(control.GetDroppedState());
+        EXPECT_EQ(told(CBN_CLOSEUP), 1);
+        EXPECT_TRUE(dialog.IsWindowVisible());
+    });
+}
+
+TEST_F(ComboBoxTest, TakesWhatIsTyped) {
+    with(CBS_DROPDOWN | CBS_AUTOHSCROLL, [&] {
+        EXPECT_EQ(textOf(&control), "");
+        type("Bä");
+        EXPECT_EQ(textOf(&control), "Bä");
+        EXPECT_EQ(told(CBN_EDITCHANGE), 2);
+        EXPECT_EQ(control.GetCurSel(), CB_ERR);
+        control.SetEditSel(0, 1);
+        EXPECT_EQ(control.GetEditSel(), static_cast<DWORD>(MAKELONG(0, 1)));
+        control.AddString("new"); // does not disturb the field
+        EXPECT_EQ(textOf(&control), "Bä");
+        control.SetCurSel(0);
+        EXPECT_EQ(textOf(&control), "pear");
+    });
+}
+
+// --- buttons and statics ---
+
+class ButtonTest : public ControlTest<CButton> {
+protected:
+    void make(DWORD style) override {
+        ASSERT_TRUE(control.Create("&Button", shown | style, CRect(10, 10, 110, 34), &dialog, controlId));
+    }
+};
+
+TEST_F(ButtonTest, MarksChangeByThemselvesOnlyInAutomaticKinds) {
+    with(BS_AUTO3STATE, [&] {
+        for (const int expected : {1, 2, 0}) {
+            click(&control, {10, 12});
+            EXPECT_EQ(control.GetCheck(), expected);
+        }
+        EXPECT_EQ(told(BN_CLICKED), 3);
+    });
+    with(BS_CHECKBOX, [&] {
+        click(&control, {10, 12});
+        EXPECT_EQ(control.GetCheck(), 0);
+        EXPECT_EQ(told(BN_CLICKED), 1);
+        control.SetCheck(1);
+        EXPECT_EQ(told(BN_CLICKED), 1);
+    });
+}
+
+TEST_F(ButtonTest, AreNotPressedWhileDisabled) {
+    with(BS_PUSHBUTTON, [&] {
+        click(&control);
+        key(Qt::Key_Space);
+        EXPECT_EQ(told(BN_CLICKED), 2);
+        control.EnableWindow(FALSE);
+        click(&control);
+        EXPECT_EQ(told(BN_CLICKED), 2);
+    });
+}
+
+TEST(GroupBox, LetsWhatItSurroundsBeUsed) {
+    ScriptedDialog dialog(IDD_EMPTY);
+    CButton inside;
+    CButton box;
+    dialog.prepare = [&] {
+        ASSERT_TRUE(inside.Create("Inside", shown | BS_AUTOCHECKBOX, CRect(20, 30, 120, 50), &dialog, 1));
+        ASSERT_TRUE(box.Create("Title", WS_CHILD | WS_VISIBLE | BS_GROUPBOX, CRect(10, 10, 160, 80), &dialog, 2));
+    };
+    dialog.script = [&] {
+        QWidget* top = dialog.GetState()->widget();
+        QWidget* hit = top->childAt(30, 40);
+        ASSERT_EQ(hit, tvx::afx::peerOf(inside.m_hWnd));
+        click(&inside, {8, 10});
+        EXPECT_EQ(inside.GetCheck(), 1);
+        // The title interrupts the frame's upper edge.
+        const QImage image = top->grab().toImage();
+        const QColor background = image.pixelColor(150, 70);
+        EXPECT_NE(image.pixelColor(150, 16), background);
+        EXPECT_EQ(image.pixelColor(13, 10), background);
+    };
+    dialog.DoModal();
+}
+
+TEST(Statics, AskForMenusThroughTheirParent) {
+    class MenuDialog : public ScriptedDialog {
+    public:
+        MenuDialog() : ScriptedDialog(IDD_EMPTY) {}
+        std::vector<HWND> asked;
+
+    protected:
+        LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+            if (message == WM_CONTEXTMENU) {
+                asked.push_back(reinterpret_cast<HWND>(wParam));
+                return 0;
+            }
+            return ScriptedDialog::WindowProc(message, wParam, lParam);
+        }
+    } dialog;
+    CListBox list;
+    dialog.prepare = [&] { ASSERT_TRUE(list.Create(shown | WS_BORDER, CRect(10, 10, 110, 110), &dialog, controlId)); };
+    dialog.script = [&] {
+        click(&list, {20, 20}, {}, Qt::RightButton);
+        EXPECT_EQ(dialog.asked, (std::vector<HWND>{list.m_hWnd}));
+    };
+    dialog.DoModal();
+}
+
+TEST(ScrollBarControl, TellsItsParentWhichMovesIt) {
+    class ScrollDialog : public ScriptedDialog {
+    public:
+        ScrollDialog() : ScriptedDialog(IDD_EMPTY) {}
+        std::vector<UINT> codes;
+        CScrollBar bar;
+
+    protected:
+        LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+            if (message == WM_HSCROLL && reinterpret_cast<HWND>(lParam) == bar.m_hWnd) {
+                codes.push_back(LOWORD(wParam));
+            }
+            return ScriptedDialog::WindowProc(message, wParam, lParam);
+        }
+    } dialog;
+    dialog.prepare = [&] {
+        ASSERT_TRUE(dialog.bar.Create(shown | SBS_HORZ, CRect(10, 10, 150, 26), &dialog, controlId));
+        dialog.bar.SetScrollRange(0, 10);
+        dialog.bar.SetScrollPos(3);
+    };
+    dialog.script = [&] {
+        dialog.bar.SetFocus();
+        key(Qt::Key_Right);
+        EXPECT_EQ(dialog.codes, (std::vector<UINT>{SB_LINERIGHT}));
+        EXPECT_EQ(dialog.bar.GetScrollPos(), 3); // moved by the parent alone
+        EXPECT_EQ(dialog.bar.SetScrollPos(20), 3);
+        EXPECT_EQ(dialog.bar.GetScrollPos(), 10);
+    };
+    dialog.DoModal();
+}
+
+} // namespace

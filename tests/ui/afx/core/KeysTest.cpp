@@ -1,0 +1,31 @@
+#include "platform/afx/core/detail/Keys.h"
+#include "afxwin.h"
+#include "platform/afx/core/detail/Window.h"
+
+#include <QMenu>
+#include <QTest>
+#include <gtest/gtest.h>
+
+namespace {
+
+// The Alt that opens a menu is released while the menu has the keyboard. An Alt that stayed down would keep every
+// accelerator from matching afterwards.
+TEST(Keys, AreFollowedWhileAMenuHasTheKeyboard) {
+    CWnd frame;
+    ASSERT_TRUE(frame.CreateEx(0, AfxRegisterWndClass(0), "frame", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 200, 100,
+                               nullptr, nullptr));
+    QWidget* widget = tvx::afx::peerOf(frame.m_hWnd);
+    QTest::keyPress(widget, Qt::Key_Alt, Qt::AltModifier);
+    EXPECT_TRUE(tvx::afx::isKeyDown(VK_MENU));
+
+    QMenu menu;
+    menu.addAction("item");
+    menu.popup(QPoint(0, 0));
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&menu));
+    QTest::keyRelease(&menu, Qt::Key_Alt);
+    EXPECT_FALSE(tvx::afx::isKeyDown(VK_MENU));
+    menu.close();
+    frame.DestroyWindow();
+}
+
+} // namespace

@@ -1,0 +1,92 @@
+#include "platform/afx/dialogs/FileDialog.h"
+#include "tests/ui/afx/frames/FrameTesting.h"
+
+#include <QComboBox>
+#include <QFileDialog>
+#include <QLineEdit>
+
+using namespace frametest;
+
+using FileDialogs = FrameTest;
+
+namespace {
+
+QFileDialog* shownDialog() {
+    return qobject_cast<QFileDialog*>(QApplication::activeModalWidget());
+}
+
+/// Types a name into the dialog and presses Enter, or Esc for an empty one.
+void answer(const std::string& name) {
+    later([name] {
+        QFileDialog* dialog = shownDialog();
+        ASSERT_NE(dialog, nullptr);
+        auto* edit = dialog->findChild<QLineEdit*>("fileNameEdit");
+        if (name.empty()) {
+            QTest::keyClick(edit, Qt::Key_Escape);
+            return;
+        }
+        edit->setText(QString::fromStdString(name));
+        QTest::keyClick(edit, Qt::Key_Return);
+    });
+}
+
+} // namespace
+
+TEST_F(FileDialogs, OpenAnswersTheParts) {
+    write(file("some.picture.brd"), "x");
+    CFileDialog dialog(TRUE, "brd", nullptr, OFN_HIDEREADONLY | OFN_FILEMUSTEXIST,
+                       "Boards (*.brd)|*.brd|All Files (*.*)|*.*||");
+    const std::string folder = file("").string();
+    dialog.m_ofn.lpstrInitialDir = folder.c_str();
+    dialog.m_ofn.lpstrTitle = "Pick a board";
+    answer("some.picture.brd");
+    ASSERT_EQ(dialog.DoModal(), IDOK);
+    EXPECT_EQ(dialog.GetPathName(), driveName("some.picture.brd"));
+    EXPECT_EQ(dialog.GetFileName(), "some.picture.brd");
+    EXPECT_EQ(dialog.GetFileExt(), "brd");
+    EXPECT_EQ(dialog.GetFileTitle(), "some.picture");
+    EXPECT_EQ(dialog.m_ofn.nFilterIndex, 1U);
+    POSITION at = dialog.GetStartPosition();
+    EXPECT_EQ(dialog.GetNextPathName(at), dialog.GetPathName());
+    EXPECT_EQ(at, nullptr);
+}
+
+TEST_F(FileDialogs, CancelChangesNothing) {
+    CFileDialog dialog(TRUE, nullptr, "first");
+    answer("");
+    EXPECT_EQ(dialog.DoModal(), IDCANCEL);
+    EXPECT_EQ(dialog.GetPathName(), "first");
+}
+
+TEST_F(FileDialogs, SaveCompletesTheExtension) {
+    CFileDialog dialog(FALSE, "brd", file("start.brd").c_str(), OFN_OVERWRITEPROMPT, "Boards|*.brd||");
+    later([] {
+        QFileDialog* shown = shownDialog();
+        ASSERT_NE(shown, nullptr);
+        EXPECT_EQ(shown->selectedNameFilter(), QString("Boards (*.brd)"));
+        EXPECT_EQ(shown->findChild<QLineEdit*>("fileNameEdit")->text(), QString("start.brd"));
+    });
+    answer("fresh");
+    ASSERT_EQ(dialog.DoModal(), IDOK);
+    EXPECT_EQ(dialog.GetPathName(), driveName("fresh.brd"));
+}
+
+TEST_F(FileDialogs, OverwritingIsAskedAbout) {
+    write(file("there.brd"), "x");
+    CFileDialog dialog(FALSE, "brd", nullptr, OFN_OVERWRITEPROMPT);
+    const std::string folder = file("").string();
+    dialog.m_ofn.lpstrInitialDir = folder.c_str();
+    BoxAnswer box("Yes");
+    answer("there.brd");
+    EXPECT_EQ(dialog.DoModal(), IDOK);
+    EXPECT_EQ(box.texts.size(), 1U);
+}
+
+TEST_F(FileDialogs, SaveAsAsksForTheName) {
+    NoteFrame& frame = openNote();
+    document().text = "named";
+    answer(file("named.note").string());
+    frame.SendMessage(WM_COMMAND, ID_FILE_SAVE);
+    EXPECT_EQ(contents(file("named.note")), "\x05named");
+    EXPECT_EQ(titleOf(frame), "named.note - Frame Test");
+}

@@ -1,0 +1,141 @@
+#include "tests/ui/afx/frames/FrameTesting.h"
+
+#include <QLabel>
+#include <QStatusBar>
+#include <QToolBar>
+#include <QToolButton>
+
+using namespace frametest;
+
+namespace {
+
+class Bars : public FrameTest {
+protected:
+    void SetUp() override {
+        FrameTest::SetUp();
+        frame = &openNote();
+        tools = qobject_cast<QToolBar*>(frame->tools.GetState()->widget());
+        ASSERT_NE(tools, nullptr);
+    }
+    QToolButton* button(UINT id) const {
+        return qobject_cast<QToolButton*>(tools->widgetForAction(tools->actions()[frame->tools.CommandToIndex(id)]));
+    }
+    NoteFrame* frame = nullptr;
+    QToolBar* tools = nullptr;
+};
+
+} // namespace
+
+TEST_F(Bars, ToolBarIsMadeFromItsResource) {
+    EXPECT_EQ(frame->tools.GetCount(), 5);
+    EXPECT_EQ(frame->tools.GetItemID(0), UINT{ID_TEST_DRAW});
+    EXPECT_EQ(frame->tools.GetItemID(2), 0U);
+    EXPECT_EQ(frame->tools.CommandToIndex(ID_TEST_GRID), 3);
+    EXPECT_EQ(frame->tools.CommandToIndex(4711), -1);
+    EXPECT_EQ(button(ID_TEST_GRID)->toolTip(), QString("Grid"));
+    const QImage icon = button(ID_TEST_LOCKED)->icon().pixmap(16, 15).toImage();
+    EXPECT_EQ(icon.pixelColor(8, 7), QColor(0, 128, 0));
+    EXPECT_EQ(icon.pixelColor(0, 0).alpha(), 0) << "the background is transparent";
+    EXPECT_FALSE(CToolBar().LoadToolBar(4711));
+}
+
+TEST_F(Bars, ButtonsFollowTheirCommands) {
+    EXPECT_TRUE(button(ID_TEST_DRAW)->isEnabled());
+    EXPECT_FALSE(button(ID_TEST_LOCKED)->isEnabled());
+    EXPECT_FALSE(button(ID_TEST_ORPHAN)->isEnabled()) << "nobody handles it";
+    EXPECT_FALSE(button(ID_TEST_GRID)->isChecked());
+    QTest::mouseClick(button(ID_TEST_GRID), Qt::LeftButton);
+    QTest::mouseClick(button(ID_TEST_DRAW), Qt::LeftButton);
+    EXPECT_EQ(journal(), (std::vector<std::string>{"grid", "draw"}));
+    idle();
+    EXPECT_TRUE(button(ID_TEST_GRID)->isChecked());
+    view().grid = false;
+    idle();
+    EXPECT_FALSE(button(ID_TEST_GRID)->isChecked());
+    EXPECT_EQ(CWnd::GetFocus(), &view()) << "buttons do not take the keyboard";
+}
+
+TEST_F(Bars, PlaceForAControl) {
+    frame->tools.SetButtonInfo(2, 5000, TBBS_SEPARATOR, 90);
+    settle();
+    CRect place;
+    frame->tools.GetItemRect(2, &place);
+    EXPECT_EQ(place.Width(), 90);
+    CRect next;
+    frame->tools.GetItemRect(3, &next);
+    EXPECT_GE(next.left, place.right);
+}
+
+TEST_F(Bars, PromptUnderThePointer) {
+    QTest::mouseMove(button(ID_TEST_GRID));
+    settle();
+    EXPECT_EQ(frame->status.GetPaneText(0), "Shows the grid");
+    QTest::mouseMove(tvx::afx::peerOf(view().m_hWnd), QPoint(100, 100));
+    settle();
+    EXPECT_EQ(frame->status.GetPaneText(0), "Ready");
+}
+
+TEST_F(Bars, AreHiddenAndShownByTheirCommands) {
+    CRect before;
+    view().GetClientRect(&before);
+    QMenu* menu = clickBar(*frame, "View");
+    ASSERT_NE(menu, nullptr);
+    EXPECT_TRUE(itemOf(*menu, "Tool Bar")->isChecked());
+    clickItem(*menu, "Tool Bar");
+    EXPECT_FALSE(frame->tools.IsVisible());
+    settle();
+    CRect after;
+    view().GetClientRect(&after);
+    EXPECT_GT(after.Height(), before.Height());
+    frame->ShowControlBar(&frame->tools, TRUE, TRUE);
+    EXPECT_TRUE(frame->tools.IsVisible()) << "counts at once";
+    EXPECT_TRUE(tools->isHidden()) << "shown when idle";
+    idle();
+    EXPECT_FALSE(tools->isHidden());
+}
+
+TEST_F(Bars, DockAndFloat) {
+    EXPECT_EQ(frame->tools.GetDockSide(), UINT{AFX_IDW_DOCKBAR_TOP});
+    frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_LEFT);
+    settle();
+    EXPECT_EQ(frame->tools.GetDockSide(), UINT{AFX_IDW_DOCKBAR_LEFT});
+    EXPECT_GT(tools->height(), tools->width());
+    frame->FloatControlBar(&frame->tools, CPoint(200, 200));
+    settle();
+    EXPECT_TRUE(frame->tools.IsFloating());
+    EXPECT_TRUE(tools->isVisible());
+    QTest::mouseClick(button(ID_TEST_DRAW), Qt::LeftButton);
+    EXPECT_TRUE(noted("draw"));
+    frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_BOTTOM);
+    settle();
+    EXPECT_FALSE(frame->tools.IsFloating());
+    EXPECT_EQ(frame->GetControlBar(AFX_IDW_TOOLBAR), &frame->tools);
+    EXPECT_EQ(frame->GetControlBar(4711), nullptr);
+}
+
+TEST_F(Bars, StatusPanes) {
+    CStatusBar& status = frame->status;
+    EXPECT_EQ(status.GetCount(), 3);
+    EXPECT_EQ(status.GetPaneText(1), "000 shapes");
+    EXPECT_TRUE(status.SetPaneText(1, "7 shapes"));
+    EXPECT_FALSE(status.SetPaneText(3, "none"));
+    const auto labels = status.GetState()->widget()->findChildren<QLabel*>("pane");
+    ASSERT_EQ(labels.size(), 3);
+    EXPECT_EQ(labels[1]->text(), QString("7 shapes"));
+    EXPECT_EQ(labels[2]->text(), QString()) << "Caps Lock is off";
+    EXPECT_GT(labels[0]->width(), labels[1]->width()) << "the first pane stretches";
+    CRect second;
+    status.GetItemRect(1, &second);
+    EXPECT_EQ(second.Width(), labels[1]->width());
+    UINT id = 0;
+    UINT style = 0;
+    int width = 0;
+    status.GetPaneInfo(1, id, style, width);
+    status.SetPaneInfo(1, id, style, width + 40);
+    settle();
+    CRect wider;
+    status.GetItemRect(1, &wider);
+    EXPECT_EQ(wider.Width(), second.Width() + 40);
+    EXPECT_EQ(status.GetPaneText(1), "7 shapes");
+    EXPECT_EQ(titleOf(status), "Ready");
+}

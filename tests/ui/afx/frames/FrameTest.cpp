@@ -1,0 +1,210 @@
+#include "tests/ui/afx/frames/FrameTesting.h"
+
+#include <QWindow>
+
+using namespace frametest;
+
+using Frame = FrameTest;
+
+TEST_F(Frame, ShowsMenuViewAndTitle) {
+    NoteFrame& frame = openNote();
+    EXPECT_EQ(titleOf(frame), "Note - Frame Test");
+    EXPECT_EQ(widgetOf(frame)->centralWidget(), view().GetState()->widget());
+    const auto* bar = qobject_cast<QMenuBar*>(widgetOf(frame)->menuWidget());
+    ASSERT_NE(bar, nullptr);
+    EXPECT_EQ(bar->actions().size(), 3);
+    EXPECT_EQ(CWnd::GetFocus(), &view());
+    CRect client;
+    view().GetClientRect(&client);
+    EXPECT_GT(client.Width(), 300);
+    const QImage shown = widgetOf(frame)->grab().toImage();
+    const QPoint corner = tvx::afx::peerOf(view().m_hWnd)->mapTo(widgetOf(frame), QPoint(0, 0));
+    EXPECT_EQ(shown.pixel(corner + QPoint(15, 15)), qRgb(255, 0, 0));
+    EXPECT_EQ(shown.pixel(corner + QPoint(50, 50)), qRgb(255, 255, 255));
+}
+
+TEST_F(Frame, FollowsItsSize) {
+    NoteFrame& frame = openNote();
+    CRect before;
+    view().GetClientRect(&before);
+    CRect outer;
+    frame.GetWindowRect(&outer);
+    frame.SetWindowPos(nullptr, 0, 0, outer.Width() - 100, outer.Height() - 50, SWP_NOMOVE | SWP_NOZORDER);
+    settle();
+    CRect after;
+    view().GetClientRect(&after);
+    EXPECT_EQ(after.Width(), before.Width() - 100);
+    EXPECT_EQ(after.Height(), before.Height() - 50);
+}
+
+TEST_F(Frame, FailsWithoutItsMenu) {
+    auto* frame = new CFrameWnd; // deletes itself
+    EXPECT_FALSE(frame->LoadFrame(777));
+}
+
+// --- menus ---
+
+TEST_F(Frame, MenuByMouseUpdatesItemsAndSendsCommands) {
+    NoteFrame& frame = openNote();
+    QMenu* edit = clickBar(frame, "Edit");
+    ASSERT_NE(edit, nullptr);
+    EXPECT_TRUE(itemOf(*edit, "Draw")->isEnabled());
+    EXPECT_FALSE(itemOf(*edit, "Locked")->isEnabled());
+    EXPECT_FALSE(itemOf(*edit, "Orphan")->isEnabled()) << "nobody handles it";
+    EXPECT_FALSE(itemOf(*edit, "Grid")->isChecked());
+    clickItem(*edit, "Grid");
+    EXPECT_TRUE(noted("grid"));
+    EXPECT_EQ(openMenu(), nullptr);
+    EXPECT_EQ(CWnd::GetFocus(), &view());
+
+    edit = clickBar(frame, "Edit");
+    EXPECT_TRUE(itemOf(*edit, "Grid")->isChecked());
+    key(Qt::Key_Escape);
+}
+
+TEST_F(Frame, MenuItemsWithoutHandlersStayWhenAsked) {
+    NoteFrame& frame = openNote();
+    frame.m_bAutoMenuEnable = FALSE;
+    QMenu* edit = clickBar(frame, "Edit");
+    ASSERT_NE(edit, nullptr);
+    EXPECT_TRUE(itemOf(*edit, "Orphan")->isEnabled());
+    key(Qt::Key_Escape);
+}
+
+TEST_F(Frame, MenuByKeyboard) {
+    openNote();
+    key(Qt::Key_E, Qt::AltModifier);
+    ASSERT_NE(openMenu(), nullptr);
+    EXPECT_EQ(openMenu()->activeAction(), itemOf(*openMenu(), "Draw"));
+    key(Qt::Key_Return);
+    EXPECT_TRUE(noted("draw"));
+
+    // F10 gives the bar the keyboard, arrows walk, a letter chooses.
+    key(Qt::Key_F10);
+    EXPECT_NE(qobject_cast<QMenuBar*>(QApplication::focusWidget()), nullptr);
+    key(Qt::Key_Right);
+    key(Qt::Key_Down);
+    ASSERT_NE(openMenu(), nullptr);
+    EXPECT_NE(itemOf(*openMenu(), "Grid"), nullptr);
+    key(Qt::Key_G);
+    EXPECT_TRUE(noted("grid"));
+    EXPECT_EQ(CWnd::GetFocus(), &view());
+}
+
+TEST_F(Frame, RadioItemsInPopupsOfPopups) {
+    NoteFrame& frame = openNote();
+    view().large = true;
+    QMenu* edit = clickBar(frame, "Edit");
+    ASSERT_NE(edit, nullptr);
+    clickItem(*edit, "Size");
+    QMenu* sizes = openMenu();
+    ASSERT_NE(sizes, nullptr);
+    ASSERT_NE(sizes, edit);
+    EXPECT_TRUE(itemOf(*sizes, "Large")->isChecked());
+    EXPECT_NE(itemOf(*sizes, "Large")->actionGroup(), nullptr);
+    EXPECT_FALSE(itemOf(*sizes, "Small")->isChecked());
+    clickItem(*sizes, "Small");
+    EXPECT_FALSE(view().large);
+}
+
+TEST_F(Frame, PromptsOfMenuItems) {
+    NoteFrame& frame = openNote();
+    EXPECT_EQ(frame.status.GetPaneText(0), "Ready");
+    QMenu* edit = clickBar(frame, "Edit");
+    ASSERT_NE(edit, nullptr);
+    edit->setActiveAction(itemOf(*edit, "Grid"));
+    EXPECT_EQ(frame.status.GetPaneText(0), "Shows the grid");
+    edit->setActiveAction(itemOf(*edit, "Draw"));
+    EXPECT_EQ(frame.status.GetPaneText(0), "Draws a shape");
+    key(Qt::Key_Escape);
+    key(Qt::Key_Escape);
+    EXPECT_EQ(frame.status.GetPaneText(0), "Ready");
+}
+
+TEST_F(Frame, ChangesOfTheBarAreSeenAtOnce) {
+    NoteFrame& frame = openNote();
+    const auto* bar = qobject_cast<QMenuBar*>(widgetOf(frame)->menuWidget());
+    frame.GetMenu()->AppendMenu(MF_STRING, ID_TEST_DRAW, "Now");
+    ASSERT_EQ(bar->actions().size(), 4);
+    bar->actions().back()->trigger();
+    settle();
+    EXPECT_TRUE(noted("draw"));
+    CMenu* shown = frame.GetMenu();
+    frame.SetMenu(nullptr);
+    EXPECT_TRUE(bar->isHidden());
+    frame.SetMenu(shown);
+    EXPECT_FALSE(bar->isHidden());
+}
+
+// --- accelerators ---
+
+TEST_F(Frame, Accelerators) {
+    openNote();
+    key(Qt::Key_D, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{"draw"});
+    key(Qt::Key_D);
+    key(Qt::Key_D, Qt::ControlModifier | Qt::ShiftModifier);
+    key(Qt::Key_L, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{"draw"}) << "plain, with Shift, of a disabled command";
+    key(Qt::Key_F5);
+    key(Qt::Key_F5, Qt::ShiftModifier);
+    QTest::keyClick(widgetOf(*static_cast<CFrameWnd*>(AfxGetMainWnd()))->windowHandle(), '*');
+    EXPECT_EQ(journal(), (std::vector<std::string>{"draw", "grid", "frame", "document"}));
+}
+
+TEST_F(Frame, AcceleratorsWorkAfterAMenuWasOpenedByKeys) {
+    openNote();
+    key(Qt::Key_E, Qt::AltModifier); // Alt is let go of while the menu has the keyboard
+    ASSERT_NE(openMenu(), nullptr);
+    key(Qt::Key_Escape);
+    key(Qt::Key_Escape);
+    EXPECT_EQ(CWnd::GetFocus(), &view());
+    key(Qt::Key_D, Qt::ControlModifier);
+    EXPECT_TRUE(noted("draw"));
+}
+
+TEST_F(Frame, AcceleratorsRestWhileAMenuIsOpen) {
+    NoteFrame& frame = openNote();
+    ASSERT_NE(clickBar(frame, "View"), nullptr);
+    key(Qt::Key_F5);
+    EXPECT_FALSE(noted("grid"));
+    key(Qt::Key_Escape);
+    key(Qt::Key_Escape);
+}
+
+TEST_F(Frame, TablesByHandle) {
+    const ACCEL entries[] = {{FVIRTKEY | FCONTROL, 'Q', 100}, {0, 'x', 101}};
+    const HACCEL table = CreateAcceleratorTable(entries, 2);
+    ASSERT_NE(table, nullptr);
+    EXPECT_EQ(CopyAcceleratorTable(table, nullptr, 0), 2);
+    ACCEL copy[1] = {};
+    EXPECT_EQ(CopyAcceleratorTable(table, copy, 1), 1);
+    EXPECT_EQ(copy[0].cmd, 100);
+    EXPECT_TRUE(DestroyAcceleratorTable(table));
+    EXPECT_FALSE(DestroyAcceleratorTable(table));
+    EXPECT_EQ(CopyAcceleratorTable(table, nullptr, 0), 0);
+    EXPECT_EQ(CreateAcceleratorTable(entries, 0), nullptr);
+}
+
+// --- routing ---
+
+TEST_F(Frame, CommandsGoFromViewToDocumentToFrame) {
+    NoteFrame& frame = openNote();
+    for (const UINT id : {ID_TEST_DRAW, ID_TEST_DOC, ID_TEST_FRAME, ID_TEST_LOCKED}) {
+        frame.SendMessage(WM_COMMAND, id);
+    }
+    EXPECT_EQ(journal(), (std::vector<std::string>{"draw", "document", "frame"})) << "a disabled one is not sent";
+    AFX_CMDHANDLERINFO info;
+    EXPECT_TRUE(frame.OnCmdMsg(ID_TEST_DOC, CN_COMMAND, nullptr, &info));
+    EXPECT_EQ(info.pTarget, &document());
+    EXPECT_EQ(journal().size(), 3U) << "asking does not act";
+}
+
+TEST_F(Frame, ClickMakesAViewActive) {
+    NoteFrame& frame = openNote();
+    frame.SetActiveView(nullptr);
+    QTest::mouseClick(tvx::afx::peerOf(static_cast<CView*>(frame.GetDlgItem(AFX_IDW_PANE_FIRST))->m_hWnd),
+                      Qt::LeftButton);
+    EXPECT_EQ(frame.GetActiveView(), frame.GetDlgItem(AFX_IDW_PANE_FIRST));
+    EXPECT_EQ(CWnd::GetFocus(), frame.GetActiveView());
+}

@@ -1,0 +1,232 @@
+#include "tests/ui/afx/frames/FrameTesting.h"
+
+#include <QMdiArea>
+#include <QMdiSubWindow>
+
+using namespace frametest;
+
+namespace {
+
+class Mdi : public FrameTest {
+protected:
+    void SetUp() override {
+        FrameTest::SetUp();
+        frame = &openBoards();
+    }
+    CMDIChildWnd* open() {
+        CDocument* document = boards().OpenDocumentFile(nullptr);
+        POSITION at = document->GetFirstViewPosition();
+        settle();
+        return static_cast<CMDIChildWnd*>(document->GetNextView(at)->GetParentFrame());
+    }
+    QMdiArea* area() const {
+        return widgetOf(*frame)->findChild<QMdiArea*>();
+    }
+    QStringList barTexts() const {
+        QStringList texts;
+        for (const QAction* action : qobject_cast<QMenuBar*>(widgetOf(*frame)->menuWidget())->actions()) {
+            texts.append(QString(action->text()).remove('&'));
+        }
+        return texts;
+    }
+    BoardsFrame* frame = nullptr;
+};
+
+} // namespace
+
+TEST_F(Mdi, NewChildrenBecomeActive) {
+    EXPECT_EQ(frame->MDIGetActive(), nullptr);
+    EXPECT_EQ(titleOf(*frame), "Frame Test");
+    CMDIChildWnd* first = open();
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    EXPECT_EQ(titleOf(*first), "Board1");
+    CMDIChildWnd* second = open();
+    EXPECT_EQ(frame->MDIGetActive(), second);
+    EXPECT_EQ(frame->GetActiveFrame(), second);
+    EXPECT_EQ(titleOf(*frame), "Board2 - Frame Test");
+    EXPECT_EQ(CWnd::GetFocus(), second->GetActiveView());
+    EXPECT_NE(first->GetState()->widget()->pos(), second->GetState()->widget()->pos());
+    EXPECT_EQ(second->GetParentFrame(), frame);
+    EXPECT_EQ(second->GetTopLevelFrame(), frame);
+}
+
+TEST_F(Mdi, ActivationBringsMenuFocusAndCommands) {
+    EXPECT_EQ(barTexts(), QStringList({"File", "Edit", "View"}));
+    CMDIChildWnd* first = open();
+    EXPECT_EQ(barTexts(), QStringList({"Board", "Window"}));
+    CMDIChildWnd* second = open();
+    auto& firstView = static_cast<NoteView&>(*first->GetActiveView());
+    QTest::mouseClick(tvx::afx::peerOf(firstView.m_hWnd), Qt::LeftButton, Qt::NoModifier, QPoint(2, 2));
+    settle();
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    EXPECT_EQ(CWnd::GetFocus(), &firstView);
+    frame->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_TRUE(firstView.grid);
+    EXPECT_FALSE(static_cast<NoteView*>(second->GetActiveView())->grid);
+    key(Qt::Key_F7);
+    EXPECT_TRUE(noted("draw")) << "the document type's accelerators";
+}
+
+TEST_F(Mdi, KeysWalkAndClose) {
+    CMDIChildWnd* first = open();
+    CMDIChildWnd* second = open();
+    CMDIChildWnd* third = open();
+    key(Qt::Key_F6, Qt::ControlModifier);
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    key(Qt::Key_F6, Qt::ControlModifier | Qt::ShiftModifier);
+    EXPECT_EQ(frame->MDIGetActive(), third);
+    frame->MDIActivate(second);
+    frame->MDIActivate(third);
+    key(Qt::Key_F4, Qt::ControlModifier);
+    EXPECT_EQ(frame->MDIGetActive(), second) << "the one that was active before";
+    EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 2);
+    frame->MDIGetActive()->MDIDestroy();
+    frame->MDIGetActive()->SendMessage(WM_CLOSE);
+    settle();
+    EXPECT_EQ(frame->MDIGetActive(), nullptr);
+    EXPECT_EQ(barTexts(), QStringList({"File", "Edit", "View"}));
+    EXPECT_EQ(titleOf(*frame), "Frame Test");
+    EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
+}
+
+TEST_F(Mdi, WindowMenuListsTheChildren) {
+    CMDIChildWnd* first = open();
+    open();
+    QMenu* menu = clickBar(*frame, "Window");
+    ASSERT_NE(menu, nullptr);
+    ASSERT_NE(itemOf(*menu, "1 Board1"), nullptr);
+    EXPECT_FALSE(itemOf(*menu, "1 Board1")->isChecked());
+    EXPECT_TRUE(itemOf(*menu, "2 Board2")->isChecked());
+    clickItem(*menu, "1 Board1");
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    first->SendMessage(WM_CLOSE);
+    settle();
+    menu = clickBar(*frame, "Window");
+    ASSERT_NE(menu, nullptr);
+    EXPECT_NE(itemOf(*menu, "1 Board2"), nullptr);
+    EXPECT_EQ(itemOf(*menu, "2 Board2"), nullptr) << "the list is made anew";
+    EXPECT_EQ(menu->actions().size(), 5);
+    key(Qt::Key_Escape);
+}
+
+TEST_F(Mdi, ViewsOfOneDocumentAreNumbered) {
+    CMDIChildWnd* first = open();
+    QMenu* menu = clickBar(*frame, "Window");
+    ASSERT_NE(menu, nullptr);
+    clickItem(*menu, "New Window");
+    CMDIChildWnd* second = frame->MDIGetActive();
+    ASSERT_NE(second, first);
+    EXPECT_EQ(second->GetActiveDocument(), first->GetActiveDocument());
+    EXPECT_EQ(titleOf(*first), "Board1:1");
+    EXPECT_EQ(titleOf(*second), "Board1:2");
+    EXPECT_EQ(titleOf(*frame), "Board1:2 - Frame Test");
+    second->GetActiveDocument()->SetModifiedFlag();
+    second->SendMessage(WM_CLOSE);
+    settle();
+    EXPECT_EQ(titleOf(*first), "Board1") << "closed without a question: the document is still shown";
+    BoxAnswer box("Cancel");
+    first->SendMessage(WM_CLOSE);
+    EXPECT_EQ(box.texts, std::vector<std::string>{"Save changes to Board1?"});
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    first->GetActiveDocument()->SetModifiedFlag(FALSE);
+}
+
+TEST_F(Mdi, MaximizedChild) {
+    CMDIChildWnd* first = open();
+    first->MDIMaximize();
+    settle();
+    BOOL maximized = FALSE;
+    frame->MDIGetActive(&maximized);
+    EXPECT_TRUE(maximized);
+    EXPECT_TRUE(first->IsZoomed());
+    idle();
+    EXPECT_EQ(widgetOf(*frame)->windowTitle().toStdString(), "Frame Test - [Board1]");
+    CMDIChildWnd* second = open();
+    EXPECT_TRUE(second->IsZoomed()) << "a new frame is as large as the active one";
+    EXPECT_FALSE(first->IsZoomed()) << "one at a time";
+    frame->MDIActivate(first);
+    settle();
+    EXPECT_TRUE(first->IsZoomed());
+    frame->MDIActivate(second);
+    settle();
+    second->MDIRestore();
+    settle();
+    idle();
+    frame->MDIGetActive(&maximized);
+    EXPECT_FALSE(maximized);
+    EXPECT_EQ(widgetOf(*frame)->windowTitle().toStdString(), "Board2 - Frame Test");
+    EXPECT_TRUE(first->IsWindowVisible());
+}
+
+TEST_F(Mdi, TilesAndCascades) {
+    CMDIChildWnd* first = open();
+    CMDIChildWnd* second = open();
+    frame->MDITile(MDITILE_VERTICAL);
+    settle();
+    const QRect left = first->GetState()->widget()->geometry();
+    const QRect right = second->GetState()->widget()->geometry();
+    EXPECT_EQ(left.top(), right.top());
+    EXPECT_EQ(left.right() + 1, right.left());
+    EXPECT_EQ(right.right() + 1, area()->viewport()->width());
+    frame->SendMessage(WM_COMMAND, ID_WINDOW_CASCADE);
+    settle();
+    EXPECT_NE(first->GetState()->widget()->y(), second->GetState()->widget()->y());
+}
+
+TEST_F(Mdi, OpenFilesAreActivatedInsteadOfOpenedTwice) {
+    write(file("x.tbrd"), std::string("\x02hi"));
+    CDocument* opened = AfxGetApp()->OpenDocumentFile(file("x.tbrd").c_str());
+    ASSERT_NE(opened, nullptr);
+    open();
+    EXPECT_EQ(AfxGetApp()->OpenDocumentFile(file("x.tbrd").c_str()), opened);
+    EXPECT_EQ(frame->MDIGetActive()->GetActiveDocument(), opened);
+    EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 2);
+}
+
+TEST_F(Mdi, MainFrameAsksForEachChangedDocument) {
+    open()->GetActiveDocument()->SetModifiedFlag();
+    open()->GetActiveDocument()->SetModifiedFlag();
+    {
+        BoxAnswer box("Cancel");
+        frame->SendMessage(WM_CLOSE);
+        EXPECT_EQ(box.texts.size(), 1U);
+        EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 2);
+    }
+    BoxAnswer box("No");
+    frame->SendMessage(WM_CLOSE);
+    EXPECT_EQ(box.texts, (std::vector<std::string>{"Save changes to Board1?", "Save changes to Board2?"}));
+    EXPECT_EQ(AfxGetApp()->m_pMainWnd, nullptr);
+    EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
+}
+
+TEST_F(Mdi, SystemMenuOfAChild) {
+    CMDIChildWnd* child = open();
+    auto* sub = qobject_cast<QMdiSubWindow*>(child->GetState()->widget());
+    QMenu* menu = sub->systemMenu();
+    ASSERT_NE(menu, nullptr);
+    menu->popup(QPoint(100, 100));
+    EXPECT_FALSE(itemOf(*menu, "Restore")->isEnabled());
+    clickItem(*menu, "Close");
+    EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
+}
+
+TEST_F(Mdi, ChildrenKnowWhereTheyGoBackTo) {
+    CMDIChildWnd* child = open();
+    child->MoveWindow(20, 30, 300, 200);
+    settle();
+    WINDOWPLACEMENT placement;
+    frame->MDIMaximize(child);
+    settle();
+    ASSERT_TRUE(child->GetWindowPlacement(&placement));
+    EXPECT_EQ(placement.showCmd, UINT{SW_SHOWMAXIMIZED});
+    EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(20, 30, 320, 230));
+    placement.rcNormalPosition = CRect(5, 6, 305, 206);
+    ASSERT_TRUE(child->SetWindowPlacement(&placement));
+    settle();
+    EXPECT_TRUE(child->IsZoomed());
+    frame->MDIRestore(child);
+    settle();
+    ASSERT_TRUE(child->GetWindowPlacement(&placement));
+    EXPECT_EQ(placement.showCmd, UINT{SW_SHOWNORMAL});
+    EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(5, 6, 305, 206));
+}

@@ -1,0 +1,157 @@
+#include "platform/afx/core/Menu.h"
+#include "platform/afx/core/detail/Menus.h"
+#include "tests/ui/afx/frames/FrameTesting.h"
+
+using namespace frametest;
+
+// --- the lists behind handles ---
+
+namespace {
+
+std::string textOf(HMENU menu, UINT item, UINT flags = MF_BYCOMMAND) {
+    char text[64];
+    GetMenuStringA(menu, item, text, sizeof(text), flags);
+    return text;
+}
+
+class MenuList : public testing::Test {
+protected:
+    void SetUp() override {
+        menu.LoadMenu(IDR_TESTMAIN);
+    }
+    CMenu menu;
+};
+
+} // namespace
+
+TEST_F(MenuList, HoldsWhatTheResourceSays) {
+    ASSERT_EQ(menu.GetMenuItemCount(), 3U);
+    EXPECT_EQ(textOf(menu, 0, MF_BYPOSITION), "&File");
+    EXPECT_EQ(textOf(menu, ID_FILE_NEW), "&New\tCtrl+N");
+    EXPECT_EQ(menu.GetMenuItemID(0), 0xFFFFFFFFU);
+    EXPECT_EQ(menu.GetSubMenu(0)->GetMenuItemID(2), 0U);
+    EXPECT_EQ(menu.GetSubMenu(0)->GetMenuState(2, MF_BYPOSITION), UINT{MF_SEPARATOR});
+    EXPECT_EQ(menu.GetMenuState(0, MF_BYPOSITION), (4U << 8U) | MF_POPUP);
+    EXPECT_FALSE(CMenu().LoadMenu(999));
+}
+
+TEST_F(MenuList, FindsCommandsInPopupsAndChangesThem) {
+    EXPECT_TRUE(menu.InsertMenu(ID_TEST_LARGE, MF_BYCOMMAND, 500, "Medium"));
+    const HMENU sizes = menu.GetSubMenu(1)->GetSubMenu(4)->m_hMenu;
+    EXPECT_EQ(GetMenuItemCount(sizes), 3);
+    EXPECT_EQ(GetMenuItemID(sizes, 1), 500U);
+    EXPECT_EQ(menu.EnableMenuItem(500, MF_GRAYED), UINT{MF_ENABLED});
+    EXPECT_EQ(menu.EnableMenuItem(500, MF_ENABLED), UINT{MF_GRAYED});
+    EXPECT_EQ(menu.CheckMenuItem(500, MF_CHECKED), UINT{MF_UNCHECKED});
+    EXPECT_EQ(menu.GetMenuState(500, MF_BYCOMMAND), UINT{MF_CHECKED});
+    EXPECT_EQ(menu.CheckMenuItem(999, MF_CHECKED), 0xFFFFFFFFU);
+    EXPECT_TRUE(menu.ModifyMenu(500, MF_BYCOMMAND, 501, "Middle"));
+    EXPECT_EQ(textOf(menu, 501), "Middle");
+    EXPECT_TRUE(menu.DeleteMenu(501, MF_BYCOMMAND));
+    EXPECT_FALSE(menu.DeleteMenu(501, MF_BYCOMMAND));
+}
+
+TEST_F(MenuList, OwnsItsPopups) {
+    const HMENU file = menu.GetSubMenu(0)->m_hMenu;
+    EXPECT_TRUE(menu.RemoveMenu(0, MF_BYPOSITION));
+    EXPECT_TRUE(IsMenu(file));
+    EXPECT_TRUE(menu.AppendMenu(MF_POPUP, reinterpret_cast<UINT_PTR>(file), "File"));
+    EXPECT_FALSE(AppendMenuA(file, MF_POPUP, reinterpret_cast<UINT_PTR>(menu.m_hMenu), "round and round"));
+    const HMENU whole = menu.m_hMenu;
+    EXPECT_TRUE(menu.DestroyMenu());
+    EXPECT_FALSE(IsMenu(file));
+    EXPECT_EQ(GetMenuItemCount(whole), -1);
+    EXPECT_FALSE(AppendMenuA(whole, MF_STRING, 1, "late"));
+}
+
+TEST_F(MenuList, CutsTextsBetweenCharacters) {
+    menu.ModifyMenu(ID_FILE_NEW, MF_BYCOMMAND, ID_FILE_NEW, "a\xC3\xA4z");
+    char text[4];
+    EXPECT_EQ(menu.GetMenuString(ID_FILE_NEW, text, 3, MF_BYCOMMAND), 1);
+    EXPECT_STREQ(text, "a");
+    EXPECT_EQ(menu.GetMenuString(ID_FILE_NEW, text, 4, MF_BYCOMMAND), 3);
+    EXPECT_EQ(menu.GetMenuString(ID_FILE_NEW, nullptr, 0, MF_BYCOMMAND), 4);
+}
+
+TEST(MenuText, AccessKey) {
+    EXPECT_EQ(tvx::afx::accessKey("&File"), U'f');
+    EXPECT_EQ(tvx::afx::accessKey("A && &B"), U'b');
+    EXPECT_EQ(tvx::afx::accessKey("Stra&\xC3\x9F"
+                                  "e"),
+              U'\u00DF');
+    EXPECT_EQ(tvx::afx::accessKey("None\t&Ctrl"), 0U);
+}
+
+// --- popups on the screen ---
+
+using ContextMenu = FrameTest;
+
+TEST_F(ContextMenu, AnswersOrSendsWhatIsChosen) {
+    NoteFrame& frame = openNote();
+    CMenu menu;
+    menu.LoadMenu(IDR_TESTCONTEXT);
+    CMenu* popup = menu.GetSubMenu(0);
+    later([] { clickItem(*openMenu(), "Draw"); });
+    EXPECT_EQ(popup->TrackPopupMenu(TPM_RETURNCMD, 20, 20, &frame), ID_TEST_DRAW);
+    settle();
+    EXPECT_FALSE(noted("draw"));
+
+    later([] {
+        EXPECT_FALSE(itemOf(*openMenu(), "Locked")->isEnabled()); // through the view's update handler
+        clickItem(*openMenu(), "Draw");
+    });
+    EXPECT_EQ(popup->TrackPopupMenu(TPM_LEFTALIGN, 20, 20, &frame), TRUE);
+    EXPECT_FALSE(noted("draw")) << "sent only after the menu is gone";
+    settle();
+    EXPECT_TRUE(noted("draw"));
+}
+
+TEST_F(ContextMenu, ClosesByEscapeAndByCancelMode) {
+    NoteFrame& frame = openNote();
+    CMenu menu;
+    menu.LoadMenu(IDR_TESTCONTEXT);
+    later([] { key(Qt::Key_Escape); });
+    EXPECT_EQ(menu.GetSubMenu(0)->TrackPopupMenu(TPM_RETURNCMD, 20, 20, &frame), 0);
+    later([&frame] { frame.SendMessage(WM_CANCELMODE); });
+    EXPECT_EQ(menu.GetSubMenu(0)->TrackPopupMenu(TPM_RETURNCMD, 20, 20, &frame), 0);
+    EXPECT_EQ(openMenu(), nullptr);
+}
+
+namespace {
+
+class ThrowingFrame : public CFrameWnd {
+public:
+    afx_msg void OnInitMenuPopup(CMenu*, UINT, BOOL) {
+        AfxThrowUserException();
+    }
+
+protected:
+    DECLARE_MESSAGE_MAP()
+};
+
+BEGIN_MESSAGE_MAP(ThrowingFrame, CFrameWnd)
+ON_WM_INITMENUPOPUP()
+END_MESSAGE_MAP()
+
+} // namespace
+
+TEST_F(ContextMenu, LetsExceptionsOfHandlersOut) {
+    auto* frame = new ThrowingFrame;
+    ASSERT_TRUE(frame->Create(nullptr, "throws"));
+    CMenu menu;
+    menu.LoadMenu(IDR_TESTCONTEXT);
+    EXPECT_THROW(menu.GetSubMenu(0)->TrackPopupMenu(TPM_LEFTALIGN, 0, 0, frame), CUserException*);
+    EXPECT_EQ(openMenu(), nullptr);
+    frame->DestroyWindow();
+}
+
+TEST_F(ContextMenu, SystemMenuIsTheWindowsOwn) {
+    NoteFrame& frame = openNote();
+    CMenu* menu = frame.GetSystemMenu(FALSE);
+    ASSERT_NE(menu, nullptr);
+    const UINT before = menu->GetMenuItemCount();
+    menu->AppendMenu(MF_STRING, 0x10, "About");
+    EXPECT_EQ(frame.GetSystemMenu(FALSE)->GetMenuItemCount(), before + 1);
+    frame.GetSystemMenu(TRUE);
+    EXPECT_EQ(frame.GetSystemMenu(FALSE)->GetMenuItemCount(), before);
+}
