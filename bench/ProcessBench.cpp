@@ -53,7 +53,7 @@ void startOurs(benchmark::State& state) {
         state.ResumeTiming();
     }
 }
-BENCHMARK(startOurs)->Unit(benchmark::kMicrosecond)->UseRealTime();
+BENCHMARK(startOurs)->Unit(benchmark::microsecond)->UseRealTime();
 
 void startCapturedOurs(benchmark::State& state) {
     growTo200Megabytes();
@@ -66,7 +66,7 @@ void startCapturedOurs(benchmark::State& state) {
         state.ResumeTiming();
     }
 }
-BENCHMARK(startCapturedOurs)->Unit(benchmark::kMicrosecond)->UseRealTime();
+BENCHMARK(startCapturedOurs)->Unit(benchmark::microsecond)->UseRealTime();
 
 void startPosixSpawn(benchmark::State& state) {
     growTo200Megabytes();
@@ -80,7 +80,7 @@ void startPosixSpawn(benchmark::State& state) {
         state.ResumeTiming();
     }
 }
-BENCHMARK(startPosixSpawn)->Unit(benchmark::kMicrosecond)->UseRealTime();
+BENCHMARK(startPosixSpawn)->Unit(benchmark::microsecond)->UseRealTime();
 
 void startToolkit(benchmark::State& state) {
     growTo200Megabytes();
@@ -93,7 +93,7 @@ void startToolkit(benchmark::State& state) {
         state.ResumeTiming();
     }
 }
-BENCHMARK(startToolkit)->Unit(benchmark::kMicrosecond)->UseRealTime();
+BENCHMARK(startToolkit)->Unit(benchmark::microsecond)->UseRealTime();
 
 // Draining 256 MiB. The range is 0 for small blocks ("head"), 1 for blocks of 1 MiB ("dd"), and 0 for one core, 1 for
 // two.
@@ -218,7 +218,7 @@ void drainToolkit(benchmark::State& state) {
 
 void placements(benchmark::internal::Benchmark* bench) {
     bench->ArgNames({"big", "other"})->ArgsProduct({{0, 1}, {0, 1}});
-    bench->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
+    bench->Unit(benchmark::millisecond)->UseRealTime()->Iterations(3);
 }
 BENCHMARK(drainOurs)->Apply(placements);
 BENCHMARK(drainLayer)->Apply(placements);

@@ -106,9 +106,9 @@ void manyNames(benchmark::State& state, const char* pattern) {
 template <typename Matcher>
 void longText(benchmark::State& state, const char* pattern, const std::string& text) {
     Matcher matcher(pattern);
-    const CString long_(text.c_str());
+    const CString longText(text.c_str());
     for (auto _ : state) {
-        benchmark::DoNotOptimize(matcher(long_));
+        benchmark::DoNotOptimize(matcher(longText));
     }
 }
 
@@ -116,18 +116,18 @@ template <typename Matcher>
 void add(const std::string& who) {
     for (const char* pattern : {"*.cpp", "*a*b*c*", "m?in*", "*xyz*"}) {
         benchmark::RegisterBenchmark((std::string(pattern) + '/' + who).c_str(), manyNames<Matcher>, pattern)
-            ->Unit(benchmark::kMicrosecond);
+            ->Unit(benchmark::microsecond);
     }
     const std::string many(10000, 'a');
     constexpr const char* attack = "*a*a*a*a*a*b";
     benchmark::RegisterBenchmark(("attack on a.../" + who).c_str(), longText<Matcher>, attack, many)
-        ->Unit(benchmark::kMicrosecond);
+        ->Unit(benchmark::microsecond);
     benchmark::RegisterBenchmark(("attack on ba.../" + who).c_str(), longText<Matcher>, attack, "b" + many)
-        ->Unit(benchmark::kMicrosecond);
+        ->Unit(benchmark::microsecond);
     benchmark::RegisterBenchmark(("*aaaaaaaab* on a.../" + who).c_str(), longText<Matcher>, "*aaaaaaaab*", many)
-        ->Unit(benchmark::kMicrosecond);
+        ->Unit(benchmark::microsecond);
     benchmark::RegisterBenchmark(("*a?a?a?b* on a.../" + who).c_str(), longText<Matcher>, "*a?a?a?b*", many)
-        ->Unit(benchmark::kMicrosecond);
+        ->Unit(benchmark::microsecond);
 }
 
 const bool added = [] {

@@ -31,29 +31,29 @@ public:
     }
 
     HANDLE add(Entry entry) {
-        const std::lock_guard lock(mutex_);
-        last_ += 4;
-        entries_.emplace(last_, std::move(entry));
-        return reinterpret_cast<HANDLE>(last_);
+        const std::lock_guard lock(m_mutex);
+        m_last += 4;
+        m_entries.emplace(m_last, std::move(entry));
+        return reinterpret_cast<HANDLE>(m_last);
     }
 
     Entry find(HANDLE handle) const {
-        const std::lock_guard lock(mutex_);
-        const auto found = entries_.find(reinterpret_cast<std::uintptr_t>(handle));
-        return found == entries_.end() ? Entry() : found->second;
+        const std::lock_guard lock(m_mutex);
+        const auto found = m_entries.find(reinterpret_cast<std::uintptr_t>(handle));
+        return found == m_entries.end() ? Entry() : found->second;
     }
 
     /// The entry comes back, so that its object ends outside the lock.
     Entry take(HANDLE handle) {
-        const std::lock_guard lock(mutex_);
-        auto node = entries_.extract(reinterpret_cast<std::uintptr_t>(handle));
+        const std::lock_guard lock(m_mutex);
+        auto node = m_entries.extract(reinterpret_cast<std::uintptr_t>(handle));
         return node ? std::move(node.mapped()) : Entry();
     }
 
 private:
-    mutable std::mutex mutex_;
-    std::unordered_map<std::uintptr_t, Entry> entries_;
-    std::uintptr_t last_ = 0;
+    mutable std::mutex m_mutex;
+    std::unordered_map<std::uintptr_t, Entry> m_entries;
+    std::uintptr_t m_last = 0;
 };
 
 using Clock = std::chrono::steady_clock;
@@ -67,28 +67,28 @@ timespec remaining(Clock::time_point deadline) {
 
 } // namespace
 
-Descriptor::Descriptor(int number) noexcept : number_(number) {
+Descriptor::Descriptor(int number) noexcept : m_number(number) {
     const bool misplaced = number >= 0 && number <= STDERR_FILENO;
     const int moved = misplaced ? ::fcntl(number, F_DUPFD_CLOEXEC, STDERR_FILENO + 1) : -1;
     if (moved >= 0) {
         ::close(number);
-        number_ = moved;
+        m_number = moved;
     }
 }
 
 Descriptor& Descriptor::operator=(Descriptor&& other) noexcept {
-    std::swap(number_, other.number_);
+    std::swap(m_number, other.m_number);
     return *this;
 }
 
 Descriptor::~Descriptor() {
-    if (number_ >= 0) {
-        ::close(number_);
+    if (m_number >= 0) {
+        ::close(m_number);
     }
 }
 
 int Descriptor::release() noexcept {
-    return std::exchange(number_, -1);
+    return std::exchange(m_number, -1);
 }
 
 short waitReadable(int descriptor, DWORD timeout) {

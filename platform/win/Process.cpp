@@ -33,21 +33,21 @@ public:
             return;
         }
         const HANDLE handles[] = {startup->hStdInput, startup->hStdOutput, startup->hStdError};
-        for (std::size_t index = 0; index < objects_.size(); ++index) {
+        for (std::size_t index = 0; index < m_objects.size(); ++index) {
             if (inherit && isInheritable(handles[index])) {
-                objects_[index] = objectOf<PipeObject>(handles[index]);
+                m_objects[index] = objectOf<PipeObject>(handles[index]);
             }
-            descriptors_[index] = objects_[index] ? objects_[index]->descriptor() : nullDevice;
+            m_descriptors[index] = m_objects[index] ? m_objects[index]->descriptor() : nullDevice;
         }
     }
 
     const std::array<int, 3>& descriptors() const {
-        return descriptors_;
+        return m_descriptors;
     }
 
 private:
-    std::array<std::shared_ptr<PipeObject>, 3> objects_;
-    std::array<int, 3> descriptors_{0, 1, 2};
+    std::array<std::shared_ptr<PipeObject>, 3> m_objects;
+    std::array<int, 3> m_descriptors{0, 1, 2};
 };
 
 Program findProgram(LPCSTR application, LPCSTR commandLine) {
@@ -62,23 +62,23 @@ Program findProgram(LPCSTR application, LPCSTR commandLine) {
 /// The words of a command line for the child, as `execve` takes them.
 class ChildArguments {
 public:
-    explicit ChildArguments(const Program& program) : words_{program.name} {
+    explicit ChildArguments(const Program& program) : m_words{program.name} {
         for (const std::string& word : splitArguments(program.arguments)) {
-            words_.push_back(wordForChild(word));
+            m_words.push_back(wordForChild(word));
         }
-        for (std::string& word : words_) {
-            pointers_.push_back(word.data());
+        for (std::string& word : m_words) {
+            m_pointers.push_back(word.data());
         }
-        pointers_.push_back(nullptr);
+        m_pointers.push_back(nullptr);
     }
 
     char* const* block() const {
-        return pointers_.data();
+        return m_pointers.data();
     }
 
 private:
-    std::vector<std::string> words_;
-    std::vector<char*> pointers_;
+    std::vector<std::string> m_words;
+    std::vector<char*> m_pointers;
 };
 
 StartShow showState(const STARTUPINFOA* startup) {

@@ -13,7 +13,7 @@ IMPLEMENT_DYNAMIC(CDockState, CObject)
 namespace {
 
 /// Damaged counts must not keep the start waiting.
-constexpr int kMostBars = AFX_IDW_CONTROLBAR_LAST - AFX_IDW_CONTROLBAR_FIRST + 1;
+constexpr int mostBars = AFX_IDW_CONTROLBAR_LAST - AFX_IDW_CONTROLBAR_FIRST + 1;
 
 std::optional<int> readNumber(const CString& section, LPCSTR entry) {
     CWinApp* app = AfxGetApp();
@@ -91,7 +91,7 @@ void CDockState::Clear() {
 void CDockState::LoadState(LPCSTR profileName) {
     Clear();
     const int count = readNumber(summarySection(profileName), "Bars").value_or(0);
-    if (count < 0 || count > kMostBars) {
+    if (count < 0 || count > mostBars) {
         return;
     }
     for (int i = 0; i < count; ++i) {

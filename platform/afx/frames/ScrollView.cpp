@@ -21,9 +21,9 @@ const SIZE CScrollView::sizeDefault = {0, 0};
 namespace {
 
 /// Stands in m_mapMode for a drawing that is scaled to the view.
-constexpr int kScaleToFit = -1;
+constexpr int scaleToFit = -1;
 /// Lines that one notch of the wheel scrolls.
-constexpr int kWheelLines = 3;
+constexpr int wheelLines = 3;
 
 } // namespace
 
@@ -63,7 +63,7 @@ void CScrollView::SetScrollSizes(int mapMode, SIZE total, const SIZE& page, cons
 }
 
 void CScrollView::SetScaleToFitSize(SIZE total) {
-    m_mapMode = kScaleToFit;
+    m_mapMode = scaleToFit;
     m_totalLog = total;
     m_position = CPoint(0, 0);
     if (m_hWnd) {
@@ -76,7 +76,7 @@ void CScrollView::SetScaleToFitSize(SIZE total) {
 }
 
 void CScrollView::OnPrepareDC(CDC* dc, CPrintInfo*) {
-    if (m_mapMode == kScaleToFit) {
+    if (m_mapMode == scaleToFit) {
         dc->SetMapMode(MM_ANISOTROPIC);
         dc->SetWindowExt(m_totalLog);
         dc->SetViewportExt(m_totalDev);
@@ -93,7 +93,7 @@ CPoint CScrollView::GetDeviceScrollPosition() const {
 }
 
 CPoint CScrollView::GetScrollPosition() const {
-    if (m_mapMode == kScaleToFit || m_mapMode == 0) {
+    if (m_mapMode == scaleToFit || m_mapMode == 0) {
         return {0, 0};
     }
     CPoint point = m_position;
@@ -115,7 +115,7 @@ void CScrollView::GetDeviceScrollSizes(int& mapMode, SIZE& total, SIZE& page, SI
 }
 
 void CScrollView::ScrollToPosition(POINT point) {
-    if (m_mapMode == kScaleToFit || m_mapMode == 0) {
+    if (m_mapMode == scaleToFit || m_mapMode == 0) {
         return;
     }
     CClientDC dc(nullptr);
@@ -131,7 +131,7 @@ CPoint CScrollView::limits() const {
 }
 
 void CScrollView::UpdateBars() {
-    if (m_mapMode == kScaleToFit || m_updatingBars) {
+    if (m_mapMode == scaleToFit || m_updatingBars) {
         return;
     }
     m_updatingBars = true; // showing a bar changes the size of the view
@@ -269,8 +269,8 @@ BOOL CScrollView::OnMouseWheel(UINT flags, short delta, CPoint point) {
         return CView::OnMouseWheel(flags, delta, point);
     }
     m_wheelRest += delta; // fine wheels send parts of a notch
-    const int lines = m_wheelRest * kWheelLines / WHEEL_DELTA;
-    m_wheelRest -= lines * WHEEL_DELTA / kWheelLines;
+    const int lines = m_wheelRest * wheelLines / WHEEL_DELTA;
+    m_wheelRest -= lines * WHEEL_DELTA / wheelLines;
     if (OnScrollBy(CSize(0, -lines * m_lineDev.cy))) {
         UpdateWindow();
     }
@@ -315,7 +315,7 @@ void CScrollView::OnKeyDown(UINT key, UINT repeat, UINT flags) {
 
 void CScrollView::OnSize(UINT type, int cx, int cy) {
     CView::OnSize(type, cx, cy);
-    if (m_mapMode == kScaleToFit) {
+    if (m_mapMode == scaleToFit) {
         SetScaleToFitSize(m_totalLog);
     } else if (m_mapMode != 0) {
         UpdateBars();
@@ -329,7 +329,7 @@ void CScrollView::ResizeParentToFit(BOOL shrinkOnly) {
     if (!frame || m_mapMode == 0) {
         return;
     }
-    CSize wanted = m_mapMode == kScaleToFit ? m_totalLog : m_totalDev;
+    CSize wanted = m_mapMode == scaleToFit ? m_totalLog : m_totalDev;
     if (shrinkOnly) {
         wanted.cx = std::min<LONG>(wanted.cx, client.Width());
         wanted.cy = std::min<LONG>(wanted.cy, client.Height());

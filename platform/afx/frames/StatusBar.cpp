@@ -24,9 +24,9 @@ END_MESSAGE_MAP()
 
 namespace {
 
-constexpr DWORD kBarStyles = 0x0040FFFF;
+constexpr DWORD barStyles = 0x0040FFFF;
 /// Frame and space around a pane's text, both sides.
-constexpr int kPaneBorder = 10;
+constexpr int paneBorder = 10;
 
 QStatusBar* barOf(const CWnd& bar) {
     const Window* state = bar.GetState();
@@ -59,8 +59,8 @@ BOOL CStatusBar::Create(CWnd* parent, DWORD style, UINT id) {
 }
 
 BOOL CStatusBar::CreateEx(CWnd* parent, DWORD, DWORD style, UINT id) {
-    SetBarStyle(style & kBarStyles);
-    return CWnd::CreateEx(0, "msctls_statusbar32", nullptr, (style & ~kBarStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent,
+    SetBarStyle(style & barStyles);
+    return CWnd::CreateEx(0, "msctls_statusbar32", nullptr, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent,
                           id);
 }
 
@@ -103,7 +103,7 @@ void CStatusBar::rebuild() {
             const bool stretch = (pane.style & SBPS_STRETCH) != 0;
             widget->addWidget(label, stretch ? 1 : 0);
             if (!stretch) {
-                label->setFixedWidth(pane.width + kPaneBorder);
+                label->setFixedWidth(pane.width + paneBorder);
             }
         }
     });

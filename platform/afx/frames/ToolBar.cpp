@@ -27,11 +27,11 @@ END_MESSAGE_MAP()
 namespace {
 
 /// The bits of a creation style that are the bar's, not the window's.
-constexpr DWORD kBarStyles = 0x0040FFFF;
+constexpr DWORD barStyles = 0x0040FFFF;
 /// Space around a picture in a button.
-constexpr int kButtonMargin = 7;
+constexpr int buttonMargin = 7;
 /// Separators from this width on make room for a control.
-constexpr int kPlaceholderWidth = 9;
+constexpr int placeholderWidth = 9;
 
 QToolBar* toolsOf(const CWnd& bar) {
     const Window* state = bar.GetState();
@@ -64,10 +64,10 @@ BOOL CToolBar::Create(CWnd* parent, DWORD style, UINT id) {
 }
 
 BOOL CToolBar::CreateEx(CWnd* parent, DWORD, DWORD style, CRect, UINT id) {
-    SetBarStyle(style & kBarStyles);
+    SetBarStyle(style & barStyles);
     CString name;
     name.LoadString(id);
-    return CWnd::CreateEx(0, "ToolbarWindow32", name, (style & ~kBarStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent, id);
+    return CWnd::CreateEx(0, "ToolbarWindow32", name, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent, id);
 }
 
 void CToolBar::OnDestroy() {
@@ -88,7 +88,7 @@ BOOL CToolBar::LoadToolBar(LPCSTR name) {
     if (!bitmap) {
         return FALSE;
     }
-    SetSizes(CSize(bar->buttonWidth + kButtonMargin, bar->buttonHeight + kButtonMargin),
+    SetSizes(CSize(bar->buttonWidth + buttonMargin, bar->buttonHeight + buttonMargin),
              CSize(bar->buttonWidth, bar->buttonHeight));
     SetBitmap(bitmap);
     m_ownBitmap = true;
@@ -160,7 +160,7 @@ void CToolBar::rebuild() {
         tools->clear();
         tools->setIconSize(QSize(m_imageSize.cx, m_imageSize.cy));
         for (const Button& button : m_buttons) {
-            if ((button.style & TBBS_SEPARATOR) != 0 && button.image < kPlaceholderWidth) {
+            if ((button.style & TBBS_SEPARATOR) != 0 && button.image < placeholderWidth) {
                 tools->addSeparator();
                 continue;
             }

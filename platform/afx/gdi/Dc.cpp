@@ -228,10 +228,10 @@ CBitmap* CDC::GetCurrentBitmap() const {
 namespace {
 
 int millimetres(int pixels) {
-    return scaled(std::int64_t{pixels} * 254, 1, kPixelsPerInch * 10);
+    return scaled(std::int64_t{pixels} * 254, 1, pixelsPerInch * 10);
 }
 
-constexpr int kRasterCapabilities = 0x2E99; // blits, stretched blits, bitmaps from bits, large bitmaps and fonts
+constexpr int rasterCapabilities = 0x2E99; // blits, stretched blits, bitmaps from bits, large bitmaps and fonts
 
 } // namespace
 
@@ -253,7 +253,7 @@ int GetDeviceCaps(HDC handle, int index) {
         return millimetres(GetSystemMetrics(SM_CYSCREEN));
     case LOGPIXELSX:
     case LOGPIXELSY:
-        return kPixelsPerInch;
+        return pixelsPerInch;
     case BITSPIXEL:
         return dc->target->format() == PixelFormat::monochrome ? 1 : 32;
     case PLANES:
@@ -261,7 +261,7 @@ int GetDeviceCaps(HDC handle, int index) {
     case NUMCOLORS:
         return dc->target->format() == PixelFormat::monochrome ? 2 : -1;
     case RASTERCAPS:
-        return kRasterCapabilities;
+        return rasterCapabilities;
     case ASPECTX:
     case ASPECTY:
         return 36;

@@ -227,7 +227,7 @@ void CDC::DrawFocusRect(const RECT* rect) {
     // Every second pixel by its place, so that the dots stay where they are when the frame grows.
     std::vector<QPoint> dots = framePixels(dc->state.mapping.toPixels(*rect), drawing.canvas.bounds());
     std::erase_if(dots, [](QPoint point) { return ((point.x() + point.y()) & 1) != 0; });
-    drawing.canvas.plot(dots, {kWhitePixel, Rop2::xorPen, nullptr, {}});
+    drawing.canvas.plot(dots, {whitePixel, Rop2::xorPen, nullptr, {}});
 }
 
 // Icons

@@ -61,9 +61,9 @@ void convertPixels(QImage& image, const DeviceContext& source, const DeviceConte
         return;
     }
     const bool expands = from == PixelFormat::monochrome;
-    const Pixel selected = expands ? kWhitePixel : pixelOf(source.state.backColor);
-    const Pixel yes = expands ? pixelOf(target.state.backColor) : kWhitePixel;
-    const Pixel no = expands ? pixelOf(target.state.textColor) : kBlackPixel;
+    const Pixel selected = expands ? whitePixel : pixelOf(source.state.backColor);
+    const Pixel yes = expands ? pixelOf(target.state.backColor) : whitePixel;
+    const Pixel no = expands ? pixelOf(target.state.textColor) : blackPixel;
     for (int y = 0; y < image.height(); ++y) {
         auto* row = reinterpret_cast<Pixel*>(image.scanLine(y));
         std::transform(row, row + image.width(), row, [&](Pixel pixel) { return pixel == selected ? yes : no; });

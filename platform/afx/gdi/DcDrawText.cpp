@@ -11,16 +11,16 @@ namespace {
 /// The state that DrawText changes for itself, put back at the end.
 class TextState {
 public:
-    explicit TextState(CDC& dc) : dc_(dc), align_(dc.SetTextAlign(TA_LEFT | TA_TOP)) {}
+    explicit TextState(CDC& dc) : m_dc(dc), m_align(dc.SetTextAlign(TA_LEFT | TA_TOP)) {}
     ~TextState() {
-        dc_.SetTextAlign(align_);
+        m_dc.SetTextAlign(m_align);
     }
     TextState(const TextState&) = delete;
     TextState& operator=(const TextState&) = delete;
 
 private:
-    CDC& dc_;
-    UINT align_;
+    CDC& m_dc;
+    UINT m_align;
 };
 
 int lineLeft(const RECT& rect, UINT format, int width) {
@@ -81,8 +81,8 @@ void drawLine(CDC& dc, const LayoutLine& line, const RECT& rect, UINT format, in
 
 /// The rectangle without numbers so large that sums with them would not fit.
 RECT pulledIn(const RECT& rect) {
-    static constexpr int kFar = 1 << 29;
-    const auto pull = [](int value) { return std::clamp(value, -kFar, kFar); };
+    static constexpr int farAway = 1 << 29;
+    const auto pull = [](int value) { return std::clamp(value, -farAway, farAway); };
     return {pull(rect.left), pull(rect.top), pull(rect.right), pull(rect.bottom)};
 }
 

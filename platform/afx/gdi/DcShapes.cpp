@@ -115,10 +115,10 @@ QRect shapeBox(const Shape& shape, const RECT& rect) {
 
 /// Shapes larger than this are drawn as polygons: going through all of their rows and pixels, of which few can be seen,
 /// would take too long.
-constexpr int kLargestByPixels = 1 << 14;
+constexpr int largestByPixels = 1 << 14;
 
 bool isLarge(const QRect& box) {
-    return std::max(box.width(), box.height()) > kLargestByPixels;
+    return std::max(box.width(), box.height()) > largestByPixels;
 }
 
 QPolygon roundedPolygon(const QRect& box, QSize corner) {
@@ -206,58 +206,58 @@ enum class ArcShape { arc, pie, chord };
 class ArcPixels {
 public:
     ArcPixels(const QRect& box, QPoint start, QPoint end, int direction)
-        : box_(box),
-          counterClockwise_(direction == AD_COUNTERCLOCKWISE),
-          start_(angle(start)),
-          sweep_(turn(start_, angle(end))) {
-        if (sweep_ == 0) {
-            sweep_ = 2 * std::numbers::pi;
+        : m_box(box),
+          m_counterClockwise(direction == AD_COUNTERCLOCKWISE),
+          m_start(angle(start)),
+          m_sweep(turn(m_start, angle(end))) {
+        if (m_sweep == 0) {
+            m_sweep = 2 * std::numbers::pi;
         }
     }
 
     /// The pixels in drawing order, from start to end.
     [[nodiscard]] QPolygon pixels() const {
-        if (isLarge(box_)) {
+        if (isLarge(m_box)) {
             return corners();
         }
-        std::vector<QPoint> all = outlineOf(ellipseSpans(box_));
-        std::erase_if(all, [&](QPoint point) { return turn(start_, angle(point)) > sweep_; });
-        std::ranges::sort(all, {}, [&](QPoint point) { return turn(start_, angle(point)); });
+        std::vector<QPoint> all = outlineOf(ellipseSpans(m_box));
+        std::erase_if(all, [&](QPoint point) { return turn(m_start, angle(point)) > m_sweep; });
+        std::ranges::sort(all, {}, [&](QPoint point) { return turn(m_start, angle(point)); });
         return QPolygon(QList<QPoint>(all.begin(), all.end()));
     }
     [[nodiscard]] QPoint centre() const {
-        return box_.center();
+        return m_box.center();
     }
 
 private:
     /// Corners of a polygon that stands for a large ellipse's pixels.
     [[nodiscard]] QPolygon corners() const {
-        constexpr int kCorners = 4096;
+        constexpr int cornerCount = 4096;
         QPolygon result;
-        for (int i = 0; i <= kCorners; ++i) {
-            const double direction = start_ + (counterClockwise_ ? -1 : 1) * sweep_ * i / kCorners;
-            const double x = box_.left() + (box_.width() - 1) * (1 + std::cos(direction)) / 2;
-            const double y = box_.top() + (box_.height() - 1) * (1 + std::sin(direction)) / 2;
+        for (int i = 0; i <= cornerCount; ++i) {
+            const double direction = m_start + (m_counterClockwise ? -1 : 1) * m_sweep * i / cornerCount;
+            const double x = m_box.left() + (m_box.width() - 1) * (1 + std::cos(direction)) / 2;
+            const double y = m_box.top() + (m_box.height() - 1) * (1 + std::sin(direction)) / 2;
             result << QPoint(static_cast<int>(std::lround(x)), static_cast<int>(std::lround(y)));
         }
         return result;
     }
     /// Direction of a point in a picture where the ellipse is a circle: 0 right, growing clockwise.
     [[nodiscard]] double angle(QPoint point) const {
-        const double x = 2.0 * (point.x() - box_.left()) + 1 - box_.width();
-        const double y = 2.0 * (point.y() - box_.top()) + 1 - box_.height();
-        return std::atan2(y / box_.height(), x / box_.width());
+        const double x = 2.0 * (point.x() - m_box.left()) + 1 - m_box.width();
+        const double y = 2.0 * (point.y() - m_box.top()) + 1 - m_box.height();
+        return std::atan2(y / m_box.height(), x / m_box.width());
     }
     /// How far it is from one direction to another, in the direction of drawing: 0 .. 2 pi.
     [[nodiscard]] double turn(double from, double to) const {
-        const double turned = counterClockwise_ ? from - to : to - from;
+        const double turned = m_counterClockwise ? from - to : to - from;
         return turned < 0 ? turned + 2 * std::numbers::pi : turned;
     }
 
-    QRect box_;
-    bool counterClockwise_;
-    double start_;
-    double sweep_;
+    QRect m_box;
+    bool m_counterClockwise;
+    double m_start;
+    double m_sweep;
 };
 
 /// A polygon over pixels is filled as the area between the pixels' centres; its outline covers the rest.

@@ -253,8 +253,8 @@ void convert(HDC handle, SizeConversion conversion, SIZE* size) {
     }
 }
 
-constexpr Conversion kToDevice = &Mapping::toDevice;
-constexpr Conversion kToLogical = &Mapping::toLogical;
+constexpr Conversion toDevice = &Mapping::toDevice;
+constexpr Conversion toLogical = &Mapping::toLogical;
 
 std::span<POINT> pointSpan(POINT* points, int count) {
     return points && count > 0 ? std::span(points, static_cast<std::size_t>(count)) : std::span<POINT>();
@@ -263,11 +263,11 @@ std::span<POINT> pointSpan(POINT* points, int count) {
 } // namespace
 
 void CDC::LPtoDP(POINT* points, int count) const {
-    convert(m_hDC, kToDevice, pointSpan(points, count));
+    convert(m_hDC, toDevice, pointSpan(points, count));
 }
 
 void CDC::LPtoDP(RECT* rect) const {
-    convert(m_hDC, kToDevice, rect);
+    convert(m_hDC, toDevice, rect);
 }
 
 void CDC::LPtoDP(SIZE* size) const {
@@ -275,11 +275,11 @@ void CDC::LPtoDP(SIZE* size) const {
 }
 
 void CDC::DPtoLP(POINT* points, int count) const {
-    convert(m_hDC, kToLogical, pointSpan(points, count));
+    convert(m_hDC, toLogical, pointSpan(points, count));
 }
 
 void CDC::DPtoLP(RECT* rect) const {
-    convert(m_hDC, kToLogical, rect);
+    convert(m_hDC, toLogical, rect);
 }
 
 void CDC::DPtoLP(SIZE* size) const {
@@ -328,8 +328,8 @@ namespace {
 
 /// A region that no target reaches beyond: what clipping starts from.
 QRegion everything() {
-    constexpr int kFar = 1 << 24;
-    return QRect(QPoint(-kFar, -kFar), QPoint(kFar, kFar));
+    constexpr int farAway = 1 << 24;
+    return QRect(QPoint(-farAway, -farAway), QPoint(farAway, farAway));
 }
 
 int clipBy(HDC handle, const QRegion& region, int mode) {

@@ -188,7 +188,7 @@ BOOL GetTextMetricsA(HDC handle, TEXTMETRICA* metrics) {
     metrics->tmAveCharWidth = wide(averageWidth(device));
     metrics->tmMaxCharWidth = wide(device.maxWidth());
     metrics->tmWeight = asked.lfWeight > 0 ? asked.lfWeight : FW_NORMAL;
-    metrics->tmDigitizedAspectX = metrics->tmDigitizedAspectY = kPixelsPerInch;
+    metrics->tmDigitizedAspectX = metrics->tmDigitizedAspectY = pixelsPerInch;
     metrics->tmFirstChar = metrics->tmBreakChar = ' ';
     metrics->tmLastChar = 0xFF;
     metrics->tmDefaultChar = '?';
@@ -234,8 +234,8 @@ int CDC::GetTextFace(int count, LPSTR name) const {
 BOOL CDC::GetCharWidth(UINT first, UINT last, int* widths) const {
     const auto dc = findContext(m_hDC);
     const auto font = dc ? dc->font() : nullptr;
-    constexpr UINT kLastCodePoint = 0x10FFFF;
-    if (!font || !widths || last < first || last > kLastCodePoint) {
+    constexpr UINT lastCodePoint = 0x10FFFF;
+    if (!font || !widths || last < first || last > lastCodePoint) {
         return FALSE;
     }
     for (UINT code = first; code <= last; ++code) {
@@ -257,7 +257,7 @@ CSize layOutTabs(CDC& dc, std::string_view text, int tabCount, const int* tabs, 
         return {};
     }
     const TabStops stops(tabCount, tabs, metrics.tmAveCharWidth);
-    const int start = output ? std::clamp(distance(origin, output->x), -kFarthestPixel, kFarthestPixel) : 0;
+    const int start = output ? std::clamp(distance(origin, output->x), -farthestPixel, farthestPixel) : 0;
     int x = 0;
     for (std::size_t at = 0; at <= text.size();) {
         const std::size_t end = std::min(text.find('\t', at), text.size());

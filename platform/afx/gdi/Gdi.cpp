@@ -246,7 +246,7 @@ BOOL CFont::CreatePointFontIndirect(const LOGFONT* description, CDC* dc) {
         return FALSE;
     }
     LOGFONT font = *description;
-    const int pixels = scaled(description->lfHeight, kPixelsPerInch, 720);
+    const int pixels = scaled(description->lfHeight, pixelsPerInch, 720);
     const auto context = findContext(dc ? dc->m_hDC : nullptr);
     font.lfHeight = -(context ? context->state.mapping.sizeToLogical({0, pixels}).height() : std::abs(pixels));
     return CreateFontIndirect(&font);

@@ -22,14 +22,14 @@ void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {
     const auto* pixels = reinterpret_cast<const Pixel*>(bitmap.image.constScanLine(y));
     if (bitmap.format == PixelFormat::color) {
         for (int x = 0; x < bitmap.image.width(); ++x) {
-            const Pixel pixel = pixels[x] & ~kOpaque;
+            const Pixel pixel = pixels[x] & ~opaque;
             std::memcpy(bytes + 4 * x, &pixel, sizeof pixel);
         }
         return;
     }
     std::fill_n(bytes, rowBytes(bitmap), BYTE{0});
     for (int x = 0; x < bitmap.image.width(); ++x) {
-        if (pixels[x] == kWhitePixel) {
+        if (pixels[x] == whitePixel) {
             bytes[x / 8] |= static_cast<BYTE>(0x80 >> (x % 8));
         }
     }
@@ -39,10 +39,10 @@ void unpackRow(BitmapObject& bitmap, int y, const BYTE* bytes) {
     auto* pixels = reinterpret_cast<Pixel*>(bitmap.image.scanLine(y));
     for (int x = 0; x < bitmap.image.width(); ++x) {
         if (bitmap.format == PixelFormat::monochrome) {
-            pixels[x] = (bytes[x / 8] & (0x80 >> (x % 8))) ? kWhitePixel : kBlackPixel;
+            pixels[x] = (bytes[x / 8] & (0x80 >> (x % 8))) ? whitePixel : blackPixel;
         } else {
             std::memcpy(&pixels[x], bytes + 4 * x, sizeof(Pixel));
-            pixels[x] |= kOpaque;
+            pixels[x] |= opaque;
         }
     }
 }

@@ -51,8 +51,8 @@ QRect ordered(int left, int top, int right, int bottom) {
 
 /// Regions of other shapes than rectangles are kept row by row, and so only within reach of a screen.
 QRect screenReach() {
-    constexpr int kFar = 1 << 15;
-    return {QPoint(-kFar, -kFar), QPoint(kFar, kFar)};
+    constexpr int farAway = 1 << 15;
+    return {QPoint(-farAway, -farAway), QPoint(farAway, farAway)};
 }
 
 QRegion ellipseRegion(const QRect& box) {

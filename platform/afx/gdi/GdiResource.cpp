@@ -43,10 +43,10 @@ std::size_t pixelBytes(const BITMAPINFOHEADER& header) {
 bool understood(const BITMAPINFOHEADER& header) {
     const bool depth = header.biBitCount == 1 || header.biBitCount == 4 || header.biBitCount == 8 ||
                        header.biBitCount == 16 || header.biBitCount == 24 || header.biBitCount == 32;
-    constexpr LONG kLargest = 1 << 15;
+    constexpr LONG largest = 1 << 15;
     return header.biSize == sizeof(BITMAPINFOHEADER) && depth && header.biCompression == BI_RGB && header.biWidth > 0 &&
-           header.biWidth <= kLargest && header.biHeight != 0 && header.biHeight <= kLargest &&
-           header.biHeight >= -kLargest && header.biClrUsed <= 256;
+           header.biWidth <= largest && header.biHeight != 0 && header.biHeight <= largest &&
+           header.biHeight >= -largest && header.biClrUsed <= 256;
 }
 
 } // namespace
@@ -95,20 +95,20 @@ BOOL CBitmap::LoadBitmap(UINT id) {
 
 namespace {
 
-constexpr int kFirstPredefined = 32512;
+constexpr int firstPredefined = 32512;
 
 /// The desktop's own pictures for the predefined icons, in the order of their numbers.
-constexpr QStyle::StandardPixmap kPredefined[] = {
+constexpr QStyle::StandardPixmap predefinedPictures[] = {
     QStyle::SP_TitleBarMenuButton, QStyle::SP_MessageBoxCritical,    QStyle::SP_MessageBoxQuestion,
     QStyle::SP_MessageBoxWarning,  QStyle::SP_MessageBoxInformation,
 };
 
 HICON loadPredefined(LPCSTR name) {
-    const std::size_t index = reinterpret_cast<std::uintptr_t>(name) - kFirstPredefined;
-    if (index >= std::size(kPredefined) || !ensureGui()) {
+    const std::size_t index = reinterpret_cast<std::uintptr_t>(name) - firstPredefined;
+    if (index >= std::size(predefinedPictures) || !ensureGui()) {
         return nullptr;
     }
-    const QIcon icon = QApplication::style()->standardIcon(kPredefined[index]);
+    const QIcon icon = QApplication::style()->standardIcon(predefinedPictures[index]);
     const int size = GetSystemMetrics(SM_CXICON);
     return addIcon(icon.pixmap(QSize(size, size), 1.0).toImage());
 }

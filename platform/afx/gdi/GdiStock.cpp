@@ -12,8 +12,8 @@ using namespace tvx::afx;
 
 namespace {
 
-constexpr int kStockCount = DEFAULT_GUI_FONT + 1;
-using StockTable = std::array<HGDIOBJ, kStockCount>;
+constexpr int stockCount = DEFAULT_GUI_FONT + 1;
+using StockTable = std::array<HGDIOBJ, stockCount>;
 
 HGDIOBJ stockBrush(UINT style, COLORREF color) {
     BrushObject brush;
@@ -41,17 +41,17 @@ StockTable makeStock() {
     table[WHITE_PEN] = stockPen(PS_SOLID, RGB(255, 255, 255));
     table[BLACK_PEN] = stockPen(PS_SOLID, RGB(0, 0, 0));
     table[NULL_PEN] = stockPen(PS_NULL, 0);
-    constexpr int kPoints = 80;
-    constexpr BYTE kFixed = FIXED_PITCH | FF_MODERN;
-    constexpr BYTE kVariable = VARIABLE_PITCH | FF_SWISS;
-    table[OEM_FIXED_FONT] = stockFont(pointFont(90, "Terminal"), kFixed);
-    table[ANSI_FIXED_FONT] = stockFont(pointFont(90, "Courier"), kFixed);
-    table[SYSTEM_FIXED_FONT] = stockFont(pointFont(90, "FixedSys"), kFixed);
-    table[ANSI_VAR_FONT] = stockFont(pointFont(kPoints, "MS Sans Serif"), kVariable);
-    table[DEFAULT_GUI_FONT] = stockFont(pointFont(kPoints, "MS Shell Dlg"), kVariable);
-    LOGFONT system = pointFont(kPoints, "System");
+    constexpr int points = 80;
+    constexpr BYTE fixedPitch = FIXED_PITCH | FF_MODERN;
+    constexpr BYTE variable = VARIABLE_PITCH | FF_SWISS;
+    table[OEM_FIXED_FONT] = stockFont(pointFont(90, "Terminal"), fixedPitch);
+    table[ANSI_FIXED_FONT] = stockFont(pointFont(90, "Courier"), fixedPitch);
+    table[SYSTEM_FIXED_FONT] = stockFont(pointFont(90, "FixedSys"), fixedPitch);
+    table[ANSI_VAR_FONT] = stockFont(pointFont(points, "MS Sans Serif"), variable);
+    table[DEFAULT_GUI_FONT] = stockFont(pointFont(points, "MS Shell Dlg"), variable);
+    LOGFONT system = pointFont(points, "System");
     system.lfHeight = 16;
-    table[SYSTEM_FONT] = stockFont(system, kVariable);
+    table[SYSTEM_FONT] = stockFont(system, variable);
     table[DEVICE_DEFAULT_FONT] = table[SYSTEM_FONT];
     return table;
 }
@@ -60,7 +60,7 @@ StockTable makeStock() {
 
 HGDIOBJ GetStockObject(int index) {
     static const StockTable table = makeStock();
-    return index >= 0 && index < kStockCount ? table[static_cast<std::size_t>(index)] : nullptr;
+    return index >= 0 && index < stockCount ? table[static_cast<std::size_t>(index)] : nullptr;
 }
 
 namespace {
@@ -76,7 +76,7 @@ constexpr PaletteColor active(QPalette::ColorRole role) {
 
 /// Where each system colour is found in the toolkit's palette, so that what hosts draw fits the controls beside it. A
 /// caption is drawn in the highlight colours while active and in window colours while not.
-constexpr PaletteColor kSystemColors[] = {
+constexpr PaletteColor systemColors[] = {
     active(QPalette::Button),               // COLOR_SCROLLBAR
     active(QPalette::Dark),                 // COLOR_BACKGROUND
     active(QPalette::Highlight),            // COLOR_ACTIVECAPTION
@@ -107,7 +107,7 @@ constexpr PaletteColor kSystemColors[] = {
 };
 
 bool isSystemColor(int index) {
-    return index >= 0 && index < static_cast<int>(std::size(kSystemColors));
+    return index >= 0 && index < static_cast<int>(std::size(systemColors));
 }
 
 } // namespace
@@ -116,7 +116,7 @@ COLORREF GetSysColor(int index) {
     if (!isSystemColor(index)) {
         return 0;
     }
-    const PaletteColor& place = kSystemColors[index];
+    const PaletteColor& place = systemColors[index];
     const QColor color =
         (ensureGui() ? QApplication::palette() : QPalette(QColor(0xEF, 0xEF, 0xEF))).color(place.group, place.role);
     return RGB(color.red(), color.green(), color.blue());
@@ -124,7 +124,7 @@ COLORREF GetSysColor(int index) {
 
 HBRUSH GetSysColorBrush(int index) {
     static const auto brushes = [] {
-        std::array<HGDIOBJ, std::size(kSystemColors)> table{};
+        std::array<HGDIOBJ, std::size(systemColors)> table{};
         for (std::size_t i = 0; i < table.size(); ++i) {
             BrushObject brush;
             brush.description = {static_cast<UINT>(BS_SOLID), GetSysColor(static_cast<int>(i)), 0};

@@ -44,7 +44,7 @@ ChildEnvironment::ChildEnvironment(StartShow show) {
     const std::vector<std::string> changed = bundleVariables();
     for (char** variable = environ; variable && *variable; ++variable) {
         if (isKept(*variable, changed)) {
-            block_.push_back(*variable);
+            m_block.push_back(*variable);
         }
     }
     for (const std::string& name : changed) {
@@ -55,12 +55,12 @@ ChildEnvironment::ChildEnvironment(StartShow show) {
     if (show == StartShow::hidden) {
         add(std::string(startHidden) + "=1");
     }
-    block_.push_back(nullptr);
+    m_block.push_back(nullptr);
 }
 
 void ChildEnvironment::add(std::string variable) {
-    own_.push_back(std::move(variable));
-    block_.push_back(own_.back().data());
+    m_own.push_back(std::move(variable));
+    m_block.push_back(m_own.back().data());
 }
 
 StartShow askedStartShow() {

@@ -21,14 +21,14 @@ public:
 
     /// As `execve` takes it.
     char* const* block() const {
-        return block_.data();
+        return m_block.data();
     }
 
 private:
     void add(std::string variable);
 
-    std::deque<std::string> own_;
-    std::vector<char*> block_;
+    std::deque<std::string> m_own;
+    std::vector<char*> m_block;
 };
 
 /// How this process was asked to show its first window when it was started.

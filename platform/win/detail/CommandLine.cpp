@@ -26,15 +26,15 @@ bool hasFolder(std::string_view name) {
 /// Reads words one after the other.
 class WordReader {
 public:
-    explicit WordReader(std::string_view text) : text_(text) {}
+    explicit WordReader(std::string_view text) : m_text(text) {}
 
     /// False at the end.
     bool next(std::string& word) {
-        at_ = std::min(text_.find_first_not_of(blanks, at_), text_.size());
+        m_at = std::min(m_text.find_first_not_of(blanks, m_at), m_text.size());
         word.clear();
         bool quoted = false;
-        const bool found = at_ < text_.size();
-        while (at_ < text_.size() && (quoted || !isBlank(text_[at_]))) {
+        const bool found = m_at < m_text.size();
+        while (m_at < m_text.size() && (quoted || !isBlank(m_text[m_at]))) {
             take(word, quoted);
         }
         return found;
@@ -42,29 +42,29 @@ public:
 
 private:
     void take(std::string& word, bool& quoted) {
-        const std::size_t slashes = std::min(text_.find_first_not_of('\\', at_), text_.size()) - at_;
-        const bool beforeQuote = at_ + slashes < text_.size() && text_[at_ + slashes] == '"';
+        const std::size_t slashes = std::min(m_text.find_first_not_of('\\', m_at), m_text.size()) - m_at;
+        const bool beforeQuote = m_at + slashes < m_text.size() && m_text[m_at + slashes] == '"';
         word.append(beforeQuote ? slashes / 2 : slashes, '\\');
-        at_ += slashes;
+        m_at += slashes;
         if (beforeQuote) {
             takeQuote(word, quoted, slashes % 2 != 0);
         } else if (slashes == 0) {
-            word += text_[at_++];
+            word += m_text[m_at++];
         }
     }
 
     void takeQuote(std::string& word, bool& quoted, bool ordinary) {
-        const bool twice = quoted && !ordinary && text_.substr(at_ + 1).starts_with('"');
+        const bool twice = quoted && !ordinary && m_text.substr(m_at + 1).starts_with('"');
         if (ordinary || twice) {
             word += '"';
         } else {
             quoted = !quoted;
         }
-        at_ += twice ? 2 : 1;
+        m_at += twice ? 2 : 1;
     }
 
-    std::string_view text_;
-    std::size_t at_ = 0;
+    std::string_view m_text;
+    std::size_t m_at = 0;
 };
 
 bool isAbsolute(std::string_view name) {

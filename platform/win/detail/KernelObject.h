@@ -18,21 +18,21 @@ public:
     /// Takes over what the system has just made; -1 is none. In a process that was started without standard descriptors
     /// it may have got the place of one of them, which others will write to or replace: then it moves away from there.
     explicit Descriptor(int number) noexcept;
-    Descriptor(Descriptor&& other) noexcept : number_(other.release()) {}
+    Descriptor(Descriptor&& other) noexcept : m_number(other.release()) {}
     Descriptor& operator=(Descriptor&& other) noexcept;
     ~Descriptor();
 
     int number() const noexcept {
-        return number_;
+        return m_number;
     }
     explicit operator bool() const noexcept {
-        return number_ >= 0;
+        return m_number >= 0;
     }
     /// Gives the descriptor up without closing it.
     int release() noexcept;
 
 private:
-    int number_ = -1;
+    int m_number = -1;
 };
 
 /// Waits until a descriptor is readable or its other end is closed, without being woken by signals.
@@ -43,17 +43,17 @@ TVX_PLATFORM_API short waitReadable(int descriptor, DWORD timeout);
 /// A process or an end of a pipe. It is signalled while its descriptor is readable. Any thread may use it.
 class KernelObject {
 public:
-    explicit KernelObject(Descriptor descriptor) noexcept : descriptor_(std::move(descriptor)) {}
+    explicit KernelObject(Descriptor descriptor) noexcept : m_descriptor(std::move(descriptor)) {}
     virtual ~KernelObject() = default;
     KernelObject(const KernelObject&) = delete;
     KernelObject& operator=(const KernelObject&) = delete;
 
     int descriptor() const noexcept {
-        return descriptor_.number();
+        return m_descriptor.number();
     }
 
 protected:
-    Descriptor descriptor_;
+    Descriptor m_descriptor;
 };
 
 /// Whether a child may be given a handle as a standard handle.

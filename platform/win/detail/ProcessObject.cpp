@@ -53,44 +53,44 @@ DWORD exitCodeOf(const siginfo_t& status) {
 }
 
 ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
-    : KernelObject(std::move(process)), kinship_(kinship) {}
+    : KernelObject(std::move(process)), m_kinship(kinship) {}
 
 ProcessObject::~ProcessObject() {
-    if (kinship_ == Kinship::child && exitCode() == STILL_ACTIVE && !code_) {
-        ReleasedChildren::instance().add(std::move(descriptor_));
+    if (m_kinship == Kinship::child && exitCode() == STILL_ACTIVE && !m_code) {
+        ReleasedChildren::instance().add(std::move(m_descriptor));
     }
     ReleasedChildren::instance().collect();
 }
 
 DWORD ProcessObject::exitCode() {
-    const std::lock_guard lock(mutex_);
-    if (!code_ && hasEnded(descriptor())) {
-        code_ = collect();
+    const std::lock_guard lock(m_mutex);
+    if (!m_code && hasEnded(descriptor())) {
+        m_code = collect();
     }
-    return code_.value_or(STILL_ACTIVE);
+    return m_code.value_or(STILL_ACTIVE);
 }
 
 DWORD ProcessObject::collect() {
     siginfo_t status;
-    if (kinship_ == Kinship::stranger || !collectStatus(descriptor(), status)) {
+    if (m_kinship == Kinship::stranger || !collectStatus(descriptor(), status)) {
         return signalBase;
     }
     // A child that was faster than the order to end keeps its own code.
     const bool killed = status.si_code == CLD_KILLED && status.si_status == SIGKILL;
-    return killed && ordered_ ? *ordered_ : exitCodeOf(status);
+    return killed && m_ordered ? *m_ordered : exitCodeOf(status);
 }
 
 DWORD ProcessObject::terminate(DWORD code) {
-    const std::lock_guard lock(mutex_);
-    if (kinship_ == Kinship::stranger || code_ || hasEnded(descriptor())) {
+    const std::lock_guard lock(m_mutex);
+    if (m_kinship == Kinship::stranger || m_code || hasEnded(descriptor())) {
         return ERROR_ACCESS_DENIED;
     }
     if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0) {
         return errorFromErrno(errno);
     }
     // The first order is the one that ends the child.
-    if (!ordered_) {
-        ordered_ = code;
+    if (!m_ordered) {
+        m_ordered = code;
     }
     return ERROR_SUCCESS;
 }
@@ -100,19 +100,19 @@ ReleasedChildren& ReleasedChildren::instance() {
     return *children;
 }
 
-ReleasedChildren::ReleasedChildren() : bell_(::epoll_create1(EPOLL_CLOEXEC)) {}
+ReleasedChildren::ReleasedChildren() : m_bell(::epoll_create1(EPOLL_CLOEXEC)) {}
 
 void ReleasedChildren::add(Descriptor process) {
-    const std::lock_guard lock(mutex_);
+    const std::lock_guard lock(m_mutex);
     epoll_event event{EPOLLIN, {}};
     // Without the bell the child is still collected with the next start or release.
-    ::epoll_ctl(bell_.number(), EPOLL_CTL_ADD, process.number(), &event);
-    running_.push_back(std::move(process));
+    ::epoll_ctl(m_bell.number(), EPOLL_CTL_ADD, process.number(), &event);
+    m_running.push_back(std::move(process));
 }
 
 void ReleasedChildren::collect() {
-    const std::lock_guard lock(mutex_);
-    std::erase_if(running_, [](const Descriptor& process) {
+    const std::lock_guard lock(m_mutex);
+    std::erase_if(m_running, [](const Descriptor& process) {
         siginfo_t status;
         const bool ended = hasEnded(process.number());
         if (ended) {
@@ -123,8 +123,8 @@ void ReleasedChildren::collect() {
 }
 
 std::size_t ReleasedChildren::count() const {
-    const std::lock_guard lock(mutex_);
-    return running_.size();
+    const std::lock_guard lock(m_mutex);
+    return m_running.size();
 }
 
 } // namespace tvx::win

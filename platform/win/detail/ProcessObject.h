@@ -27,10 +27,10 @@ public:
 private:
     DWORD collect();
 
-    const Kinship kinship_;
-    std::mutex mutex_;
-    std::optional<DWORD> code_;    ///< once the end was seen
-    std::optional<DWORD> ordered_; ///< what the child is to report when it was killed
+    const Kinship m_kinship;
+    std::mutex m_mutex;
+    std::optional<DWORD> m_code;    ///< once the end was seen
+    std::optional<DWORD> m_ordered; ///< what the child is to report when it was killed
 };
 
 /// The platform's exit code for the status of an ended child.
@@ -49,15 +49,15 @@ public:
     std::size_t count() const;
     /// A descriptor that is readable while an ended child waits to be collected; -1 when the system gives none.
     int bell() const noexcept {
-        return bell_.number();
+        return m_bell.number();
     }
 
 private:
     ReleasedChildren();
 
-    mutable std::mutex mutex_;
-    std::vector<Descriptor> running_;
-    Descriptor bell_;
+    mutable std::mutex m_mutex;
+    std::vector<Descriptor> m_running;
+    Descriptor m_bell;
 };
 
 } // namespace tvx::win

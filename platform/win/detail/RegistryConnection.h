@@ -29,7 +29,7 @@ enum class Sql {
     begin,
     commit,
     rollback,
-    count_,
+    m_count,
 };
 
 /// One use of a prepared statement: arguments are bound in order, and the statement is free again when this ends.
@@ -110,7 +110,7 @@ private:
     sqlite3* m_database = nullptr;
     std::optional<Patience> m_patience; ///< of the wait that is going on
     const volatile std::uint32_t* m_log = nullptr;
-    std::array<sqlite3_stmt*, static_cast<std::size_t>(Sql::count_)> m_statements{};
+    std::array<sqlite3_stmt*, static_cast<std::size_t>(Sql::m_count)> m_statements{};
 };
 
 } // namespace tvx::registry

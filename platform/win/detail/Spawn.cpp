@@ -103,16 +103,16 @@ public:
     SignalsBlocked() {
         sigset_t all;
         ::sigfillset(&all);
-        ::pthread_sigmask(SIG_SETMASK, &all, &before_);
+        ::pthread_sigmask(SIG_SETMASK, &all, &m_before);
     }
     ~SignalsBlocked() {
-        ::pthread_sigmask(SIG_SETMASK, &before_, nullptr);
+        ::pthread_sigmask(SIG_SETMASK, &m_before, nullptr);
     }
     SignalsBlocked(const SignalsBlocked&) = delete;
     SignalsBlocked& operator=(const SignalsBlocked&) = delete;
 
 private:
-    sigset_t before_;
+    sigset_t m_before;
 };
 
 void collectFailed(int process) {

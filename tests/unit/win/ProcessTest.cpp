@@ -27,7 +27,7 @@ public:
     explicit Child(const std::string& line, const char* directory = nullptr, WORD show = 5) {
         const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
         HANDLE writeEnd = nullptr;
-        CreatePipe(&output_, &writeEnd, &inheritable, 0);
+        CreatePipe(&m_output, &writeEnd, &inheritable, 0);
         STARTUPINFOA startup;
         startup.dwFlags = STARTF_USESTDHANDLES | STARTF_USESHOWWINDOW;
         startup.wShowWindow = show;
@@ -40,7 +40,7 @@ public:
         CloseHandle(writeEnd);
     }
     ~Child() {
-        CloseHandle(output_);
+        CloseHandle(m_output);
         if (started) {
             CloseHandle(information.hProcess);
             CloseHandle(information.hThread);
@@ -61,7 +61,7 @@ public:
         std::string text;
         char buffer[4096];
         DWORD count = 0;
-        while (std::ranges::count(text, '\n') < lines && ReadFile(output_, buffer, sizeof buffer, &count, nullptr)) {
+        while (std::ranges::count(text, '\n') < lines && ReadFile(m_output, buffer, sizeof buffer, &count, nullptr)) {
             text.append(buffer, count);
         }
         return text;
@@ -79,7 +79,7 @@ public:
     PROCESS_INFORMATION information;
 
 private:
-    HANDLE output_ = nullptr;
+    HANDLE m_output = nullptr;
 };
 
 /// A shell command. It must not hold double quotes.

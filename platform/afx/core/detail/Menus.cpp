@@ -14,9 +14,9 @@ namespace tvx::afx {
 namespace {
 
 /// What a bare kind of item keeps of the flags it was made with.
-constexpr UINT kStateFlags = MF_GRAYED | MF_DISABLED | MF_CHECKED;
-constexpr UINT kKeptFlags = kStateFlags | MF_SEPARATOR | MF_OWNERDRAW | MF_MENUBREAK | MF_MENUBARBREAK | MF_HELP;
-constexpr UINT kNoItem = 0xFFFFFFFF;
+constexpr UINT stateFlags = MF_GRAYED | MF_DISABLED | MF_CHECKED;
+constexpr UINT keptFlags = stateFlags | MF_SEPARATOR | MF_OWNERDRAW | MF_MENUBREAK | MF_MENUBARBREAK | MF_HELP;
+constexpr UINT noItem = 0xFFFFFFFF;
 
 HandleTable<Menu>& menus() {
     static auto* table = new HandleTable<Menu>(9);
@@ -38,10 +38,10 @@ HMENU addMenu() {
 /// A popup's handle travels as the command; the calls of old took either.
 MenuItem makeItem(UINT flags, UINT_PTR id, LPCSTR text) {
     MenuItem item;
-    item.flags = flags & kKeptFlags;
+    item.flags = flags & keptFlags;
     if ((flags & MF_POPUP) != 0) {
         item.popup = reinterpret_cast<HMENU>(id);
-        item.id = kNoItem;
+        item.id = noItem;
     } else {
         item.id = static_cast<UINT>(id);
     }
@@ -194,7 +194,7 @@ BOOL IsMenu(HMENU menu) {
 // --- items ---
 
 BOOL AppendMenuA(HMENU menu, UINT flags, UINT_PTR id, LPCSTR text) {
-    return InsertMenuA(menu, kNoItem, flags | MF_BYPOSITION, id, text);
+    return InsertMenuA(menu, noItem, flags | MF_BYPOSITION, id, text);
 }
 
 BOOL InsertMenuA(HMENU handle, UINT position, UINT flags, UINT_PTR id, LPCSTR text) {
@@ -257,11 +257,11 @@ BOOL DeleteMenu(HMENU handle, UINT position, UINT flags) {
 
 namespace {
 
-/// Sets some of the state bits and answers the old ones, kNoItem when there is no such item.
+/// Sets some of the state bits and answers the old ones, noItem when there is no such item.
 UINT changeState(HMENU handle, UINT item, UINT flags, UINT mask) {
     const MenuPlace place = findItem(handle, item, flags);
     if (!place) {
-        return kNoItem;
+        return noItem;
     }
     UINT& state = place.item().flags;
     const UINT old = state & mask;
@@ -315,7 +315,7 @@ BOOL SetMenuDefaultItem(HMENU handle, UINT item, UINT byPosition) {
         place.item().isDefault = true;
     }
     tellMenuChanged(handle);
-    return place || item == kNoItem ? TRUE : FALSE;
+    return place || item == noItem ? TRUE : FALSE;
 }
 
 BOOL SetMenuItemBitmaps(HMENU menu, UINT position, UINT flags, HBITMAP unchecked, HBITMAP checked) {
@@ -339,7 +339,7 @@ int GetMenuItemCount(HMENU handle) {
 UINT GetMenuItemID(HMENU menu, int position) {
     const MenuPlace place = findItem(menu, static_cast<UINT>(position), MF_BYPOSITION);
     if (!place || place.item().popup) {
-        return kNoItem;
+        return noItem;
     }
     return place.item().isSeparator() ? 0 : place.item().id;
 }
@@ -347,7 +347,7 @@ UINT GetMenuItemID(HMENU menu, int position) {
 UINT GetMenuState(HMENU menu, UINT item, UINT flags) {
     const MenuPlace place = findItem(menu, item, flags);
     if (!place) {
-        return kNoItem;
+        return noItem;
     }
     const MenuItem& found = place.item();
     if (!found.popup) {

@@ -17,9 +17,9 @@ namespace {
 
 /// How long a window manager is given to do what it was asked, in milliseconds; how often it is asked, and how often
 /// its borders are looked for.
-constexpr int kLookBack = 150;
-constexpr int kAttempts = 3;
-constexpr int kLooks = 20;
+constexpr int lookBackTime = 150;
+constexpr int attempts = 3;
+constexpr int looks = 20;
 
 /// Wayland desktops keep the places of windows to themselves; what was asked for must not be lost over that.
 bool tellsPlaces() {
@@ -33,7 +33,7 @@ Placement::Placement(Window& window) : m_window(window) {
     m_settle.setInterval(0);
     QObject::connect(&m_settle, &QTimer::timeout, &m_settle, [this] { storing([this] { settle(); }); });
     m_lookBack.setSingleShot(true);
-    m_lookBack.setInterval(kLookBack);
+    m_lookBack.setInterval(lookBackTime);
     QObject::connect(&m_lookBack, &QTimer::timeout, &m_lookBack, [this] { storing([this] { lookBack(); }); });
 }
 
@@ -78,7 +78,7 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
         m_wish = Wish{rect, measured};
     } else if (isNormal()) {
         // What the desktop still tells of the place before does not count.
-        m_wish = Wish{rect, Measured::Frame, kAttempts};
+        m_wish = Wish{rect, Measured::Frame, attempts};
         m_lookBack.start();
     }
     const QMargins around = borders();
@@ -164,7 +164,7 @@ void Placement::grant() {
     if (awaitsBorders()) {
         // Borders that change nothing of the size inside come without an event.
         m_wish->looks++;
-        if (wish.looks < kLooks) {
+        if (wish.looks < looks) {
             m_lookBack.start();
         }
         return;
@@ -183,7 +183,7 @@ void Placement::lookBack() {
         return;
     }
     const bool done = !awaitsBorders() && m_wish->attempts > 0 && wishedFrame() == frameRect();
-    if (done || m_wish->attempts >= kAttempts) {
+    if (done || m_wish->attempts >= attempts) {
         m_wish.reset();
         remember();
     } else {
@@ -208,7 +208,7 @@ void Placement::remember() {
 namespace {
 
 /// Coordinates that no screen reaches, well inside what display servers take.
-constexpr int kFarthest = 30000;
+constexpr int farthest = 30000;
 
 bool showsEnough(const QRect& caption, const QRect& screen) {
     constexpr int graspable = 64;
@@ -247,7 +247,7 @@ QRect reachableFrame(const QRect& frame) {
     if (reachable || screens.isEmpty()) {
         return frame;
     }
-    const auto near = [](int at) { return std::clamp(at, -kFarthest, kFarthest); };
+    const auto near = [](int at) { return std::clamp(at, -farthest, farthest); };
     const QRect area = nearestWorkArea(QPoint(near(frame.left()), near(frame.top())));
     const QSize size = frame.size().boundedTo(area.size());
     return {std::clamp(frame.left(), area.left(), area.right() + 1 - size.width()),

@@ -21,7 +21,7 @@ QHash<const QWidget*, WindowSurface*>& surfaces() {
 
 } // namespace
 
-WindowSurface::WindowSurface(QWidget& window) : window_(window) {
+WindowSurface::WindowSurface(QWidget& window) : m_window(window) {
     QObject::connect(&window, &QObject::destroyed, this, [this, key = &window] {
         surfaces().remove(key);
         delete this;
@@ -38,96 +38,96 @@ WindowSurface& WindowSurface::of(const QWidget& widget) {
 }
 
 QImage* WindowSurface::storeImage() const {
-    return dynamic_cast<QImage*>(store_->paintDevice());
+    return dynamic_cast<QImage*>(m_store->paintDevice());
 }
 
 bool WindowSurface::isDirect(const QImage* image) const {
-    return image && image->depth() == 32 && image->devicePixelRatio() == 1 && window_.devicePixelRatio() == 1;
+    return image && image->depth() == 32 && image->devicePixelRatio() == 1 && m_window.devicePixelRatio() == 1;
 }
 
 QImage* WindowSurface::open(const QRect& wanted) {
-    QWindow* window = window_.windowHandle();
-    store_ = window_.backingStore();
-    if (!window || !store_ || !window_.isVisible() || store_->size().isEmpty()) {
+    QWindow* window = m_window.windowHandle();
+    m_store = m_window.backingStore();
+    if (!window || !m_store || !m_window.isVisible() || m_store->size().isEmpty()) {
         return nullptr;
     }
     // An empty region: the store is made ready for drawing (on some displays nothing is shown without), but nothing of
     // it is cleared.
-    began_ = painting_ == 0;
-    if (began_) {
-        store_->beginPaint(QRegion());
+    m_began = m_painting == 0;
+    if (m_began) {
+        m_store->beginPaint(QRegion());
     }
     QImage* image = storeImage();
     if (isDirect(image)) {
-        alias_ = QImage(image->bits(), image->width(), image->height(), image->bytesPerLine(), QImage::Format_RGB32);
-        return &alias_;
+        m_alias = QImage(image->bits(), image->width(), image->height(), image->bytesPerLine(), QImage::Format_RGB32);
+        return &m_alias;
     }
     readCopy(image, wanted);
-    return &copy_;
+    return &m_copy;
 }
 
 void WindowSurface::readCopy(const QImage* image, const QRect& wanted) {
-    if (copy_.size() != window_.size()) {
-        copy_ = QImage(window_.size(), QImage::Format_RGB32);
-        copy_.fill(window_.palette().color(QPalette::Window));
+    if (m_copy.size() != m_window.size()) {
+        m_copy = QImage(m_window.size(), QImage::Format_RGB32);
+        m_copy.fill(m_window.palette().color(QPalette::Window));
     }
     if (!image) {
         return; // pixels that cannot be read: what was drawn last has to do
     }
-    QPainter painter(&copy_);
+    QPainter painter(&m_copy);
     const double ratio = image->devicePixelRatio();
     painter.setCompositionMode(QPainter::CompositionMode_Source);
     painter.drawImage(QRectF(wanted), *image, QRectF(QPointF(wanted.topLeft()) * ratio, QSizeF(wanted.size()) * ratio));
 }
 
 void WindowSurface::writeCopy(const QRect& touched) {
-    QPainter painter(store_->paintDevice());
-    painter.drawImage(touched, copy_, touched);
+    QPainter painter(m_store->paintDevice());
+    painter.drawImage(touched, m_copy, touched);
 }
 
 void WindowSurface::close(const QRect& touched, ShownBy shownBy) {
     if (!touched.isEmpty()) {
-        if (alias_.isNull()) {
+        if (m_alias.isNull()) {
             writeCopy(touched);
         }
         if (shownBy == ShownBy::flush) {
             showLater(touched);
         }
     }
-    alias_ = QImage();
-    if (began_) {
-        store_->endPaint();
+    m_alias = QImage();
+    if (m_began) {
+        m_store->endPaint();
     }
-    began_ = false;
+    m_began = false;
 }
 
 /// A context that is kept open for longer shows its drawing when the program looks for the next message.
 void WindowSurface::showLater(const QRect& part) {
-    unshown_ |= part;
-    if (std::exchange(flushIsPosted_, true)) {
+    m_unshown |= part;
+    if (std::exchange(m_flushIsPosted, true)) {
         return;
     }
     const auto posted = [this] {
-        flushIsPosted_ = false;
+        m_flushIsPosted = false;
         flush();
     };
     QMetaObject::invokeMethod(this, posted, Qt::QueuedConnection);
 }
 
 void WindowSurface::endPaint() {
-    if (--painting_ == 0 && !unshown_.isEmpty()) {
+    if (--m_painting == 0 && !m_unshown.isEmpty()) {
         showLater(QRect());
     }
 }
 
 void WindowSurface::flush() {
-    if (painting_ > 0 || unshown_.isEmpty()) {
+    if (m_painting > 0 || m_unshown.isEmpty()) {
         return;
     }
-    const QRect part = std::exchange(unshown_, QRect()) & window_.rect();
-    QBackingStore* store = window_.backingStore();
-    QWindow* window = window_.windowHandle();
-    if (store && window && window_.isVisible() && !part.isEmpty()) {
+    const QRect part = std::exchange(m_unshown, QRect()) & m_window.rect();
+    QBackingStore* store = m_window.backingStore();
+    QWindow* window = m_window.windowHandle();
+    if (store && window && m_window.isVisible() && !part.isEmpty()) {
         store->flush(part, window);
     }
 }
@@ -188,84 +188,84 @@ QRegion drawableRegion(const QWidget& widget, WindowPart part) {
 // A window at any time
 
 WindowTarget::WindowTarget(QWidget& widget, WindowPart part, std::function<QRect()> area)
-    : widget_(&widget), part_(part), area_(std::move(area)) {}
+    : m_widget(&widget), m_part(part), m_area(std::move(area)) {}
 
 bool WindowTarget::open(Canvas& canvas) {
-    if (!widget_ || !widget_->isVisible()) {
+    if (!m_widget || !m_widget->isVisible()) {
         return false;
     }
-    const QRect area = area_();
-    if (!drawable_ || !layoutIsFixed) {
-        drawable_ = drawableRegion(*widget_, part_) & area;
+    const QRect area = m_area();
+    if (!m_drawable || !layoutIsFixed) {
+        m_drawable = drawableRegion(*m_widget, m_part) & area;
         if (limit) {
-            *drawable_ &= *limit;
+            *m_drawable &= *limit;
         }
     }
-    const QRegion& clip = *drawable_;
-    const QPoint widgetOrigin = widget_->mapTo(widget_->window(), QPoint());
-    origin_ = widgetOrigin + area.topLeft();
-    QImage* image = WindowSurface::of(*widget_).open(clip.boundingRect().translated(widgetOrigin));
+    const QRegion& clip = *m_drawable;
+    const QPoint widgetOrigin = m_widget->mapTo(m_widget->window(), QPoint());
+    m_origin = widgetOrigin + area.topLeft();
+    QImage* image = WindowSurface::of(*m_widget).open(clip.boundingRect().translated(widgetOrigin));
     if (!image) {
         return false;
     }
     canvas.image = image;
-    canvas.origin = origin_;
-    canvas.clip = clip.translated(-area.topLeft()) & image->rect().translated(-origin_);
+    canvas.origin = m_origin;
+    canvas.clip = clip.translated(-area.topLeft()) & image->rect().translated(-m_origin);
     return true;
 }
 
 void WindowTarget::close(const QRect& touched) {
-    if (widget_) {
-        WindowSurface::of(*widget_).close(touched.isEmpty() ? QRect() : touched.translated(origin_), shownBy);
+    if (m_widget) {
+        WindowSurface::of(*m_widget).close(touched.isEmpty() ? QRect() : touched.translated(m_origin), shownBy);
     }
 }
 
 QSize WindowTarget::size() const {
-    return widget_ ? area_().size() : QSize();
+    return m_widget ? m_area().size() : QSize();
 }
 
 void WindowTarget::release() {
-    if (widget_) {
-        WindowSurface::of(*widget_).flush();
+    if (m_widget) {
+        WindowSurface::of(*m_widget).flush();
     }
 }
 
 // A paint event
 
 PaintTarget::PaintTarget(QWidget& widget, const QRegion& update, std::function<QRect()> area)
-    : widget_(&widget), update_(update), area_(area), window_(widget, WindowPart::client, std::move(area)) {
-    window_.limit = update;
+    : m_widget(&widget), m_update(update), m_area(area), m_window(widget, WindowPart::client, std::move(area)) {
+    m_window.limit = update;
     if (!widget.testAttribute(Qt::WA_WState_InPaintEvent)) {
         return; // nothing is being painted: `update` limits what can be drawn
     }
     takePicture();
-    if (!picture_.isNull()) {
+    if (!m_picture.isNull()) {
         return;
     }
-    surface_ = &WindowSurface::of(widget);
-    surface_->beginPaint();
-    window_.shownBy = WindowSurface::ShownBy::toolkit;
-    window_.layoutIsFixed = true;
+    m_surface = &WindowSurface::of(widget);
+    m_surface->beginPaint();
+    m_window.shownBy = WindowSurface::ShownBy::toolkit;
+    m_window.layoutIsFixed = true;
 }
 
 PaintTarget::~PaintTarget() {
-    if (surface_) {
-        surface_->endPaint();
+    if (m_surface) {
+        m_surface->endPaint();
     }
 }
 
 /// Finds out whether the widget is being painted on anything but its window, and takes what is there so far.
 void PaintTarget::takePicture() {
-    QPainter painter(widget_);
+    QPainter painter(m_widget);
     QPaintDevice* device = painter.paintEngine() ? painter.paintEngine()->paintDevice() : nullptr;
-    QBackingStore* store = widget_->backingStore();
+    QBackingStore* store = m_widget->backingStore();
     if (!device || (store && device == store->paintDevice())) {
         return;
     }
-    picture_ = QImage(widget_->size(), QImage::Format_RGB32);
-    picture_.fill(widget_->palette().color(widget_->backgroundRole()));
+    m_picture = QImage(m_widget->size(), QImage::Format_RGB32);
+    m_picture.fill(m_widget->palette().color(m_widget->backgroundRole()));
     const QPoint place = painter.deviceTransform().map(QPoint());
-    QPainter copier(&picture_);
+    QPainter copier(&m_picture);
     if (const auto* pixmap = dynamic_cast<QPixmap*>(device)) {
         copier.drawPixmap(-place, *pixmap);
     } else if (const auto* image = dynamic_cast<QImage*>(device)) {
@@ -274,35 +274,35 @@ void PaintTarget::takePicture() {
 }
 
 bool PaintTarget::open(Canvas& canvas) {
-    if (picture_.isNull()) {
-        return window_.open(canvas);
+    if (m_picture.isNull()) {
+        return m_window.open(canvas);
     }
-    const QRect area = area_();
-    canvas.image = &picture_;
+    const QRect area = m_area();
+    canvas.image = &m_picture;
     canvas.origin = area.topLeft();
-    canvas.clip = (update_ & area & picture_.rect()).translated(-area.topLeft());
+    canvas.clip = (m_update & area & m_picture.rect()).translated(-area.topLeft());
     return true;
 }
 
 void PaintTarget::close(const QRect& touched) {
-    if (picture_.isNull()) {
-        window_.close(touched);
+    if (m_picture.isNull()) {
+        m_window.close(touched);
     } else if (!touched.isEmpty()) {
-        drawn_ |= touched.translated(area_().topLeft());
+        m_drawn |= touched.translated(m_area().topLeft());
     }
 }
 
 QSize PaintTarget::size() const {
-    return window_.size();
+    return m_window.size();
 }
 
 void PaintTarget::release() {
-    if (!picture_.isNull() && widget_ && !drawn_.isEmpty()) {
-        QPainter painter(widget_);
-        painter.setClipRegion(update_);
-        painter.drawImage(drawn_, picture_, drawn_);
+    if (!m_picture.isNull() && m_widget && !m_drawn.isEmpty()) {
+        QPainter painter(m_widget);
+        painter.setClipRegion(m_update);
+        painter.drawImage(m_drawn, m_picture, m_drawn);
     }
-    window_.release();
+    m_window.release();
 }
 
 } // namespace tvx::afx

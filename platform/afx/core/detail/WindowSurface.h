@@ -38,7 +38,7 @@ public:
 
     /// While the toolkit paints the window, its pixels are open already and are shown by the toolkit.
     void beginPaint() {
-        ++painting_;
+        ++m_painting;
     }
     void endPaint();
 
@@ -50,14 +50,14 @@ private:
     void writeCopy(const QRect& touched);
     void showLater(const QRect& part);
 
-    QWidget& window_;
-    QBackingStore* store_ = nullptr; ///< while open
-    QImage alias_;                   ///< the store's pixels while they can be used as they are
-    QImage copy_;                    ///< else what is drawn on instead
-    QRect unshown_;
-    int painting_ = 0;
-    bool began_ = false;
-    bool flushIsPosted_ = false;
+    QWidget& m_window;
+    QBackingStore* m_store = nullptr; ///< while open
+    QImage m_alias;                   ///< the store's pixels while they can be used as they are
+    QImage m_copy;                    ///< else what is drawn on instead
+    QRect m_unshown;
+    int m_painting = 0;
+    bool m_began = false;
+    bool m_flushIsPosted = false;
 };
 
 /// What a window's context covers.
@@ -84,11 +84,11 @@ public:
     bool layoutIsFixed = false;
 
 private:
-    QPointer<QWidget> widget_;
-    WindowPart part_;
-    std::function<QRect()> area_;
-    QPoint origin_; ///< of the area in the window, while open
-    std::optional<QRegion> drawable_;
+    QPointer<QWidget> m_widget;
+    WindowPart m_part;
+    std::function<QRect()> m_area;
+    QPoint m_origin; ///< of the area in the window, while open
+    std::optional<QRegion> m_drawable;
 };
 
 /// What a widget's paint event draws on: the window's pixels, or those of a picture that is being taken of it.
@@ -106,13 +106,13 @@ public:
 private:
     void takePicture();
 
-    QPointer<QWidget> widget_;
-    QRegion update_;
-    std::function<QRect()> area_;
-    WindowTarget window_;
-    QPointer<WindowSurface> surface_; ///< while the toolkit paints it
-    QImage picture_;                  ///< of the widget, when it is painted on anything else
-    QRect drawn_;
+    QPointer<QWidget> m_widget;
+    QRegion m_update;
+    std::function<QRect()> m_area;
+    WindowTarget m_window;
+    QPointer<WindowSurface> m_surface; ///< while the toolkit paints it
+    QImage m_picture;                  ///< of the widget, when it is painted on anything else
+    QRect m_drawn;
 };
 
 /// What can be drawn of a widget, in its coordinates: the visible part without its child widgets.

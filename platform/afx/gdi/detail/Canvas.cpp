@@ -42,7 +42,7 @@ bool Ink::at(int x, int y, Pixel& pixel) const {
     const int column = wrapped(std::int64_t{x} - patternOrigin.x(), pattern->width());
     const int line = wrapped(std::int64_t{y} - patternOrigin.y(), pattern->height());
     pixel = reinterpret_cast<const Pixel*>(pattern->constScanLine(line))[column];
-    return (pixel & kOpaque) != 0;
+    return (pixel & opaque) != 0;
 }
 
 void Canvas::fillClipped(const QRect& area, const Ink& ink) {
@@ -53,7 +53,7 @@ void Canvas::fillClipped(const QRect& area, const Ink& ink) {
             fillRow(row(y) + area.left(), area.width(), ink.color, ink.rop);
         }
     }
-    touched_ |= area;
+    m_touched |= area;
 }
 
 void Canvas::fill(const QRect& area, const Ink& ink) {
@@ -102,7 +102,7 @@ void Canvas::plot(std::span<const QPoint> points, const Ink& ink) {
                 plotVisible(point, ink, operation);
             }
         }
-        touched_ |= visible & around;
+        m_touched |= visible & around;
     }
 }
 
@@ -119,7 +119,7 @@ void Canvas::plotVisible(QPoint point, const Ink& ink, const PenOperation& opera
 namespace {
 
 void blitRow(Pixel* to, const Pixel* from, const Span& span, Rop3 rop, const Ink& brush) {
-    if (rop == kRop3Source) {
+    if (rop == rop3Source) {
         std::copy(from + span.left, from + span.right, to + span.left);
         return;
     }
@@ -147,7 +147,7 @@ void Canvas::blit(const QImage& source, QPoint at, Rop3 rop, const Ink& brush) {
             const auto* from = reinterpret_cast<const Pixel*>(source.constScanLine(y - at.y())) - at.x();
             blitRow(row(y), from, {y, part.left(), part.right() + 1}, rop, brush);
         }
-        touched_ |= part;
+        m_touched |= part;
     }
 }
 

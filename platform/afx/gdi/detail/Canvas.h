@@ -15,7 +15,7 @@
 namespace tvx::afx {
 
 constexpr Pixel pixelOf(COLORREF color) {
-    return kOpaque | (static_cast<Pixel>(GetRValue(color)) << 16) | (static_cast<Pixel>(GetGValue(color)) << 8) |
+    return opaque | (static_cast<Pixel>(GetRValue(color)) << 16) | (static_cast<Pixel>(GetGValue(color)) << 8) |
            GetBValue(color);
 }
 constexpr COLORREF colorOf(Pixel pixel) {
@@ -27,15 +27,15 @@ enum class PixelFormat { color, monochrome };
 /// The colour nearest to `pixel` in a format: black or white by brightness in a monochrome one.
 constexpr Pixel nearest(Pixel pixel, PixelFormat format) {
     if (format == PixelFormat::color) {
-        return pixel | kOpaque;
+        return pixel | opaque;
     }
     const unsigned brightness = ((pixel >> 16) & 0xFF) * 299 + ((pixel >> 8) & 0xFF) * 587 + (pixel & 0xFF) * 114;
-    return brightness >= 128 * 1000 ? kWhitePixel : kBlackPixel;
+    return brightness >= 128 * 1000 ? whitePixel : blackPixel;
 }
 
 /// What an area is drawn with: one colour or a repeated picture, and how it combines with what is there.
 struct Ink {
-    Pixel color = kBlackPixel;
+    Pixel color = blackPixel;
     Rop2 rop = Rop2::copy;
     const QImage* pattern = nullptr; ///< Format_ARGB32; pixels with alpha 0 leave the target alone
     QPoint patternOrigin;            ///< in the coordinates of the target's context
@@ -55,14 +55,14 @@ public:
 
     /// What has been changed so far, in the context's coordinates.
     [[nodiscard]] QRect touched() const {
-        return touched_;
+        return m_touched;
     }
     [[nodiscard]] QRect bounds() const {
         return clip.boundingRect();
     }
     /// Marks an area as changed by drawing that went around the members.
     void touch(const QRect& area) {
-        touched_ |= area & bounds();
+        m_touched |= area & bounds();
     }
 
     void fill(const QRect& area, const Ink& ink);
@@ -80,7 +80,7 @@ public:
 private:
     void fillClipped(const QRect& area, const Ink& ink);
     void plotVisible(QPoint point, const Ink& ink, const PenOperation& operation);
-    QRect touched_;
+    QRect m_touched;
 };
 
 } // namespace tvx::afx

@@ -7,11 +7,11 @@ namespace tvx::afx {
 
 namespace {
 
-constexpr std::uint32_t kContextTag = 2;
+constexpr std::uint32_t contextTag = 2;
 
 HandleTable<DeviceContext>& contexts() {
     // Never destroyed, like the tools.
-    static auto& table = *new HandleTable<DeviceContext>(kContextTag);
+    static auto& table = *new HandleTable<DeviceContext>(contextTag);
     return table;
 }
 
@@ -86,13 +86,13 @@ std::optional<Ink> DeviceContext::brushInk(QImage& pattern) const {
 
 namespace {
 
-constexpr int kHatchSize = 8;
+constexpr int hatchSize = 8;
 
 bool onHatchLine(int hatch, int x, int y) {
     const bool horizontal = y == 3;
     const bool vertical = x == 4;
     const bool falling = x == y;
-    const bool rising = x + y == kHatchSize - 1;
+    const bool rising = x + y == hatchSize - 1;
     switch (hatch) {
     case HS_HORIZONTAL:
         return horizontal;
@@ -110,9 +110,9 @@ bool onHatchLine(int hatch, int x, int y) {
 }
 
 QImage hatchImage(int hatch, Pixel line, Pixel between) {
-    QImage image(kHatchSize, kHatchSize, QImage::Format_ARGB32);
-    for (int y = 0; y < kHatchSize; ++y) {
-        for (int x = 0; x < kHatchSize; ++x) {
+    QImage image(hatchSize, hatchSize, QImage::Format_ARGB32);
+    for (int y = 0; y < hatchSize; ++y) {
+        for (int x = 0; x < hatchSize; ++x) {
             reinterpret_cast<Pixel*>(image.scanLine(y))[x] = onHatchLine(hatch, x, y) ? line : between;
         }
     }
@@ -124,7 +124,7 @@ QImage recolored(const QImage& image, Pixel black, Pixel white) {
     for (int y = 0; y < result.height(); ++y) {
         auto* row = reinterpret_cast<Pixel*>(result.scanLine(y));
         std::transform(row, row + result.width(), row,
-                       [&](Pixel pixel) { return pixel == kWhitePixel ? white : black; });
+                       [&](Pixel pixel) { return pixel == whitePixel ? white : black; });
     }
     return result;
 }
@@ -174,15 +174,15 @@ std::size_t contextCount() {
     return contexts().size();
 }
 
-Drawing::Drawing(DeviceContext& context) : context_(context), open_(context.target->open(canvas)) {
-    if (open_ && context.state.clip) {
+Drawing::Drawing(DeviceContext& context) : m_context(context), m_open(context.target->open(canvas)) {
+    if (m_open && context.state.clip) {
         canvas.clip &= *context.state.clip;
     }
 }
 
 Drawing::~Drawing() {
-    if (open_) {
-        context_.target->close(canvas.touched());
+    if (m_open) {
+        m_context.target->close(canvas.touched());
     }
 }
 

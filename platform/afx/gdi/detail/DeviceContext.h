@@ -117,13 +117,13 @@ public:
 
     /// False when no pixel can be seen: there is nothing to do then.
     explicit operator bool() const {
-        return open_;
+        return m_open;
     }
     Canvas canvas;
 
 private:
-    DeviceContext& context_;
-    bool open_;
+    DeviceContext& m_context;
+    bool m_open;
 };
 
 inline RECT rectOf(const QRect& rect) {

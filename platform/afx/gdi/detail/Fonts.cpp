@@ -23,37 +23,37 @@ using Choices = std::array<const char*, 3>;
 
 /// For labels and dialogs. At 8 points the condensed face has the average width (6) and height (13) that dialog
 /// templates were laid out for; the normal one is a fifth wider, so that texts would be cut.
-constexpr Choices kInterface = {"DejaVu Sans Condensed", "DejaVu Sans", "Noto Sans"};
+constexpr Choices interface = {"DejaVu Sans Condensed", "DejaVu Sans", "Noto Sans"};
 /// For documents: faces with the same advances as the ones named, then any of the kind.
-constexpr Choices kSans = {"Liberation Sans", "Nimbus Sans", "DejaVu Sans"};
-constexpr Choices kSerif = {"Liberation Serif", "Nimbus Roman", "DejaVu Serif"};
+constexpr Choices sans = {"Liberation Sans", "Nimbus Sans", "DejaVu Sans"};
+constexpr Choices serif = {"Liberation Serif", "Nimbus Roman", "DejaVu Serif"};
 /// Terminal faces had drawn pixels and no outlines; of the fixed ones this one is the most legible at small sizes.
-constexpr Choices kFixed = {"DejaVu Sans Mono", "Liberation Mono", "Nimbus Mono PS"};
-constexpr Choices kTypewriter = {"Liberation Mono", "DejaVu Sans Mono", "Nimbus Mono PS"};
+constexpr Choices fixedPitch = {"DejaVu Sans Mono", "Liberation Mono", "Nimbus Mono PS"};
+constexpr Choices typewriter = {"Liberation Mono", "DejaVu Sans Mono", "Nimbus Mono PS"};
 
 struct Substitute {
     std::string_view face;
     const Choices& choices;
 };
 
-const Substitute kSubstitutes[] = {
-    {"MS Sans Serif", kInterface},
-    {"MS Shell Dlg", kInterface},
-    {"MS Shell Dlg 2", kInterface},
-    {"Microsoft Sans Serif", kInterface},
-    {"System", kInterface},
-    {"Tahoma", kInterface},
-    {"Helv", kInterface},
-    {"Arial", kSans},
-    {"Helvetica", kSans},
-    {"Times New Roman", kSerif},
-    {"Times", kSerif},
-    {"Tms Rmn", kSerif},
-    {"MS Serif", kSerif},
-    {"Courier", kFixed},
-    {"FixedSys", kFixed},
-    {"Terminal", kFixed},
-    {"Courier New", kTypewriter},
+const Substitute substitutes[] = {
+    {"MS Sans Serif", interface},
+    {"MS Shell Dlg", interface},
+    {"MS Shell Dlg 2", interface},
+    {"Microsoft Sans Serif", interface},
+    {"System", interface},
+    {"Tahoma", interface},
+    {"Helv", interface},
+    {"Arial", sans},
+    {"Helvetica", sans},
+    {"Times New Roman", serif},
+    {"Times", serif},
+    {"Tms Rmn", serif},
+    {"MS Serif", serif},
+    {"Courier", fixedPitch},
+    {"FixedSys", fixedPitch},
+    {"Terminal", fixedPitch},
+    {"Courier New", typewriter},
 };
 
 QString firstInstalled(const Choices& choices) {
@@ -67,9 +67,9 @@ QString firstInstalled(const Choices& choices) {
 
 const Choices& choicesByFamily(BYTE pitchAndFamily) {
     if ((pitchAndFamily & 0xF0) == FF_MODERN || (pitchAndFamily & 3) == FIXED_PITCH) {
-        return kFixed;
+        return fixedPitch;
     }
-    return (pitchAndFamily & 0xF0) == FF_ROMAN ? kSerif : kInterface;
+    return (pitchAndFamily & 0xF0) == FF_ROMAN ? serif : interface;
 }
 
 std::string_view faceName(const LOGFONTA& description) {
@@ -84,15 +84,15 @@ QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
         return wanted;
     }
     const auto* found = std::ranges::find_if(
-        kSubstitutes, [&](const Substitute& substitute) { return text::equalNoCase(substitute.face, faceName); });
-    return firstInstalled(found != std::end(kSubstitutes) ? found->choices : choicesByFamily(pitchAndFamily));
+        substitutes, [&](const Substitute& substitute) { return text::equalNoCase(substitute.face, faceName); });
+    return firstInstalled(found != std::end(substitutes) ? found->choices : choicesByFamily(pitchAndFamily));
 }
 
 namespace {
 
 /// Cell height in pixels that a description without a height gets.
-constexpr int kDefaultCellHeight = 16;
-constexpr int kLargestHeight = 4096;
+constexpr int defaultCellHeight = 16;
+constexpr int largestHeight = 4096;
 
 /// The largest em size whose characters fit cells of `cellHeight`.
 void fitCell(QFont& font, int cellHeight) {
@@ -104,11 +104,11 @@ void fitCell(QFont& font, int cellHeight) {
 }
 
 void setHeight(QFont& font, int height) {
-    height = std::clamp(height, -kLargestHeight, kLargestHeight);
+    height = std::clamp(height, -largestHeight, largestHeight);
     if (height < 0) {
         font.setPixelSize(-height);
     } else {
-        fitCell(font, height == 0 ? kDefaultCellHeight : height);
+        fitCell(font, height == 0 ? defaultCellHeight : height);
     }
 }
 
@@ -167,8 +167,8 @@ std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
         return nullptr;
     }
     static const auto cleared = QObject::connect(qGuiApp, &QObject::destroyed, [] { fonts.clear(); });
-    constexpr std::size_t kMostFonts = 256;
-    if (fonts.size() > kMostFonts) {
+    constexpr std::size_t mostFonts = 256;
+    if (fonts.size() > mostFonts) {
         fonts.clear();
     }
     auto& kept = fonts[keyOf(description)];
@@ -186,7 +186,7 @@ QFont controlFont(const LOGFONTA& description) {
 
 LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
     LOGFONTA font{};
-    font.lfHeight = -scaled(tenthsOfPoint, kPixelsPerInch, 720);
+    font.lfHeight = -scaled(tenthsOfPoint, pixelsPerInch, 720);
     font.lfCharSet = DEFAULT_CHARSET;
     const std::size_t length = text::characterStart(faceName, std::min<std::size_t>(faceName.size(), LF_FACESIZE - 1));
     std::memcpy(font.lfFaceName, faceName.data(), length);

@@ -8,16 +8,16 @@ namespace tvx::afx {
 
 namespace {
 
-constexpr std::uint32_t kObjectTag = 1;
-constexpr std::uint32_t kIconTag = 3;
+constexpr std::uint32_t objectTag = 1;
+constexpr std::uint32_t iconTag = 3;
 /// More pixels than this are refused: 1 GiB.
-constexpr std::int64_t kMostPixels = std::int64_t{1} << 28;
+constexpr std::int64_t mostPixels = std::int64_t{1} << 28;
 
 } // namespace
 
 HandleTable<GdiObject>& gdiObjects() {
     // Never destroyed: static objects of hosts still hold tools when the process ends.
-    static auto& table = *new HandleTable<GdiObject>(kObjectTag);
+    static auto& table = *new HandleTable<GdiObject>(objectTag);
     return table;
 }
 
@@ -27,7 +27,7 @@ DWORD GdiObject::type() const {
 }
 
 HBITMAP addBitmap(int width, int height, PixelFormat format) {
-    if (width <= 0 || height <= 0 || std::int64_t{width} * height > kMostPixels) {
+    if (width <= 0 || height <= 0 || std::int64_t{width} * height > mostPixels) {
         return nullptr;
     }
     QImage image(width, height, QImage::Format_RGB32);
@@ -43,7 +43,7 @@ HBITMAP addBitmap(const QImage& image, PixelFormat format) {
     }
     for (int y = 0; y < pixels.height(); ++y) {
         auto* row = reinterpret_cast<Pixel*>(pixels.scanLine(y));
-        std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | kOpaque; });
+        std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | opaque; });
     }
     return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(pixels), format, nullptr}));
 }
@@ -54,7 +54,7 @@ QImage bitmapImage(HBITMAP bitmap) {
 }
 
 HandleTable<IconObject>& icons() {
-    static auto& table = *new HandleTable<IconObject>(kIconTag);
+    static auto& table = *new HandleTable<IconObject>(iconTag);
     return table;
 }
 

@@ -17,16 +17,16 @@ template <class T>
 class HandleTable {
 public:
     /// @param tag 1..15, different for each table, so that the numbers of two tables never mean each other's objects
-    explicit HandleTable(std::uint32_t tag) : tag_(tag << kTagShift) {}
+    explicit HandleTable(std::uint32_t tag) : m_tag(tag << tagShift) {}
 
     /// Keeps `object` and answers its number, 0 when the table is full.
     [[nodiscard]] std::uintptr_t add(std::shared_ptr<T> object) {
         const std::uint32_t slot = freeSlot();
-        if (slot > kSlotMask) {
+        if (slot > slotMask) {
             return 0;
         }
-        slots_[slot].object = std::move(object);
-        return tag_ | (static_cast<std::uint32_t>(slots_[slot].generation) << kGenerationShift) | slot;
+        m_slots[slot].object = std::move(object);
+        return m_tag | (static_cast<std::uint32_t>(m_slots[slot].generation) << generationShift) | slot;
     }
 
     /// The object of that number, null when there is none (any more).
@@ -42,13 +42,13 @@ public:
             return nullptr;
         }
         ++slot->generation;
-        freed_.push_back(static_cast<std::uint32_t>(number & kSlotMask));
+        m_freed.push_back(static_cast<std::uint32_t>(number & slotMask));
         return std::exchange(slot->object, nullptr);
     }
 
     /// How many numbers are in use.
     [[nodiscard]] std::size_t size() const {
-        return slots_.size() - freed_.size();
+        return m_slots.size() - m_freed.size();
     }
 
 private:
@@ -56,37 +56,37 @@ private:
         std::shared_ptr<T> object;
         std::uint8_t generation = 1;
     };
-    static constexpr unsigned kTagShift = 28;
-    static constexpr unsigned kGenerationShift = 20;
-    static constexpr std::uint32_t kSlotMask = 0xFFFFF;
+    static constexpr unsigned tagShift = 28;
+    static constexpr unsigned generationShift = 20;
+    static constexpr std::uint32_t slotMask = 0xFFFFF;
     /// So many slots wait before one is used again.
-    static constexpr std::size_t kQuarantine = 256;
+    static constexpr std::size_t quarantine = 256;
 
     std::uint32_t freeSlot() {
-        if (freed_.size() > kQuarantine || (!freed_.empty() && slots_.size() > kSlotMask)) {
-            const std::uint32_t slot = freed_.front();
-            freed_.pop_front();
+        if (m_freed.size() > quarantine || (!m_freed.empty() && m_slots.size() > slotMask)) {
+            const std::uint32_t slot = m_freed.front();
+            m_freed.pop_front();
             return slot;
         }
-        if (slots_.size() > kSlotMask) {
-            return kSlotMask + 1;
+        if (m_slots.size() > slotMask) {
+            return slotMask + 1;
         }
-        slots_.emplace_back();
-        return static_cast<std::uint32_t>(slots_.size() - 1);
+        m_slots.emplace_back();
+        return static_cast<std::uint32_t>(m_slots.size() - 1);
     }
 
     const Slot* slotOf(std::uintptr_t number) const {
-        const std::size_t index = number & kSlotMask;
-        if (number >> 32 || index >= slots_.size() || (number & (0xFU << kTagShift)) != tag_) {
+        const std::size_t index = number & slotMask;
+        if (number >> 32 || index >= m_slots.size() || (number & (0xFU << tagShift)) != m_tag) {
             return nullptr;
         }
-        const Slot& slot = slots_[index];
-        return slot.object && slot.generation == ((number >> kGenerationShift) & 0xFF) ? &slot : nullptr;
+        const Slot& slot = m_slots[index];
+        return slot.object && slot.generation == ((number >> generationShift) & 0xFF) ? &slot : nullptr;
     }
 
-    std::uint32_t tag_;
-    std::vector<Slot> slots_;
-    std::deque<std::uint32_t> freed_;
+    std::uint32_t m_tag;
+    std::vector<Slot> m_slots;
+    std::deque<std::uint32_t> m_freed;
 };
 
 } // namespace tvx::afx

@@ -45,7 +45,7 @@ int unitsPerInch(int mode) {
 } // namespace
 
 bool Mapping::hasFreeExtents() const {
-    return mode_ == MM_ISOTROPIC || mode_ == MM_ANISOTROPIC;
+    return m_mode == MM_ISOTROPIC || m_mode == MM_ANISOTROPIC;
 }
 
 bool Mapping::setMode(int mode) {
@@ -54,12 +54,12 @@ bool Mapping::setMode(int mode) {
     }
     const int units = unitsPerInch(mode == MM_ISOTROPIC ? MM_LOMETRIC : mode);
     if (units != 0) {
-        windowExtent_ = {units, units};
-        viewportExtent_ = {kPixelsPerInch, -kPixelsPerInch};
+        m_windowExtent = {units, units};
+        m_viewportExtent = {pixelsPerInch, -pixelsPerInch};
     } else if (mode == MM_TEXT) {
-        windowExtent_ = viewportExtent_ = {1, 1};
+        m_windowExtent = m_viewportExtent = {1, 1};
     }
-    mode_ = mode;
+    m_mode = mode;
     return true;
 }
 
@@ -67,7 +67,7 @@ bool Mapping::setWindowExtent(QSize extent) {
     if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
         return false;
     }
-    windowExtent_ = extent;
+    m_windowExtent = extent;
     keepIsotropic();
     return true;
 }
@@ -76,27 +76,27 @@ bool Mapping::setViewportExtent(QSize extent) {
     if (!hasFreeExtents() || extent.width() == 0 || extent.height() == 0) {
         return false;
     }
-    viewportExtent_ = extent;
+    m_viewportExtent = extent;
     keepIsotropic();
     return true;
 }
 
 void Mapping::keepIsotropic() {
-    if (mode_ != MM_ISOTROPIC) {
+    if (m_mode != MM_ISOTROPIC) {
         return;
     }
-    const std::int64_t width = std::abs(std::int64_t{viewportExtent_.width()});
-    const std::int64_t height = std::abs(std::int64_t{viewportExtent_.height()});
-    const int unitsWide = std::abs(windowExtent_.width());
-    const int unitsHigh = std::abs(windowExtent_.height());
+    const std::int64_t width = std::abs(std::int64_t{m_viewportExtent.width()});
+    const std::int64_t height = std::abs(std::int64_t{m_viewportExtent.height()});
+    const int unitsWide = std::abs(m_windowExtent.width());
+    const int unitsHigh = std::abs(m_windowExtent.height());
     const auto signedLike = [](int value, int sign) { return sign < 0 ? -value : value; };
     // A pixel stands for as many units down as across: the extent with pixels to spare gives them up.
     if (width * unitsHigh > height * unitsWide) {
-        viewportExtent_.setWidth(
-            signedLike(std::max(1, scaled(height, unitsWide, unitsHigh)), viewportExtent_.width()));
+        m_viewportExtent.setWidth(
+            signedLike(std::max(1, scaled(height, unitsWide, unitsHigh)), m_viewportExtent.width()));
     } else {
-        viewportExtent_.setHeight(
-            signedLike(std::max(1, scaled(width, unitsHigh, unitsWide)), viewportExtent_.height()));
+        m_viewportExtent.setHeight(
+            signedLike(std::max(1, scaled(width, unitsHigh, unitsWide)), m_viewportExtent.height()));
     }
 }
 
@@ -111,20 +111,22 @@ int converted(int value, int fromOrigin, int by, int per, int toOrigin) {
 
 QPoint Mapping::toDevice(QPoint logical) const {
     return {
-        converted(logical.x(), windowOrigin.x(), viewportExtent_.width(), windowExtent_.width(), viewportOrigin.x()),
-        converted(logical.y(), windowOrigin.y(), viewportExtent_.height(), windowExtent_.height(), viewportOrigin.y())};
+        converted(logical.x(), windowOrigin.x(), m_viewportExtent.width(), m_windowExtent.width(), viewportOrigin.x()),
+        converted(logical.y(), windowOrigin.y(), m_viewportExtent.height(), m_windowExtent.height(),
+                  viewportOrigin.y())};
 }
 
 QPoint Mapping::toLogical(QPoint device) const {
     return {
-        converted(device.x(), viewportOrigin.x(), windowExtent_.width(), viewportExtent_.width(), windowOrigin.x()),
-        converted(device.y(), viewportOrigin.y(), windowExtent_.height(), viewportExtent_.height(), windowOrigin.y())};
+        converted(device.x(), viewportOrigin.x(), m_windowExtent.width(), m_viewportExtent.width(), windowOrigin.x()),
+        converted(device.y(), viewportOrigin.y(), m_windowExtent.height(), m_viewportExtent.height(),
+                  windowOrigin.y())};
 }
 
 QPoint Mapping::toPixel(QPoint logical) const {
     const QPoint device = toDevice(logical);
-    return {std::clamp(device.x(), -kFarthestPixel, kFarthestPixel),
-            std::clamp(device.y(), -kFarthestPixel, kFarthestPixel)};
+    return {std::clamp(device.x(), -farthestPixel, farthestPixel),
+            std::clamp(device.y(), -farthestPixel, farthestPixel)};
 }
 
 QRect Mapping::toPixels(const RECT& logical) const {
@@ -135,13 +137,13 @@ QRect Mapping::toPixels(const RECT& logical) const {
 }
 
 QSize Mapping::sizeToDevice(QSize logical) const {
-    return {std::abs(scaled(logical.width(), viewportExtent_.width(), windowExtent_.width())),
-            std::abs(scaled(logical.height(), viewportExtent_.height(), windowExtent_.height()))};
+    return {std::abs(scaled(logical.width(), m_viewportExtent.width(), m_windowExtent.width())),
+            std::abs(scaled(logical.height(), m_viewportExtent.height(), m_windowExtent.height()))};
 }
 
 QSize Mapping::sizeToLogical(QSize device) const {
-    return {std::abs(scaled(device.width(), windowExtent_.width(), viewportExtent_.width())),
-            std::abs(scaled(device.height(), windowExtent_.height(), viewportExtent_.height()))};
+    return {std::abs(scaled(device.width(), m_windowExtent.width(), m_viewportExtent.width())),
+            std::abs(scaled(device.height(), m_windowExtent.height(), m_viewportExtent.height()))};
 }
 
 } // namespace tvx::afx

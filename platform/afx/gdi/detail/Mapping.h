@@ -14,16 +14,16 @@
 namespace tvx::afx {
 
 /// Pixels to an inch, both ways.
-constexpr int kPixelsPerInch = 96;
+constexpr int pixelsPerInch = 96;
 
 /// Nothing is drawn beyond this distance from the origin.
-constexpr int kFarthestPixel = 1 << 27;
+constexpr int farthestPixel = 1 << 27;
 
 /// Conversion between logical and device units, in integers: halves are rounded up.
 class TVX_PLATFORM_API Mapping {
 public:
     [[nodiscard]] int mode() const {
-        return mode_;
+        return m_mode;
     }
     /// False for a number that is no mode. Extents become the mode's own; origins stay.
     bool setMode(int mode);
@@ -31,10 +31,10 @@ public:
     QPoint windowOrigin;
     QPoint viewportOrigin;
     [[nodiscard]] QSize windowExtent() const {
-        return windowExtent_;
+        return m_windowExtent;
     }
     [[nodiscard]] QSize viewportExtent() const {
-        return viewportExtent_;
+        return m_viewportExtent;
     }
     /// False in the modes whose extents are fixed, and for an extent of 0.
     bool setWindowExtent(QSize extent);
@@ -42,7 +42,7 @@ public:
 
     [[nodiscard]] QPoint toDevice(QPoint logical) const;
     [[nodiscard]] QPoint toLogical(QPoint device) const;
-    /// As `toDevice`, for drawing: never farther out than `kFarthestPixel`, so that sizes and sums fit an `int`.
+    /// As `toDevice`, for drawing: never farther out than `farthestPixel`, so that sizes and sums fit an `int`.
     [[nodiscard]] QPoint toPixel(QPoint logical) const;
     /// Both corners converted; of corners in the wrong order those of the result are put right.
     [[nodiscard]] QRect toPixels(const RECT& logical) const;
@@ -54,9 +54,9 @@ private:
     void keepIsotropic();
     [[nodiscard]] bool hasFreeExtents() const;
 
-    int mode_ = 1;
-    QSize windowExtent_{1, 1};
-    QSize viewportExtent_{1, 1};
+    int m_mode = 1;
+    QSize m_windowExtent{1, 1};
+    QSize m_viewportExtent{1, 1};
 };
 
 /// The number kept inside the range of `int`.

@@ -30,14 +30,14 @@ std::span<const int> dashPattern(UINT style) {
 }
 
 /// All patterns repeat after this many pixels.
-constexpr int kDashPeriod = 24;
+constexpr int dashPeriod = 24;
 
 bool isOn(std::span<const int> pattern, int phase) {
     if (pattern.empty()) {
         return true;
     }
     std::size_t part = 0;
-    for (phase %= kDashPeriod; phase >= pattern[part % pattern.size()]; ++part) {
+    for (phase %= dashPeriod; phase >= pattern[part % pattern.size()]; ++part) {
         phase -= pattern[part % pattern.size()];
     }
     return part % 2 == 0;
@@ -51,55 +51,55 @@ int deviceWidth(const DeviceContext& context) {
 } // namespace
 
 Outline::Outline(const DeviceContext& context, Canvas& canvas)
-    : context_(context),
-      canvas_(canvas),
-      ink_(context.penInk()),
-      style_(context.state.pen->description.lopnStyle),
-      width_(deviceWidth(context)) {
-    if (isWide() && style_ != PS_INSIDEFRAME) {
-        style_ = PS_SOLID;
+    : m_context(context),
+      m_canvas(canvas),
+      m_ink(context.penInk()),
+      m_style(context.state.pen->description.lopnStyle),
+      m_width(deviceWidth(context)) {
+    if (isWide() && m_style != PS_INSIDEFRAME) {
+        m_style = PS_SOLID;
     }
-    if (ink_ && context.state.backMode == OPAQUE) {
-        gap_ = context.ink(context.state.backColor, ink_->rop);
+    if (m_ink && context.state.backMode == OPAQUE) {
+        m_gap = context.ink(context.state.backColor, m_ink->rop);
     }
 }
 
 void Outline::addPixel(QPoint point, int phase) {
-    (isOn(dashPattern(style_), phase) ? on_ : off_).push_back(point);
+    (isOn(dashPattern(m_style), phase) ? m_on : m_off).push_back(point);
 }
 
 void Outline::plotPixels() {
-    canvas_.plot(on_, *ink_);
-    if (gap_) {
-        canvas_.plot(off_, *gap_);
+    m_canvas.plot(m_on, *m_ink);
+    if (m_gap) {
+        m_canvas.plot(m_off, *m_gap);
     }
-    on_.clear();
-    off_.clear();
+    m_on.clear();
+    m_off.clear();
 }
 
 void Outline::thin(const QPolygon& points) {
-    const QRect bounds = canvas_.bounds();
+    const QRect bounds = m_canvas.bounds();
     for (qsizetype i = 0; i + 1 < points.size(); ++i) {
         const LinePixels pixels(points[i], points[i + 1]);
-        pixels.forEach(pixels.within(bounds), [&](int index, QPoint point) { addPixel(point, phase_ + index); });
-        phase_ = (phase_ + pixels.count() % kDashPeriod) % kDashPeriod;
+        pixels.forEach(pixels.within(bounds), [&](int index, QPoint point) { addPixel(point, m_phase + index); });
+        m_phase = (m_phase + pixels.count() % dashPeriod) % dashPeriod;
     }
 }
 
 void Outline::wide(const QPainterPath& path) {
     QPainterPathStroker stroker;
-    stroker.setWidth(width_);
+    stroker.setWidth(m_width);
     stroker.setCapStyle(Qt::RoundCap);
-    stroker.setJoinStyle(style_ == PS_INSIDEFRAME ? Qt::MiterJoin : Qt::RoundJoin);
+    stroker.setJoinStyle(m_style == PS_INSIDEFRAME ? Qt::MiterJoin : Qt::RoundJoin);
     // Points mean centres of pixels.
     const QList<QPolygonF> areas = stroker.createStroke(path.translated(0.5, 0.5)).toSubpathPolygons();
-    canvas_.fill(
-        polygonSpans({areas.data(), static_cast<std::size_t>(areas.size())}, FillRule::winding, canvas_.bounds()),
-        *ink_);
+    m_canvas.fill(
+        polygonSpans({areas.data(), static_cast<std::size_t>(areas.size())}, FillRule::winding, m_canvas.bounds()),
+        *m_ink);
 }
 
 void Outline::line(const QPolygon& points, LastPoint last) {
-    if (!ink_ || points.isEmpty()) {
+    if (!m_ink || points.isEmpty()) {
         return;
     }
     if (isWide()) {
@@ -110,13 +110,13 @@ void Outline::line(const QPolygon& points, LastPoint last) {
     }
     thin(points);
     if (last == LastPoint::drawn) {
-        addPixel(points.last(), phase_);
+        addPixel(points.last(), m_phase);
     }
     plotPixels();
 }
 
 void Outline::closed(const QPolygon& points) {
-    if (!ink_ || points.isEmpty()) {
+    if (!m_ink || points.isEmpty()) {
         return;
     }
     if (isWide()) {
@@ -142,19 +142,19 @@ void Outline::rectangle(const QRect& box) {
 }
 
 void Outline::rounded(const QRect& box, QSize corner, const Spans& rows) {
-    if (!ink_ || box.isEmpty()) {
+    if (!m_ink || box.isEmpty()) {
         return;
     }
     if (!isWide()) {
         for (const QPoint& point : outlineOf(rows)) {
-            addPixel(point, phase_++);
+            addPixel(point, m_phase++);
         }
         plotPixels();
         return;
     }
     QRectF middle = QRectF(box.topLeft(), box.bottomRight());
-    if (style_ == PS_INSIDEFRAME) {
-        const double half = (width_ - 1) / 2.0;
+    if (m_style == PS_INSIDEFRAME) {
+        const double half = (m_width - 1) / 2.0;
         middle.adjust(half, half, -half, -half);
     }
     QPainterPath path;

@@ -28,18 +28,18 @@ private:
     void plotPixels();
     void wide(const QPainterPath& path);
     [[nodiscard]] bool isWide() const {
-        return width_ > 1;
+        return m_width > 1;
     }
 
-    const DeviceContext& context_;
-    Canvas& canvas_;
-    std::optional<Ink> ink_;
-    std::optional<Ink> gap_; ///< between dashes
-    UINT style_;
-    int width_;
-    int phase_ = 0; ///< pixels of the dash pattern used up
-    std::vector<QPoint> on_;
-    std::vector<QPoint> off_;
+    const DeviceContext& m_context;
+    Canvas& m_canvas;
+    std::optional<Ink> m_ink;
+    std::optional<Ink> m_gap; ///< between dashes
+    UINT m_style;
+    int m_width;
+    int m_phase = 0; ///< pixels of the dash pattern used up
+    std::vector<QPoint> m_on;
+    std::vector<QPoint> m_off;
 };
 
 } // namespace tvx::afx

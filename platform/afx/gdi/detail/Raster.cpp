@@ -11,8 +11,7 @@ namespace {
 
 /// Points farther out are pulled in, so that products of two coordinates fit 64 bits.
 QPoint pulledIn(QPoint point) {
-    return {std::clamp(point.x(), -kFarthestPixel, kFarthestPixel),
-            std::clamp(point.y(), -kFarthestPixel, kFarthestPixel)};
+    return {std::clamp(point.x(), -farthestPixel, farthestPixel), std::clamp(point.y(), -farthestPixel, farthestPixel)};
 }
 
 std::int64_t floorDiv(std::int64_t value, std::int64_t by) {
@@ -22,28 +21,28 @@ std::int64_t floorDiv(std::int64_t value, std::int64_t by) {
 
 } // namespace
 
-LinePixels::LinePixels(QPoint from, QPoint to) : from_(pulledIn(from)) {
-    const QPoint delta = pulledIn(to) - from_;
-    steep_ = std::abs(delta.y()) > std::abs(delta.x());
-    const int major = steep_ ? delta.y() : delta.x();
-    count_ = std::abs(major);
-    majorStep_ = major < 0 ? -1 : 1;
-    minorDelta_ = steep_ ? delta.x() : delta.y();
+LinePixels::LinePixels(QPoint from, QPoint to) : m_from(pulledIn(from)) {
+    const QPoint delta = pulledIn(to) - m_from;
+    m_steep = std::abs(delta.y()) > std::abs(delta.x());
+    const int major = m_steep ? delta.y() : delta.x();
+    m_count = std::abs(major);
+    m_majorStep = major < 0 ? -1 : 1;
+    m_minorDelta = m_steep ? delta.x() : delta.y();
 }
 
 LinePixels::Range LinePixels::within(const QRect& bounds) const {
-    const int start = steep_ ? from_.y() : from_.x();
-    const int low = steep_ ? bounds.top() : bounds.left();
-    const int high = steep_ ? bounds.bottom() : bounds.right();
-    const int first = majorStep_ > 0 ? low - start : start - high;
-    const int last = majorStep_ > 0 ? high - start : start - low;
-    return {std::clamp(first, 0, count_), std::clamp(last + 1, 0, count_)};
+    const int start = m_steep ? m_from.y() : m_from.x();
+    const int low = m_steep ? bounds.top() : bounds.left();
+    const int high = m_steep ? bounds.bottom() : bounds.right();
+    const int first = m_majorStep > 0 ? low - start : start - high;
+    const int last = m_majorStep > 0 ? high - start : start - low;
+    return {std::clamp(first, 0, m_count), std::clamp(last + 1, 0, m_count)};
 }
 
 QPoint LinePixels::at(int index) const {
-    const int major = majorStep_ * index;
-    const auto minor = static_cast<int>(floorDiv(2 * minorDelta_ * index + count_, 2 * std::int64_t{count_}));
-    return from_ + (steep_ ? QPoint(minor, major) : QPoint(major, minor));
+    const int major = m_majorStep * index;
+    const auto minor = static_cast<int>(floorDiv(2 * m_minorDelta * index + m_count, 2 * std::int64_t{m_count}));
+    return m_from + (m_steep ? QPoint(minor, major) : QPoint(major, minor));
 }
 
 namespace {
@@ -118,32 +117,32 @@ namespace {
 /// Goes around a shape given by its rows, a row at a time down the right side and up the left one.
 class OutlineWalker {
 public:
-    explicit OutlineWalker(const Spans& rows) : rows_(rows) {}
+    explicit OutlineWalker(const Spans& rows) : m_rows(rows) {}
 
     std::vector<QPoint> walk() {
-        const int last = static_cast<int>(rows_.size()) - 1;
-        run(rows_.front().y, rows_.front().left, rows_.front().right - 1);
+        const int last = static_cast<int>(m_rows.size()) - 1;
+        run(m_rows.front().y, m_rows.front().left, m_rows.front().right - 1);
         for (int row = 1; row < last; ++row) {
             rightEnd(row);
         }
         if (last > 0) {
-            run(rows_.back().y, rows_.back().right - 1, rows_.back().left);
+            run(m_rows.back().y, m_rows.back().right - 1, m_rows.back().left);
         }
         for (int row = last - 1; row > 0; --row) {
             leftEnd(row);
         }
-        return std::move(outline_);
+        return std::move(m_outline);
     }
 
 private:
     void run(int y, int from, int to) {
         const int step = from <= to ? 1 : -1;
         for (int x = from; x != to + step; x += step) {
-            outline_.emplace_back(x, y);
+            m_outline.emplace_back(x, y);
         }
     }
     [[nodiscard]] const Span& row(int index) const {
-        return rows_[static_cast<std::size_t>(index)];
+        return m_rows[static_cast<std::size_t>(index)];
     }
     void rightEnd(int index) {
         const int end = row(index).right - 1;
@@ -169,8 +168,8 @@ private:
         }
     }
 
-    const Spans& rows_;
-    std::vector<QPoint> outline_;
+    const Spans& m_rows;
+    std::vector<QPoint> m_outline;
 };
 
 } // namespace

@@ -35,7 +35,7 @@ public:
 
     /// Number of pixels, the last point not counted. 0 when both points are the same.
     [[nodiscard]] int count() const {
-        return count_;
+        return m_count;
     }
     struct Range {
         int first;
@@ -50,11 +50,11 @@ public:
     void forEach(Range range, Plot plot) const;
 
 private:
-    QPoint from_;
-    int count_;
-    bool steep_;
-    int majorStep_;
-    std::int64_t minorDelta_;
+    QPoint m_from;
+    int m_count;
+    bool m_steep;
+    int m_majorStep;
+    std::int64_t m_minorDelta;
 };
 
 template <class Plot>
@@ -63,15 +63,15 @@ void LinePixels::forEach(Range range, Plot plot) const {
         return;
     }
     // The rest of the division that `at` does, carried on from pixel to pixel.
-    const QPoint start = at(range.first) - from_;
-    const std::int64_t whole = 2 * std::int64_t{count_};
-    std::int64_t minor = steep_ ? start.x() : start.y();
-    std::int64_t rest = 2 * minorDelta_ * range.first + count_ - minor * whole;
+    const QPoint start = at(range.first) - m_from;
+    const std::int64_t whole = 2 * std::int64_t{m_count};
+    std::int64_t minor = m_steep ? start.x() : start.y();
+    std::int64_t rest = 2 * m_minorDelta * range.first + m_count - minor * whole;
     for (int index = range.first; index < range.last; ++index) {
-        const int major = majorStep_ * index;
+        const int major = m_majorStep * index;
         const int across = static_cast<int>(minor);
-        plot(index, from_ + (steep_ ? QPoint(across, major) : QPoint(major, across)));
-        rest += 2 * minorDelta_;
+        plot(index, m_from + (m_steep ? QPoint(across, major) : QPoint(major, across)));
+        rest += 2 * m_minorDelta;
         if (rest >= whole) {
             rest -= whole;
             ++minor;

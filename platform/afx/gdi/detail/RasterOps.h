@@ -9,16 +9,16 @@
 namespace tvx::afx {
 
 using Pixel = std::uint32_t;
-constexpr Pixel kOpaque = 0xFF000000U;
-constexpr Pixel kBlackPixel = kOpaque;
-constexpr Pixel kWhitePixel = 0xFFFFFFFFU;
+constexpr Pixel opaque = 0xFF000000U;
+constexpr Pixel blackPixel = opaque;
+constexpr Pixel whitePixel = 0xFFFFFFFFU;
 
 /// A binary operation of pen (or brush) and destination: bit `pen * 2 + destination` of the table, 0..15.
 enum class Rop2 : std::uint8_t { black = 0, notDestination = 5, xorPen = 6, nop = 10, copy = 12, white = 15 };
 
 /// A ternary operation: bit `brush * 4 + source * 2 + destination` of the table, 0..255.
 using Rop3 = std::uint8_t;
-constexpr Rop3 kRop3Source = 0xCC;
+constexpr Rop3 rop3Source = 0xCC;
 
 /// The operation of a code for the `SetROP2` call (1..16).
 constexpr Rop2 rop2FromCode(int code) {
@@ -42,7 +42,7 @@ constexpr Rop2 rop2FromRop3(Rop3 rop) {
 
 constexpr Pixel combine(Rop2 rop, Pixel pen, Pixel destination) {
     const auto table = static_cast<unsigned>(rop);
-    Pixel result = kOpaque;
+    Pixel result = opaque;
     if (table & 1) {
         result |= ~pen & ~destination;
     }
@@ -61,7 +61,7 @@ constexpr Pixel combine(Rop2 rop, Pixel pen, Pixel destination) {
 constexpr Pixel combine(Rop3 rop, Pixel brush, Pixel source, Pixel destination) {
     const Rop2 withoutBrush = static_cast<Rop2>(rop & 0xF);
     const Rop2 withBrush = static_cast<Rop2>(rop >> 4);
-    return kOpaque | (~brush & combine(withoutBrush, source, destination)) |
+    return opaque | (~brush & combine(withoutBrush, source, destination)) |
            (brush & combine(withBrush, source, destination));
 }
 
@@ -69,34 +69,34 @@ constexpr Pixel combine(Rop3 rop, Pixel brush, Pixel source, Pixel destination) 
 class PenOperation {
 public:
     constexpr PenOperation(Rop2 rop, Pixel pen)
-        : and_(combine(rop, pen, 0) ^ combine(rop, pen, ~Pixel{0})), xor_(combine(rop, pen, 0)) {}
+        : m_and(combine(rop, pen, 0) ^ combine(rop, pen, ~Pixel{0})), m_xor(combine(rop, pen, 0)) {}
     [[nodiscard]] constexpr Pixel operator()(Pixel destination) const {
-        return ((destination & and_) ^ xor_) | kOpaque;
+        return ((destination & m_and) ^ m_xor) | opaque;
     }
 
 private:
-    Pixel and_;
-    Pixel xor_;
+    Pixel m_and;
+    Pixel m_xor;
 };
 
 /// A ternary operation with a brush that does not change: its polynomial in source and destination.
 class BlitOperation {
 public:
     constexpr BlitOperation(Rop3 rop, Pixel brush)
-        : constant_(combine(rop, brush, 0, 0)),
-          source_(constant_ ^ combine(rop, brush, ~Pixel{0}, 0)),
-          destination_(constant_ ^ combine(rop, brush, 0, ~Pixel{0})),
-          both_(constant_ ^ source_ ^ destination_ ^ combine(rop, brush, ~Pixel{0}, ~Pixel{0})) {}
+        : m_constant(combine(rop, brush, 0, 0)),
+          m_source(m_constant ^ combine(rop, brush, ~Pixel{0}, 0)),
+          m_destination(m_constant ^ combine(rop, brush, 0, ~Pixel{0})),
+          m_both(m_constant ^ m_source ^ m_destination ^ combine(rop, brush, ~Pixel{0}, ~Pixel{0})) {}
     [[nodiscard]] constexpr Pixel operator()(Pixel source, Pixel destination) const {
-        return (constant_ ^ (source & source_) ^ (destination & destination_) ^ (source & destination & both_)) |
-               kOpaque;
+        return (m_constant ^ (source & m_source) ^ (destination & m_destination) ^ (source & destination & m_both)) |
+               opaque;
     }
 
 private:
-    Pixel constant_;
-    Pixel source_;
-    Pixel destination_;
-    Pixel both_;
+    Pixel m_constant;
+    Pixel m_source;
+    Pixel m_destination;
+    Pixel m_both;
 };
 
 } // namespace tvx::afx

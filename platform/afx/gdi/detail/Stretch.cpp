@@ -31,50 +31,50 @@ namespace {
 /// The pixels of a part of a source, by their places in the whole.
 class PartReader {
 public:
-    PartReader(const QImage& part, QPoint offset) : part_(part), area_(offset, part.size()) {}
+    PartReader(const QImage& part, QPoint offset) : m_part(part), m_area(offset, part.size()) {}
     [[nodiscard]] Pixel at(int x, int y) const {
-        const int column = std::clamp(x, area_.left(), area_.right()) - area_.left();
-        const int row = std::clamp(y, area_.top(), area_.bottom()) - area_.top();
-        return reinterpret_cast<const Pixel*>(part_.constScanLine(row))[column];
+        const int column = std::clamp(x, m_area.left(), m_area.right()) - m_area.left();
+        const int row = std::clamp(y, m_area.top(), m_area.bottom()) - m_area.top();
+        return reinterpret_cast<const Pixel*>(m_part.constScanLine(row))[column];
     }
 
 private:
-    const QImage& part_;
-    QRect area_;
+    const QImage& m_part;
+    QRect m_area;
 };
 
 /// Makes one pixel out of several.
 class PixelSum {
 public:
-    explicit PixelSum(int mode) : mode_(mode) {}
+    explicit PixelSum(int mode) : m_mode(mode) {}
     void add(Pixel pixel) {
-        all_ &= pixel;
-        any_ |= pixel;
+        m_all &= pixel;
+        m_any |= pixel;
         for (int channel = 0; channel < 3; ++channel) {
-            sums_[channel] += (pixel >> (8 * channel)) & 0xFF;
+            m_sums[channel] += (pixel >> (8 * channel)) & 0xFF;
         }
-        ++count_;
+        ++m_count;
     }
     [[nodiscard]] Pixel result() const {
-        if (mode_ == BLACKONWHITE) {
-            return kOpaque | all_;
+        if (m_mode == BLACKONWHITE) {
+            return opaque | m_all;
         }
-        if (mode_ == WHITEONBLACK) {
-            return kOpaque | any_;
+        if (m_mode == WHITEONBLACK) {
+            return opaque | m_any;
         }
-        Pixel mean = kOpaque;
+        Pixel mean = opaque;
         for (int channel = 0; channel < 3; ++channel) {
-            mean |= static_cast<Pixel>((sums_[channel] + count_ / 2) / count_) << (8 * channel);
+            mean |= static_cast<Pixel>((m_sums[channel] + m_count / 2) / m_count) << (8 * channel);
         }
         return mean;
     }
 
 private:
-    int mode_;
-    Pixel all_ = kWhitePixel;
-    Pixel any_ = 0;
-    std::uint64_t sums_[3] = {};
-    std::uint64_t count_ = 0;
+    int m_mode;
+    Pixel m_all = whitePixel;
+    Pixel m_any = 0;
+    std::uint64_t m_sums[3] = {};
+    std::uint64_t m_count = 0;
 };
 
 Pixel combinedPixel(const PartReader& reader, StretchAxis::Range columns, StretchAxis::Range rows, int mode) {

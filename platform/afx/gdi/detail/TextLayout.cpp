@@ -8,7 +8,7 @@ namespace tvx::afx {
 
 namespace {
 
-constexpr std::string_view kEllipsis = "...";
+constexpr std::string_view ellipsis = "...";
 
 /// Takes the ampersands out: the last one before a character underlines it, a doubled one stands for itself.
 LayoutLine withoutPrefixes(std::string_view text, UINT format) {
@@ -47,7 +47,7 @@ std::vector<std::string_view> paragraphs(std::string_view text) {
 
 class Breaker {
 public:
-    Breaker(const CDC& dc, const TextLayoutStyle& style) : dc_(dc), style_(style) {}
+    Breaker(const CDC& dc, const TextLayoutStyle& style) : m_dc(dc), m_style(style) {}
 
     /// The lines of a paragraph, broken between words. A word wider than the rectangle has a line of its own.
     std::vector<LayoutLine> lines(const LayoutLine& paragraph) const {
@@ -67,7 +67,7 @@ private:
         for (std::size_t end = at; end < text.size();) {
             end = std::min(text.find(' ', std::min(text.find_first_not_of(' ', end), text.size())), text.size());
             const std::string_view line = std::string_view(text).substr(at, end - at);
-            if (layoutWidth(dc_, line, style_) > style_.width && fitting != std::string::npos) {
+            if (layoutWidth(m_dc, line, m_style) > m_style.width && fitting != std::string::npos) {
                 return fitting;
             }
             fitting = end;
@@ -85,8 +85,8 @@ private:
         return line;
     }
 
-    const CDC& dc_;
-    const TextLayoutStyle& style_;
+    const CDC& m_dc;
+    const TextLayoutStyle& m_style;
 };
 
 void dropMnemonicBeyond(LayoutLine& line, std::size_t kept) {
@@ -101,7 +101,7 @@ void shortenEnd(LayoutLine& line, const CDC& dc, const TextLayoutStyle& style) {
     std::string shortened = line.text;
     while (layoutWidth(dc, shortened, style) > style.width && text::previousCharacter(line.text, kept) > 0) {
         kept = text::previousCharacter(line.text, kept);
-        shortened = line.text.substr(0, kept).append(kEllipsis);
+        shortened = line.text.substr(0, kept).append(ellipsis);
     }
     dropMnemonicBeyond(line, kept);
     line.text = shortened;
@@ -115,7 +115,7 @@ void shortenPath(LayoutLine& line, const CDC& dc, const TextLayoutStyle& style) 
     std::string shortened = line.text;
     while (layoutWidth(dc, shortened, style) > style.width && kept > 0) {
         kept = text::previousCharacter(line.text, kept);
-        shortened = line.text.substr(0, kept).append(kEllipsis).append(tail);
+        shortened = line.text.substr(0, kept).append(ellipsis).append(tail);
     }
     dropMnemonicBeyond(line, kept);
     line.text = shortened;

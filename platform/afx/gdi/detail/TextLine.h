@@ -28,9 +28,9 @@ public:
     void draw(Canvas& canvas, QPoint left, Pixel color) const;
 
 private:
-    const RealizedFont& font_;
-    QString text_;
-    std::vector<int> advances_;
+    const RealizedFont& m_font;
+    QString m_text;
+    std::vector<int> m_advances;
 };
 
 /// Text for the toolkit: UTF-8, every byte that belongs to no UTF-8 sequence as the Latin-1 character of its value.
@@ -45,8 +45,8 @@ public:
     [[nodiscard]] int after(int x) const;
 
 private:
-    std::vector<int> stops_;
-    int every_;
+    std::vector<int> m_stops;
+    int m_every;
 };
 
 } // namespace tvx::afx

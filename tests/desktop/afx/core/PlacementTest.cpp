@@ -25,7 +25,7 @@ namespace {
 
 CWinApp testApplication("Placement tests");
 
-constexpr int kPatience = 5000;
+constexpr int patience = 5000;
 
 /// What a rectangle is called in failures.
 std::string words(const CRect& rect) {
@@ -78,7 +78,7 @@ protected:
     /// Waits until the frame stands at a rectangle, its borders included, for the framework and for the display server.
     void standsAt(const CRect& rect) const {
         const bool stands =
-            QTest::qWaitFor([&] { return framed() && frameRect() == rect && onScreen() == rect; }, kPatience);
+            QTest::qWaitFor([&] { return framed() && frameRect() == rect && onScreen() == rect; }, patience);
         EXPECT_TRUE(stands) << words(frameRect()) << ", on the screen " << words(onScreen()) << ", not " << words(rect);
     }
     bool framed() const {
@@ -91,15 +91,15 @@ protected:
     }
     bool fillsScreen() const {
         return QTest::qWaitFor([&] { return framed() && frameRect().Width() >= ::GetSystemMetrics(SM_CXSCREEN); },
-                               kPatience);
+                               patience);
     }
     bool becomes(UINT command) const {
-        return QTest::qWaitFor([&] { return placementOf(*frame).showCmd == command; }, kPatience);
+        return QTest::qWaitFor([&] { return placementOf(*frame).showCmd == command; }, patience);
     }
     std::unique_ptr<TestFrame> frame;
 };
 
-const CRect kPlace(90, 70, 690, 520);
+const CRect givenPlace(90, 70, 690, 520);
 
 } // namespace
 
@@ -108,33 +108,33 @@ TEST_F(FramesOnDesktop, PlacedBeforeTheFirstShowStandAtTheRectangle) {
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     standsAt(CRect(0, 0, 600, 400));
     make();
-    frame->MoveWindow(kPlace);
-    EXPECT_EQ(frameRect(), kPlace) << "also before it is shown";
+    frame->MoveWindow(givenPlace);
+    EXPECT_EQ(frameRect(), givenPlace) << "also before it is shown";
     frame->ShowWindow(SW_SHOW);
-    standsAt(kPlace);
+    standsAt(givenPlace);
 }
 
 TEST_F(FramesOnDesktop, SavedAndRestoredAgainAndAgainStayWhereTheyAre) {
-    auto placement = placementFor(kPlace, SW_SHOWNORMAL);
+    auto placement = placementFor(givenPlace, SW_SHOWNORMAL);
     for (int i = 0; i < 4; ++i) {
         ASSERT_TRUE(frame->SetWindowPlacement(&placement));
-        standsAt(kPlace);
+        standsAt(givenPlace);
         placement = placementOf(*frame);
-        EXPECT_EQ(CRect(placement.rcNormalPosition), kPlace);
+        EXPECT_EQ(CRect(placement.rcNormalPosition), givenPlace);
         make();
     }
 }
 
 TEST_F(FramesOnDesktop, MaximizedRememberWhereTheyGoBackTo) {
-    auto placement = placementFor(kPlace, SW_SHOWMAXIMIZED);
+    auto placement = placementFor(givenPlace, SW_SHOWMAXIMIZED);
     for (int i = 0; i < 2; ++i) {
         ASSERT_TRUE(frame->SetWindowPlacement(&placement));
         ASSERT_TRUE(becomes(SW_SHOWMAXIMIZED));
         ASSERT_TRUE(fillsScreen());
         placement = placementOf(*frame);
-        EXPECT_EQ(CRect(placement.rcNormalPosition), kPlace) << words(placement.rcNormalPosition);
+        EXPECT_EQ(CRect(placement.rcNormalPosition), givenPlace) << words(placement.rcNormalPosition);
         frame->ShowWindow(SW_RESTORE);
-        standsAt(kPlace);
+        standsAt(givenPlace);
         make();
     }
 }
@@ -143,43 +143,43 @@ TEST_F(FramesOnDesktop, MaximizedByTheWindowManagerRememberTheirLastPlace) {
     frame->ShowWindow(SW_SHOW);
     frame->MoveWindow(CRect(10, 20, 500, 400));
     standsAt(CRect(10, 20, 500, 400));
-    frame->MoveWindow(kPlace);
-    standsAt(kPlace);
+    frame->MoveWindow(givenPlace);
+    standsAt(givenPlace);
     frame->GetState()->widget()->windowHandle()->showMaximized();
     ASSERT_TRUE(becomes(SW_SHOWMAXIMIZED));
     ASSERT_TRUE(fillsScreen());
-    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), kPlace) << words(placementOf(*frame).rcNormalPosition);
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace) << words(placementOf(*frame).rcNormalPosition);
     frame->ShowWindow(SW_RESTORE);
-    standsAt(kPlace);
+    standsAt(givenPlace);
     EXPECT_EQ(placementOf(*frame).showCmd, UINT{SW_SHOWNORMAL});
 }
 
 TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangle) {
     frame->ShowWindow(SW_SHOWMAXIMIZED);
     ASSERT_TRUE(fillsScreen());
-    auto placement = placementFor(kPlace, SW_SHOWMAXIMIZED);
+    auto placement = placementFor(givenPlace, SW_SHOWMAXIMIZED);
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
-    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), kPlace);
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
     placement.showCmd = SW_SHOWNORMAL;
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
-    standsAt(kPlace);
+    standsAt(givenPlace);
 }
 
 TEST_F(FramesOnDesktop, MinimizedSayWhetherTheyWereMaximized) {
-    auto placement = placementFor(kPlace, SW_SHOWMAXIMIZED);
+    auto placement = placementFor(givenPlace, SW_SHOWMAXIMIZED);
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     ASSERT_TRUE(becomes(SW_SHOWMAXIMIZED));
     frame->ShowWindow(SW_MINIMIZE);
     ASSERT_TRUE(becomes(SW_SHOWMINIMIZED));
     placement = placementOf(*frame);
     EXPECT_EQ(placement.flags, UINT{WPF_RESTORETOMAXIMIZED});
-    EXPECT_EQ(CRect(placement.rcNormalPosition), kPlace);
+    EXPECT_EQ(CRect(placement.rcNormalPosition), givenPlace);
     make();
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     ASSERT_TRUE(becomes(SW_SHOWMINIMIZED));
     frame->ShowWindow(SW_RESTORE);
     ASSERT_TRUE(becomes(SW_SHOWMAXIMIZED));
-    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), kPlace);
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
 }
 
 TEST_F(FramesOnDesktop, PlacedOffTheScreenComeBackToIt) {
@@ -202,18 +202,18 @@ protected:
 } // namespace
 
 TEST_F(FramesOnDesktop, HaveDialogsOverTheirMiddleInTheWholeSizeThatTheyGaveThemselves) {
-    frame->MoveWindow(kPlace);
+    frame->MoveWindow(givenPlace);
     frame->ShowWindow(SW_SHOW);
-    standsAt(kPlace);
+    standsAt(givenPlace);
     LaidOutDialog dialog;
     ASSERT_TRUE(dialog.Create(IDD_EMPTY, frame.get()));
     dialog.ShowWindow(SW_SHOW);
     const QWidget& widget = *dialog.GetState()->widget();
     const CSize size(420, 260);
-    const CRect wanted(kPlace.CenterPoint() - CSize(size.cx / 2, size.cy / 2), size);
+    const CRect wanted(givenPlace.CenterPoint() - CSize(size.cx / 2, size.cy / 2), size);
     const auto onScreen = [&] { return fromQt(widget.windowHandle()->frameGeometry()); };
     const auto framed = [&] { return widget.windowHandle()->frameMargins().top() > 0; };
-    EXPECT_TRUE(QTest::qWaitFor([&] { return framed() && onScreen() == wanted; }, kPatience)) << words(onScreen());
+    EXPECT_TRUE(QTest::qWaitFor([&] { return framed() && onScreen() == wanted; }, patience)) << words(onScreen());
     dialog.DestroyWindow();
 }
 
@@ -234,14 +234,14 @@ TEST(DialogsOnDesktop, KeepTheirInsideAndStandWhereTheyStood) {
     const CRect inside = client();
     dialog.MoveWindow(200, 150, inside.Width(), inside.Height());
     dialog.ShowWindow(SW_SHOW);
-    ASSERT_TRUE(QTest::qWaitFor([&] { return framed() && rect().TopLeft() == CPoint(200, 150); }, kPatience))
+    ASSERT_TRUE(QTest::qWaitFor([&] { return framed() && rect().TopLeft() == CPoint(200, 150); }, patience))
         << words(rect());
     EXPECT_EQ(client(), inside) << "the borders are around it, not in it: " << words(client());
     const WINDOWPLACEMENT placement = placementOf(dialog);
     dialog.DestroyWindow();
     ASSERT_TRUE(dialog.Create(IDD_EMPTY));
     ASSERT_TRUE(dialog.SetWindowPlacement(&placement));
-    EXPECT_TRUE(QTest::qWaitFor([&] { return rect() == CRect(placement.rcNormalPosition) && framed(); }, kPatience))
+    EXPECT_TRUE(QTest::qWaitFor([&] { return rect() == CRect(placement.rcNormalPosition) && framed(); }, patience))
         << words(rect());
     EXPECT_EQ(client(), inside) << words(client());
     dialog.DestroyWindow();

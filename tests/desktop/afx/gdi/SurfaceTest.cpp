@@ -14,7 +14,7 @@ using namespace tvx::afx;
 
 namespace {
 
-constexpr int kPatience = 5000;
+constexpr int patience = 5000;
 
 HDC openContext(QWidget& widget) {
     return addContext(std::make_shared<DeviceContext>(
@@ -28,7 +28,7 @@ QColor shown(const QWidget& widget, int x, int y) {
 
 /// Waits until the screen shows a colour at a point.
 bool becomes(const QWidget& widget, QPoint point, const QColor& color) {
-    return QTest::qWaitFor([&] { return shown(widget, point.x(), point.y()) == color; }, kPatience);
+    return QTest::qWaitFor([&] { return shown(widget, point.x(), point.y()) == color; }, patience);
 }
 
 class SurfaceOnScreen : public testing::Test {

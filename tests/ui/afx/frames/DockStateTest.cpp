@@ -19,7 +19,7 @@
 
 namespace {
 
-constexpr UINT kFirst = AFX_IDW_CONTROLBAR_FIRST + 40;
+constexpr UINT firstBarId = AFX_IDW_CONTROLBAR_FIRST + 40;
 
 /// A frame with tool bars A, B, C (and D where asked for) and a status bar.
 class BarFrame : public CFrameWnd {
@@ -30,7 +30,7 @@ public:
         EnableDocking(CBRS_ALIGN_ANY);
         for (int i = 0; i < count; ++i) {
             CToolBar& bar = bars[i];
-            EXPECT_TRUE(bar.CreateEx(this, TBSTYLE_FLAT, WS_CHILD | WS_VISIBLE | CBRS_TOP, CRect(), kFirst + i));
+            EXPECT_TRUE(bar.CreateEx(this, TBSTYLE_FLAT, WS_CHILD | WS_VISIBLE | CBRS_TOP, CRect(), firstBarId + i));
             const UINT commands[] = {100, 101};
             bar.SetButtons(commands, 2);
             bar.EnableDocking(CBRS_ALIGN_ANY);
@@ -75,11 +75,11 @@ std::string BarFrame::describe(const CDockState& state) {
     std::string text;
     for (INT_PTR i = 0; i < state.m_arrBarInfo.GetSize(); ++i) {
         const auto& info = *static_cast<const CControlBarInfo*>(state.m_arrBarInfo[i]);
-        if (info.m_nBarID < kFirst) {
+        if (info.m_nBarID < firstBarId) {
             continue;
         }
         text += text.empty() ? "" : " ";
-        text += static_cast<char>((info.m_bVisible ? 'A' : 'a') + (info.m_nBarID - kFirst));
+        text += static_cast<char>((info.m_bVisible ? 'A' : 'a') + (info.m_nBarID - firstBarId));
         text += ":" + sideName(info.m_uMRUDockID) + std::to_string(info.m_nRow) + "." + std::to_string(info.m_nPlace);
         if (info.m_bFloating) {
             text += "*" + std::to_string(info.m_pointPos.x) + "," + std::to_string(info.m_pointPos.y);
@@ -146,7 +146,7 @@ TEST_F(DockState, KeepsRowsAndTheOrderInThem) {
     const auto record = [&](UINT index) {
         for (INT_PTR i = 0; i < state.m_arrBarInfo.GetSize(); ++i) {
             auto* info = static_cast<CControlBarInfo*>(state.m_arrBarInfo[i]);
-            if (info->m_nBarID == kFirst + index) {
+            if (info->m_nBarID == firstBarId + index) {
                 return info;
             }
         }
@@ -204,7 +204,7 @@ TEST_F(DockState, DamagedRecordsDoNoHarm) {
     }
     write("Bars-Summary", "Bars", "3"); // the first is missing, the others are nonsense
     write("Bars-Bar1", "BarID", "nonsense");
-    write("Bars-Bar2", "BarID", std::to_string(kFirst).c_str());
+    write("Bars-Bar2", "BarID", std::to_string(firstBarId).c_str());
     write("Bars-Bar2", "MRUDockID", "7");
     write("Bars-Bar2", "Row", "-2147483648");
     write("Bars-Bar2", "Place", "2147483647");
@@ -222,7 +222,7 @@ TEST_F(DockState, AFloatingBarOffTheScreenComesBackToIt) {
     CDockState state;
     frame->GetDockState(state);
     auto& info = *static_cast<CControlBarInfo*>(state.m_arrBarInfo[1]);
-    ASSERT_EQ(info.m_nBarID, kFirst);
+    ASSERT_EQ(info.m_nBarID, firstBarId);
     info.m_bFloating = TRUE;
     info.m_pointPos = CPoint(90000, -70000);
     frame->SetDockState(state);

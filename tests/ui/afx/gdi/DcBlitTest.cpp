@@ -6,7 +6,7 @@
 
 namespace {
 
-constexpr COLORREF kMask = 0xFFFFFF;
+constexpr COLORREF colorMask = 0xFFFFFF;
 
 struct NamedOperation {
     const char* name;
@@ -19,7 +19,7 @@ void PrintTo(const NamedOperation& operation, std::ostream* stream) {
 }
 
 using C = COLORREF;
-const NamedOperation kOperations[] = {
+const NamedOperation operations[] = {
     {"SRCCOPY", SRCCOPY, [](C, C s, C) { return s; }},
     {"SRCPAINT", SRCPAINT, [](C, C s, C d) { return s | d; }},
     {"SRCAND", SRCAND, [](C, C s, C d) { return s & d; }},
@@ -34,7 +34,7 @@ const NamedOperation kOperations[] = {
     {"PATINVERT", PATINVERT, [](C p, C, C d) { return p ^ d; }},
     {"DSTINVERT", DSTINVERT, [](C, C, C d) { return ~d; }},
     {"BLACKNESS", BLACKNESS, [](C, C, C) { return C{0}; }},
-    {"WHITENESS", WHITENESS, [](C, C, C) { return kMask; }},
+    {"WHITENESS", WHITENESS, [](C, C, C) { return colorMask; }},
     {"a masked pattern", 0x00B8074A, [](C p, C s, C d) { return ((p ^ d) & s) ^ p; }},
 };
 
@@ -48,12 +48,12 @@ TEST_P(RasterOperation, CombinesPatternSourceAndDestination) {
     CBrush brush(pattern);
     target.SelectObject(&brush);
     EXPECT_TRUE(target.BitBlt(1, 1, 1, 1, &from, 0, 0, GetParam().code));
-    EXPECT_EQ(target.GetPixel(1, 1), GetParam().result(pattern, source, destination) & kMask);
+    EXPECT_EQ(target.GetPixel(1, 1), GetParam().result(pattern, source, destination) & colorMask);
     EXPECT_EQ(target.GetPixel(0, 1), destination);
     EXPECT_EQ(target.GetPixel(2, 1), destination);
 }
 
-INSTANTIATE_TEST_SUITE_P(Named, RasterOperation, testing::ValuesIn(kOperations));
+INSTANTIATE_TEST_SUITE_P(Named, RasterOperation, testing::ValuesIn(operations));
 
 TEST(PatBlt, RefusesOperationsThatNeedASource) {
     MemoryDc dc(3, 3);
@@ -107,7 +107,7 @@ TEST_F(Blit, StretchesAndMirrors) {
 
 TEST_F(Blit, ShrinksByTheStretchingMode) {
     MemoryDc wide(6, 1), narrow(3, 1);
-    const COLORREF colors[] = {0, kMask, kMask, kMask, RGB(255, 0, 0), RGB(0, 0, 255)};
+    const COLORREF colors[] = {0, colorMask, colorMask, colorMask, RGB(255, 0, 0), RGB(0, 0, 255)};
     for (int x = 0; x < 6; ++x) {
         wide.SetPixelV(x, 0, colors[x]);
     }
@@ -115,7 +115,7 @@ TEST_F(Blit, ShrinksByTheStretchingMode) {
     EXPECT_EQ(narrow.picture(), "#.#\n");
     narrow.SetStretchBltMode(WHITEONBLACK);
     narrow.StretchBlt(0, 0, 3, 1, &wide, 0, 0, 6, 1, SRCCOPY);
-    EXPECT_EQ(narrow.GetPixel(0, 0), kMask);
+    EXPECT_EQ(narrow.GetPixel(0, 0), colorMask);
     EXPECT_EQ(narrow.GetPixel(2, 0), RGB(255, 0, 255));
     narrow.SetStretchBltMode(HALFTONE);
     narrow.StretchBlt(0, 0, 3, 1, &wide, 0, 0, 6, 1, SRCCOPY);
@@ -188,7 +188,7 @@ TEST(Pixels, AreExact) {
         EXPECT_EQ(color.SetPixel(1, 0, value), value);
         EXPECT_EQ(color.GetPixel(1, 0), value);
     }
-    EXPECT_EQ(mono.SetPixel(0, 0, RGB(200, 200, 200)), kMask);
+    EXPECT_EQ(mono.SetPixel(0, 0, RGB(200, 200, 200)), colorMask);
     EXPECT_EQ(mono.SetPixel(0, 0, RGB(10, 90, 10)), 0U);
     EXPECT_EQ(color.SetPixel(3, 0, 0), CLR_INVALID);
 }

@@ -15,15 +15,15 @@
 
 namespace {
 
-constexpr COLORREF kRed = RGB(255, 0, 0);
-constexpr COLORREF kGreen = RGB(0, 255, 0);
-constexpr COLORREF kBlue = RGB(0, 0, 255);
+constexpr COLORREF plainRed = RGB(255, 0, 0);
+constexpr COLORREF plainGreen = RGB(0, 255, 0);
+constexpr COLORREF plainBlue = RGB(0, 0, 255);
 
 /// A window with a green background that paints what the test says.
 class TestWindow : public CWnd {
 public:
     explicit TestWindow(CWnd* parent = nullptr, const CRect& rect = CRect(20, 20, 220, 170)) {
-        static CBrush green(kGreen);
+        static CBrush green(plainGreen);
         const DWORD style = parent ? WS_CHILD | WS_VISIBLE : WS_OVERLAPPEDWINDOW | WS_VISIBLE;
         CreateEx(0, AfxRegisterWndClass(0, nullptr, green), "test", style, rect.left, rect.top, rect.Width(),
                  rect.Height(), parent ? parent->m_hWnd : nullptr, nullptr);
@@ -77,35 +77,35 @@ TEST_F(WindowDc, PaintsOverABackgroundThatWasErased) {
     window.onPaint = [](CPaintDC& dc) {
         EXPECT_FALSE(dc.m_ps.fErase) << "the background brush has erased it";
         EXPECT_EQ(CRect(dc.m_ps.rcPaint), CRect(5, 5, 30, 30));
-        EXPECT_EQ(dc.GetPixel(6, 6), kGreen);
-        dc.FillSolidRect(0, 0, 20, 20, kRed);
+        EXPECT_EQ(dc.GetPixel(6, 6), plainGreen);
+        dc.FillSolidRect(0, 0, 20, 20, plainRed);
     };
     {
         CClientDC dc(&window);
-        dc.FillSolidRect(0, 0, 100, 100, kBlue);
+        dc.FillSolidRect(0, 0, 100, 100, plainBlue);
     }
     window.InvalidateRect(CRect(5, 5, 30, 30));
     window.UpdateWindow();
-    EXPECT_EQ(shown(window, 10, 10), kRed);
-    EXPECT_EQ(shown(window, 25, 25), kGreen);
-    EXPECT_EQ(shown(window, 2, 2), kBlue) << "the rest was not invalid";
+    EXPECT_EQ(shown(window, 10, 10), plainRed);
+    EXPECT_EQ(shown(window, 25, 25), plainGreen);
+    EXPECT_EQ(shown(window, 2, 2), plainBlue) << "the rest was not invalid";
 }
 
 TEST_F(WindowDc, DrawsAtAnyTimeThroughEachKindOfContext) {
     const int paints = window.paints;
     {
         CClientDC dc(&window);
-        dc.FillSolidRect(0, 0, 10, 10, kRed);
+        dc.FillSolidRect(0, 0, 10, 10, plainRed);
     }
-    EXPECT_EQ(shown(window, 5, 5), kRed);
+    EXPECT_EQ(shown(window, 5, 5), plainRed);
     CDC* dc = window.GetDC();
     ASSERT_NE(dc, nullptr);
-    dc->FillSolidRect(10, 0, 10, 10, kBlue);
+    dc->FillSolidRect(10, 0, 10, 10, plainBlue);
     EXPECT_EQ(window.ReleaseDC(dc), 1);
-    EXPECT_EQ(shown(window, 15, 5), kBlue);
+    EXPECT_EQ(shown(window, 15, 5), plainBlue);
     settle();
     EXPECT_EQ(window.paints, paints);
-    EXPECT_EQ(shown(window, 5, 5), kRed);
+    EXPECT_EQ(shown(window, 5, 5), plainRed);
 }
 
 TEST_F(WindowDc, OfTheWholeWindowBeginsAtTheFrame) {
@@ -115,10 +115,10 @@ TEST_F(WindowDc, OfTheWholeWindowBeginsAtTheFrame) {
     window.ClientToScreen(&client);
     {
         CWindowDC dc(&window);
-        dc.FillSolidRect(client.x - frame.left + 3, client.y - frame.top + 4, 5, 5, kRed);
+        dc.FillSolidRect(client.x - frame.left + 3, client.y - frame.top + 4, 5, 5, plainRed);
     }
-    EXPECT_EQ(shown(window, 3, 4), kRed);
-    EXPECT_EQ(shown(window, 2, 4), kGreen);
+    EXPECT_EQ(shown(window, 3, 4), plainRed);
+    EXPECT_EQ(shown(window, 2, 4), plainGreen);
 }
 
 TEST_F(WindowDc, OfAChildStaysInsideIt) {
@@ -126,12 +126,12 @@ TEST_F(WindowDc, OfAChildStaysInsideIt) {
     settle();
     {
         CClientDC inner(&child);
-        inner.FillSolidRect(-50, -50, 500, 500, kBlue);
+        inner.FillSolidRect(-50, -50, 500, 500, plainBlue);
         CClientDC outer(&window);
-        outer.FillSolidRect(0, 0, 200, 100, kRed);
+        outer.FillSolidRect(0, 0, 200, 100, plainRed);
     }
-    EXPECT_EQ(shown(window, 60, 60), kBlue);
-    EXPECT_EQ(shown(window, 49, 60), kRed);
+    EXPECT_EQ(shown(window, 60, 60), plainBlue);
+    EXPECT_EQ(shown(window, 49, 60), plainRed);
 }
 
 TEST_F(WindowDc, NeedsAWindow) {
@@ -162,9 +162,9 @@ TEST_F(WindowDc, PaintsNothingOutsideOfAPaintMessage) {
     {
         CPaintDC dc(&window);
         EXPECT_TRUE(CRect(dc.m_ps.rcPaint).IsRectEmpty());
-        dc.FillSolidRect(0, 0, 50, 50, kRed);
+        dc.FillSolidRect(0, 0, 50, 50, plainRed);
     }
-    EXPECT_EQ(shown(window, 5, 5), kGreen);
+    EXPECT_EQ(shown(window, 5, 5), plainGreen);
 }
 
 TEST_F(WindowDc, LeavesNoContextBehind) {

@@ -21,9 +21,9 @@ using namespace tvx::afx;
 
 namespace {
 
-constexpr COLORREF kRed = RGB(255, 0, 0);
-constexpr COLORREF kGreen = RGB(0, 255, 0);
-constexpr COLORREF kBlue = RGB(0, 0, 255);
+constexpr COLORREF plainRed = RGB(255, 0, 0);
+constexpr COLORREF plainGreen = RGB(0, 255, 0);
+constexpr COLORREF plainBlue = RGB(0, 0, 255);
 
 /// A widget that paints itself green, or as the test says.
 class Canvas : public QWidget {
@@ -90,42 +90,42 @@ TEST_F(Surface, ShowsDrawingAtOnceAndUntilThePartIsInvalidated) {
     const int paints = window.paints;
     {
         WidgetDc dc(window);
-        dc.FillSolidRect(10, 10, 20, 20, kRed);
-        EXPECT_EQ(dc.GetPixel(10, 10), kRed);
-        EXPECT_EQ(dc.GetPixel(9, 10), kGreen) << "what the toolkit painted can be read";
+        dc.FillSolidRect(10, 10, 20, 20, plainRed);
+        EXPECT_EQ(dc.GetPixel(10, 10), plainRed);
+        EXPECT_EQ(dc.GetPixel(9, 10), plainGreen) << "what the toolkit painted can be read";
     }
-    EXPECT_EQ(shown(window, 15, 15), kRed);
+    EXPECT_EQ(shown(window, 15, 15), plainRed);
     settle();
     EXPECT_EQ(window.paints, paints);
-    EXPECT_EQ(shown(window, 29, 29), kRed);
+    EXPECT_EQ(shown(window, 29, 29), plainRed);
     window.update(0, 0, 20, 20);
     settle();
-    EXPECT_EQ(shown(window, 15, 15), kGreen);
-    EXPECT_EQ(shown(window, 25, 25), kRed) << "outside the invalid part it stays";
+    EXPECT_EQ(shown(window, 15, 15), plainGreen);
+    EXPECT_EQ(shown(window, 25, 25), plainRed) << "outside the invalid part it stays";
 }
 
 TEST_F(Surface, ShowsTheDrawingOfAContextThatIsKeptOpen) {
     WidgetDc dc(window);
-    dc.FillSolidRect(0, 0, 5, 5, kRed);
+    dc.FillSolidRect(0, 0, 5, 5, plainRed);
     settle();
-    EXPECT_EQ(shown(window, 2, 2), kRed);
+    EXPECT_EQ(shown(window, 2, 2), plainRed);
     window.update();
     settle();
-    EXPECT_EQ(dc.GetPixel(2, 2), kGreen) << "painted by the toolkit in between";
-    dc.FillSolidRect(0, 0, 5, 5, kBlue);
-    EXPECT_EQ(dc.GetPixel(2, 2), kBlue);
+    EXPECT_EQ(dc.GetPixel(2, 2), plainGreen) << "painted by the toolkit in between";
+    dc.FillSolidRect(0, 0, 5, 5, plainBlue);
+    EXPECT_EQ(dc.GetPixel(2, 2), plainBlue);
 }
 
 TEST_F(Surface, FollowsAWindowThatIsResizedWhileAContextIsOpen) {
     WidgetDc dc(window);
     for (const QSize size : {QSize(400, 300), QSize(50, 40), QSize(800, 600)}) {
         window.resize(size);
-        dc.FillSolidRect(0, 0, 1000, 1000, kRed); // before the toolkit made new pixels
+        dc.FillSolidRect(0, 0, 1000, 1000, plainRed); // before the toolkit made new pixels
         settle();
-        dc.FillSolidRect(size.width() - 5, size.height() - 5, 5, 5, kBlue);
-        EXPECT_EQ(dc.GetPixel(size.width() - 1, size.height() - 1), kBlue);
+        dc.FillSolidRect(size.width() - 5, size.height() - 5, 5, 5, plainBlue);
+        EXPECT_EQ(dc.GetPixel(size.width() - 1, size.height() - 1), plainBlue);
         EXPECT_EQ(dc.GetPixel(size.width(), 0), CLR_INVALID);
-        EXPECT_EQ(shown(window, size.width() - 2, size.height() - 2), kBlue);
+        EXPECT_EQ(shown(window, size.width() - 2, size.height() - 2), plainBlue);
     }
 }
 
@@ -140,8 +140,8 @@ TEST_F(Surface, DropsDrawingOnHiddenWindows) {
     EXPECT_EQ(dc.GetClipBox(&box), NULLREGION);
     window.show();
     settle();
-    dc.FillSolidRect(0, 0, 5, 5, kRed);
-    EXPECT_EQ(dc.GetPixel(0, 0), kRed);
+    dc.FillSolidRect(0, 0, 5, 5, plainRed);
+    EXPECT_EQ(dc.GetPixel(0, 0), plainRed);
     Canvas never;
     WidgetDc early(never);
     EXPECT_TRUE(early.Rectangle(0, 0, 10, 10));
@@ -152,7 +152,7 @@ TEST_F(Surface, OutlivesItsWindow) {
     gone->show();
     settle();
     WidgetDc dc(*gone);
-    dc.FillSolidRect(0, 0, 5, 5, kRed);
+    dc.FillSolidRect(0, 0, 5, 5, plainRed);
     gone.reset();
     EXPECT_TRUE(dc.Rectangle(0, 0, 10, 10));
     EXPECT_EQ(dc.GetPixel(0, 0), CLR_INVALID);
@@ -166,16 +166,16 @@ TEST_F(Surface, ServesSeveralContextsAtOnce) {
     child.show();
     settle();
     WidgetDc first(window), second(window), inner(child);
-    first.FillSolidRect(0, 0, 10, 10, kRed);
+    first.FillSolidRect(0, 0, 10, 10, plainRed);
     second.BitBlt(10, 0, 10, 10, &first, 0, 0, SRCCOPY);
     inner.BitBlt(0, 0, 10, 10, &second, 10, 0, SRCCOPY);
-    first.FillSolidRect(5, 0, 10, 10, kBlue);
-    EXPECT_EQ(second.GetPixel(4, 0), kRed);
-    EXPECT_EQ(second.GetPixel(14, 0), kBlue);
-    EXPECT_EQ(second.GetPixel(15, 0), kRed);
-    EXPECT_EQ(inner.GetPixel(0, 0), kRed);
+    first.FillSolidRect(5, 0, 10, 10, plainBlue);
+    EXPECT_EQ(second.GetPixel(4, 0), plainRed);
+    EXPECT_EQ(second.GetPixel(14, 0), plainBlue);
+    EXPECT_EQ(second.GetPixel(15, 0), plainRed);
+    EXPECT_EQ(inner.GetPixel(0, 0), plainRed);
     inner.DeleteDC();
-    EXPECT_EQ(shown(child, 0, 0), kRed);
+    EXPECT_EQ(shown(child, 0, 0), plainRed);
 }
 
 TEST_F(Surface, LeavesChildWindowsAlone) {
@@ -191,25 +191,25 @@ TEST_F(Surface, LeavesChildWindowsAlone) {
     settle();
     {
         WidgetDc dc(window);
-        dc.FillSolidRect(0, 0, 200, 150, kRed);
+        dc.FillSolidRect(0, 0, 200, 150, plainRed);
         EXPECT_EQ(dc.GetPixel(60, 60), CLR_INVALID);
         EXPECT_EQ(dc.GetPixel(105, 55), CLR_INVALID);
         EXPECT_FALSE(dc.RectVisible(CRect(55, 55, 80, 80)));
     }
-    EXPECT_EQ(shown(window, 60, 60), kGreen);
-    EXPECT_EQ(shown(window, 49, 60), kRed);
-    EXPECT_EQ(shown(window, 105, 55), kGreen);
-    EXPECT_EQ(shown(window, 50, 125), kRed) << "a group box only stands around its controls";
+    EXPECT_EQ(shown(window, 60, 60), plainGreen);
+    EXPECT_EQ(shown(window, 49, 60), plainRed);
+    EXPECT_EQ(shown(window, 105, 55), plainGreen);
+    EXPECT_EQ(shown(window, 50, 125), plainRed) << "a group box only stands around its controls";
     WidgetDc inner(child);
-    inner.FillSolidRect(-100, -100, 500, 500, kBlue);
+    inner.FillSolidRect(-100, -100, 500, 500, plainBlue);
     inner.DeleteDC();
-    EXPECT_EQ(shown(window, 60, 60), kBlue);
-    EXPECT_EQ(shown(window, 49, 60), kRed) << "a child draws inside of itself only";
+    EXPECT_EQ(shown(window, 60, 60), plainBlue);
+    EXPECT_EQ(shown(window, 49, 60), plainRed) << "a child draws inside of itself only";
     child.hide();
     settle();
     WidgetDc again(window);
-    again.FillSolidRect(0, 0, 200, 150, kRed);
-    EXPECT_EQ(again.GetPixel(60, 60), kRed) << "a hidden child covers nothing";
+    again.FillSolidRect(0, 0, 200, 150, plainRed);
+    EXPECT_EQ(again.GetPixel(60, 60), plainRed) << "a hidden child covers nothing";
 }
 
 TEST_F(Surface, DoesNotDrawOverDocumentsInFront) {
@@ -226,9 +226,9 @@ TEST_F(Surface, DoesNotDrawOverDocumentsInFront) {
     settle();
     WidgetDc dc(*back->widget());
     const QPoint covered = back->widget()->mapFrom(&area, QPoint(70, 70));
-    dc.FillSolidRect(0, 0, 200, 200, kRed);
+    dc.FillSolidRect(0, 0, 200, 200, plainRed);
     EXPECT_EQ(dc.GetPixel(covered.x(), covered.y()), CLR_INVALID);
-    EXPECT_EQ(dc.GetPixel(5, 5), kRed);
+    EXPECT_EQ(dc.GetPixel(5, 5), plainRed);
     area.setActiveSubWindow(back);
     settle();
     EXPECT_NE(dc.GetPixel(covered.x(), covered.y()), CLR_INVALID);
@@ -240,26 +240,26 @@ TEST_F(Surface, CoversTheMenuBarInContextsOfWholeWindows) {
     bar.show();
     settle();
     WidgetDc client(window), whole(window, WindowPart::whole);
-    client.FillSolidRect(0, 0, 200, 30, kRed);
+    client.FillSolidRect(0, 0, 200, 30, plainRed);
     EXPECT_EQ(client.GetPixel(5, 5), CLR_INVALID);
-    whole.FillSolidRect(0, 0, 10, 10, kBlue);
-    EXPECT_EQ(whole.GetPixel(5, 5), kBlue);
+    whole.FillSolidRect(0, 0, 10, 10, plainBlue);
+    EXPECT_EQ(whole.GetPixel(5, 5), plainBlue);
     whole.DeleteDC();
-    EXPECT_EQ(shown(window, 5, 5), kBlue);
-    EXPECT_EQ(shown(window, 5, 25), kRed);
+    EXPECT_EQ(shown(window, 5, 5), plainBlue);
+    EXPECT_EQ(shown(window, 5, 25), plainRed);
 }
 
 TEST_F(Surface, PaintsOnlyWhatNeedsPainting) {
     window.onPaint = [&](const QRegion& update) {
         WidgetPaintDc dc(window, update);
-        dc.FillSolidRect(0, 0, 200, 150, kBlue);
+        dc.FillSolidRect(0, 0, 200, 150, plainBlue);
         EXPECT_EQ(dc.GetPixel(50, 50), CLR_INVALID);
-        EXPECT_EQ(dc.GetPixel(5, 5), kBlue);
+        EXPECT_EQ(dc.GetPixel(5, 5), plainBlue);
     };
     window.update(0, 0, 10, 10);
     settle();
-    EXPECT_EQ(shown(window, 5, 5), kBlue);
-    EXPECT_EQ(shown(window, 15, 5), kGreen);
+    EXPECT_EQ(shown(window, 5, 5), plainBlue);
+    EXPECT_EQ(shown(window, 15, 5), plainGreen);
 }
 
 TEST_F(Surface, AllowsOtherContextsInsideAPaintEvent) {
@@ -269,23 +269,23 @@ TEST_F(Surface, AllowsOtherContextsInsideAPaintEvent) {
     settle();
     window.onPaint = [&](const QRegion& update) {
         WidgetPaintDc dc(window, update);
-        dc.FillSolidRect(0, 0, 200, 150, kBlue);
+        dc.FillSolidRect(0, 0, 200, 150, plainBlue);
         WidgetDc client(window), elsewhere(other);
-        client.FillSolidRect(100, 100, 5, 5, kRed); // outside the part that needs painting
-        EXPECT_EQ(client.GetPixel(5, 5), kBlue);
+        client.FillSolidRect(100, 100, 5, 5, plainRed); // outside the part that needs painting
+        EXPECT_EQ(client.GetPixel(5, 5), plainBlue);
         client.DeleteDC();
-        elsewhere.FillSolidRect(0, 0, 5, 5, kRed);
-        dc.SetPixelV(1, 1, kRed);
+        elsewhere.FillSolidRect(0, 0, 5, 5, plainRed);
+        dc.SetPixelV(1, 1, plainRed);
         QPainter painter(&window); // the toolkit's own painting goes on beside it
         painter.fillRect(2, 2, 1, 1, Qt::red);
     };
     window.update(0, 0, 10, 10);
     settle();
-    EXPECT_EQ(shown(window, 1, 1), kRed);
-    EXPECT_EQ(shown(window, 2, 2), kRed);
-    EXPECT_EQ(shown(window, 3, 3), kBlue);
-    EXPECT_EQ(shown(window, 102, 102), kRed) << "shown although the toolkit did not paint there";
-    EXPECT_EQ(shown(other, 2, 2), kRed);
+    EXPECT_EQ(shown(window, 1, 1), plainRed);
+    EXPECT_EQ(shown(window, 2, 2), plainRed);
+    EXPECT_EQ(shown(window, 3, 3), plainBlue);
+    EXPECT_EQ(shown(window, 102, 102), plainRed) << "shown although the toolkit did not paint there";
+    EXPECT_EQ(shown(other, 2, 2), plainRed);
 }
 
 TEST_F(Surface, PaintsIntoPicturesThatAreTakenOfTheWindow) {
@@ -293,13 +293,13 @@ TEST_F(Surface, PaintsIntoPicturesThatAreTakenOfTheWindow) {
     child.setGeometry(50, 50, 40, 40);
     child.onPaint = [&](const QRegion& update) {
         WidgetPaintDc dc(child, update);
-        dc.FillSolidRect(0, 0, 20, 40, kBlue);
+        dc.FillSolidRect(0, 0, 20, 40, plainBlue);
         dc.PatBlt(20, 0, 20, 20, DSTINVERT);
     };
     child.setAttribute(Qt::WA_OpaquePaintEvent, false);
     child.show();
     settle();
-    EXPECT_EQ(shown(child, 5, 5), kBlue);
+    EXPECT_EQ(shown(child, 5, 5), plainBlue);
     const QImage picture = window.grab().toImage();
     EXPECT_EQ(picture.pixelColor(55, 55), QColor(0, 0, 255));
     EXPECT_EQ(picture.pixelColor(75, 55), QColor(255, 0, 255)) << "what lies behind was inverted";
@@ -312,7 +312,7 @@ TEST_F(Surface, DrawsNothingWithAPaintContextOutsideOfPainting) {
     WidgetPaintDc dc(window, QRegion());
     EXPECT_TRUE(dc.Rectangle(0, 0, 10, 10));
     dc.DeleteDC();
-    EXPECT_EQ(shown(window, 5, 5), kGreen);
+    EXPECT_EQ(shown(window, 5, 5), plainGreen);
 }
 
 TEST_F(Surface, ErasesExclusiveOrTracksOnTheScreen) {
