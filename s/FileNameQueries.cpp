@@ -62,7 +62,7 @@ bool isWritable(const CString& form) {
 } // namespace
 
 int Gui_FileName::Exists() const {
-    return kindOf(*this) != tvx::FileKind::none;
+    return kindOf(*this) != tvx::FileKind::None;
 }
 
 int Gui_FileName::IsReadable() const {
@@ -70,11 +70,11 @@ int Gui_FileName::IsReadable() const {
 }
 
 int Gui_FileName::IsDirectory() const {
-    return kindOf(*this) == tvx::FileKind::folder;
+    return kindOf(*this) == tvx::FileKind::Folder;
 }
 
 int Gui_FileName::IsFile() const {
-    return kindOf(*this) == tvx::FileKind::file;
+    return kindOf(*this) == tvx::FileKind::File;
 }
 
 int Gui_FileName::IsWritable() const {

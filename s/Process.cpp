@@ -25,7 +25,7 @@ void close(HANDLE& handle) {
     }
 }
 
-enum class PipeEnds { onlyReadingForChild, bothForChild };
+enum class PipeEnds { OnlyReadingForChild, BothForChild };
 
 /// A pipe between the child and this process.
 struct Pipe {
@@ -46,7 +46,7 @@ struct Pipe {
             return false;
         }
         const HANDLE self = GetCurrentProcess();
-        return ends == PipeEnds::bothForChild || DuplicateHandle(self, writeEnd, self, &writeEnd, 0, FALSE,
+        return ends == PipeEnds::BothForChild || DuplicateHandle(self, writeEnd, self, &writeEnd, 0, FALSE,
                                                                  DUPLICATE_SAME_ACCESS | DUPLICATE_CLOSE_SOURCE);
     }
 };
@@ -104,7 +104,7 @@ int Gui_Process::Run(const char* commandLine, const char* directory, int capture
     startup.wShowWindow = hidden ? showHidden : showNormally;
     PROCESS_INFORMATION child;
     const bool connected =
-        !capture || (input.Create(PipeEnds::onlyReadingForChild) && output.Create(PipeEnds::bothForChild));
+        !capture || (input.Create(PipeEnds::OnlyReadingForChild) && output.Create(PipeEnds::BothForChild));
     startup.hStdInput = input.readEnd;
     startup.hStdOutput = startup.hStdError = output.writeEnd;
     if (!connected || !start(commandLine, directory, startup, child)) {

@@ -57,7 +57,7 @@ int openFile(const std::string& path, int flags) {
     return opened;
 }
 
-std::string requiredPath(LPCTSTR name, tvx::PathUse use = tvx::PathUse::existing) {
+std::string requiredPath(LPCTSTR name, tvx::PathUse use = tvx::PathUse::Existing) {
     std::optional<std::string> path = tvx::systemPath(name ? name : "", use);
     if (!path) {
         AfxThrowFileException(CFileException::badPath, -1, name);
@@ -137,7 +137,7 @@ CFile::~CFile() {
 
 BOOL CFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
     Abort();
-    const auto use = openFlags & modeCreate ? tvx::PathUse::creating : tvx::PathUse::existing;
+    const auto use = openFlags & modeCreate ? tvx::PathUse::Creating : tvx::PathUse::Existing;
     const std::optional<std::string> path = tvx::systemPath(fileName ? fileName : "", use);
     m_descriptor = path ? openFile(*path, systemFlags(openFlags)) : noDescriptor;
     if (m_descriptor != noDescriptor) {
@@ -304,7 +304,7 @@ BOOL CFile::GetStatus(LPCTSTR fileName, CFileStatus& status) {
 
 void CFile::Rename(LPCTSTR oldName, LPCTSTR newName) {
     const std::string from = requiredPath(oldName);
-    const std::string to = requiredPath(newName, tvx::PathUse::creating);
+    const std::string to = requiredPath(newName, tvx::PathUse::Creating);
     int result = ::renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str(), RENAME_NOREPLACE);
     // Some network file systems cannot refuse to replace; there the name is asked for first.
     if (result != 0 && errno == EINVAL) {

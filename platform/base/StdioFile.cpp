@@ -47,7 +47,7 @@ BOOL CStdioFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
         AfxThrowMemoryException();
     }
     m_text = !(openFlags & typeBinary);
-    m_direction = Direction::none;
+    m_direction = Direction::None;
     return TRUE;
 }
 
@@ -105,7 +105,7 @@ void CStdioFile::WriteString(LPCTSTR text) {
 }
 
 UINT CStdioFile::Read(void* buffer, UINT count) {
-    turn(Direction::reading);
+    turn(Direction::Reading);
     if (!m_text) {
         const auto read = static_cast<UINT>(std::fread(buffer, 1, count, stream()));
         checkReadError();
@@ -120,7 +120,7 @@ UINT CStdioFile::Read(void* buffer, UINT count) {
 }
 
 void CStdioFile::Write(const void* buffer, UINT count) {
-    turn(Direction::writing);
+    turn(Direction::Writing);
     if (std::fwrite(buffer, 1, count, stream()) != count) {
         throwLastError();
     }
@@ -143,7 +143,7 @@ ULONGLONG CStdioFile::Seek(LONGLONG offset, UINT from) {
         }
         throwLastError();
     }
-    m_direction = Direction::none;
+    m_direction = Direction::None;
     return GetPosition();
 }
 
@@ -169,14 +169,14 @@ void CStdioFile::SetLength(ULONGLONG length) {
 
 /// Between reading and writing a stream must be repositioned.
 void CStdioFile::turn(Direction direction) {
-    if (m_direction != Direction::none && m_direction != direction) {
+    if (m_direction != Direction::None && m_direction != direction) {
         std::fseek(stream(), 0, SEEK_CUR);
     }
     m_direction = direction;
 }
 
 int CStdioFile::nextCharacter() {
-    turn(Direction::reading);
+    turn(Direction::Reading);
     const int character = std::getc(stream());
     if (!m_text || character != '\r') {
         return character;

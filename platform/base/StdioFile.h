@@ -55,7 +55,7 @@ public:
     std::FILE* m_pStream = nullptr;
 
 private:
-    enum class Direction { none, reading, writing };
+    enum class Direction { None, Reading, Writing };
 
     void turn(Direction direction);
     int nextCharacter();
@@ -63,5 +63,5 @@ private:
     std::FILE* stream() const;
 
     bool m_text = true;
-    Direction m_direction = Direction::none;
+    Direction m_direction = Direction::None;
 };

@@ -45,7 +45,7 @@ private:
     std::vector<std::string_view> m_others;
 };
 
-enum class Member { yes, no };
+enum class Member { Yes, No };
 
 /// Where the first character at or after `at` stands that is, or is not, in the set; the length when there is none.
 std::size_t findMember(std::string_view text, std::string_view characters, Member wanted, std::size_t at = 0) {
@@ -53,7 +53,7 @@ std::size_t findMember(std::string_view text, std::string_view characters, Membe
     while (at < text.size()) {
         const bool isAscii = static_cast<unsigned char>(text[at]) < 0x80;
         const std::size_t length = isAscii ? 1 : tvx::text::characterLength(text, at);
-        if (set.contains(text.substr(at, length)) == (wanted == Member::yes)) {
+        if (set.contains(text.substr(at, length)) == (wanted == Member::Yes)) {
             return at;
         }
         at += length;
@@ -131,11 +131,11 @@ CStringT<char> CStringT<char>::Right(int count) const {
 }
 
 CStringT<char> CStringT<char>::SpanIncluding(LPCSTR set) const {
-    return Left(static_cast<int>(findMember(View(), viewOrEmpty(set), Member::no)));
+    return Left(static_cast<int>(findMember(View(), viewOrEmpty(set), Member::No)));
 }
 
 CStringT<char> CStringT<char>::SpanExcluding(LPCSTR set) const {
-    return Left(static_cast<int>(findMember(View(), viewOrEmpty(set), Member::yes)));
+    return Left(static_cast<int>(findMember(View(), viewOrEmpty(set), Member::Yes)));
 }
 
 CStringT<char> CStringT<char>::Tokenize(LPCSTR separators, int& start) const {
@@ -143,12 +143,12 @@ CStringT<char> CStringT<char>::Tokenize(LPCSTR separators, int& start) const {
         AfxThrowInvalidArgException();
     }
     const std::string_view set = viewOrEmpty(separators);
-    const std::size_t begin = findMember(View(), set, Member::no, static_cast<std::size_t>(start));
+    const std::size_t begin = findMember(View(), set, Member::No, static_cast<std::size_t>(start));
     if (begin >= View().size()) {
         start = -1;
         return {};
     }
-    const std::size_t end = findMember(View(), set, Member::yes, begin);
+    const std::size_t end = findMember(View(), set, Member::Yes, begin);
     start = static_cast<int>(end);
     return Mid(static_cast<int>(begin), static_cast<int>(end - begin));
 }
@@ -166,7 +166,7 @@ int CStringT<char>::ReverseFind(char character) const noexcept {
 }
 
 int CStringT<char>::FindOneOf(LPCSTR set) const noexcept {
-    const std::size_t found = findMember(View(), viewOrEmpty(set), Member::yes);
+    const std::size_t found = findMember(View(), viewOrEmpty(set), Member::Yes);
     return found == View().size() ? -1 : static_cast<int>(found);
 }
 
@@ -244,7 +244,7 @@ CStringT<char>& CStringT<char>::Trim(LPCSTR set) {
 }
 
 CStringT<char>& CStringT<char>::TrimLeft() {
-    keepRange(findMember(View(), whiteSpace, Member::no), View().size());
+    keepRange(findMember(View(), whiteSpace, Member::No), View().size());
     return *this;
 }
 
@@ -254,7 +254,7 @@ CStringT<char>& CStringT<char>::TrimLeft(char character) {
 }
 
 CStringT<char>& CStringT<char>::TrimLeft(LPCSTR set) {
-    keepRange(findMember(View(), viewOrEmpty(set), Member::no), View().size());
+    keepRange(findMember(View(), viewOrEmpty(set), Member::No), View().size());
     return *this;
 }
 

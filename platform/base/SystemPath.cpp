@@ -125,7 +125,7 @@ std::string corrected(const std::string& path, PathUse use) {
         const std::size_t next = std::min(path.find_first_not_of('/', end), path.size());
         const std::string_view part = std::string_view(path).substr(at, end - at);
         const bool isFixed =
-            part.empty() || (next == path.size() && use == PathUse::creating) || exists(result + std::string(part));
+            part.empty() || (next == path.size() && use == PathUse::Creating) || exists(result + std::string(part));
         const std::optional<std::string> entry = isFixed ? std::string(part) : findEntry(result, part);
         if (!entry) {
             return result + path.substr(at);
@@ -147,7 +147,7 @@ std::optional<std::string> belowSystemRoot(std::string_view name, const std::str
         return std::nullopt;
     }
     const auto wanted = [use](const std::string& path) {
-        return use == PathUse::existing ? path : path.substr(0, withoutLastPart(path));
+        return use == PathUse::Existing ? path : path.substr(0, withoutLastPart(path));
     };
     return !exists(wanted(missing)) && exists(wanted(plain)) ? std::optional(plain) : std::nullopt;
 }

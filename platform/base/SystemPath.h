@@ -34,8 +34,8 @@ TVX_PLATFORM_API const RootResolver* setRootResolver(const RootResolver* resolve
 
 /// What a name is wanted for.
 enum class PathUse {
-    existing, ///< an existing file: one that differs only in case will do
-    creating, ///< the last part is taken as it is written, so that no file of another spelling is overwritten
+    Existing, ///< an existing file: one that differs only in case will do
+    Creating, ///< the last part is taken as it is written, so that no file of another spelling is overwritten
 };
 
 /// The system's form of a file name.
@@ -51,7 +51,7 @@ enum class PathUse {
 ///
 /// @return nothing for an empty name, one that holds a zero, or one whose drive or share is unknown
 [[nodiscard]] TVX_PLATFORM_API std::optional<std::string> systemPath(std::string_view name,
-                                                                     PathUse use = PathUse::existing);
+                                                                     PathUse use = PathUse::Existing);
 
 /// The framework's form of a name of the system's: `/a/b` becomes `C:\a\b`, a relative `a/b` becomes `a\b`. A name that
 /// lies on no drive, or that holds a backslash, cannot be written so and stays as it is.

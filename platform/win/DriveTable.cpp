@@ -168,7 +168,7 @@ std::optional<Drive> driveOf(const Mount& mount, const std::vector<Drive>& other
         return std::nullopt;
     }
     if (isNetwork(mount.fileSystem)) {
-        Drive drive{0, mount.point, DriveKind::remote, remoteName(mount, others)};
+        Drive drive{0, mount.point, DriveKind::Remote, remoteName(mount, others)};
         return drive.remoteName.empty() ? std::nullopt : std::optional(drive);
     }
     if (!mount.source.starts_with("/dev/")) {
@@ -176,7 +176,7 @@ std::optional<Drive> driveOf(const Mount& mount, const std::vector<Drive>& other
     }
     const bool isDisc = mount.fileSystem == "iso9660" || mount.source.starts_with("/dev/sr");
     if (isDisc || isMediaFolder(mount.point) || isRemovable(mount.source)) {
-        return Drive{0, mount.point, isDisc ? DriveKind::optical : DriveKind::removable, {}};
+        return Drive{0, mount.point, isDisc ? DriveKind::Optical : DriveKind::Removable, {}};
     }
     return std::nullopt;
 }
@@ -202,14 +202,14 @@ bool isShare(std::string_view name) {
 
 bool setKind(Drive& drive, std::string_view kind) {
     if (isShare(kind)) {
-        drive.kind = DriveKind::remote;
+        drive.kind = DriveKind::Remote;
         drive.remoteName = kind;
         return true;
     }
     if (kind == "removable") {
-        drive.kind = DriveKind::removable;
+        drive.kind = DriveKind::Removable;
     } else if (kind == "cdrom") {
-        drive.kind = DriveKind::optical;
+        drive.kind = DriveKind::Optical;
     } else {
         return kind.empty() || kind == "fixed";
     }
@@ -236,11 +236,11 @@ bool isBelow(std::string_view path, std::string_view folder) {
 
 DriveTable DriveTable::fromMounts(std::string_view mountInfo, const RemovableTest& isRemovable) {
     DriveTable table;
-    table.m_drives.push_back({'C', "/", DriveKind::fixed, {}});
+    table.m_drives.push_back({'C', "/", DriveKind::Fixed, {}});
     char letter = 'D';
     for (const auto& [point, mount] : parseMounts(mountInfo)) {
         std::optional<Drive> drive = driveOf(mount, table.m_drives, isRemovable);
-        if (!drive || (!isLetter(letter) && drive->kind != DriveKind::remote)) {
+        if (!drive || (!isLetter(letter) && drive->kind != DriveKind::Remote)) {
             continue;
         }
         drive->letter = isLetter(letter) ? letter++ : '\0';

@@ -175,13 +175,13 @@ __attribute__((constructor)) void installResolver() {
 
 UINT typeOf(DriveKind kind) {
     switch (kind) {
-    case DriveKind::removable:
+    case DriveKind::Removable:
         return DRIVE_REMOVABLE;
-    case DriveKind::optical:
+    case DriveKind::Optical:
         return DRIVE_CDROM;
-    case DriveKind::remote:
+    case DriveKind::Remote:
         return DRIVE_REMOTE;
-    case DriveKind::fixed:
+    case DriveKind::Fixed:
         break;
     }
     return DRIVE_FIXED;

@@ -32,7 +32,7 @@ DWORD copyOut(const std::string& text, DWORD size, LPSTR buffer) {
     return static_cast<DWORD>(text.size());
 }
 
-std::optional<std::string> pathOf(LPCSTR name, PathUse use = PathUse::existing) {
+std::optional<std::string> pathOf(LPCSTR name, PathUse use = PathUse::Existing) {
     auto path = tvx::systemPath(name ? name : "", use);
     if (!path) {
         SetLastError(ERROR_PATH_NOT_FOUND);
@@ -166,7 +166,7 @@ HANDLE CreateFileA(LPCSTR name, DWORD access, DWORD share, const SECURITY_ATTRIB
         return INVALID_HANDLE_VALUE;
     }
     const bool isExisting = disposition == OPEN_EXISTING || disposition == TRUNCATE_EXISTING;
-    const auto path = pathOf(name, isExisting ? PathUse::existing : PathUse::creating);
+    const auto path = pathOf(name, isExisting ? PathUse::Existing : PathUse::Creating);
     if (!path) {
         return INVALID_HANDLE_VALUE;
     }
@@ -174,7 +174,7 @@ HANDLE CreateFileA(LPCSTR name, DWORD access, DWORD share, const SECURITY_ATTRIB
     if (!file || !prepare(file.number(), share, disposition)) {
         return failed();
     }
-    return tvx::win::makeHandle(std::make_shared<tvx::win::KernelObject>(std::move(file)), tvx::win::Inheritance::none);
+    return tvx::win::makeHandle(std::make_shared<tvx::win::KernelObject>(std::move(file)), tvx::win::Inheritance::None);
 }
 
 BOOL DeleteFileA(LPCSTR name) {
@@ -215,9 +215,9 @@ DWORD GetFullPathNameA(LPCSTR name, DWORD size, LPSTR buffer, LPSTR* filePart) {
 tvx::FileKind tvx::fileKind(LPCSTR name) {
     const auto location = follow(name);
     if (!location) {
-        return FileKind::none;
+        return FileKind::None;
     }
-    return S_ISDIR(location->state.st_mode) ? FileKind::folder : FileKind::file;
+    return S_ISDIR(location->state.st_mode) ? FileKind::Folder : FileKind::File;
 }
 
 std::string tvx::fullName(std::string_view name) {

@@ -101,10 +101,10 @@ inline DWORD GetFullPathName(LPCSTR name, DWORD size, LPSTR buffer, LPSTR* fileP
 namespace tvx {
 
 /// What there is under a name.
-enum class FileKind { none, file, folder };
+enum class FileKind { None, File, Folder };
 
 /// Tells what there is under a name, links followed, in half the time that GetFileAttributesA takes: whether it may be
-/// written is not asked. FileKind::none, with the last error, when that cannot be told.
+/// written is not asked. FileKind::None, with the last error, when that cannot be told.
 [[nodiscard]] TVX_PLATFORM_API FileKind fileKind(LPCSTR name);
 
 /// What GetFullPathNameA gives. A name that cannot have the framework's form, because it lies on no drive or holds

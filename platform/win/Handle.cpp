@@ -18,7 +18,7 @@ namespace {
 
 struct Entry {
     std::shared_ptr<KernelObject> object;
-    Inheritance inheritance = Inheritance::none;
+    Inheritance inheritance = Inheritance::None;
 };
 
 /// The handles of the process. Numbers are never used twice, so that a stale one is always noticed.
@@ -119,7 +119,7 @@ std::shared_ptr<KernelObject> objectOf(HANDLE handle) {
 }
 
 bool isInheritable(HANDLE handle) {
-    return Handles::instance().find(handle).inheritance == Inheritance::inheritable;
+    return Handles::instance().find(handle).inheritance == Inheritance::Inheritable;
 }
 
 } // namespace tvx::win
@@ -147,7 +147,7 @@ BOOL DuplicateHandle(HANDLE sourceProcess, HANDLE source, HANDLE targetProcess, 
     if (options & DUPLICATE_CLOSE_SOURCE) {
         CloseHandle(source);
     }
-    *target = makeHandle(std::move(object), inherit ? Inheritance::inheritable : Inheritance::none);
+    *target = makeHandle(std::move(object), inherit ? Inheritance::Inheritable : Inheritance::None);
     return TRUE;
 }
 

@@ -40,7 +40,7 @@ BOOL CreatePipe(HANDLE* readEnd, HANDLE* writeEnd, const SECURITY_ATTRIBUTES* at
     // The system's own size does where it allows no more.
     ::fcntl(ends[0], F_SETPIPE_SZ, capacity);
     const Inheritance inheritance =
-        attributes && attributes->bInheritHandle ? Inheritance::inheritable : Inheritance::none;
+        attributes && attributes->bInheritHandle ? Inheritance::Inheritable : Inheritance::None;
     *readEnd = makeHandle(std::make_shared<PipeObject>(Descriptor(ends[0])), inheritance);
     *writeEnd = makeHandle(std::make_shared<PipeObject>(Descriptor(ends[1])), inheritance);
     return TRUE;

@@ -83,12 +83,12 @@ private:
 
 StartShow showState(const STARTUPINFOA* startup) {
     const bool hidden = startup && (startup->dwFlags & STARTF_USESHOWWINDOW) && startup->wShowWindow == 0;
-    return hidden ? StartShow::hidden : StartShow::normal;
+    return hidden ? StartShow::Hidden : StartShow::Normal;
 }
 
 DWORD errorOf(const SpawnResult& result) {
     const bool missing = result.error == ENOENT || result.error == ENOTDIR;
-    if (result.failedStep == SpawnStep::directory && missing) {
+    if (result.failedStep == SpawnStep::Directory && missing) {
         return ERROR_DIRECTORY;
     }
     return tvx::errorFromErrno(result.error);
@@ -109,9 +109,9 @@ SpawnResult start(const Program& program, const std::optional<std::string>& dire
 }
 
 void hold(SpawnResult started, PROCESS_INFORMATION& information) {
-    const auto child = std::make_shared<ProcessObject>(std::move(started.process), Kinship::child);
-    information.hProcess = makeHandle(child, Inheritance::none);
-    information.hThread = makeHandle(child, Inheritance::none);
+    const auto child = std::make_shared<ProcessObject>(std::move(started.process), Kinship::Child);
+    information.hProcess = makeHandle(child, Inheritance::None);
+    information.hThread = makeHandle(child, Inheritance::None);
     information.dwProcessId = static_cast<DWORD>(started.id);
     information.dwThreadId = information.dwProcessId;
 }
@@ -147,7 +147,7 @@ BOOL CreateProcessA(LPCSTR application, LPSTR commandLine, const SECURITY_ATTRIB
 
 void GetStartupInfoA(STARTUPINFOA* startup) {
     *startup = {};
-    if (askedStartShow() == StartShow::hidden) {
+    if (askedStartShow() == StartShow::Hidden) {
         startup->dwFlags = STARTF_USESHOWWINDOW;
     }
 }
@@ -178,7 +178,7 @@ HANDLE OpenProcess(DWORD access, BOOL /*inherit*/, DWORD processId) {
         SetLastError(errno == ENOENT ? ERROR_INVALID_PARAMETER : tvx::errorFromErrno(errno));
         return nullptr;
     }
-    return makeHandle(std::make_shared<ProcessObject>(std::move(process), Kinship::stranger), Inheritance::none);
+    return makeHandle(std::make_shared<ProcessObject>(std::move(process), Kinship::Stranger), Inheritance::None);
 }
 
 BOOL GetExitCodeProcess(HANDLE process, DWORD* code) {

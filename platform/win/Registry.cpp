@@ -16,7 +16,7 @@ using namespace tvx::registry;
 namespace {
 
 struct OpenKey {
-    Hive hive = Hive::user;
+    Hive hive = Hive::User;
     KeyPath path;
     REGSAM access = KEY_ALL_ACCESS;
     bool isClass = false; ///< looked up in the machine's settings where the user has none
@@ -62,9 +62,9 @@ public:
 private:
     HandleTable() {
         m_keys[HKEY_CLASSES_ROOT] =
-            std::make_shared<OpenKey>(OpenKey{Hive::user, pathOf("Software\\Classes"), KEY_ALL_ACCESS, true, {}, {}});
+            std::make_shared<OpenKey>(OpenKey{Hive::User, pathOf("Software\\Classes"), KEY_ALL_ACCESS, true, {}, {}});
         m_keys[HKEY_CURRENT_USER] = std::make_shared<OpenKey>();
-        m_keys[HKEY_LOCAL_MACHINE] = std::make_shared<OpenKey>(OpenKey{Hive::machine, {}, KEY_READ, false, {}, {}});
+        m_keys[HKEY_LOCAL_MACHINE] = std::make_shared<OpenKey>(OpenKey{Hive::Machine, {}, KEY_READ, false, {}, {}});
     }
 
     std::mutex m_mutex;
@@ -118,14 +118,14 @@ DWORD below(HKEY handle, LPCSTR subKey, REGSAM access, OpenKey& result) {
 
 LSTATUS findKey(OpenKey& key) {
     LSTATUS result = withStore(key.hive, [&](Store& store) { return store.findKey(key.path); });
-    if (result == ERROR_FILE_NOT_FOUND && key.isClass && key.hive == Hive::user) {
-        result = withStore(Hive::machine, [&](Store& store) { return store.findKey(key.path); });
+    if (result == ERROR_FILE_NOT_FOUND && key.isClass && key.hive == Hive::User) {
+        result = withStore(Hive::Machine, [&](Store& store) { return store.findKey(key.path); });
         if (result == ERROR_SUCCESS) {
-            key.hive = Hive::machine;
+            key.hive = Hive::Machine;
         }
     }
     const bool asksToWrite = (key.access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY)) != 0;
-    return result == ERROR_SUCCESS && key.hive == Hive::machine && asksToWrite ? ERROR_ACCESS_DENIED : result;
+    return result == ERROR_SUCCESS && key.hive == Hive::Machine && asksToWrite ? ERROR_ACCESS_DENIED : result;
 }
 
 /// Hands a value's type and bytes to a caller by the rules of RegQueryValueExA.
@@ -272,9 +272,9 @@ LSTATUS RegEnumValueA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWO
 namespace tvx {
 
 LSTATUS RegistryTransaction::begin() {
-    Store& store = Store::of(Hive::user);
+    Store& store = Store::of(Hive::User);
     store.mutex.lock();
-    const LSTATUS result = withStore(Hive::user, [](Store& user) { return user.begin(); });
+    const LSTATUS result = withStore(Hive::User, [](Store& user) { return user.begin(); });
     m_isOpen = result == ERROR_SUCCESS;
     if (!m_isOpen) {
         store.mutex.unlock();
@@ -287,8 +287,8 @@ LSTATUS RegistryTransaction::commit() {
         return ERROR_INVALID_FUNCTION;
     }
     m_isOpen = false;
-    const LSTATUS result = withStore(Hive::user, [](Store& user) { return user.commit(); });
-    Store::of(Hive::user).mutex.unlock();
+    const LSTATUS result = withStore(Hive::User, [](Store& user) { return user.commit(); });
+    Store::of(Hive::User).mutex.unlock();
     return result;
 }
 
@@ -296,7 +296,7 @@ RegistryTransaction::~RegistryTransaction() {
     if (!m_isOpen) {
         return;
     }
-    Store& store = Store::of(Hive::user);
+    Store& store = Store::of(Hive::User);
     store.rollback();
     store.mutex.unlock();
 }

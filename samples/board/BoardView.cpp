@@ -23,7 +23,7 @@ std::array<Point, 4> cornersOf(const Shape& shape) {
 }
 
 bool hasHandle(const Shape& shape, std::size_t handle) {
-    return shape.kind != ShapeKind::line || handle % 2 == 0;
+    return shape.kind != ShapeKind::Line || handle % 2 == 0;
 }
 
 void moveHandle(Shape& shape, int handle, Point point) {
@@ -185,7 +185,7 @@ int CBoardView::HandleAt(Point point) const {
 
 void CBoardView::OnLButtonDown(UINT, CPoint point) {
     const Point place = ToDrawing(point);
-    if (m_tool == Tool::select) {
+    if (m_tool == Tool::Select) {
         StartSelecting(place);
     } else {
         StartDrawing(Snapped(place));
@@ -194,12 +194,12 @@ void CBoardView::OnLButtonDown(UINT, CPoint point) {
 
 void CBoardView::StartSelecting(Point point) {
     if (const int handle = HandleAt(point); handle >= 0) {
-        StartDrag(Drag::resize, handle, point);
+        StartDrag(Drag::Resize, handle, point);
         return;
     }
     Select(GetDocument()->GetDrawing().shapeAt(point));
     if (m_selected >= 0) {
-        StartDrag(Drag::move, -1, Snapped(point));
+        StartDrag(Drag::Move, -1, Snapped(point));
     }
 }
 
@@ -209,9 +209,9 @@ void CBoardView::StartDrawing(Point point) {
     shape.kind = static_cast<ShapeKind>(static_cast<int>(m_tool) - 1);
     shape.from = shape.to = point;
     shape.color = m_color;
-    shape.fill = shape.kind == ShapeKind::line ? noColor : m_fill;
-    shape.width = shape.kind == ShapeKind::text ? 1 : 2;
-    StartDrag(Drag::resize, 2, point);
+    shape.fill = shape.kind == ShapeKind::Line ? noColor : m_fill;
+    shape.width = shape.kind == ShapeKind::Text ? 1 : 2;
+    StartDrag(Drag::Resize, 2, point);
     m_draft = std::move(shape);
     m_draftIsNew = true;
 }
@@ -229,11 +229,11 @@ void CBoardView::StartDrag(Drag drag, int handle, Point point) {
 
 void CBoardView::OnMouseMove(UINT, CPoint point) {
     m_pointer = ToDrawing(point);
-    if (m_drag == Drag::none || !m_draft) {
+    if (m_drag == Drag::None || !m_draft) {
         return;
     }
     const Point place = Snapped(m_pointer);
-    if (m_drag == Drag::move) {
+    if (m_drag == Drag::Move) {
         m_draft->moveBy(place.x - m_last.x, place.y - m_last.y);
     } else if (!(place == m_last)) {
         moveHandle(*m_draft, m_handle, place);
@@ -243,20 +243,20 @@ void CBoardView::OnMouseMove(UINT, CPoint point) {
 }
 
 void CBoardView::OnLButtonUp(UINT, CPoint) {
-    if (m_drag != Drag::none) {
+    if (m_drag != Drag::None) {
         EndDrag(true);
     }
 }
 
 // The capture also goes when another window or a message box comes up: the drag is given up then.
 void CBoardView::OnCaptureChanged(CWnd*) {
-    if (m_drag != Drag::none) {
+    if (m_drag != Drag::None) {
         EndDrag(false);
     }
 }
 
 void CBoardView::EndDrag(bool keep) {
-    m_drag = Drag::none;
+    m_drag = Drag::None;
     if (GetCapture() == this) {
         ReleaseCapture();
     }
@@ -273,11 +273,11 @@ void CBoardView::KeepDraft() {
         ReplaceSelected(std::move(shape));
         return;
     }
-    m_tool = Tool::select;
+    m_tool = Tool::Select;
     if (isTiny(shape)) {
         return;
     }
-    if (shape.kind == ShapeKind::text) {
+    if (shape.kind == ShapeKind::Text) {
         CTextDialog dialog("", this);
         if (dialog.DoModal() != IDOK || dialog.GetText().IsEmpty()) {
             return;
@@ -298,7 +298,7 @@ void CBoardView::ReplaceSelected(Shape shape) {
 
 void CBoardView::OnLButtonDblClk(UINT flags, CPoint point) {
     OnLButtonDown(flags, point);
-    if (m_tool == Tool::select && Selected() && Selected()->kind == ShapeKind::text) {
+    if (m_tool == Tool::Select && Selected() && Selected()->kind == ShapeKind::Text) {
         EndDrag(false);
         OnEditText();
     }
@@ -320,7 +320,7 @@ void CBoardView::OnContextMenu(CWnd*, CPoint point) {
 }
 
 BOOL CBoardView::OnSetCursor(CWnd* window, UINT hitTest, UINT message) {
-    if (hitTest != HTCLIENT || m_tool == Tool::select) {
+    if (hitTest != HTCLIENT || m_tool == Tool::Select) {
         return CScrollView::OnSetCursor(window, hitTest, message);
     }
     ::SetCursor(theApp.LoadStandardCursor(IDC_CROSS));
@@ -329,7 +329,7 @@ BOOL CBoardView::OnSetCursor(CWnd* window, UINT hitTest, UINT message) {
 
 void CBoardView::OnKeyDown(UINT key, UINT repeat, UINT flags) {
     if (key == VK_ESCAPE) {
-        m_tool = Tool::select;
+        m_tool = Tool::Select;
         EndDrag(false);
         Select(-1);
         return;
@@ -373,7 +373,7 @@ void CBoardView::OnUpdateColor(CCmdUI* item) {
 
 void CBoardView::OnFill(UINT id) {
     m_fill = fillColors[id - ID_FILL_FIRST];
-    if (Selected() && Selected()->kind != ShapeKind::line) {
+    if (Selected() && Selected()->kind != ShapeKind::Line) {
         Shape shape = *Selected();
         shape.fill = m_fill;
         ReplaceSelected(std::move(shape));
@@ -424,7 +424,7 @@ void CBoardView::OnUpdateSelected(CCmdUI* item) {
 }
 
 void CBoardView::OnUpdateEditText(CCmdUI* item) {
-    item->Enable(Selected() && Selected()->kind == ShapeKind::text);
+    item->Enable(Selected() && Selected()->kind == ShapeKind::Text);
 }
 
 void CBoardView::OnUpdatePosition(CCmdUI* item) {

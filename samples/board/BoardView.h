@@ -9,7 +9,7 @@
 namespace board {
 
 /// What the mouse does, in the order of the commands from ID_TOOL_SELECT.
-enum class Tool { select, rectangle, ellipse, line, text };
+enum class Tool { Select, Rectangle, Ellipse, Line, Text };
 
 } // namespace board
 
@@ -52,7 +52,7 @@ public:
 
 private:
     /// What a drag does with the draft: moves it, or moves one of its handles.
-    enum class Drag { none, move, resize };
+    enum class Drag { None, Move, Resize };
 
     const board::Shape* Selected() const;
     void Select(int index);
@@ -73,13 +73,13 @@ private:
     void DrawGrid(CDC& dc) const;
     void DrawHandles(CDC& dc, const board::Shape& shape) const;
 
-    board::Tool m_tool = board::Tool::select;
+    board::Tool m_tool = board::Tool::Select;
     board::Color m_color = 0;
     board::Color m_fill = board::noColor;
     int m_selected = -1;
     board::Point m_pointer; ///< Where the mouse is, for the status bar.
 
-    Drag m_drag = Drag::none;
+    Drag m_drag = Drag::None;
     int m_handle = -1;
     board::Point m_last;
     std::optional<board::Shape> m_draft; ///< The shape being drawn, moved or resized.

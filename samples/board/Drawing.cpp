@@ -36,9 +36,9 @@ int clampMove(int distance, int first, int second) {
 
 bool Shape::contains(Point point) const {
     switch (kind) {
-    case ShapeKind::line:
+    case ShapeKind::Line:
         return distanceToLine(point, from, to) <= reach + width / 2.0;
-    case ShapeKind::ellipse:
+    case ShapeKind::Ellipse:
         return insideEllipse(point, from, to);
     default:
         return point.x >= std::min(from.x, to.x) && point.x <= std::max(from.x, to.x) &&

@@ -10,7 +10,7 @@
 
 namespace board {
 
-enum class ShapeKind { rectangle, ellipse, line, text };
+enum class ShapeKind { Rectangle, Ellipse, Line, Text };
 
 /// 0xRRGGBB, or noColor for a shape that is not filled.
 using Color = std::uint32_t;
@@ -30,7 +30,7 @@ struct Point {
 
 /// One shape of a drawing. Two points carry it: the ends of a line, opposite corners of the box of all others.
 struct Shape {
-    ShapeKind kind = ShapeKind::rectangle;
+    ShapeKind kind = ShapeKind::Rectangle;
     Point from;
     Point to;
     Color color = 0;         ///< Of the outline, or of the text.
@@ -63,18 +63,18 @@ struct Drawing {
 
 /// What can be wrong with the text of a drawing, in the order of the sentences for the user, IDS_FAULT_FIRST and on.
 enum class Fault {
-    noDrawing,
-    unknownVersion, ///< the version
-    unknownShape,   ///< the word in its place
-    fewCoordinates,
-    noNumber, ///< of what, the word in its place, the least and the greatest number
-    noColor,  ///< the word in its place
-    noText,
-    openText,
-    noBlankAfterText,
-    unknownEscape,
-    unknownAttribute, ///< the shape, the attribute
-    zeroByte,
+    NoDrawing,
+    UnknownVersion, ///< the version
+    UnknownShape,   ///< the word in its place
+    FewCoordinates,
+    NoNumber, ///< of what, the word in its place, the least and the greatest number
+    NoColor,  ///< the word in its place
+    NoText,
+    OpenText,
+    NoBlankAfterText,
+    UnknownEscape,
+    UnknownAttribute, ///< the shape, the attribute
+    ZeroByte,
 };
 
 /// What reading gives: a drawing, or what is wrong and where.

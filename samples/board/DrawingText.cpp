@@ -18,10 +18,10 @@ struct KindName {
     ShapeKind kind;
     std::string_view name;
 };
-constexpr std::array<KindName, 4> kindNames{{{ShapeKind::rectangle, "rectangle"},
-                                             {ShapeKind::ellipse, "ellipse"},
-                                             {ShapeKind::line, "line"},
-                                             {ShapeKind::text, "text"}}};
+constexpr std::array<KindName, 4> kindNames{{{ShapeKind::Rectangle, "rectangle"},
+                                             {ShapeKind::Ellipse, "ellipse"},
+                                             {ShapeKind::Line, "line"},
+                                             {ShapeKind::Text, "text"}}};
 
 std::string_view nameOf(ShapeKind kind) {
     for (const KindName& entry : kindNames) {
@@ -71,10 +71,10 @@ public:
             text += m_rest[at] == '\\' ? escaped(++at) : m_rest[at];
         }
         if (at >= m_rest.size()) {
-            throw Damage{Fault::openText};
+            throw Damage{Fault::OpenText};
         }
         if (at + 1 < m_rest.size() && !isBlank(m_rest[at + 1])) {
-            throw Damage{Fault::noBlankAfterText};
+            throw Damage{Fault::NoBlankAfterText};
         }
         take(at + 1);
         return text;
@@ -92,7 +92,7 @@ private:
         case '\\':
             return c;
         default:
-            throw Damage{Fault::unknownEscape};
+            throw Damage{Fault::UnknownEscape};
         }
     }
 
@@ -123,7 +123,7 @@ std::optional<Number> parse(std::string_view text, int base) {
 int parseNumber(std::string_view what, std::string_view text, int least, int most) {
     const auto value = parse<int>(text, 10);
     if (!value || *value < least || *value > most) {
-        throw Damage{Fault::noNumber,
+        throw Damage{Fault::NoNumber,
                      {std::string(what), std::string(text), std::to_string(least), std::to_string(most)}};
     }
     return *value;
@@ -133,14 +133,14 @@ Color parseColor(std::string_view text) {
     const bool shaped = text.size() == 7 && text.front() == '#';
     const auto value = shaped ? parse<Color>(text.substr(1), 16) : std::nullopt;
     if (!value) {
-        throw Damage{Fault::noColor, {std::string(text)}};
+        throw Damage{Fault::NoColor, {std::string(text)}};
     }
     return *value;
 }
 
 int parseCoordinate(LineReader& line) {
     if (line.atEnd()) {
-        throw Damage{Fault::fewCoordinates};
+        throw Damage{Fault::FewCoordinates};
     }
     return parseNumber("x, y", line.word(), -maxCoordinate, maxCoordinate);
 }
@@ -151,14 +151,14 @@ void parseAttribute(Shape& shape, std::string_view word) {
     const std::string_view value = sign == std::string_view::npos ? std::string_view() : word.substr(sign + 1);
     if (name == "color") {
         shape.color = parseColor(value);
-    } else if (name == "fill" && shape.kind != ShapeKind::line) {
+    } else if (name == "fill" && shape.kind != ShapeKind::Line) {
         shape.fill = parseColor(value);
-    } else if (name == "width" && shape.kind != ShapeKind::text) {
+    } else if (name == "width" && shape.kind != ShapeKind::Text) {
         shape.width = parseNumber("width", value, 1, 20);
-    } else if (name == "size" && shape.kind == ShapeKind::text) {
+    } else if (name == "size" && shape.kind == ShapeKind::Text) {
         shape.size = parseNumber("size", value, minTextSize, maxTextSize);
     } else {
-        throw Damage{Fault::unknownAttribute, {std::string(nameOf(shape.kind)), std::string(name)}};
+        throw Damage{Fault::UnknownAttribute, {std::string(nameOf(shape.kind)), std::string(name)}};
     }
 }
 
@@ -168,7 +168,7 @@ ShapeKind parseKind(std::string_view word) {
             return entry.kind;
         }
     }
-    throw Damage{Fault::unknownShape, {std::string(word)}};
+    throw Damage{Fault::UnknownShape, {std::string(word)}};
 }
 
 Shape parseShape(std::string_view text) {
@@ -178,9 +178,9 @@ Shape parseShape(std::string_view text) {
     for (int* coordinate : {&shape.from.x, &shape.from.y, &shape.to.x, &shape.to.y}) {
         *coordinate = parseCoordinate(line);
     }
-    if (shape.kind == ShapeKind::text) {
+    if (shape.kind == ShapeKind::Text) {
         if (!line.atQuote()) {
-            throw Damage{Fault::noText};
+            throw Damage{Fault::NoText};
         }
         shape.text = line.quotedText();
     }
@@ -193,11 +193,11 @@ Shape parseShape(std::string_view text) {
 void checkHeader(std::string_view line) {
     LineReader words(line);
     if (words.atEnd() || words.word() != "board") {
-        throw Damage{Fault::noDrawing};
+        throw Damage{Fault::NoDrawing};
     }
     const std::string_view version = words.atEnd() ? std::string_view() : words.word();
     if (version != "1" || !words.atEnd()) {
-        throw Damage{Fault::unknownVersion, {std::string(version)}};
+        throw Damage{Fault::UnknownVersion, {std::string(version)}};
     }
 }
 
@@ -220,7 +220,7 @@ std::string_view takeLine(std::string_view& text) {
 
 void readLine(Drawing& drawing, std::string_view line) {
     if (line.find('\0') != std::string_view::npos) {
-        throw Damage{Fault::zeroByte};
+        throw Damage{Fault::ZeroByte};
     }
     if (isShape(line)) {
         Shape shape = parseShape(line);
@@ -265,14 +265,14 @@ void appendShape(std::string& text, const Shape& shape) {
     for (const int coordinate : {shape.from.x, shape.from.y, shape.to.x, shape.to.y}) {
         text.append(" ").append(std::to_string(coordinate));
     }
-    if (shape.kind == ShapeKind::text) {
+    if (shape.kind == ShapeKind::Text) {
         appendQuoted(text, shape.text);
     }
     appendColor(text, "color", shape.color);
     if (shape.fill != noColor) {
         appendColor(text, "fill", shape.fill);
     }
-    if (shape.kind == ShapeKind::text) {
+    if (shape.kind == ShapeKind::Text) {
         text.append(" size=").append(std::to_string(shape.size));
     } else {
         text.append(" width=").append(std::to_string(shape.width));

@@ -30,10 +30,10 @@ void drawText(CDC& dc, const Shape& shape) {
 }
 
 void drawOutline(CDC& dc, const Shape& shape) {
-    if (shape.kind == ShapeKind::line) {
+    if (shape.kind == ShapeKind::Line) {
         dc.MoveTo(shape.from.x, shape.from.y);
         dc.LineTo(shape.to.x, shape.to.y);
-    } else if (shape.kind == ShapeKind::ellipse) {
+    } else if (shape.kind == ShapeKind::Ellipse) {
         dc.Ellipse(boxOf(shape));
     } else {
         dc.Rectangle(boxOf(shape));
@@ -43,7 +43,7 @@ void drawOutline(CDC& dc, const Shape& shape) {
 } // namespace
 
 void DrawShape(CDC& dc, const Shape& shape) {
-    if (shape.kind == ShapeKind::text) {
+    if (shape.kind == ShapeKind::Text) {
         drawText(dc, shape);
         return;
     }

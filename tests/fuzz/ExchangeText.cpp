@@ -23,7 +23,7 @@ void checkRoundTrip(const Change& change) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     try {
         for (const Change& change : readExchangeText({reinterpret_cast<const char*>(data), size})) {
-            if (change.kind == Change::Kind::setValue) {
+            if (change.kind == Change::Kind::SetValue) {
                 checkRoundTrip(change);
             }
         }

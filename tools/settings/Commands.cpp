@@ -188,7 +188,7 @@ void list(std::vector<std::string> given, Streams& streams) {
         streams.out << writeTree(name);
         return;
     }
-    const Key key(name, Key::Way::read);
+    const Key key(name, Key::Way::Read);
     for (const std::string& subKey : key.subKeys()) {
         streams.out << writeKey(below(name, subKey));
     }
@@ -199,13 +199,13 @@ void list(std::vector<std::string> given, Streams& streams) {
 
 void get(std::vector<std::string> given, Streams& streams) {
     const Words words(std::move(given), 2, 2, "", "");
-    streams.out << shown(Key(keyOf(words[0]), Key::Way::read).setting(nameOf(words[1]))) << "\n";
+    streams.out << shown(Key(keyOf(words[0]), Key::Way::Read).setting(nameOf(words[1]))) << "\n";
 }
 
 void set(std::vector<std::string> given, Streams&) {
     const Words words(std::move(given), 3, 3, "", "t");
     const Setting setting = typed(words.option("text"), nameOf(words[1]), words[2]);
-    Key(keyOf(words[0]), Key::Way::create).set(setting);
+    Key(keyOf(words[0]), Key::Way::Create).set(setting);
 }
 
 void remove(std::vector<std::string> given, Streams&) {
@@ -215,10 +215,10 @@ void remove(std::vector<std::string> given, Streams&) {
     }
     const KeyName key = keyOf(words[0]);
     if (words.has('r')) {
-        Key(key, Key::Way::write); // tells when there is none
-        apply({{Change::Kind::deleteKey, 0, key, {}}}, "delete");
+        Key(key, Key::Way::Write); // tells when there is none
+        apply({{Change::Kind::DeleteKey, 0, key, {}}}, "delete");
     } else {
-        Key(key, Key::Way::write).remove(nameOf(words[1]));
+        Key(key, Key::Way::Write).remove(nameOf(words[1]));
     }
 }
 
@@ -310,16 +310,16 @@ Outcome run(const std::vector<std::string>& words, std::istream& in, std::ostrea
         if (!answers(words, out)) {
             dispatch(words, streams);
         }
-        return Outcome::done;
+        return Outcome::Done;
     } catch (const Misuse& misuse) {
         errors << "tvxsettings: " << misuse.message << ". See tvxsettings --help.\n";
-        return Outcome::misused;
+        return Outcome::Misused;
     } catch (const FileFault& fault) {
         errors << "tvxsettings: " << fault.message << "\n";
-        return Outcome::badFile;
+        return Outcome::BadFile;
     } catch (const Failure& failure) {
         errors << "tvxsettings: " << failure.what() << "\n";
-        return failure.result() == ERROR_FILE_NOT_FOUND ? Outcome::missing : Outcome::failed;
+        return failure.result() == ERROR_FILE_NOT_FOUND ? Outcome::Missing : Outcome::Failed;
     }
 }
 

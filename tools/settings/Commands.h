@@ -8,11 +8,11 @@ namespace settings {
 
 /// How a run of the tool ended; the program's exit code.
 enum class Outcome {
-    done = 0,
-    missing = 1, ///< there is no such key or value
-    misused = 2, ///< the command line is wrong
-    failed = 3,  ///< the settings could not be read or written
-    badFile = 4, ///< the file cannot be read or written, or holds no exchange text; nothing was changed
+    Done = 0,
+    Missing = 1, ///< there is no such key or value
+    Misused = 2, ///< the command line is wrong
+    Failed = 3,  ///< the settings could not be read or written
+    BadFile = 4, ///< the file cannot be read or written, or holds no exchange text; nothing was changed
 };
 
 /// Does what a command line (without the program's name) asks for.

@@ -89,7 +89,7 @@ private:
         if (isDeleted && key.path.empty()) {
             fail("a root cannot be deleted");
         }
-        m_changes.push_back({isDeleted ? Change::Kind::deleteKey : Change::Kind::makeKey, m_first, key, {}});
+        m_changes.push_back({isDeleted ? Change::Kind::DeleteKey : Change::Kind::MakeKey, m_first, key, {}});
         m_key = isDeleted ? std::nullopt : std::optional(key);
     }
 
@@ -115,7 +115,7 @@ private:
             readData(setting);
         }
         m_changes.push_back(
-            {isDeleted ? Change::Kind::deleteValue : Change::Kind::setValue, m_first, *m_key, std::move(setting)});
+            {isDeleted ? Change::Kind::DeleteValue : Change::Kind::SetValue, m_first, *m_key, std::move(setting)});
     }
 
     void readData(Setting& setting) {

@@ -14,9 +14,9 @@ namespace settings {
 
 /// One thing that a text asks for.
 struct Change {
-    enum class Kind { makeKey, deleteKey, setValue, deleteValue };
+    enum class Kind { MakeKey, DeleteKey, SetValue, DeleteValue };
 
-    Kind kind = Kind::makeKey;
+    Kind kind = Kind::MakeKey;
     int line = 0; ///< where it stands, counted from 1
     KeyName key;
     Setting setting; ///< of the kinds with a value

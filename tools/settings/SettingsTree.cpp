@@ -9,27 +9,27 @@ std::string reason(LSTATUS result) {
 }
 
 LSTATUS openKey(const KeyName& name, Key::Way way, HKEY& key) {
-    if (way == Key::Way::create) {
+    if (way == Key::Way::Create) {
         return RegCreateKeyExA(name.root, name.path.c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE,
                                nullptr, &key, nullptr);
     }
-    const REGSAM access = way == Key::Way::read ? KEY_READ : KEY_READ | KEY_WRITE;
+    const REGSAM access = way == Key::Way::Read ? KEY_READ : KEY_READ | KEY_WRITE;
     return RegOpenKeyExA(name.root, name.path.c_str(), 0, access, &key);
 }
 
 void applyOne(const Change& change) {
     switch (change.kind) {
-    case Change::Kind::makeKey:
-        Key(change.key, Key::Way::create);
+    case Change::Kind::MakeKey:
+        Key(change.key, Key::Way::Create);
         break;
-    case Change::Kind::deleteKey:
+    case Change::Kind::DeleteKey:
         removeTree(change.key);
         break;
-    case Change::Kind::setValue:
-        Key(change.key, Key::Way::create).set(change.setting);
+    case Change::Kind::SetValue:
+        Key(change.key, Key::Way::Create).set(change.setting);
         break;
-    case Change::Kind::deleteValue:
-        Key(change.key, Key::Way::write).remove(change.setting.name);
+    case Change::Kind::DeleteValue:
+        Key(change.key, Key::Way::Write).remove(change.setting.name);
         break;
     }
 }
@@ -37,7 +37,7 @@ void applyOne(const Change& change) {
 /// What a text asks to delete may be gone already.
 bool isAlreadyDone(const Change& change, const Failure& failure) {
     return failure.result() == ERROR_FILE_NOT_FOUND &&
-           (change.kind == Change::Kind::deleteKey || change.kind == Change::Kind::deleteValue);
+           (change.kind == Change::Kind::DeleteKey || change.kind == Change::Kind::DeleteValue);
 }
 
 } // namespace
@@ -130,7 +130,7 @@ KeyName below(const KeyName& key, const std::string& name) {
 }
 
 void removeTree(const KeyName& key) {
-    for (const std::string& name : Key(key, Key::Way::write).subKeys()) {
+    for (const std::string& name : Key(key, Key::Way::Write).subKeys()) {
         removeTree(below(key, name));
     }
     const LSTATUS result = RegDeleteKeyA(key.root, key.path.c_str());
@@ -143,7 +143,7 @@ std::string writeTree(const KeyName& name) {
     if (!canWriteKey(name)) {
         throw Failure(ERROR_INVALID_NAME, writeKeyName(name));
     }
-    const Key key(name, Key::Way::read);
+    const Key key(name, Key::Way::Read);
     const std::vector<std::string> subKeys = key.subKeys();
     const std::vector<Setting> settings = key.settings();
     std::string text;

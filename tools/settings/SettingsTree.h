@@ -28,7 +28,7 @@ private:
 /// An open key. Closes itself.
 class Key {
 public:
-    enum class Way { read, write, create };
+    enum class Way { Read, Write, Create };
 
     /// Throws Failure when it cannot be opened.
     Key(const KeyName& name, Way way);

@@ -13,14 +13,14 @@ namespace {
 /// An open key for as long as it is needed.
 class Key {
 public:
-    enum class Way { open, change, create };
+    enum class Way { Open, Change, Create };
 
     Key(LPCSTR path, Way way) {
-        if (way == Way::create) {
+        if (way == Way::Create) {
             m_result = RegCreateKeyExA(HKEY_CURRENT_USER, path, 0, nullptr, REG_OPTION_NON_VOLATILE,
                                        KEY_READ | KEY_WRITE, nullptr, &m_key, nullptr);
         } else {
-            m_result = RegOpenKeyExA(HKEY_CURRENT_USER, path, 0, way == Way::open ? KEY_READ : KEY_WRITE, &m_key);
+            m_result = RegOpenKeyExA(HKEY_CURRENT_USER, path, 0, way == Way::Open ? KEY_READ : KEY_WRITE, &m_key);
         }
     }
     ~Key() {
@@ -49,7 +49,7 @@ CString sectionPath(const CString& profile, LPCSTR section) {
 
 /// The bytes of an entry of the type asked for.
 std::optional<std::string> readEntry(const CString& path, LPCSTR entry, DWORD wanted) {
-    const Key key(path, Key::Way::open);
+    const Key key(path, Key::Way::Open);
     if (key.result() != ERROR_SUCCESS) {
         return std::nullopt;
     }
@@ -78,7 +78,7 @@ CString CWinApp::profilePath() const {
 }
 
 LSTATUS CWinApp::writeEntry(LPCSTR section, LPCSTR entry, DWORD type, std::string_view bytes) {
-    const Key key(sectionPath(profilePath(), section), Key::Way::create);
+    const Key key(sectionPath(profilePath(), section), Key::Way::Create);
     if (key.result() != ERROR_SUCCESS) {
         return key.result();
     }
@@ -125,7 +125,7 @@ BOOL CWinApp::WriteProfileStringA(LPCSTR section, LPCSTR entry, LPCSTR value) {
         return RegDeleteKeyA(HKEY_CURRENT_USER, sectionPath(profilePath(), section)) == ERROR_SUCCESS;
     }
     if (!value) {
-        const Key key(sectionPath(profilePath(), section), Key::Way::change);
+        const Key key(sectionPath(profilePath(), section), Key::Way::Change);
         return key.result() == ERROR_SUCCESS && RegDeleteValueA(key, entry) == ERROR_SUCCESS;
     }
     return writeEntry(section, entry, REG_SZ, {value, std::strlen(value) + 1}) == ERROR_SUCCESS;

@@ -55,7 +55,7 @@ void CCmdUI::SetRadio(BOOL on) {
     SetCheck(on ? 1 : 0);
     MenuItem* item = itemOf(*this);
     if (item && !m_pSubMenu) {
-        item->mark = MenuItem::Mark::radio;
+        item->mark = MenuItem::Mark::Radio;
         tellMenuChanged(m_pMenu->m_hMenu);
     }
 }

@@ -18,7 +18,7 @@ IMPLEMENT_DYNAMIC(CPaintDC, CDC)
 namespace {
 
 HDC screenContext() {
-    return addContext(std::make_shared<DeviceContext>(DcKind::screen, std::make_unique<ScreenTarget>()));
+    return addContext(std::make_shared<DeviceContext>(DcKind::Screen, std::make_unique<ScreenTarget>()));
 }
 
 /// The client area of a window in its client widget; empty when the window is gone.
@@ -45,14 +45,14 @@ HDC addWindowContext(HWND window, DcKind kind, std::unique_ptr<DrawTarget> targe
 
 HDC windowContext(HWND handle, WindowPart part) {
     const Window* window = Window::from(handle);
-    const bool client = part == WindowPart::client;
+    const bool client = part == WindowPart::Client;
     QWidget* widget = !window ? nullptr : client ? window->clientWidget() : window->widget();
     if (!widget) {
         SetLastError(ERROR_INVALID_WINDOW_HANDLE);
         return nullptr;
     }
     const auto area = [handle, client] { return client ? clientArea(handle) : wholeArea(handle); };
-    return addWindowContext(handle, DcKind::window, std::make_unique<WindowTarget>(*widget, part, area));
+    return addWindowContext(handle, DcKind::Window, std::make_unique<WindowTarget>(*widget, part, area));
 }
 
 /// The handle of a window object; null for no object, which stands for the screen. Raises CResourceException when the
@@ -70,16 +70,16 @@ HWND handleOf(const CWnd* window) {
 } // namespace
 
 HDC GetDC(HWND window) {
-    return window ? windowContext(window, WindowPart::client) : screenContext();
+    return window ? windowContext(window, WindowPart::Client) : screenContext();
 }
 
 HDC GetWindowDC(HWND window) {
-    return window ? windowContext(window, WindowPart::whole) : screenContext();
+    return window ? windowContext(window, WindowPart::Whole) : screenContext();
 }
 
 int ReleaseDC(HWND, HDC dc) {
     const auto context = findContext(dc);
-    const bool releasable = context && (context->kind == DcKind::window || context->kind == DcKind::screen);
+    const bool releasable = context && (context->kind == DcKind::Window || context->kind == DcKind::Screen);
     return releasable && removeContext(dc) ? 1 : 0;
 }
 
@@ -94,7 +94,7 @@ HDC BeginPaint(HWND handle, PAINTSTRUCT* paint) {
         std::make_unique<PaintTarget>(*window->clientWidget(), update.translated(window->clientRect().topLeft()),
                                       [handle] { return clientArea(handle); });
     *paint = {};
-    paint->hdc = addWindowContext(handle, DcKind::paint, std::move(target));
+    paint->hdc = addWindowContext(handle, DcKind::Paint, std::move(target));
     paint->rcPaint = fromQt(update.boundingRect());
     if (!update.isEmpty()) {
         paint->fErase = window->call(WM_ERASEBKGND, reinterpret_cast<WPARAM>(paint->hdc)) == 0;
@@ -104,7 +104,7 @@ HDC BeginPaint(HWND handle, PAINTSTRUCT* paint) {
 
 BOOL EndPaint(HWND, const PAINTSTRUCT* paint) {
     const auto context = findContext(paint ? paint->hdc : nullptr);
-    return context && context->kind == DcKind::paint && removeContext(paint->hdc);
+    return context && context->kind == DcKind::Paint && removeContext(paint->hdc);
 }
 
 CClientDC::CClientDC(CWnd* window) : m_hWnd(handleOf(window)) {

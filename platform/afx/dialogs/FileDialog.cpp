@@ -124,7 +124,7 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
     }
     const CString name(record.lpstrFile ? record.lpstrFile : "");
     if (!name.IsEmpty()) {
-        const auto path = tvx::systemPath(name.GetString(), tvx::PathUse::creating).value_or(name.GetString());
+        const auto path = tvx::systemPath(name.GetString(), tvx::PathUse::Creating).value_or(name.GetString());
         const QFileInfo info(QString::fromStdString(path));
         if (info.isAbsolute()) {
             dialog.setDirectory(info.absolutePath());

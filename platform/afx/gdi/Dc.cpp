@@ -69,11 +69,11 @@ HDC CreateCompatibleDC(HDC dc) {
     static const HGDIOBJ onePixel = [] {
         QImage pixel(1, 1, QImage::Format_RGB32);
         pixel.fill(Qt::black);
-        return addGdiObject(BitmapObject{pixel, PixelFormat::monochrome, nullptr}, GdiOwner::stock);
+        return addGdiObject(BitmapObject{pixel, PixelFormat::Monochrome, nullptr}, GdiOwner::Stock);
     }();
     auto target = std::make_unique<MemoryTarget>();
     target->bitmap = findTool<BitmapObject>(onePixel);
-    return addContext(std::make_shared<DeviceContext>(DcKind::memory, std::move(target)));
+    return addContext(std::make_shared<DeviceContext>(DcKind::Memory, std::move(target)));
 }
 
 BOOL DeleteDC(HDC dc) {
@@ -133,7 +133,7 @@ HGDIOBJ selectBitmap(DeviceContext& context, HDC dc, HGDIOBJ handle) {
         return nullptr;
     }
     memory->bitmap->selectedInto = nullptr;
-    if (next.object->owner == GdiOwner::host) {
+    if (next.object->owner == GdiOwner::Host) {
         next->selectedInto = dc;
     }
     return memory->select(next).handle;
@@ -255,11 +255,11 @@ int GetDeviceCaps(HDC handle, int index) {
     case LOGPIXELSY:
         return pixelsPerInch;
     case BITSPIXEL:
-        return dc->target->format() == PixelFormat::monochrome ? 1 : 32;
+        return dc->target->format() == PixelFormat::Monochrome ? 1 : 32;
     case PLANES:
         return 1;
     case NUMCOLORS:
-        return dc->target->format() == PixelFormat::monochrome ? 2 : -1;
+        return dc->target->format() == PixelFormat::Monochrome ? 2 : -1;
     case RASTERCAPS:
         return rasterCapabilities;
     case ASPECTX:

@@ -41,7 +41,7 @@ Tool<BrushObject> brushOf(HBRUSH handle) {
 
 BOOL fillWith(HDC dc, const RECT* rect, HBRUSH handle) {
     const auto brush = brushOf(handle);
-    return rect && brush && fillLogical(dc, *rect, *brush, Rop2::copy);
+    return rect && brush && fillLogical(dc, *rect, *brush, Rop2::Copy);
 }
 
 } // namespace
@@ -67,14 +67,14 @@ void CDC::FrameRect(const RECT* rect, CBrush* brush) {
                           {inside[2], inside[1], rect->right, inside[3]}};
     for (const RECT& side : sides) {
         if (side.left < side.right && side.top < side.bottom) {
-            fillLogical(m_hDC, side, *tool, Rop2::copy);
+            fillLogical(m_hDC, side, *tool, Rop2::Copy);
         }
     }
 }
 
 void CDC::InvertRect(const RECT* rect) {
     if (rect) {
-        fillLogical(m_hDC, *rect, solid(0), Rop2::notDestination);
+        fillLogical(m_hDC, *rect, solid(0), Rop2::NotDestination);
     }
 }
 
@@ -87,7 +87,7 @@ BOOL CDC::FillRgn(CRgn* region, CBrush* brush) {
     }
     Drawing drawing(*dc);
     QImage pattern;
-    const auto ink = dc->brushInk(*tool, Rop2::copy, pattern);
+    const auto ink = dc->brushInk(*tool, Rop2::Copy, pattern);
     if (!drawing || !ink) {
         return TRUE;
     }
@@ -102,7 +102,7 @@ void CDC::FillSolidRect(const RECT* rect, COLORREF color) {
         return;
     }
     SetBkColor(color);
-    fillLogical(m_hDC, *rect, solid(color), Rop2::copy);
+    fillLogical(m_hDC, *rect, solid(color), Rop2::Copy);
 }
 
 void CDC::FillSolidRect(int x, int y, int cx, int cy, COLORREF color) {
@@ -179,16 +179,16 @@ void drawEdgeLine(HDC dc, RECT& rect, EdgeColors colors, UINT flags) {
     const BrushObject dark = solid(GetSysColor(colors.bottomRight));
     RECT inside = rect;
     if (flags & BF_LEFT) {
-        fillLogical(dc, {rect.left, rect.top, ++inside.left, rect.bottom}, light, Rop2::copy);
+        fillLogical(dc, {rect.left, rect.top, ++inside.left, rect.bottom}, light, Rop2::Copy);
     }
     if (flags & BF_TOP) {
-        fillLogical(dc, {rect.left, rect.top, rect.right, ++inside.top}, light, Rop2::copy);
+        fillLogical(dc, {rect.left, rect.top, rect.right, ++inside.top}, light, Rop2::Copy);
     }
     if (flags & BF_RIGHT) {
-        fillLogical(dc, {--inside.right, rect.top, rect.right, rect.bottom}, dark, Rop2::copy);
+        fillLogical(dc, {--inside.right, rect.top, rect.right, rect.bottom}, dark, Rop2::Copy);
     }
     if (flags & BF_BOTTOM) {
-        fillLogical(dc, {rect.left, --inside.bottom, rect.right, rect.bottom}, dark, Rop2::copy);
+        fillLogical(dc, {rect.left, --inside.bottom, rect.right, rect.bottom}, dark, Rop2::Copy);
     }
     rect = inside;
 }
@@ -207,7 +207,7 @@ BOOL CDC::DrawEdge(RECT* rect, UINT edge, UINT flags) {
         drawEdgeLine(m_hDC, inside, innerColors(edge, flags), flags);
     }
     if (flags & BF_MIDDLE) {
-        fillLogical(m_hDC, inside, solid(GetSysColor(flags & BF_MONO ? COLOR_WINDOW : COLOR_BTNFACE)), Rop2::copy);
+        fillLogical(m_hDC, inside, solid(GetSysColor(flags & BF_MONO ? COLOR_WINDOW : COLOR_BTNFACE)), Rop2::Copy);
     }
     if (flags & BF_ADJUST) {
         *rect = inside;
@@ -227,7 +227,7 @@ void CDC::DrawFocusRect(const RECT* rect) {
     // Every second pixel by its place, so that the dots stay where they are when the frame grows.
     std::vector<QPoint> dots = framePixels(dc->state.mapping.toPixels(*rect), drawing.canvas.bounds());
     std::erase_if(dots, [](QPoint point) { return ((point.x() + point.y()) & 1) != 0; });
-    drawing.canvas.plot(dots, {whitePixel, Rop2::xorPen, nullptr, {}});
+    drawing.canvas.plot(dots, {whitePixel, Rop2::XorPen, nullptr, {}});
 }
 
 // Icons

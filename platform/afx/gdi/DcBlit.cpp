@@ -60,7 +60,7 @@ void convertPixels(QImage& image, const DeviceContext& source, const DeviceConte
     if (from == to) {
         return;
     }
-    const bool expands = from == PixelFormat::monochrome;
+    const bool expands = from == PixelFormat::Monochrome;
     const Pixel selected = expands ? whitePixel : pixelOf(source.state.backColor);
     const Pixel yes = expands ? pixelOf(target.state.backColor) : whitePixel;
     const Pixel no = expands ? pixelOf(target.state.textColor) : blackPixel;
@@ -88,7 +88,7 @@ void drawSource(DeviceContext& target, const BlitArea& to, DeviceContext& source
     }
     convertPixels(pixels.image, source, target);
     QImage pattern;
-    const Ink brush = target.brushInk(*target.state.brush, Rop2::copy, pattern).value_or(Ink{});
+    const Ink brush = target.brushInk(*target.state.brush, Rop2::Copy, pattern).value_or(Ink{});
     drawing.canvas.blit(pixels.image, at, rop, brush);
 }
 

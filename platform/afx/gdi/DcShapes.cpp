@@ -138,7 +138,7 @@ void drawRounded(Shape& shape, const QRect& box, QSize corner) {
 void drawLargeRounded(Shape& shape, const QRect& box, QSize corner) {
     const QPolygon polygon = roundedPolygon(box, corner);
     const std::array polygons = {QPolygonF(polygon)};
-    shape.fill(polygonSpans(polygons, FillRule::winding, shape.canvas().bounds()));
+    shape.fill(polygonSpans(polygons, FillRule::Winding, shape.canvas().bounds()));
     Outline(*shape.dc, shape.canvas()).closed(polygon);
 }
 
@@ -200,7 +200,7 @@ BOOL CDC::Ellipse(const RECT* rect) {
 
 namespace {
 
-enum class ArcShape { arc, pie, chord };
+enum class ArcShape { Arc, Pie, Chord };
 
 /// A stretch of an ellipse's outline, found by the directions from its centre to two points.
 class ArcPixels {
@@ -278,15 +278,15 @@ BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, Arc
     const ArcPixels arc(box, shape.mapping().toPixel(pointOf(rays[0])), shape.mapping().toPixel(pointOf(rays[1])),
                         shape.dc->state.arcDirection);
     QPolygon outline = arc.pixels();
-    if (kind == ArcShape::pie) {
+    if (kind == ArcShape::Pie) {
         outline << arc.centre();
     }
-    if (kind != ArcShape::arc) {
-        shape.fill(areaOf(outline, FillRule::winding, shape.canvas().bounds()));
+    if (kind != ArcShape::Arc) {
+        shape.fill(areaOf(outline, FillRule::Winding, shape.canvas().bounds()));
     }
     Outline pen(*shape.dc, shape.canvas());
-    if (kind == ArcShape::arc) {
-        pen.line(outline, Outline::LastPoint::drawn);
+    if (kind == ArcShape::Arc) {
+        pen.line(outline, Outline::LastPoint::Drawn);
     } else {
         pen.closed(outline);
     }
@@ -296,27 +296,27 @@ BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, Arc
 } // namespace
 
 BOOL CDC::Arc(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
-    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::arc);
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::Arc);
 }
 
 BOOL CDC::Arc(const RECT* rect, POINT start, POINT end) {
-    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::arc) : FALSE;
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::Arc) : FALSE;
 }
 
 BOOL CDC::Pie(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
-    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::pie);
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::Pie);
 }
 
 BOOL CDC::Pie(const RECT* rect, POINT start, POINT end) {
-    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::pie) : FALSE;
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::Pie) : FALSE;
 }
 
 BOOL CDC::Chord(int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
-    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::chord);
+    return drawArc(m_hDC, {left, top, right, bottom}, {POINT{startX, startY}, POINT{endX, endY}}, ArcShape::Chord);
 }
 
 BOOL CDC::Chord(const RECT* rect, POINT start, POINT end) {
-    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::chord) : FALSE;
+    return rect ? drawArc(m_hDC, *rect, {start, end}, ArcShape::Chord) : FALSE;
 }
 
 // Polygons
@@ -340,7 +340,7 @@ BOOL CDC::PolyPolygon(const POINT* points, const int* counts, int count) {
         outlines.push_back(devicePoints(shape.mapping(), points, counts[i]));
         areas.emplace_back(outlines.back());
     }
-    const FillRule rule = shape.dc->state.polyFillMode == WINDING ? FillRule::winding : FillRule::alternate;
+    const FillRule rule = shape.dc->state.polyFillMode == WINDING ? FillRule::Winding : FillRule::Alternate;
     shape.fill(polygonSpans(areas, rule, shape.canvas().bounds()));
     Outline pen(*shape.dc, shape.canvas());
     for (const QPolygon& outline : outlines) {

@@ -296,7 +296,7 @@ int CDC::GetClipBox(RECT* rect) const {
     Drawing drawing(*dc);
     // The screen has no pixels to open, but what fits on it is what can be asked about it.
     const QRegion clip =
-        dc->kind == DcKind::screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.canvas.clip;
+        dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.canvas.clip;
     *rect = rectOf(clip.boundingRect());
     DPtoLP(rect);
     return regionKind(clip);

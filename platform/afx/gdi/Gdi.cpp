@@ -296,7 +296,7 @@ BOOL DeleteObject(HGDIOBJ object) {
     if (!found) {
         return FALSE;
     }
-    if (found->owner == GdiOwner::host) {
+    if (found->owner == GdiOwner::Host) {
         gdiObjects().take(number);
     }
     return TRUE;
@@ -320,7 +320,7 @@ int copyRecord(const Record& record, int count, LPVOID buffer) {
 }
 
 BITMAP describe(const BitmapObject& bitmap) {
-    const int bits = bitmap.format == PixelFormat::monochrome ? 1 : 32;
+    const int bits = bitmap.format == PixelFormat::Monochrome ? 1 : 32;
     BITMAP record{};
     record.bmWidth = bitmap.image.width();
     record.bmHeight = bitmap.image.height();

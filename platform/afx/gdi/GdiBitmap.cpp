@@ -14,13 +14,13 @@ namespace {
 
 /// Rows of a bitmap as `GetBitmapBits` gives them: from the top, padded to even numbers of bytes.
 std::size_t rowBytes(const BitmapObject& bitmap) {
-    const std::size_t bits = bitmap.format == PixelFormat::monochrome ? 1 : 32;
+    const std::size_t bits = bitmap.format == PixelFormat::Monochrome ? 1 : 32;
     return (static_cast<std::size_t>(bitmap.image.width()) * bits + 15) / 16 * 2;
 }
 
 void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {
     const auto* pixels = reinterpret_cast<const Pixel*>(bitmap.image.constScanLine(y));
-    if (bitmap.format == PixelFormat::color) {
+    if (bitmap.format == PixelFormat::Color) {
         for (int x = 0; x < bitmap.image.width(); ++x) {
             const Pixel pixel = pixels[x] & ~opaque;
             std::memcpy(bytes + 4 * x, &pixel, sizeof pixel);
@@ -38,7 +38,7 @@ void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {
 void unpackRow(BitmapObject& bitmap, int y, const BYTE* bytes) {
     auto* pixels = reinterpret_cast<Pixel*>(bitmap.image.scanLine(y));
     for (int x = 0; x < bitmap.image.width(); ++x) {
-        if (bitmap.format == PixelFormat::monochrome) {
+        if (bitmap.format == PixelFormat::Monochrome) {
             pixels[x] = (bytes[x / 8] & (0x80 >> (x % 8))) ? whitePixel : blackPixel;
         } else {
             std::memcpy(&pixels[x], bytes + 4 * x, sizeof(Pixel));
@@ -61,7 +61,7 @@ HBITMAP CreateBitmap(int width, int height, UINT planes, UINT bitsPerPixel, LPCV
     if (planes != 1 || (bitsPerPixel != 1 && bitsPerPixel != 32)) {
         return nullptr;
     }
-    const HBITMAP handle = addBitmap(width, height, bitsPerPixel == 1 ? PixelFormat::monochrome : PixelFormat::color);
+    const HBITMAP handle = addBitmap(width, height, bitsPerPixel == 1 ? PixelFormat::Monochrome : PixelFormat::Color);
     const auto bitmap = findTool<BitmapObject>(handle);
     if (bitmap && bits) {
         for (int y = 0; y < height; ++y) {

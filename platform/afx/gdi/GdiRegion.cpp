@@ -83,7 +83,7 @@ BOOL CRgn::CreatePolygonRgn(const POINT* points, int count, int mode) {
         polygon << QPointF(points[i].x, points[i].y);
     }
     const std::array polygons = {polygon};
-    const FillRule rule = mode == WINDING ? FillRule::winding : FillRule::alternate;
+    const FillRule rule = mode == WINDING ? FillRule::Winding : FillRule::Alternate;
     return Attach(
         addRegion(regionOf(polygonSpans(polygons, rule, polygon.boundingRect().toAlignedRect() & screenReach()))));
 }

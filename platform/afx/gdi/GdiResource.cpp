@@ -24,7 +24,7 @@ namespace {
 HBITMAP addPicture(const tvx::Picture& picture) {
     const QImage pixels(reinterpret_cast<const uchar*>(picture.pixels.data()), picture.width, picture.height,
                         picture.width * 4, QImage::Format_RGB32);
-    return addBitmap(pixels, picture.bitsPerPixel == 1 ? PixelFormat::monochrome : PixelFormat::color);
+    return addBitmap(pixels, picture.bitsPerPixel == 1 ? PixelFormat::Monochrome : PixelFormat::Color);
 }
 
 std::size_t paletteBytes(const BITMAPINFOHEADER& header) {
@@ -57,7 +57,7 @@ HBITMAP CreateDIBitmap(HDC dc, const BITMAPINFOHEADER* header, DWORD initialise,
         return nullptr;
     }
     if ((initialise & CBM_INIT) == 0) {
-        return addBitmap(header->biWidth, std::abs(header->biHeight), PixelFormat::color);
+        return addBitmap(header->biWidth, std::abs(header->biHeight), PixelFormat::Color);
     }
     if (!bits || !info || !understood(info->bmiHeader)) {
         return nullptr;

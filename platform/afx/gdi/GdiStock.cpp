@@ -18,16 +18,16 @@ using StockTable = std::array<HGDIOBJ, stockCount>;
 HGDIOBJ stockBrush(UINT style, COLORREF color) {
     BrushObject brush;
     brush.description = {style, color, 0};
-    return addGdiObject(std::move(brush), GdiOwner::stock);
+    return addGdiObject(std::move(brush), GdiOwner::Stock);
 }
 
 HGDIOBJ stockPen(UINT style, COLORREF color) {
-    return addGdiObject(PenObject{{style, {0, 0}, color}}, GdiOwner::stock);
+    return addGdiObject(PenObject{{style, {0, 0}, color}}, GdiOwner::Stock);
 }
 
 HGDIOBJ stockFont(LOGFONT description, BYTE pitchAndFamily) {
     description.lfPitchAndFamily = pitchAndFamily;
-    return addGdiObject(FontObject{description}, GdiOwner::stock);
+    return addGdiObject(FontObject{description}, GdiOwner::Stock);
 }
 
 StockTable makeStock() {
@@ -129,7 +129,7 @@ HBRUSH GetSysColorBrush(int index) {
             BrushObject brush;
             brush.description = {static_cast<UINT>(BS_SOLID), GetSysColor(static_cast<int>(i)), 0};
             brush.systemColor = static_cast<int>(i);
-            table[i] = addGdiObject(std::move(brush), GdiOwner::stock);
+            table[i] = addGdiObject(std::move(brush), GdiOwner::Stock);
         }
         return table;
     }();

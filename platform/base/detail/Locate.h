@@ -19,7 +19,7 @@ struct Location {
 };
 
 /// As systemPath(), with what the look-up learned.
-[[nodiscard]] std::optional<Location> locate(std::string_view name, PathUse use = PathUse::existing);
+[[nodiscard]] std::optional<Location> locate(std::string_view name, PathUse use = PathUse::Existing);
 
 /// What a file is like, in bits of CFile::Attribute.
 /// @param name  whose last part tells whether the file is hidden

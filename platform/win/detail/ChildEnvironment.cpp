@@ -52,7 +52,7 @@ ChildEnvironment::ChildEnvironment(StartShow show) {
             add(name + "=" + value);
         }
     }
-    if (show == StartShow::hidden) {
+    if (show == StartShow::Hidden) {
         add(std::string(startHidden) + "=1");
     }
     m_block.push_back(nullptr);
@@ -64,7 +64,7 @@ void ChildEnvironment::add(std::string variable) {
 }
 
 StartShow askedStartShow() {
-    return std::getenv(startHidden) ? StartShow::hidden : StartShow::normal;
+    return std::getenv(startHidden) ? StartShow::Hidden : StartShow::Normal;
 }
 
 } // namespace tvx::win

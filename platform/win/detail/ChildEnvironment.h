@@ -9,7 +9,7 @@
 namespace tvx::win {
 
 /// How a child is to show its first window.
-enum class StartShow { normal, hidden };
+enum class StartShow { Normal, Hidden };
 
 /// The environment of a child: the process's own, with the user's values where the application's bundle had put its
 /// own for itself (docs/processes.md says how a bundle tells), and the wish to be hidden.

@@ -13,12 +13,12 @@
 
 namespace tvx::win {
 
-enum class DriveKind { fixed, removable, optical, remote };
+enum class DriveKind { Fixed, Removable, Optical, Remote };
 
 struct Drive {
     char letter = 0;    ///< 'A' to 'Z'; 0 for a share for which no letter was left
     std::string folder; ///< in the system's form, without a separator at the end except for "/"
-    DriveKind kind = DriveKind::fixed;
+    DriveKind kind = DriveKind::Fixed;
     std::string remoteName; ///< "\\server\share" of a remote one
 };
 

@@ -57,7 +57,7 @@ protected:
 };
 
 /// Whether a child may be given a handle as a standard handle.
-enum class Inheritance { none, inheritable };
+enum class Inheritance { None, Inheritable };
 
 /// A new handle to the object.
 HANDLE makeHandle(std::shared_ptr<KernelObject> object, Inheritance inheritance);

@@ -56,7 +56,7 @@ ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
     : KernelObject(std::move(process)), m_kinship(kinship) {}
 
 ProcessObject::~ProcessObject() {
-    if (m_kinship == Kinship::child && exitCode() == STILL_ACTIVE && !m_code) {
+    if (m_kinship == Kinship::Child && exitCode() == STILL_ACTIVE && !m_code) {
         ReleasedChildren::instance().add(std::move(m_descriptor));
     }
     ReleasedChildren::instance().collect();
@@ -72,7 +72,7 @@ DWORD ProcessObject::exitCode() {
 
 DWORD ProcessObject::collect() {
     siginfo_t status;
-    if (m_kinship == Kinship::stranger || !collectStatus(descriptor(), status)) {
+    if (m_kinship == Kinship::Stranger || !collectStatus(descriptor(), status)) {
         return signalBase;
     }
     // A child that was faster than the order to end keeps its own code.
@@ -82,7 +82,7 @@ DWORD ProcessObject::collect() {
 
 DWORD ProcessObject::terminate(DWORD code) {
     const std::lock_guard lock(m_mutex);
-    if (m_kinship == Kinship::stranger || m_code || hasEnded(descriptor())) {
+    if (m_kinship == Kinship::Stranger || m_code || hasEnded(descriptor())) {
         return ERROR_ACCESS_DENIED;
     }
     if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0) {

@@ -10,7 +10,7 @@
 namespace tvx::win {
 
 /// Whose child a process is: only children of this process can be ended, collected and asked for their code.
-enum class Kinship { child, stranger };
+enum class Kinship { Child, Stranger };
 
 /// A process, held by the system's reference to it.
 class ProcessObject : public KernelObject {

@@ -6,7 +6,7 @@ namespace tvx::registry {
 
 namespace {
 
-constexpr std::array<const char*, static_cast<std::size_t>(Sql::m_count)> statements = {
+constexpr std::array<const char*, static_cast<std::size_t>(Sql::Count)> statements = {
     // findKey
     "SELECT id FROM key WHERE path = ?1",
     // addKey: parent's path, path, name

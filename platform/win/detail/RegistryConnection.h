@@ -14,22 +14,22 @@ namespace tvx::registry {
 
 /// The statements of the store, prepared when first used.
 enum class Sql {
-    findKey,
-    addKey,
-    deleteKey,
-    deleteValues,
-    hasSubKeys,
-    keyAfter,
-    keyAt,
-    readValue,
-    writeValue,
-    deleteValue,
-    valueAfter,
-    valueAt,
-    begin,
-    commit,
-    rollback,
-    m_count,
+    FindKey,
+    AddKey,
+    DeleteKey,
+    DeleteValues,
+    HasSubKeys,
+    KeyAfter,
+    KeyAt,
+    ReadValue,
+    WriteValue,
+    DeleteValue,
+    ValueAfter,
+    ValueAt,
+    Begin,
+    Commit,
+    Rollback,
+    Count,
 };
 
 /// One use of a prepared statement: arguments are bound in order, and the statement is free again when this ends.
@@ -110,7 +110,7 @@ private:
     sqlite3* m_database = nullptr;
     std::optional<Patience> m_patience; ///< of the wait that is going on
     const volatile std::uint32_t* m_log = nullptr;
-    std::array<sqlite3_stmt*, static_cast<std::size_t>(Sql::m_count)> m_statements{};
+    std::array<sqlite3_stmt*, static_cast<std::size_t>(Sql::Count)> m_statements{};
 };
 
 } // namespace tvx::registry

@@ -115,7 +115,7 @@ std::string makeCopyFolder(const std::string& place) {
 } // namespace
 
 std::string locate(Hive hive) {
-    return hive == Hive::user ? userFile() : machineFile();
+    return hive == Hive::User ? userFile() : machineFile();
 }
 
 std::string resolve(const std::string& name) {
@@ -131,9 +131,9 @@ std::string resolve(const std::string& name) {
 FileKind kindOf(const std::string& file) {
     struct stat status{};
     if (stat(file.c_str(), &status) == 0) {
-        return S_ISREG(status.st_mode) ? FileKind::regular : FileKind::other;
+        return S_ISREG(status.st_mode) ? FileKind::Regular : FileKind::Other;
     }
-    return errno == ENOENT ? FileKind::missing : FileKind::unreachable;
+    return errno == ENOENT ? FileKind::Missing : FileKind::Unreachable;
 }
 
 FileIdentity identityOf(const std::string& file) {

@@ -10,7 +10,7 @@
 namespace tvx::registry {
 
 /// The two files of settings.
-enum class Hive { user, machine };
+enum class Hive { User, Machine };
 
 /// Where the file of a hive is expected. Empty when there is no such place: the machine has no settings, or the user no
 /// home.
@@ -19,7 +19,7 @@ enum class Hive { user, machine };
 [[nodiscard]] std::string resolve(const std::string& name);
 
 /// What stands under a name.
-enum class FileKind { missing, regular, other, unreachable };
+enum class FileKind { Missing, Regular, Other, Unreachable };
 [[nodiscard]] FileKind kindOf(const std::string& file);
 
 /// Which file a name led to at some moment: another one has taken its place when this differs.

@@ -12,18 +12,18 @@ struct Store::Memory {
 
     /// How it can be known that nobody has written.
     enum class Watch {
-        none,    ///< not at all: a file of another machine, which the database is asked each time
-        log,     ///< by the head of the shared log
-        nothing, ///< it cannot happen: the store is a copy
+        None,    ///< not at all: a file of another machine, which the database is asked each time
+        Log,     ///< by the head of the shared log
+        Nothing, ///< it cannot happen: the store is a copy
     };
 
     /// What may be answered from memory. Must be called before the database is asked, so that what is kept is at least
     /// as new as the head it is kept under.
     Replies* current(const Connection& connection) {
-        if (watch == Watch::none) {
+        if (watch == Watch::None) {
             return nullptr;
         }
-        if (const LogHead now = watch == Watch::log ? connection.logHead() : head;
+        if (const LogHead now = watch == Watch::Log ? connection.logHead() : head;
             now != head || replies.size() > most) {
             replies.clear();
             head = now;
@@ -31,7 +31,7 @@ struct Store::Memory {
         return &replies;
     }
 
-    Watch watch = Watch::none;
+    Watch watch = Watch::None;
     LogHead head{};
     Replies replies;
 };

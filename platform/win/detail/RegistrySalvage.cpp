@@ -48,14 +48,14 @@ Salvage read(const std::string& file) {
 
 std::size_t Store::takeOver(const std::string& damaged) {
     const Salvage salvage = read(damaged);
-    if (salvage.values.empty() || ensureOpen(Intent::write) != ERROR_SUCCESS || m_mode != Mode::shared) {
+    if (salvage.values.empty() || ensureOpen(Intent::Write) != ERROR_SUCCESS || m_mode != Mode::Shared) {
         return 0;
     }
     std::size_t saved = 0;
     const DWORD result = together([&] {
         for (const auto& [id, key] : salvage.keys) {
             // Keys above one are older, and have been added with their spelling.
-            (void)m_connection->query(Sql::addKey).bind(parentOf(key.path)).bind(key.path).bind(key.name).step();
+            (void)m_connection->query(Sql::AddKey).bind(parentOf(key.path)).bind(key.path).bind(key.name).step();
             (void)addLevels({key.path, key.path});
         }
         for (const auto& [id, value] : salvage.values) {

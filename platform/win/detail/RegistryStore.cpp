@@ -46,9 +46,9 @@ DWORD Store::run(Intent intent, Operation operation) {
 /// The same with an operation that writes.
 template <typename Operation>
 DWORD Store::change(Operation operation) {
-    const DWORD result = run(Intent::write, [&] { return m_mode == Mode::shared ? operation() : m_writeError; });
+    const DWORD result = run(Intent::Write, [&] { return m_mode == Mode::Shared ? operation() : m_writeError; });
     if (result == ERROR_DISK_FULL || result == ERROR_BUSY || result == ERROR_REGISTRY_IO_FAILED) {
-        tell(Fault::notSaved, "Settings could not be saved in " + m_file + ". " + errorText(result));
+        tell(Fault::NotSaved, "Settings could not be saved in " + m_file + ". " + errorText(result));
     }
     return result;
 }
@@ -58,22 +58,22 @@ DWORD Store::together(const std::function<DWORD()>& operation) {
     if (m_inTransaction) {
         return operation();
     }
-    DWORD result = failed(m_connection->query(Sql::begin).step());
+    DWORD result = failed(m_connection->query(Sql::Begin).step());
     if (result != ERROR_SUCCESS) {
         return result;
     }
     result = operation();
     if (result == ERROR_SUCCESS) {
-        result = failed(m_connection->query(Sql::commit).step());
+        result = failed(m_connection->query(Sql::Commit).step());
     }
     if (result != ERROR_SUCCESS) {
-        (void)m_connection->query(Sql::rollback).step();
+        (void)m_connection->query(Sql::Rollback).step();
     }
     return result;
 }
 
 Store::Replies* Store::replies() {
-    return m_inTransaction || m_mode == Mode::closed ? nullptr : m_memory->current(*m_connection);
+    return m_inTransaction || m_mode == Mode::Closed ? nullptr : m_memory->current(*m_connection);
 }
 
 template <typename Question>
@@ -96,12 +96,12 @@ Store::Reply Store::remembered(std::string_view subject, std::string_view detail
 }
 
 Store::Reply Store::askKey(std::string_view path) {
-    const int step = m_connection->query(Sql::findKey).bind(path).step();
+    const int step = m_connection->query(Sql::FindKey).bind(path).step();
     return {step == SQLITE_DONE ? ERROR_FILE_NOT_FOUND : failed(step), nullptr};
 }
 
 Store::Reply Store::askValue(std::string_view path, std::string_view folded) {
-    Query query = m_connection->query(Sql::readValue);
+    Query query = m_connection->query(Sql::ReadValue);
     const int step = query.bind(path).bind(folded).step();
     if (step == SQLITE_ROW) {
         return {ERROR_SUCCESS,
@@ -124,13 +124,13 @@ DWORD Store::findKey(const KeyPath& key) {
     }
     // No value has a zero in its name, so this cannot be mistaken for one.
     constexpr std::string_view noValue("\0", 1);
-    return run(Intent::read,
+    return run(Intent::Read,
                [&] { return remembered(key.folded, noValue, [&] { return askKey(key.folded); }).result; });
 }
 
 DWORD Store::readValue(const KeyPath& key, std::string_view name, std::shared_ptr<const Value>& value) {
     const std::string folded = text::foldCase(name);
-    return run(Intent::read, [&] {
+    return run(Intent::Read, [&] {
         Reply reply = remembered(key.folded, folded, [&] { return askValue(key.folded, folded); });
         value = std::move(reply.value);
         return reply.result;
@@ -152,7 +152,7 @@ DWORD Store::createKey(const KeyPath& key, bool& created) {
 
 DWORD Store::addLevels(const KeyPath& key) {
     for (const KeyPath& level : levelsOf(key)) {
-        const int step = m_connection->query(Sql::addKey)
+        const int step = m_connection->query(Sql::AddKey)
                              .bind(parentOf(level.folded))
                              .bind(level.folded)
                              .bind(lastPart(level.spelled))
@@ -174,7 +174,7 @@ DWORD Store::deleteKey(const KeyPath& key) {
 
 DWORD Store::removeKey(const KeyPath& key) {
     {
-        Query query = m_connection->query(Sql::hasSubKeys);
+        Query query = m_connection->query(Sql::HasSubKeys);
         const int step = query.bind(key.folded).step();
         if (step != SQLITE_ROW) {
             return failed(step);
@@ -183,9 +183,9 @@ DWORD Store::removeKey(const KeyPath& key) {
             return ERROR_ACCESS_DENIED;
         }
     }
-    int step = m_connection->query(Sql::deleteValues).bind(key.folded).step();
+    int step = m_connection->query(Sql::DeleteValues).bind(key.folded).step();
     if (step == SQLITE_DONE) {
-        step = m_connection->query(Sql::deleteKey).bind(key.folded).step();
+        step = m_connection->query(Sql::DeleteKey).bind(key.folded).step();
     }
     return step == SQLITE_DONE && m_connection->changes() == 0 ? ERROR_FILE_NOT_FOUND : failed(step);
 }
@@ -196,7 +196,7 @@ DWORD Store::writeValue(const KeyPath& key, const Value& value) {
 }
 
 DWORD Store::insertValue(std::string_view path, std::string_view folded, const Value& value) {
-    const int step = m_connection->query(Sql::writeValue)
+    const int step = m_connection->query(Sql::WriteValue)
                          .bind(path)
                          .bind(folded)
                          .bind(value.name)
@@ -214,7 +214,7 @@ DWORD Store::deleteValue(const KeyPath& key, std::string_view name) {
     }
     const std::string folded = text::foldCase(name);
     return change([&] {
-        const int step = m_connection->query(Sql::deleteValue).bind(key.folded).bind(folded).step();
+        const int step = m_connection->query(Sql::DeleteValue).bind(key.folded).bind(folded).step();
         return step == SQLITE_DONE && m_connection->changes() == 0 ? ERROR_FILE_NOT_FOUND : failed(step);
     });
 }
@@ -240,9 +240,9 @@ DWORD Store::keyAt(const KeyPath& key, DWORD index, Cursor& cursor, std::string&
     if (found != ERROR_SUCCESS) {
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
     }
-    const DWORD result = run(Intent::read, [&] {
+    const DWORD result = run(Intent::Read, [&] {
         const std::string last = cursor.folded;
-        Query query = m_connection->query(follows(cursor, index) ? Sql::keyAfter : Sql::keyAt);
+        Query query = m_connection->query(follows(cursor, index) ? Sql::KeyAfter : Sql::KeyAt);
         query.bind(key.folded);
         const int step = (follows(cursor, index) ? query.bind(last) : query.bind(std::int64_t{index})).step();
         if (step != SQLITE_ROW) {
@@ -260,9 +260,9 @@ DWORD Store::valueAt(const KeyPath& key, DWORD index, Cursor& cursor, Value& val
     if (found != ERROR_SUCCESS) {
         return found == ERROR_FILE_NOT_FOUND ? ERROR_KEY_DELETED : found;
     }
-    const DWORD result = run(Intent::read, [&] {
+    const DWORD result = run(Intent::Read, [&] {
         const std::string last = cursor.folded;
-        Query query = m_connection->query(follows(cursor, index) ? Sql::valueAfter : Sql::valueAt);
+        Query query = m_connection->query(follows(cursor, index) ? Sql::ValueAfter : Sql::ValueAt);
         query.bind(key.folded);
         const int step = (follows(cursor, index) ? query.bind(last) : query.bind(std::int64_t{index})).step();
         if (step != SQLITE_ROW) {
@@ -282,7 +282,7 @@ DWORD Store::begin() {
         return ERROR_INVALID_FUNCTION;
     }
     return change([&] {
-        const DWORD result = failed(m_connection->query(Sql::begin).step());
+        const DWORD result = failed(m_connection->query(Sql::Begin).step());
         m_inTransaction = result == ERROR_SUCCESS;
         return result;
     });
@@ -292,9 +292,9 @@ DWORD Store::commit() {
     if (!m_inTransaction || m_isLost) {
         return ERROR_INVALID_FUNCTION;
     }
-    const DWORD result = failed(m_connection->query(Sql::commit).step());
+    const DWORD result = failed(m_connection->query(Sql::Commit).step());
     if (result != ERROR_SUCCESS) {
-        (void)m_connection->query(Sql::rollback).step();
+        (void)m_connection->query(Sql::Rollback).step();
     }
     m_inTransaction = false;
     return result;
@@ -302,7 +302,7 @@ DWORD Store::commit() {
 
 void Store::rollback() {
     if (m_inTransaction && !m_isLost) {
-        (void)m_connection->query(Sql::rollback).step();
+        (void)m_connection->query(Sql::Rollback).step();
     }
     m_inTransaction = false;
 }

@@ -82,20 +82,20 @@ public:
     void rollback();
 
     /// What happens to the log on closing: brought into the file by the last process, or left as it is.
-    enum class Log { merge, keep };
+    enum class Log { Merge, Keep };
     /// Closes the file; the next operation opens it again. Does nothing within a transaction.
-    void close(Log log = Log::merge);
+    void close(Log log = Log::Merge);
     /// Leaves an open transaction to the process that this one is a fork of.
     void leaveToParent();
 
     [[nodiscard]] std::vector<std::string> takeNotices();
 
 private:
-    enum class Intent { read, write };
+    enum class Intent { Read, Write };
     /// How the open file can be used.
-    enum class Mode { closed, shared, readOnly, copy };
+    enum class Mode { Closed, Shared, ReadOnly, Copy };
     /// Faults that last, so that the user is told once about each.
-    enum class Fault { unusable, newer, notSaved };
+    enum class Fault { Unusable, Newer, NotSaved };
 
     /// What a question was answered with.
     struct Reply {
@@ -146,7 +146,7 @@ private:
     FileIdentity m_identity;
     FileStamp m_stamp;
     FileStamp m_logStamp;
-    Mode m_mode = Mode::closed;
+    Mode m_mode = Mode::Closed;
     DWORD m_writeError = ERROR_ACCESS_DENIED; ///< what a write is answered where none is possible
     bool m_inTransaction = false;
     bool m_isLost = false; ///< the process is the child of one that forked within a transaction

@@ -24,8 +24,8 @@ constexpr const char* schema = "BEGIN IMMEDIATE;"
 static_assert(applicationId == 1414944850 && schemaVersion == 1);
 
 struct Stores {
-    Store user{Hive::user};
-    Store machine{Hive::machine};
+    Store user{Hive::User};
+    Store machine{Hive::Machine};
 };
 
 /// Never destroyed: objects that end later than this may still keep their settings.
@@ -36,7 +36,7 @@ Stores& stores();
 void beforeFork() {
     for (Store* store : {&stores().user, &stores().machine}) {
         store->mutex.lock();
-        store->close(Store::Log::keep);
+        store->close(Store::Log::Keep);
     }
 }
 
@@ -69,7 +69,7 @@ Store::Store(Hive hive) : m_hive(hive), m_memory(std::make_unique<Memory>()) {}
 Store::~Store() = default;
 
 Store& Store::of(Hive hive) {
-    return hive == Hive::user ? stores().user : stores().machine;
+    return hive == Hive::User ? stores().user : stores().machine;
 }
 
 void closeStores() {
@@ -87,16 +87,16 @@ void Store::close(Log log) {
         closeConnection(log);
     }
     m_memory->replies.clear();
-    m_memory->watch = Memory::Watch::none;
+    m_memory->watch = Memory::Watch::None;
     m_copy.reset();
-    m_mode = Mode::closed;
+    m_mode = Mode::Closed;
 }
 
 void Store::closeConnection(Log log) {
     // Merging deletes the log by its name. Where another file has taken the place, or takes it right now, that would be
     // the other file's.
     std::optional<FolderLock> lock;
-    if (log == Log::merge && m_mode == Mode::shared) {
+    if (log == Log::Merge && m_mode == Mode::Shared) {
         lock.emplace(m_file);
     }
     if (!lock || !lock->isHeld() || !isCurrent()) {
@@ -111,9 +111,9 @@ void Store::leaveToParent() {
 
 bool Store::isCurrent() const {
     switch (m_mode) {
-    case Mode::closed:
+    case Mode::Closed:
         return false;
-    case Mode::copy:
+    case Mode::Copy:
         return m_stamp == stampOf(m_file) && m_logStamp == stampOf(m_file + "-wal");
     default:
         return m_identity == identityOf(m_name);
@@ -121,14 +121,14 @@ bool Store::isCurrent() const {
 }
 
 DWORD Store::ensureOpen(Intent intent) {
-    if (m_isLost || (intent == Intent::write && m_hive == Hive::machine)) {
+    if (m_isLost || (intent == Intent::Write && m_hive == Hive::Machine)) {
         return ERROR_ACCESS_DENIED;
     }
     if (m_inTransaction) {
         return ERROR_SUCCESS;
     }
     // What could not be written before may have become possible.
-    const bool isEnough = m_mode == Mode::shared || intent == Intent::read;
+    const bool isEnough = m_mode == Mode::Shared || intent == Intent::Read;
     return isEnough && isCurrent() ? ERROR_SUCCESS : open(intent);
 }
 
@@ -136,20 +136,20 @@ DWORD Store::open(Intent intent) {
     close();
     m_name = locate(m_hive);
     if (m_name.empty()) {
-        return intent == Intent::read ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
+        return intent == Intent::Read ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
     }
     m_file = resolve(m_name);
     const FileKind kind = kindOf(m_file);
-    if (kind == FileKind::missing) {
-        if (intent == Intent::read) {
+    if (kind == FileKind::Missing) {
+        if (intent == Intent::Read) {
             return ERROR_FILE_NOT_FOUND;
         }
         if (const DWORD result = createFile(); result != ERROR_SUCCESS) {
             return result;
         }
-    } else if (kind != FileKind::regular) {
-        tell(Fault::unusable, "The settings cannot be used: " + m_name +
-                                  (kind == FileKind::other ? " is no file." : " cannot be reached."));
+    } else if (kind != FileKind::Regular) {
+        tell(Fault::Unusable, "The settings cannot be used: " + m_name +
+                                  (kind == FileKind::Other ? " is no file." : " cannot be reached."));
         return ERROR_ACCESS_DENIED;
     }
     return openFile(intent);
@@ -164,7 +164,7 @@ DWORD Store::createFile() {
         result = makeFile(m_file);
     }
     if (result != ERROR_SUCCESS) {
-        tell(Fault::notSaved, "Settings cannot be saved: " + m_file + " cannot be made. " + errorText(result));
+        tell(Fault::NotSaved, "Settings cannot be saved: " + m_file + " cannot be made. " + errorText(result));
     }
     return result;
 }
@@ -175,7 +175,7 @@ DWORD Store::openFile(Intent intent) {
     if (result == ERROR_SUCCESS || result == ERROR_REGISTRY_CORRUPT) {
         return result;
     }
-    close(Log::keep);
+    close(Log::Keep);
     if (m_identity == FileIdentity{} || m_identity != identityOf(m_name)) {
         return open(intent); // somebody has set it aside just now
     }
@@ -194,9 +194,9 @@ DWORD Store::connect(const std::string& file) {
     if (result != ERROR_SUCCESS) {
         return result;
     }
-    m_memory->watch = m_copy                     ? Memory::Watch::nothing
-                      : m_connection->shareLog() ? Memory::Watch::log
-                                                 : Memory::Watch::none;
+    m_memory->watch = m_copy                     ? Memory::Watch::Nothing
+                      : m_connection->shareLog() ? Memory::Watch::Log
+                                                 : Memory::Watch::None;
     return ERROR_SUCCESS;
 }
 
@@ -208,12 +208,12 @@ DWORD Store::checkSchema() {
     }
     const bool isNew = *id == 0 && isEmptyDatabase();
     if (*id != applicationId && !isNew) {
-        tell(Fault::unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
+        tell(Fault::Unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
         return ERROR_BAD_FORMAT;
     }
-    const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::machine || isOfNewerVersion(*version);
-    m_mode = m_copy ? Mode::copy : isForReading ? Mode::readOnly : Mode::shared;
-    if (m_mode == Mode::shared) {
+    const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::Machine || isOfNewerVersion(*version);
+    m_mode = m_copy ? Mode::Copy : isForReading ? Mode::ReadOnly : Mode::Shared;
+    if (m_mode == Mode::Shared) {
         chooseJournal();
     }
     return isNew ? initialise() : ERROR_SUCCESS;
@@ -223,7 +223,7 @@ bool Store::isOfNewerVersion(std::int64_t version) {
     if (version <= schemaVersion) {
         return false;
     }
-    tell(Fault::newer, "The settings in " + m_file +
+    tell(Fault::Newer, "The settings in " + m_file +
                            " were written by a newer version of this software. They are read as far as possible and "
                            "not changed.");
     return true;
@@ -243,7 +243,7 @@ void Store::chooseJournal() {
 }
 
 DWORD Store::initialise() {
-    if (m_mode != Mode::shared) {
+    if (m_mode != Mode::Shared) {
         return ERROR_FILE_NOT_FOUND;
     }
     const FolderLock lock(m_file);
@@ -272,14 +272,14 @@ DWORD Store::openCopy(DWORD reason) {
         return ERROR_SUCCESS;
     }
     close();
-    tell(Fault::unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
+    tell(Fault::Unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
     return reason;
 }
 
 DWORD Store::replaceDamaged() {
     const FileIdentity damaged = m_identity;
-    const bool isOurs = m_hive == Hive::user && !m_copy;
-    close(Log::keep);
+    const bool isOurs = m_hive == Hive::User && !m_copy;
+    close(Log::Keep);
     std::optional<std::string> aside;
     if (isOurs) {
         const FolderLock lock(m_file);
@@ -289,7 +289,7 @@ DWORD Store::replaceDamaged() {
         aside = lock.isHeld() ? setAside(m_file) : std::nullopt;
     }
     if (!aside) {
-        tell(Fault::unusable, "The settings cannot be used: " + m_file + " is damaged.");
+        tell(Fault::Unusable, "The settings cannot be used: " + m_file + " is damaged.");
         return ERROR_ACCESS_DENIED;
     }
     const std::size_t saved = takeOver(*aside);

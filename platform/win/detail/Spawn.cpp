@@ -17,7 +17,7 @@ namespace {
 /// thread that started it stands still.
 struct Start {
     const SpawnRequest& request;
-    SpawnStep step = SpawnStep::start;
+    SpawnStep step = SpawnStep::Start;
     int error = 0;
 };
 
@@ -79,7 +79,7 @@ bool prepare(Start& start) {
         return false;
     }
     closeOthers();
-    start.step = SpawnStep::directory;
+    start.step = SpawnStep::Directory;
     return !start.request.directory || ::chdir(start.request.directory) == 0;
 }
 
@@ -87,7 +87,7 @@ bool prepare(Start& start) {
 __attribute__((no_sanitize("address"))) int runChild(void* data) {
     Start& start = *static_cast<Start*>(data);
     if (prepare(start)) {
-        start.step = SpawnStep::program;
+        start.step = SpawnStep::Program;
         sigset_t none;
         ::sigemptyset(&none);
         ::sigprocmask(SIG_SETMASK, &none, nullptr);

@@ -21,13 +21,13 @@ struct SpawnRequest {
 };
 
 /// What a start can fail in.
-enum class SpawnStep { start, directory, program };
+enum class SpawnStep { Start, Directory, Program };
 
 /// A started child, or why there is none.
 struct SpawnResult {
     Descriptor process; ///< none: it failed
     pid_t id = 0;
-    SpawnStep failedStep = SpawnStep::start;
+    SpawnStep failedStep = SpawnStep::Start;
     int error = 0; ///< an `errno` value
 };
 

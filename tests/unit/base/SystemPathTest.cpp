@@ -56,8 +56,8 @@ TEST_F(SystemPath, LooksForMissingPartsWithoutCase) {
 TEST_F(SystemPath, NewFilesDoNotFallOnOtherSpellings) {
     put("Sub/README");
     EXPECT_EQ("Sub/README", systemPath("sub\\readme"));
-    EXPECT_EQ("Sub/readme", systemPath("sub\\readme", PathUse::creating));
-    EXPECT_EQ("Sub/README", systemPath("sub\\README", PathUse::creating));
+    EXPECT_EQ("Sub/readme", systemPath("sub\\readme", PathUse::Creating));
+    EXPECT_EQ("Sub/README", systemPath("sub\\README", PathUse::Creating));
 }
 
 namespace {
@@ -120,9 +120,9 @@ TEST_F(TwoDrives, SystemNamesCompletedByTheWrongDriveAreFound) {
     std::filesystem::current_path("mount");
     EXPECT_EQ(m_folder + "/other/a", systemPath("D:" + rest));
     EXPECT_EQ(m_folder + "/other/a", systemPath(rest));
-    EXPECT_EQ(m_folder + "/other/new", systemPath(drive("other\\new").replace(0, 1, "D"), PathUse::creating));
-    EXPECT_EQ(folder + "/sub/new", systemPath("D:\\sub\\new", PathUse::creating));
-    EXPECT_EQ(folder + "/tmp", systemPath("D:\\tmp", PathUse::creating)) << "the drive has that folder itself";
+    EXPECT_EQ(m_folder + "/other/new", systemPath(drive("other\\new").replace(0, 1, "D"), PathUse::Creating));
+    EXPECT_EQ(folder + "/sub/new", systemPath("D:\\sub\\new", PathUse::Creating));
+    EXPECT_EQ(folder + "/tmp", systemPath("D:\\tmp", PathUse::Creating)) << "the drive has that folder itself";
 }
 
 TEST_F(TwoDrives, RootedNamesAreNeverTakenAsTheyAreWritten) {

@@ -53,7 +53,7 @@ TEST(Drawing, TextsOfAnyBytesSurvive) {
     std::mt19937 random(7);
     for (int round = 0; round < 300; ++round) {
         Shape shape;
-        shape.kind = ShapeKind::text;
+        shape.kind = ShapeKind::Text;
         shape.to = {100, 20};
         for (int i = 0; i < round % 40; ++i) {
             shape.text += static_cast<char>(1 + random() % 255);
@@ -74,22 +74,22 @@ TEST(Drawing, FaultsAreNamedWithTheirLine) {
         std::vector<std::string> details{};
     };
     for (const Case& c : {
-             Case{"", 1, Fault::noDrawing},
-             Case{"board 2\n", 1, Fault::unknownVersion, {"2"}},
-             Case{"board 1\ncircle 1 2 3\n", 2, Fault::unknownShape, {"circle"}},
-             Case{"board 1\n\nline 1 2 3\n", 3, Fault::fewCoordinates},
-             Case{"board 1\nline 1 2 3 x\n", 2, Fault::noNumber, {"x, y", "x", "-100000", "100000"}},
-             Case{"board 1\nline 1 2 3 4 color=#12345\n", 2, Fault::noColor, {"#12345"}},
-             Case{"board 1\nline 1 2 3 4 fill=#000000\n", 2, Fault::unknownAttribute, {"line", "fill"}},
-             Case{"board 1\ntext 0 0 9 9 size=8\n", 2, Fault::noText},
-             Case{"board 1\ntext 0 0 9 9 \"open\n", 2, Fault::openText},
-             Case{"board 1\ntext 0 0 9 9 \"a\"b\n", 2, Fault::noBlankAfterText},
-             Case{"board 1\ntext 0 0 9 9 \"\\t\"\n", 2, Fault::unknownEscape},
+             Case{"", 1, Fault::NoDrawing},
+             Case{"board 2\n", 1, Fault::UnknownVersion, {"2"}},
+             Case{"board 1\ncircle 1 2 3\n", 2, Fault::UnknownShape, {"circle"}},
+             Case{"board 1\n\nline 1 2 3\n", 3, Fault::FewCoordinates},
+             Case{"board 1\nline 1 2 3 x\n", 2, Fault::NoNumber, {"x, y", "x", "-100000", "100000"}},
+             Case{"board 1\nline 1 2 3 4 color=#12345\n", 2, Fault::NoColor, {"#12345"}},
+             Case{"board 1\nline 1 2 3 4 fill=#000000\n", 2, Fault::UnknownAttribute, {"line", "fill"}},
+             Case{"board 1\ntext 0 0 9 9 size=8\n", 2, Fault::NoText},
+             Case{"board 1\ntext 0 0 9 9 \"open\n", 2, Fault::OpenText},
+             Case{"board 1\ntext 0 0 9 9 \"a\"b\n", 2, Fault::NoBlankAfterText},
+             Case{"board 1\ntext 0 0 9 9 \"\\t\"\n", 2, Fault::UnknownEscape},
              Case{"board 1\nrectangle 0 0 999999999999 1\n",
                   2,
-                  Fault::noNumber,
+                  Fault::NoNumber,
                   {"x, y", "999999999999", "-100000", "100000"}},
-             Case{"board 1\nrectangle 0 0 1 1 width=0\n", 2, Fault::noNumber, {"width", "0", "1", "20"}},
+             Case{"board 1\nrectangle 0 0 1 1 width=0\n", 2, Fault::NoNumber, {"width", "0", "1", "20"}},
          }) {
         SCOPED_TRACE(c.text);
         const ReadResult read = readDrawing(c.text);

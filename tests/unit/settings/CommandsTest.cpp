@@ -22,7 +22,7 @@ protected:
     }
     /// All that is stored, as text.
     std::string everything() {
-        EXPECT_EQ(run({"export"}), Outcome::done);
+        EXPECT_EQ(run({"export"}), Outcome::Done);
         return m_out;
     }
 
@@ -33,42 +33,42 @@ protected:
 
 TEST_F(Commands, SetAndGetValues) {
     const std::string key = "Software\\Tarvex";
-    EXPECT_EQ(run({"set", key, "Unit", "größe 1"}), Outcome::done);
-    EXPECT_EQ(run({"set", "-t", "number", key, "N", "0x10"}), Outcome::done);
-    EXPECT_EQ(run({"set", "-t", "bytes", key, "B", "00 ff,7a"}), Outcome::done);
-    EXPECT_EQ(run({"set", "--", key, "@", "-x"}), Outcome::done);
-    EXPECT_EQ(run({"get", key, "unit"}), Outcome::done);
+    EXPECT_EQ(run({"set", key, "Unit", "größe 1"}), Outcome::Done);
+    EXPECT_EQ(run({"set", "-t", "number", key, "N", "0x10"}), Outcome::Done);
+    EXPECT_EQ(run({"set", "-t", "bytes", key, "B", "00 ff,7a"}), Outcome::Done);
+    EXPECT_EQ(run({"set", "--", key, "@", "-x"}), Outcome::Done);
+    EXPECT_EQ(run({"get", key, "unit"}), Outcome::Done);
     EXPECT_EQ(m_out, "größe 1\n");
-    EXPECT_EQ(run({"get", "HKEY_CURRENT_USER\\" + key, "N"}), Outcome::done);
+    EXPECT_EQ(run({"get", "HKEY_CURRENT_USER\\" + key, "N"}), Outcome::Done);
     EXPECT_EQ(m_out, "16\n");
-    EXPECT_EQ(run({"get", key, "B"}), Outcome::done);
+    EXPECT_EQ(run({"get", key, "B"}), Outcome::Done);
     EXPECT_EQ(m_out, "00 ff 7a\n");
-    EXPECT_EQ(run({"get", key, "@"}), Outcome::done);
+    EXPECT_EQ(run({"get", key, "@"}), Outcome::Done);
     EXPECT_EQ(m_out, "-x\n");
-    EXPECT_EQ(run({"list", "Software"}), Outcome::done);
+    EXPECT_EQ(run({"list", "Software"}), Outcome::Done);
     EXPECT_EQ(m_out, "[HKEY_CURRENT_USER\\Software\\Tarvex]\n");
-    EXPECT_EQ(run({"list", key}), Outcome::done);
+    EXPECT_EQ(run({"list", key}), Outcome::Done);
     EXPECT_EQ(m_out, "@=\"-x\"\n\"B\"=hex:00,ff,7a\n\"N\"=dword:00000010\n\"Unit\"=\"größe 1\"\n");
 }
 
 TEST_F(Commands, TellWhatIsMissing) {
-    EXPECT_EQ(run({"get", "Software", "a"}), Outcome::missing);
+    EXPECT_EQ(run({"get", "Software", "a"}), Outcome::Missing);
     EXPECT_EQ(m_errors, "tvxsettings: HKEY_CURRENT_USER\\Software: it does not exist.\n");
     run({"set", "Software", "b", "1"});
-    EXPECT_EQ(run({"get", "Software", "a"}), Outcome::missing);
+    EXPECT_EQ(run({"get", "Software", "a"}), Outcome::Missing);
     EXPECT_EQ(m_errors, "tvxsettings: HKEY_CURRENT_USER\\Software, \"a\": it does not exist.\n");
-    EXPECT_EQ(run({"list", "Nowhere"}), Outcome::missing);
-    EXPECT_EQ(run({"delete", "-r", "Nowhere"}), Outcome::missing);
-    EXPECT_EQ(run({"set", "HKLM\\Software", "a", "1"}), Outcome::failed);
+    EXPECT_EQ(run({"list", "Nowhere"}), Outcome::Missing);
+    EXPECT_EQ(run({"delete", "-r", "Nowhere"}), Outcome::Missing);
+    EXPECT_EQ(run({"set", "HKLM\\Software", "a", "1"}), Outcome::Failed);
     EXPECT_EQ(everything(), "REGEDIT4\n\n[HKEY_CURRENT_USER\\Software]\n\"b\"=\"1\"\n\n");
 }
 
 TEST_F(Commands, DeleteValuesAndTrees) {
     run({"set", "a\\b\\c", "v", "1"});
     run({"set", "a", "v", "1"});
-    EXPECT_EQ(run({"delete", "a", "v"}), Outcome::done);
-    EXPECT_EQ(run({"delete", "a", "v"}), Outcome::missing);
-    EXPECT_EQ(run({"delete", "-r", "a"}), Outcome::done);
+    EXPECT_EQ(run({"delete", "a", "v"}), Outcome::Done);
+    EXPECT_EQ(run({"delete", "a", "v"}), Outcome::Missing);
+    EXPECT_EQ(run({"delete", "-r", "a"}), Outcome::Done);
     EXPECT_EQ(everything(), "REGEDIT4\n\n[HKEY_CURRENT_USER]\n\n");
 }
 
@@ -79,13 +79,13 @@ TEST_F(Commands, ImportWhatWasExported) {
     run({"delete", "Empty", "a"});
     const std::string text = everything();
     const std::string file = (m_sandbox.folder / "all.reg").string();
-    EXPECT_EQ(run({"export", "-o", file, "Software"}), Outcome::done);
+    EXPECT_EQ(run({"export", "-o", file, "Software"}), Outcome::Done);
     EXPECT_EQ(m_out, "");
     RegistrySandbox::use(m_sandbox.folder / "other.db");
-    EXPECT_EQ(run({"import", "-"}, text), Outcome::done);
+    EXPECT_EQ(run({"import", "-"}, text), Outcome::Done);
     EXPECT_EQ(everything(), text);
     RegistrySandbox::use(m_sandbox.folder / "third.db");
-    EXPECT_EQ(run({"import", file}), Outcome::done);
+    EXPECT_EQ(run({"import", file}), Outcome::Done);
     EXPECT_EQ(everything(), "REGEDIT4\n\n" + text.substr(text.find("[HKEY_CURRENT_USER\\Software")));
 }
 
@@ -93,31 +93,31 @@ TEST_F(Commands, ImportAllOrNothing) {
     run({"set", "k", "old", "1"});
     const std::string before = everything();
     const std::string head = "REGEDIT4\n[-HKCU\\k]\n[HKCU\\new]\n\"a\"=\"1\"\n";
-    EXPECT_EQ(run({"import", "-"}, head + "\"b\"=nonsense\n"), Outcome::badFile);
+    EXPECT_EQ(run({"import", "-"}, head + "\"b\"=nonsense\n"), Outcome::BadFile);
     EXPECT_EQ(m_errors, "tvxsettings: standard input:5: expected a text in quotes, dword:, hex: or -\n");
     EXPECT_EQ(everything(), before);
-    EXPECT_EQ(run({"import", "-"}, head + "[HKLM\\Software]\n"), Outcome::failed);
+    EXPECT_EQ(run({"import", "-"}, head + "[HKLM\\Software]\n"), Outcome::Failed);
     EXPECT_EQ(m_errors.substr(0, 30), "tvxsettings: standard input:5:");
     EXPECT_EQ(everything(), before);
-    EXPECT_EQ(run({"import", (m_sandbox.folder / "none.reg").string()}), Outcome::badFile);
+    EXPECT_EQ(run({"import", (m_sandbox.folder / "none.reg").string()}), Outcome::BadFile);
     EXPECT_NE(m_errors.find("none.reg: No such file"), std::string::npos) << m_errors;
-    EXPECT_EQ(run({"import", "-"}, head + "[-HKCU\\never]\n[HKCU\\new]\n\"never\"=-\n"), Outcome::done);
+    EXPECT_EQ(run({"import", "-"}, head + "[-HKCU\\never]\n[HKCU\\new]\n\"never\"=-\n"), Outcome::Done);
     EXPECT_EQ(everything(), "REGEDIT4\n\n[HKEY_CURRENT_USER\\new]\n\"a\"=\"1\"\n\n");
 }
 
 TEST_F(Commands, ExplainThemselves) {
-    EXPECT_EQ(run({"--help"}), Outcome::done);
+    EXPECT_EQ(run({"--help"}), Outcome::Done);
     EXPECT_NE(m_out.find("import FILE"), std::string::npos);
-    EXPECT_EQ(run({"get", "--help"}), Outcome::done);
-    EXPECT_EQ(run({}), Outcome::misused);
-    EXPECT_EQ(run({"frob"}), Outcome::misused);
+    EXPECT_EQ(run({"get", "--help"}), Outcome::Done);
+    EXPECT_EQ(run({}), Outcome::Misused);
+    EXPECT_EQ(run({"frob"}), Outcome::Misused);
     EXPECT_EQ(m_errors, "tvxsettings: unknown command \"frob\". See tvxsettings --help.\n");
-    EXPECT_EQ(run({"get", "a"}), Outcome::misused);
-    EXPECT_EQ(run({"get", "a", "b", "c"}), Outcome::misused);
-    EXPECT_EQ(run({"list", "-x"}), Outcome::misused);
-    EXPECT_EQ(run({"delete", "a"}), Outcome::misused);
-    EXPECT_EQ(run({"set", "-t", "number", "a", "b", "-1"}), Outcome::misused);
-    EXPECT_EQ(run({"set", "-t", "bytes", "a", "b", "123"}), Outcome::misused);
+    EXPECT_EQ(run({"get", "a"}), Outcome::Misused);
+    EXPECT_EQ(run({"get", "a", "b", "c"}), Outcome::Misused);
+    EXPECT_EQ(run({"list", "-x"}), Outcome::Misused);
+    EXPECT_EQ(run({"delete", "a"}), Outcome::Misused);
+    EXPECT_EQ(run({"set", "-t", "number", "a", "b", "-1"}), Outcome::Misused);
+    EXPECT_EQ(run({"set", "-t", "bytes", "a", "b", "123"}), Outcome::Misused);
     EXPECT_FALSE(std::filesystem::exists(m_sandbox.file));
 }
 

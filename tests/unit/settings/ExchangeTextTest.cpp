@@ -40,7 +40,7 @@ TEST(ExchangeText, HoldsKeysWithValuesOfEveryType) {
                               "\"gone\"=-\r\n"
                               "[-hkcu\\Old]\r\n");
     ASSERT_EQ(changes.size(), 8u);
-    EXPECT_EQ(changes[0].kind, Change::Kind::makeKey);
+    EXPECT_EQ(changes[0].kind, Change::Kind::MakeKey);
     EXPECT_EQ(changes[0].key.path, "Software\\Tarvex");
     EXPECT_EQ(changes[0].line, 4);
     EXPECT_EQ(changes[1].setting.name, "");
@@ -53,9 +53,9 @@ TEST(ExchangeText, HoldsKeysWithValuesOfEveryType) {
     EXPECT_EQ(changes[4].setting.data, std::string("\0\1\xFF", 3));
     EXPECT_EQ(changes[5].setting.type, REG_EXPAND_SZ);
     EXPECT_EQ(changes[5].setting.data, std::string("%\0", 2));
-    EXPECT_EQ(changes[6].kind, Change::Kind::deleteValue);
+    EXPECT_EQ(changes[6].kind, Change::Kind::DeleteValue);
     EXPECT_EQ(changes[6].line, 11);
-    EXPECT_EQ(changes[7].kind, Change::Kind::deleteKey);
+    EXPECT_EQ(changes[7].kind, Change::Kind::DeleteKey);
     EXPECT_EQ(changes[7].key.root, HKEY_CURRENT_USER);
 }
 

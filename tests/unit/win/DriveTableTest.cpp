@@ -26,7 +26,7 @@ std::string describe(const DriveTable& table) {
         text += text.empty() ? "" : " ";
         text += drive.letter ? std::string(1, drive.letter) + ":" : std::string("-");
         text += drive.folder;
-        text += drive.kind == DriveKind::removable ? "(removable)" : drive.kind == DriveKind::optical ? "(disc)" : "";
+        text += drive.kind == DriveKind::Removable ? "(removable)" : drive.kind == DriveKind::Optical ? "(disc)" : "";
         text += drive.remoteName.empty() ? "" : "(" + drive.remoteName + ")";
     }
     return text;

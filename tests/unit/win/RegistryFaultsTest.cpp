@@ -87,7 +87,7 @@ TEST_F(RegistryFaults, DamagedFileIsSetAsideAndToldOnce) {
         notices.clear();
         RegistrySandbox::use(m_sandbox.file);
         const auto before = setAside().size();
-        EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+        EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
         const TestKey key(path);
         EXPECT_EQ(key.write("a", "1"), 0);
         EXPECT_EQ(key.read("a"), "1");
@@ -116,7 +116,7 @@ TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
     const std::size_t middle = whole.size() / 2 / 4096 * 4096;
     damaged.replace(middle, 4096, std::string(4096, '\xA5'));
     put(damaged);
-    const TestKey key(path, TestKey::Way::open);
+    const TestKey key(path, TestKey::Way::Open);
     ASSERT_EQ(key.result, 0);
     int found = 0;
     for (int i = 0; i < 3000; ++i) {
@@ -158,7 +158,7 @@ TEST_F(RegistryFaults, LinkStaysALink) {
     const fs::path target = m_sandbox.folder / "elsewhere.db";
     fs::create_directories(m_sandbox.file.parent_path());
     fs::create_symlink("../elsewhere.db", m_sandbox.file);
-    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND}) << "leads nowhere so far";
+    EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND}) << "leads nowhere so far";
     EXPECT_EQ(TestKey(path).write("a", "1"), 0);
     EXPECT_TRUE(fs::exists(target));
     tvx::registry::closeStores();
@@ -183,7 +183,7 @@ TEST_F(RegistryFaults, LinkIntoAMissingFolderIsLeftAlone) {
 TEST_F(RegistryFaults, FolderInThePlaceOfTheFile) {
     fs::create_directories(m_sandbox.file / "inside");
     EXPECT_EQ(TestKey(path).result, LSTATUS{ERROR_ACCESS_DENIED});
-    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_ACCESS_DENIED});
     EXPECT_TRUE(fs::exists(m_sandbox.file / "inside"));
     EXPECT_EQ(notices.size(), 1u);
     fs::remove_all(m_sandbox.file);
@@ -218,7 +218,7 @@ TEST_F(RegistryFaults, FileOfAnotherProgramIsLeftAlone) {
 
 TEST_F(RegistryFaults, EmptyFileIsANewStore) {
     put("");
-    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+    EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
     EXPECT_EQ(TestKey(path).write("a", "1"), 0);
     EXPECT_TRUE(notices.empty());
 }

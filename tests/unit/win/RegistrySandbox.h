@@ -39,11 +39,11 @@ public:
 /// An open key that closes itself.
 class TestKey {
 public:
-    enum class Way { create, open };
+    enum class Way { Create, Open };
 
-    explicit TestKey(const std::string& path, Way way = Way::create, REGSAM access = KEY_READ | KEY_WRITE,
+    explicit TestKey(const std::string& path, Way way = Way::Create, REGSAM access = KEY_READ | KEY_WRITE,
                      HKEY root = HKEY_CURRENT_USER) {
-        result = way == Way::create ? RegCreateKeyExA(root, path.c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE, access,
+        result = way == Way::Create ? RegCreateKeyExA(root, path.c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE, access,
                                                       nullptr, &handle, &disposition)
                                     : RegOpenKeyExA(root, path.c_str(), 0, access, &handle);
     }

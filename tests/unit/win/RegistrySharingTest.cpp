@@ -45,7 +45,7 @@ TEST_F(RegistrySharing, SeesThatAnotherFileHasTakenThePlace) {
     key.write("a", "old");
     EXPECT_EQ(key.read("a"), "old");
     std::filesystem::remove_all(m_sandbox.file.parent_path());
-    EXPECT_EQ(TestKey(path, TestKey::Way::open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+    EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
     EXPECT_TRUE(ChildProcess([](ChildProcess&) { TestKey(path).write("a", "new"); }).end());
     EXPECT_EQ(key.read("a"), "new");
     EXPECT_EQ(key.write("a", "newer"), 0);

@@ -69,7 +69,7 @@ TEST_F(Registry, FindsNamesWithoutCaseAndKeepsTheirFirstSpelling) {
 
 TEST_F(Registry, PassesOverBackslashesTooMany) {
     TestKey("Software\\Tarvex").write("a", "1");
-    EXPECT_EQ(TestKey("\\Software\\\\Tarvex\\", TestKey::Way::open).read("a"), "1");
+    EXPECT_EQ(TestKey("\\Software\\\\Tarvex\\", TestKey::Way::Open).read("a"), "1");
 }
 
 TEST_F(Registry, AnswersTheSizeOfAValueThatDoesNotFit) {
@@ -122,11 +122,11 @@ TEST_F(Registry, DeletesValuesAndKeysWithoutKeysBelow) {
 
 TEST_F(Registry, RefusesWhatAKeyWasNotOpenedFor) {
     TestKey("Software\\Tarvex").write("a", "1");
-    const TestKey reading("Software\\Tarvex", TestKey::Way::open, KEY_READ);
+    const TestKey reading("Software\\Tarvex", TestKey::Way::Open, KEY_READ);
     EXPECT_EQ(reading.read("a"), "1");
     EXPECT_EQ(reading.write("a", "2"), LSTATUS{ERROR_ACCESS_DENIED});
-    EXPECT_EQ(TestKey("Software\\Tarvex", TestKey::Way::open, KEY_WRITE).read("a"), "<5>");
-    EXPECT_EQ(TestKey("Software", TestKey::Way::create, KEY_READ, HKEY_LOCAL_MACHINE).result,
+    EXPECT_EQ(TestKey("Software\\Tarvex", TestKey::Way::Open, KEY_WRITE).read("a"), "<5>");
+    EXPECT_EQ(TestKey("Software", TestKey::Way::Create, KEY_READ, HKEY_LOCAL_MACHINE).result,
               LSTATUS{ERROR_ACCESS_DENIED});
     HKEY handle = nullptr;
     EXPECT_EQ(RegOpenKeyExA(HKEY_CURRENT_USER, "Nowhere", 0, KEY_READ, &handle), LSTATUS{ERROR_FILE_NOT_FOUND});
@@ -146,10 +146,10 @@ TEST_F(Registry, AnswersClassesOfTheUserBeforeThoseOfTheMachine) {
     RegistrySandbox::use(m_sandbox.file);
     setenv("XDG_CONFIG_DIRS", (m_sandbox.folder / "xdg").c_str(), 1);
     TestKey("Software\\Classes\\.brd").write("", "user");
-    EXPECT_EQ(TestKey(".brd", TestKey::Way::open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "user");
-    EXPECT_EQ(TestKey(".pdf", TestKey::Way::open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "viewer");
-    EXPECT_EQ(TestKey("Software\\Classes\\.brd", TestKey::Way::open, KEY_READ, HKEY_LOCAL_MACHINE).read(""), "machine");
-    EXPECT_EQ(TestKey(".pdf", TestKey::Way::create, KEY_WRITE, HKEY_CLASSES_ROOT).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey(".brd", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "user");
+    EXPECT_EQ(TestKey(".pdf", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "viewer");
+    EXPECT_EQ(TestKey("Software\\Classes\\.brd", TestKey::Way::Open, KEY_READ, HKEY_LOCAL_MACHINE).read(""), "machine");
+    EXPECT_EQ(TestKey(".pdf", TestKey::Way::Create, KEY_WRITE, HKEY_CLASSES_ROOT).result, LSTATUS{ERROR_ACCESS_DENIED});
 }
 
 TEST_F(Registry, MakesFileAndFolderPrivateAndOnlyWhenSomethingIsWritten) {

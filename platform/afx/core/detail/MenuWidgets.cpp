@@ -40,7 +40,7 @@ void applyState(QAction& action, const MenuItem& item) {
     }
     action.setCheckable(true);
     action.setChecked(true);
-    if (item.mark == MenuItem::Mark::radio) {
+    if (item.mark == MenuItem::Mark::Radio) {
         auto* group = new QActionGroup(&action); // the style draws members of exclusive groups with a round mark
         group->setExclusive(true);
         group->addAction(&action);

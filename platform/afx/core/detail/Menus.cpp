@@ -281,7 +281,7 @@ BOOL EnableMenuItem(HMENU menu, UINT item, UINT flags) {
 DWORD CheckMenuItem(HMENU menu, UINT item, UINT flags) {
     const MenuPlace place = findItem(menu, item, flags);
     if (place && (flags & MF_CHECKED) != 0) {
-        place.item().mark = MenuItem::Mark::check;
+        place.item().mark = MenuItem::Mark::Check;
     }
     return changeState(menu, item, flags, MF_CHECKED);
 }
@@ -295,7 +295,7 @@ BOOL CheckMenuRadioItem(HMENU menu, UINT first, UINT last, UINT checked, UINT fl
         }
         changeState(menu, item, (flags & MF_BYPOSITION) | (item == checked ? MF_CHECKED : 0U), MF_CHECKED);
         if (item == checked) {
-            place.item().mark = MenuItem::Mark::radio;
+            place.item().mark = MenuItem::Mark::Radio;
             found = TRUE;
         }
     }

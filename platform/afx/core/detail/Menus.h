@@ -13,13 +13,13 @@ namespace tvx::afx {
 
 /// One item: a command, a separator or a popup.
 struct MenuItem {
-    enum class Mark { check, radio };
+    enum class Mark { Check, Radio };
 
     UINT flags = 0; ///< MF_SEPARATOR, MF_GRAYED, MF_DISABLED, MF_CHECKED, MF_OWNERDRAW, MF_MENUBREAK, ...
     UINT id = 0;    ///< The command; of no meaning for separators.
     std::string text;
     HMENU popup = nullptr;
-    Mark mark = Mark::check;
+    Mark mark = Mark::Check;
     bool isDefault = false;
     HBITMAP unchecked = nullptr;
     HBITMAP checked = nullptr;

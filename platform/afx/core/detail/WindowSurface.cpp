@@ -90,7 +90,7 @@ void WindowSurface::close(const QRect& touched, ShownBy shownBy) {
         if (m_alias.isNull()) {
             writeCopy(touched);
         }
-        if (shownBy == ShownBy::flush) {
+        if (shownBy == ShownBy::Flush) {
             showLater(touched);
         }
     }
@@ -139,7 +139,7 @@ bool keepsItsPixels(const QWidget& child, WindowPart part) {
     if (child.isHidden() || child.isWindow() || qobject_cast<const QGroupBox*>(&child)) {
         return false;
     }
-    return part == WindowPart::client || !qobject_cast<const QMenuBar*>(&child);
+    return part == WindowPart::Client || !qobject_cast<const QMenuBar*>(&child);
 }
 
 void subtractChildren(QRegion& region, const QWidget& widget, WindowPart part) {
@@ -173,7 +173,7 @@ void subtractDocumentsInFront(QRegion& region, const QWidget& widget) {
 
 QRegion drawableRegion(const QWidget& widget, WindowPart part) {
     QRegion region = widget.visibleRegion();
-    if (part == WindowPart::whole) {
+    if (part == WindowPart::Whole) {
         // The toolkit's visible region leaves opaque children out, the menu bar too.
         region = QRegion(widget.rect());
         for (const QWidget* level = &widget; !level->isWindow(); level = level->parentWidget()) {
@@ -233,7 +233,7 @@ void WindowTarget::release() {
 // A paint event
 
 PaintTarget::PaintTarget(QWidget& widget, const QRegion& update, std::function<QRect()> area)
-    : m_widget(&widget), m_update(update), m_area(area), m_window(widget, WindowPart::client, std::move(area)) {
+    : m_widget(&widget), m_update(update), m_area(area), m_window(widget, WindowPart::Client, std::move(area)) {
     m_window.limit = update;
     if (!widget.testAttribute(Qt::WA_WState_InPaintEvent)) {
         return; // nothing is being painted: `update` limits what can be drawn
@@ -244,7 +244,7 @@ PaintTarget::PaintTarget(QWidget& widget, const QRegion& update, std::function<Q
     }
     m_surface = &WindowSurface::of(widget);
     m_surface->beginPaint();
-    m_window.shownBy = WindowSurface::ShownBy::toolkit;
+    m_window.shownBy = WindowSurface::ShownBy::Toolkit;
     m_window.layoutIsFixed = true;
 }
 

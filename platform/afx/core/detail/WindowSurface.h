@@ -30,7 +30,7 @@ public:
     /// @param wanted the part that may be read or drawn, for windows whose pixels have to be copied
     [[nodiscard]] QImage* open(const QRect& wanted);
     /// Who shows what was drawn: `flush`, or the toolkit at the end of its paint event.
-    enum class ShownBy { flush, toolkit };
+    enum class ShownBy { Flush, Toolkit };
     /// Ends what `open` began, with the part that was changed.
     void close(const QRect& touched, ShownBy shownBy);
     /// Shows what was drawn since the last time.
@@ -62,8 +62,8 @@ private:
 
 /// What a window's context covers.
 enum class WindowPart {
-    client, ///< child widgets keep their pixels
-    whole   ///< the same, but the menu bar belongs to the frame
+    Client, ///< child widgets keep their pixels
+    Whole   ///< the same, but the menu bar belongs to the frame
 };
 
 /// A part of a widget to draw on.
@@ -79,7 +79,7 @@ public:
 
     /// Nothing outside of this, in the widget's coordinates, is drawn.
     std::optional<QRegion> limit;
-    WindowSurface::ShownBy shownBy = WindowSurface::ShownBy::flush;
+    WindowSurface::ShownBy shownBy = WindowSurface::ShownBy::Flush;
     /// Whether windows are laid out as they are until the target's end, so that what is visible is found out once.
     bool layoutIsFixed = false;
 

@@ -105,7 +105,7 @@ bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
         }
         return false;
     };
-    const auto named = systemPath(fileName, PathUse::creating);
+    const auto named = systemPath(fileName, PathUse::Creating);
     if (!named) {
         return fail(ENOENT);
     }

@@ -12,7 +12,7 @@ int wrapped(std::int64_t value, int by) {
 }
 
 void fillRow(Pixel* pixels, int count, Pixel color, Rop2 rop) {
-    if (rop == Rop2::copy) {
+    if (rop == Rop2::Copy) {
         std::fill_n(pixels, count, color);
         return;
     }

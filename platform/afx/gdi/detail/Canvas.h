@@ -22,11 +22,11 @@ constexpr COLORREF colorOf(Pixel pixel) {
     return RGB(static_cast<int>(pixel >> 16), static_cast<int>(pixel >> 8), static_cast<int>(pixel));
 }
 
-enum class PixelFormat { color, monochrome };
+enum class PixelFormat { Color, Monochrome };
 
 /// The colour nearest to `pixel` in a format: black or white by brightness in a monochrome one.
 constexpr Pixel nearest(Pixel pixel, PixelFormat format) {
-    if (format == PixelFormat::color) {
+    if (format == PixelFormat::Color) {
         return pixel | opaque;
     }
     const unsigned brightness = ((pixel >> 16) & 0xFF) * 299 + ((pixel >> 8) & 0xFF) * 587 + (pixel & 0xFF) * 114;
@@ -36,7 +36,7 @@ constexpr Pixel nearest(Pixel pixel, PixelFormat format) {
 /// What an area is drawn with: one colour or a repeated picture, and how it combines with what is there.
 struct Ink {
     Pixel color = blackPixel;
-    Rop2 rop = Rop2::copy;
+    Rop2 rop = Rop2::Copy;
     const QImage* pattern = nullptr; ///< Format_ARGB32; pixels with alpha 0 leave the target alone
     QPoint patternOrigin;            ///< in the coordinates of the target's context
 
@@ -51,7 +51,7 @@ public:
     QImage* image = nullptr;
     QPoint origin; ///< where (0, 0) of the context lies in the image
     QRegion clip;  ///< in the context's coordinates, inside the image
-    PixelFormat format = PixelFormat::color;
+    PixelFormat format = PixelFormat::Color;
 
     /// What has been changed so far, in the context's coordinates.
     [[nodiscard]] QRect touched() const {

@@ -55,7 +55,7 @@ DeviceContext::~DeviceContext() {
 }
 
 MemoryTarget* DeviceContext::memory() const {
-    return kind == DcKind::memory ? static_cast<MemoryTarget*>(target.get()) : nullptr;
+    return kind == DcKind::Memory ? static_cast<MemoryTarget*>(target.get()) : nullptr;
 }
 
 std::shared_ptr<const RealizedFont> DeviceContext::font() const {
@@ -144,7 +144,7 @@ std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, Q
     const Pixel back = ink(state.backColor).color;
     if (description.lbStyle == BS_HATCHED) {
         pattern = hatchImage(static_cast<int>(description.lbHatch), result.color, state.backMode == OPAQUE ? back : 0);
-    } else if (brush.patternFormat == PixelFormat::monochrome) {
+    } else if (brush.patternFormat == PixelFormat::Monochrome) {
         pattern = recolored(brush.pattern, ink(state.textColor).color, back);
     } else {
         pattern = brush.pattern;

@@ -22,7 +22,7 @@ public:
     [[nodiscard]] virtual QSize size() const = 0;
     /// Colour format of bitmaps that are compatible with the target.
     [[nodiscard]] virtual PixelFormat format() const {
-        return PixelFormat::color;
+        return PixelFormat::Color;
     }
     /// Shows what was drawn; called when the context is released.
     virtual void release() {}
@@ -51,7 +51,7 @@ public:
     [[nodiscard]] QSize size() const override;
 };
 
-enum class DcKind { memory, window, paint, screen };
+enum class DcKind { Memory, Window, Paint, Screen };
 
 /// What `SaveDC` remembers.
 struct DcState {
@@ -97,7 +97,7 @@ public:
     [[nodiscard]] std::optional<Ink> brushInk(QImage& pattern) const;
     [[nodiscard]] std::optional<Ink> brushInk(const BrushObject& brush, Rop2 rop, QImage& pattern) const;
     /// `color` as the target can show it.
-    [[nodiscard]] Ink ink(COLORREF color, Rop2 rop = Rop2::copy) const;
+    [[nodiscard]] Ink ink(COLORREF color, Rop2 rop = Rop2::Copy) const;
 };
 
 [[nodiscard]] TVX_PLATFORM_API HDC addContext(std::shared_ptr<DeviceContext> context);

@@ -23,7 +23,7 @@ struct PenObject {
 struct BrushObject {
     LOGBRUSH description{};
     QImage pattern; ///< of a pattern brush, Format_RGB32
-    PixelFormat patternFormat = PixelFormat::color;
+    PixelFormat patternFormat = PixelFormat::Color;
     int systemColor = -1; ///< follows the palette when 0 or above
 };
 
@@ -33,7 +33,7 @@ struct FontObject {
 
 struct BitmapObject {
     QImage image; ///< Format_RGB32
-    PixelFormat format = PixelFormat::color;
+    PixelFormat format = PixelFormat::Color;
     HDC selectedInto = nullptr;
 };
 
@@ -41,12 +41,12 @@ struct RegionObject {
     QRegion region;
 };
 
-enum class GdiOwner { host, stock };
+enum class GdiOwner { Host, Stock };
 
 /// A drawing tool of any kind.
 struct GdiObject {
     std::variant<PenObject, BrushObject, FontObject, BitmapObject, RegionObject> value;
-    GdiOwner owner = GdiOwner::host;
+    GdiOwner owner = GdiOwner::Host;
 
     [[nodiscard]] DWORD type() const;
 };
@@ -71,7 +71,7 @@ struct Tool {
 [[nodiscard]] TVX_PLATFORM_API HandleTable<GdiObject>& gdiObjects();
 
 template <class T>
-[[nodiscard]] HGDIOBJ addGdiObject(T value, GdiOwner owner = GdiOwner::host) {
+[[nodiscard]] HGDIOBJ addGdiObject(T value, GdiOwner owner = GdiOwner::Host) {
     auto object = std::make_shared<GdiObject>(GdiObject{std::move(value), owner});
     return reinterpret_cast<HGDIOBJ>(gdiObjects().add(std::move(object)));
 }
@@ -93,7 +93,7 @@ template <class T>
 /// A bitmap of black pixels; null handle for sizes that cannot be had.
 [[nodiscard]] HBITMAP addBitmap(int width, int height, PixelFormat format);
 /// A bitmap with these pixels. Takes any format of image.
-[[nodiscard]] TVX_PLATFORM_API HBITMAP addBitmap(const QImage& image, PixelFormat format = PixelFormat::color);
+[[nodiscard]] TVX_PLATFORM_API HBITMAP addBitmap(const QImage& image, PixelFormat format = PixelFormat::Color);
 /// The pixels of a bitmap, null image for a handle that is none.
 [[nodiscard]] TVX_PLATFORM_API QImage bitmapImage(HBITMAP bitmap);
 

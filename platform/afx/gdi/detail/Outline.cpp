@@ -94,7 +94,7 @@ void Outline::wide(const QPainterPath& path) {
     // Points mean centres of pixels.
     const QList<QPolygonF> areas = stroker.createStroke(path.translated(0.5, 0.5)).toSubpathPolygons();
     m_canvas.fill(
-        polygonSpans({areas.data(), static_cast<std::size_t>(areas.size())}, FillRule::winding, m_canvas.bounds()),
+        polygonSpans({areas.data(), static_cast<std::size_t>(areas.size())}, FillRule::Winding, m_canvas.bounds()),
         *m_ink);
 }
 
@@ -109,7 +109,7 @@ void Outline::line(const QPolygon& points, LastPoint last) {
         return;
     }
     thin(points);
-    if (last == LastPoint::drawn) {
+    if (last == LastPoint::Drawn) {
         addPixel(points.last(), m_phase);
     }
     plotPixels();
@@ -135,7 +135,7 @@ void Outline::rectangle(const QRect& box) {
     if (isWide()) {
         rounded(box, {}, {});
     } else if (box.width() == 1 || box.height() == 1) {
-        line(QPolygon({box.topLeft(), box.bottomRight()}), LastPoint::drawn);
+        line(QPolygon({box.topLeft(), box.bottomRight()}), LastPoint::Drawn);
     } else {
         closed(QPolygon({box.topLeft(), box.topRight(), box.bottomRight(), box.bottomLeft()}));
     }

@@ -12,9 +12,9 @@ class Outline {
 public:
     Outline(const DeviceContext& context, Canvas& canvas);
 
-    enum class LastPoint { left, drawn };
+    enum class LastPoint { Left, Drawn };
     /// An open line through points.
-    void line(const QPolygon& points, LastPoint last = LastPoint::left);
+    void line(const QPolygon& points, LastPoint last = LastPoint::Left);
     /// A closed line through points.
     void closed(const QPolygon& points);
     /// Along the inside of a rectangle.

@@ -225,7 +225,7 @@ int firstPixel(double x, const QRect& bounds) {
 void appendRow(Spans& spans, int y, std::span<const Crossing> crossings, FillRule rule, const QRect& bounds) {
     int winding = 0;
     for (std::size_t i = 0; i + 1 < crossings.size(); ++i) {
-        winding += rule == FillRule::winding ? crossings[i].direction : (winding ? -1 : 1);
+        winding += rule == FillRule::Winding ? crossings[i].direction : (winding ? -1 : 1);
         const int left = firstPixel(crossings[i].x, bounds);
         const int right = firstPixel(crossings[i + 1].x, bounds);
         if (winding == 0 || left >= right) {

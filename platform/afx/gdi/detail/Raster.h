@@ -95,7 +95,7 @@ void LinePixels::forEach(Range range, Plot plot) const {
 /// the left end of the top row, each pixel once.
 [[nodiscard]] TVX_PLATFORM_API std::vector<QPoint> outlineOf(const Spans& rows);
 
-enum class FillRule { alternate, winding };
+enum class FillRule { Alternate, Winding };
 
 /// Pixels whose centre lies inside closed polygons: of edges on pixel borders the left and top ones belong to the
 /// shape, the right and bottom ones do not. Only rows of `bounds` are looked at.

@@ -14,7 +14,7 @@ constexpr Pixel blackPixel = opaque;
 constexpr Pixel whitePixel = 0xFFFFFFFFU;
 
 /// A binary operation of pen (or brush) and destination: bit `pen * 2 + destination` of the table, 0..15.
-enum class Rop2 : std::uint8_t { black = 0, notDestination = 5, xorPen = 6, nop = 10, copy = 12, white = 15 };
+enum class Rop2 : std::uint8_t { Black = 0, NotDestination = 5, XorPen = 6, Nop = 10, Copy = 12, White = 15 };
 
 /// A ternary operation: bit `brush * 4 + source * 2 + destination` of the table, 0..255.
 using Rop3 = std::uint8_t;

@@ -51,7 +51,7 @@ void TextLine::fillBackground(Canvas& canvas, QPoint left, const Ink& ink) const
     QTransform turned = QTransform::fromTranslate(left.x(), left.y());
     turned.rotate(-m_font.angle);
     const std::array polygons = {turned.map(QPolygonF(QRectF(cell)))};
-    canvas.fill(polygonSpans(polygons, FillRule::winding, canvas.bounds()), ink);
+    canvas.fill(polygonSpans(polygons, FillRule::Winding, canvas.bounds()), ink);
 }
 
 void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
@@ -61,7 +61,7 @@ void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
     QPainter painter(canvas.image);
     painter.setClipRegion(canvas.clip.translated(canvas.origin));
     QFont font = m_font.font;
-    if (canvas.format == PixelFormat::monochrome) {
+    if (canvas.format == PixelFormat::Monochrome) {
         font.setStyleStrategy(static_cast<QFont::StyleStrategy>(QFont::NoAntialias | QFont::PreferNoShaping));
     }
     painter.setFont(font);

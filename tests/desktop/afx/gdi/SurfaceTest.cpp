@@ -18,8 +18,8 @@ constexpr int patience = 5000;
 
 HDC openContext(QWidget& widget) {
     return addContext(std::make_shared<DeviceContext>(
-        DcKind::window,
-        std::make_unique<WindowTarget>(widget, WindowPart::client, [&widget] { return widget.rect(); })));
+        DcKind::Window,
+        std::make_unique<WindowTarget>(widget, WindowPart::Client, [&widget] { return widget.rect(); })));
 }
 
 QColor shown(const QWidget& widget, int x, int y) {

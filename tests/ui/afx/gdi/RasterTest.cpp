@@ -111,7 +111,7 @@ Spans fill(const std::vector<QPolygonF>& polygons, FillRule rule) {
 
 TEST(PolygonSpans, LeaveTheRightAndBottomEdgesOut) {
     const QPolygonF square({{1, 1}, {4, 1}, {4, 3}, {1, 3}});
-    EXPECT_EQ(fill({square}, FillRule::alternate), (Spans{{1, 1, 4}, {2, 1, 4}}));
+    EXPECT_EQ(fill({square}, FillRule::Alternate), (Spans{{1, 1, 4}, {2, 1, 4}}));
 }
 
 TEST(PolygonSpans, OfNeighboursNeitherOverlapNorLeaveGaps) {
@@ -119,11 +119,11 @@ TEST(PolygonSpans, OfNeighboursNeitherOverlapNorLeaveGaps) {
     std::map<std::pair<int, int>, int> covered;
     for (const auto& triangle :
          {QPolygonF({a, b, middle}), QPolygonF({b, c, middle}), QPolygonF({c, d, middle}), QPolygonF({d, a, middle})}) {
-        for (const QPoint point : setOf(fill({triangle}, FillRule::winding))) {
+        for (const QPoint point : setOf(fill({triangle}, FillRule::Winding))) {
             ++covered[{point.x(), point.y()}];
         }
     }
-    const PointSet whole = setOf(fill({QPolygonF({a, b, c, d})}, FillRule::winding));
+    const PointSet whole = setOf(fill({QPolygonF({a, b, c, d})}, FillRule::Winding));
     EXPECT_EQ(covered.size(), whole.size());
     for (const auto& [point, times] : covered) {
         EXPECT_EQ(times, 1) << point.first << ',' << point.second;
@@ -133,10 +133,10 @@ TEST(PolygonSpans, OfNeighboursNeitherOverlapNorLeaveGaps) {
 TEST(PolygonSpans, FollowTheFillRule) {
     const QPolygonF outer({{0, 0}, {9, 0}, {9, 9}, {0, 9}});
     const QPolygonF inner({{3, 3}, {6, 3}, {6, 6}, {3, 6}});
-    EXPECT_EQ(setOf(fill({outer, inner}, FillRule::alternate)).size(), 81U - 9U);
-    EXPECT_EQ(setOf(fill({outer, inner}, FillRule::winding)).size(), 81U);
+    EXPECT_EQ(setOf(fill({outer, inner}, FillRule::Alternate)).size(), 81U - 9U);
+    EXPECT_EQ(setOf(fill({outer, inner}, FillRule::Winding)).size(), 81U);
     const QPolygonF turned({{3, 3}, {3, 6}, {6, 6}, {6, 3}});
-    EXPECT_EQ(setOf(fill({outer, turned}, FillRule::winding)).size(), 81U - 9U);
+    EXPECT_EQ(setOf(fill({outer, turned}, FillRule::Winding)).size(), 81U - 9U);
 }
 
 TEST(RasterOperations, AreTheTruthTablesOfTheirCodes) {
@@ -151,9 +151,9 @@ TEST(RasterOperations, AreTheTruthTablesOfTheirCodes) {
         // Seen as bits of pen and destination: 3 2 1 0.
         EXPECT_EQ(combine(rop2FromCode(code), 0xC, 0xA) & 0xF, static_cast<unsigned>(code - 1));
     }
-    EXPECT_EQ(rop2FromRop3(0x5A), Rop2::xorPen);
-    EXPECT_EQ(rop2FromRop3(0x55), Rop2::notDestination);
-    EXPECT_EQ(rop2FromRop3(0xF0), Rop2::copy);
+    EXPECT_EQ(rop2FromRop3(0x5A), Rop2::XorPen);
+    EXPECT_EQ(rop2FromRop3(0x55), Rop2::NotDestination);
+    EXPECT_EQ(rop2FromRop3(0xF0), Rop2::Copy);
 }
 
 } // namespace

@@ -30,8 +30,8 @@ TEST(ScaledSurface, DrawsAndReadsInUnscaledPixels) {
     ASSERT_EQ(window.devicePixelRatio(), 2);
     CDC dc;
     dc.Attach(addContext(std::make_shared<DeviceContext>(
-        DcKind::window,
-        std::make_unique<WindowTarget>(window, WindowPart::client, [&window] { return window.rect(); }))));
+        DcKind::Window,
+        std::make_unique<WindowTarget>(window, WindowPart::Client, [&window] { return window.rect(); }))));
     EXPECT_EQ(dc.GetPixel(50, 50), RGB(0, 255, 0));
     dc.FillSolidRect(10, 10, 20, 20, RGB(255, 0, 0));
     dc.PatBlt(20, 10, 10, 20, DSTINVERT);

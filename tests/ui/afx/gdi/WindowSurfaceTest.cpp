@@ -48,8 +48,8 @@ protected:
 /// A context on a widget, as the window core makes them.
 class WidgetDc : public CDC {
 public:
-    explicit WidgetDc(QWidget& widget, WindowPart part = WindowPart::client)
-        : WidgetDc(std::make_unique<WindowTarget>(widget, part, [&widget] { return widget.rect(); }), DcKind::window) {}
+    explicit WidgetDc(QWidget& widget, WindowPart part = WindowPart::Client)
+        : WidgetDc(std::make_unique<WindowTarget>(widget, part, [&widget] { return widget.rect(); }), DcKind::Window) {}
     WidgetDc(std::unique_ptr<DrawTarget> target, DcKind kind) {
         Attach(addContext(std::make_shared<DeviceContext>(kind, std::move(target))));
     }
@@ -59,7 +59,7 @@ public:
 class WidgetPaintDc : public WidgetDc {
 public:
     WidgetPaintDc(QWidget& widget, const QRegion& update)
-        : WidgetDc(std::make_unique<PaintTarget>(widget, update, [&widget] { return widget.rect(); }), DcKind::paint) {}
+        : WidgetDc(std::make_unique<PaintTarget>(widget, update, [&widget] { return widget.rect(); }), DcKind::Paint) {}
 };
 
 /// What the screen shows of a window.
@@ -239,7 +239,7 @@ TEST_F(Surface, CoversTheMenuBarInContextsOfWholeWindows) {
     bar.setGeometry(0, 0, 200, 20);
     bar.show();
     settle();
-    WidgetDc client(window), whole(window, WindowPart::whole);
+    WidgetDc client(window), whole(window, WindowPart::Whole);
     client.FillSolidRect(0, 0, 200, 30, plainRed);
     EXPECT_EQ(client.GetPixel(5, 5), CLR_INVALID);
     whole.FillSolidRect(0, 0, 10, 10, plainBlue);
