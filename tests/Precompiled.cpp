@@ -1,0 +1,2 @@
+// A program for the precompiled headers to belong to.
+int main() {}
