@@ -1,6 +1,6 @@
 #include "s/WinApp.h"
 
-#include "platform/afx/dialogs/MessageBox.h"
+#include "platform/afx/core/LastReport.h"
 #include "platform/port/Exception.h"
 #include "res/resource.h"
 #include "s/Msg.h"

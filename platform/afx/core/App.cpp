@@ -2,7 +2,6 @@
 
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
-#include "platform/afx/dialogs/MessageBox.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Exception.h"
@@ -194,12 +193,36 @@ void CWinApp::OnContextHelp() {
     OnHelp();
 }
 
+namespace {
+
+/// Takes the wait cursor away as long as it lives, for the time that the user is asked something.
+class WaitCursorPause {
+public:
+    WaitCursorPause() {
+        change(Qt::ArrowCursor);
+    }
+    ~WaitCursorPause() {
+        change(Qt::WaitCursor);
+    }
+    WaitCursorPause(const WaitCursorPause&) = delete;
+    WaitCursorPause& operator=(const WaitCursorPause&) = delete;
+
+private:
+    static void change(Qt::CursorShape shape) {
+        if (QCoreApplication::instance() && QApplication::overrideCursor()) {
+            QApplication::changeOverrideCursor(shape);
+        }
+    }
+};
+
+} // namespace
+
 int CWinApp::DoMessageBox(LPCSTR text, UINT type, UINT) {
     const CWnd* over = CWnd::GetActiveWindow();
     if (!over) {
         over = GetMainWnd();
     }
-    CWaitCursorPause pause(*this);
+    const WaitCursorPause pause;
     return ::MessageBoxA(over ? over->m_hWnd : nullptr, text, m_pszAppName ? m_pszAppName : AfxGetAppName(), type);
 }
 

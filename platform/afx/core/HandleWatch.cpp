@@ -1,6 +1,7 @@
 #include "platform/afx/core/HandleWatch.h"
 
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/HandleWatches.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/win/detail/KernelObject.h"
@@ -30,7 +31,7 @@ public:
     Watch(HWND window, UINT message) : m_window(window), m_message(message) {
         m_nextFrame.setSingleShot(true);
         m_nextFrame.setTimerType(Qt::PreciseTimer);
-        connect(&m_nextFrame, &QTimer::timeout, this, &Watch::post);
+        connectStoring(&m_nextFrame, &QTimer::timeout, this, [this] { post(); });
     }
     ~Watch() override {
         disarm();
@@ -52,7 +53,7 @@ public:
         m_objects = std::move(objects);
         for (const auto& object : m_objects) {
             auto* notifier = new QSocketNotifier(object->descriptor(), QSocketNotifier::Read, this);
-            connect(notifier, &QSocketNotifier::activated, this, &Watch::signalled);
+            connectStoring(notifier, &QSocketNotifier::activated, this, [this] { signalled(); });
             m_notifiers.push_back(notifier);
         }
     }
@@ -127,7 +128,7 @@ void watchReleasedChildren() {
         return;
     }
     auto* notifier = new QSocketNotifier(children.bell(), QSocketNotifier::Read, QCoreApplication::instance());
-    QObject::connect(notifier, &QSocketNotifier::activated, [&children] { children.collect(); });
+    connectStoring(notifier, &QSocketNotifier::activated, notifier, [&children] { children.collect(); });
 }
 
 } // namespace tvx::afx

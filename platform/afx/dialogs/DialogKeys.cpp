@@ -1,4 +1,5 @@
 #include "platform/afx/dialogs/detail/DialogKeys.h"
+#include "platform/afx/core/detail/Group.h"
 
 #include "platform/afx/controls/detail/Control.h"
 #include "platform/afx/core/ControlMessages.h"
@@ -54,20 +55,6 @@ Window* focusIn(const Window& dialog) {
 }
 
 } // namespace
-
-std::vector<Window*> dialogGroup(const Window& control) {
-    if (!control.parent()) {
-        return {};
-    }
-    const auto& siblings = control.parent()->children();
-    auto first = std::find(siblings.begin(), siblings.end(), &control);
-    const auto startsGroup = [](const Window* window) { return (window->style() & WS_GROUP) != 0; };
-    auto last = std::find_if(std::next(first), siblings.end(), startsGroup);
-    while (first != siblings.begin() && !startsGroup(*first)) {
-        --first;
-    }
-    return {first, last};
-}
 
 Window* nextTabItem(Window& dialog, const Window* from, Direction direction) {
     std::vector<Window*> controls;

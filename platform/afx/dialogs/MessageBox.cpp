@@ -1,5 +1,6 @@
-#include "platform/afx/dialogs/MessageBox.h"
+#include "platform/afx/core/App.h"
 
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -151,7 +152,7 @@ private:
         QPushButton* button = QMessageBox::addButton(ownText(entry.label), QMessageBox::ActionRole);
         const int answer = entry.answer;
         QObject::disconnect(button, nullptr, this, nullptr);
-        QObject::connect(button, &QPushButton::clicked, this, [this, answer] { finish(answer); });
+        connectStoring(button, &QPushButton::clicked, this, [this, answer] { finish(answer); });
         if (answer == defaultOf(m_type).answer) {
             setDefaultButton(button);
         }
@@ -239,18 +240,6 @@ BOOL MessageBeep(UINT) {
         QApplication::beep();
     }
     return TRUE;
-}
-
-CWaitCursorPause::CWaitCursorPause(CWinApp& app) {
-    if (QCoreApplication::instance() && QApplication::overrideCursor()) {
-        QApplication::changeOverrideCursor(Qt::ArrowCursor);
-    }
-}
-
-CWaitCursorPause::~CWaitCursorPause() {
-    if (QCoreApplication::instance() && QApplication::overrideCursor()) {
-        QApplication::changeOverrideCursor(Qt::WaitCursor);
-    }
 }
 
 namespace {

@@ -1,5 +1,6 @@
 #include "platform/afx/frames/ToolBar.h"
 
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
@@ -185,15 +186,12 @@ void CToolBar::rebuild() {
                 widget->setAccessibleName(toQt(text.tip.IsEmpty() ? text.prompt : text.tip));
             }
             const UINT id = button.id;
-            QObject::connect(action, &QAction::triggered, tools, [this, id] {
-                storing([&] {
-                    armIdle();
-                    const CWnd* owner = GetOwner();
-                    if (owner) {
-                        owner->SendMessage(WM_COMMAND, MAKEWPARAM(static_cast<int>(id), 0),
-                                           reinterpret_cast<LPARAM>(m_hWnd));
-                    }
-                });
+            connectStoring(action, &QAction::triggered, tools, [this, id] {
+                armIdle();
+                if (const CWnd* owner = GetOwner()) {
+                    owner->SendMessage(WM_COMMAND, MAKEWPARAM(static_cast<int>(id), 0),
+                                       reinterpret_cast<LPARAM>(m_hWnd));
+                }
             });
         }
     });

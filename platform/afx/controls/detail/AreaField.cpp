@@ -1,5 +1,6 @@
 #include "platform/afx/controls/detail/HostText.h"
 #include "platform/afx/controls/detail/TextField.h"
+#include "platform/afx/core/detail/Connect.h"
 
 #include <QAbstractTextDocumentLayout>
 #include <QPlainTextEdit>
@@ -20,14 +21,14 @@ public:
     AreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed)
         : m_edit(new QPlainTextEdit(parent)), m_wraps(options.wraps) {
         count(0, 0);
-        QObject::connect(m_edit->document(), &QTextDocument::contentsChange, m_edit,
-                         [this](int position, int, int added) { count(position, added); });
+        connectStoring(m_edit->document(), &QTextDocument::contentsChange, m_edit,
+                       [this](int position, int, int added) { count(position, added); });
         m_edit->setTabChangesFocus(false);
         m_edit->setLineWrapMode(options.wraps ? QPlainTextEdit::WidgetWidth : QPlainTextEdit::NoWrap);
         m_edit->setVerticalScrollBarPolicy(policy(options.verticalBar));
         m_edit->setHorizontalScrollBarPolicy(policy(options.horizontalBar));
         m_edit->document()->setDocumentMargin(2);
-        QObject::connect(m_edit, &QPlainTextEdit::textChanged, m_edit, [changed = std::move(changed)] { changed(); });
+        connectStoring(m_edit, &QPlainTextEdit::textChanged, m_edit, std::move(changed));
     }
     QWidget* widget() const override {
         return m_edit;

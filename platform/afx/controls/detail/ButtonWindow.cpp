@@ -1,8 +1,9 @@
 #include "platform/afx/controls/detail/ButtonWindow.h"
 
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Group.h"
 #include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/dialogs/detail/DialogKeys.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
 #include <QCheckBox>
@@ -104,7 +105,7 @@ QWidget* ButtonWindow::makeWidget(QWidget* parent) {
     if (pushLike) {
         made->setCheckable(true);
     }
-    QObject::connect(made, &QAbstractButton::clicked, made, [this] { click(); });
+    connectStoring(made, &QAbstractButton::clicked, made, [this] { click(); });
     return made;
 }
 

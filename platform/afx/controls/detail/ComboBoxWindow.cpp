@@ -2,6 +2,7 @@
 
 #include "platform/afx/controls/detail/EditWindow.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 
@@ -159,11 +160,11 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     face->setItemDelegate(new ItemDelegate(face, *this));
     face->setInsertPolicy(QComboBox::NoInsert);
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
-    QObject::connect(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
+    connectStoring(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
     if (isEditable()) {
         face->setEditable(true);
         face->setCompleter(nullptr);
-        QObject::connect(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
+        connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
             const HWND self = handle();
             notify(CBN_EDITUPDATE);
             if (from(self)) {

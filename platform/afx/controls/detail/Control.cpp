@@ -2,7 +2,6 @@
 
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/dialogs/detail/DialogWindow.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/gdi/detail/DeviceContext.h"
@@ -138,7 +137,9 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_SETFOCUS:
     case WM_KILLFOCUS: {
         const HWND self = handle();
-        tellDialogFocus(*this, message == WM_SETFOCUS);
+        for (Window* around = parent(); around; around = around->parent()) {
+            around->focusMovedWithin(*this, message == WM_SETFOCUS);
+        }
         if (from(self)) {
             focusMoved(message == WM_SETFOCUS);
         }

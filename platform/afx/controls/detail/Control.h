@@ -12,6 +12,9 @@
 
 namespace tvx::afx {
 
+/// The class that stands for control classes nobody has registered: an empty frame.
+inline constexpr const char* emptyPaneClass = "TvxEmptyPane";
+
 /// The toolkit's font for a handle; the user-interface font for null.
 TVX_PLATFORM_API QFont toolkitFont(HFONT font);
 

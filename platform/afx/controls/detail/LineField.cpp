@@ -1,5 +1,6 @@
 #include "platform/afx/controls/detail/HostText.h"
 #include "platform/afx/controls/detail/TextField.h"
+#include "platform/afx/core/detail/Connect.h"
 
 #include <QLineEdit>
 
@@ -13,7 +14,7 @@ class LineField : public TextField {
 public:
     LineField(QWidget* parent, std::function<void()> changed) : m_edit(new QLineEdit(parent)) {
         m_edit->setMaxLength(std::numeric_limits<int>::max()); // the limit is counted in bytes, by the control
-        QObject::connect(m_edit, &QLineEdit::textChanged, m_edit, [changed = std::move(changed)] { changed(); });
+        connectStoring(m_edit, &QLineEdit::textChanged, m_edit, std::move(changed));
     }
     QWidget* widget() const override {
         return m_edit;

@@ -3,7 +3,7 @@
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/dialogs/detail/DialogWindow.h"
+#include "platform/afx/gdi/detail/Fonts.h"
 #include "platform/base/Text.h"
 
 #include <QAbstractScrollArea>

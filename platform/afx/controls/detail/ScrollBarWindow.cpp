@@ -1,4 +1,6 @@
 #include "platform/afx/controls/detail/ScrollBarWindow.h"
+#include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/ScrollCode.h"
 
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
@@ -17,31 +19,12 @@ const WindowClassEntry scrollBarEntry("ScrollBar", &makeScrollBar);
 
 } // namespace
 
-int scrollCodeOf(int action) {
-    switch (action) {
-    case QAbstractSlider::SliderSingleStepAdd:
-        return SB_LINEDOWN;
-    case QAbstractSlider::SliderSingleStepSub:
-        return SB_LINEUP;
-    case QAbstractSlider::SliderPageStepAdd:
-        return SB_PAGEDOWN;
-    case QAbstractSlider::SliderPageStepSub:
-        return SB_PAGEUP;
-    case QAbstractSlider::SliderToMinimum:
-        return SB_TOP;
-    case QAbstractSlider::SliderToMaximum:
-        return SB_BOTTOM;
-    default:
-        return SB_THUMBTRACK;
-    }
-}
-
 QWidget* ScrollBarWindow::makeWidget(QWidget* parent) {
     auto* bar = new QScrollBar((style() & SBS_VERT) != 0 ? Qt::Vertical : Qt::Horizontal, parent);
     bar->setRange(0, 0);
     bar->setInvertedControls(bar->orientation() == Qt::Vertical);
     // The parent decides where the slider stands; the toolkit's own idea is put back before it acts on it.
-    QObject::connect(bar, &QScrollBar::actionTriggered, bar, [this, bar](int action) {
+    connectStoring(bar, &QScrollBar::actionTriggered, bar, [this, bar](int action) {
         const int code = scrollCodeOf(action);
         const int position = bar->sliderPosition();
         if (code != SB_THUMBTRACK) {
@@ -49,7 +32,7 @@ QWidget* ScrollBarWindow::makeWidget(QWidget* parent) {
         }
         tell(code, position);
     });
-    QObject::connect(bar, &QScrollBar::sliderReleased, bar, [this, bar] {
+    connectStoring(bar, &QScrollBar::sliderReleased, bar, [this, bar] {
         const HWND self = handle();
         tell(SB_THUMBPOSITION, bar->sliderPosition());
         if (from(self)) {

@@ -9,10 +9,6 @@ class QScrollBar;
 
 namespace tvx::afx {
 
-/// The SB_... code of WM_HSCROLL and WM_VSCROLL for what the user did to a bar.
-/// @param action  the toolkit's QAbstractSlider::SliderAction
-[[nodiscard]] int scrollCodeOf(int action);
-
 /// The "ScrollBar" class: tells its parent by WM_HSCROLL or WM_VSCROLL where the user wants to go. The parent moves the
 /// slider.
 class TVX_PLATFORM_API ScrollBarWindow : public Control {

@@ -1,6 +1,8 @@
 #include "platform/afx/core/detail/Dispatch.h"
 
 #include "platform/afx/core/App.h"
+#include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/HandleWatches.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MessageQueue.h"
 #include "platform/afx/core/detail/Timers.h"
@@ -142,18 +144,29 @@ void runIdle() {
         return;
     }
     idleDue = false;
-    try {
-        const bool more = thread->OnIdle(idleCount) != FALSE;
-        ++idleCount;
-        if (more) {
-            idleDue = true;
-            QAbstractEventDispatcher::instance()->wakeUp();
-        }
-    } catch (...) {
-        // The dispatcher's signal is no event, so nothing else catches here.
-        ExceptionCarrier::store(std::current_exception());
+    const bool more = thread->OnIdle(idleCount) != FALSE;
+    ++idleCount;
+    if (more) {
+        idleDue = true;
+        QAbstractEventDispatcher::instance()->wakeUp();
     }
 }
+
+namespace {
+
+void startOnGuiThread() {
+    connectStoring(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, qApp, &runIdle);
+    MessageQueue::instance().moveToThread(QThread::currentThread());
+    watchReleasedChildren();
+}
+
+struct HooksEntry {
+    HooksEntry() {
+        setGuiHooks({&translateEvent, &ExceptionCarrier::store, &startOnGuiThread});
+    }
+} const hooksEntry;
+
+} // namespace
 
 } // namespace tvx::afx
 

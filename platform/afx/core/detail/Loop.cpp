@@ -1,7 +1,7 @@
 #include "platform/afx/core/detail/Loop.h"
 
+#include "platform/afx/core/LastReport.h"
 #include "platform/afx/core/detail/MessageQueue.h"
-#include "platform/afx/dialogs/MessageBox.h"
 #include "platform/base/Exception.h"
 
 namespace tvx::afx {

@@ -2,11 +2,11 @@
 
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
-#include "platform/afx/frames/detail/MdiWindow.h"
 #include "platform/afx/gdi/detail/ButtonImages.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/win/FrameworkIds.h"
@@ -58,9 +58,9 @@ int indexOf(const QAction& action) {
 
 PopupMenu::PopupMenu(HMENU menu, int index, const MenuHost& host, QWidget* parent)
     : QMenu(parent), m_menu(menu), m_index(index), m_host(host) {
-    connect(this, &QMenu::aboutToShow, this, [this] { storing([this] { opened(); }); });
-    connect(this, &QMenu::aboutToHide, this, [this] { storing([this] { closed(); }); });
-    connect(this, &QMenu::hovered, this, [this](QAction* action) { storing([this, action] { hovered(action); }); });
+    connectStoring(this, &QMenu::aboutToShow, this, [this] { opened(); });
+    connectStoring(this, &QMenu::aboutToHide, this, [this] { closed(); });
+    connectStoring(this, &QMenu::hovered, this, [this](QAction* action) { hovered(action); });
     fill();
 }
 
@@ -119,7 +119,7 @@ void PopupMenu::addItem(const MenuItem& item, int index) {
         action->setText(QString::fromStdString(item.text));
     } else {
         action = addAction(QString::fromStdString(item.text));
-        connect(action, &QAction::triggered, this, [this, action] { storing([this, action] { chosen(action); }); });
+        connectStoring(action, &QAction::triggered, this, [this, action] { chosen(action); });
     }
     action->setMenuRole(QAction::NoRole);
     action->setData(index);
@@ -190,15 +190,14 @@ void FrameMenuBar::addEntry(const MenuItem& item, int index) {
     QAction* action = nullptr;
     if (item.popup) {
         auto* popup = new PopupMenu(item.popup, index, m_host, this);
-        connect(popup, &QMenu::aboutToShow, popup, [this] {
-            storing([this] { SendMessageA(m_host.owner, WM_INITMENU, reinterpret_cast<WPARAM>(m_menu), 0); });
-        });
+        connectStoring(popup, &QMenu::aboutToShow, popup,
+                       [this] { SendMessageA(m_host.owner, WM_INITMENU, reinterpret_cast<WPARAM>(m_menu), 0); });
         action = addMenu(popup);
         action->setText(QString::fromStdString(item.text));
     } else {
         action = addAction(QString::fromStdString(item.text));
         const UINT id = item.id;
-        connect(action, &QAction::triggered, this, [this, id] { m_host.choose(id); });
+        connectStoring(action, &QAction::triggered, this, [this, id] { m_host.choose(id); });
     }
     action->setData(index);
     action->setEnabled(item.isEnabled());
@@ -293,7 +292,7 @@ UINT track(HMENU menu, UINT flags, QPoint at, Tracking& tracking) {
         }
     } closer{popup};
     ModalLoop loop;
-    QObject::connect(popup, &QMenu::aboutToHide, popup, [&loop] { loop.end(0); });
+    connectStoring(popup.data(), &QMenu::aboutToHide, popup, [&loop] { loop.end(0); });
     guarded([&] {
         storing([&] { popup->prepare(); });
         if (popup && !popup->actions().isEmpty()) {
@@ -375,7 +374,7 @@ void openMenuByKey(Window& window, char32_t key) {
         return;
     }
     if (key == U'-') {
-        if (Window* child = activeMdiChild(window)) {
+        if (Window* child = window.activeChildFrame()) {
             showSystemMenu(*child, fromQt(child->clientToScreen(QPoint(0, 0))));
             return;
         }

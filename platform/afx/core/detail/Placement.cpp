@@ -1,5 +1,6 @@
 #include "platform/afx/core/detail/Placement.h"
 
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Gdi.h"
@@ -31,10 +32,10 @@ bool tellsPlaces() {
 Placement::Placement(Window& window) : m_window(window) {
     m_settle.setSingleShot(true);
     m_settle.setInterval(0);
-    QObject::connect(&m_settle, &QTimer::timeout, &m_settle, [this] { storing([this] { settle(); }); });
+    connectStoring(&m_settle, &QTimer::timeout, &m_settle, [this] { settle(); });
     m_lookBack.setSingleShot(true);
     m_lookBack.setInterval(lookBackTime);
-    QObject::connect(&m_lookBack, &QTimer::timeout, &m_lookBack, [this] { storing([this] { lookBack(); }); });
+    connectStoring(&m_lookBack, &QTimer::timeout, &m_lookBack, [this] { lookBack(); });
 }
 
 QWidget& Placement::widget() const {

@@ -1,12 +1,12 @@
 #include "platform/afx/core/detail/PlainWindow.h"
 
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/win/FrameworkIds.h"
 
-#include "platform/afx/controls/detail/ScrollBarWindow.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
-#include "platform/afx/frames/detail/MdiWindow.h"
+#include "platform/afx/core/detail/ScrollCode.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
@@ -46,12 +46,19 @@ protected:
     void scrollContentsBy(int, int) override {}
 };
 
+/// Plain children until the room of the frames, which comes with the same library, has told of its kind.
+constinit WindowFactory childFrameFactory = nullptr;
+
 } // namespace
+
+void setChildFrameFactory(WindowFactory factory) {
+    childFrameFactory = factory;
+}
 
 std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs) {
     if ((static_cast<DWORD>(cs.style) & WS_CHILD) != 0) {
-        const bool childFrame = (cs.dwExStyle & WS_EX_MDICHILD) != 0;
-        return childFrame ? makeMdiChild(cs) : std::make_unique<PlainWindow>(cs);
+        const bool childFrame = childFrameFactory && (cs.dwExStyle & WS_EX_MDICHILD) != 0;
+        return childFrame ? childFrameFactory(cs) : std::make_unique<PlainWindow>(cs);
     }
     return std::make_unique<TopLevelWindow>(cs);
 }
@@ -115,7 +122,7 @@ void PlainWindow::connectBar(int bar) {
     const UINT message = bar == SB_HORZ ? WM_HSCROLL : WM_VSCROLL;
     // The toolkit would move the slider by itself; here the window decides, by SetScrollPos. Its own idea is put back
     // before it acts on it.
-    QObject::connect(slider, &QScrollBar::actionTriggered, slider, [this, slider, message](int action) {
+    connectStoring(slider, &QScrollBar::actionTriggered, slider, [this, slider, message](int action) {
         const int code = scrollCodeOf(action);
         const int position = slider->sliderPosition();
         if (code != SB_THUMBTRACK) {
@@ -124,7 +131,7 @@ void PlainWindow::connectBar(int bar) {
         armIdle();
         call(message, MAKEWPARAM(code, position));
     });
-    QObject::connect(slider, &QScrollBar::sliderReleased, slider, [this, slider, message] {
+    connectStoring(slider, &QScrollBar::sliderReleased, slider, [this, slider, message] {
         call(message, MAKEWPARAM(SB_THUMBPOSITION, slider->sliderPosition()));
         call(message, MAKEWPARAM(SB_ENDSCROLL, 0));
     });

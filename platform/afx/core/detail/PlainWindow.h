@@ -71,6 +71,9 @@ QRect frameClientRect(const QMainWindow& main);
 /// A PlainWindow for a child, a TopLevelWindow otherwise.
 TVX_PLATFORM_API std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs);
 
+/// Tells what makes children with WS_EX_MDICHILD; called when the library is loaded.
+void setChildFrameFactory(WindowFactory factory);
+
 /// The toolkit's window flags for a framework window's styles.
 TVX_PLATFORM_API Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle);
 

@@ -323,6 +323,15 @@ void Window::setText(const QString& text) {
     }
 }
 
+Window* Window::activeChildFrame() const {
+    for (const Window* child : m_children) {
+        if (Window* frame = child->heldChildFrame()) {
+            return frame;
+        }
+    }
+    return nullptr;
+}
+
 void Window::setMenu(HMENU menu) {}
 
 bool Window::isEnabled() const {

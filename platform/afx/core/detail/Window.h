@@ -111,9 +111,15 @@ public:
     }
     /// Puts this child directly behind `after` in the order of its siblings; null: first.
     void placeAfter(Window* after);
+    /// Told that the keyboard came to a control somewhere below this window, or left it.
+    virtual void focusMovedWithin(Window& control, bool got) {}
     /// Whether the mouse passes through to the parent, as it does on captions and group boxes.
     virtual bool passesMouse() const {
         return false;
+    }
+    /// Its own active child frame, for a window that holds such.
+    virtual Window* heldChildFrame() const {
+        return nullptr;
     }
     bool isDestroyed() const {
         return m_destroyed;
@@ -155,6 +161,8 @@ public:
         return m_text;
     }
     virtual void setText(const QString& text);
+    /// The active child frame of a main frame; null for other windows and when there is none.
+    Window* activeChildFrame() const;
     /// The frame's menu (top-level windows only).
     virtual HMENU menu() const {
         return nullptr;

@@ -1,4 +1,5 @@
 #include "platform/afx/core/detail/WindowSurface.h"
+#include "platform/afx/core/detail/Connect.h"
 
 #include <QBackingStore>
 #include <QGroupBox>
@@ -22,7 +23,7 @@ QHash<const QWidget*, WindowSurface*>& surfaces() {
 } // namespace
 
 WindowSurface::WindowSurface(QWidget& window) : m_window(window) {
-    QObject::connect(&window, &QObject::destroyed, this, [this, key = &window] {
+    connectStoring(&window, &QObject::destroyed, this, [this, key = &window] {
         surfaces().remove(key);
         delete this;
     });

@@ -14,8 +14,6 @@ class Window;
 
 /// Whether a message is one of a dialog's keys; it is carried out then.
 TVX_PLATFORM_API bool isDialogMessage(Window& dialog, const MSG& msg);
-/// The controls of the group that a control belongs to: from one with WS_GROUP to before the next.
-TVX_PLATFORM_API std::vector<Window*> dialogGroup(const Window& control);
 
 enum class Direction { Forward, Backward };
 /// The next control that Tab reaches, the first one when `from` is null; null when there is none.

@@ -1,4 +1,6 @@
 #include "platform/afx/dialogs/detail/DialogWindow.h"
+#include "platform/afx/controls/detail/Control.h"
+#include "platform/afx/gdi/detail/Fonts.h"
 
 #include "platform/afx/controls/detail/ButtonWindow.h"
 #include "platform/afx/core/WindowCalls.h"
@@ -53,12 +55,6 @@ std::string captionOf(const ResourceName& name) {
 }
 
 } // namespace
-
-QSize dialogBaseUnits(const QFont& font) {
-    static const QString letters = QStringLiteral("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz");
-    const QFontMetrics metrics(font);
-    return {(metrics.horizontalAdvance(letters) / 26 + 1) / 2, metrics.height()};
-}
 
 DialogWindow::~DialogWindow() {
     DeleteObject(reinterpret_cast<HGDIOBJ>(m_ownFont));
@@ -200,13 +196,9 @@ void DialogWindow::showDefault(const Window* focused) {
     }
 }
 
-void tellDialogFocus(Window& control, bool got) {
-    for (Window* window = control.parent(); window; window = window->parent()) {
-        if (auto* dialog = dynamic_cast<DialogWindow*>(window)) {
-            dialog->showDefault(got ? &control : nullptr);
-            dialog->lastFocus = got ? control.handle() : dialog->lastFocus;
-        }
-    }
+void DialogWindow::focusMovedWithin(Window& control, bool got) {
+    showDefault(got ? &control : nullptr);
+    lastFocus = got ? control.handle() : lastFocus;
 }
 
 // --- messages ---

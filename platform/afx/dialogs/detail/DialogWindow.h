@@ -10,11 +10,6 @@ namespace tvx::afx {
 
 /// The class of dialogs.
 inline constexpr const char* dialogClass = "#32770";
-/// The class that stands for control classes nobody has registered: an empty frame.
-inline constexpr const char* emptyPaneClass = "TvxEmptyPane";
-
-/// The size of 4 by 8 dialog units in pixels, for a font.
-TVX_PLATFORM_API QSize dialogBaseUnits(const QFont& font);
 
 /// The "#32770" class: a top-level dialog with the desktop's decoration, or a child dialog (property pages, form
 /// views, dialog bars).
@@ -30,6 +25,8 @@ public:
     /// Gives the area inside a size, and the window a corner.
     void setClientSize(QPoint corner, QSize inside);
     void show(int command) override;
+    /// Keeps the control for the next activation, and gives the button that Enter presses now the default look.
+    void focusMovedWithin(Window& control, bool got) override;
 
     /// Takes the template's font: it gives the dialog its units, and its controls their text.
     void useFont(const DialogTemplate& description);
@@ -67,7 +64,5 @@ private:
 TVX_PLATFORM_API bool makeControls(DialogWindow& dialog, const DialogTemplate& description);
 /// Fills list and combo boxes with the first contents that resources (type 240) give the dialog `name`.
 TVX_PLATFORM_API bool fillControls(DialogWindow& dialog, LPCSTR name);
-/// Tells the dialog around a control that the keyboard came to the control or left it.
-void tellDialogFocus(Window& control, bool got);
 
 } // namespace tvx::afx

@@ -1,6 +1,7 @@
 #include "platform/afx/frames/detail/MdiWindow.h"
 
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PlainWindow.h"
@@ -44,6 +45,8 @@ protected:
 
 } // namespace
 
+namespace {
+
 std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs) {
     if (!dynamic_cast<MdiClientWindow*>(Window::from(cs.hwndParent))) {
         return std::make_unique<PlainWindow>(cs);
@@ -51,13 +54,16 @@ std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs) {
     return std::make_unique<MdiChildWindow>(cs);
 }
 
-Window* activeMdiChild(const Window& frame) {
-    for (Window* child : frame.children()) {
-        if (const auto* client = dynamic_cast<MdiClientWindow*>(child)) {
-            return client->active();
-        }
+struct ChildFrameEntry {
+    ChildFrameEntry() {
+        setChildFrameFactory(&makeMdiChild);
     }
-    return nullptr;
+} const childFrameEntry;
+
+} // namespace
+
+Window* MdiClientWindow::heldChildFrame() const {
+    return m_active;
 }
 
 // --- the client ---
@@ -67,8 +73,7 @@ QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
     area->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setActivationOrder(QMdiArea::ActivationHistoryOrder);
-    QObject::connect(area, &QMdiArea::subWindowActivated, area,
-                     [this](const QMdiSubWindow* sub) { storing([&] { follow(sub); }); });
+    connectStoring(area, &QMdiArea::subWindowActivated, area, [this](const QMdiSubWindow* sub) { follow(sub); });
     return area;
 }
 

@@ -20,6 +20,7 @@ public:
     using Window::Window;
     QWidget* clientWidget() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    Window* heldChildFrame() const override;
     QMdiArea* area() const;
     /// The active child frame, null when there is none.
     MdiChildWindow* active() const {
@@ -69,9 +70,5 @@ private:
     MenuHost m_systemMenu;
     bool m_defaultPlace;
 };
-
-[[nodiscard]] std::unique_ptr<Window> makeMdiChild(const CREATESTRUCT& cs);
-/// The active child frame's window of a main frame, null when there is none.
-[[nodiscard]] Window* activeMdiChild(const Window& frame);
 
 } // namespace tvx::afx

@@ -166,7 +166,7 @@ std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
     if (!ensureGui()) {
         return nullptr;
     }
-    static const auto cleared = QObject::connect(qGuiApp, &QObject::destroyed, [] { fonts.clear(); });
+    static const bool cleared = (qAddPostRoutine([] { fonts.clear(); }), true);
     constexpr std::size_t mostFonts = 256;
     if (fonts.size() > mostFonts) {
         fonts.clear();
@@ -191,6 +191,12 @@ LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
     const std::size_t length = text::characterStart(faceName, std::min<std::size_t>(faceName.size(), LF_FACESIZE - 1));
     std::memcpy(font.lfFaceName, faceName.data(), length);
     return font;
+}
+
+QSize dialogBaseUnits(const QFont& font) {
+    static const QString letters = QStringLiteral("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz");
+    const QFontMetrics metrics(font);
+    return {(metrics.horizontalAdvance(letters) / 26 + 1) / 2, metrics.height()};
 }
 
 } // namespace tvx::afx

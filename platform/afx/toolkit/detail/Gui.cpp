@@ -1,16 +1,11 @@
 #include "platform/afx/toolkit/detail/Gui.h"
 
-#include "platform/afx/core/detail/Dispatch.h"
-#include "platform/afx/core/detail/HandleWatches.h"
-#include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/core/detail/MessageQueue.h"
 #include "platform/win/Display.h"
 #include "platform/win/Module.h"
 #include "platform/win/ResourceConstants.h"
 #include "platform/win/Thread.h"
 #include "platform/win/detail/LanguageTable.h"
 
-#include <QAbstractEventDispatcher>
 #include <QApplication>
 #include <QLibraryInfo>
 #include <QLocale>
@@ -27,6 +22,9 @@ namespace tvx::afx {
 
 namespace {
 
+/// Without a constructor, so that it is there for the floors above whichever source is initialised first.
+constinit GuiHooks floorsAbove;
+
 /// Sees every event once, with its deepest receiver, and turns it into messages. Event filters would see an ignored
 /// event again at every ancestor, and exceptions could not be caught in them.
 class GuiApplication : public QApplication {
@@ -36,14 +34,14 @@ public:
     bool notify(QObject* receiver, QEvent* event) override {
         try {
             bool result = true;
-            if (translateEvent(receiver, event, result)) {
+            if (floorsAbove.translate(receiver, event, result)) {
                 return result;
             }
             return QApplication::notify(receiver, event);
         } catch (abi::__forced_unwind&) {
             throw;
         } catch (...) {
-            ExceptionCarrier::store(std::current_exception());
+            floorsAbove.storeException(std::current_exception());
             return true;
         }
     }
@@ -82,16 +80,17 @@ void makeApplication() {
     auto* application = new GuiApplication(argc, argv);
     threadOfWindows = GetCurrentThreadId();
     QApplication::setQuitOnLastWindowClosed(false);
-    QObject::connect(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, application,
-                     &runIdle);
     translateToolkit();
     // The toolkit has taken the process's locale from the environment; numbers keep their point.
     std::setlocale(LC_NUMERIC, "C");
-    MessageQueue::instance().moveToThread(application->thread());
-    watchReleasedChildren();
+    floorsAbove.started();
 }
 
 } // namespace
+
+void setGuiHooks(const GuiHooks& hooks) {
+    floorsAbove = hooks;
+}
 
 DWORD guiThread() {
     return threadOfWindows;

@@ -1,7 +1,7 @@
 #include "afxwin.h"
+#include "platform/afx/core/LastReport.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
-#include "platform/afx/dialogs/MessageBox.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QApplication>
