@@ -10,6 +10,7 @@ struct BitmapFile {
     std::vector<BYTE> info; ///< a BITMAPINFO with its whole colour table
     std::vector<BYTE> bits;
 
+    /// The beginning of `info`, which must have been read.
     const BITMAPINFO& header() const {
         return *reinterpret_cast<const BITMAPINFO*>(info.data());
     }

@@ -24,9 +24,13 @@ class GUI_API Gui_CommandLineInfo_Impl {
 public:
     using IntStyleEnum = Gui_CommandLineInfo::IntStyleEnum;
 
+    /// Whether the switch was given: 1 or 0. What each means is told at the public class of the command line.
+    /// @{
     virtual int IsSmokeTestSwitch() const;
     virtual int IsHelpSwitch() const;
     virtual int IsNoSplashSwitch() const;
+    /// @}
+    /// The style asked for by the latest style switch.
     virtual IntStyleEnum GetStyleSwitch() const;
 
     Gui_CommandLineInfo_Impl() = default;
@@ -71,6 +75,7 @@ public:
 
     void ParseParam(const char* param, BOOL isSwitch, BOOL isLast) override;
 
+    /// How many words there are, those of command files included.
     int GetCount() const;
     /// The words as a vector, null when there is none. It points into this object.
     char** GetVector();

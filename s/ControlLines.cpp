@@ -80,6 +80,7 @@ int ControlLines::remove(const CStringList& texts) {
 
 int ControlLines::removeUnmatched(const CString& pattern) {
     int removed = 0;
+    // Backwards, since removing a line moves those behind it.
     for (int line = count() - 1; line >= 0; --line) {
         if (!MatchesWildcard(text(line).View(), pattern.View())) {
             m_control.SendMessage(m_messages.remove, static_cast<WPARAM>(line));

@@ -96,6 +96,7 @@ int Gui_Process::Run(const char* commandLine, const char* directory, int capture
     }
     Pipe input;
     Pipe output;
+    // A child whose pipes nobody reads any more would hang on its next output.
     if (capture) {
         record.SetPolicy(TerminateOnRelease, 1);
     }

@@ -7,8 +7,8 @@
 
 /// What a process object knows of its child.
 struct Gui_Process::Record {
-    HANDLE process = INVALID_HANDLE_VALUE;
-    HANDLE mainThread = INVALID_HANDLE_VALUE;
+    HANDLE process = INVALID_HANDLE_VALUE;    ///< owned; invalid without a child
+    HANDLE mainThread = INVALID_HANDLE_VALUE; ///< owned, kept for hosts that ask for it
     HANDLE inputPipe = INVALID_HANDLE_VALUE;  ///< this process's end of the child's standard input
     HANDLE outputPipe = INVALID_HANDLE_VALUE; ///< this process's end of the child's standard output and error
     DWORD lastError = 0;

@@ -4,7 +4,7 @@
 #include "platform/port/Version.h"
 #include "s/SettingsKey.h"
 
-#include <cstring>
+#include <optional>
 #include <utility>
 
 namespace {
@@ -12,6 +12,8 @@ namespace {
 constexpr const char* defaultSection = "Settings";
 constexpr const char* defaultVersion = "10.1";
 constexpr int versionLength = 4;
+// Bytes of a number in the record of the first instance: all releases read it into a buffer of this size.
+constexpr DWORD longestNumber = 20;
 
 CString installedVersion() {
     const CString version = CString(Port::Version::getValue("version").c_str()).Left(versionLength);
@@ -54,20 +56,16 @@ CString Gui_Profile::GetKeyLocation(CString appName, bool underSuite, bool perAp
 void Gui_Profile::WriteFirstInstanceInfo(const char* appName, const char* valueName, unsigned long value) {
     CString text;
     text.Format("%d", static_cast<int>(value));
-    RegSetValueExA(InstanceKey(appName), valueName, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.GetString()),
-                   static_cast<DWORD>(text.GetLength() + 1));
+    InstanceKey(appName).writeText(valueName, text);
 }
 
 int Gui_Profile::ReadFirstInstanceInfo(const char* appName, const char* valueName, unsigned long& value) {
-    char text[20] = {};
-    DWORD size = sizeof text;
-    if (RegQueryValueExA(InstanceKey(appName), valueName, nullptr, nullptr, reinterpret_cast<BYTE*>(text), &size) !=
-        ERROR_SUCCESS) {
+    const std::optional<CString> text = InstanceKey(appName).text(valueName, longestNumber);
+    if (!text) {
         return 0;
     }
-    text[sizeof text - 1] = '\0'; // others may have stored a text without its zero
-    const char* end = text;
-    const LONG number = tvx::text::toInt32(text, &end);
+    const char* end = nullptr;
+    const LONG number = tvx::text::toInt32(*text, &end);
     if (*end != '\0') {
         return 0;
     }

@@ -8,7 +8,6 @@
 #include <array>
 #include <cstring>
 #include <span>
-#include <vector>
 
 // Where windows and bars stood, and fonts: records that are lines of decimal numbers.
 
@@ -19,19 +18,6 @@ constexpr const char* fontEntry = "Font";
 constexpr const char* barProfile = "ControlBar";
 constexpr const char* familyKey = "Software\\Tarvex\\Common";
 constexpr char spaceInName = '~';
-
-CString familyText(const char* name) {
-    const SettingsKey key(familyKey);
-    DWORD size = 0;
-    if (RegQueryValueExA(key, name, nullptr, nullptr, nullptr, &size) != ERROR_SUCCESS) {
-        return {};
-    }
-    std::vector<char> text(size + 1); // others may have stored a text without its zero
-    if (RegQueryValueExA(key, name, nullptr, nullptr, reinterpret_cast<BYTE*>(text.data()), &size) != ERROR_SUCCESS) {
-        return {};
-    }
-    return text.data();
-}
 
 /// Reads as many numbers, separated by commas, as there is room for.
 /// @return where the last one ended, null when one is missing
@@ -114,13 +100,11 @@ void Gui_Profile::WriteWindowPlacement(WINDOWPLACEMENT& placement, const char* e
 }
 
 int Gui_Profile::ReadDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement) {
-    return parsePlacement(familyText(name), placement);
+    return parsePlacement(SettingsKey(familyKey).text(name).value_or(CString()), placement);
 }
 
 void Gui_Profile::WriteDialogWindowPlacement(const char* name, WINDOWPLACEMENT& placement) {
-    const CString text = placementText(placement);
-    RegSetValueExA(SettingsKey(familyKey), name, 0, REG_SZ, reinterpret_cast<const BYTE*>(text.GetString()),
-                   static_cast<DWORD>(text.GetLength() + 1));
+    SettingsKey(familyKey).writeText(name, placementText(placement));
 }
 
 // --- bars ---

@@ -15,11 +15,11 @@ struct QueryMeasures {
 
 /// Where everything in a query dialog stands, in pixels from the corner of the client area.
 struct QueryLayout {
-    CRect prompt;
-    CRect field;
-    CPoint ok;
+    CRect prompt; ///< left of the field, in the middle of its height unless it is the higher one
+    CRect field;  ///< takes what the prompt leaves of the row, one pixel at least
+    CPoint ok;    ///< the buttons are placed, their size is the template's
     CPoint cancel;
-    CPoint help;
+    CPoint help;  ///< not used by a dialog without help
     CSize dialog; ///< the whole window
 };
 

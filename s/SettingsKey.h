@@ -2,6 +2,9 @@
 
 #include "afxwin.h"
 
+#include <cstdint>
+#include <optional>
+
 /// A key of the user's settings, open for reading and writing; made when it is missing. Closes itself.
 class SettingsKey {
 public:
@@ -16,9 +19,12 @@ public:
     SettingsKey(const SettingsKey&) = delete;
     SettingsKey& operator=(const SettingsKey&) = delete;
 
-    operator HKEY() const {
-        return m_key;
-    }
+    /// The text of a value, up to its first zero.
+    /// @param most  bytes that the stored value may have, a zero of its own included
+    /// @return nothing when there is no such value, or a larger one
+    [[nodiscard]] std::optional<CString> text(const char* name, DWORD most = UINT32_MAX) const;
+    /// Stores a text. What cannot be stored is lost without a word, as in all that remembers for the user's comfort.
+    void writeText(const char* name, const CString& text) const;
 
 private:
     HKEY m_key = nullptr;

@@ -6,6 +6,7 @@
 #include "platform/port/MsgManData.h"
 #include "platform/port/Str.h"
 #include "platform/port/Time.h"
+#include "s/MessageOrigin.h"
 
 #include <algorithm>
 #include <array>
@@ -27,7 +28,7 @@ constexpr int lineLimit = 255;
 constexpr std::int64_t unknownTime = -1;
 
 Port_MsgManData origin(int line) {
-    return Port_MsgManData::createObject("GuiUtilities", "../s/Version", line, "$Revision: 1.7 $");
+    return LibraryOrigin("../s/Version", line, "$Revision: 1.7 $");
 }
 
 // --- one line ---

@@ -76,6 +76,7 @@ BOOL Gui_WinApp::InitApplication() {
 
 void Gui_WinApp::DoWaitCursor(int code) {
     CWinApp::DoWaitCursor(code);
+    // The pointer is drawn in its new shape when it moves: so it is moved to where it stands.
     POINT position;
     if (code <= 0 && GetCursorPos(&position)) {
         SetCursorPos(position.x, position.y);

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "afx.h"
-#include "platform/port/MsgManData.h"
+#include "s/MessageOrigin.h"
 
 /// What the application object keeps for itself.
 struct Gui_WinAppData {
@@ -12,5 +12,5 @@ struct Gui_WinAppData {
 
 /// The origin of the messages that the application object issues.
 inline Port_MsgManData WinAppOrigin(int line) {
-    return Port_MsgManData::createObject("GuiUtilities", "../s/WinApp", line, "$Revision");
+    return LibraryOrigin("../s/WinApp", line, "$Revision");
 }

@@ -10,7 +10,7 @@
 #include "s/SettingsKey.h"
 #include "s/WinAppData.h"
 
-#include <array>
+#include <string>
 
 namespace {
 
@@ -36,20 +36,11 @@ void record(const char* valueName, unsigned long value) {
 }
 
 std::string recordedMark() {
-    std::array<char, 128> text = {};
-    DWORD size = text.size() - 1; // others may have stored a text without its zero
-    const InstanceKey key(AfxGetAppName());
-    if (RegQueryValueExA(key, markValue, nullptr, nullptr, reinterpret_cast<BYTE*>(text.data()), &size) !=
-        ERROR_SUCCESS) {
-        return {};
-    }
-    return text.data();
+    return InstanceKey(AfxGetAppName()).text(markValue).value_or(CString()).GetString();
 }
 
 void recordMark(const std::string& mark) {
-    const InstanceKey key(AfxGetAppName());
-    RegSetValueExA(key, markValue, 0, REG_SZ, reinterpret_cast<const BYTE*>(mark.c_str()),
-                   static_cast<DWORD>(mark.size() + 1));
+    InstanceKey(AfxGetAppName()).writeText(markValue, mark.c_str());
 }
 
 /// Whether the recorded process runs and is the one that was recorded, as far as that is known.

@@ -94,10 +94,12 @@ void CArchive::Write(const void* buffer, UINT count) {
     if (count > m_buffer.size() - m_position) {
         Flush();
     }
+    // What is no smaller than the buffer would only be copied once more on its way through it.
     if (count >= m_buffer.size()) {
         m_file->Write(buffer, count);
         return;
     }
+    // Hosts write nothing from a null pointer, which memcpy may not be given.
     if (count > 0) {
         std::memcpy(m_buffer.data() + m_position, buffer, count);
     }
@@ -119,6 +121,7 @@ BOOL CArchive::ReadString(CString& line) {
         }
         line.AppendChar(character);
     }
+    // Texts were written on systems with either line end; a carriage return elsewhere is part of the line.
     if (character == '\n' && line.Right(1) == "\r") {
         line.Truncate(line.GetLength() - 1);
     }
@@ -126,6 +129,7 @@ BOOL CArchive::ReadString(CString& line) {
 }
 
 void CArchive::WriteCount(DWORD_PTR count) {
+    // The largest number of each form says that a larger form follows, so it cannot be written in its own.
     if (count < 0xFFFF) {
         *this << static_cast<WORD>(count);
         return;
@@ -149,6 +153,7 @@ DWORD_PTR CArchive::ReadCount() {
 
 template <typename Unsigned>
 CArchive& CArchive::put(Unsigned value) {
+    // Byte by byte: files have the low byte first on every machine.
     BYTE bytes[sizeof(Unsigned)];
     for (std::size_t i = 0; i < sizeof bytes; ++i) {
         bytes[i] = static_cast<BYTE>(value >> (8 * i));

@@ -154,10 +154,7 @@ BOOL CException::GetErrorMessage(LPTSTR text, UINT capacity, UINT* helpContext) 
     }
     const CString description = Describe();
     if (text && capacity > 0) {
-        const std::string_view whole = description.View();
-        const std::size_t length = tvx::text::characterStart(whole, std::min<std::size_t>(whole.size(), capacity - 1));
-        std::memcpy(text, whole.data(), length);
-        text[length] = '\0';
+        tvx::text::copyCut(description.View(), text, capacity);
     }
     return !description.IsEmpty();
 }

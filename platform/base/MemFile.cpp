@@ -89,6 +89,7 @@ ULONGLONG CMemFile::Seek(LONGLONG offset, UINT from) {
     }
     const ULONGLONG base = from == begin ? 0 : from == current ? m_position : m_length;
     const ULONGLONG position = base + static_cast<ULONGLONG>(offset);
+    // A position before the beginning wraps round to a huge number, so one comparison refuses both.
     if (position > largestFile) {
         AfxThrowFileException(CFileException::badSeek);
     }

@@ -67,10 +67,6 @@ CObject* CRuntimeClass::CreateObject(LPCSTR name) {
     return found ? found->CreateObject() : nullptr;
 }
 
-CRuntimeClass* CRuntimeClass::First() {
-    return firstClass;
-}
-
 AFX_CLASSINIT::AFX_CLASSINIT(CRuntimeClass* newClass) : m_class(newClass) {
     newClass->m_pNextClass = firstClass;
     firstClass = newClass;

@@ -47,8 +47,6 @@ struct TVX_PLATFORM_API CRuntimeClass {
     static CRuntimeClass* FromName(LPCSTR name);
     /// Makes an object of the class with this name; null when there is no such class or it cannot be made.
     static CObject* CreateObject(LPCSTR name);
-    /// The first class of the list of all classes.
-    static CRuntimeClass* First();
 };
 
 /// Keeps a class in the list of all classes. Made by the IMPLEMENT_ macros, one beside each class.

@@ -138,6 +138,7 @@ ULONGLONG CStdioFile::Seek(LONGLONG offset, UINT from) {
         AfxThrowInvalidArgException();
     }
     if (::fseeko(stream(), offset, origins[from]) != 0) {
+        // Before the beginning, or beyond what an offset can hold: the call is wrong, not the disk.
         if (errno == EINVAL || errno == EOVERFLOW) {
             AfxThrowFileException(CFileException::badSeek, errno, GetFilePath());
         }
@@ -156,6 +157,7 @@ ULONGLONG CStdioFile::GetPosition() const {
 }
 
 ULONGLONG CStdioFile::GetLength() const {
+    // What waits in the stream is unknown to the system, which is asked for the length.
     if (std::fflush(stream()) != 0) {
         throwLastError();
     }
@@ -182,6 +184,7 @@ int CStdioFile::nextCharacter() {
         return character;
     }
     const int following = std::getc(stream());
+    // Only the pair is a line end: a carriage return alone is text.
     if (following == '\n') {
         return following;
     }
@@ -193,6 +196,7 @@ int CStdioFile::nextCharacter() {
 
 void CStdioFile::checkReadError() {
     if (std::ferror(stream())) {
+        // Else every later read would report this error again.
         std::clearerr(stream());
         throwLastError();
     }

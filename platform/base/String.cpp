@@ -75,6 +75,7 @@ char* share(char* text) {
         return text;
     }
     Header& header = headerOf(text);
+    // Whoever locked it writes to it unseen, so the copy cannot live on it.
     if (header.owners.load(std::memory_order_relaxed) == locked) {
         return newText({text, static_cast<std::size_t>(header.length)});
     }
@@ -87,6 +88,7 @@ void release(char* text) noexcept {
         return;
     }
     Header& header = headerOf(text);
+    // An only owner need not subtract: nobody else is there who could copy meanwhile.
     const int owners = header.owners.load(std::memory_order_acquire);
     if (owners == 1 || owners == locked || header.owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
         std::free(&header);
@@ -233,6 +235,7 @@ char* CStringT<char>::GetBufferSetLength(int length) {
 
 void CStringT<char>::ReleaseBuffer(int length) {
     if (length < 0) {
+        // A host that wrote over the zero is stopped by the end of the buffer.
         length = static_cast<int>(std::find(m_text, m_text + GetAllocLength(), '\0') - m_text);
     }
     ReleaseBufferSetLength(length);
@@ -292,6 +295,7 @@ void CStringT<char>::assign(std::string_view text) {
         return;
     }
     if (!text.empty()) {
+        // Not memcpy: the text may be a part of this one.
         std::memmove(m_text, text.data(), text.size());
     }
     setLength(static_cast<int>(text.size()));

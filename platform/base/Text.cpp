@@ -243,6 +243,17 @@ bool isWellFormed(std::string_view text) noexcept {
     return true;
 }
 
+bool copyWhole(std::string_view text, char* buffer, std::size_t size) noexcept {
+    return text.size() < size && copyCut(text, buffer, size) == text.size();
+}
+
+std::size_t copyCut(std::string_view text, char* buffer, std::size_t size) noexcept {
+    const std::size_t length = characterStart(text, std::min(text.size(), size - 1));
+    std::copy_n(text.data(), length, buffer);
+    buffer[length] = '\0';
+    return length;
+}
+
 std::wstring widen(std::string_view text) {
     std::wstring result;
     result.reserve(text.size());

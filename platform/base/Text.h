@@ -64,6 +64,17 @@ TVX_PLATFORM_API void append(std::string& text, char32_t codePoint);
 /// Whether every byte belongs to a well-formed sequence.
 [[nodiscard]] TVX_PLATFORM_API bool isWellFormed(std::string_view text) noexcept;
 
+// Into a caller's buffer
+
+/// Copies a text with its zero when all of it fits.
+/// @param size  bytes of `buffer`
+/// @return false when it does not fit: the buffer is as before
+[[nodiscard]] TVX_PLATFORM_API bool copyWhole(std::string_view text, char* buffer, std::size_t size) noexcept;
+/// Copies what fits, cut before a character that does not, and ends it with a zero.
+/// @param size  bytes of `buffer`, at least 1
+/// @return bytes copied, the zero not counted
+TVX_PLATFORM_API std::size_t copyCut(std::string_view text, char* buffer, std::size_t size) noexcept;
+
 // Wide text
 
 /// UTF-8 to wide text, one element a code point (wchar_t has 32 bits here); broken bytes become U+DC80..U+DCFF.

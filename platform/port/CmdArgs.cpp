@@ -98,6 +98,7 @@ private:
 
     void takeKnown(const OptionRule& rule) {
         m_wantsHelp = m_wantsHelp || isHelp(rule);
+        // Exactly the second time, so that an option given five times is told of once.
         if (++m_given[&rule] == 2 && rule.times == Times::Once && !isHelp(rule)) {
             m_errors.push_back(tvx::text::format("Option \"-%s\" is given more than once.", rule.name.c_str()));
         }
@@ -108,6 +109,7 @@ private:
 
     void takeValue(const OptionRule& rule) {
         const char* value = m_next < m_arguments.size() ? m_arguments[m_next] : nullptr;
+        // A negative number begins like an option; where a number is wanted it is one.
         const bool isNegative = value && rule.kind != ValueKind::Text && isValue(value, rule.kind);
         if (!value || (isOption(value) && !isNegative)) {
             m_errors.push_back(

@@ -73,36 +73,12 @@ Port_MsgMan::~Port_MsgMan() {
     Port_MsgDispatcher::removeMsgMan(this);
 }
 
-const char* Port_MsgMan::getName() const {
-    return m_name.c_str();
-}
-
-bool Port_MsgMan::getEnabled() const {
-    return m_enabled;
-}
-
-void Port_MsgMan::setEnabled(bool enabled) {
-    m_enabled = enabled;
-}
-
-int Port_MsgMan::getAbort() const {
-    return m_abort;
-}
-
-void Port_MsgMan::setAbort(int code) {
-    m_abort = code;
-}
-
 int Port_MsgMan::getMsgCount(MsgType type) const {
     return m_counts.at(type);
 }
 
 int Port_MsgMan::getErrorCount() const {
     return m_counts[MsgTypeError] + m_counts[MsgTypeInternal] + m_counts[MsgTypeFatal];
-}
-
-void Port_MsgMan::resetMsgCounts() {
-    m_counts.fill(0);
 }
 
 void Port_MsgMan::setMsgSwitch(const char* module, const char* source, int line, MsgSwitch state) {
@@ -143,22 +119,6 @@ void Port_MsgMan::take(const Port_Msg& msg) {
 Port_MsgManDefault::Port_MsgManDefault(const char* name) : Port_MsgMan(name) {}
 
 Port_MsgManDefault::~Port_MsgManDefault() = default;
-
-bool Port_MsgManDefault::getClean() const {
-    return m_clean;
-}
-
-void Port_MsgManDefault::setClean(bool clean) {
-    m_clean = clean;
-}
-
-int Port_MsgManDefault::getMaxLineWidth() const {
-    return m_maxLineWidth;
-}
-
-void Port_MsgManDefault::setMaxLineWidth(int columns) {
-    m_maxLineWidth = columns;
-}
 
 wchar_t** Port_MsgManDefault::msgFormat(MsgType type, bool clean, int width, const wchar_t* text, int* count) {
     const std::vector<std::wstring> lines = formatLines(type, clean, width, text);

@@ -45,27 +45,39 @@ public:
     Port_MsgMan& operator=(const Port_MsgMan&) = delete;
 
     /// The name given to the constructor, empty for none.
-    const char* getName() const;
+    const char* getName() const {
+        return m_name.c_str();
+    }
 
     /// Whether the manager takes messages. A disabled one is passed over: the message goes to the manager registered
     /// before it. Managers start enabled.
-    bool getEnabled() const;
+    bool getEnabled() const {
+        return m_enabled;
+    }
     /// Makes the manager take messages, or be passed over.
-    void setEnabled(bool enabled);
+    void setEnabled(bool enabled) {
+        m_enabled = enabled;
+    }
 
     /// Whether work should stop: 0 means go on, any other value is the code with which the application should end.
     /// A fatal message sets the flag of the manager that takes it (a code of 0 counts as 1); the flag is only a
     /// request, nothing in the library ends the process. Long operations ask it between their steps.
-    int getAbort() const;
+    int getAbort() const {
+        return m_abort;
+    }
     /// Sets the flag, for example when the user cancels, or clears it with 0.
-    void setAbort(int code);
+    void setAbort(int code) {
+        m_abort = code;
+    }
 
     /// How many messages of @p type were written. Those that are switched off do not count.
     int getMsgCount(MsgType type) const;
     /// How many messages of the error class were written.
     int getErrorCount() const;
     /// Begins to count from 0 again.
-    void resetMsgCounts();
+    void resetMsgCounts() {
+        m_counts.fill(0);
+    }
 
     /// Switches messages off or on again by the place that issues them, as named in `Port_MsgManData::createObject`.
     /// Of several settings that concern one message the latest holds. Fatal messages are always written.
@@ -111,14 +123,22 @@ public:
     ~Port_MsgManDefault() override;
 
     /// Whether messages are written without the prefix that names their type. Off at first.
-    bool getClean() const;
+    bool getClean() const {
+        return m_clean;
+    }
     /// Turns the prefixes off, or on again with false.
-    void setClean(bool clean);
+    void setClean(bool clean) {
+        m_clean = clean;
+    }
 
     /// The width in columns at which lines are wrapped; 80 at first. 0 or less means that they are not.
-    int getMaxLineWidth() const;
+    int getMaxLineWidth() const {
+        return m_maxLineWidth;
+    }
     /// Sets the width for the messages that follow.
-    void setMaxLineWidth(int columns);
+    void setMaxLineWidth(int columns) {
+        m_maxLineWidth = columns;
+    }
 
     /// Turns a message into lines.
     ///

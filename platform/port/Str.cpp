@@ -65,12 +65,7 @@ int UT_STR::SScanf(const char* text, const char* format, ...) {
 }
 
 bool UT_STR::Copy(char* buffer, std::size_t size, const char* text) {
-    const std::size_t length = std::strlen(text) + 1;
-    if (length > size) {
-        return false;
-    }
-    std::memcpy(buffer, text, length);
-    return true;
+    return tvx::text::copyWhole(text, buffer, size);
 }
 
 bool UT_STR::Cat(char* buffer, std::size_t size, const char* text) {

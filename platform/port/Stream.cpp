@@ -30,6 +30,7 @@ public:
         pthread_sigmask(SIG_BLOCK, &m_pipe, &m_before);
     }
     ~BrokenPipeGuard() {
+        // The signal of this write is taken away before signals are let in again; one that waited before is the host's.
         const timespec atOnce{};
         if (!m_wasPending) {
             while (sigtimedwait(&m_pipe, nullptr, &atOnce) == -1 && errno == EINTR) {
@@ -52,6 +53,7 @@ void writeAll(int descriptor, std::string_view text) {
         if (written >= 0) {
             text.remove_prefix(static_cast<std::size_t>(written));
         } else if (errno != EINTR) {
+            // No reader or a full disk: a message is lost, which is no reason to disturb the work it tells of.
             return;
         }
     }
@@ -118,6 +120,7 @@ int Stream::readline(char* to, int limit) {
         used = length + lineEndLength(text.substr(length));
     } else if (text.size() > most) {
         length = tvx::text::characterStart(text, most);
+        // A limit smaller than one character: cutting it is the only way on.
         used = length = length > 0 ? length : most;
     } else {
         used = length = text.size();

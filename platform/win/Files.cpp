@@ -1,5 +1,6 @@
 #include "platform/win/Files.h"
 
+#include "platform/base/Text.h"
 #include "platform/base/detail/Locate.h"
 #include "platform/win/Drives.h"
 #include "platform/win/Error.h"
@@ -25,11 +26,8 @@ constexpr mode_t newFileMode = 0666;
 
 /// Hands a text to a caller's buffer; see GetCurrentDirectoryA.
 DWORD copyOut(const std::string& text, DWORD size, LPSTR buffer) {
-    if (!buffer || size <= text.size()) {
-        return static_cast<DWORD>(text.size() + 1);
-    }
-    std::memcpy(buffer, text.c_str(), text.size() + 1);
-    return static_cast<DWORD>(text.size());
+    const bool fits = buffer && tvx::text::copyWhole(text, buffer, size);
+    return static_cast<DWORD>(fits ? text.size() : text.size() + 1);
 }
 
 std::optional<std::string> pathOf(LPCSTR name, PathUse use = PathUse::Existing) {

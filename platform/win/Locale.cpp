@@ -1,11 +1,11 @@
 #include "platform/win/Locale.h"
 
+#include "platform/base/Text.h"
 #include "platform/win/Error.h"
 #include "platform/win/detail/LanguageTable.h"
 
 #include <algorithm>
 #include <cstdlib>
-#include <cstring>
 #include <string>
 #include <string_view>
 
@@ -60,12 +60,9 @@ int GetLocaleInfoA(LCID locale, LCTYPE type, LPSTR buffer, int size) {
     }
     const std::string_view text = language->abbreviation;
     const int needed = static_cast<int>(text.size()) + 1;
-    if (size > 0 && size < needed) {
+    if (size > 0 && !tvx::text::copyWhole(text, buffer, static_cast<std::size_t>(size))) {
         SetLastError(ERROR_INSUFFICIENT_BUFFER);
         return 0;
-    }
-    if (size > 0) {
-        std::memcpy(buffer, text.data(), text.size() + 1);
     }
     return needed;
 }

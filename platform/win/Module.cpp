@@ -264,10 +264,7 @@ DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size) {
         SetLastError(path.empty() ? ERROR_MOD_NOT_FOUND : ERROR_INSUFFICIENT_BUFFER);
         return 0;
     }
-    const std::size_t length = std::min<std::size_t>(path.size(), size - 1);
-    std::memcpy(buffer, path.data(), length);
-    buffer[length] = '\0';
-    if (length == path.size()) {
+    if (const std::size_t length = tvx::text::copyCut(path, buffer, size); length == path.size()) {
         return static_cast<DWORD>(length);
     }
     SetLastError(ERROR_INSUFFICIENT_BUFFER);

@@ -1,5 +1,6 @@
 #include "platform/win/Registry.h"
 
+#include "platform/base/Text.h"
 #include "platform/win/detail/RegistryNotices.h"
 #include "platform/win/detail/RegistryStore.h"
 
@@ -150,10 +151,9 @@ DWORD copyValue(const Value& value, LPDWORD type, LPBYTE data, LPDWORD size) {
 }
 
 DWORD copyName(const std::string& name, LPSTR buffer, DWORD& size) {
-    if (size <= name.size()) {
+    if (!tvx::text::copyWhole(name, buffer, size)) {
         return ERROR_MORE_DATA;
     }
-    std::memcpy(buffer, name.c_str(), name.size() + 1);
     size = static_cast<DWORD>(name.size());
     return ERROR_SUCCESS;
 }

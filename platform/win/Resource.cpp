@@ -5,8 +5,6 @@
 #include "platform/win/detail/ByteReader.h"
 #include "platform/win/detail/ModuleTable.h"
 
-#include <cstring>
-
 namespace {
 
 using tvx::detail::ModuleTable;
@@ -106,11 +104,7 @@ int LoadStringA(HINSTANCE module, UINT id, LPSTR buffer, int size) {
     if (!string) {
         return 0;
     }
-    const std::size_t length =
-        tvx::text::characterStart(*string, std::min(string->size(), static_cast<std::size_t>(size) - 1));
-    std::memcpy(buffer, string->data(), length);
-    buffer[length] = '\0';
-    return static_cast<int>(length);
+    return static_cast<int>(tvx::text::copyCut(*string, buffer, static_cast<std::size_t>(size)));
 }
 
 namespace tvx {

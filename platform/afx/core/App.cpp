@@ -1,5 +1,6 @@
 #include "platform/afx/core/App.h"
 
+#include "platform/afx/core/CommandLineInfo.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Gdi.h"
@@ -268,11 +269,6 @@ void CWinApp::SetRegistryKey(UINT id) {
 
 namespace {
 
-bool isExistingFile(const char* word) {
-    std::error_code error;
-    return std::filesystem::exists(word, error);
-}
-
 std::vector<std::string>& arguments() {
     static std::vector<std::string> words;
     return words;
@@ -280,20 +276,11 @@ std::vector<std::string>& arguments() {
 
 } // namespace
 
-const char* AfxSwitchOf(const char* word) {
-    const bool marked = word[0] == '-' || word[0] == '/';
-    if (!marked || (word[0] == '/' && isExistingFile(word))) {
-        return nullptr;
-    }
-    return word + 1;
-}
-
 void CWinApp::ParseCommandLine(CCommandLineInfo& info) {
     const auto& words = arguments();
     for (std::size_t i = 0; i < words.size(); ++i) {
-        const char* word = words[i].c_str();
-        const char* name = AfxSwitchOf(word);
-        info.ParseParam(name ? name : word, name ? TRUE : FALSE, i + 1 == words.size() ? TRUE : FALSE);
+        const auto [text, isSwitch] = takeApart(words[i].c_str());
+        info.ParseParam(text, isSwitch ? TRUE : FALSE, i + 1 == words.size() ? TRUE : FALSE);
     }
 }
 

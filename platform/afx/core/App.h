@@ -180,10 +180,6 @@ private:
     int m_waitDepth = 0;
 };
 
-/// The text behind the mark of a word that is a switch, null for a plain word. Switches begin with "-" or "/"; a word
-/// that begins with "/" and names an existing file or folder is that file.
-TVX_PLATFORM_API const char* AfxSwitchOf(const char* word);
-
 /// The application object, null before its constructor ran.
 TVX_PLATFORM_API CWinApp* AfxGetApp();
 /// The application's main window, null when there is none.

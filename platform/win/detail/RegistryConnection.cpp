@@ -1,7 +1,5 @@
 #include "platform/win/detail/RegistryConnection.h"
 
-#include <atomic>
-
 namespace tvx::registry {
 
 namespace {
@@ -154,7 +152,7 @@ int Query::step() {
 }
 
 bool Connection::shareLog() {
-    constexpr int regionSize = 32768; // of the log's index, see the database's file format
+    constexpr int regionSize = 32768; // the database maps its index in regions of this size (walformat.html, 2.0)
     sqlite3_file* file = nullptr;
     void* region = nullptr;
     const bool hasMemory =
@@ -163,15 +161,6 @@ bool Connection::shareLog() {
         file->pMethods->xShmMap(file, 0, regionSize, 0, const_cast<void volatile**>(&region)) == SQLITE_OK;
     m_log = hasMemory ? static_cast<const volatile std::uint32_t*>(region) : nullptr;
     return m_log != nullptr;
-}
-
-LogHead Connection::logHead() const {
-    LogHead head;
-    for (std::size_t i = 0; i < head.size(); ++i) {
-        head[i] = m_log[i];
-    }
-    std::atomic_thread_fence(std::memory_order_acquire);
-    return head;
 }
 
 void Connection::keepLogOnClose() {

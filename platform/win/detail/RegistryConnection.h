@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/win/detail/LogHead.h"
 #include "platform/win/detail/Patience.h"
 
 #include <array>
@@ -63,10 +64,6 @@ private:
     int m_bound = 0;
 };
 
-/// What tells whether anybody has written: the head of the database's log. The database compares it itself to know
-/// whether the pages that it holds are still right.
-using LogHead = std::array<std::uint32_t, 12>;
-
 /// An open database with its statements.
 class Connection {
 public:
@@ -102,7 +99,10 @@ public:
     }
     /// Whether the log is shared with other processes, so that its head can be looked at.
     [[nodiscard]] bool shareLog();
-    [[nodiscard]] LogHead logHead() const;
+    /// The head as it is now; nothing when it does not tell, and the database must be asked.
+    [[nodiscard]] std::optional<LogHead> logHead() const {
+        return readLogHead(m_log);
+    }
     /// Leaves the log for others to bring into the file.
     void keepLogOnClose();
 

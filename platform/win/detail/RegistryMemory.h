@@ -17,16 +17,19 @@ struct Store::Memory {
         Nothing, ///< it cannot happen: the store is a copy
     };
 
-    /// What may be answered from memory. Must be called before the database is asked, so that what is kept is at least
-    /// as new as the head it is kept under.
+    /// What may be answered from memory; null when the database is to be asked. Must be called before the database is
+    /// asked, so that what is kept is at least as new as the head it is kept under.
     Replies* current(const Connection& connection) {
         if (watch == Watch::None) {
             return nullptr;
         }
-        if (const LogHead now = watch == Watch::Log ? connection.logHead() : head;
-            now != head || replies.size() > most) {
+        const std::optional<LogHead> now = watch == Watch::Log ? connection.logHead() : head;
+        if (!now) {
+            return nullptr;
+        }
+        if (*now != head || replies.size() > most) {
             replies.clear();
-            head = now;
+            head = *now;
         }
         return &replies;
     }

@@ -191,6 +191,26 @@ TEST(Archive, ObjectsAreStoredOnceAndMayPointInCircles) {
     });
 }
 
+TEST(Archive, ObjectsWithoutPointersAreStoredBehindTheirClass) {
+    CArchiveNode node;
+    node.m_name = "inline";
+    const std::string bytes = stored([&](CArchive& archive) {
+        archive.SerializeClass(node.GetRuntimeClass());
+        node.Serialize(archive);
+    });
+    loadFrom(bytes, [](CArchive& archive) {
+        CArchiveNode loaded;
+        archive.SerializeClass(loaded.GetRuntimeClass());
+        archive.SetObjectSchema(7); // as a Serialize function that reads another class's data does
+        loaded.Serialize(archive);
+        EXPECT_EQ("inline", loaded.m_name);
+        EXPECT_EQ(7u, loaded.m_schema);
+        EXPECT_EQ(0xFFFFFFFFu, archive.GetObjectSchema()) << "a schema is told once";
+    });
+    const auto asAnother = [](CArchive& archive) { archive.SerializeClass(RUNTIME_CLASS(COtherArchiveNode)); };
+    EXPECT_EQ(CArchiveException::badClass, causeOf(bytes, asAnother));
+}
+
 TEST(Archive, TagsKeepTheirFormat) {
     CArchiveNode node;
     const std::string bytes = stored([&](CArchive& archive) { archive << &node << &node; });

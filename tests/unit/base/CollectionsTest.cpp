@@ -53,6 +53,15 @@ TEST(Array, GrowsAndShrinksAnywhere) {
     EXPECT_EQ(nullptr, array.GetData());
 }
 
+TEST(Array, ElementsAreChangedInPlace) {
+    CStringArray array;
+    array.Add("a");
+    array.ElementAt(0) += "b";
+    const CStringArray& fixed = array;
+    EXPECT_EQ("ab", fixed.ElementAt(0));
+    expectInvalid([&] { array.ElementAt(1) = "c"; });
+}
+
 TEST(Array, TakesItsOwnElementsAsArguments) {
     CStringArray array;
     array.Add("a");
@@ -157,6 +166,16 @@ TEST(Map, SetsFindsAndRemoves) {
     EXPECT_TRUE(map.RemoveKey("one"));
     EXPECT_FALSE(map.RemoveKey("one"));
     EXPECT_EQ(1, map.GetCount());
+}
+
+TEST(Map, KeepsItsElementsWhenRoomIsMadeForMore) {
+    CMapStringToString map;
+    map["one"] = "1";
+    map.InitHashTable(1009);
+    map.InitHashTable(7, FALSE);
+    CString value;
+    EXPECT_TRUE(map.Lookup("one", value));
+    EXPECT_EQ("1", value);
 }
 
 TEST(Map, IteratesOverAllWhileCurrentOnesAreRemoved) {

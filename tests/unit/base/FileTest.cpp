@@ -46,6 +46,9 @@ TEST_F(File, WritesReadsAndMoves) {
     file.SeekToBegin();
     file.SetLength(2);
     EXPECT_EQ(2u, file.Read(bytes, sizeof bytes));
+    file.SeekToBegin();
+    EXPECT_EQ(2u, file.SeekToEnd());
+    EXPECT_EQ(2u, file.GetPosition());
     file.Seek(3, CFile::begin);
     file.Write("x", 1);
     file.Flush();

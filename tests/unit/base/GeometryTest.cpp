@@ -64,3 +64,19 @@ TEST(Geometry, RectanglesIntersectUniteAndSubtract) {
     result &= right;
     EXPECT_EQ(CRect(5, 5, 10, 10), result);
 }
+
+TEST(Geometry, AreSetAnew) {
+    CPoint point(1, 2);
+    point.SetPoint(-3, 4);
+    EXPECT_EQ(CPoint(-3, 4), point);
+    CRect rect;
+    rect.SetRect(1, 2, 3, 4);
+    EXPECT_EQ(CRect(1, 2, 3, 4), rect);
+    rect.SetRect(CPoint(5, 6), CPoint(7, 8));
+    EXPECT_EQ(CRect(5, 6, 7, 8), rect);
+    const RECT other = {9, 8, 7, 6};
+    rect.CopyRect(&other);
+    EXPECT_EQ(CRect(9, 8, 7, 6), rect) << "edges that are the wrong way round stay so";
+    rect.SetRectEmpty();
+    EXPECT_TRUE(rect.IsRectNull());
+}

@@ -84,6 +84,14 @@ TEST(Diagnostics, TraceAndDumpSpeakOnlyWhenAsked) {
     EXPECT_TRUE(text.ends_with("radius 0, next NULL\n")) << text;
 }
 
+TEST(Diagnostics, DumpOverridesReadHowDeepToGo) {
+    CDumpContext dump;
+    EXPECT_EQ(0, dump.GetDepth());
+    dump.SetDepth(2);
+    EXPECT_EQ(2, dump.GetDepth());
+    EXPECT_EQ(0, afxDump.GetDepth()) << "each context has its own";
+}
+
 TEST(DiagnosticsDeathTest, BrokenInvariantsEndTheProcess) {
     CCircle circle;
     ASSERT_VALID(&circle);

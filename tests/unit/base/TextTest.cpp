@@ -99,6 +99,22 @@ TEST(Text, StepsBackToWhereSteppingForwardCameFrom) {
     }
 }
 
+TEST(Text, GoesIntoBuffersWholeOrCutBetweenCharacters) {
+    char buffer[6] = "as is";
+    EXPECT_FALSE(text::copyWhole("123456", buffer, sizeof buffer));
+    EXPECT_FALSE(text::copyWhole("", buffer, 0));
+    EXPECT_STREQ("as is", buffer);
+    EXPECT_TRUE(text::copyWhole("12345", buffer, sizeof buffer));
+    EXPECT_STREQ("12345", buffer);
+    EXPECT_EQ(5u, text::copyCut("abcé", buffer, sizeof buffer));
+    EXPECT_STREQ("abcé", buffer);
+    EXPECT_EQ(4u, text::copyCut("abcdé", buffer, sizeof buffer));
+    EXPECT_STREQ("abcd", buffer);
+    EXPECT_EQ(0u, text::copyCut("é", buffer, 2));
+    EXPECT_EQ(0u, text::copyCut("a", buffer, 1));
+    EXPECT_STREQ("", buffer);
+}
+
 TEST(Text, KeepsEveryByteOnTheWayThroughWideText) {
     for (const std::string& broken : brokenTexts) {
         EXPECT_EQ(broken, text::narrow(text::widen(broken)));

@@ -148,7 +148,9 @@ TEST(MsgDispatcher, PassesOverDisabledAndBusyManagers) {
     Reacting reacting([] { origin().issueError("from inside"); });
     Port_MsgDispatcher::addMsgMan(&reacting);
     origin().issueStatus("outside");
+    EXPECT_TRUE(reacting.getEnabled());
     reacting.setEnabled(false);
+    EXPECT_FALSE(reacting.getEnabled());
     origin().issueStatus("past");
     EXPECT_EQ(outer.texts(), (Lines{"from inside", "past"}));
     EXPECT_EQ(reacting.getMsgCount(Port_MsgMan::MsgTypeStatus), 1);
@@ -176,6 +178,14 @@ TEST(MsgDispatcher, WithoutManagersWritesToTheStandardStreams) {
     origin().issueFatal(3, "fatal");
     EXPECT_EQ(testing::internal::GetCapturedStdout(), "status\nInfo: info\n");
     EXPECT_EQ(testing::internal::GetCapturedStderr(), "Warning: warning\nError: error\nFatal error: fatal\n");
+}
+
+TEST(MsgMan, KeepsACopyOfItsName) {
+    std::string name = "console";
+    const Port_MsgManDefault named(name.c_str());
+    name.clear();
+    EXPECT_STREQ(named.getName(), "console");
+    EXPECT_STREQ(Port_MsgManDefault().getName(), "");
 }
 
 TEST(MsgMan, ErrorClassIsFourToSix) {

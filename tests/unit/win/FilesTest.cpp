@@ -141,6 +141,24 @@ TEST_F(Files, AreCreatedAndKeptFromOthers) {
     EXPECT_FALSE(DeleteFileA("Q:\\a"));
 }
 
+TEST_F(Files, CallsGoByTheirNamesWithoutALetterToo) {
+    std::filesystem::current_path("work");
+    const HANDLE file = CreateFile("D:\\new", GENERIC_WRITE, 0, nullptr, CREATE_NEW, 0, nullptr);
+    ASSERT_NE(file, INVALID_HANDLE_VALUE);
+    EXPECT_TRUE(CloseHandle(file));
+    EXPECT_EQ(GetFileAttributes("new"), FILE_ATTRIBUTE_NORMAL);
+    EXPECT_EQ(GetDriveType("E:"), GetDriveTypeA("E:"));
+    char buffer[20];
+    char* last = nullptr;
+    EXPECT_EQ(GetCurrentDirectory(sizeof buffer, buffer), 3u);
+    EXPECT_STREQ(buffer, "D:\\");
+    EXPECT_EQ(GetFullPathName("new", sizeof buffer, buffer, &last), 6u);
+    EXPECT_STREQ(buffer, "D:\\new");
+    EXPECT_STREQ(last, "new");
+    EXPECT_TRUE(DeleteFile("D:\\new"));
+    EXPECT_FALSE(std::filesystem::exists("new"));
+}
+
 TEST_F(Files, FullNamesAreCompletedAndResolved) {
     std::filesystem::create_directory("work/sub");
     std::filesystem::current_path("work/sub");

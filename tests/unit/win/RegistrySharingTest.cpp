@@ -3,7 +3,10 @@
 
 #include "ChildProcess.h"
 #include "RegistrySandbox.h"
+#include "platform/win/detail/LogHead.h"
 
+#include <array>
+#include <fstream>
 #include <memory>
 #include <vector>
 
@@ -38,6 +41,48 @@ TEST_F(RegistrySharing, SeesWhatAnotherProcessWroteAtOnce) {
         ASSERT_EQ(writer.receive(), i);
         EXPECT_EQ(key.read("a"), i % 5 == 0 ? "<2>" : std::to_string(i));
     }
+}
+
+TEST_F(RegistrySharing, ReliesOnTheHeadOfTheLogOnlyInTheFormatItKnows) {
+    using tvx::registry::LogHead;
+    using tvx::registry::readLogHead;
+    std::array<std::uint32_t, 2 * std::tuple_size_v<LogHead>> words{};
+    const auto load = [&] {
+        std::ifstream index(m_sandbox.file.string() + "-shm", std::ios::binary);
+        index.read(reinterpret_cast<char*>(words.data()), sizeof words);
+        return readLogHead(words.data());
+    };
+    const TestKey key(path);
+    key.write("a", "1");
+    const std::optional<LogHead> before = load();
+    ASSERT_TRUE(before) << "the database here writes another format: settings are read without their memory";
+    key.write("a", "2");
+    const std::optional<LogHead> after = load();
+    ASSERT_TRUE(after);
+    EXPECT_NE(*before, *after);
+
+    words[0] = words[words.size() / 2] = tvx::registry::logHeadVersion + 1;
+    EXPECT_FALSE(readLogHead(words.data())) << "another version";
+    (void)load();
+    ++words[2];
+    EXPECT_FALSE(readLogHead(words.data())) << "a writer at work: the copies differ";
+}
+
+TEST_F(RegistrySharing, AsksTheDatabaseWhenTheHeadOfTheLogIsOfAnotherVersion) {
+    const TestKey key(path);
+    key.write("a", "old");
+    EXPECT_EQ(key.read("a"), "old"); // remembered under this head
+    std::fstream index(m_sandbox.file.string() + "-shm", std::ios::binary | std::ios::in | std::ios::out);
+    const std::uint32_t other = tvx::registry::logHeadVersion + 1;
+    for (const std::size_t copy : {std::size_t{0}, sizeof(tvx::registry::LogHead)}) {
+        index.seekp(static_cast<std::streamoff>(copy));
+        index.write(reinterpret_cast<const char*>(&other), sizeof other);
+    }
+    index.close();
+    // The database finds that the head is not right and makes it anew from the log.
+    EXPECT_EQ(key.read("a"), "old");
+    EXPECT_TRUE(ChildProcess([](ChildProcess&) { TestKey(path).write("a", "new"); }).end());
+    EXPECT_EQ(key.read("a"), "new");
 }
 
 TEST_F(RegistrySharing, SeesThatAnotherFileHasTakenThePlace) {

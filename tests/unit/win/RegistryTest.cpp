@@ -120,6 +120,35 @@ TEST_F(Registry, DeletesValuesAndKeysWithoutKeysBelow) {
     EXPECT_EQ(TestKey("Software\\Tarvex\\board").read("b"), "<2>") << "a new key of the name has no old values";
 }
 
+TEST_F(Registry, CallsGoByTheirNamesWithoutALetterToo) {
+    HKEY made = nullptr;
+    HKEY opened = nullptr;
+    DWORD disposition = 0;
+    ASSERT_EQ(RegCreateKeyEx(HKEY_CURRENT_USER, "Software\\Tarvex", 0, nullptr, REG_OPTION_NON_VOLATILE,
+                             KEY_READ | KEY_WRITE, nullptr, &made, &disposition),
+              0);
+    EXPECT_EQ(disposition, DWORD{REG_CREATED_NEW_KEY});
+    const DWORD number = 7;
+    EXPECT_EQ(RegSetValueEx(made, "a", 0, REG_DWORD, reinterpret_cast<const BYTE*>(&number), sizeof number), 0);
+    ASSERT_EQ(RegOpenKeyEx(HKEY_CURRENT_USER, "Software", 0, KEY_READ, &opened), 0);
+    std::array<char, 20> name{};
+    DWORD size = name.size();
+    EXPECT_EQ(RegEnumKeyEx(opened, 0, name.data(), &size, nullptr, nullptr, nullptr, nullptr), 0);
+    EXPECT_STREQ(name.data(), "Tarvex");
+    size = name.size();
+    EXPECT_EQ(RegEnumValue(made, 0, name.data(), &size, nullptr, nullptr, nullptr, nullptr), 0);
+    EXPECT_STREQ(name.data(), "a");
+    DWORD read = 0;
+    size = sizeof read;
+    EXPECT_EQ(RegQueryValueEx(made, "a", nullptr, nullptr, reinterpret_cast<BYTE*>(&read), &size), 0);
+    EXPECT_EQ(read, number);
+    EXPECT_EQ(RegDeleteValue(made, "a"), 0);
+    EXPECT_EQ(RegCloseKey(made), 0);
+    EXPECT_EQ(RegDeleteKey(opened, "Tarvex"), 0);
+    EXPECT_EQ(RegCloseKey(opened), 0);
+    EXPECT_EQ(TestKey("Software\\Tarvex", TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND});
+}
+
 TEST_F(Registry, RefusesWhatAKeyWasNotOpenedFor) {
     TestKey("Software\\Tarvex").write("a", "1");
     const TestKey reading("Software\\Tarvex", TestKey::Way::Open, KEY_READ);

@@ -142,7 +142,7 @@ TEST_F(ResourceLibrary, IsOneModuleHoweverOftenItIsLoaded) {
     fs::create_symlink("host.DEU", "path/link.DEU");
     const HMODULE first = LoadLibraryA("host.DEU");
     ASSERT_NE(first, nullptr);
-    EXPECT_EQ(LoadLibraryA("link.DEU"), first);
+    EXPECT_EQ(LoadLibrary("link.DEU"), first);
     EXPECT_EQ(GetModuleHandleA("host.deu"), first);
     EXPECT_TRUE(FreeLibrary(first));
     EXPECT_NE(FindResourceA(first, MAKEINTRESOURCE(IDS_GREETING / 16 + 1), RT_STRING), nullptr);

@@ -39,6 +39,7 @@ TEST(Module, FileNameIsCutToTheBuffer) {
     char buffer[MAX_PATH * 4] = "";
     EXPECT_EQ(GetModuleFileNameA(nullptr, buffer, sizeof buffer), path.size());
     EXPECT_EQ(buffer, path);
+    EXPECT_EQ(GetModuleFileName(nullptr, buffer, sizeof buffer), path.size()) << "its name without a letter";
     EXPECT_EQ(GetModuleFileNameA(nullptr, buffer, 4), 4u);
     EXPECT_EQ(buffer, path.substr(0, 3));
     EXPECT_EQ(GetLastError(), ERROR_INSUFFICIENT_BUFFER);
@@ -72,9 +73,11 @@ TEST(Resource, MissingOnesTellWhichPartIsMissing) {
 
 TEST(Resource, NeutralLanguageWinsUnlessOneIsAskedFor) {
     EXPECT_EQ(textOf(tvx::resourceBytes(nullptr, MAKEINTRESOURCE(7), RT_RCDATA)), "neutral");
-    const HRSRC german = FindResourceExA(nullptr, RT_RCDATA, MAKEINTRESOURCE(7), MAKELANGID(7, 1));
+    const HRSRC german = FindResourceEx(nullptr, RT_RCDATA, MAKEINTRESOURCE(7), MAKELANGID(7, 1));
     ASSERT_NE(german, nullptr);
-    EXPECT_EQ(std::string(static_cast<char*>(LoadResource(nullptr, german)), 7), "deutsch");
+    const HGLOBAL data = LoadResource(nullptr, german);
+    EXPECT_FALSE(FreeResource(data));
+    EXPECT_EQ(std::string(static_cast<char*>(data), 7), "deutsch") << "there is nothing to free";
     EXPECT_EQ(tvx::resourceString(nullptr, IDS_GREETING), "Hello\tworld\n");
 }
 
