@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Installs what this project needs from Debian 12's own packages, and only what is missing.
 #
-#   scripts/setup.sh GROUP...     groups: build, display, tour, test, check, fuzz, coverage
+#   scripts/setup.sh GROUP...     groups: build, display, tour, test, bench, check, fuzz, coverage
 #
 # Runs as root or through sudo, and never asks. Installs nothing where nothing is missing.
 # TVX_SKIP_SETUP=1 skips it, for systems with other package names.
@@ -29,17 +29,18 @@ tour     xdotool          keys and clicks of the guided tour
 tour     wmctrl           finds and activates windows in the guided tour
 tour     imagemagick      takes the pictures of the guided tour
 test     libgtest-dev     the test programs' framework
-test     libbenchmark-dev the benchmark programs' framework
 test     xdotool          keys and clicks in desktop tests
 test     wmctrl           asks the window manager in desktop tests
 test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
+bench    libbenchmark-dev the benchmark programs' framework
+bench    libglib2.0-dev   a peer of the wildcards
 check    git              lists the files to check
 check    python3          the include, documentation and wording checks
 check    clang-format-19  the format check; other versions format differently
 check    clang-tidy-19    the lint check; older ones cannot parse the standard library's ranges
-fuzz     clang-19         compiles the fuzz targets; older ones cannot parse the standard library's ranges
-fuzz     libclang-rt-19-dev  the fuzzing and sanitizer run-time of that compiler
+fuzz     clang-19         compiles with sanitizers; older ones cannot parse the standard library's ranges
+fuzz     libclang-rt-19-dev  sanitizers and fuzzing engine of that compiler
 coverage gcovr            tells which lines the tests ran
 LIST
 }
