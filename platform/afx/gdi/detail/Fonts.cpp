@@ -166,7 +166,7 @@ std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
     if (!ensureGui()) {
         return nullptr;
     }
-    static const bool cleared = (qAddPostRoutine([] { fonts.clear(); }), true);
+    [[maybe_unused]] static const bool cleared = (qAddPostRoutine([] { fonts.clear(); }), true);
     constexpr std::size_t mostFonts = 256;
     if (fonts.size() > mostFonts) {
         fonts.clear();

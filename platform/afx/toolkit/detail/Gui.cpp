@@ -77,7 +77,7 @@ void makeApplication() {
     static int argc = 1;
     static std::string name = moduleFileName(nullptr);
     static char* argv[] = {name.data(), nullptr};
-    auto* application = new GuiApplication(argc, argv);
+    new GuiApplication(argc, argv); // the toolkit keeps it as qApp, to the end of the process
     threadOfWindows = GetCurrentThreadId();
     QApplication::setQuitOnLastWindowClosed(false);
     translateToolkit();
