@@ -54,7 +54,7 @@ std::string_view remark(const OptionRule& rule) {
 
 std::string countRemark(const PlainRule& rule) {
     const std::string least = std::to_string(rule.least);
-    if (rule.most == PlainRule::Unlimited) {
+    if (rule.most == PlainRule::unlimited) {
         return rule.least == 0 ? "  (any number)" : "  (at least " + least + ")";
     }
     if (rule.least == rule.most) {

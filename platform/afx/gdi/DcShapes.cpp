@@ -20,7 +20,7 @@ class Shape {
 public:
     explicit Shape(HDC handle) : dc(findContext(handle)) {
         if (dc) {
-            drawing.emplace(*dc);
+            m_drawing.emplace(*dc);
         }
     }
     /// What a drawing call answers: whether the context was valid.
@@ -28,10 +28,10 @@ public:
         return dc != nullptr;
     }
     [[nodiscard]] bool visible() const {
-        return drawing && *drawing;
+        return m_drawing && *m_drawing;
     }
     [[nodiscard]] Canvas& canvas() {
-        return drawing->canvas;
+        return m_drawing->canvas;
     }
     [[nodiscard]] const Mapping& mapping() const {
         return dc->state.mapping;
@@ -48,7 +48,7 @@ public:
     std::shared_ptr<DeviceContext> dc;
 
 private:
-    std::optional<Drawing> drawing;
+    std::optional<Drawing> m_drawing;
 };
 
 QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {

@@ -177,7 +177,7 @@ private:
         const std::string_view from = trim(range.substr(0, dots));
         const std::string_view to = dots == std::string_view::npos ? from : trim(range.substr(dots + 2));
         const auto least = toCount(from);
-        const auto most = to == "*" ? PlainRule::Unlimited : toCount(to);
+        const auto most = to == "*" ? PlainRule::unlimited : toCount(to);
         if (!least || !most || *least > *most) {
             return false;
         }

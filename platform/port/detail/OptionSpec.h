@@ -24,7 +24,7 @@ struct OptionRule {
 
 /// The plain arguments, with a name for the usage summary. Without a line for them none are allowed.
 struct PlainRule {
-    static constexpr std::size_t Unlimited = std::numeric_limits<std::size_t>::max();
+    static constexpr std::size_t unlimited = std::numeric_limits<std::size_t>::max();
 
     std::string name;
     std::size_t least = 0;
