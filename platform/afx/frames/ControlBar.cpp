@@ -18,15 +18,6 @@ BEGIN_MESSAGE_MAP(CControlBar, CWnd)
 END_MESSAGE_MAP()
 // clang-format on
 
-namespace {
-
-QToolBar* toolsOf(const CControlBar& bar) {
-    const Window* state = bar.GetState();
-    return state ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
-}
-
-} // namespace
-
 CControlBar::~CControlBar() {
     if (CFrameWnd* frame = m_hWnd ? GetDockingFrame() : nullptr) {
         frame->removeBar(this);

@@ -18,7 +18,10 @@ public:
 
     /// Takes a template over. Adding one a second time changes nothing.
     virtual void AddDocTemplate(CDocTemplate* docTemplate);
+    /// Where a walk over the templates begins, in the order they were added; null when there is none.
     virtual POSITION GetFirstDocTemplatePosition() const;
+    /// The template at a position, which moves on to the next one; null position: no more. The template stays this
+    /// object's.
     virtual CDocTemplate* GetNextDocTemplate(POSITION& position) const;
     /// File New: makes a document; where several templates have a name for File New, the user chooses.
     virtual void OnFileNew();
@@ -35,8 +38,13 @@ public:
                                   CDocTemplate* docTemplate);
     /// Opens a file with the template that fits it best, or activates it when it is open already. Null when it failed.
     virtual CDocument* OpenDocumentFile(LPCSTR fileName);
+    /// Asks for each modified document of all templates. FALSE at the first one that the user cancelled or that could
+    /// not be saved; those before it have been saved.
     virtual BOOL SaveAllModified();
+    /// Closes all documents without asking; call SaveAllModified first.
+    /// @param endSession handed on to the templates
     virtual void CloseAllDocuments(BOOL endSession);
+    /// Number of open documents of all templates.
     virtual int GetOpenDocumentCount();
 
 protected:

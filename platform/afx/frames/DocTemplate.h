@@ -59,9 +59,14 @@ public:
 
     // --- documents ---
 
+    /// Where a walk over the open documents begins; null when there is none.
     virtual POSITION GetFirstDocPosition() const = 0;
+    /// The document at a position, which moves on to the next one; null position: no more. Do not
+    /// close documents during the walk.
     virtual CDocument* GetNextDoc(POSITION& position) const = 0;
+    /// Takes a document into the list of open ones. CreateNewDocument calls it.
     virtual void AddDocument(CDocument* document);
+    /// Takes a document out of the list. The document's destructor calls it.
     virtual void RemoveDocument(CDocument* document);
     /// A new, empty document object of the template's class. Null when it cannot be made.
     virtual CDocument* CreateNewDocument();
@@ -77,11 +82,14 @@ public:
     virtual void SetDefaultTitle(CDocument* document) = 0;
     /// Asks for each modified document. FALSE when the user cancelled.
     virtual BOOL SaveAllModified();
+    /// Closes all documents of this kind without asking.
+    /// @param endSession not used by the base
     virtual void CloseAllDocuments(BOOL endSession);
     /// Loads the resources that the frames share. Called by AddDocTemplate.
     virtual void LoadTemplate();
 
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
+    /// Hands idle time on to each open document.
     void OnIdle();
 
     /// Whether the application object deletes the template. TRUE.
@@ -102,6 +110,8 @@ class TVX_PLATFORM_API CSingleDocTemplate : public CDocTemplate {
     DECLARE_DYNAMIC(CSingleDocTemplate)
 
 public:
+    /// @param id number of the menu, accelerators, icon and string
+    /// @param docClass,frameClass,viewClass classes that can be made by name (DECLARE_DYNCREATE)
     CSingleDocTemplate(UINT id, CRuntimeClass* docClass, CRuntimeClass* frameClass, CRuntimeClass* viewClass);
     ~CSingleDocTemplate() override;
 
@@ -126,6 +136,9 @@ class TVX_PLATFORM_API CMultiDocTemplate : public CDocTemplate {
     DECLARE_DYNAMIC(CMultiDocTemplate)
 
 public:
+    /// @param id number of the child frames' menu, accelerators, icon and string
+    /// @param docClass,frameClass,viewClass classes that can be made by name; the frame's is CMDIChildWnd or derived
+    /// from it
     CMultiDocTemplate(UINT id, CRuntimeClass* docClass, CRuntimeClass* frameClass, CRuntimeClass* viewClass);
     ~CMultiDocTemplate() override;
 

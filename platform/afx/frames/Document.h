@@ -46,12 +46,15 @@ public:
     }
     /// Names the file; the title becomes its last part.
     virtual void SetPathName(LPCSTR path, BOOL addToRecent = TRUE);
+    /// The template that made the document and lists it, null for a document made without one.
     CDocTemplate* GetDocTemplate() const {
         return m_pDocTemplate;
     }
+    /// Whether there are changes that have not been saved.
     virtual BOOL IsModified() {
         return m_bModified;
     }
+    /// Notes that the contents have changed or, with FALSE, that they are as saved. It changes no caption.
     virtual void SetModifiedFlag(BOOL modified = TRUE) {
         m_bModified = modified;
     }
@@ -62,6 +65,7 @@ public:
     void AddView(CView* view);
     /// Unties a view; the last one's end deletes the document.
     void RemoveView(CView* view);
+    /// Where a walk over the views begins; null when there is none.
     virtual POSITION GetFirstViewPosition() const;
     /// The view at a position, which moves on to the next one; null position: no more.
     virtual CView* GetNextView(POSITION& position) const;
@@ -80,6 +84,8 @@ public:
 
     /// Empties the document. Called before a new or opened one begins and when it is closed.
     virtual void DeleteContents();
+    /// Begins an empty document: the base calls DeleteContents and forgets name and changes. A derived class calls it
+    /// first.
     virtual BOOL OnNewDocument();
     /// Loads a file through Serialize.
     virtual BOOL OnOpenDocument(LPCSTR path);
@@ -117,9 +123,14 @@ public:
 
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
 
+    /// File Save, File Save As and File Close, bound by this class.
+    /// @{
     afx_msg void OnFileSave();
     afx_msg void OnFileSaveAs();
     afx_msg void OnFileClose();
+    /// @}
+    /// Greys its item while there is nothing to save. The base does not bind it: a host that wants this binds it to
+    /// ID_FILE_SAVE.
     afx_msg void OnUpdateFileSave(CCmdUI* item);
 
 protected:

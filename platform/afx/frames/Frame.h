@@ -62,6 +62,7 @@ public:
     /// Leaves place and size to the window manager.
     static const CRect rectDefault;
 
+    /// Makes the object; Create or LoadFrame makes the window.
     CFrameWnd();
     ~CFrameWnd() override;
 

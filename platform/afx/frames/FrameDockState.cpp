@@ -29,10 +29,6 @@ struct DockPlace {
     int place = 0;
 };
 
-QToolBar* toolsOf(const CControlBar& bar) {
-    return bar.GetState() ? qobject_cast<QToolBar*>(bar.GetState()->widget()) : nullptr;
-}
-
 /// All tool bars side by side and row by row, as the toolkit's layout has them.
 std::vector<DockPlace> dockPlaces(const QMainWindow& main) {
     std::vector<DockPlace> places;

@@ -27,16 +27,29 @@ public:
     /// The active child frame, null when there is none.
     /// @param maximized receives whether it is maximised; may be null
     CMDIChildWnd* MDIGetActive(BOOL* maximized = nullptr) const;
+    /// Makes a child frame the active one.
     void MDIActivate(CWnd* child);
+    /// Activates the next or the previous child frame.
+    /// @{
     void MDINext();
     void MDIPrev();
+    /// @}
+    /// Maximises a child frame, or gives it back its size.
+    /// @{
     void MDIMaximize(CWnd* child);
     void MDIRestore(CWnd* child);
+    /// @}
+    /// Lays the child frames one over the other, each a step further. `type` changes nothing here.
+    /// @{
     void MDICascade();
     void MDICascade(int type);
+    /// @}
+    /// Lays the child frames one above the other.
     void MDITile();
     /// @param type MDITILE_VERTICAL (side by side) or MDITILE_HORIZONTAL (one above the other)
     void MDITile(int type);
+    /// Asks the client window to put the minimised child frames in rows (WM_MDIICONARRANGE). The toolkit's client has
+    /// no such order: they stay where they are.
     void MDIIconArrange();
     /// Shows another menu and answers the one shown before; null leaves it.
     /// @param windowMenu the popup that lists the child frames, null finds it
@@ -62,8 +75,11 @@ public:
     afx_msg void OnDestroy();
     afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);
     afx_msg void OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu);
+    /// Greys the Window commands while there is no child frame.
     afx_msg void OnUpdateMDIWindowCmd(CCmdUI* item);
+    /// Window Arrange, Cascade and Tile (ID_WINDOW_...). FALSE for another command, which goes on along its route.
     afx_msg BOOL OnMDIWindowCmd(UINT id);
+    /// Window New: another frame with a view of the active document; without a document nothing happens.
     afx_msg void OnWindowNew();
 
 protected:
@@ -97,18 +113,27 @@ public:
     /// The menu and accelerators in force while this frame is active; they stay the caller's.
     void SetHandles(HMENU menu, HACCEL accelerators);
 
+    /// The main frame that holds this one, null while there is none.
     CMDIFrameWnd* GetMDIFrame() const;
     /// Closes without asking. The document is asked by WM_CLOSE.
     void MDIDestroy();
+    /// Makes this the active child frame.
     void MDIActivate();
+    /// Maximises this frame, or gives it back its size.
+    /// @{
     void MDIMaximize();
     void MDIRestore();
+    /// @}
 
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL DestroyWindow() override;
     void ActivateFrame(int command = -1) override;
     void OnUpdateFrameMenu(HMENU alternative) override;
+    /// Shows in the main frame the menu that belongs to this state.
+    /// @param activate whether this frame becomes active
+    /// @param activated the frame that becomes active; null when none does, which brings the main frame's own menu back
+    /// @param alternative shown instead of this frame's menu; null for none
     virtual void OnUpdateFrameMenu(BOOL activate, CWnd* activated, HMENU alternative);
     void OnUpdateFrameTitle(BOOL addToTitle) override;
     HACCEL GetDefaultAccelerator() override;

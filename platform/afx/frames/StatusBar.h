@@ -40,17 +40,25 @@ public:
 
     /// Index of a pane's number, -1 when there is none.
     int CommandToIndex(UINT id) const;
+    /// Number of a pane; 0 for an index outside the bar.
     UINT GetItemID(int index) const;
     /// Place of a pane in the bar's client area; empty for an index outside.
     void GetItemRect(int index, RECT* rect) const;
+    /// Text of a pane; empty for an index outside the bar.
+    /// @{
     CString GetPaneText(int index) const;
     void GetPaneText(int index, CString& text) const;
+    /// @}
     /// Shows a text in a pane. FALSE for an index outside the bar.
     virtual BOOL SetPaneText(int index, LPCSTR text, BOOL update = TRUE);
+    /// SBPS_... style of a pane; 0 for an index outside the bar.
     UINT GetPaneStyle(int index) const;
+    /// Changes the style of a pane and shows it so. An index outside the bar changes nothing.
     void SetPaneStyle(int index, UINT style);
     /// Number, SBPS_... style and width of the text area in pixels.
     void GetPaneInfo(int index, UINT& id, UINT& style, int& width) const;
+    /// Changes number, SBPS_... style and width (pixels) of a pane; its text stays. An index outside the bar changes
+    /// nothing.
     void SetPaneInfo(int index, UINT id, UINT style, int width);
 
     void OnUpdateCmdUI(CFrameWnd* target, BOOL disable) override;

@@ -4,6 +4,7 @@
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/frames/detail/BarWindow.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/gdi/detail/ButtonImages.h"
 #include "platform/win/ExtensionModule.h"
@@ -33,11 +34,6 @@ constexpr DWORD barStyles = 0x0040FFFF;
 constexpr int buttonMargin = 7;
 /// Separators from this width on make room for a control.
 constexpr int placeholderWidth = 9;
-
-QToolBar* toolsOf(const CWnd& bar) {
-    const Window* state = bar.GetState();
-    return state ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
-}
 
 QAction* actionAt(const CWnd& bar, int index) {
     const QToolBar* tools = toolsOf(bar);

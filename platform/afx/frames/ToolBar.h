@@ -74,6 +74,7 @@ public:
     virtual void GetItemRect(int index, RECT* rect) const;
     /// TBBS_... style (low half) and state (high half) of a button.
     UINT GetButtonStyle(int index) const;
+    /// Changes style and state of a button. An index outside the bar changes nothing.
     void SetButtonStyle(int index, UINT style);
     /// Command, style and picture of a button; of a separator the picture's number is its width in pixels.
     void GetButtonInfo(int index, UINT& id, UINT& style, int& image) const;
@@ -82,6 +83,7 @@ public:
     void SetButtonInfo(int index, UINT id, UINT style, int image);
     /// Text below (or instead of) the picture; empty for none.
     BOOL SetButtonText(int index, LPCSTR text);
+    /// Text of a button; empty when it has none and for an index outside the bar.
     CString GetButtonText(int index) const;
 
     void OnUpdateCmdUI(CFrameWnd* target, BOOL disable) override;

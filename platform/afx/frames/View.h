@@ -54,10 +54,15 @@ public:
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
     CScrollBar* GetScrollBarCtrl(int bar) const override;
 
+    /// Ties the view to the document of its creation context.
     afx_msg int OnCreate(CREATESTRUCT* cs);
+    /// Takes the view away as the frame's active one.
     afx_msg void OnDestroy();
+    /// Prepares a context and calls OnDraw.
     afx_msg void OnPaint();
+    /// A click makes the view its frame's active one, unless a handler answered that it must not activate.
     afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);
+    /// The first update of the frame's windows: calls OnInitialUpdate.
     afx_msg LRESULT OnInitialUpdateMessage(WPARAM, LPARAM);
 
 protected:

@@ -115,6 +115,11 @@ constexpr Side sides[] = {{AFX_IDW_DOCKBAR_TOP, Qt::TopToolBarArea, CBRS_ALIGN_T
 
 } // namespace
 
+QToolBar* toolsOf(const CWnd& bar) {
+    const Window* state = bar.GetState();
+    return state ? qobject_cast<QToolBar*>(state->widget()) : nullptr;
+}
+
 UINT dockBarOf(Qt::ToolBarArea area) {
     const auto* side = std::find_if(std::begin(sides), std::end(sides), [=](const Side& s) { return s.area == area; });
     return side != std::end(sides) ? side->dockBar : 0;

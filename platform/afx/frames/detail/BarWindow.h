@@ -5,6 +5,7 @@
 
 #include "platform/afx/core/detail/Window.h"
 
+class CWnd;
 class QMainWindow;
 class QToolBar;
 
@@ -29,6 +30,9 @@ public:
 protected:
     QWidget* makeWidget(QWidget* parent) override;
 };
+
+/// The toolkit's tool bar behind a bar; null for a bar of another kind and for one without a window.
+[[nodiscard]] QToolBar* toolsOf(const CWnd& bar);
 
 /// A side of a frame under its three names: the dock bar's identifier, the toolkit's area, the CBRS_ALIGN_... bit. What
 /// is no side is 0, and the area at the top.
