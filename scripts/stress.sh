@@ -15,7 +15,8 @@ usage() {
     sed -n '2,/^set/s/^# \{0,1\}//p' "$0" >&2
     exit 2
 }
-busy='' preset=debug output=build/stress
+root=$(cd "$(dirname "$0")/.." && pwd)
+busy='' preset=debug output="$root/build/stress"
 while getopts bo:p: option; do
     case "$option" in
     b) busy=1 ;;
@@ -29,7 +30,7 @@ if [ $# -lt 2 ] || ! [[ $1 =~ ^[1-9][0-9]*$ ]]; then usage; fi
 times=$1
 shift
 output=$(mkdir -p "$output" && cd "$output" && pwd)
-cd "$(dirname "$0")/.."
+cd "$root"
 
 loops=()
 stop() {
