@@ -2,7 +2,8 @@
 
 /// @file
 /// What nearly every source of the rooms includes and rarely changes, parsed once for all of them. Sources include what
-/// they use all the same: a build with CMAKE_DISABLE_PRECOMPILE_HEADERS, such as the lint check's, finds what is missing.
+/// they use all the same: a build with CMAKE_DISABLE_PRECOMPILE_HEADERS, such as the lint check's, finds what is
+/// missing.
 
 #include "platform/base/Collections.h"
 #include "platform/base/Exception.h"
