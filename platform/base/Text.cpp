@@ -249,7 +249,7 @@ bool copyWhole(std::string_view text, char* buffer, std::size_t size) noexcept {
 
 std::size_t copyCut(std::string_view text, char* buffer, std::size_t size) noexcept {
     const std::size_t length = characterStart(text, std::min(text.size(), size - 1));
-    std::copy_n(text.data(), length, buffer);
+    text.copy(buffer, length);
     buffer[length] = '\0';
     return length;
 }
