@@ -16,6 +16,8 @@
 #include <QWidget>
 #include <QWindow>
 
+#include <csignal>
+#include <cstdlib>
 #include <memory>
 #include <string>
 
@@ -101,6 +103,25 @@ protected:
 
 const CRect givenPlace(90, 70, 690, 520);
 
+/// Halts the window manager for a while, as a machine with other work does.
+class HaltedManager {
+public:
+    HaltedManager() : m_process(std::atoi(std::getenv("TVX_WINDOW_MANAGER"))) {
+        EXPECT_EQ(kill(m_process, SIGSTOP), 0);
+    }
+    ~HaltedManager() {
+        kill(m_process, SIGCONT);
+    }
+    HaltedManager(const HaltedManager&) = delete;
+    HaltedManager& operator=(const HaltedManager&) = delete;
+
+private:
+    pid_t m_process;
+};
+
+/// As long as a user takes for something else; windows must get right whenever the window manager goes on.
+constexpr int meanwhile = 500;
+
 } // namespace
 
 TEST_F(FramesOnDesktop, PlacedBeforeTheFirstShowStandAtTheRectangle) {
@@ -163,6 +184,39 @@ TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangle) {
     placement.showCmd = SW_SHOWNORMAL;
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     standsAt(givenPlace);
+}
+
+TEST_F(FramesOnDesktop, ShownAndMovedBeforeTheWindowManagerComesToItStandAtTheLastRectangle) {
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(CRect(10, 20, 500, 400), SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        QTest::qWait(meanwhile);
+        frame->MoveWindow(givenPlace);
+        QTest::qWait(meanwhile);
+    }
+    standsAt(givenPlace);
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+}
+
+TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangleAlsoLate) {
+    frame->ShowWindow(SW_SHOWMAXIMIZED);
+    ASSERT_TRUE(fillsScreen());
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(givenPlace, SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        QTest::qWait(meanwhile);
+        EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+    }
+    standsAt(givenPlace);
+    {
+        const HaltedManager halted;
+        frame->ShowWindow(SW_SHOWMAXIMIZED);
+        QTest::qWait(meanwhile);
+    }
+    ASSERT_TRUE(fillsScreen());
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
 }
 
 TEST_F(FramesOnDesktop, MinimizedSayWhetherTheyWereMaximized) {
