@@ -7,6 +7,7 @@
 #include "platform/afx/core/Wnd.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Keys.h"
+#include "platform/afx/core/detail/Menus.h"
 #include "platform/afx/dialogs/detail/DialogWindow.h"
 
 #include <QApplication>
@@ -152,25 +153,12 @@ bool onEnter(Window& dialog, Window* focus) {
 
 // --- mnemonics ---
 
-QChar mnemonicOf(const QString& text) {
-    for (int at = 0; at + 1 < text.size(); ++at) {
-        if (text.at(at) != QLatin1Char('&')) {
-            continue;
-        }
-        if (text.at(at + 1) != QLatin1Char('&')) {
-            return text.at(at + 1).toUpper();
-        }
-        ++at;
-    }
-    return {};
-}
-
 /// The controls whose text carries this mnemonic, hidden and disabled ones left out.
-std::vector<Window*> withMnemonic(const std::vector<Window*>& controls, QChar letter) {
+std::vector<Window*> withMnemonic(const std::vector<Window*>& controls, char32_t letter) {
     std::vector<Window*> found;
     for (Window* window : controls) {
         const auto* control = dynamic_cast<const Control*>(window);
-        if (control && mnemonicOf(control->mnemonicText()) == letter) {
+        if (control && accessKey(fromQt(control->mnemonicText())) == letter) {
             found.push_back(window);
         }
     }
@@ -209,9 +197,7 @@ bool activate(const std::vector<Window*>& controls, Window* chosen, bool unique)
 bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
     std::vector<Window*> controls;
     collect(dialog, controls);
-    const auto codePoint = static_cast<char32_t>(character);
-    const QString letter = QString::fromUcs4(&codePoint, 1).toUpper();
-    const auto found = withMnemonic(controls, letter.at(0));
+    const auto found = withMnemonic(controls, QChar::toLower(static_cast<char32_t>(character)));
     if (found.empty()) {
         return false;
     }

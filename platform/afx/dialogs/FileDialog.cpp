@@ -7,6 +7,7 @@
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/SystemPath.h"
+#include "platform/base/Text.h"
 #include "platform/win/FrameworkIds.h"
 
 #include <QFileDialog>
@@ -29,7 +30,7 @@ CFileDialog::CFileDialog(BOOL openDialog, LPCSTR defaultExtension, LPCSTR fileNa
     m_ofn.nFilterIndex = 1;
     m_ofn.lpstrDefExt = defaultExtension ? m_defaultExtension.GetString() : nullptr;
     if (fileName) {
-        std::strncpy(m_fileName, fileName, sizeof(m_fileName) - 1);
+        tvx::text::copyCut(fileName, m_fileName, sizeof(m_fileName));
     }
     if (filter) {
         m_filter = filter;
