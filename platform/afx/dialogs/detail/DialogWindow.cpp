@@ -22,6 +22,8 @@
 #include <QWindow>
 
 #include <cstdio>
+#include <set>
+#include <string>
 
 namespace tvx::afx {
 
@@ -275,11 +277,24 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 namespace {
 
+/// Tells of a class that a template names and nobody has registered: the host forgot to, or relies on a control that
+/// does not exist here. Once for each class, as dialogs are opened again and again.
+void tellUnknownClass(const std::string& className) {
+    static std::set<std::string> told;
+    if (told.insert(className).second) {
+        std::fprintf(stderr, "Nobody has registered the window class %s: dialogs show an empty pane instead.\n",
+                     className.c_str());
+    }
+}
+
 HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
     const std::string caption = captionOf(item.title);
     const QRect place = dialog.map(item.rect);
     CREATESTRUCT cs{};
     const bool known = findWindowClass(item.className.c_str()) != nullptr;
+    if (!known) {
+        tellUnknownClass(item.className);
+    }
     cs.lpszClass = known ? item.className.c_str() : emptyPaneClass;
     cs.lpszName = caption.c_str();
     const DWORD later = WS_VISIBLE | (known ? 0U : DWORD{WS_TABSTOP});
