@@ -79,10 +79,13 @@ public:
         guarded([this] { hide(); });
         return answer == QDialog::Accepted;
     }
+    /// The toolkit calls this from slots of its own. A host whose OnFileNameOK throws ends the loop with that.
     void done(int result) override {
-        if (result != QDialog::Accepted || isAccepted()) {
-            m_loop.end(result);
-        }
+        storing([&] {
+            if (result != QDialog::Accepted || isAccepted()) {
+                m_loop.end(result);
+            }
+        });
     }
 
 private:

@@ -27,7 +27,7 @@ protected:
     void paintEvent(QPaintEvent* event) override {
         if (m_window.type() == BS_OWNERDRAW) {
             QPainter painter(this);
-            m_window.paintByOwner(painter);
+            storing([&] { m_window.paintByOwner(painter); });
             return;
         }
         Base::paintEvent(event);
@@ -311,7 +311,7 @@ LRESULT ButtonWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 // --- painting ---
 
-bool ButtonWindow::paintByOwner(QPainter& painter) {
+void ButtonWindow::paintByOwner(QPainter& painter) {
     const HWND self = handle();
     OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
     DRAWITEMSTRUCT item{};
@@ -323,7 +323,6 @@ bool ButtonWindow::paintByOwner(QPainter& painter) {
     if (from(self)) {
         painter.drawImage(0, 0, drawing.image());
     }
-    return true;
 }
 
 /// The title interrupts the frame's upper edge, as templates are drawn for; the toolkit's styles put it above.

@@ -5,6 +5,7 @@
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/base/Text.h"
 
 #include <QAbstractItemView>
 #include <QComboBox>
@@ -14,6 +15,7 @@
 #include <QStringListModel>
 #include <QStylePainter>
 #include <QStyledItemDelegate>
+#include <QValidator>
 #include <QWheelEvent>
 
 #include <cstring>
@@ -59,6 +61,19 @@ private:
 
 namespace {
 
+/// Refuses what the user types beyond a number of bytes. The toolkit's own limit counts units of UTF-16, and cuts what
+/// the program sets as well.
+class ByteLimit : public QValidator {
+public:
+    ByteLimit(QObject* parent, int limit) : QValidator(parent), m_limit(limit) {}
+    State validate(QString& input, int&) const override {
+        return hostBytes(input) <= m_limit ? Acceptable : Invalid;
+    }
+
+private:
+    int m_limit;
+};
+
 class ItemDelegate : public QStyledItemDelegate {
 public:
     ItemDelegate(QObject* parent, ComboBoxWindow& window) : QStyledItemDelegate(parent), m_window(window) {}
@@ -72,7 +87,7 @@ public:
             return;
         }
         const UINT state = (option.state & QStyle::State_Selected) != 0 ? ODS_SELECTED : 0U;
-        painter->drawImage(option.rect, m_window.paintItem(index.row(), option.rect.size(), state));
+        storing([&] { painter->drawImage(option.rect, m_window.paintItem(index.row(), option.rect.size(), state)); });
     }
 
 private:
@@ -85,7 +100,7 @@ public:
     void showPopup() override {
         if (!m_open) {
             m_open = true;
-            m_window.listShown(true);
+            storing([this] { m_window.listShown(true); });
         }
         QComboBox::showPopup();
     }
@@ -93,7 +108,7 @@ public:
         QComboBox::hidePopup();
         if (m_open) {
             m_open = false;
-            m_window.listShown(false);
+            storing([this] { m_window.listShown(false); });
         }
     }
 
@@ -117,7 +132,7 @@ protected:
         const QRect field = style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this);
         if (currentIndex() >= 0) {
             const UINT state = ODS_COMBOBOXEDIT | (hasFocus() ? ODS_FOCUS : 0U) | (isEnabled() ? 0U : ODS_DISABLED);
-            painter.drawImage(field, m_window.paintItem(currentIndex(), field.size(), state));
+            storing([&] { painter.drawImage(field, m_window.paintItem(currentIndex(), field.size(), state)); });
         }
     }
     void wheelEvent(QWheelEvent* event) override {
@@ -478,7 +493,10 @@ LRESULT ComboBoxWindow::fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bo
     }
     const QString text = field()->text();
     if (message == CB_LIMITTEXT) {
-        field()->setMaxLength(wParam == 0 ? 32767 : static_cast<int>(std::min<WPARAM>(wParam, 32767)));
+        const QValidator* old = field()->validator();
+        const int limit = text::clampToInt32(static_cast<LONG_PTR>(wParam));
+        field()->setValidator(limit > 0 ? new ByteLimit(field(), limit) : nullptr);
+        delete old;
         return TRUE;
     }
     if (message == CB_SETEDITSEL) {

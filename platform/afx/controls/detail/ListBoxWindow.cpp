@@ -23,6 +23,7 @@ namespace {
 /// Distance of a line's text from the left edge.
 constexpr int textIndent = 3;
 
+/// The toolkit calls these by its own frames, also without an event of its own: what a host's handler throws is stored.
 class ListArea : public QAbstractScrollArea {
 public:
     ListArea(QWidget* parent, ListBoxWindow& window) : QAbstractScrollArea(parent), m_window(window) {
@@ -33,23 +34,26 @@ public:
 protected:
     void paintEvent(QPaintEvent* event) override {
         QPainter painter(viewport());
-        m_window.paint(painter, event->rect());
+        storing([&] { m_window.paint(painter, event->rect()); });
     }
     void mousePressEvent(QMouseEvent* event) override {
-        m_window.press(*event, false);
+        storing([&] { m_window.press(*event, false); });
     }
     void mouseDoubleClickEvent(QMouseEvent* event) override {
-        m_window.press(*event, true);
+        storing([&] { m_window.press(*event, true); });
     }
     void mouseMoveEvent(QMouseEvent* event) override {
-        m_window.drag(*event);
+        storing([&] { m_window.drag(*event); });
     }
     void keyPressEvent(QKeyEvent* event) override {
-        event->setAccepted(m_window.key(*event));
+        // A key whose handler failed is done with: the toolkit must not offer it to the parent as well.
+        bool taken = true;
+        storing([&] { taken = m_window.key(*event); });
+        event->setAccepted(taken);
     }
     void resizeEvent(QResizeEvent* event) override {
         QAbstractScrollArea::resizeEvent(event);
-        m_window.applyRange();
+        storing([this] { m_window.applyRange(); });
     }
     void focusInEvent(QFocusEvent* event) override {
         QAbstractScrollArea::focusInEvent(event);

@@ -23,7 +23,7 @@ public:
 protected:
     void paintEvent(QPaintEvent*) override {
         QPainter painter(this);
-        m_window.paint(painter);
+        storing([&] { m_window.paint(painter); }); // an owner-drawn one asks the host
     }
 
 private:
