@@ -361,7 +361,3 @@ void CDocument::OnFileClose() {
         OnCloseDocument();
     }
 }
-
-void CDocument::OnUpdateFileSave(CCmdUI* item) {
-    item->Enable(IsModified());
-}

@@ -82,10 +82,6 @@ void CView::OnPaint() {
     OnDraw(&dc);
 }
 
-BOOL CView::IsSelected(const CObject*) const {
-    return FALSE;
-}
-
 CScrollBar* CView::GetScrollBarCtrl(int bar) const {
     return CWnd::GetScrollBarCtrl(bar);
 }
