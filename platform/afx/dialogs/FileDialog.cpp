@@ -68,6 +68,7 @@ QStringList filtersOf(LPCSTR text) {
 class Dialog : public QFileDialog {
 public:
     explicit Dialog(QWidget* over) : QFileDialog(over) {
+        // A desktop's own dialog would wait in a loop of its own, and close without asking the host.
         setOption(QFileDialog::DontUseNativeDialog);
         setWindowModality(Qt::ApplicationModal);
     }

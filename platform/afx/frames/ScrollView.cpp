@@ -36,6 +36,7 @@ BOOL CScrollView::PreCreateWindow(CREATESTRUCT& cs) {
 void CScrollView::SetScrollSizes(int mapMode, SIZE total, const SIZE& page, const SIZE& line) {
     const int oldMode = std::exchange(m_mapMode, mapMode);
     m_totalLog = total;
+    // The screen's context: sizes may be told before the view has a window.
     CClientDC dc(nullptr);
     dc.SetMapMode(mapMode);
     const auto toDevice = [&dc](SIZE size) {
@@ -228,6 +229,7 @@ BOOL CScrollView::OnScroll(UINT code, UINT position, BOOL doScroll) {
     const int dx = distanceOf(LOBYTE(code), position, m_position.x, m_pageDev.cx, m_lineDev.cx, limit.x);
     const int dy = distanceOf(HIBYTE(code), position, m_position.y, m_pageDev.cy, m_lineDev.cy, limit.y);
     const BOOL moved = OnScrollBy(CSize(dx, dy), doScroll);
+    // Painted at once: while the slider is dragged, messages come faster than the loop gets to painting.
     if (moved && doScroll) {
         UpdateWindow();
     }
@@ -265,6 +267,7 @@ void CScrollView::OnVScroll(UINT code, UINT position, CScrollBar* bar) {
 }
 
 BOOL CScrollView::OnMouseWheel(UINT flags, short delta, CPoint point) {
+    // With a modifier key the wheel is the host's, mostly for zooming.
     if ((flags & (MK_SHIFT | MK_CONTROL)) != 0 || limits().y == 0) {
         return CView::OnMouseWheel(flags, delta, point);
     }

@@ -173,11 +173,13 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     face->setModel(m_model.get());
     m_noLines = new QStringListModel(face);
     face->setItemDelegate(new ItemDelegate(face, *this));
+    // By default the toolkit adds to the lines what is typed and ended with Enter.
     face->setInsertPolicy(QComboBox::NoInsert);
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
     connectStoring(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
     if (isEditable()) {
         face->setEditable(true);
+        // The toolkit would complete what is typed with the first line that begins so.
         face->setCompleter(nullptr);
         connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
             const HWND self = handle();
@@ -209,6 +211,7 @@ void ComboBoxWindow::widgetMade() {
 
 void ComboBoxWindow::fontChanged() {
     Control::fontChanged();
+    // The lines of an owner-drawn box are as high as the owner answered, whatever the font.
     if (!isOwnerDrawn()) {
         m_itemHeight = widget()->fontMetrics().height() + 2;
     }
@@ -221,6 +224,7 @@ void ComboBoxWindow::measure() {
     item.CtlID = static_cast<UINT>(id());
     item.itemHeight = static_cast<UINT>(m_itemHeight);
     SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    // Whatever the owner answers, a line has a height: lines are counted by dividing by it.
     m_itemHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
     applyHeights();
 }
@@ -228,6 +232,7 @@ void ComboBoxWindow::measure() {
 void ComboBoxWindow::applyHeights() {
     const int closed = std::max(widget()->fontMetrics().height(), m_itemHeight) + 8;
     guarded([&] {
+        // The height that hosts give is that of the open list; closed, a box is as high as its line.
         widget()->setFixedHeight(closed);
         box()->setMaxVisibleItems(std::clamp((m_openHeight - closed) / m_itemHeight, 1, 100));
     });
@@ -249,6 +254,7 @@ QString ComboBoxWindow::text() const {
 }
 
 void ComboBoxWindow::setText(const QString& text) {
+    // The text of a box that is not typed into is its chosen line, and changes with the choice only.
     if (box() && isEditable()) {
         guarded([&] { field()->setText(text); });
     }
@@ -291,6 +297,7 @@ void ComboBoxWindow::listShown(bool shown) {
         notify(CBN_DROPDOWN);
         return;
     }
+    // A list that closes without a choice tells so before it tells that it closes.
     if (!m_chosenWhileOpen) {
         notify(CBN_SELENDCANCEL);
     }
@@ -359,6 +366,7 @@ LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
     const int row = static_cast<int>(index);
     tellDeleted(row);
     guarded([&] {
+        // The toolkit would choose a neighbour of the line that goes; here nothing is chosen then.
         const int current = box()->currentIndex();
         m_model->removeAt(row, [&] { m_items.remove(row); });
         box()->setCurrentIndex(current == row ? -1 : current > row ? current - 1 : current);
@@ -530,6 +538,7 @@ LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
         return 0;
     }
     if (message == WM_DESTROY) {
+        // The owner frees its data while the control can still be asked about its lines.
         for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
             tellDeleted(row);
         }

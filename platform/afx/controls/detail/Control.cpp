@@ -58,6 +58,7 @@ void Control::fontChanged() {
 }
 
 void Control::notify(int code) {
+    // What the handler changes may change the states of commands.
     armIdle();
     if (parent() && !isDestroyed()) {
         SendMessageA(parent()->handle(), WM_COMMAND, MAKEWPARAM(id(), code), reinterpret_cast<LPARAM>(handle()));
@@ -91,6 +92,7 @@ Control::Colors Control::chosenColors() const {
         return {};
     }
     Colors colors{true, fromColorRef(context->state.textColor).rgb(), 0};
+    // Any other brush, such as the hollow one, leaves the background transparent.
     if (brush->description.lbStyle == BS_SOLID) {
         const bool system = brush->systemColor >= 0;
         colors.background = fromColorRef(system ? GetSysColor(brush->systemColor) : brush->description.lbColor).rgb();
@@ -101,6 +103,7 @@ Control::Colors Control::chosenColors() const {
 void Control::askColors() {
     const HWND self = handle();
     const Colors colors = chosenColors();
+    // This runs in each paint request; setting a palette asks for another one.
     if (!from(self) || colors == m_colors) {
         return;
     }

@@ -23,7 +23,8 @@ namespace {
 /// Distance of a line's text from the left edge.
 constexpr int textIndent = 3;
 
-/// The toolkit calls these by its own frames, also without an event of its own: what a host's handler throws is stored.
+/// Between these overrides and the place of ours below stand frames of the toolkit, which cannot be unwound: what a
+/// host's handler throws is stored.
 class ListArea : public QAbstractScrollArea {
 public:
     ListArea(QWidget* parent, ListBoxWindow& window) : QAbstractScrollArea(parent), m_window(window) {
@@ -101,6 +102,7 @@ void ListBoxWindow::widgetMade() {
 }
 
 void ListBoxWindow::applyBars() {
+    // With this style the bars stay when there is nothing to scroll, so that lines keep their width.
     const bool always = (style() & LBS_DISABLENOSCROLL) != 0;
     const auto policy = [&](DWORD bit) {
         return (style() & bit) == 0 ? Qt::ScrollBarAlwaysOff : always ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAsNeeded;
@@ -117,6 +119,7 @@ void ListBoxWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 
 void ListBoxWindow::fontChanged() {
     Control::fontChanged();
+    // The lines of an owner-drawn list are as high as the owner answered, whatever the font.
     if (!isOwnerDrawn()) {
         m_rowHeight = m_area->fontMetrics().height() + 2;
     }
@@ -130,6 +133,7 @@ void ListBoxWindow::measure() {
     item.CtlID = static_cast<UINT>(id());
     item.itemHeight = static_cast<UINT>(m_area->fontMetrics().height() + 2);
     SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
+    // Whatever the owner answers, a line has a height: lines are counted by dividing by it.
     m_rowHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
     applyRange();
 }
@@ -144,6 +148,7 @@ QRect ListBoxWindow::clientRect() const {
 
 void ListBoxWindow::setWindowRect(const QRect& rect) {
     QRect whole = rect;
+    // Lists show whole lines only, unless the style says that they need not.
     if ((style() & LBS_NOINTEGRALHEIGHT) == 0 && m_area) {
         const int frame = 2 * m_area->frameWidth();
         const int rows = (rect.height() - frame) / m_rowHeight;
@@ -212,6 +217,7 @@ int ListBoxWindow::visibleRows() const {
 }
 
 int ListBoxWindow::rowAt(int y) const {
+    // A point above the area means the line before the first one seen, so that dragging there scrolls.
     const int row = top() + (y >= 0 ? y / m_rowHeight : -1);
     return std::clamp(row, -1, m_items.count() - 1);
 }
@@ -267,6 +273,7 @@ LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
     const int row = static_cast<int>(index);
     tellDeleted(row);
     m_items.remove(row);
+    // The selection goes with its line, while the keyboard stays on the line that takes the place.
     m_current = m_current == row ? -1 : m_current > row ? m_current - 1 : m_current;
     m_caret = std::min(m_caret > row ? m_caret - 1 : m_caret, m_items.count() - 1);
     m_anchor = std::min(m_anchor > row ? m_anchor - 1 : m_anchor, m_items.count() - 1);
@@ -437,6 +444,7 @@ LRESULT ListBoxWindow::selectionProc(UINT message, WPARAM wParam, LPARAM lParam,
         if (!isMultiple()) {
             return LB_ERR;
         }
+        // A first line behind the last one means: take these lines out.
         selectRange(row, last, row <= last);
         return LB_OKAY;
     }
@@ -517,6 +525,7 @@ LRESULT ListBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return 0;
     }
     if (message == WM_DESTROY) {
+        // The owner frees its data while the control can still be asked about its lines.
         reset();
         return 0;
     }
@@ -553,6 +562,7 @@ void ListBoxWindow::moveCaret(int index, bool extend, bool toggle) {
     }
     showRow(index);
     refresh();
+    // A multiple selection is told of at each step: the same line may have come in or gone out.
     if (isMultiple() || before != m_current) {
         tellSelection();
     }
@@ -564,6 +574,7 @@ void ListBoxWindow::press(const QMouseEvent& event, bool twice) {
     }
     const int row = rowAt(event.position().toPoint().y());
     m_pressed = true;
+    // The first of two presses has selected the line already.
     if (twice) {
         if ((style() & LBS_NOTIFY) != 0) {
             notify(LBN_DBLCLK);
@@ -585,6 +596,7 @@ void ListBoxWindow::drag(const QMouseEvent& event) {
 }
 
 bool ListBoxWindow::search(const QString& text) {
+    // From behind the keyboard's line and around, so that the same letter pressed again goes on.
     const int found = m_items.find(fromQt(text), m_caret, ListItems::Match::Prefix);
     if (found >= 0) {
         moveCaret(found, false, false);
@@ -593,6 +605,7 @@ bool ListBoxWindow::search(const QString& text) {
 }
 
 bool ListBoxWindow::key(const QKeyEvent& event) {
+    // One line less than is seen: the last line stays in sight as the first.
     const int page = std::max(visibleRows() - 1, 1);
     const int last = m_items.count() - 1;
     int target = m_caret;
@@ -670,6 +683,7 @@ void ListBoxWindow::paintRow(QPainter& painter, int index) const {
 }
 
 void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
+    // The owner may end the list while it draws a line.
     const HWND self = handle();
     OwnerPainting drawing(*this, m_area->viewport()->size(), m_area->viewport()->palette().color(QPalette::Base));
     for (int row = first; row <= last && row < m_items.count() && from(self); ++row) {

@@ -94,6 +94,7 @@ LRESULT StaticWindow::setPicture(UINT kind, HANDLE picture) {
         setStyle((style() & ~DWORD{SS_TYPEMASK}) | (kind == IMAGE_ICON ? SS_ICON : SS_BITMAP), exStyle());
     }
     const QImage image = this->picture();
+    // A control takes the size of its picture, unless it is to centre or to stretch it.
     const bool keepsSize = (style() & (SS_CENTERIMAGE | SS_REALSIZECONTROL)) != 0;
     if (!image.isNull() && !keepsSize) {
         guarded([&] { setWindowRect(QRect(windowRect().topLeft(), image.size())); });
@@ -194,6 +195,7 @@ void StaticWindow::paintByOwner(QPainter& painter) {
 
 void StaticWindow::paint(QPainter& painter) {
     QRect area = widget()->rect();
+    // Only a parent that chose colours has them filled in; else what lies below is seen.
     if (widget()->testAttribute(Qt::WA_SetPalette)) {
         painter.fillRect(area, widget()->palette().color(QPalette::Window));
     }

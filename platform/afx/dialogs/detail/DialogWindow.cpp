@@ -99,6 +99,7 @@ void DialogWindow::setWindowRect(const QRect& rect) {
         Window::setWindowRect(rect);
         return;
     }
+    // The limits that keep the user from sizing it would keep the program from it as well.
     widget()->setMinimumSize(0, 0);
     widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
     Window::setWindowRect(rect);
@@ -107,6 +108,7 @@ void DialogWindow::setWindowRect(const QRect& rect) {
 
 QMargins DialogWindow::expectedBorders() const {
     const bool framed = !isChild() && (style() & WS_CAPTION) == WS_CAPTION;
+    // A frame is known only of a window that is shown; the owner's is like the dialog's will be.
     const QWidget* over = framed && owner() ? owner()->widget() : nullptr;
     const QWindow* native = over && over->isVisible() ? over->windowHandle() : nullptr;
     return native ? native->frameMargins() : QMargins();
@@ -297,6 +299,7 @@ HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
     }
     cs.lpszClass = known ? item.className.c_str() : emptyPaneClass;
     cs.lpszName = caption.c_str();
+    // It is shown when it has its size; and an empty pane takes no keyboard.
     const DWORD later = WS_VISIBLE | (known ? 0U : DWORD{WS_TABSTOP});
     cs.style = static_cast<LONG>((item.style | WS_CHILD) & ~later);
     const bool edge = hasClientEdge(item.className) && (item.style & WS_BORDER) != 0;
