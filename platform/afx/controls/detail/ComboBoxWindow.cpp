@@ -18,8 +18,6 @@
 #include <QValidator>
 #include <QWheelEvent>
 
-#include <cstring>
-
 namespace tvx::afx {
 
 /// Shows the box's lines to the toolkit without copying them.
@@ -159,7 +157,9 @@ const WindowClassEntry comboBoxEntry("ComboBox", &makeComboBox);
 } // namespace
 
 ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
-    : Control(cs), m_model(std::make_unique<ComboModel>(*this)), m_openHeight(cs.cy) {}
+    : ListControl(cs, {ODT_COMBOBOX, CBS_OWNERDRAWFIXED | CBS_OWNERDRAWVARIABLE, CBS_HASSTRINGS}),
+      m_model(std::make_unique<ComboModel>(*this)),
+      m_openHeight(cs.cy) {}
 
 ComboBoxWindow::~ComboBoxWindow() {
     if (box()) {
@@ -219,13 +219,7 @@ void ComboBoxWindow::fontChanged() {
 }
 
 void ComboBoxWindow::measure() {
-    MEASUREITEMSTRUCT item{};
-    item.CtlType = ODT_COMBOBOX;
-    item.CtlID = static_cast<UINT>(id());
-    item.itemHeight = static_cast<UINT>(m_itemHeight);
-    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
-    // Whatever the owner answers, a line has a height: lines are counted by dividing by it.
-    m_itemHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    m_itemHeight = askHeight(m_itemHeight);
     applyHeights();
 }
 
@@ -269,12 +263,6 @@ UINT ComboBoxWindow::dialogCode(const MSG* msg) const {
 
 UINT ComboBoxWindow::colorMessage() const {
     return isEditable() ? WM_CTLCOLOREDIT : WM_CTLCOLORLISTBOX;
-}
-
-void ComboBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
 }
 
 void ComboBoxWindow::focusMoved(bool got) {
@@ -324,12 +312,7 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     if (index < -1 || index > m_items.count()) {
         return CB_ERR;
     }
-    ListItems::Item item;
-    if (hasStrings()) {
-        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
-    } else {
-        item.data = text;
-    }
+    ListItems::Item item = newItem(text);
     int place = 0;
     guarded([&] {
         // The toolkit chooses the first line of an empty box by itself; here only the user and the program choose.
@@ -350,15 +333,6 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     return place;
 }
 
-void ComboBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || !parent()) {
-        return;
-    }
-    DELETEITEMSTRUCT gone{ODT_COMBOBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
-                          static_cast<ULONG_PTR>(m_items.at(index).data)};
-    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
-}
-
 LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
     if (!m_items.isValid(index)) {
         return CB_ERR;
@@ -375,9 +349,7 @@ LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
 }
 
 void ComboBoxWindow::reset() {
-    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-        tellDeleted(row);
-    }
+    tellAllDeleted();
     guarded([&] {
         m_model->replaceAll([&] { m_items.clear(); });
         box()->setCurrentIndex(-1);
@@ -385,28 +357,6 @@ void ComboBoxWindow::reset() {
             field()->clear();
         }
     });
-}
-
-LRESULT ComboBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
-    const auto start = static_cast<int>(after);
-    if (!hasStrings()) {
-        return m_items.findData(text, start);
-    }
-    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : CB_ERR;
-}
-
-LRESULT ComboBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
-    const auto row = static_cast<int>(index);
-    if (!m_items.isValid(row)) {
-        return CB_ERR;
-    }
-    const auto& item = m_items.at(row);
-    if (!hasStrings()) {
-        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
-        return sizeof(item.data);
-    }
-    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
-    return static_cast<LRESULT>(item.text.size());
 }
 
 LRESULT ComboBoxWindow::setCurrent(LONG_PTR index) {
@@ -437,18 +387,11 @@ LRESULT ComboBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, boo
     case CB_GETLBTEXT:
         return copyText(wParam, lParam);
     case CB_GETLBTEXTLEN:
-        if (!m_items.isValid(row)) {
-            return CB_ERR;
-        }
-        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+        return textLength(wParam);
     case CB_GETITEMDATA:
-        return m_items.isValid(row) ? m_items.at(row).data : CB_ERR;
+        return itemData(wParam);
     case CB_SETITEMDATA:
-        if (!m_items.isValid(row)) {
-            return CB_ERR;
-        }
-        m_items.at(row).data = lParam;
-        return CB_OKAY;
+        return setItemData(wParam, lParam);
     case CB_FINDSTRING:
         return find(wParam, lParam, ListItems::Match::Prefix);
     case CB_FINDSTRINGEXACT:
@@ -539,9 +482,7 @@ LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
     }
     if (message == WM_DESTROY) {
         // The owner frees its data while the control can still be asked about its lines.
-        for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-            tellDeleted(row);
-        }
+        tellAllDeleted();
         return 0;
     }
     return Control::defaultProc(message, wParam, lParam);

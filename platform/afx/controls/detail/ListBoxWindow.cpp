@@ -14,8 +14,6 @@
 #include <QStyle>
 #include <QStyleOption>
 
-#include <cstring>
-
 namespace tvx::afx {
 
 namespace {
@@ -89,6 +87,9 @@ const WindowClassEntry listBoxEntry("ListBox", &makeListBox);
 
 // --- making ---
 
+ListBoxWindow::ListBoxWindow(const CREATESTRUCT& cs)
+    : ListControl(cs, {ODT_LISTBOX, LBS_OWNERDRAWFIXED | LBS_OWNERDRAWVARIABLE, LBS_HASSTRINGS}) {}
+
 QWidget* ListBoxWindow::makeWidget(QWidget* parent) {
     m_area = new ListArea(parent, *this);
     return m_area;
@@ -128,13 +129,7 @@ void ListBoxWindow::fontChanged() {
 
 /// The parent says how high its lines are.
 void ListBoxWindow::measure() {
-    MEASUREITEMSTRUCT item{};
-    item.CtlType = ODT_LISTBOX;
-    item.CtlID = static_cast<UINT>(id());
-    item.itemHeight = static_cast<UINT>(m_area->fontMetrics().height() + 2);
-    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
-    // Whatever the owner answers, a line has a height: lines are counted by dividing by it.
-    m_rowHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    m_rowHeight = askHeight(m_area->fontMetrics().height() + 2);
     applyRange();
 }
 
@@ -165,12 +160,6 @@ void ListBoxWindow::focusMoved(bool got) {
     if ((style() & LBS_NOTIFY) != 0) {
         notify(got ? LBN_SETFOCUS : LBN_KILLFOCUS);
     }
-}
-
-void ListBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
 }
 
 // --- rows and scrolling ---
@@ -239,12 +228,7 @@ void ListBoxWindow::showRow(int index) {
 // --- lines ---
 
 LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
-    ListItems::Item item;
-    if (hasStrings()) {
-        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
-    } else {
-        item.data = text;
-    }
+    ListItems::Item item = newItem(text);
     if (index < -1 || index > m_items.count()) {
         return LB_ERR;
     }
@@ -254,16 +238,6 @@ LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     m_anchor += m_anchor >= place ? 1 : 0;
     contentChanged();
     return place;
-}
-
-/// Hosts free what the data of an owner-drawn line points to when they are told of its end.
-void ListBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || !parent()) {
-        return;
-    }
-    DELETEITEMSTRUCT gone{ODT_LISTBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
-                          static_cast<ULONG_PTR>(m_items.at(index).data)};
-    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
 }
 
 LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
@@ -282,34 +256,10 @@ LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
 }
 
 void ListBoxWindow::reset() {
-    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-        tellDeleted(row);
-    }
+    tellAllDeleted();
     m_items.clear();
     m_current = m_caret = m_anchor = -1;
     contentChanged();
-}
-
-LRESULT ListBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
-    const auto start = static_cast<int>(after);
-    if (!hasStrings()) {
-        return m_items.findData(text, start);
-    }
-    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : LB_ERR;
-}
-
-LRESULT ListBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
-    const auto row = static_cast<int>(index);
-    if (!m_items.isValid(row)) {
-        return LB_ERR;
-    }
-    const auto& item = m_items.at(row);
-    if (!hasStrings()) {
-        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
-        return sizeof(item.data);
-    }
-    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
-    return static_cast<LRESULT>(item.text.size());
 }
 
 LRESULT ListBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
@@ -329,18 +279,11 @@ LRESULT ListBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool
     case LB_GETTEXT:
         return copyText(wParam, lParam);
     case LB_GETTEXTLEN:
-        if (!m_items.isValid(row)) {
-            return LB_ERR;
-        }
-        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+        return textLength(wParam);
     case LB_GETITEMDATA:
-        return m_items.isValid(row) ? m_items.at(row).data : LB_ERR;
+        return itemData(wParam);
     case LB_SETITEMDATA:
-        if (!m_items.isValid(row)) {
-            return LB_ERR;
-        }
-        m_items.at(row).data = lParam;
-        return LB_OKAY;
+        return setItemData(wParam, lParam);
     case LB_FINDSTRING:
         return find(wParam, lParam, ListItems::Match::Prefix);
     case LB_FINDSTRINGEXACT:
@@ -573,7 +516,6 @@ void ListBoxWindow::press(const QMouseEvent& event, bool twice) {
         return;
     }
     const int row = rowAt(event.position().toPoint().y());
-    m_pressed = true;
     // The first of two presses has selected the line already.
     if (twice) {
         if ((style() & LBS_NOTIFY) != 0) {
