@@ -90,7 +90,9 @@ void CDocument::UpdateAllViews(CView* sender, LPARAM hint, CObject* object) {
 void CDocument::SendInitialUpdate() {
     const auto views = m_views;
     for (CView* view : views) {
-        view->OnInitialUpdate();
+        if (std::find(m_views.begin(), m_views.end(), view) != m_views.end()) {
+            view->OnInitialUpdate();
+        }
     }
 }
 

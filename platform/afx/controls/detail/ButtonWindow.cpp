@@ -316,18 +316,9 @@ LRESULT ButtonWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 // --- painting ---
 
 void ButtonWindow::paintByOwner(QPainter& painter) {
-    const HWND self = handle();
-    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
-    DRAWITEMSTRUCT item{};
-    item.CtlType = ODT_BUTTON;
-    item.rcItem = fromQt(widget()->rect());
-    item.itemState = (button()->isDown() ? ODS_SELECTED : 0U) | (widget()->hasFocus() ? ODS_FOCUS : 0U) |
-                     (isEnabled() ? 0U : ODS_DISABLED) | (m_shownAsDefault ? ODS_DEFAULT : 0U);
-    drawing.draw(item);
-    // The owner may have ended the button while it drew.
-    if (from(self)) {
-        painter.drawImage(0, 0, drawing.image());
-    }
+    Control::paintByOwner(painter, ODT_BUTTON,
+                          (button()->isDown() ? ODS_SELECTED : 0U) | (widget()->hasFocus() ? ODS_FOCUS : 0U) |
+                              (m_shownAsDefault ? ODS_DEFAULT : 0U));
 }
 
 /// The title interrupts the frame's upper edge, as templates are drawn for; the toolkit's styles put it above.

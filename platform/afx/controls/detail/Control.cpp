@@ -8,6 +8,7 @@
 
 #include <QApplication>
 #include <QFrame>
+#include <QPainter>
 
 namespace tvx::afx {
 
@@ -122,6 +123,12 @@ void Control::applyColors(QPalette& palette, const QColor& text, const QColor& b
     palette.setColor(QPalette::Window, background);
 }
 
+void Control::applyFieldColors(QPalette& palette, const QColor& text, const QColor& background) {
+    palette.setColor(QPalette::Active, QPalette::Text, text);
+    palette.setColor(QPalette::Inactive, QPalette::Text, text);
+    palette.setColor(QPalette::Base, background);
+}
+
 LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
     case WM_PAINT: {
@@ -189,6 +196,20 @@ void OwnerPainting::draw(DRAWITEMSTRUCT item) {
 
 QImage OwnerPainting::image() const {
     return bitmapImage(m_bitmap);
+}
+
+void Control::paintByOwner(QPainter& painter, UINT type, UINT state) {
+    const HWND self = handle();
+    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
+    DRAWITEMSTRUCT item{};
+    item.CtlType = type;
+    item.rcItem = fromQt(widget()->rect());
+    item.itemState = state | (isEnabled() ? 0U : ODS_DISABLED);
+    drawing.draw(item);
+    // The owner may have ended the control while it drew.
+    if (from(self)) {
+        painter.drawImage(0, 0, drawing.image());
+    }
 }
 
 std::string resourceText(const char* name) {

@@ -142,9 +142,7 @@ UINT EditWindow::colorMessage() const {
 }
 
 void EditWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
+    applyFieldColors(palette, text, background);
 }
 
 // --- typing ---

@@ -10,9 +10,7 @@
 namespace tvx::afx {
 
 void ListControl::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
+    applyFieldColors(palette, text, background);
 }
 
 ListItems::Item ListControl::newItem(LPARAM text) const {

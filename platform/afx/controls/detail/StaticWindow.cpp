@@ -180,19 +180,6 @@ void StaticWindow::paintText(QPainter& painter, const QRect& area) const {
                                     QPalette::WindowText);
 }
 
-void StaticWindow::paintByOwner(QPainter& painter) {
-    const HWND self = handle();
-    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
-    DRAWITEMSTRUCT item{};
-    item.CtlType = ODT_STATIC;
-    item.rcItem = fromQt(widget()->rect());
-    item.itemState = isEnabled() ? 0 : ODS_DISABLED;
-    drawing.draw(item);
-    if (from(self)) {
-        painter.drawImage(0, 0, drawing.image());
-    }
-}
-
 void StaticWindow::paint(QPainter& painter) {
     QRect area = widget()->rect();
     // Only a parent that chose colours has them filled in; else what lies below is seen.
@@ -200,7 +187,7 @@ void StaticWindow::paint(QPainter& painter) {
         painter.fillRect(area, widget()->palette().color(QPalette::Window));
     }
     if (type() == SS_OWNERDRAW) {
-        paintByOwner(painter);
+        paintByOwner(painter, ODT_STATIC, 0);
         return;
     }
     if (hasBorder() || (style() & SS_SUNKEN) != 0) {
