@@ -212,13 +212,6 @@ void Control::paintByOwner(QPainter& painter, UINT type, UINT state) {
     }
 }
 
-std::string resourceText(const char* name) {
-    if (!name || !IS_INTRESOURCE(name)) {
-        return name ? name : "";
-    }
-    return "#" + std::to_string(reinterpret_cast<std::uintptr_t>(name));
-}
-
 // --- controls that bring no behaviour yet ---
 
 namespace {

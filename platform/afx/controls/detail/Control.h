@@ -96,7 +96,4 @@ private:
     HGDIOBJ m_oldFont = nullptr;
 };
 
-/// The name in a control's text that stands for a resource: "#123" for a number.
-std::string resourceText(const char* name);
-
 } // namespace tvx::afx
