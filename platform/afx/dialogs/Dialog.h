@@ -98,7 +98,8 @@ protected:
     afx_msg LRESULT HandleInitDialog(WPARAM wParam, LPARAM lParam);
     DECLARE_MESSAGE_MAP()
 
-    /// What F1 asks the application's help for, 0 for nothing. The template's number from the start.
+    /// The number that WM_COMMANDHELP asks the application's help for, 0 for none. That of the template at first. F1
+    /// sends ID_HELP to the main window instead.
     UINT m_nIDHelp = 0;
     LPCSTR m_lpszTemplateName = nullptr;
     CWnd* m_pParentWnd = nullptr;

@@ -3,6 +3,8 @@
 /// @file
 /// What the window manager has done of what it was asked.
 
+#include "platform/base/Export.h"
+
 class QTimer;
 
 namespace tvx::afx {
@@ -15,6 +17,6 @@ enum class Told {
 
 /// Starts a timer when the window manager has done all that was asked of it before this call, and what it told of that
 /// has reached the windows. A timer that is gone by then is forgotten.
-Told startWhenDesktopHasAnswered(QTimer& timer);
+TVX_PLATFORM_API Told startWhenDesktopHasAnswered(QTimer& timer);
 
 } // namespace tvx::afx

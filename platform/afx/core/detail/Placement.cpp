@@ -7,6 +7,8 @@
 #include "platform/afx/gdi/Gdi.h"
 
 #include <QGuiApplication>
+#include <QMoveEvent>
+#include <QResizeEvent>
 #include <QScreen>
 #include <QWindow>
 
@@ -134,6 +136,7 @@ void Placement::aboutToShow() {
 }
 
 void Placement::changed() {
+    m_askAgain = m_asked; // an answer on its way is not about this change
     m_settle.start();
 }
 
@@ -165,8 +168,25 @@ void Placement::ask() {
     }
 }
 
+/// The toolkit keeps a place to itself that it has told before, though the widget was given another one meanwhile:
+/// one that was asked for and then overtaken by maximising, or refused.
+void Placement::hearWithheld() {
+    QWindow* native = widget().isWindow() ? widget().windowHandle() : nullptr;
+    if (native && widget().size() != native->size()) {
+        QResizeEvent resized(native->size(), widget().size());
+        guarded([&] { QCoreApplication::sendEvent(native, &resized); });
+    }
+    if (native && widget().geometry().topLeft() != native->position()) {
+        QMoveEvent moved(native->position(), widget().geometry().topLeft());
+        guarded([&] { QCoreApplication::sendEvent(native, &moved); });
+    }
+}
+
 void Placement::answered() {
     m_asked = false;
+    if (!isGone()) {
+        hearWithheld();
+    }
     if (std::exchange(m_askAgain, false)) {
         if (!isGone()) {
             ask(); // something changed after the question

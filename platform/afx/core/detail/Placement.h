@@ -74,6 +74,7 @@ private:
     QSize expectedGrowth() const;
     void settle();
     void ask();
+    void hearWithheld();
     void answered();
     void leaveNormal();
     void grant();

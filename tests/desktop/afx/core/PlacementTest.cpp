@@ -1,6 +1,7 @@
 // Frames end where they were asked to, though the window manager puts its borders around them only when they are shown.
 #include "platform/afx/core/App.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/dialogs/Dialog.h"
 #include "platform/afx/frames/Frame.h"
@@ -13,6 +14,7 @@
 #include <QApplication>
 #include <QScreen>
 #include <QTest>
+#include <QTimer>
 #include <QWidget>
 #include <QWindow>
 
@@ -77,11 +79,20 @@ protected:
         frame->GetWindowRect(rect);
         return rect;
     }
-    /// Waits until the frame stands at a rectangle, its borders included, for the framework and for the display server.
+    /// Waits until the frame stands at a rectangle, its borders included, for the framework and for the display server,
+    /// and the window manager has nothing left to do.
     void standsAt(const CRect& rect) const {
-        const bool stands =
-            QTest::qWaitFor([&] { return framed() && frameRect() == rect && onScreen() == rect; }, patience);
+        const auto is = [&] { return framed() && frameRect() == rect && onScreen() == rect; };
+        const bool stands = QTest::qWaitFor([&] { return is() && answered() && is(); }, patience);
         EXPECT_TRUE(stands) << words(frameRect()) << ", on the screen " << words(onScreen()) << ", not " << words(rect);
+    }
+    static bool answered() {
+        QTimer timer;
+        bool over = false;
+        timer.setSingleShot(true);
+        QObject::connect(&timer, &QTimer::timeout, [&over] { over = true; });
+        EXPECT_EQ(startWhenDesktopHasAnswered(timer), Told::ByManager);
+        return QTest::qWaitFor([&over] { return over; }, patience);
     }
     bool framed() const {
         const QWindow* native = frame->GetState()->widget()->windowHandle();
@@ -216,6 +227,20 @@ TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangleAlsoLate) {
         QTest::qWait(meanwhile);
     }
     ASSERT_TRUE(fillsScreen());
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+}
+
+TEST_F(FramesOnDesktop, MaximizedAgainBeforeTheWindowManagerHasRestoredThemFillTheScreen) {
+    frame->ShowWindow(SW_SHOWMAXIMIZED);
+    ASSERT_TRUE(fillsScreen());
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(givenPlace, SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        frame->ShowWindow(SW_SHOWMAXIMIZED);
+    }
+    ASSERT_TRUE(answered());
+    EXPECT_TRUE(fillsScreen()) << words(frameRect()) << ", on the screen " << words(onScreen());
     EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
 }
 
