@@ -24,6 +24,7 @@ UINT codeOf(Window& window, const MSG* msg = nullptr) {
 }
 
 bool isUsable(const Window& window) {
+    // By the style, not by what is seen: the first control is looked for before the dialog is shown.
     return window.isEnabled() && (window.style() & WS_VISIBLE) != 0;
 }
 
@@ -67,6 +68,7 @@ Window* nextTabItem(Window& dialog, const Window* from, Direction direction) {
     if (place == controls.end()) {
         place = controls.begin();
     } else {
+        // The control itself comes last: it is the answer when there is no other.
         std::rotate(controls.begin(), std::next(place), controls.end());
     }
     const auto isStop = [](const Window* window) { return (window->style() & WS_TABSTOP) != 0; };
@@ -104,6 +106,7 @@ namespace {
 
 bool onTab(Window& dialog, Window* focus) {
     const Direction direction = isKeyDown(VK_SHIFT) ? Direction::Backward : Direction::Forward;
+    // Where there is nowhere to go, the key is the dialog's all the same.
     if (Window* next = nextTabItem(dialog, focus, direction)) {
         focusControl(*next);
     }
@@ -141,6 +144,7 @@ bool press(Window& dialog, int id) {
 
 bool onEnter(Window& dialog, Window* focus) {
     const UINT code = focus ? codeOf(*focus) : 0;
+    // A push button that has the keyboard is the default one for that time.
     if ((code & (DLGC_DEFPUSHBUTTON | DLGC_UNDEFPUSHBUTTON)) != 0) {
         armIdle();
         SendMessageA(focus->handle(), BM_CLICK, 0, 0);
@@ -213,6 +217,7 @@ bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
 
 bool onKey(Window& dialog, Window* focus, const MSG& msg) {
     const UINT code = focus ? codeOf(*focus, &msg) : 0;
+    // With Alt, keys are mnemonics, which come as WM_SYSCHAR, or the menu's.
     if ((code & DLGC_WANTALLKEYS) != 0 || isKeyDown(VK_MENU)) {
         return false;
     }

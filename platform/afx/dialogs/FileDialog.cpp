@@ -69,6 +69,7 @@ QStringList filtersOf(LPCSTR text) {
 class Dialog : public QFileDialog {
 public:
     explicit Dialog(QWidget* over) : QFileDialog(over) {
+        // A desktop's own dialog would wait in a loop of its own, and close without asking the host.
         setOption(QFileDialog::DontUseNativeDialog);
         setWindowModality(Qt::ApplicationModal);
     }
@@ -80,10 +81,13 @@ public:
         guarded([this] { hide(); });
         return answer == QDialog::Accepted;
     }
+    /// The toolkit calls this from slots of its own. A host whose OnFileNameOK throws ends the loop with that.
     void done(int result) override {
-        if (result != QDialog::Accepted || isAccepted()) {
-            m_loop.end(result);
-        }
+        storing([&] {
+            if (result != QDialog::Accepted || isAccepted()) {
+                m_loop.end(result);
+            }
+        });
     }
 
 private:

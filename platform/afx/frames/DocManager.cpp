@@ -161,6 +161,7 @@ void activate(const CDocument& document) {
 CDocument* CDocManager::OpenDocumentFile(LPCSTR fileName) {
     CString name(fileName);
     name.Trim();
+    // Names that come from other programs may stand in quotation marks.
     if (name.GetLength() > 1 && name[0] == '"' && name[name.GetLength() - 1] == '"') {
         name = name.Mid(1, name.GetLength() - 2);
     }
