@@ -114,12 +114,15 @@ namespace {
 
 /// Lets every shown frame bring its tool bars, status bar and title up to date.
 void updateFrames() {
-    const auto windows = Window::topLevels();
-    for (const Window* window : windows) {
-        CWnd* object = window->object();
-        if (object && object->IsFrameWnd() && object->IsWindowVisible()) {
-            object->SendMessage(WM_IDLEUPDATECMDUI, TRUE, 0);
-            object->SendMessageToDescendants(WM_IDLEUPDATECMDUI, TRUE, 0, TRUE, TRUE);
+    // An update handler may end any window, its own frame too.
+    for (const HWND frame : Window::topLevelHandles()) {
+        const CWnd* object = CWnd::FromHandlePermanent(frame);
+        if (!object || !object->IsFrameWnd() || !object->IsWindowVisible()) {
+            continue;
+        }
+        SendMessageA(frame, WM_IDLEUPDATECMDUI, TRUE, 0);
+        if (CWnd* still = CWnd::FromHandlePermanent(frame)) {
+            still->SendMessageToDescendants(WM_IDLEUPDATECMDUI, TRUE, 0, TRUE, TRUE);
         }
     }
 }

@@ -92,10 +92,6 @@ BOOL CCmdTarget::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* in
     return FALSE;
 }
 
-void CCmdTarget::OnFinalRelease() {
-    delete this;
-}
-
 // --- wait cursor ---
 
 void CCmdTarget::BeginWaitCursor() {

@@ -50,10 +50,11 @@ public:
     CWnd(const CWnd&) = delete;
     CWnd& operator=(const CWnd&) = delete;
 
-    /// The handle of an object that may be null.
+    /// The handle of an object that may be null: null then, and when it has no window.
     HWND GetSafeHwnd() const {
         return HandleOf(this);
     }
+    /// The handle, null when there is no window.
     operator HWND() const {
         return m_hWnd;
     }
@@ -75,6 +76,7 @@ public:
     BOOL SubclassWindow(HWND window);
     /// Attaches to the control `id` of `parent`. FALSE when there is none or it has an object already.
     BOOL SubclassDlgItem(UINT id, CWnd* parent);
+    /// Gives up the window, whose messages go to its class alone again, and answers its handle. The same as Detach.
     HWND UnsubclassWindow();
     /// @}
 
@@ -139,9 +141,11 @@ public:
 
     DWORD GetStyle() const;
     DWORD GetExStyle() const;
-    /// Removes and adds style bits. `swpFlags` other than 0 redraws the frame. Answers whether anything changed.
+    /// Removes and adds style bits, removing first. Answers whether anything changed.
+    /// @param swpFlags passed on to SetWindowPos when not 0. Not needed for the new style to be seen: that is at once.
     BOOL ModifyStyle(DWORD remove, DWORD add, UINT swpFlags = 0);
     BOOL ModifyStyleEx(DWORD remove, DWORD add, UINT swpFlags = 0);
+    /// The identifier that a child is found by and its messages carry; SetDlgCtrlID answers the previous one.
     int GetDlgCtrlID() const;
     int SetDlgCtrlID(int id);
     /// Enables or disables input. Answers whether the window was disabled before.
@@ -197,7 +201,9 @@ public:
     void ScreenToClient(RECT* rect) const;
     void MapWindowPoints(CWnd* to, POINT* points, UINT count) const;
     void MapWindowPoints(CWnd* to, RECT* rect) const;
-    /// The window rectangle that gives the client rectangle `rect`, for this window's styles.
+    /// Makes of a client rectangle the rectangle of the window around it, as this window is now: frame, caption and
+    /// menu bar of a top-level window are known once it has been shown.
+    /// @param adjustType not used
     virtual void CalcWindowRect(RECT* rect, UINT adjustType = 0);
     /// @}
 
@@ -210,9 +216,13 @@ public:
     void InvalidateRect(const RECT* rect, BOOL erase = TRUE);
     /// Paints what has been requested, now.
     void UpdateWindow();
+    /// Requests a repaint of a region of the client area, else of a rectangle, else (both null) of all, and carries it
+    /// out with RDW_UPDATENOW. Children are repainted with RDW_ALLCHILDREN. A request is never taken back: RDW_VALIDATE
+    /// does nothing.
     BOOL RedrawWindow(const RECT* rect = nullptr, CRgn* region = nullptr,
                       UINT flags = RDW_INVALIDATE | RDW_UPDATENOW | RDW_ERASE);
-    /// Suspends or resumes painting while contents change.
+    /// Suspends or resumes painting of the window and its children while contents change. Resuming requests a repaint
+    /// of everything. Contexts (CClientDC) draw meanwhile.
     void SetRedraw(BOOL redraw = TRUE);
     /// A context over the client area, to be given back with ReleaseDC. It draws at once, also outside WM_PAINT.
     CDC* GetDC();
@@ -228,14 +238,18 @@ public:
     CWnd* GetParent() const;
     /// Makes the window a child of another and answers the previous parent.
     CWnd* SetParent(CWnd* parent);
-    /// The window a dialog or popup stands over.
+    /// The window that a bar reports to and that CenterWindow centres over: the one set last, else the parent (of a
+    /// popup or dialog the window it stands over).
     CWnd* GetOwner() const;
+    /// Sets that; null for the parent again. It changes neither parent nor stacking, and is not told of its end.
     void SetOwner(CWnd* owner);
     CWnd* GetTopLevelParent() const;
     CFrameWnd* GetParentFrame() const;
     CFrameWnd* GetTopLevelFrame() const;
     CWnd* GetWindow(UINT relation) const;
     CWnd* GetTopWindow() const;
+    /// The sibling behind this one, with GW_HWNDPREV the one before; null after the last. Siblings of a top-level
+    /// window are this process's other ones in the order of their creation.
     CWnd* GetNextWindow(UINT relation = GW_HWNDNEXT) const {
         return GetWindow(relation);
     }
@@ -246,6 +260,7 @@ public:
     /// The same among all descendants; with `onlyPerm` only windows with an object.
     CWnd* GetDescendantWindow(int id, BOOL onlyPerm = FALSE) const;
     static CWnd* GetDesktopWindow();
+    /// FindWindowA: a top-level window of this process by class and caption (null: any).
     static CWnd* FindWindow(LPCSTR className, LPCSTR text);
     static CWnd* WindowFromPoint(POINT point);
     /// @}
@@ -283,7 +298,6 @@ public:
     BOOL SetScrollInfo(int bar, SCROLLINFO* info, BOOL redraw = TRUE);
     BOOL GetScrollInfo(int bar, SCROLLINFO* info, UINT mask = SIF_ALL);
     void ShowScrollBar(UINT bar, BOOL show = TRUE);
-    void EnableScrollBarCtrl(int bar, BOOL enable = TRUE);
     virtual CScrollBar* GetScrollBarCtrl(int bar) const;
     /// @}
 
@@ -306,6 +320,8 @@ public:
     void SetDlgItemInt(int id, UINT value, BOOL isSigned = TRUE);
     /// The number in an item's text. `translated` tells whether the text was a number of 32 bits.
     UINT GetDlgItemInt(int id, BOOL* translated = nullptr, BOOL isSigned = TRUE) const;
+    /// Marks of buttons: 0 off, 1 on, 2 neither (three-state boxes). CheckRadioButton sets one of a range and clears
+    /// the others; GetCheckedRadioButton answers which one is set, 0 for none.
     void CheckDlgButton(int id, UINT check);
     void CheckRadioButton(int first, int last, int checked);
     UINT IsDlgButtonChecked(int id) const;
@@ -313,7 +329,8 @@ public:
     LRESULT SendDlgItemMessage(int id, UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
     /// The control that Tab (Shift+Tab with `previous`) reaches from `from`, the first one when `from` is null.
     CWnd* GetNextDlgTabItem(CWnd* from, BOOL previous = FALSE) const;
-    /// The control of the same group that the arrow keys reach.
+    /// The control that the arrow keys reach from `from`: the next one that can be used in its group, which begins with
+    /// WS_GROUP, and after the last the first again. Null when `from` is.
     CWnd* GetNextDlgGroupItem(CWnd* from, BOOL previous = FALSE) const;
     /// Moves data between the controls and the members, through DoDataExchange. FALSE when validation failed.
     /// @param save TRUE from the controls into the members.

@@ -218,10 +218,12 @@ void CWnd::CalcWindowRect(RECT* rect, UINT) {
     if (!window) {
         return;
     }
-    const QSize client = window->clientRect().size();
-    const QSize whole = window->windowRect().size();
-    rect->right += whole.width() - client.width();
-    rect->bottom += whole.height() - client.height();
+    const QRect client(window->clientToScreen(QPoint(0, 0)), window->clientRect().size());
+    const QRect whole = window->screenRect();
+    rect->left += whole.left() - client.left();
+    rect->top += whole.top() - client.top();
+    rect->right += whole.right() - client.right();
+    rect->bottom += whole.bottom() - client.bottom();
 }
 
 // --- painting ---
@@ -239,7 +241,7 @@ void CWnd::UpdateWindow() {
 }
 
 BOOL CWnd::RedrawWindow(const RECT* rect, CRgn* region, UINT flags) {
-    return ::RedrawWindow(m_hWnd, rect, nullptr, flags);
+    return ::RedrawWindow(m_hWnd, rect, region ? static_cast<HRGN>(*region) : nullptr, flags);
 }
 
 void CWnd::SetRedraw(BOOL redraw) {
@@ -508,10 +510,6 @@ void CWnd::ShowScrollBar(UINT bar, BOOL show) {
     if (bar == SB_VERT || bar == SB_BOTH) {
         plain->showScrollBar(SB_VERT, show != FALSE);
     }
-}
-
-void CWnd::EnableScrollBarCtrl(int bar, BOOL enable) {
-    ShowScrollBar(static_cast<UINT>(bar), enable);
 }
 
 CScrollBar* CWnd::GetScrollBarCtrl(int) const {

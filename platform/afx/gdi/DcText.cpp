@@ -137,14 +137,6 @@ CSize CDC::GetTextExtent(const CString& text) const {
     return measure(m_hDC, viewOf(text));
 }
 
-CSize CDC::GetOutputTextExtent(LPCSTR text, int count) const {
-    return GetTextExtent(text, count);
-}
-
-CSize CDC::GetOutputTextExtent(const CString& text) const {
-    return GetTextExtent(text);
-}
-
 BOOL GetTextExtentPoint32A(HDC dc, LPCSTR text, int count, SIZE* size) {
     if (!size || !findContext(dc)) {
         return FALSE;

@@ -231,7 +231,7 @@ bool fetch(MSG* message, HWND window, UINT first, UINT last, bool remove) {
 BOOL PeekMessageA(MSG* message, HWND window, UINT first, UINT last, UINT remove) {
     const bool take = (remove & PM_REMOVE) != 0;
     if (isQuitting()) {
-        *message = makeMessage(nullptr, WM_QUIT, 0, 0);
+        *message = makeMessage(nullptr, WM_QUIT, static_cast<WPARAM>(quitCode()), 0);
         return TRUE;
     }
     if (fetch(message, window, first, last, take)) {

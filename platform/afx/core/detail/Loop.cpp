@@ -110,10 +110,13 @@ bool isQuitting() {
     return state().quitting;
 }
 
+int quitCode() {
+    return state().exitCode;
+}
+
 int takeQuit() {
-    LoopState& current = state();
-    current.quitting = false;
-    return current.exitCode;
+    state().quitting = false;
+    return quitCode();
 }
 
 } // namespace tvx::afx

@@ -213,6 +213,13 @@ const std::vector<Window*>& Window::topLevels() {
     return tables().topLevels;
 }
 
+std::vector<HWND> Window::topLevelHandles() {
+    std::vector<HWND> handles;
+    handles.reserve(topLevels().size());
+    std::ranges::transform(topLevels(), std::back_inserter(handles), &Window::handle);
+    return handles;
+}
+
 Window* Window::topLevel() {
     Window* window = this;
     while (window->m_parent) {
@@ -452,10 +459,14 @@ void Window::destroy() {
     if (m_destroyed) {
         return;
     }
-    const auto all = topLevels();
-    for (Window* window : all) {
-        if (window->m_owner == this && from(window->m_handle) == window) {
+    const HWND self = m_handle;
+    // The end of one owned window may be the end of another, and of this one.
+    for (const HWND handle : topLevelHandles()) {
+        if (Window* window = from(handle); window && window->m_owner == this) {
             window->destroy();
+        }
+        if (from(self) != this) {
+            return;
         }
     }
     markDestroyed();
