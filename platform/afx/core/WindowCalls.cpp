@@ -120,6 +120,7 @@ BOOL tellDescendants(const Window& parent, WNDENUMPROC callback, LPARAM param) {
     for (const Window* window : parent.children()) {
         handles.push_back(window->handle());
     }
+    // The callback may end any of them.
     for (const HWND handle : handles) {
         if (!Window::from(handle)) {
             continue;
@@ -192,6 +193,7 @@ BOOL EnableWindow(HWND handle, BOOL enable) {
         return FALSE;
     }
     const bool wasDisabled = !window->isEnabled();
+    // WM_ENABLE tells of changes only.
     if (wasDisabled == (enable != FALSE)) {
         window->setEnabled(enable != FALSE);
     }

@@ -197,6 +197,7 @@ BOOL CBrush::CreateBrushIndirect(const LOGBRUSH* description) {
     switch (description->lbStyle) {
     case BS_SOLID:
         return CreateSolidBrush(description->lbColor);
+    // There is one, which nobody can delete.
     case BS_NULL:
         return Attach(GetStockObject(NULL_BRUSH));
     case BS_HATCHED:
@@ -246,6 +247,7 @@ BOOL CFont::CreatePointFontIndirect(const LOGFONT* description, CDC* dc) {
         return FALSE;
     }
     LOGFONT font = *description;
+    // A point is 1/72 of an inch.
     const int pixels = scaled(description->lfHeight, pixelsPerInch, 720);
     const auto context = findContext(dc ? dc->m_hDC : nullptr);
     font.lfHeight = -(context ? context->state.mapping.sizeToLogical({0, pixels}).height() : std::abs(pixels));
@@ -296,6 +298,7 @@ BOOL DeleteObject(HGDIOBJ object) {
     if (!found) {
         return FALSE;
     }
+    // A tool that is selected somewhere lives on there: contexts share it, only its handle ends.
     if (found->owner == GdiOwner::Host) {
         gdiObjects().take(number);
     }

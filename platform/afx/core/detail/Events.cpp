@@ -135,6 +135,7 @@ bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
 }
 
 bool onKeyRelease(Window& window, QObject* receiver, QKeyEvent& event) {
+    // The display tells of a release between repeated presses; hosts know repeated presses only.
     if (event.isAutoRepeat()) {
         event.accept();
         return true;
@@ -185,6 +186,7 @@ UINT buttonMessage(const QMouseEvent& event) {
     } else if (event.button() != Qt::LeftButton) {
         return WM_NULL;
     }
+    // The numbers of a button's messages follow each other: down, up, double click.
     switch (event.type()) {
     case QEvent::MouseButtonPress:
         return first;
@@ -262,6 +264,7 @@ bool onWheel(Window& under, QObject* receiver, QWheelEvent& event) {
         return false;
     }
     const QPoint screen = event.globalPosition().toPoint();
+    // The wheel's is the one mouse message in screen coordinates.
     const WPARAM keys = buttonFlags(event.buttons(), event.modifiers());
     MSG msg = makeMessage(target->handle(), WM_MOUSEWHEEL, MAKEWPARAM(static_cast<int>(keys), event.angleDelta().y()),
                           MAKELPARAM(screen.x(), screen.y()));

@@ -44,6 +44,7 @@ HWND newHandle(const QWidget& widget, bool topLevel) {
     if (topLevel && QGuiApplication::platformName() == QLatin1String("xcb")) {
         return reinterpret_cast<HWND>(const_cast<QWidget&>(widget).winId());
     }
+    // X ids have 29 bits: none of theirs is as large as one of ours.
     auto& next = tables().nextHandle;
     while (tables().byHandle.contains(next)) {
         ++next;
@@ -69,6 +70,7 @@ const WindowClass* findWindowClass(const char* name) {
 
 QString toQt(const char* text) {
     const std::string_view bytes = text ? text : "";
+    // Bytes that are no UTF-8 come back from the toolkit as they were given.
     return text::isWellFormed(bytes) ? QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()))
                                      : QString::fromStdU16String(text::widen16(bytes));
 }
@@ -150,6 +152,7 @@ bool Window::start(const CREATESTRUCT& cs) {
         m_creating = false;
         tellGeometry();
     }
+    // Not before WM_CREATE was handled: that is where hosts make the children.
     if (from(handle) && (m_style & WS_VISIBLE) != 0) {
         show((m_style & WS_MAXIMIZE) != 0 ? SW_SHOWMAXIMIZED : SW_SHOW);
     }
@@ -251,6 +254,7 @@ void Window::setParent(Window* parent) {
         std::erase(tables().topLevels, this);
     }
     m_parent = parent;
+    // The toolkit hides a widget that gets another parent and moves it into the corner.
     const bool shown = m_widget && !m_widget->isHidden();
     const QRect place = m_widget->geometry();
     guarded([&] {
@@ -469,6 +473,7 @@ void Window::destroy() {
             return;
         }
     }
+    // All are marked before any is told: a handler must not begin to destroy what goes anyway.
     markDestroyed();
     if (m_widget && !m_widget->isHidden()) {
         guarded([this] { m_widget->hide(); });
@@ -541,6 +546,7 @@ void Window::unlink() {
         tables().byWidget.erase(m_widget);
         silence(*m_widget);
         m_widget->hide();
+        // It may be the receiver of the event that is being handled.
         m_widget->deleteLater();
     }
 }

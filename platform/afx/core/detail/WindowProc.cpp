@@ -122,6 +122,7 @@ LRESULT Window::parentProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_MOUSEACTIVATE:
         return askParent(MA_ACTIVATE);
     case WM_MOUSEWHEEL:
+        // A wheel that turns over something that does not scroll is for what it stands in.
         return passEvent(*this, message) ? 0 : askParent(0);
     default:
         return askParent(0);
