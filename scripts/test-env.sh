@@ -15,7 +15,7 @@ mkdir -m 700 "$home/run" "$home/tmp"
 
 for name in ${!XDG_@} ${!TVX_@} ${!LC_@} ${!LANG@} ${!QT_@} ${!DBUS_@} ${!DESKTOP_@} ${!WAYLAND_@} \
     ${!DISPLAY@} ${!TARVEX@} ${!MYTARVEX@}; do
-    [ "$name" = TVX_SCREEN ] || unset "$name"
+    [ "$name" = TVX_SCREEN ] || [ "$name" = TVX_PICTURE ] || unset "$name"
 done
 export HOME="$home" TMPDIR="$home/tmp" LC_ALL=C.UTF-8
 export XDG_CONFIG_HOME="$home/.config" XDG_DATA_HOME="$home/.local/share" XDG_STATE_HOME="$home/.local/state"

@@ -3,7 +3,8 @@
 #
 #   scripts/with-display.sh COMMAND [ARGUMENT...]
 #
-# The exit code is the command's. TVX_SCREEN gives the display's size and depth (1280x800x24).
+# The exit code is the command's. TVX_SCREEN gives the display's size and depth (1280x800x24). The command finds the
+# window manager's process in TVX_WINDOW_MANAGER, to halt it as a busy machine would.
 set -euo pipefail
 
 if [ $# -eq 0 ]; then
@@ -52,6 +53,7 @@ openbox --sm-disable --startup "sh -c 'echo managed >\"$work/managed\"'" >"$work
 manager=$!
 read -r -t 30 _ <&9 || fail "the window manager did not start"
 exec 8>&- 9>&-
+export TVX_WINDOW_MANAGER=$manager
 
 # Job control gives the command its own process group, its standard input and undisturbed signals.
 set -m

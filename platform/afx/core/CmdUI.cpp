@@ -34,7 +34,7 @@ void CCmdUI::Enable(BOOL on) {
         // A disabled control must not keep the keyboard.
         CWnd* parent = m_pOther->GetParent();
         CWnd* next = parent ? parent->GetNextDlgTabItem(m_pOther) : nullptr;
-        if (next) {
+        if (next && next != m_pOther) {
             next->SetFocus();
         }
     }

@@ -469,7 +469,7 @@ struct SCROLLINFO {
 };
 
 /// What WM_HELP carries a pointer to: the control that help was asked for. The message is for hosts that send it
-/// themselves; F1 comes as WM_COMMANDHELP in dialogs and as the command ID_HELP elsewhere.
+/// themselves; F1 in a dialog is the command ID_HELP of the main window, elsewhere a key like others.
 struct HELPINFO {
     UINT cbSize;           ///< sizeof(HELPINFO).
     int iContextType;      ///< 1 for a control or window, 2 for a menu item.

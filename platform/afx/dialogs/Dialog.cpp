@@ -269,7 +269,7 @@ int CDialog::DoModal() {
         activateAgain(ownerHandle);
     };
     try {
-        if (createFrom(*description, parent, true) && !m_ended) {
+        if (createFrom(*description, parent, true) && !m_ended) { // OnInitDialog may end it before it is seen
             GetState()->widget()->setWindowModality(Qt::ApplicationModal);
             ShowWindow(SW_SHOW);
             if (!m_ended && m_hWnd) {

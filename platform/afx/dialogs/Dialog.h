@@ -72,7 +72,8 @@ public:
     void SetDefID(UINT id);
     /// Turns dialog units into pixels of this dialog's font.
     void MapDialogRect(RECT* rect) const;
-    /// The number that F1 asks the application's help for; 0 for none. The constructor's template number by default.
+    /// The number that WM_COMMANDHELP asks the application's help for; 0 for none. That of the template at first. F1
+    /// sends ID_HELP to the main window instead.
     void SetHelpID(UINT id) {
         m_nIDHelp = id;
     }

@@ -129,45 +129,6 @@ BOOL CWnd::UpdateData(BOOL save) {
 
 // --- states of controls that stand for commands ---
 
-namespace {
-
-/// A control of a dialog or bar as an element of a command.
-class ControlCmdUI : public CCmdUI {
-public:
-    explicit ControlCmdUI(const Window& control) {
-        m_pOther = CWnd::FromHandle(control.handle());
-        m_nID = static_cast<UINT>(control.id());
-    }
-    void Enable(BOOL on) override {
-        // A focused control that is disabled would keep the keyboard away from the others.
-        if (!on && ::GetFocus() == m_pOther->m_hWnd) {
-            CWnd* next = m_pOther->GetParent()->GetNextDlgTabItem(m_pOther);
-            if (next && next != m_pOther) {
-                next->SetFocus();
-            }
-        }
-        m_pOther->EnableWindow(on);
-        m_bEnableChanged = TRUE;
-    }
-    void SetCheck(int check) override {
-        if ((m_pOther->SendMessage(WM_GETDLGCODE) & DLGC_BUTTON) != 0) {
-            m_pOther->SendMessage(BM_SETCHECK, static_cast<WPARAM>(check));
-        }
-    }
-    void SetRadio(BOOL on) override {
-        SetCheck(on ? 1 : 0);
-    }
-    void SetText(LPCSTR text) override {
-        CString now;
-        m_pOther->GetWindowText(now);
-        if (now != text) {
-            m_pOther->SetWindowText(text);
-        }
-    }
-};
-
-} // namespace
-
 void CWnd::UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler) {
     const Window* window = GetState();
     if (!window) {
@@ -176,7 +137,9 @@ void CWnd::UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler) {
     const auto children = window->children();
     UINT index = 0;
     for (const Window* child : children) {
-        ControlCmdUI element(*child);
+        CCmdUI element;
+        element.m_pOther = CWnd::FromHandle(child->handle());
+        element.m_nID = static_cast<UINT>(child->id());
         element.m_nIndex = index++;
         element.m_nIndexMax = static_cast<UINT>(children.size());
         if (element.m_nID == 0 || element.m_nID == 0xFFFF) {

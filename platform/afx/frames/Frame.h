@@ -178,7 +178,8 @@ public:
 
     /// The prompt of a command: its string's part before the line end. FALSE leaves `message` empty.
     virtual void GetMessageString(UINT id, CString& message) const;
-    /// Shows a text in the status line; null or 0 shows the idle message.
+    /// Shows a text, or the prompt of a number, in the status line; null or 0 empties it, AFX_IDS_IDLEMESSAGE shows the
+    /// idle message.
     void SetMessageText(LPCSTR text);
     void SetMessageText(UINT id);
     /// The bar whose first pane shows the messages; the base answers the bar AFX_IDW_STATUS_BAR.

@@ -54,6 +54,26 @@ struct CommandText {
     }
 };
 
+void addSeparator(QToolBar& tools, int width) {
+    if (width < placeholderWidth) {
+        tools.addSeparator();
+        return;
+    }
+    auto* place = new QWidget(&tools);
+    place->setFixedWidth(width);
+    tools.addWidget(place);
+}
+
+/// Gives a button the texts of its command. It takes no keyboard: the view keeps it while buttons are clicked.
+void dressButton(QToolBar& tools, QAction& action, const CommandText& text, DWORD barStyle) {
+    action.setToolTip((barStyle & CBRS_TOOLTIPS) != 0 ? toQt(text.tip) : QString());
+    action.setStatusTip((barStyle & CBRS_FLYBY) != 0 ? toQt(text.prompt) : QString());
+    action.setMenuRole(QAction::NoRole);
+    QWidget* button = tools.widgetForAction(&action);
+    button->setFocusPolicy(Qt::NoFocus);
+    button->setAccessibleName(toQt(text.tip.IsEmpty() ? text.prompt : text.tip));
+}
+
 } // namespace
 
 BOOL CToolBar::Create(CWnd* parent, DWORD style, UINT id) {
@@ -157,32 +177,18 @@ void CToolBar::rebuild() {
         tools->clear();
         tools->setIconSize(QSize(m_imageSize.cx, m_imageSize.cy));
         for (const Button& button : m_buttons) {
-            if ((button.style & TBBS_SEPARATOR) != 0 && button.image < placeholderWidth) {
-                tools->addSeparator();
-                continue;
-            }
             if ((button.style & TBBS_SEPARATOR) != 0) {
-                auto* place = new QWidget(tools);
-                place->setFixedWidth(button.image);
-                tools->addWidget(place);
+                addSeparator(*tools, button.image);
                 continue;
             }
-            const CommandText text(button.id);
             QAction* action = tools->addAction(toQt(button.text));
             const QRect part(button.image * m_imageSize.cx, 0, m_imageSize.cx, m_imageSize.cy);
             if (pictures.rect().contains(part)) {
                 action->setIcon(QIcon(QPixmap::fromImage(pictures.copy(part))));
             }
-            action->setToolTip((m_dwStyle & CBRS_TOOLTIPS) != 0 ? toQt(text.tip) : QString());
-            action->setStatusTip((m_dwStyle & CBRS_FLYBY) != 0 ? toQt(text.prompt) : QString());
-            action->setMenuRole(QAction::NoRole);
-            if (QWidget* widget = tools->widgetForAction(action)) {
-                widget->setMinimumSize(m_buttonSize.cx, m_buttonSize.cy);
-                widget->setFocusPolicy(Qt::NoFocus);
-                widget->setAccessibleName(toQt(text.tip.IsEmpty() ? text.prompt : text.tip));
-            }
-            const UINT id = button.id;
-            connectStoring(action, &QAction::triggered, tools, [this, id] {
+            dressButton(*tools, *action, CommandText(button.id), m_dwStyle);
+            tools->widgetForAction(action)->setMinimumSize(m_buttonSize.cx, m_buttonSize.cy);
+            connectStoring(action, &QAction::triggered, tools, [this, id = button.id] {
                 armIdle();
                 if (const CWnd* owner = GetOwner()) {
                     owner->SendMessage(WM_COMMAND, MAKEWPARAM(static_cast<int>(id), 0),

@@ -1,26 +1,28 @@
 #include "platform/afx/core/detail/Placement.h"
 
 #include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Gdi.h"
 
 #include <QGuiApplication>
+#include <QMoveEvent>
+#include <QResizeEvent>
 #include <QScreen>
 #include <QWindow>
 
 #include <algorithm>
 #include <limits>
+#include <utility>
 
 namespace tvx::afx {
 
 namespace {
 
-/// How long a window manager is given to do what it was asked, in milliseconds; how often it is asked, and how often
-/// its borders are looked for.
-constexpr int lookBackTime = 150;
-constexpr int attempts = 3;
-constexpr int looks = 20;
+/// How often a frame is asked to its place. The borders that a first request counted may have been those of another
+/// state of the window; what differs after the second is what the desktop wants, as a smallest size or its own tiles.
+constexpr int mostAttempts = 2;
 
 /// Wayland desktops keep the places of windows to themselves; what was asked for must not be lost over that.
 bool tellsPlaces() {
@@ -33,9 +35,9 @@ Placement::Placement(Window& window) : m_window(window) {
     m_settle.setSingleShot(true);
     m_settle.setInterval(0);
     connectStoring(&m_settle, &QTimer::timeout, &m_settle, [this] { settle(); });
-    m_lookBack.setSingleShot(true);
-    m_lookBack.setInterval(lookBackTime);
-    connectStoring(&m_lookBack, &QTimer::timeout, &m_lookBack, [this] { lookBack(); });
+    m_answer.setSingleShot(true);
+    m_answer.setInterval(0);
+    connectStoring(&m_answer, &QTimer::timeout, &m_answer, [this] { answered(); });
 }
 
 QWidget& Placement::widget() const {
@@ -47,6 +49,10 @@ QMargins Placement::borders() const {
     return native ? native->frameMargins() : QMargins();
 }
 
+bool Placement::isGone() const {
+    return m_window.isDestroyed() || !m_window.widget() || !widget().isVisible();
+}
+
 bool Placement::isNormal() const {
     return !widget().isMaximized() && !widget().isMinimized();
 }
@@ -54,7 +60,7 @@ bool Placement::isNormal() const {
 /// Whether the desktop will frame the window or has not told yet that it has.
 bool Placement::awaitsBorders() const {
     const bool framed = widget().isWindow() && (widget().windowFlags() & Qt::FramelessWindowHint) == 0;
-    return framed && (!widget().isVisible() || borders().isNull());
+    return framed && (!widget().isVisible() || (m_bordersComing && !m_bordersTold && borders().isNull()));
 }
 
 /// What the desktop's borders will add to the size of a window that is not shown yet.
@@ -73,14 +79,12 @@ QRect Placement::frameRect() const {
 
 void Placement::moveFrame(const QRect& rect, Measured measured) {
     m_wish.reset();
-    m_lookBack.stop();
+    m_seen.reset(); // what the desktop still tells of the place before does not count
     m_askedCorner = rect.topLeft();
     if (awaitsBorders()) {
         m_wish = Wish{rect, measured};
     } else if (isNormal()) {
-        // What the desktop still tells of the place before does not count.
-        m_wish = Wish{rect, Measured::Frame, attempts};
-        m_lookBack.start();
+        m_wish = Wish{rect, Measured::Frame, 1};
     }
     const QMargins around = borders();
     const QSize inside =
@@ -93,8 +97,9 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
     }
     if (isNormal()) {
         m_restored = rect;
-        m_restoredSize = widget().size();
     }
+    // Also without an event: a window that stands there already is told nothing.
+    changed();
 }
 
 void Placement::setRestored(const QRect& rect) {
@@ -114,16 +119,12 @@ QRect Placement::restored() const {
     if (m_wish && m_wish->measured == Measured::Frame) {
         return m_wish->rect;
     }
-    QRect rect = m_window.windowRect();
-    if (!isNormal() && !m_restored.isNull()) {
-        // A size that was told before the state it belongs to is no restored one.
-        const bool early = widget().isMaximized() && widget().size() == m_restoredSize && !m_before.isNull();
-        rect = early ? m_before : m_restored;
-    }
+    const QRect rect = isNormal() || m_restored.isNull() ? m_window.windowRect() : m_restored;
     return widget().isWindow() && !tellsPlaces() ? QRect(m_askedCorner, rect.size()) : rect;
 }
 
 void Placement::aboutToShow() {
+    changed();
     QWindow* native = widget().windowHandle();
     if (!m_wish || widget().isVisible() || !native || !native->handle()) {
         return;
@@ -135,22 +136,78 @@ void Placement::aboutToShow() {
 }
 
 void Placement::changed() {
+    m_askAgain = m_asked; // an answer on its way is not about this change
     m_settle.start();
 }
 
+void Placement::bordersChanged() {
+    m_bordersTold = true;
+    changed();
+}
+
 void Placement::settle() {
-    if (m_window.isDestroyed() || !m_window.widget() || !widget().isVisible()) {
+    if (isGone()) {
         return;
     }
-    if (!isNormal()) {
-        m_specialInside = widget().geometry();
-    } else if (widget().geometry() == m_specialInside) {
-        return; // restored, but still of the size it had before: the new one is on its way
-    } else {
-        m_specialInside = QRect();
-        grant();
-        remember();
+    if (isNormal()) {
+        m_seen = Seen{m_window.windowRect(), widget().geometry()};
     }
+    ask();
+}
+
+void Placement::ask() {
+    if (m_asked) {
+        m_askAgain = true;
+        return;
+    }
+    m_asked = true;
+    const Told told = widget().isWindow() ? startWhenDesktopHasAnswered(m_answer) : Told::ByNobody;
+    m_bordersComing = told == Told::ByManager;
+    if (!widget().isWindow()) {
+        m_answer.start(); // child frames are moved by the toolkit, which is done at once
+    }
+}
+
+/// The toolkit keeps a place to itself that it has told before, though the widget was given another one meanwhile:
+/// one that was asked for and then overtaken by maximising, or refused.
+void Placement::hearWithheld() {
+    QWindow* native = widget().isWindow() ? widget().windowHandle() : nullptr;
+    if (native && widget().size() != native->size()) {
+        QResizeEvent resized(native->size(), widget().size());
+        guarded([&] { QCoreApplication::sendEvent(native, &resized); });
+    }
+    if (native && widget().geometry().topLeft() != native->position()) {
+        QMoveEvent moved(native->position(), widget().geometry().topLeft());
+        guarded([&] { QCoreApplication::sendEvent(native, &moved); });
+    }
+}
+
+void Placement::answered() {
+    m_asked = false;
+    if (!isGone()) {
+        hearWithheld();
+    }
+    if (std::exchange(m_askAgain, false)) {
+        if (!isGone()) {
+            ask(); // something changed after the question
+        }
+    } else if (isGone()) {
+        m_seen.reset();
+    } else if (!isNormal()) {
+        leaveNormal();
+    } else if (m_wish) {
+        grant();
+    } else {
+        remember(m_window.windowRect());
+    }
+}
+
+/// What was seen before the state came is the restored rectangle, unless it was the size of that state, told first.
+void Placement::leaveNormal() {
+    if (m_seen && !m_wish && m_seen->inside != widget().geometry()) {
+        remember(m_seen->frame);
+    }
+    m_seen.reset();
 }
 
 QRect Placement::wishedFrame() const {
@@ -158,50 +215,25 @@ QRect Placement::wishedFrame() const {
 }
 
 void Placement::grant() {
-    if (!m_wish || m_lookBack.isActive()) {
+    if (awaitsBorders()) {
+        return; // the event that tells them leads here again
+    }
+    const QRect wanted = wishedFrame();
+    if (wanted == m_window.windowRect() || m_wish->attempts >= mostAttempts) {
+        m_wish.reset();
+        remember(m_window.windowRect());
         return;
     }
     Wish wish = *m_wish;
-    if (awaitsBorders()) {
-        // Borders that change nothing of the size inside come without an event.
-        m_wish->looks++;
-        if (wish.looks < looks) {
-            m_lookBack.start();
-        }
-        return;
-    }
     ++wish.attempts;
-    const QRect wanted = wishedFrame();
-    if (wanted != frameRect()) {
-        guarded([&] { m_window.setWindowRect(wanted); });
-    }
+    guarded([&] { m_window.setWindowRect(wanted); });
     m_wish = wish;
-    m_lookBack.start();
+    ask();
 }
 
-void Placement::lookBack() {
-    if (!m_wish || m_window.isDestroyed() || !m_window.widget() || !isNormal()) {
-        return;
-    }
-    const bool done = !awaitsBorders() && m_wish->attempts > 0 && wishedFrame() == frameRect();
-    if (done || m_wish->attempts >= attempts) {
-        m_wish.reset();
-        remember();
-    } else {
-        grant();
-    }
-}
-
-void Placement::remember() {
-    if (m_wish || m_window.isDestroyed() || !m_window.widget()) {
-        return;
-    }
-    const QRect now = m_window.windowRect();
-    if (now != m_restored) {
-        m_before = m_restored;
-        m_restored = now;
-        m_restoredSize = widget().size();
-    }
+void Placement::remember(const QRect& frame) {
+    m_restored = frame;
+    m_seen.reset();
 }
 
 // --- screens ---

@@ -26,11 +26,11 @@ enum class Measured {
 ///
 /// The desktop puts its caption and borders around a window only when the window is shown, and tells their widths a
 /// little later. Until then only the size inside can be set: a rectangle asked for earlier is kept here and the frame
-/// brought to it once its borders are known. Window managers may still be busy with what they were told before, so a
-/// look back follows.
+/// brought to it once its borders are known. What the desktop did is looked at when it has done all that it was asked,
+/// never after a time.
 ///
 /// The restored rectangle follows the window while it is neither maximised nor minimised. Desktops tell a new size and
-/// a new state in either order, so it is taken only when all that they told at a time has been heard.
+/// a new state in either order, so it too is taken only when all has been told.
 class TVX_PLATFORM_API Placement {
 public:
     explicit Placement(Window& window);
@@ -52,34 +52,46 @@ public:
     void aboutToShow();
     /// Called for every change of place, size or state.
     void changed();
+    /// Called when the desktop has told the widths of its borders.
+    void bordersChanged();
 
 private:
     struct Wish {
         QRect rect;
         Measured measured = Measured::Frame;
         int attempts = 0; ///< How often the frame was moved for it.
-        int looks = 0;    ///< How often its borders were looked for.
+    };
+    /// A window that was neither maximised nor minimised, as far as was told.
+    struct Seen {
+        QRect frame;
+        QRect inside; ///< The widget's own geometry.
     };
     QWidget& widget() const;
     QMargins borders() const;
+    bool isGone() const;
     bool isNormal() const;
     bool awaitsBorders() const;
     QSize expectedGrowth() const;
     void settle();
+    void ask();
+    void hearWithheld();
+    void answered();
+    void leaveNormal();
     void grant();
-    void lookBack();
     QRect wishedFrame() const;
-    void remember();
+    void remember(const QRect& frame);
 
     Window& m_window;
-    QTimer m_settle;
-    QTimer m_lookBack;
+    QTimer m_settle; ///< Runs out when everything that came at a time has been heard.
+    QTimer m_answer; ///< Runs out when the desktop has done what it was asked.
+    bool m_asked = false;
+    bool m_askAgain = false;
+    bool m_bordersTold = false;
+    bool m_bordersComing = true; ///< False when the desktop tells nothing.
     std::optional<Wish> m_wish;
-    QPoint m_askedCorner; ///< For desktops that do not tell where windows are.
+    std::optional<Seen> m_seen; ///< Not known yet whether a state belongs to it.
+    QPoint m_askedCorner;       ///< For desktops that do not tell where windows are.
     QRect m_restored;
-    QSize m_restoredSize;  ///< The widget's own size for m_restored.
-    QRect m_before;        ///< The restored rectangle before the last change.
-    QRect m_specialInside; ///< The widget's geometry while last maximised or minimised.
 };
 
 /// The rectangle, moved and if need be shrunk so that enough of its caption to grasp shows on a screen.

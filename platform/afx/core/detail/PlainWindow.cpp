@@ -363,24 +363,15 @@ void showTopLevel(Window& window, int command) {
     }
 }
 
-void TopLevelWindow::show(int command) {
-    const bool visible = command != SW_HIDE;
-    const bool before = !widget()->isHidden();
-    const HWND self = handle();
-    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
-    if (visible != before) {
-        if (visible) {
-            applySizeLimits();
-            forgetToldSize();
-        }
-        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
+void TopLevelWindow::beforeShow(bool visible) {
+    if (visible) {
+        applySizeLimits();
+        forgetToldSize();
     }
-    if (from(self)) {
-        guarded([&] { showTopLevel(*this, command); });
-    }
-    if (from(self)) {
-        tellGeometry();
-    }
+}
+
+void TopLevelWindow::showWidget(int command) {
+    showTopLevel(*this, command);
 }
 
 LRESULT TopLevelWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {

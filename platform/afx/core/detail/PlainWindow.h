@@ -40,7 +40,6 @@ public:
     /// The area below the menu bar.
     QRect clientRect() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
-    void show(int command) override;
     void setWindowRect(const QRect& rect) override;
     /// What the caption shows; a maximised child frame adds its name to it.
     QString text() const override;
@@ -51,6 +50,8 @@ public:
     QMainWindow* mainWindow() const;
 
 protected:
+    void beforeShow(bool visible) override;
+    void showWidget(int command) override;
     QWidget* makeWidget(QWidget* parent) override;
     void widgetMade() override;
     void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;

@@ -406,11 +406,23 @@ void Window::show(int command) {
     m_style = visible ? (m_style | WS_VISIBLE) : (m_style & ~DWORD{WS_VISIBLE});
     const HWND handle = m_handle;
     if (visible != before) {
+        beforeShow(visible);
         call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
     }
+    // Handlers of messages may destroy the window.
     if (from(handle)) {
-        guarded([&] { m_widget->setVisible(visible); });
+        guarded([&] { showWidget(command); });
     }
+    // Frames and dialogs hear of their size when they are shown, not only when it changes.
+    if (from(handle) && m_placement) {
+        tellGeometry();
+    }
+}
+
+void Window::beforeShow(bool) {}
+
+void Window::showWidget(int command) {
+    m_widget->setVisible(command != SW_HIDE);
 }
 
 bool Window::isVisible() const {

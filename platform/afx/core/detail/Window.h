@@ -154,6 +154,7 @@ public:
     QRect screenRect() const;
     QPoint clientToScreen(const QPoint& point) const;
     QPoint screenToClient(const QPoint& point) const;
+    /// Does what a show command (SW_...) says, and tells the window of it.
     virtual void show(int command);
     bool isVisible() const;
     /// Sends WM_SIZE or WM_MOVE when size or place differ from those told last.
@@ -183,6 +184,10 @@ protected:
     virtual QWidget* makeWidget(QWidget* parent) = 0;
     /// Called once the widget stands and the first text is to be shown, before WM_CREATE.
     virtual void widgetMade();
+    /// Called when the window is about to appear or vanish, before WM_SHOWWINDOW.
+    virtual void beforeShow(bool visible);
+    /// Does what a show command says with the kind's widget.
+    virtual void showWidget(int command);
     /// Lets the kind follow a change of style bits.
     virtual void styleChanged(DWORD oldStyle, DWORD oldExStyle);
     /// Lets the kind follow WM_SETFONT.

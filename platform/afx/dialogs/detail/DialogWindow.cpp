@@ -131,28 +131,15 @@ void DialogWindow::keepOnScreen() {
     }
 }
 
-void DialogWindow::show(int command) {
+void DialogWindow::showWidget(int command) {
     if (isChild()) {
-        Window::show(command);
+        Window::showWidget(command);
         return;
     }
-    const bool visible = command != SW_HIDE;
-    const bool before = !widget()->isHidden();
-    const HWND self = handle();
-    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
-    if (visible != before) {
-        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
-    }
-    if (!from(self)) {
-        return;
-    }
-    if (visible && !before) {
+    if (command != SW_HIDE && widget()->isHidden()) {
         keepOnScreen();
     }
-    guarded([&] { showTopLevel(*this, command); });
-    if (from(self)) {
-        tellGeometry();
-    }
+    showTopLevel(*this, command);
 }
 
 // --- units and fonts ---

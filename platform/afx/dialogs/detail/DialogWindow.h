@@ -24,7 +24,6 @@ public:
     QMargins expectedBorders() const override;
     /// Gives the area inside a size, and the window a corner.
     void setClientSize(QPoint corner, QSize inside);
-    void show(int command) override;
     /// Keeps the control for the next activation, and gives the button that Enter presses now the default look.
     void focusMovedWithin(Window& control, bool got) override;
 
@@ -45,6 +44,7 @@ public:
     HWND lastFocus = nullptr;
 
 protected:
+    void showWidget(int command) override;
     QWidget* makeWidget(QWidget* parent) override;
     void widgetMade() override;
     void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;

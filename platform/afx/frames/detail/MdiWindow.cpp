@@ -281,42 +281,30 @@ void MdiChildWindow::setWindowRect(const QRect& rect) {
     Window::setWindowRect(rect);
 }
 
-void MdiChildWindow::show(int command) {
-    const bool visible = command != SW_HIDE;
-    const bool before = !widget()->isHidden();
-    const HWND self = handle();
-    setStyle(visible ? (style() | WS_VISIBLE) : (style() & ~DWORD{WS_VISIBLE}), exStyle());
-    if (visible != before) {
-        forgetToldSize();
-        call(WM_SHOWWINDOW, visible ? TRUE : FALSE);
-    }
-    if (!from(self)) {
-        return;
-    }
-    guarded([&] {
-        switch (command) {
-        case SW_HIDE:
-            widget()->hide();
-            break;
-        case SW_SHOWMAXIMIZED:
-            widget()->showMaximized();
-            break;
-        case SW_SHOWMINIMIZED:
-        case SW_MINIMIZE:
-        case SW_SHOWMINNOACTIVE:
-            widget()->showMinimized();
-            break;
-        case SW_SHOWNORMAL:
-        case SW_RESTORE:
-            widget()->showNormal();
-            break;
-        default:
-            widget()->show();
-            break;
-        }
-    });
-    if (from(self)) {
-        tellGeometry();
+void MdiChildWindow::beforeShow(bool) {
+    forgetToldSize();
+}
+
+void MdiChildWindow::showWidget(int command) {
+    switch (command) {
+    case SW_HIDE:
+        widget()->hide();
+        break;
+    case SW_SHOWMAXIMIZED:
+        widget()->showMaximized();
+        break;
+    case SW_SHOWMINIMIZED:
+    case SW_MINIMIZE:
+    case SW_SHOWMINNOACTIVE:
+        widget()->showMinimized();
+        break;
+    case SW_SHOWNORMAL:
+    case SW_RESTORE:
+        widget()->showNormal();
+        break;
+    default:
+        widget()->show();
+        break;
     }
 }
 

@@ -53,7 +53,6 @@ public:
     explicit MdiChildWindow(const CREATESTRUCT& cs);
     QWidget* clientWidget() const override;
     QWidget* childHost() const override;
-    void show(int command) override;
     void setText(const QString& text) override;
     void setWindowRect(const QRect& rect) override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
@@ -61,6 +60,8 @@ public:
     MdiClientWindow& client() const;
 
 protected:
+    void beforeShow(bool visible) override;
+    void showWidget(int command) override;
     QWidget* makeWidget(QWidget* parent) override;
     void widgetMade() override;
     void iconChanged() override;

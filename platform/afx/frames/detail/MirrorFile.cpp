@@ -120,23 +120,34 @@ bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
     if (exists && ::access(target.c_str(), W_OK) != 0) {
         return fail(errno);
     }
-    int descriptor = makeTemporary(target.parent_path(), target.filename(), m_temporary);
-    m_copies = exists && status.st_nlink > 1;
-    if (descriptor < 0 && exists && errno != ENOENT) {
-        m_copies = true;
-        descriptor = makeTemporary(fs::temp_directory_path(ignored), target.filename(), m_temporary);
-    }
+    const int descriptor = makeBeside(target, exists ? &status : nullptr);
     if (descriptor < 0) {
         return fail(errno);
-    }
-    ::fchmod(descriptor, exists ? status.st_mode & 07777 : defaultMode());
-    if (exists && ::fchown(descriptor, status.st_uid, status.st_gid) != 0) {
-        m_copies = m_copies || status.st_uid != ::geteuid(); // another's file stays the other's
     }
     m_target = target.string();
     attach(descriptor);
     SetFilePath(fileName);
     return true;
+}
+
+/// Makes the temporary file with the rights of the file that it will replace, and tells whether its name can be moved.
+/// @param replaced that file's status; null when there is none
+int MirrorFile::makeBeside(const fs::path& target, const struct stat* replaced) {
+    int descriptor = makeTemporary(target.parent_path(), target.filename(), m_temporary);
+    m_copies = replaced && replaced->st_nlink > 1;
+    if (descriptor < 0 && replaced && errno != ENOENT) {
+        std::error_code ignored;
+        m_copies = true;
+        descriptor = makeTemporary(fs::temp_directory_path(ignored), target.filename(), m_temporary);
+    }
+    if (descriptor < 0) {
+        return -1;
+    }
+    ::fchmod(descriptor, replaced ? replaced->st_mode & 07777 : defaultMode());
+    if (replaced && ::fchown(descriptor, replaced->st_uid, replaced->st_gid) != 0) {
+        m_copies = m_copies || replaced->st_uid != ::geteuid(); // another's file stays the other's
+    }
+    return descriptor;
 }
 
 void MirrorFile::Close() {

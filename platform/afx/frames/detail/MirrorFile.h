@@ -2,7 +2,9 @@
 
 #include "platform/base/File.h"
 
+#include <filesystem>
 #include <string>
+#include <sys/stat.h>
 
 namespace tvx::afx {
 
@@ -22,6 +24,7 @@ public:
 
 private:
     bool openBeside(LPCTSTR fileName, CFileException* error);
+    int makeBeside(const std::filesystem::path& target, const struct stat* replaced);
     void forget();
     std::string m_target;    ///< The system's name of the file to be replaced; empty for files written in place.
     std::string m_temporary; ///< Where it is written meanwhile.

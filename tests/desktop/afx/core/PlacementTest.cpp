@@ -1,6 +1,7 @@
 // Frames end where they were asked to, though the window manager puts its borders around them only when they are shown.
 #include "platform/afx/core/App.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/dialogs/Dialog.h"
 #include "platform/afx/frames/Frame.h"
@@ -13,9 +14,12 @@
 #include <QApplication>
 #include <QScreen>
 #include <QTest>
+#include <QTimer>
 #include <QWidget>
 #include <QWindow>
 
+#include <csignal>
+#include <cstdlib>
 #include <memory>
 #include <string>
 
@@ -75,11 +79,20 @@ protected:
         frame->GetWindowRect(rect);
         return rect;
     }
-    /// Waits until the frame stands at a rectangle, its borders included, for the framework and for the display server.
+    /// Waits until the frame stands at a rectangle, its borders included, for the framework and for the display server,
+    /// and the window manager has nothing left to do.
     void standsAt(const CRect& rect) const {
-        const bool stands =
-            QTest::qWaitFor([&] { return framed() && frameRect() == rect && onScreen() == rect; }, patience);
+        const auto is = [&] { return framed() && frameRect() == rect && onScreen() == rect; };
+        const bool stands = QTest::qWaitFor([&] { return is() && answered() && is(); }, patience);
         EXPECT_TRUE(stands) << words(frameRect()) << ", on the screen " << words(onScreen()) << ", not " << words(rect);
+    }
+    static bool answered() {
+        QTimer timer;
+        bool over = false;
+        timer.setSingleShot(true);
+        QObject::connect(&timer, &QTimer::timeout, [&over] { over = true; });
+        EXPECT_EQ(startWhenDesktopHasAnswered(timer), Told::ByManager);
+        return QTest::qWaitFor([&over] { return over; }, patience);
     }
     bool framed() const {
         const QWindow* native = frame->GetState()->widget()->windowHandle();
@@ -100,6 +113,25 @@ protected:
 };
 
 const CRect givenPlace(90, 70, 690, 520);
+
+/// Halts the window manager for a while, as a machine with other work does.
+class HaltedManager {
+public:
+    HaltedManager() : m_process(std::atoi(std::getenv("TVX_WINDOW_MANAGER"))) {
+        EXPECT_EQ(kill(m_process, SIGSTOP), 0);
+    }
+    ~HaltedManager() {
+        kill(m_process, SIGCONT);
+    }
+    HaltedManager(const HaltedManager&) = delete;
+    HaltedManager& operator=(const HaltedManager&) = delete;
+
+private:
+    pid_t m_process;
+};
+
+/// As long as a user takes for something else; windows must get right whenever the window manager goes on.
+constexpr int meanwhile = 500;
 
 } // namespace
 
@@ -163,6 +195,53 @@ TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangle) {
     placement.showCmd = SW_SHOWNORMAL;
     ASSERT_TRUE(frame->SetWindowPlacement(&placement));
     standsAt(givenPlace);
+}
+
+TEST_F(FramesOnDesktop, ShownAndMovedBeforeTheWindowManagerComesToItStandAtTheLastRectangle) {
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(CRect(10, 20, 500, 400), SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        QTest::qWait(meanwhile);
+        frame->MoveWindow(givenPlace);
+        QTest::qWait(meanwhile);
+    }
+    standsAt(givenPlace);
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+}
+
+TEST_F(FramesOnDesktop, PlacedWhileMaximizedGoBackToTheNewRectangleAlsoLate) {
+    frame->ShowWindow(SW_SHOWMAXIMIZED);
+    ASSERT_TRUE(fillsScreen());
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(givenPlace, SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        QTest::qWait(meanwhile);
+        EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+    }
+    standsAt(givenPlace);
+    {
+        const HaltedManager halted;
+        frame->ShowWindow(SW_SHOWMAXIMIZED);
+        QTest::qWait(meanwhile);
+    }
+    ASSERT_TRUE(fillsScreen());
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
+}
+
+TEST_F(FramesOnDesktop, MaximizedAgainBeforeTheWindowManagerHasRestoredThemFillTheScreen) {
+    frame->ShowWindow(SW_SHOWMAXIMIZED);
+    ASSERT_TRUE(fillsScreen());
+    {
+        const HaltedManager halted;
+        const auto placement = placementFor(givenPlace, SW_SHOWNORMAL);
+        ASSERT_TRUE(frame->SetWindowPlacement(&placement));
+        frame->ShowWindow(SW_SHOWMAXIMIZED);
+    }
+    ASSERT_TRUE(answered());
+    EXPECT_TRUE(fillsScreen()) << words(frameRect()) << ", on the screen " << words(onScreen());
+    EXPECT_EQ(CRect(placementOf(*frame).rcNormalPosition), givenPlace);
 }
 
 TEST_F(FramesOnDesktop, MinimizedSayWhetherTheyWereMaximized) {
