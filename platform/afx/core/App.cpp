@@ -131,6 +131,7 @@ void updateFrames() {
 
 BOOL CWinApp::OnIdle(LONG count) {
     if (count == 0) {
+        // Once more: the next turn drops the temporary objects that update handlers have made.
         updateFrames();
         return TRUE;
     }
@@ -328,6 +329,7 @@ int runApplication(CWinApp& app) {
             app.m_pMainWnd->DestroyWindow();
         }
         const int exitCode = app.ExitInstance();
+        // A start that failed for want of a display must not look like one that had nothing to do.
         return exitCode == 0 && wasDisplayMissed() ? 1 : exitCode;
     }
     return app.Run();

@@ -164,6 +164,7 @@ BOOL AttachThreadInput(DWORD from, DWORD to, BOOL) {
 }
 
 HWND GetForegroundWindow() {
+    // The desktop's answer leaves this process's own windows out.
     const HWND own = GetActiveWindow();
     return own ? own : handleOf(desktop::active());
 }

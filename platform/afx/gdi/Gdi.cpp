@@ -59,6 +59,7 @@ CGdiObject* CGdiObject::FromHandle(HGDIOBJ object) {
 }
 
 void CGdiObject::DeleteTempMap() {
+    // Their destructor must not delete tools that are not theirs.
     objectMap().deleteTemporaries([](CGdiObject& object) { object.m_hObject = nullptr; });
 }
 

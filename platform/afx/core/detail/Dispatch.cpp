@@ -47,6 +47,7 @@ DispatchScope::DispatchScope(Dispatch& dispatch) {
 
 DispatchScope::~DispatchScope() {
     innermost = innermost->outer;
+    // The state of a window that has ended lives until nobody on the stack can hold it any more.
     if (!innermost && !graveyard().empty()) {
         const auto ended = std::move(graveyard());
         graveyard().clear();
@@ -82,6 +83,7 @@ bool passEvent(const Window& window, UINT message) {
         current->source->passed) {
         return false;
     }
+    // Once: a handler that calls its base twice must not type a character twice.
     passToToolkit(*current->source);
     return true;
 }

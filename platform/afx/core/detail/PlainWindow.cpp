@@ -33,6 +33,7 @@ public:
         viewport()->setAutoFillBackground(false);
         viewport()->setAttribute(Qt::WA_OpaquePaintEvent);
         viewport()->setAttribute(Qt::WA_NoSystemBackground);
+        // WM_MOUSEMOVE comes with no button pressed, too.
         viewport()->setMouseTracking(true);
     }
 

@@ -204,6 +204,7 @@ Window* Window::of(const QObject* object) {
         if (found != table.end()) {
             return found->second;
         }
+        // A menu or a tool tip belongs to a widget without being a part of its window.
         if (static_cast<const QWidget*>(object)->isWindow()) {
             break;
         }
@@ -364,6 +365,7 @@ QRect Window::windowRect() const {
     if (m_widget->isWindow()) {
         return m_placement ? m_placement->frameRect() : m_widget->frameGeometry();
     }
+    // A frame's client area begins below its menu bar, which is inside of the toolkit's widget.
     const QPoint origin = m_parent ? m_parent->clientRect().topLeft() : QPoint();
     return m_widget->geometry().translated(-origin);
 }
