@@ -88,7 +88,7 @@ public:
     /// writes is seen by the next call. docs/settings.md tells where the file is.
     /// @{
 
-    /// Makes `key` the maker's part of the settings; the application's part is its program name.
+    /// Makes `key` the maker's part of the settings; the application's part becomes its display name, m_pszAppName.
     void SetRegistryKey(LPCSTR key);
     void SetRegistryKey(UINT id);
 
@@ -119,16 +119,24 @@ public:
     /// Documents.
     /// @{
 
+    /// Makes a kind of document known, in InitInstance. The application deletes it, unless its m_bAutoDelete is FALSE.
     void AddDocTemplate(CDocTemplate* docTemplate);
+    /// Goes through the kinds in the order they were added; a null position is the end.
     POSITION GetFirstDocTemplatePosition() const;
     CDocTemplate* GetNextDocTemplate(POSITION& position) const;
     /// Opens a document, or activates it when it is open already. Null when that failed (the user has been told).
     virtual CDocument* OpenDocumentFile(LPCSTR fileName);
     /// Asks for each modified document whether it is to be saved. FALSE when the user cancelled.
     virtual BOOL SaveAllModified();
+    /// Closes all documents without asking; SaveAllModified comes first. `endSession` is passed on to the templates.
     void CloseAllDocuments(BOOL endSession);
+    /// Documents of all kinds that are open.
     int GetOpenDocumentCount();
-    /// Asks for a file name with the document manager's dialog.
+    /// Asks for a file name with the document manager's dialog. FALSE when the user cancelled.
+    /// @param fileName    comes with the name that is proposed, goes with the one chosen
+    /// @param titleId     string resource of the dialog's caption
+    /// @param flags       OFN_...
+    /// @param docTemplate whose kind of file is proposed; null: all kinds are offered
     BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog, CDocTemplate* docTemplate);
     /// @}
 
