@@ -36,6 +36,8 @@ TVX_PLATFORM_API BOOL DestroyAcceleratorTable(HACCEL table);
 /// @return whether the table has the key
 TVX_PLATFORM_API int TranslateAcceleratorA(HWND window, HACCEL table, MSG* message);
 
+/// The same calls by the names without their suffix.
+/// @{
 inline HACCEL LoadAccelerators(HINSTANCE module, LPCSTR name) {
     return LoadAcceleratorsA(module, name);
 }
@@ -48,3 +50,4 @@ inline int CopyAcceleratorTable(HACCEL table, ACCEL* entries, int count) {
 inline int TranslateAccelerator(HWND window, HACCEL table, MSG* message) {
     return TranslateAcceleratorA(window, table, message);
 }
+/// @}

@@ -114,12 +114,15 @@ namespace {
 
 /// Lets every shown frame bring its tool bars, status bar and title up to date.
 void updateFrames() {
-    const auto windows = Window::topLevels();
-    for (const Window* window : windows) {
-        CWnd* object = window->object();
-        if (object && object->IsFrameWnd() && object->IsWindowVisible()) {
-            object->SendMessage(WM_IDLEUPDATECMDUI, TRUE, 0);
-            object->SendMessageToDescendants(WM_IDLEUPDATECMDUI, TRUE, 0, TRUE, TRUE);
+    // An update handler may end any window, its own frame too.
+    for (const HWND frame : Window::topLevelHandles()) {
+        const CWnd* object = CWnd::FromHandlePermanent(frame);
+        if (!object || !object->IsFrameWnd() || !object->IsWindowVisible()) {
+            continue;
+        }
+        SendMessageA(frame, WM_IDLEUPDATECMDUI, TRUE, 0);
+        if (CWnd* still = CWnd::FromHandlePermanent(frame)) {
+            still->SendMessageToDescendants(WM_IDLEUPDATECMDUI, TRUE, 0, TRUE, TRUE);
         }
     }
 }
@@ -128,6 +131,7 @@ void updateFrames() {
 
 BOOL CWinApp::OnIdle(LONG count) {
     if (count == 0) {
+        // Once more: the next turn drops the temporary objects that update handlers have made.
         updateFrames();
         return TRUE;
     }
@@ -325,6 +329,7 @@ int runApplication(CWinApp& app) {
             app.m_pMainWnd->DestroyWindow();
         }
         const int exitCode = app.ExitInstance();
+        // A start that failed for want of a display must not look like one that had nothing to do.
         return exitCode == 0 && wasDisplayMissed() ? 1 : exitCode;
     }
     return app.Run();

@@ -15,10 +15,11 @@ class CDocument;
 
 /// What the framework knows about the running module.
 struct AFX_MODULE_STATE {
-    HINSTANCE m_hCurrentInstanceHandle = nullptr;
-    HINSTANCE m_hCurrentResourceHandle = nullptr;
+    HINSTANCE m_hCurrentInstanceHandle = nullptr; ///< The application's own module.
+    HINSTANCE m_hCurrentResourceHandle = nullptr; ///< The module searched first for resources: AfxGetResourceHandle.
     /// The name given to the application object's constructor, or the program's base name.
     LPCSTR m_lpszCurrentAppName = nullptr;
+    /// The application object.
     class CWinApp* m_pCurrentWinApp = nullptr;
 };
 
@@ -46,6 +47,7 @@ public:
     CWinApp(const CWinApp&) = delete;
     CWinApp& operator=(const CWinApp&) = delete;
 
+    /// The application's own module; known from InitApplication on.
     HINSTANCE m_hInstance = nullptr;
     /// The command line after the program's name, words with blanks quoted.
     LPSTR m_lpCmdLine = nullptr;
@@ -61,8 +63,11 @@ public:
     LPCSTR m_pszProfileName = nullptr;
     /// The maker's part of the settings; null until SetRegistryKey.
     LPCSTR m_pszRegistryKey = nullptr;
+    /// Owned; null until the first AddDocTemplate.
     CDocManager* m_pDocManager = nullptr;
 
+    /// The first call of a start, for what has to be there before InitInstance. FALSE ends the program with exit code
+    /// 1, without ExitInstance.
     virtual BOOL InitApplication();
     BOOL InitInstance() override;
     int Run() override;
@@ -83,7 +88,7 @@ public:
     /// writes is seen by the next call. docs/settings.md tells where the file is.
     /// @{
 
-    /// Makes `key` the maker's part of the settings; the application's part is its program name.
+    /// Makes `key` the maker's part of the settings; the application's part becomes its display name, m_pszAppName.
     void SetRegistryKey(LPCSTR key);
     void SetRegistryKey(UINT id);
 
@@ -114,22 +119,33 @@ public:
     /// Documents.
     /// @{
 
+    /// Makes a kind of document known, in InitInstance. The application deletes it, unless its m_bAutoDelete is FALSE.
     void AddDocTemplate(CDocTemplate* docTemplate);
+    /// Goes through the kinds in the order they were added; a null position is the end.
     POSITION GetFirstDocTemplatePosition() const;
     CDocTemplate* GetNextDocTemplate(POSITION& position) const;
     /// Opens a document, or activates it when it is open already. Null when that failed (the user has been told).
     virtual CDocument* OpenDocumentFile(LPCSTR fileName);
     /// Asks for each modified document whether it is to be saved. FALSE when the user cancelled.
     virtual BOOL SaveAllModified();
+    /// Closes all documents without asking; SaveAllModified comes first. `endSession` is passed on to the templates.
     void CloseAllDocuments(BOOL endSession);
+    /// Documents of all kinds that are open.
     int GetOpenDocumentCount();
-    /// Asks for a file name with the document manager's dialog.
+    /// Asks for a file name with the document manager's dialog. FALSE when the user cancelled.
+    /// @param fileName    comes with the name that is proposed, goes with the one chosen
+    /// @param titleId     string resource of the dialog's caption
+    /// @param flags       OFN_...
+    /// @param docTemplate whose kind of file is proposed; null: all kinds are offered
     BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog, CDocTemplate* docTemplate);
     /// @}
 
     /// Resources.
     /// @{
 
+    /// Icons and cursors are looked for in the whole chain of modules, those named Standard are the system's (IDI_...,
+    /// IDC_...). They are shared and stay the framework's; null when there is none of that name or number. Of cursors
+    /// there are the system's only.
     HICON LoadIcon(LPCSTR name) const;
     HICON LoadIcon(UINT id) const;
     HICON LoadStandardIcon(LPCSTR name) const;
@@ -154,16 +170,23 @@ public:
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
     /// @}
 
-    /// Commands.
+    /// Commands. All but OnAppExit are in no map until the host puts them into its own, for the commands that its menu
+    /// has: ON_COMMAND(ID_HELP_FINDER, &CWinApp::OnHelpFinder).
     /// @{
 
     afx_msg void OnFileNew();
     afx_msg void OnFileOpen();
+    /// Closes the main window as its close button does, so that documents are asked about.
     afx_msg void OnAppExit();
+    /// Help on where the user is; a frame's own OnHelp comes before it.
     afx_msg void OnHelp();
+    /// The list of topics: HELP_INDEX.
     afx_msg void OnHelpIndex();
+    /// The search: HELP_FINDER.
     afx_msg void OnHelpFinder();
+    /// How help is used: HELP_HELPONHELP.
     afx_msg void OnHelpUsing();
+    /// The same as OnHelp: there is no mode in which the pointer chooses what to explain.
     afx_msg void OnContextHelp();
 
     /// Hides the main window: the first step of the end.
@@ -184,7 +207,10 @@ private:
 TVX_PLATFORM_API CWinApp* AfxGetApp();
 /// The application's main window, null when there is none.
 TVX_PLATFORM_API CWnd* AfxGetMainWnd();
+/// The one state of the process, which all modules share; each call brings its handles up to date.
 TVX_PLATFORM_API AFX_MODULE_STATE* AfxGetModuleState();
+/// The name given to the application object, else the program's without directory and extension. Null while neither is
+/// known: before an application object without a name is run.
 TVX_PLATFORM_API LPCSTR AfxGetAppName();
 
 /// Shows a message box with the application's display name as caption and answers the button (IDOK, ...).
@@ -197,9 +223,11 @@ TVX_PLATFORM_API int AfxMessageBox(LPCSTR text, UINT type = MB_OK, UINT helpId =
 TVX_PLATFORM_API int AfxMessageBox(UINT textId, UINT type = MB_OK, UINT helpId = static_cast<UINT>(-1));
 /// A message box with a caption of its own over `owner` (may be null).
 TVX_PLATFORM_API int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type);
+/// The desktop's one sound for mistakes, whatever the type; none without a display. Always TRUE.
 TVX_PLATFORM_API BOOL MessageBeep(UINT type);
-/// Puts `first` and `second` into the places "%1" and "%2" of a format.
+/// Puts texts into the places "%1" and "%2" of a string resource, which every module may have.
 TVX_PLATFORM_API void AfxFormatString1(CString& result, UINT formatId, LPCSTR first);
+/// The same for a format with two places.
 TVX_PLATFORM_API void AfxFormatString2(CString& result, UINT formatId, LPCSTR first, LPCSTR second);
 /// What the entry point runs: the application object's life from InitApplication to its exit code.
 TVX_PLATFORM_API int AfxWinMain(int argc, char** argv);

@@ -50,6 +50,7 @@ Clipboard& clipboard() {
 
 QString mimeTypeOf(UINT format) {
     const auto found = clipboard().names.find(format);
+    // Names of formats may hold blanks and more that a MIME type may not.
     return found == clipboard().names.end()
                ? QString()
                : QStringLiteral("application/x-tvx-") +
@@ -102,6 +103,7 @@ BOOL CloseClipboard() {
     if (!state.open) {
         return FALSE;
     }
+    // All formats at once: what is given to the toolkit replaces everything that it was given before.
     if (std::exchange(state.changed, false)) {
         publish(state);
     }
@@ -143,6 +145,7 @@ HANDLE GetClipboardData(UINT format) {
     if (!state.open) {
         return nullptr;
     }
+    // What was set in this use is not with the desktop yet.
     if (state.changed) {
         const auto found = state.own.find(format);
         return found != state.own.end() ? found->second : nullptr;

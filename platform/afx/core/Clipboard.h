@@ -43,12 +43,15 @@ TVX_PLATFORM_API HGLOBAL GlobalAlloc(UINT flags, std::size_t bytes);
 TVX_PLATFORM_API HGLOBAL GlobalReAlloc(HGLOBAL block, std::size_t bytes, UINT flags);
 /// The address of a block's first byte; null for what is no block.
 TVX_PLATFORM_API LPVOID GlobalLock(HGLOBAL block);
+/// Blocks never move, so nothing is counted: the address stays valid until the block is freed or grows. FALSE only for
+/// what is no block.
 TVX_PLATFORM_API BOOL GlobalUnlock(HGLOBAL block);
 /// Size of a block in bytes; 0 for what is no block.
 TVX_PLATFORM_API std::size_t GlobalSize(HGLOBAL block);
 /// Frees a block. Null on success, else the handle.
 TVX_PLATFORM_API HGLOBAL GlobalFree(HGLOBAL block);
 
+/// RegisterClipboardFormatA.
 inline UINT RegisterClipboardFormat(LPCSTR name) {
     return RegisterClipboardFormatA(name);
 }

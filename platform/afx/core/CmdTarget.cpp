@@ -53,6 +53,7 @@ thread_local std::array<CachedSearch, 512> cache;
 
 const AFX_MSGMAP_ENTRY* CCmdTarget::FindMessageEntry(UINT message, UINT code, UINT id) const {
     const AFX_MSGMAP* map = GetMessageMap();
+    // Entries of registered messages name a variable, whose number may not be known yet.
     if (message == WM_COMMAND || message == WM_NOTIFY || message >= 0xC000) {
         return search(map, message, code, id);
     }
@@ -68,6 +69,8 @@ BOOL CCmdTarget::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* in
     UINT message = WM_COMMAND;
     auto plainCode = static_cast<UINT>(code);
     if (code != CN_UPDATE_COMMAND_UI) {
+        // A notification by WM_NOTIFY carries its message in the upper half of the code; commands and older
+        // notifications have 0 there.
         message = HIWORD(static_cast<std::uintptr_t>(static_cast<DWORD>(code)));
         plainCode = LOWORD(static_cast<std::uintptr_t>(static_cast<DWORD>(code)));
         message = message == 0 ? WM_COMMAND : message;
@@ -90,10 +93,6 @@ BOOL CCmdTarget::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* in
         }
     }
     return FALSE;
-}
-
-void CCmdTarget::OnFinalRelease() {
-    delete this;
 }
 
 // --- wait cursor ---

@@ -16,9 +16,9 @@ namespace tvx::afx {
 
 /// One message or command on its way through a message map.
 struct MessageCall {
-    UINT message = 0;
-    WPARAM wParam = 0;
-    LPARAM lParam = 0;
+    UINT message = 0;      ///< WM_...; WM_COMMAND for commands and their updates.
+    WPARAM wParam = 0;     ///< Of window messages only, as `lParam`.
+    LPARAM lParam = 0;     ///< See `wParam`.
     LRESULT result = 0;    ///< What a window message's handler answered.
     UINT id = 0;           ///< The command or control, for commands and notifications.
     void* extra = nullptr; ///< A CCmdUI for updates, an NMHDR with result for WM_NOTIFY.
@@ -41,14 +41,14 @@ struct AFX_MSGMAP_ENTRY {
 
 /// The message map of one class, linked to that of its base class.
 struct AFX_MSGMAP {
-    const AFX_MSGMAP* (*pfnGetBaseMap)();
-    const AFX_MSGMAP_ENTRY* lpEntries;
+    const AFX_MSGMAP* (*pfnGetBaseMap)(); ///< Null in the map of CCmdTarget, where every search ends.
+    const AFX_MSGMAP_ENTRY* lpEntries;    ///< In the order they are written; the first that fits is taken.
 };
 
 /// Filled by OnCmdMsg instead of calling the handler, when only its existence is asked for.
 struct AFX_CMDHANDLERINFO {
-    CCmdTarget* pTarget = nullptr;
-    tvx::afx::MessageHandler pmf = nullptr;
+    CCmdTarget* pTarget = nullptr;          ///< Whose map has the handler.
+    tvx::afx::MessageHandler pmf = nullptr; ///< The handler, to be compared at most.
 };
 
 /// State of one user-interface element of a command: a menu item, a tool-bar button, a status pane, a control.
@@ -61,15 +61,15 @@ public:
     CCmdUI() = default;
     virtual ~CCmdUI() = default;
 
-    UINT m_nID = 0;              ///< The command.
-    UINT m_nIndex = 0;           ///< Position in the menu, tool bar or status bar.
-    CMenu* m_pMenu = nullptr;    ///< The menu, when the element is a menu item.
-    CMenu* m_pSubMenu = nullptr; ///< The popup below it, when the item opens one.
-    CMenu* m_pParentMenu = nullptr;
-    CWnd* m_pOther = nullptr; ///< The bar or dialog, when the element is no menu item.
-    BOOL m_bEnableChanged = FALSE;
-    BOOL m_bContinueRouting = FALSE;
-    UINT m_nIndexMax = 0; ///< Number of elements of the menu or bar.
+    UINT m_nID = 0;                  ///< The command.
+    UINT m_nIndex = 0;               ///< Position in the menu, tool bar or status bar.
+    CMenu* m_pMenu = nullptr;        ///< The menu, when the element is a menu item.
+    CMenu* m_pSubMenu = nullptr;     ///< The popup below it, when the item opens one.
+    CMenu* m_pParentMenu = nullptr;  ///< The menu that m_pMenu is a popup of; null for bars and context menus.
+    CWnd* m_pOther = nullptr;        ///< The bar or dialog, when the element is no menu item.
+    BOOL m_bEnableChanged = FALSE;   ///< Set by Enable: the handler has decided, nothing is greyed for want of one.
+    BOOL m_bContinueRouting = FALSE; ///< Set by ContinueRouting.
+    UINT m_nIndexMax = 0;            ///< Number of elements of the menu or bar.
 
     /// Enables or greys the element.
     virtual void Enable(BOOL on = TRUE);
@@ -100,13 +100,14 @@ public:
     /// @param extra the CCmdUI for updates, else null.
     virtual BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info);
 
-    /// Shows the wait cursor until EndWaitCursor is called as often.
+    /// Shows the wait cursor until EndWaitCursor is called as often. Where something may throw in between, a
+    /// CWaitCursor is better. Like the others it goes to CWinApp::DoWaitCursor.
     void BeginWaitCursor();
+    /// Ends what one BeginWaitCursor began; without one it does nothing.
     void EndWaitCursor();
-    /// Shows the wait cursor again after something (a message box) has changed it.
+    /// Shows the wait cursor again after something has changed it, if it is to be shown at all. Message boxes put it
+    /// back by themselves.
     void RestoreWaitCursor();
-
-    virtual void OnFinalRelease();
 
     /// The first entry of this object's map chain for a window message, or null.
     const AFX_MSGMAP_ENTRY* FindMessageEntry(UINT message, UINT code, UINT id) const;
@@ -124,6 +125,7 @@ protected:
 /// @endcode
 class TVX_PLATFORM_API CWaitCursor {
 public:
+    /// May be nested: the cursor goes with the last one.
     CWaitCursor();
     ~CWaitCursor();
     CWaitCursor(const CWaitCursor&) = delete;

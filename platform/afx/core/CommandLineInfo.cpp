@@ -18,6 +18,7 @@ void CCommandLineInfo::ParseParam(const char* param, BOOL isSwitch, BOOL isLast)
 void CCommandLineInfo::ParseParamFlag(const char* param) {
     const std::string_view word(param);
     const auto is = [&](std::string_view name) { return tvx::text::equalNoCase(word, name); };
+    // The desktop's own switches have one spelling, those for people any case.
     if (word == "pt") {
         m_nShellCommand = FilePrintTo;
     } else if (word == "p") {
@@ -63,6 +64,7 @@ void CCommandLineInfo::ParseLast(BOOL isLast) {
         m_nShellCommand = FileOpen;
     }
     if (m_bRunEmbedded || m_bRunAutomated) {
+        // Another program drives this one; its user has not asked for it.
         m_bShowSplash = FALSE;
     }
 }

@@ -154,26 +154,26 @@
 
 /// An item of an owner-drawn list that goes: the host frees what its data points to. WM_DELETEITEM carries it.
 struct DELETEITEMSTRUCT {
-    UINT CtlType;
-    UINT CtlID;
-    UINT itemID;
-    HWND hwndItem;
-    ULONG_PTR itemData;
+    UINT CtlType;       ///< ODT_LISTBOX or ODT_COMBOBOX.
+    UINT CtlID;         ///< The control's identifier.
+    UINT itemID;        ///< The index that the item had.
+    HWND hwndItem;      ///< The control.
+    ULONG_PTR itemData; ///< As in DRAWITEMSTRUCT; 0 for items that were given nothing.
 };
 using LPDELETEITEMSTRUCT = DELETEITEMSTRUCT*;
 
 /// A stretch of text: the byte it begins at and the byte behind it.
 struct _charrange {
-    LONG cpMin;
-    LONG cpMax;
+    LONG cpMin; ///< From 0.
+    LONG cpMax; ///< -1: the end of the text.
 };
 using CHARRANGE = _charrange;
 
 /// A search in a text: where to search, what to look for (zero-terminated), and where it was found.
 struct _findtextexa {
-    CHARRANGE chrg;
-    LPCSTR lpstrText;
-    CHARRANGE chrgText;
+    CHARRANGE chrg;     ///< Where to search.
+    LPCSTR lpstrText;   ///< The text looked for, UTF-8, the caller's.
+    CHARRANGE chrgText; ///< Receives where it stands.
 };
 using FINDTEXTEXA = _findtextexa;
 using FINDTEXTEX = _findtextexa;

@@ -72,11 +72,7 @@ void showForeign(desktop::WindowId window, int command) {
 
 /// False when the callback wanted no more.
 bool tellOwn(WNDENUMPROC callback, LPARAM param) {
-    std::vector<HWND> handles;
-    for (const Window* window : Window::topLevels()) {
-        handles.push_back(window->handle());
-    }
-    return std::ranges::all_of(handles,
+    return std::ranges::all_of(Window::topLevelHandles(),
                                [&](HWND handle) { return !Window::from(handle) || callback(handle, param) != FALSE; });
 }
 
@@ -168,6 +164,7 @@ BOOL AttachThreadInput(DWORD from, DWORD to, BOOL) {
 }
 
 HWND GetForegroundWindow() {
+    // The desktop's answer leaves this process's own windows out.
     const HWND own = GetActiveWindow();
     return own ? own : handleOf(desktop::active());
 }

@@ -28,6 +28,7 @@ Names namesOf(const QMimeData& data) {
     Names names;
     const auto urls = data.urls();
     for (const QUrl& url : urls) {
+        // What is dragged out of a browser has no name that a host could open.
         if (url.isLocalFile()) {
             names.push_back(tvx::driveName(fromQt(url.toLocalFile())));
         }

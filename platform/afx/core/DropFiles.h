@@ -18,6 +18,7 @@ TVX_PLATFORM_API void DragFinish(HDROP drop);
 /// Lets a window accept dropped files, or no longer.
 TVX_PLATFORM_API void DragAcceptFiles(HWND window, BOOL accept);
 
+/// DragQueryFileA.
 inline UINT DragQueryFile(HDROP drop, UINT index, LPSTR buffer, UINT size) {
     return DragQueryFileA(drop, index, buffer, size);
 }

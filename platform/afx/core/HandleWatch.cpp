@@ -21,6 +21,7 @@ namespace tvx::afx {
 namespace {
 
 using Clock = std::chrono::steady_clock;
+// A window that shows output need not be told of it more often than a display shows pictures.
 constexpr std::chrono::milliseconds frame{16};
 
 using Objects = std::vector<std::shared_ptr<win::KernelObject>>;
@@ -66,6 +67,7 @@ public:
 
 private:
     void signalled() {
+        // An object stays signalled: its notifier would call again at every turn of the loop.
         forgetObjects();
         const auto wait = std::chrono::ceil<std::chrono::milliseconds>(m_lastPost + frame - Clock::now());
         if (wait.count() > 0) {

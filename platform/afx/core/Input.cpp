@@ -94,10 +94,12 @@ HCURSOR SetCursor(HCURSOR cursor) {
     QWidget* widget = peerOf(cursorWindow);
     if (widget && cursor) {
         const QCursor wanted = cursorOf(cursor);
+        // Handlers of WM_SETCURSOR set the same one at every move of the mouse; the display need not hear of it.
         if (widget->cursor().shape() != wanted.shape() || !widget->testAttribute(Qt::WA_SetCursor)) {
             widget->setCursor(wanted);
         }
     } else if (widget) {
+        // Null hides the pointer.
         widget->setCursor(Qt::BlankCursor);
     }
     return previous;
@@ -128,6 +130,7 @@ SHORT GetKeyState(int key) {
     bool down = false;
     switch (key) {
     case VK_SHIFT:
+        // A modifier that went down in another program's window is known from later events only.
         down = modifiers.testFlag(Qt::ShiftModifier) || isKeyDown(key);
         break;
     case VK_CONTROL:

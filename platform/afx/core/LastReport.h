@@ -9,6 +9,7 @@
 /// timer or a paint handler that has failed once may fail again at any moment, and would take the message box away.
 class TVX_PLATFORM_API CLastReport {
 public:
+    /// Begins that time on the calling thread; it ends with the object. May be nested.
     CLastReport();
     ~CLastReport();
     CLastReport(const CLastReport&) = delete;

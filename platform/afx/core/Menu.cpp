@@ -39,6 +39,7 @@ CMenu* CMenu::FromHandlePermanent(HMENU menu) {
 }
 
 void CMenu::DeleteTempMap() {
+    // Their destructor must not destroy menus that they only looked at.
     objects().deleteTemporaries([](CMenu& menu) { menu.m_hMenu = nullptr; });
 }
 

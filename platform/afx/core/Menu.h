@@ -53,13 +53,15 @@ class CWnd;
 #define TPM_NONOTIFY 0x0080
 #define TPM_RETURNCMD 0x0100
 
-/// An empty menu bar, or an empty popup. Null only when there are no handles left.
+/// An empty menu bar. Null only when there are no handles left.
 TVX_PLATFORM_API HMENU CreateMenu();
+/// An empty popup. Bars and popups are the same kind of menu here: either may be used as the other.
 TVX_PLATFORM_API HMENU CreatePopupMenu();
 /// A copy of a menu resource of one module (null: the application). Null when there is none or it is damaged.
 TVX_PLATFORM_API HMENU LoadMenuA(HINSTANCE module, LPCSTR name);
 /// Ends a menu and the popups in it. FALSE for what is no menu.
 TVX_PLATFORM_API BOOL DestroyMenu(HMENU menu);
+/// Whether a handle is a menu's. A handle is never given out again soon, so that one kept too long is found out.
 TVX_PLATFORM_API BOOL IsMenu(HMENU menu);
 
 /// Adds an item at the end.
@@ -113,6 +115,8 @@ TVX_PLATFORM_API HMENU GetSystemMenu(HWND window, BOOL revert);
 /// Shows changes of the window's menu bar. They are seen without it too.
 TVX_PLATFORM_API BOOL DrawMenuBar(HWND window);
 
+/// The same calls by the names without their suffix.
+/// @{
 inline BOOL AppendMenu(HMENU menu, UINT flags, UINT_PTR id, LPCSTR text) {
     return AppendMenuA(menu, flags, id, text);
 }
@@ -128,6 +132,7 @@ inline int GetMenuString(HMENU menu, UINT item, LPSTR buffer, int size, UINT fla
 inline HMENU LoadMenu(HINSTANCE module, LPCSTR name) {
     return LoadMenuA(module, name);
 }
+/// @}
 
 /// The object around a menu. It owns the menu it holds and destroys it in its destructor; a menu that belongs to a
 /// window or another menu is detached first, or looked at with FromHandle.
@@ -150,13 +155,15 @@ public:
     CMenu(const CMenu&) = delete;
     CMenu& operator=(const CMenu&) = delete;
 
+    /// The handle, null when there is none; it stays this object's.
     operator HMENU() const {
         return m_hMenu;
     }
-    /// The handle, null when there is none.
+    /// The same by name.
     HMENU GetSafeHmenu() const {
         return m_hMenu;
     }
+    /// Whether both stand for one menu: two objects may, if one of them is temporary.
     BOOL operator==(const CMenu& other) const {
         return m_hMenu == other.m_hMenu;
     }
@@ -183,7 +190,9 @@ public:
     /// Ends the menu and its popups.
     BOOL DestroyMenu();
 
-    // --- items; the arguments are those of the calls of the same names above ---
+    /// Items. Arguments and results are those of the calls of the same names above; without a menu each call fails as
+    /// it does for an item that is not there.
+    /// @{
 
     BOOL AppendMenu(UINT flags, UINT_PTR id = 0, LPCSTR text = nullptr);
     BOOL InsertMenu(UINT position, UINT flags, UINT_PTR id = 0, LPCSTR text = nullptr);
@@ -193,6 +202,7 @@ public:
     UINT EnableMenuItem(UINT item, UINT flags);
     UINT CheckMenuItem(UINT item, UINT flags);
     BOOL CheckMenuRadioItem(UINT first, UINT last, UINT checked, UINT flags);
+    /// SetMenuDefaultItem.
     BOOL SetDefaultItem(UINT item, BOOL byPosition = FALSE);
     BOOL SetMenuItemBitmaps(UINT position, UINT flags, const CBitmap* unchecked, const CBitmap* checked);
     /// Number of items; UINT(-1) when there is no menu.
@@ -204,6 +214,7 @@ public:
     int GetMenuString(UINT item, CString& text, UINT flags) const;
     /// The popup of an item as FromHandle answers it; null when it has none.
     CMenu* GetSubMenu(int position) const;
+    /// @}
     /// Shows this popup; see the call of the same name.
     BOOL TrackPopupMenu(UINT flags, int x, int y, CWnd* owner, const RECT* rect = nullptr);
 };

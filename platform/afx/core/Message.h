@@ -11,12 +11,12 @@
 
 /// One message on its way to a window (or, with a null window, to a thread).
 struct MSG {
-    HWND hwnd;
-    UINT message;
-    WPARAM wParam;
-    LPARAM lParam;
-    DWORD time; ///< Milliseconds since some fixed moment of this session.
-    POINT pt;   ///< Pointer position on the screen when the message was made.
+    HWND hwnd;     ///< The window; null for messages of PostThreadMessage and for WM_QUIT.
+    UINT message;  ///< WM_..., from WM_APP up a host's own, from 0xC000 up a registered one.
+    WPARAM wParam; ///< What it says depends on the message, in `lParam` too: both have 64 bits here.
+    LPARAM lParam; ///< A pointer in it is valid in the process and, for sent messages, during the call.
+    DWORD time;    ///< Milliseconds since some fixed moment of this session.
+    POINT pt;      ///< Pointer position on the screen when the message was made.
 };
 using LPMSG = MSG*;
 
@@ -392,18 +392,19 @@ using LPMSG = MSG*;
 
 /// What a window is created from; WM_CREATE carries a pointer to it.
 struct CREATESTRUCT {
-    LPVOID lpCreateParams;
-    HINSTANCE hInstance;
-    HMENU hMenu; ///< The menu of a frame, the identifier of a child window.
-    HWND hwndParent;
+    LPVOID lpCreateParams; ///< What the creator passed on; frames and views get a CCreateContext, or null.
+    HINSTANCE hInstance;   ///< The application's module, whichever module's code creates the window.
+    HMENU hMenu;           ///< The menu of a frame, the identifier of a child window.
+    HWND hwndParent;       ///< The parent of a child, the owner of any other window; null for none.
+    /// Size and place in pixels, in the parent's client area for children; CW_USEDEFAULT leaves them to the desktop.
     int cy;
     int cx;
     int y;
     int x;
-    LONG style;
-    LPCSTR lpszName;
-    LPCSTR lpszClass;
-    DWORD dwExStyle;
+    LONG style;       ///< WS_... and the bits of the class.
+    LPCSTR lpszName;  ///< Caption or text; may be null.
+    LPCSTR lpszClass; ///< A class's name; null until PreCreateWindow has chosen one.
+    DWORD dwExStyle;  ///< WS_EX_...
 };
 using LPCREATESTRUCT = CREATESTRUCT*;
 
@@ -436,6 +437,8 @@ struct MINMAXINFO {
     POINT ptMaxTrackSize;
 };
 
+/// Where a window is about to be put. For hosts that send WM_WINDOWPOSCHANGING themselves: the layer does not, it tells
+/// of a new place by WM_SIZE and WM_MOVE when the window has it.
 struct WINDOWPOS {
     /// The window, the one it stands behind, its rectangle in its parent and the SWP_... flags.
     HWND hwnd;
@@ -449,58 +452,62 @@ struct WINDOWPOS {
 
 /// The head of every WM_NOTIFY structure.
 struct NMHDR {
-    HWND hwndFrom;
-    UINT_PTR idFrom;
-    UINT code;
+    HWND hwndFrom;   ///< The control that tells; a null one is not routed to any handler.
+    UINT_PTR idFrom; ///< Its identifier: what ON_NOTIFY entries are found by.
+    UINT code;       ///< What happened, the second thing they are found by.
 };
 
 /// State of a scroll bar. Positions run from nMin to nMax - nPage + 1.
 struct SCROLLINFO {
-    UINT cbSize;
-    UINT fMask;
-    int nMin;
-    int nMax;
-    UINT nPage;
-    int nPos;
-    int nTrackPos;
+    UINT cbSize;   ///< sizeof(SCROLLINFO); not looked at.
+    UINT fMask;    ///< SIF_...: which fields are to be set. When asked, all are filled.
+    int nMin;      ///< The least position.
+    int nMax;      ///< The last thing to be seen, not the last position: that is nMax - nPage + 1.
+    UINT nPage;    ///< How much is seen at once, which gives the thumb its length; 0 counts as 1.
+    int nPos;      ///< Where the thumb was put last, always within the range.
+    int nTrackPos; ///< Where the user holds the thumb while dragging it, else nPos. For reading only.
 };
 
-/// What WM_HELP carries a pointer to: the control that help was asked for.
+/// What WM_HELP carries a pointer to: the control that help was asked for. The message is for hosts that send it
+/// themselves; F1 in a dialog is the command ID_HELP of the main window, elsewhere a key like others.
 struct HELPINFO {
-    UINT cbSize;
-    int iContextType;
-    int iCtrlId;
-    HANDLE hItemHandle;
-    DWORD_PTR dwContextId;
-    POINT MousePos;
+    UINT cbSize;           ///< sizeof(HELPINFO).
+    int iContextType;      ///< 1 for a control or window, 2 for a menu item.
+    int iCtrlId;           ///< The control's identifier or the item's command.
+    HANDLE hItemHandle;    ///< The control's or the menu's handle.
+    DWORD_PTR dwContextId; ///< The number of the help page, 0 for none.
+    POINT MousePos;        ///< The pointer in screen pixels.
 };
 
-/// An item of an owner-drawn control or menu that is to be painted.
+/// An item of an owner-drawn control that is to be painted. Menus draw their items themselves.
 struct DRAWITEMSTRUCT {
-    UINT CtlType;
-    UINT CtlID;
-    UINT itemID;
-    UINT itemAction;
-    UINT itemState;
-    HWND hwndItem;
-    HDC hDC;
-    RECT rcItem;
-    ULONG_PTR itemData;
+    UINT CtlType;       ///< ODT_...
+    UINT CtlID;         ///< The control's identifier.
+    UINT itemID;        ///< The item's index; 0 for buttons and static texts.
+    UINT itemAction;    ///< ODA_DRAWENTIRE: items are always painted whole.
+    UINT itemState;     ///< ODS_...: how it is to look.
+    HWND hwndItem;      ///< The control.
+    HDC hDC;            ///< Where to draw; the control's until the handler returns.
+    RECT rcItem;        ///< The item in the control's client pixels.
+    ULONG_PTR itemData; ///< What the item was given by SetItemData, or by AddString without LBS_HASSTRINGS.
 };
 using LPDRAWITEMSTRUCT = DRAWITEMSTRUCT*;
 
-/// An item of an owner-drawn control or menu that is to be measured.
+/// The items of an owner-drawn list or combo box are to be measured: the handler fills itemHeight. The question comes
+/// once for the whole control: all its items are equally high, whatever its style says.
 struct MEASUREITEMSTRUCT {
-    UINT CtlType;
-    UINT CtlID;
-    UINT itemID;
-    UINT itemWidth;
-    UINT itemHeight;
-    ULONG_PTR itemData;
+    UINT CtlType;       ///< ODT_LISTBOX or ODT_COMBOBOX.
+    UINT CtlID;         ///< The control's identifier.
+    UINT itemID;        ///< 0: no item in particular.
+    UINT itemWidth;     ///< Not used: items are as wide as their list.
+    UINT itemHeight;    ///< Pixels, 1 to 1000. Comes with the height of a line of text.
+    ULONG_PTR itemData; ///< 0: no item in particular.
 };
 using LPMEASUREITEMSTRUCT = MEASUREITEMSTRUCT*;
 
+/// Called by a timer: its window, WM_TIMER, its number and the time as GetTickCount tells it.
 using TIMERPROC = void (*)(HWND, UINT, UINT_PTR, DWORD);
+/// Called for each window of an enumeration with its last argument; FALSE ends the enumeration.
 using WNDENUMPROC = BOOL (*)(HWND, LPARAM);
 
 #define HWND_TOP (reinterpret_cast<HWND>(static_cast<std::intptr_t>(0)))
@@ -520,7 +527,9 @@ TVX_PLATFORM_API void PostQuitMessage(int exitCode);
 /// Looks for a waiting message in the range first..last (0, 0: any) for `window` (null: any) and stores it.
 /// With PM_REMOVE it is taken out, to be handed to DispatchMessage. Never waits.
 TVX_PLATFORM_API BOOL PeekMessageA(MSG* message, HWND window, UINT first, UINT last, UINT remove);
-/// Waits for a message and takes it out. 0 when the message is WM_QUIT.
+/// Waits for a message and takes it out. 0 when the message is WM_QUIT, whose wParam is the exit code of
+/// PostQuitMessage; -1 when there is no display to wait for. A loop of a host's own sees the WM_QUIT again if it asks
+/// again: the loops around it are to end too.
 TVX_PLATFORM_API BOOL GetMessageA(MSG* message, HWND window, UINT first, UINT last);
 /// Characters are made from key messages when they are dispatched, so this only answers whether `message` is one.
 TVX_PLATFORM_API BOOL TranslateMessage(const MSG* message);

@@ -29,6 +29,8 @@ class CWnd;
 
 namespace tvx::afx {
 
+/// Takes a handler's type apart: `type` is the class it is a member of, `result` what it answers.
+/// @{
 template <class T>
 struct MemberOf;
 template <class Class, class Result, class... Args>
@@ -41,6 +43,7 @@ struct MemberOf<Result (Class::*)(Args...) const> {
     using type = const Class;
     using result = Result;
 };
+/// @}
 
 /// Calls a handler on the target and keeps what it answers; a handler without result answers 0.
 template <auto Fn, class... Args>
@@ -61,9 +64,13 @@ bool call(CCmdTarget& target, MessageCall& message, Args... args) {
 /// The window object of a handle that a message carries, temporary if it has none of its own.
 TVX_PLATFORM_API CWnd* windowOf(HWND handle);
 /// Temporary objects around the device context and the menu that a message carries.
+/// @{
 TVX_PLATFORM_API CDC* contextOf(HDC handle);
 TVX_PLATFORM_API CMenu* menuOf(HMENU handle);
+/// @}
 
+/// What handlers are given of a parameter: the window whose handle it is, the point of its signed halves.
+/// @{
 inline CWnd* windowOf(WPARAM value) {
     return windowOf(reinterpret_cast<HWND>(value));
 }
@@ -73,6 +80,7 @@ inline CWnd* windowOf(LPARAM value) {
 inline CPoint pointOf(LPARAM value) {
     return CPoint(GET_X_LPARAM(value), GET_Y_LPARAM(value));
 }
+/// @}
 
 /// One function for each shape of parameters that handlers have. Each unpacks the two numbers a message travels with,
 /// calls the handler and answers whether the message is finished with it.
@@ -248,8 +256,8 @@ bool onUpdate(CCmdTarget& t, MessageCall& m) {
 
 /// What OnCmdMsg carries for WM_NOTIFY.
 struct NotifyExtra {
-    NMHDR* header;
-    LRESULT* result;
+    NMHDR* header;   ///< What the control sent; a longer structure that begins with it.
+    LRESULT* result; ///< What the control is to be answered.
 };
 template <auto Fn> // void (NMHDR*, LRESULT*)
 bool onNotify(CCmdTarget& t, MessageCall& m) {

@@ -51,6 +51,7 @@ int CWinThread::Run() {
     if (isQuitting()) {
         const int exitCode = takeQuit();
         const int result = ExitInstance();
+        // A failure that was told by PostQuitMessage is not lost over an ExitInstance that knows of none.
         return exitCode != 0 ? exitCode : result;
     }
     return ExitInstance();
@@ -92,6 +93,7 @@ BOOL CWinThread::PumpMessage() {
     MessageQueue& queue = MessageQueue::instance();
     EventCapture& capture = EventCapture::instance();
     while (!isQuitting()) {
+        // Posted messages before input, as PeekMessage hands them out.
         if (auto posted = queue.find(nullptr, 0, 0, true)) {
             pump(*posted);
             return TRUE;

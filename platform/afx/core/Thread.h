@@ -52,5 +52,7 @@ private:
 
 /// The thread of the caller: the application object on its user-interface thread, null elsewhere.
 TVX_PLATFORM_API CWinThread* AfxGetThread();
+/// The message now being handled, null outside of every handler. It is gone when its handler returns.
 TVX_PLATFORM_API MSG* AfxGetCurrentMessage();
+/// Ends the application: PostQuitMessage, which tells more.
 TVX_PLATFORM_API void AfxPostQuitMessage(int exitCode);

@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/gdi/detail/GdiObjects.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Text.h"
 #include "platform/win/Error.h"
@@ -119,6 +120,7 @@ BOOL tellDescendants(const Window& parent, WNDENUMPROC callback, LPARAM param) {
     for (const Window* window : parent.children()) {
         handles.push_back(window->handle());
     }
+    // The callback may end any of them.
     for (const HWND handle : handles) {
         if (!Window::from(handle)) {
             continue;
@@ -191,6 +193,7 @@ BOOL EnableWindow(HWND handle, BOOL enable) {
         return FALSE;
     }
     const bool wasDisabled = !window->isEnabled();
+    // WM_ENABLE tells of changes only.
     if (wasDisabled == (enable != FALSE)) {
         window->setEnabled(enable != FALSE);
     }
@@ -453,14 +456,27 @@ int MapWindowPoints(HWND from, HWND to, POINT* points, UINT count) {
 
 // --- painting ---
 
+namespace {
+
+/// The part of the client area that is to be repainted, in the client widget's coordinates. A region counts before a
+/// rectangle.
+QRegion partToRepaint(const Window& window, const RECT* rect, HRGN region) {
+    const QRect area = window.clientRect();
+    if (const auto found = findTool<RegionObject>(region)) {
+        return found->region.translated(area.topLeft()) & area;
+    }
+    return rect ? toQt(*rect).translated(area.topLeft()) & area : area;
+}
+
+} // namespace
+
 BOOL RedrawWindow(HWND handle, const RECT* rect, HRGN region, UINT flags) {
     Window* window = windowOrError(handle);
     QWidget* client = peerOf(handle);
     if (!window || !client) {
         return FALSE;
     }
-    const QRect area = window->clientRect();
-    const QRect part = rect ? toQt(*rect).translated(area.topLeft()).intersected(area) : area;
+    const QRegion part = partToRepaint(*window, rect, region);
     guarded([&] {
         if ((flags & RDW_INVALIDATE) != 0) {
             client->update(part);

@@ -64,8 +64,13 @@ TVX_PLATFORM_API HWND GetForegroundWindow();
 TVX_PLATFORM_API BOOL SetForegroundWindow(HWND window);
 /// The screen's own window; its rectangle is the primary screen's.
 TVX_PLATFORM_API HWND GetDesktopWindow();
+/// The innermost window of this process at a point of the screen, hidden and disabled ones left out; null for none.
 TVX_PLATFORM_API HWND WindowFromPoint(POINT point);
+/// The first child, in the order of GetWindow, at a point of the parent's client area, hidden and disabled ones
+/// included; the parent itself where no child is, null outside of it.
 TVX_PLATFORM_API HWND ChildWindowFromPoint(HWND parent, POINT point);
+/// The first top-level window of this process with that class (any case) and caption; null for either means any.
+/// Windows of other processes are not found: EnumWindows lists them.
 TVX_PLATFORM_API HWND FindWindowA(LPCSTR className, LPCSTR text);
 /// Calls `callback` for all descendants of a window until it answers FALSE.
 TVX_PLATFORM_API BOOL EnumChildWindows(HWND parent, WNDENUMPROC callback, LPARAM param);
@@ -88,27 +93,39 @@ TVX_PLATFORM_API BOOL SetWindowTextA(HWND window, LPCSTR text);
 TVX_PLATFORM_API int GetWindowTextA(HWND window, LPSTR buffer, int size);
 TVX_PLATFORM_API int GetWindowTextLengthA(HWND window);
 TVX_PLATFORM_API int GetClassNameA(HWND window, LPSTR buffer, int size);
-/// Style, extended style, identifier or user data (GWL_...).
+/// Style, extended style, identifier or user data (GWL_...); the setting call answers the previous value. Both answer 0
+/// for another index. What a new style changes is seen at once, without SWP_FRAMECHANGED.
 TVX_PLATFORM_API LONG_PTR GetWindowLongPtrA(HWND window, int index);
 TVX_PLATFORM_API LONG_PTR SetWindowLongPtrA(HWND window, int index, LONG_PTR value);
 /// @}
 
+/// The pointer's place in screen pixels. FALSE without a display.
 TVX_PLATFORM_API BOOL GetCursorPos(POINT* point);
+/// Moves the pointer, as far as the desktop lets a program do that: Wayland desktops do not. FALSE without a display.
 TVX_PLATFORM_API BOOL SetCursorPos(int x, int y);
 /// Shows a cursor over the window that the pointer is in; meant for WM_SETCURSOR handlers. Answers the previous one.
 TVX_PLATFORM_API HCURSOR SetCursor(HCURSOR cursor);
-/// One of the system's cursors (IDC_ARROW, ...; null module) or one of a module's own.
+/// One of the system's cursors (IDC_ARROW, ...), whatever the module. Null for any other: cursors in resources are not
+/// shown here. Cursors are shared and never destroyed.
 TVX_PLATFORM_API HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name);
-/// The state of a key or mouse button (VK_...): negative when down, bit 0 set when a lock key is on.
+/// The state of a key or mouse button (VK_...): negative when down, else 0. Whether a lock key is on is not told, and
+/// keys that went down while another program had the keyboard are not known.
 TVX_PLATFORM_API SHORT GetKeyState(int key);
+/// The same: a program only hears of keys by its messages. A long calculation that wants to see Esc has to let them
+/// come (PeekMessage, PumpMessage) before it asks.
 TVX_PLATFORM_API SHORT GetAsyncKeyState(int key);
 
 /// The dialog units of the system font (SYSTEM_FONT), in pixels: width in the low half, height in the high one. A
 /// horizontal dialog unit is a quarter of the width, a vertical one an eighth of the height.
 TVX_PLATFORM_API LONG GetDialogBaseUnits();
 
-/// Starts a timer. With a null window the identifier is chosen and answered.
+/// Starts a timer, or starts it anew when the window has one of that number. With a null window the number is chosen,
+/// unless it is that of such a timer, and answered.
+/// @param elapse   milliseconds, at least 1
+/// @param callback called instead of sending WM_TIMER; null for the message
+/// @return 0 when the window is none, or without a display
 TVX_PLATFORM_API UINT_PTR SetTimer(HWND window, UINT_PTR id, UINT elapse, TIMERPROC callback);
+/// Ends a timer; it does nothing any more. FALSE when there is none. A window's timers end with it.
 TVX_PLATFORM_API BOOL KillTimer(HWND window, UINT_PTR id);
 
 /// The same calls by the names without their suffix.

@@ -140,6 +140,7 @@ BOOL CWnd::CreateEx(DWORD exStyle, LPCSTR className, LPCSTR text, DWORD style, i
     cs.hInstance = AfxGetInstanceHandle();
     cs.lpCreateParams = param;
     if (!PreCreateWindow(cs)) {
+        // Objects that delete themselves do so there, also when there never was a window.
         PostNcDestroy();
         return FALSE;
     }
@@ -206,6 +207,7 @@ BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result)
         const auto* header = reinterpret_cast<const NMHDR*>(lParam);
         return header && header->hwndFrom ? OnNotify(wParam, lParam, result) : FALSE;
     }
+    // Commands and notifications have roads of their own, above; every other message ends in this window's map.
     const AFX_MSGMAP_ENTRY* entry = FindMessageEntry(message, 0, 0);
     if (!entry) {
         return FALSE;
@@ -371,6 +373,7 @@ LPCSTR AfxRegisterWndClass(UINT classStyle, HCURSOR cursor, HBRUSH background, H
         entry.icon = icon;
         addWindowClass(std::move(entry));
     }
+    // The table's own text, which stays where it is: hosts keep the pointer.
     return findWindowClass(name)->name.c_str();
 }
 

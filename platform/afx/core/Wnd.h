@@ -50,10 +50,11 @@ public:
     CWnd(const CWnd&) = delete;
     CWnd& operator=(const CWnd&) = delete;
 
-    /// The handle of an object that may be null.
+    /// The handle of an object that may be null: null then, and when it has no window.
     HWND GetSafeHwnd() const {
         return HandleOf(this);
     }
+    /// The handle, null when there is no window.
     operator HWND() const {
         return m_hWnd;
     }
@@ -75,6 +76,7 @@ public:
     BOOL SubclassWindow(HWND window);
     /// Attaches to the control `id` of `parent`. FALSE when there is none or it has an object already.
     BOOL SubclassDlgItem(UINT id, CWnd* parent);
+    /// Gives up the window, whose messages go to its class alone again, and answers its handle. The same as Detach.
     HWND UnsubclassWindow();
     /// @}
 
@@ -104,12 +106,15 @@ public:
     /// Messages.
     /// @{
 
+    /// Hands a message straight to the window's procedure; 0 without a window. From another thread it waits for that.
     LRESULT SendMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
         return ::SendMessageA(m_hWnd, message, wParam, lParam);
     }
+    /// Puts a message behind those that wait. Without a window it goes to the thread itself.
     BOOL PostMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
         return ::PostMessageA(m_hWnd, message, wParam, lParam);
     }
+    /// SendMessage by the name that sources compiled elsewhere hold.
     LRESULT SendMessageA(UINT message, WPARAM wParam = 0, LPARAM lParam = 0) const {
         return ::SendMessageA(m_hWnd, message, wParam, lParam);
     }
@@ -137,20 +142,27 @@ public:
     /// State.
     /// @{
 
+    /// The bits that the window has now: WS_VISIBLE, WS_DISABLED and the scroll bars' follow what was done with it.
     DWORD GetStyle() const;
+    /// The WS_EX_... bits.
     DWORD GetExStyle() const;
-    /// Removes and adds style bits. `swpFlags` other than 0 redraws the frame. Answers whether anything changed.
+    /// Removes and adds style bits, removing first. Answers whether anything changed.
+    /// @param swpFlags passed on to SetWindowPos when not 0. Not needed for the new style to be seen: that is at once.
     BOOL ModifyStyle(DWORD remove, DWORD add, UINT swpFlags = 0);
+    /// The same for WS_EX_... bits.
     BOOL ModifyStyleEx(DWORD remove, DWORD add, UINT swpFlags = 0);
+    /// The identifier that a child is found by and its messages carry; SetDlgCtrlID answers the previous one.
     int GetDlgCtrlID() const;
     int SetDlgCtrlID(int id);
     /// Enables or disables input. Answers whether the window was disabled before.
     BOOL EnableWindow(BOOL enable = TRUE);
+    /// Whether this window itself takes input; its parents may be disabled all the same.
     BOOL IsWindowEnabled() const;
     /// Shows, hides, minimises, maximises or restores (SW_...). Answers whether the window was visible before.
     BOOL ShowWindow(int command);
     /// Whether the window and all its ancestors are shown.
     BOOL IsWindowVisible() const;
+    /// Whether the window is minimised or, IsZoomed, maximised: both when it will be maximised on being restored.
     BOOL IsIconic() const;
     BOOL IsZoomed() const;
     /// @}
@@ -166,6 +178,7 @@ public:
     /// Copies at most size - 1 bytes, never half a character, and answers how many.
     int GetWindowText(LPSTR buffer, int size) const;
     void GetWindowText(CString& text) const;
+    /// Bytes of the text, the ending NUL not counted.
     int GetWindowTextLength() const;
     /// Sets the font a control draws with; it stays the caller's and must live as long as the control uses it.
     void SetFont(CFont* font, BOOL redraw = TRUE);
@@ -173,31 +186,46 @@ public:
     CFont* GetFont() const;
     /// Gives a frame its icon; `bigIcon` selects the one for task lists. Answers the previous one.
     HICON SetIcon(HICON icon, BOOL bigIcon);
+    /// The icon set last, null when none was.
     HICON GetIcon(BOOL bigIcon) const;
     /// @}
 
     /// Place and size.
     /// @{
 
+    /// The window with its frame, in screen pixels, children too. Left alone without a window.
     void GetWindowRect(RECT* rect) const;
     /// The client area, with its left top corner at 0, 0.
     void GetClientRect(RECT* rect) const;
+    /// Puts the window with its frame into a rectangle: of the parent's client area for children, of the screen for
+    /// others. WM_SIZE and WM_MOVE come before the call returns where something has changed; what a window manager
+    /// decides otherwise comes later. `repaint` is not looked at: what was uncovered is always repainted.
     void MoveWindow(int x, int y, int width, int height, BOOL repaint = TRUE);
     void MoveWindow(const RECT* rect, BOOL repaint = TRUE);
     /// Moves, sizes, reorders, shows or hides in one step (SWP_...).
+    /// @param insertAfter a sibling to stand behind, null: in front of all; not looked at with SWP_NOZORDER
     BOOL SetWindowPos(const CWnd* insertAfter, int x, int y, int cx, int cy, UINT flags);
+    /// How the window is shown and where it is when it is neither minimised nor maximised: what is kept from one run to
+    /// the next. FALSE without a window.
     BOOL GetWindowPlacement(WINDOWPLACEMENT* placement) const;
+    /// Puts it back and shows it. A rectangle that is off the screen is moved until its caption can be reached. FALSE
+    /// when `length` is not the structure's.
     BOOL SetWindowPlacement(const WINDOWPLACEMENT* placement);
     /// Centres over `other`, over the owner, or on the screen, keeping the window on the screen.
     void CenterWindow(CWnd* other = nullptr);
+    /// In front of its siblings; a top-level window in front of all others, as far as the desktop allows that.
     void BringWindowToTop();
+    /// Converts in place between this window's client area and the screen.
     void ClientToScreen(POINT* point) const;
     void ClientToScreen(RECT* rect) const;
     void ScreenToClient(POINT* point) const;
     void ScreenToClient(RECT* rect) const;
+    /// Converts in place from this window's client area to another's; null stands for the screen.
     void MapWindowPoints(CWnd* to, POINT* points, UINT count) const;
     void MapWindowPoints(CWnd* to, RECT* rect) const;
-    /// The window rectangle that gives the client rectangle `rect`, for this window's styles.
+    /// Makes of a client rectangle the rectangle of the window around it, as this window is now: frame, caption and
+    /// menu bar of a top-level window are known once it has been shown.
+    /// @param adjustType not used
     virtual void CalcWindowRect(RECT* rect, UINT adjustType = 0);
     /// @}
 
@@ -210,52 +238,80 @@ public:
     void InvalidateRect(const RECT* rect, BOOL erase = TRUE);
     /// Paints what has been requested, now.
     void UpdateWindow();
+    /// Requests a repaint of a region of the client area, else of a rectangle, else (both null) of all, and carries it
+    /// out with RDW_UPDATENOW. Children are repainted with RDW_ALLCHILDREN. A request is never taken back: RDW_VALIDATE
+    /// does nothing.
     BOOL RedrawWindow(const RECT* rect = nullptr, CRgn* region = nullptr,
                       UINT flags = RDW_INVALIDATE | RDW_UPDATENOW | RDW_ERASE);
-    /// Suspends or resumes painting while contents change.
+    /// Suspends or resumes painting of the window and its children while contents change. Resuming requests a repaint
+    /// of everything. Contexts (CClientDC) draw meanwhile.
     void SetRedraw(BOOL redraw = TRUE);
     /// A context over the client area, to be given back with ReleaseDC. It draws at once, also outside WM_PAINT.
     CDC* GetDC();
+    /// A context over the whole window. A frame that the desktop draws can be measured, but not drawn on.
     CDC* GetWindowDC();
+    /// Gives a context of GetDC or GetWindowDC back and shows what was drawn. 0 for any other.
     int ReleaseDC(CDC* dc);
-    /// Moves the contents (and the children) by an offset and requests the uncovered strip.
+    /// Moves the contents by an offset in pixels and requests the uncovered strip.
+    /// @param scroll what is to be moved, null: the whole client area, and the children with it
+    /// @param clip   counts where `scroll` is null
     void ScrollWindow(int dx, int dy, const RECT* scroll = nullptr, const RECT* clip = nullptr);
     /// @}
 
     /// The tree of windows.
     /// @{
 
+    /// The parent of a child, the window that a popup or dialog stands over; null for a main window. Temporary when it
+    /// has no object.
     CWnd* GetParent() const;
     /// Makes the window a child of another and answers the previous parent.
     CWnd* SetParent(CWnd* parent);
-    /// The window a dialog or popup stands over.
+    /// The window that a bar reports to and that CenterWindow centres over: the one set last, else the parent (of a
+    /// popup or dialog the window it stands over).
     CWnd* GetOwner() const;
+    /// Sets that; null for the parent again. It changes neither parent nor stacking, and is not told of its end.
     void SetOwner(CWnd* owner);
+    /// The last of the parents, over owners too; the window itself when it has none.
     CWnd* GetTopLevelParent() const;
+    /// The nearest frame around this window, not itself: a document's frame before the main one. Null for none.
     CFrameWnd* GetParentFrame() const;
+    /// The outermost frame, which may be this one.
     CFrameWnd* GetTopLevelFrame() const;
+    /// The window in a relation to this one (GW_...): first, last, next or previous sibling, first child, owner. Null
+    /// when there is none.
     CWnd* GetWindow(UINT relation) const;
+    /// The first child.
     CWnd* GetTopWindow() const;
+    /// The sibling behind this one, with GW_HWNDPREV the one before; null after the last. Siblings of a top-level
+    /// window are this process's other ones in the order of their creation.
     CWnd* GetNextWindow(UINT relation = GW_HWNDNEXT) const {
         return GetWindow(relation);
     }
+    /// Whether `other` is a child of this window, or of its children; popups over it are not.
     BOOL IsChild(const CWnd* other) const;
     /// The child with an identifier; temporary when it has no object, null when there is none.
     CWnd* GetDlgItem(int id) const;
     void GetDlgItem(int id, HWND* handle) const;
     /// The same among all descendants; with `onlyPerm` only windows with an object.
     CWnd* GetDescendantWindow(int id, BOOL onlyPerm = FALSE) const;
+    /// Stands for the screen: only its rectangles can be asked for.
     static CWnd* GetDesktopWindow();
+    /// FindWindowA: a top-level window of this process by class and caption (null: any).
     static CWnd* FindWindow(LPCSTR className, LPCSTR text);
+    /// The innermost window of this process at a point of the screen; null for none.
     static CWnd* WindowFromPoint(POINT point);
     /// @}
 
     /// Activation, focus, capture.
     /// @{
 
+    /// Asks for the top-level window of this one to be the active one and answers the one before. The desktop decides,
+    /// and WM_ACTIVATE tells. GetActiveWindow knows this process's windows: it is null while another process has it.
     CWnd* SetActiveWindow();
     static CWnd* GetActiveWindow();
+    /// Raises the window and activates it.
     BOOL SetForegroundWindow();
+    /// The active window if it is this process's, else null.
     static CWnd* GetForegroundWindow();
     /// Gives the window the keyboard and answers the window that had it.
     CWnd* SetFocus();
@@ -270,28 +326,39 @@ public:
 
     /// Starts or restarts a timer that sends WM_TIMER (or calls `callback`) every `elapse` milliseconds.
     UINT_PTR SetTimer(UINT_PTR id, UINT elapse, TIMERPROC callback = nullptr);
+    /// FALSE when there is no such timer. Timers end with their window.
     BOOL KillTimer(UINT_PTR id);
     /// @}
 
-    /// Scroll bars of the window's frame.
+    /// Scroll bars of the window's frame: SB_HORZ or SB_VERT. The calls that ask answer 0 where there is no such bar. A
+    /// window scrolls nothing by itself: it gets WM_HSCROLL or WM_VSCROLL, moves what it shows and sets the position.
+    /// Bars of edits and lists can be asked and set to a position; their ranges are theirs.
     /// @{
 
+    /// Puts the thumb, within the range, and answers where it was. No message comes of it.
     int SetScrollPos(int bar, int pos, BOOL redraw = TRUE);
     int GetScrollPos(int bar) const;
+    /// From the least position to the last thing to be seen; a range of nothing hides the bar.
     void SetScrollRange(int bar, int min, int max, BOOL redraw = TRUE);
     void GetScrollRange(int bar, int* min, int* max) const;
+    /// What SCROLLINFO tells. FALSE where there is no such bar.
     BOOL SetScrollInfo(int bar, SCROLLINFO* info, BOOL redraw = TRUE);
     BOOL GetScrollInfo(int bar, SCROLLINFO* info, UINT mask = SIF_ALL);
+    /// Shows or hides bars, SB_BOTH too; the client area shrinks or grows at once.
     void ShowScrollBar(UINT bar, BOOL show = TRUE);
-    void EnableScrollBarCtrl(int bar, BOOL enable = TRUE);
+    /// The control that stands in for a bar of the frame: null unless a derived class has one to answer.
     virtual CScrollBar* GetScrollBarCtrl(int bar) const;
     /// @}
 
     /// Menus.
     /// @{
 
+    /// The menu bar's menu, null when there is none; it ends with the window.
     CMenu* GetMenu() const;
+    /// Shows another menu, null for none. The window owns it from then on, the previous one is the caller's. FALSE for
+    /// child windows.
     BOOL SetMenu(CMenu* menu);
+    /// Not needed: changes of a menu are seen at once.
     void DrawMenuBar();
     /// The window menu; with `revert` it gets its original items back.
     CMenu* GetSystemMenu(BOOL revert) const;
@@ -300,26 +367,34 @@ public:
     /// Dialog items.
     /// @{
 
+    /// The text of an item, as SetWindowText and GetWindowText of it; nothing and 0 when there is no such child.
     void SetDlgItemText(int id, LPCSTR text);
     int GetDlgItemText(int id, LPSTR buffer, int size) const;
     int GetDlgItemText(int id, CString& text) const;
+    /// A number in decimal digits; with `isSigned` `value` is taken for an int.
     void SetDlgItemInt(int id, UINT value, BOOL isSigned = TRUE);
     /// The number in an item's text. `translated` tells whether the text was a number of 32 bits.
     UINT GetDlgItemInt(int id, BOOL* translated = nullptr, BOOL isSigned = TRUE) const;
+    /// Marks of buttons: 0 off, 1 on, 2 neither (three-state boxes). CheckRadioButton sets one of a range and clears
+    /// the others; GetCheckedRadioButton answers which one is set, 0 for none.
     void CheckDlgButton(int id, UINT check);
     void CheckRadioButton(int first, int last, int checked);
     UINT IsDlgButtonChecked(int id) const;
     int GetCheckedRadioButton(int first, int last) const;
+    /// Sends a message to an item; 0 when there is no such child.
     LRESULT SendDlgItemMessage(int id, UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
     /// The control that Tab (Shift+Tab with `previous`) reaches from `from`, the first one when `from` is null.
     CWnd* GetNextDlgTabItem(CWnd* from, BOOL previous = FALSE) const;
-    /// The control of the same group that the arrow keys reach.
+    /// The control that the arrow keys reach from `from`: the next one that can be used in its group, which begins with
+    /// WS_GROUP, and after the last the first again. Null when `from` is.
     CWnd* GetNextDlgGroupItem(CWnd* from, BOOL previous = FALSE) const;
     /// Moves data between the controls and the members, through DoDataExchange. FALSE when validation failed.
     /// @param save TRUE from the controls into the members.
     BOOL UpdateData(BOOL save = TRUE);
     /// Updates the controls' states through their ON_UPDATE_COMMAND_UI handlers.
     void UpdateDialogControls(CCmdTarget* target, BOOL disableIfNoHandler);
+    /// A message box over this window; answers the button (IDOK, ...).
+    /// @param caption null: the application's name
     int MessageBox(LPCSTR text, LPCSTR caption = nullptr, UINT type = MB_OK);
     /// Accepts files dropped from other programs (WM_DROPFILES).
     void DragAcceptFiles(BOOL accept = TRUE);
@@ -337,7 +412,14 @@ public:
     tvx::afx::Window* GetState() const;
     /// @}
 
-    /// Handlers of messages; the base versions do what happens by default.
+    /// Handlers of messages; the base versions do what happens by default, whatever values they are called with.
+    ///
+    /// Points are pixels of the client area, except those of OnContextMenu and OnMouseWheel, which are the screen's
+    /// ((-1, -1) when the keyboard asked for a menu). Windows that come as arguments may be temporary or null.
+    ///
+    /// What differs: the desktop draws the frames of top-level windows, so there are no messages of the non-client area
+    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange, OnHelpInfo and
+    /// those of the session's end are called for messages that hosts send: the layer sends none of these.
     /// @{
 
     afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);

@@ -180,6 +180,7 @@ void CWnd::CenterWindow(CWnd* other) {
     place.moveCenter(area.center());
     place.moveRight(std::min(place.right(), available.right()));
     place.moveBottom(std::min(place.bottom(), available.bottom()));
+    // The left top corner last: of a window larger than the screen the caption has to be within reach.
     place.moveLeft(std::max(place.left(), available.left()));
     place.moveTop(std::max(place.top(), available.top()));
     ::SetWindowPos(m_hWnd, nullptr, place.x(), place.y(), 0, 0, SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
@@ -218,10 +219,12 @@ void CWnd::CalcWindowRect(RECT* rect, UINT) {
     if (!window) {
         return;
     }
-    const QSize client = window->clientRect().size();
-    const QSize whole = window->windowRect().size();
-    rect->right += whole.width() - client.width();
-    rect->bottom += whole.height() - client.height();
+    const QRect client(window->clientToScreen(QPoint(0, 0)), window->clientRect().size());
+    const QRect whole = window->screenRect();
+    rect->left += whole.left() - client.left();
+    rect->top += whole.top() - client.top();
+    rect->right += whole.right() - client.right();
+    rect->bottom += whole.bottom() - client.bottom();
 }
 
 // --- painting ---
@@ -239,7 +242,7 @@ void CWnd::UpdateWindow() {
 }
 
 BOOL CWnd::RedrawWindow(const RECT* rect, CRgn* region, UINT flags) {
-    return ::RedrawWindow(m_hWnd, rect, nullptr, flags);
+    return ::RedrawWindow(m_hWnd, rect, region ? static_cast<HRGN>(*region) : nullptr, flags);
 }
 
 void CWnd::SetRedraw(BOOL redraw) {
@@ -447,6 +450,7 @@ void CWnd::SetScrollRange(int bar, int min, int max, BOOL redraw) {
 
 void CWnd::GetScrollRange(int bar, int* min, int* max) const {
     const QScrollBar* slider = barOf(*this, bar);
+    // The toolkit's maximum is the last position, the host's the last thing seen: a page less one apart.
     *min = slider ? slider->minimum() : 0;
     *max = slider ? slider->maximum() + std::max(slider->pageStep() - 1, 0) : 0;
 }
@@ -458,6 +462,7 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     }
     auto* plain = dynamic_cast<PlainWindow*>(GetState());
     if (!plain) {
+        // Controls keep range and page of their bars by what is in them.
         slider->setValue((info->fMask & SIF_POS) != 0 ? info->nPos : slider->value());
         return TRUE;
     }
@@ -508,10 +513,6 @@ void CWnd::ShowScrollBar(UINT bar, BOOL show) {
     if (bar == SB_VERT || bar == SB_BOTH) {
         plain->showScrollBar(SB_VERT, show != FALSE);
     }
-}
-
-void CWnd::EnableScrollBarCtrl(int bar, BOOL enable) {
-    ShowScrollBar(static_cast<UINT>(bar), enable);
 }
 
 CScrollBar* CWnd::GetScrollBarCtrl(int) const {

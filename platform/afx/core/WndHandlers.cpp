@@ -5,6 +5,8 @@
 // The handlers that derived classes list in their message maps and call as their base: each does what happens without
 // one.
 
+// Default() hands on the message as it came: a host that calls a base handler with other values changes nothing, as it
+// is used to.
 void CWnd::OnActivate(UINT, CWnd*, BOOL) {
     Default();
 }

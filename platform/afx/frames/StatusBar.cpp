@@ -254,12 +254,7 @@ LRESULT CStatusBar::OnGetText(WPARAM size, LPARAM buffer) {
     if (size == 0 || buffer == 0) {
         return 0;
     }
-    const std::size_t room = std::min<std::size_t>(size - 1, static_cast<std::size_t>(text.GetLength()));
-    const std::size_t length = tvx::text::characterStart(text.View(), room);
-    auto* target = reinterpret_cast<char*>(buffer);
-    std::memcpy(target, text.GetString(), length);
-    target[length] = '\0';
-    return static_cast<LRESULT>(length);
+    return static_cast<LRESULT>(tvx::text::copyCut(text.View(), reinterpret_cast<char*>(buffer), size));
 }
 
 // --- states ---

@@ -133,6 +133,7 @@ HGDIOBJ selectBitmap(DeviceContext& context, HDC dc, HGDIOBJ handle) {
         return nullptr;
     }
     memory->bitmap->selectedInto = nullptr;
+    // The one pixel of fresh contexts may be selected into any number of them.
     if (next.object->owner == GdiOwner::Host) {
         next->selectedInto = dc;
     }
@@ -264,6 +265,7 @@ int GetDeviceCaps(HDC handle, int index) {
         return rasterCapabilities;
     case ASPECTX:
     case ASPECTY:
+        // The sides of a square pixel and its diagonal: hosts divide these numbers by each other only.
         return 36;
     case ASPECTXY:
         return 51;

@@ -305,9 +305,6 @@ public:
     /// Width and height of one line of text in the selected font: exactly what drawing it takes.
     CSize GetTextExtent(LPCSTR text, int count) const;
     CSize GetTextExtent(const CString& text) const;
-    /// As `GetTextExtent`.
-    CSize GetOutputTextExtent(LPCSTR text, int count) const;
-    CSize GetOutputTextExtent(const CString& text) const;
     /// The sizes of the selected font.
     BOOL GetTextMetrics(TEXTMETRIC* metrics) const;
     /// Name of the selected font as it was asked for; of the face really used when no name was given.

@@ -121,6 +121,7 @@ void CDC::Draw3dRect(int x, int y, int cx, int cy, COLORREF topLeft, COLORREF bo
     const RECT rect = rectAt(x, y, cx, cy);
     FillSolidRect(x, y, distance(1, cx), 1, topLeft);
     FillSolidRect(x, y, 1, distance(1, cy), topLeft);
+    // The corners at both ends of the dark sides belong to them.
     FillSolidRect(rect.right, y, -1, cy, bottomRight);
     FillSolidRect(x, rect.bottom, cx, -1, bottomRight);
 }
@@ -133,6 +134,8 @@ BOOL CDC::PatBlt(int x, int y, int width, int height, DWORD rop) {
     }
     const RECT rect = rectAt(x, y, width, height);
     const Rop2 binary = rop2FromRop3(ternary);
+    // Of the four results of a binary operation two are for zeros of the brush and two for its ones: where they are
+    // equal, the brush does not count, and a null brush must not keep the operation from being done.
     const bool usesBrush = static_cast<unsigned>(binary) >> 2 != (static_cast<unsigned>(binary) & 3U);
     return fillLogical(m_hDC, rect, usesBrush ? *dc->state.brush : solid(0), binary);
 }
@@ -184,6 +187,7 @@ void drawEdgeLine(HDC dc, RECT& rect, EdgeColors colors, UINT flags) {
     if (flags & BF_TOP) {
         fillLogical(dc, {rect.left, rect.top, rect.right, ++inside.top}, light, Rop2::Copy);
     }
+    // The dark sides last: the corners that they share with the light ones are theirs.
     if (flags & BF_RIGHT) {
         fillLogical(dc, {--inside.right, rect.top, rect.right, rect.bottom}, dark, Rop2::Copy);
     }
@@ -245,6 +249,7 @@ BOOL drawIcon(HDC handle, QPoint logical, HICON icon, QSize size) {
         return TRUE;
     }
     Canvas& canvas = drawing.canvas;
+    // Icons keep their size in pixels in every mapping mode, only their place is converted.
     const QRect place(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size);
     QPainter painter(canvas.image);
     painter.setClipRegion(canvas.clip.translated(canvas.origin));
@@ -291,6 +296,7 @@ COLORREF CDC::SetPixel(int x, int y, COLORREF color) {
     if (!PtVisible(x, y) || !SetPixelV(x, y, color)) {
         return CLR_INVALID;
     }
+    // What is really there: a monochrome bitmap has the nearer of two colours.
     return GetPixel(x, y);
 }
 

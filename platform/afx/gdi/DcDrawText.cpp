@@ -65,6 +65,7 @@ void drawLine(CDC& dc, const LayoutLine& line, const RECT& rect, UINT format, in
     const int x = lineLeft(rect, format, line.width);
     const UINT clip = format & DT_NOCLIP ? 0 : ETO_CLIPPED;
     if (format & DT_EXPANDTABS && line.text.find('\t') != std::string::npos) {
+        // The call that draws tabs has no rectangle to cut at.
         const int saved = dc.SaveDC();
         if (clip) {
             dc.IntersectClipRect(&rect);
@@ -116,6 +117,7 @@ int CDC::DrawText(LPCSTR text, int count, RECT* rect, UINT format) {
     TextLayoutStyle style;
     style.format = format;
     style.width = area.right - area.left;
+    // With DT_TABSTOP the second byte of the format says how many characters a tab is wide.
     const int perTab = format & DT_TABSTOP ? static_cast<int>((format >> 8) & 0xFF) : 8;
     style.tabWidth = std::max(1, perTab) * metrics.tmAveCharWidth;
     style.lineHeight = metrics.tmHeight + (format & DT_EXTERNALLEADING ? metrics.tmExternalLeading : 0);
@@ -136,6 +138,7 @@ int CDC::DrawText(LPCSTR text, int count, RECT* rect, UINT format) {
         drawLine(*this, line, area, format, y, style);
         y += downwards * style.lineHeight;
     }
+    // Centred or at the bottom, the end of the text is counted from the top of the rectangle.
     return layout.height() + std::abs(top - area.top);
 }
 

@@ -338,6 +338,7 @@ int clipBy(HDC handle, const QRegion& region, int mode) {
         return RGN_ERROR;
     }
     auto& clip = dc->state.clip;
+    // Kept apart from what can be seen of the target: that may change while the clipping stays.
     clip = mode == RGN_COPY ? region : combined(clip.value_or(everything()), region, mode);
     return regionKind(*clip);
 }

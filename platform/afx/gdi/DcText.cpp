@@ -79,6 +79,7 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
     const auto font = dc->font();
     Drawing drawing(*dc);
     const Mapping& mapping = dc->state.mapping;
+    // Hosts fill rectangles by this call with an empty text, so the rectangle does not wait for a font.
     if (rect && (options & ETO_OPAQUE) && drawing) {
         drawing.canvas.fill(mapping.toPixels(*rect), dc->ink(dc->state.backColor));
     }
@@ -89,6 +90,7 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
     if (advances) {
         line.setAdvances(deviceAdvances(mapping, advances, line.characterCount()));
     }
+    // With TA_UPDATECP the text goes on where the last one ended; the point given is not looked at.
     const bool moves = (dc->state.textAlign & TA_UPDATECP) != 0;
     const QPoint start = mapping.toPixel(moves ? dc->state.position : QPoint(x, y));
     const TextPlace place = placeText(*font, dc->state.textAlign, start, line.width());
@@ -96,6 +98,7 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
         if (rect && (options & ETO_CLIPPED)) {
             drawing.canvas.clip &= mapping.toPixels(*rect);
         }
+        // The rectangle filled above stands in for the background of the text's own cell.
         if (dc->state.backMode == OPAQUE && !(options & ETO_OPAQUE)) {
             line.fillBackground(drawing.canvas, place.left, dc->ink(dc->state.backColor));
         }
@@ -135,14 +138,6 @@ CSize CDC::GetTextExtent(LPCSTR text, int count) const {
 
 CSize CDC::GetTextExtent(const CString& text) const {
     return measure(m_hDC, viewOf(text));
-}
-
-CSize CDC::GetOutputTextExtent(LPCSTR text, int count) const {
-    return GetTextExtent(text, count);
-}
-
-CSize CDC::GetOutputTextExtent(const CString& text) const {
-    return GetTextExtent(text);
 }
 
 BOOL GetTextExtentPoint32A(HDC dc, LPCSTR text, int count, SIZE* size) {

@@ -60,6 +60,7 @@ CGdiObject* CGdiObject::FromHandle(HGDIOBJ object) {
 }
 
 void CGdiObject::DeleteTempMap() {
+    // Their destructor must not delete tools that are not theirs.
     objectMap().deleteTemporaries([](CGdiObject& object) { object.m_hObject = nullptr; });
 }
 
@@ -198,6 +199,7 @@ BOOL CBrush::CreateBrushIndirect(const LOGBRUSH* description) {
     switch (description->lbStyle) {
     case BS_SOLID:
         return CreateSolidBrush(description->lbColor);
+    // There is one, which nobody can delete.
     case BS_NULL:
         return Attach(GetStockObject(NULL_BRUSH));
     case BS_HATCHED:
@@ -247,6 +249,7 @@ BOOL CFont::CreatePointFontIndirect(const LOGFONT* description, CDC* dc) {
         return FALSE;
     }
     LOGFONT font = *description;
+    // A point is 1/72 of an inch.
     const int pixels = scaled(description->lfHeight, pixelsPerInch, 720);
     const auto context = findContext(dc ? dc->m_hDC : nullptr);
     font.lfHeight = -(context ? context->state.mapping.sizeToLogical({0, pixels}).height() : std::abs(pixels));
@@ -297,6 +300,7 @@ BOOL DeleteObject(HGDIOBJ object) {
     if (!found) {
         return FALSE;
     }
+    // A tool that is selected somewhere lives on there: contexts share it, only its handle ends.
     if (found->owner == GdiOwner::Host) {
         gdiObjects().take(number);
     }

@@ -66,6 +66,7 @@ public:
     UINT GetObjectType() const;
     /// Takes one of the predefined tools (BLACK_PEN, DEFAULT_GUI_FONT, ...), which is not deleted with the object.
     BOOL CreateStockObject(int index);
+    /// Whether both stand for one tool: two objects may, if one of them is temporary.
     BOOL operator==(const CGdiObject& other) const {
         return m_hObject == other.m_hObject;
     }
@@ -210,16 +211,18 @@ public:
 
     /// A rectangle; the corners may come in any order.
     BOOL CreateRectRgn(int left, int top, int right, int bottom);
+    /// The same from a rectangle. FALSE for null.
     BOOL CreateRectRgnIndirect(const RECT* rect);
     /// The largest ellipse inside a rectangle.
     BOOL CreateEllipticRgn(int left, int top, int right, int bottom);
+    /// What CDC::Polygon would fill, within 32768 units around the origin. FALSE for fewer than two points.
     /// @param mode ALTERNATE or WINDING
     BOOL CreatePolygonRgn(const POINT* points, int count, int mode);
 
     /// Makes this region, which must exist, the combination RGN_... of two others. The result is the kind of region
     /// (NULLREGION, SIMPLEREGION, COMPLEXREGION) or ERROR.
     int CombineRgn(const CRgn* first, const CRgn* second, int mode);
-    /// Makes the region, which must exist, a rectangle.
+    /// Makes the region, which must exist, a rectangle; the corners may come in any order.
     void SetRectRgn(int left, int top, int right, int bottom);
     /// Moves the region; the result is its kind.
     int OffsetRgn(int x, int y);

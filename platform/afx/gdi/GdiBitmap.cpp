@@ -22,6 +22,7 @@ void packRow(const BitmapObject& bitmap, int y, BYTE* bytes) {
     const auto* pixels = reinterpret_cast<const Pixel*>(bitmap.image.constScanLine(y));
     if (bitmap.format == PixelFormat::Color) {
         for (int x = 0; x < bitmap.image.width(); ++x) {
+            // The fourth byte of a pixel is unused: hosts expect 0 there.
             const Pixel pixel = pixels[x] & ~opaque;
             std::memcpy(bytes + 4 * x, &pixel, sizeof pixel);
         }

@@ -32,6 +32,7 @@ int screenMetric(int index) {
         return primaryScreen().height();
     case SM_CXFULLSCREEN:
         return workArea().width();
+    // The client area of a maximised window: it has a caption, but its borders lie beyond the screen.
     case SM_CYFULLSCREEN:
         return workArea().height() - GetSystemMetrics(SM_CYCAPTION);
     case SM_XVIRTUALSCREEN:
@@ -150,6 +151,7 @@ int fixedMetric(int index) {
 } // namespace
 
 int GetSystemMetrics(int index) {
+    // These first: they are answered where there is no display, without starting the toolkit.
     if (const int fixed = fixedMetric(index)) {
         return fixed;
     }

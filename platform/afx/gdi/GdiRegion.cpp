@@ -56,6 +56,7 @@ QRect screenReach() {
 }
 
 QRegion ellipseRegion(const QRect& box) {
+    // The toolkit's own ellipses differ by pixels from what Ellipse() draws, but they cost nothing by the row.
     const QRect reach = screenReach();
     return reach.contains(box) ? regionOf(ellipseSpans(box)) : QRegion(box & reach, QRegion::Ellipse);
 }

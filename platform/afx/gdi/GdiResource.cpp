@@ -71,6 +71,7 @@ HBITMAP CreateDIBitmap(HDC dc, const BITMAPINFOHEADER* header, DWORD initialise,
     if (!picture) {
         return nullptr;
     }
+    // A bitmap in the format of the screen, however few colours its bits have.
     picture->bitsPerPixel = 32;
     return addPicture(*picture);
 }
@@ -134,6 +135,7 @@ std::string keyOf(HINSTANCE module, LPCSTR name) {
 HICON LoadIconA(HINSTANCE module, LPCSTR name) {
     static auto& shared = *new std::map<std::string, HICON>;
     HICON& icon = shared[keyOf(module, name)];
+    // A host may have destroyed the shared icon; then it is loaded again.
     if (iconImage(icon).isNull()) {
         icon = module ? loadFromModule(module, name) : loadPredefined(name);
     }

@@ -50,6 +50,7 @@ StockTable makeStock() {
     table[ANSI_VAR_FONT] = stockFont(pointFont(points, "MS Sans Serif"), variable);
     table[DEFAULT_GUI_FONT] = stockFont(pointFont(points, "MS Shell Dlg"), variable);
     LOGFONT system = pointFont(points, "System");
+    // A positive height is that of the cell, not of the characters in it.
     system.lfHeight = 16;
     table[SYSTEM_FONT] = stockFont(system, variable);
     table[DEVICE_DEFAULT_FONT] = table[SYSTEM_FONT];
@@ -118,6 +119,7 @@ COLORREF GetSysColor(int index) {
     }
     const PaletteColor& place = systemColors[index];
     const QColor color =
+        // Without a display the palette is made of the window colour of the toolkit's own style.
         (ensureGui() ? QApplication::palette() : QPalette(QColor(0xEF, 0xEF, 0xEF))).color(place.group, place.role);
     return RGB(color.red(), color.green(), color.blue());
 }
@@ -128,6 +130,8 @@ HBRUSH GetSysColorBrush(int index) {
         for (std::size_t i = 0; i < table.size(); ++i) {
             BrushObject brush;
             brush.description = {static_cast<UINT>(BS_SOLID), GetSysColor(static_cast<int>(i)), 0};
+            // The colour described is that of this moment; drawing looks the number up again, as the palette may
+            // change.
             brush.systemColor = static_cast<int>(i);
             table[i] = addGdiObject(std::move(brush), GdiOwner::Stock);
         }

@@ -67,33 +67,33 @@ struct RGBQUAD {
 
 /// Size and format of device-independent bits.
 struct BITMAPINFOHEADER {
-    DWORD biSize;
-    LONG biWidth;
-    LONG biHeight; ///< above 0: bottom row first, below 0: top row first
-    WORD biPlanes;
-    WORD biBitCount;
-    DWORD biCompression;
-    DWORD biSizeImage;
-    LONG biXPelsPerMeter;
-    LONG biYPelsPerMeter;
-    DWORD biClrUsed;
-    DWORD biClrImportant;
+    DWORD biSize;         ///< sizeof(BITMAPINFOHEADER), 40
+    LONG biWidth;         ///< pixels of a row; each row is padded to a multiple of 4 bytes
+    LONG biHeight;        ///< above 0: bottom row first, below 0: top row first
+    WORD biPlanes;        ///< always 1
+    WORD biBitCount;      ///< bits a pixel: 1, 4, 8, 16, 24 or 32
+    DWORD biCompression;  ///< BI_RGB: compressed bits are not understood
+    DWORD biSizeImage;    ///< bytes of all rows; not looked at
+    LONG biXPelsPerMeter; ///< not looked at
+    LONG biYPelsPerMeter; ///< not looked at
+    DWORD biClrUsed;      ///< colours in the table; 0: as many as the bits can tell apart
+    DWORD biClrImportant; ///< not looked at
 };
 
 /// The header of device-independent bits with the colour table that follows it.
 struct BITMAPINFO {
     BITMAPINFOHEADER bmiHeader;
-    RGBQUAD bmiColors[1];
+    RGBQUAD bmiColors[1]; ///< the first of as many as the header tells
 };
 
 #pragma pack(push, 2)
 /// What a bitmap file begins with.
 struct BITMAPFILEHEADER {
-    WORD bfType;
-    DWORD bfSize;
+    WORD bfType;  ///< the characters "BM": 0x4D42
+    DWORD bfSize; ///< bytes of the whole file
     WORD bfReserved1;
     WORD bfReserved2;
-    DWORD bfOffBits;
+    DWORD bfOffBits; ///< where the pixels begin, from the start of the file
 };
 #pragma pack(pop)
 

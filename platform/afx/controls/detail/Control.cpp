@@ -141,9 +141,6 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     }
     case WM_GETDLGCODE:
         return static_cast<LRESULT>(dialogCode(reinterpret_cast<const MSG*>(lParam)));
-    case WM_SETREDRAW:
-        guarded([&] { widget()->setUpdatesEnabled(wParam != 0); });
-        return 0;
     case WM_SETFOCUS:
     case WM_KILLFOCUS: {
         const HWND self = handle();

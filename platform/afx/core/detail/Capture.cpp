@@ -30,6 +30,7 @@ void tellFocus(Window& window, bool got) {
     if (got && focusTold != handle) {
         const HWND previous = std::exchange(focusTold, handle);
         SendMessageA(handle, WM_SETFOCUS, reinterpret_cast<WPARAM>(previous), 0);
+        // The keyboard may go from one part of a control to another: the window has it all the while.
     } else if (!got && focusTold == handle && focusNow() != handle) {
         focusTold = nullptr;
         SendMessageA(handle, WM_KILLFOCUS, reinterpret_cast<WPARAM>(focusNow()), 0);
@@ -39,6 +40,7 @@ void tellFocus(Window& window, bool got) {
 void cancelModes() {
     while (QWidget* popup = QApplication::activePopupWidget()) {
         guarded([popup] { popup->close(); });
+        // One that refuses to close must not keep this going for ever.
         if (QApplication::activePopupWidget() == popup) {
             break;
         }

@@ -47,6 +47,7 @@ DispatchScope::DispatchScope(Dispatch& dispatch) {
 
 DispatchScope::~DispatchScope() {
     innermost = innermost->outer;
+    // The state of a window that has ended lives until nobody on the stack can hold it any more.
     if (!innermost && !graveyard().empty()) {
         const auto ended = std::move(graveyard());
         graveyard().clear();
@@ -82,6 +83,7 @@ bool passEvent(const Window& window, UINT message) {
         current->source->passed) {
         return false;
     }
+    // Once: a handler that calls its base twice must not type a character twice.
     passToToolkit(*current->source);
     return true;
 }
@@ -231,7 +233,7 @@ bool fetch(MSG* message, HWND window, UINT first, UINT last, bool remove) {
 BOOL PeekMessageA(MSG* message, HWND window, UINT first, UINT last, UINT remove) {
     const bool take = (remove & PM_REMOVE) != 0;
     if (isQuitting()) {
-        *message = makeMessage(nullptr, WM_QUIT, 0, 0);
+        *message = makeMessage(nullptr, WM_QUIT, static_cast<WPARAM>(quitCode()), 0);
         return TRUE;
     }
     if (fetch(message, window, first, last, take)) {

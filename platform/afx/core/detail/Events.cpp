@@ -135,6 +135,7 @@ bool onKeyPress(Window& window, QObject* receiver, QKeyEvent& event) {
 }
 
 bool onKeyRelease(Window& window, QObject* receiver, QKeyEvent& event) {
+    // The display tells of a release between repeated presses; hosts know repeated presses only.
     if (event.isAutoRepeat()) {
         event.accept();
         return true;
@@ -185,6 +186,7 @@ UINT buttonMessage(const QMouseEvent& event) {
     } else if (event.button() != Qt::LeftButton) {
         return WM_NULL;
     }
+    // The numbers of a button's messages follow each other: down, up, double click.
     switch (event.type()) {
     case QEvent::MouseButtonPress:
         return first;
@@ -210,6 +212,7 @@ Window* mouseTarget(Window* under) {
 /// Lets windows choose the cursor, and views and child frames become active, before they see the press itself.
 void announceMouse(const Window& window, UINT message) {
     const HWND handle = window.handle();
+    // Nobody is asked for a cursor while the mouse is captured: that is the rule hosts know.
     if (!captureWindow()) {
         noteCursorWindow(handle);
         SendMessageA(handle, WM_SETCURSOR, reinterpret_cast<WPARAM>(handle),
@@ -262,6 +265,7 @@ bool onWheel(Window& under, QObject* receiver, QWheelEvent& event) {
         return false;
     }
     const QPoint screen = event.globalPosition().toPoint();
+    // The wheel's is the one mouse message in screen coordinates.
     const WPARAM keys = buttonFlags(event.buttons(), event.modifiers());
     MSG msg = makeMessage(target->handle(), WM_MOUSEWHEEL, MAKEWPARAM(static_cast<int>(keys), event.angleDelta().y()),
                           MAKELPARAM(screen.x(), screen.y()));
@@ -307,6 +311,7 @@ bool onPaint(Window& window, QObject* receiver, QPaintEvent& event) {
 }
 
 bool onCloseRequest(Window& window, QEvent& event) {
+    // The toolkit must not hide the window: what happens is decided by whoever handles WM_CLOSE.
     event.ignore();
     armIdle();
     MSG msg = makeMessage(window.handle(), WM_SYSCOMMAND, SC_CLOSE, 0);
@@ -319,6 +324,7 @@ void onActivation(Window& window, bool active) {
     const auto otherHandle = reinterpret_cast<LPARAM>(other && other != &window ? other->handle() : nullptr);
     const HWND handle = window.handle();
     armIdle();
+    // The caption first, as hosts know the order.
     SendMessageA(handle, WM_NCACTIVATE, active ? TRUE : FALSE, 0);
     SendMessageA(handle, WM_ACTIVATE, active ? WA_ACTIVE : WA_INACTIVE, otherHandle);
 }

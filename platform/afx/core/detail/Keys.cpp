@@ -139,6 +139,7 @@ int virtualKey(const QKeyEvent& event) {
         return '0' + static_cast<int>(digit - shiftedDigits.begin());
     }
     const auto found = std::find_if(keyTable.begin(), keyTable.end(), [key](const KeyPair& p) { return p.key == key; });
+    // On the layouts of other scripts letters are known by their place, so that Ctrl+C is where it was.
     return found != keyTable.end() ? found->virtualKey : letterByScanCode(event.nativeScanCode());
 }
 

@@ -43,6 +43,7 @@ int ModalLoop::run() {
     LoopState& current = state();
     if (!m_ended && !current.quitting) {
         m_outer = std::exchange(current.innermost, this);
+        // Guarded calls around this loop do not guard what happens in it.
         const int guards = std::exchange(current.guards, 0);
         m_running = true;
         // Messages posted before this loop began must not wait for the loop around it.
@@ -51,6 +52,7 @@ int ModalLoop::run() {
         m_running = false;
         current.guards = guards;
         current.innermost = m_outer;
+        // A loop of the toolkit cannot return before those inside of it, so the wish to quit goes outwards one by one.
         if (current.quitting && m_outer) {
             m_outer->m_loop.exit();
         }
@@ -74,6 +76,7 @@ void ExceptionCarrier::store(std::exception_ptr error) noexcept {
     if (!current.pending) {
         current.pending = std::move(error);
     }
+    // Inside of a guarded call the exception goes on when the call returns to us.
     if (current.guards == 0 && current.innermost) {
         current.innermost->m_loop.exit();
     }
@@ -110,10 +113,13 @@ bool isQuitting() {
     return state().quitting;
 }
 
+int quitCode() {
+    return state().exitCode;
+}
+
 int takeQuit() {
-    LoopState& current = state();
-    current.quitting = false;
-    return current.exitCode;
+    state().quitting = false;
+    return quitCode();
 }
 
 } // namespace tvx::afx

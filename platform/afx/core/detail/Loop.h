@@ -86,6 +86,8 @@ void storing(Call&& call) noexcept {
 /// The wish to end all loops of this thread, with the outermost one's result.
 TVX_PLATFORM_API void requestQuit(int exitCode);
 TVX_PLATFORM_API bool isQuitting();
+/// The exit code of that wish, or of the last one.
+int quitCode();
 /// Forgets the wish and answers its exit code; the outermost loop's owner calls this.
 TVX_PLATFORM_API int takeQuit();
 

@@ -307,14 +307,19 @@ BOOL SetMenuDefaultItem(HMENU handle, UINT item, UINT byPosition) {
         return FALSE;
     }
     const MenuPlace place = findItem(handle, item, byPosition != 0 ? MF_BYPOSITION : MF_BYCOMMAND);
-    for (MenuItem& other : menu->items) {
+    if (!place && item != noItem) {
+        return FALSE;
+    }
+    // A command may be in a popup below: the popup has one default item, like every menu.
+    Menu& changed = place ? *place.menu : *menu;
+    for (MenuItem& other : changed.items) {
         other.isDefault = false;
     }
     if (place) {
         place.item().isDefault = true;
     }
-    tellMenuChanged(handle);
-    return place || item == noItem ? TRUE : FALSE;
+    tellMenuChanged(changed.handle);
+    return TRUE;
 }
 
 BOOL SetMenuItemBitmaps(HMENU menu, UINT position, UINT flags, HBITMAP unchecked, HBITMAP checked) {

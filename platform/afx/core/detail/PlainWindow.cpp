@@ -33,6 +33,7 @@ public:
         viewport()->setAutoFillBackground(false);
         viewport()->setAttribute(Qt::WA_OpaquePaintEvent);
         viewport()->setAttribute(Qt::WA_NoSystemBackground);
+        // WM_MOUSEMOVE comes with no button pressed, too.
         viewport()->setMouseTracking(true);
     }
 
@@ -162,6 +163,7 @@ Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle) {
     if ((style & WS_CAPTION) != WS_CAPTION) {
         return flags | Qt::FramelessWindowHint;
     }
+    // Without the first of them the toolkit adds all buttons of a caption by itself.
     flags |= Qt::CustomizeWindowHint | Qt::WindowTitleHint;
     if ((style & WS_SYSMENU) != 0) {
         flags |= Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
@@ -298,6 +300,7 @@ void TopLevelWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
     const Qt::WindowFlags flags = windowFlags(style(), exStyle());
     widget()->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
     if (flags != windowFlags(oldStyle, oldExStyle)) {
+        // The toolkit hides a window whose flags change.
         const bool shown = !widget()->isHidden();
         guarded([&] {
             widget()->setWindowFlags(flags);
@@ -311,6 +314,7 @@ void TopLevelWindow::applySizeLimits() {
     MINMAXINFO limits{};
     limits.ptMaxTrackSize = {unlimited, unlimited};
     call(WM_GETMINMAXINFO, 0, reinterpret_cast<LPARAM>(&limits));
+    // The host's limits count the frame, the toolkit's do not.
     const QSize frame = widget()->frameGeometry().size() - widget()->geometry().size();
     widget()->setMinimumSize((toQt(limits.ptMinTrackSize).isNull()
                                   ? QSize(0, 0)

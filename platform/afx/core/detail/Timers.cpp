@@ -36,6 +36,7 @@ public:
         }
         stop(window, id);
         constexpr UINT longest = 0x7FFFFFFF;
+        // An interval of 0 would let the toolkit's loop never rest.
         const int toolkitId = startTimer(static_cast<int>(std::clamp(elapse, 1U, longest)));
         m_timers.push_back({window, id, callback, toolkitId});
         return id != 0 ? id : 1;

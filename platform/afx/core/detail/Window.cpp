@@ -44,6 +44,7 @@ HWND newHandle(const QWidget& widget, bool topLevel) {
     if (topLevel && QGuiApplication::platformName() == QLatin1String("xcb")) {
         return reinterpret_cast<HWND>(const_cast<QWidget&>(widget).winId());
     }
+    // X ids have 29 bits: none of theirs is as large as one of ours.
     auto& next = tables().nextHandle;
     while (tables().byHandle.contains(next)) {
         ++next;
@@ -69,6 +70,7 @@ const WindowClass* findWindowClass(const char* name) {
 
 QString toQt(const char* text) {
     const std::string_view bytes = text ? text : "";
+    // Bytes that are no UTF-8 come back from the toolkit as they were given.
     return text::isWellFormed(bytes) ? QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()))
                                      : QString::fromStdU16String(text::widen16(bytes));
 }
@@ -150,6 +152,7 @@ bool Window::start(const CREATESTRUCT& cs) {
         m_creating = false;
         tellGeometry();
     }
+    // Not before WM_CREATE was handled: that is where hosts make the children.
     if (from(handle) && (m_style & WS_VISIBLE) != 0) {
         show((m_style & WS_MAXIMIZE) != 0 ? SW_SHOWMAXIMIZED : SW_SHOW);
     }
@@ -201,6 +204,7 @@ Window* Window::of(const QObject* object) {
         if (found != table.end()) {
             return found->second;
         }
+        // A menu or a tool tip belongs to a widget without being a part of its window.
         if (static_cast<const QWidget*>(object)->isWindow()) {
             break;
         }
@@ -211,6 +215,13 @@ Window* Window::of(const QObject* object) {
 
 const std::vector<Window*>& Window::topLevels() {
     return tables().topLevels;
+}
+
+std::vector<HWND> Window::topLevelHandles() {
+    std::vector<HWND> handles;
+    handles.reserve(topLevels().size());
+    std::ranges::transform(topLevels(), std::back_inserter(handles), &Window::handle);
+    return handles;
 }
 
 Window* Window::topLevel() {
@@ -244,6 +255,7 @@ void Window::setParent(Window* parent) {
         std::erase(tables().topLevels, this);
     }
     m_parent = parent;
+    // The toolkit hides a widget that gets another parent and moves it into the corner.
     const bool shown = m_widget && !m_widget->isHidden();
     const QRect place = m_widget->geometry();
     guarded([&] {
@@ -353,6 +365,7 @@ QRect Window::windowRect() const {
     if (m_widget->isWindow()) {
         return m_placement ? m_placement->frameRect() : m_widget->frameGeometry();
     }
+    // A frame's client area begins below its menu bar, which is inside of the toolkit's widget.
     const QPoint origin = m_parent ? m_parent->clientRect().topLeft() : QPoint();
     return m_widget->geometry().translated(-origin);
 }
@@ -464,12 +477,17 @@ void Window::destroy() {
     if (m_destroyed) {
         return;
     }
-    const auto all = topLevels();
-    for (Window* window : all) {
-        if (window->m_owner == this && from(window->m_handle) == window) {
+    const HWND self = m_handle;
+    // The end of one owned window may be the end of another, and of this one.
+    for (const HWND handle : topLevelHandles()) {
+        if (Window* window = from(handle); window && window->m_owner == this) {
             window->destroy();
         }
+        if (from(self) != this) {
+            return;
+        }
     }
+    // All are marked before any is told: a handler must not begin to destroy what goes anyway.
     markDestroyed();
     if (m_widget && !m_widget->isHidden()) {
         guarded([this] { m_widget->hide(); });
@@ -542,6 +560,7 @@ void Window::unlink() {
         tables().byWidget.erase(m_widget);
         silence(*m_widget);
         m_widget->hide();
+        // It may be the receiver of the event that is being handled.
         m_widget->deleteLater();
     }
 }

@@ -36,6 +36,8 @@ public:
     static Window* of(const QObject* widget);
     /// All top-level windows, in order of creation.
     static const std::vector<Window*>& topLevels();
+    /// Their handles, for those who call what may end any of them.
+    static std::vector<HWND> topLevelHandles();
 
     HWND handle() const {
         return m_handle;
@@ -205,6 +207,8 @@ private:
     void unlink();
     LRESULT reflect(UINT message, WPARAM wParam, LPARAM lParam);
     LRESULT textProc(UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT appearanceProc(UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT parentProc(UINT message, WPARAM wParam, LPARAM lParam);
     LRESULT mouseProc(UINT message, WPARAM wParam, LPARAM lParam);
     LRESULT systemCommand(UINT command, LPARAM lParam);
     LRESULT systemKey(UINT message, WPARAM wParam, LPARAM lParam);

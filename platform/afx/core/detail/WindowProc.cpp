@@ -1,5 +1,6 @@
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 
 #include "platform/afx/core/Wnd.h"
@@ -82,12 +83,9 @@ LRESULT Window::reflect(UINT message, WPARAM wParam, LPARAM lParam) {
     return result;
 }
 
-LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+LRESULT Window::appearanceProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    HICON& icon = wParam == ICON_BIG ? bigIcon : smallIcon;
     switch (message) {
-    case WM_SETTEXT:
-    case WM_GETTEXT:
-    case WM_GETTEXTLENGTH:
-        return textProc(message, wParam, lParam);
     case WM_SETFONT:
         font = reinterpret_cast<HFONT>(wParam);
         fontChanged();
@@ -95,13 +93,56 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_GETFONT:
         return reinterpret_cast<LRESULT>(font);
     case WM_SETICON: {
-        HICON& place = wParam == ICON_BIG ? bigIcon : smallIcon;
-        const HICON old = std::exchange(place, reinterpret_cast<HICON>(lParam));
+        const HICON old = std::exchange(icon, reinterpret_cast<HICON>(lParam));
         iconChanged();
         return reinterpret_cast<LRESULT>(old);
     }
     case WM_GETICON:
-        return reinterpret_cast<LRESULT>(wParam == ICON_BIG ? bigIcon : smallIcon);
+        return reinterpret_cast<LRESULT>(icon);
+    case WM_SETREDRAW:
+        guarded([&] { m_widget->setUpdatesEnabled(wParam != 0); });
+        return 0;
+    default:
+        return 0;
+    }
+}
+
+/// Messages whose answer is the parent's when nobody here has one.
+LRESULT Window::parentProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    const auto askParent = [&](LRESULT without) {
+        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : without;
+    };
+    switch (message) {
+    case WM_SETCURSOR:
+        // The parent may choose for its children; the innermost class cursor is the last word.
+        return askParent(FALSE) != 0 || showClassCursor(wParam) ? TRUE : FALSE;
+    case WM_MOUSEACTIVATE:
+        return askParent(MA_ACTIVATE);
+    case WM_MOUSEWHEEL:
+        // A wheel that turns over something that does not scroll is for what it stands in.
+        return passEvent(*this, message) ? 0 : askParent(0);
+    default:
+        return askParent(0);
+    }
+}
+
+LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_SETTEXT:
+    case WM_GETTEXT:
+    case WM_GETTEXTLENGTH:
+        return textProc(message, wParam, lParam);
+    case WM_SETFONT:
+    case WM_GETFONT:
+    case WM_SETICON:
+    case WM_GETICON:
+    case WM_SETREDRAW:
+        return appearanceProc(message, wParam, lParam);
+    case WM_SETCURSOR:
+    case WM_MOUSEACTIVATE:
+    case WM_CONTEXTMENU:
+    case WM_MOUSEWHEEL:
+        return parentProc(message, wParam, lParam);
     case WM_CLOSE:
         destroy();
         return 0;
@@ -111,21 +152,6 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return TRUE;
     case WM_NCACTIVATE:
         return TRUE;
-    case WM_SETCURSOR:
-        // The parent may choose for its children; the innermost class cursor is the last word.
-        if (m_parent && SendMessageA(m_parent->m_handle, message, wParam, lParam) != 0) {
-            return TRUE;
-        }
-        return showClassCursor(wParam) ? TRUE : FALSE;
-    case WM_MOUSEACTIVATE:
-        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : MA_ACTIVATE;
-    case WM_CONTEXTMENU:
-        return m_parent ? SendMessageA(m_parent->m_handle, message, wParam, lParam) : 0;
-    case WM_MOUSEWHEEL:
-        if (!passEvent(*this, message) && m_parent) {
-            return SendMessageA(m_parent->m_handle, message, wParam, lParam);
-        }
-        return 0;
     case WM_CTLCOLORMSGBOX:
     case WM_CTLCOLOREDIT:
     case WM_CTLCOLORLISTBOX:

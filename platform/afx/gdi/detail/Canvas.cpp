@@ -96,6 +96,7 @@ void Canvas::plot(std::span<const QPoint> points, const Ink& ink) {
         if (!visible.intersects(around)) {
             continue;
         }
+        // Most shapes lie in one visible rectangle, where their points need not be asked one by one.
         const bool whole = visible.contains(around);
         for (const QPoint& point : points) {
             if (whole || visible.contains(point)) {

@@ -61,6 +61,7 @@ MemoryTarget* DeviceContext::memory() const {
 std::shared_ptr<const RealizedFont> DeviceContext::font() const {
     LOGFONTA device = state.font->description;
     const QSize size = state.mapping.sizeToDevice({std::abs(device.lfWidth), std::abs(device.lfHeight)});
+    // A height that a mapping mode makes smaller than a pixel must not become 0, which means the default height.
     if (device.lfHeight != 0) {
         device.lfHeight = device.lfHeight < 0 ? -std::max(1, size.height()) : std::max(1, size.height());
     }
@@ -143,6 +144,7 @@ std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, Q
     }
     const Pixel back = ink(state.backColor).color;
     if (description.lbStyle == BS_HATCHED) {
+        // A pixel of 0 is not opaque: what was there stays between the lines.
         pattern = hatchImage(static_cast<int>(description.lbHatch), result.color, state.backMode == OPAQUE ? back : 0);
     } else if (brush.patternFormat == PixelFormat::Monochrome) {
         pattern = recolored(brush.pattern, ink(state.textColor).color, back);

@@ -116,6 +116,7 @@ QFont::Weight weightOf(LONG weight) {
     if (weight <= 0) {
         return QFont::Normal;
     }
+    // The two scales have the same numbers.
     return static_cast<QFont::Weight>(std::clamp<LONG>(weight, QFont::Thin, QFont::Black));
 }
 
@@ -138,6 +139,7 @@ QFont makeFont(const LOGFONTA& description) {
     QFont font(familyFor(faceName(description), description.lfPitchAndFamily));
     font.setStyleStrategy(styleStrategy(description.lfQuality));
     font.setHintingPreference(QFont::PreferFullHinting);
+    // Hosts measure a text in pieces and add up: that is right only while characters do not move towards each other.
     font.setKerning(false);
     font.setWeight(weightOf(description.lfWeight));
     font.setItalic(description.lfItalic != 0);
@@ -195,6 +197,7 @@ LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
 QSize dialogBaseUnits(const QFont& font) {
     static const QString letters = QStringLiteral("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz");
     const QFontMetrics metrics(font);
+    // The average of 52 letters, rounded: the rule that dialog templates were laid out by.
     return {(metrics.horizontalAdvance(letters) / 26 + 1) / 2, metrics.height()};
 }
 

@@ -11,6 +11,8 @@ int scaled(std::int64_t value, int by, int per) {
     if (by == per) {
         return saturated(value);
     }
+    // A distance of 33 bits, doubled, times an extent of 32 does not fit 64. Halves are rounded up whatever the sign,
+    // so that a shape has the same size on either side of the origin.
     __extension__ using Wide = __int128;
     const Wide sign = per < 0 ? -1 : 1;
     const Wide numerator = sign * (Wide{2} * value * by + per);
@@ -52,6 +54,7 @@ bool Mapping::setMode(int mode) {
     if (mode < MM_TEXT || mode > MM_ANISOTROPIC) {
         return false;
     }
+    // MM_ISOTROPIC begins with the extents of tenths of a millimetre, MM_ANISOTROPIC with those of the mode before.
     const int units = unitsPerInch(mode == MM_ISOTROPIC ? MM_LOMETRIC : mode);
     if (units != 0) {
         m_windowExtent = {units, units};

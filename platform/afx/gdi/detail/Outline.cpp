@@ -56,6 +56,7 @@ Outline::Outline(const DeviceContext& context, Canvas& canvas)
       m_ink(context.penInk()),
       m_style(context.state.pen->description.lopnStyle),
       m_width(deviceWidth(context)) {
+    // Dashed lines are one pixel wide; a wider pen of such a style draws without gaps.
     if (isWide() && m_style != PS_INSIDEFRAME) {
         m_style = PS_SOLID;
     }
@@ -126,6 +127,7 @@ void Outline::closed(const QPolygon& points) {
         wide(path);
         return;
     }
+    // Each side leaves its last pixel to the next one: by exclusive or a pixel drawn twice would be gone.
     thin(points);
     thin(QPolygon({points.last(), points.first()}));
     plotPixels();
@@ -134,6 +136,7 @@ void Outline::closed(const QPolygon& points) {
 void Outline::rectangle(const QRect& box) {
     if (isWide()) {
         rounded(box, {}, {});
+        // There and back would draw every pixel twice.
     } else if (box.width() == 1 || box.height() == 1) {
         line(QPolygon({box.topLeft(), box.bottomRight()}), LastPoint::Drawn);
     } else {

@@ -199,6 +199,7 @@ std::vector<Edge> edgesOf(std::span<const QPolygonF> polygons) {
         for (qsizetype i = 0; i < polygon.size(); ++i) {
             QPointF from = polygon[i];
             QPointF to = polygon[(i + 1) % polygon.size()];
+            // A side along a row has no crossing with it.
             if (from.y() == to.y()) {
                 continue;
             }
@@ -248,6 +249,7 @@ Spans polygonSpans(std::span<const QPolygonF> polygons, FillRule rule, const QRe
     std::vector<Crossing> crossings;
     std::size_t next = 0;
     for (int y = bounds.top(); y <= bounds.bottom(); ++y) {
+        // A pixel belongs to the area when its centre does, so that areas side by side neither overlap nor leave gaps.
         const double middle = y + 0.5;
         while (next < edges.size() && edges[next].top <= middle) {
             active.push_back(&edges[next++]);

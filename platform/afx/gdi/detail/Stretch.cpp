@@ -56,6 +56,7 @@ public:
         ++m_count;
     }
     [[nodiscard]] Pixel result() const {
+        // By bits: black figures survive on white ground when they are made smaller, or white ones on black.
         if (m_mode == BLACKONWHITE) {
             return opaque | m_all;
         }

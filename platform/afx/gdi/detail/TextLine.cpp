@@ -17,6 +17,7 @@ QString shownText(std::string_view text) {
     constexpr char32_t strayByte = 0xDC00;
     for (std::size_t at = 0; at < text.size();) {
         char32_t character = tvx::text::decode(text, at);
+        // Bytes that are no UTF-8 are shown as the Latin-1 characters that they mostly are.
         if (character >= strayByte + 0x80 && character <= strayByte + 0xFF) {
             character -= strayByte;
         }

@@ -38,6 +38,7 @@ public:
                 return result;
             }
             return QApplication::notify(receiver, event);
+            // A thread that is ended unwinds its stack like this; the process aborts when that is not let through.
         } catch (abi::__forced_unwind&) {
             throw;
         } catch (...) {
@@ -51,6 +52,7 @@ DWORD threadOfWindows = 0;
 
 bool askDisplay() {
     const char* plugin = std::getenv("QT_QPA_PLATFORM");
+    // Whoever chooses a plugin knows that it needs no display, or has one.
     if (plugin && *plugin != '\0') {
         return true;
     }
@@ -74,11 +76,13 @@ void translateToolkit() {
 }
 
 void makeApplication() {
+    // The program's name only: the toolkit would take options of its own out of the host's command line.
     static int argc = 1;
     static std::string name = moduleFileName(nullptr);
     static char* argv[] = {name.data(), nullptr};
     new GuiApplication(argc, argv); // the toolkit keeps it as qApp, to the end of the process
     threadOfWindows = GetCurrentThreadId();
+    // The main window's end is the application's end, whatever other windows are or are not shown.
     QApplication::setQuitOnLastWindowClosed(false);
     translateToolkit();
     // The toolkit has taken the process's locale from the environment; numbers keep their point.

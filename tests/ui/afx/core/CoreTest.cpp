@@ -5,9 +5,12 @@
 #include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QApplication>
+#include <QDropEvent>
 #include <QMessageBox>
+#include <QMimeData>
 #include <QTest>
 #include <QTimer>
+#include <QUrl>
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -208,6 +211,76 @@ TEST_F(Core, PeekedMessagesAreDispatchedByTheirFetcher) {
     EXPECT_EQ(journal, (std::vector<std::string>{"view 5"}));
 }
 
+TEST_F(Core, AHostsOwnLoopFetchesUntilItIsToQuit) {
+    const DWORD start = GetTickCount();
+    const QPoint clicked(20, 30);
+    QTimer::singleShot(0, [&] {
+        QTest::mouseClick(view.widget(), Qt::LeftButton, Qt::NoModifier, clicked);
+        QTest::keyClick(view.widget(), Qt::Key_F7);
+    });
+    view.on[WM_LBUTTONDOWN] = [&] {
+        const QPoint screen = view.widget()->mapToGlobal(clicked);
+        EXPECT_EQ(GetMessagePos(), static_cast<DWORD>(MAKELONG(screen.x(), screen.y())));
+        EXPECT_EQ(AfxGetCurrentMessage()->hwnd, view.m_hWnd);
+        const auto age = static_cast<DWORD>(GetMessageTime()) - start;
+        EXPECT_LE(age, GetTickCount() - start);
+    };
+    view.on[WM_KEYUP] = [] { ::PostQuitMessage(5); };
+    MSG msg;
+    bool clickCame = false;
+    while (::GetMessage(&msg, nullptr, 0, 0)) {
+        const bool key = msg.message == WM_KEYDOWN || msg.message == WM_KEYUP;
+        EXPECT_EQ(::TranslateMessage(&msg) != FALSE, key) << msg.message;
+        clickCame = clickCame || msg.message == WM_LBUTTONDOWN;
+        ::DispatchMessage(&msg);
+    }
+    EXPECT_TRUE(clickCame);
+    EXPECT_EQ(msg.message, UINT{WM_QUIT});
+    EXPECT_EQ(msg.wParam, 5U);
+    EXPECT_EQ(AfxGetCurrentMessage(), nullptr);
+    EXPECT_EQ(tvx::afx::takeQuit(), 5);
+}
+
+TEST_F(Core, TheThreadPumpsMessagesAndTakesItsOwn) {
+    CWinThread* thread = AfxGetThread();
+    MSG msg;
+    EXPECT_TRUE(thread->PostThreadMessage(WM_APP + 6, 1, 2));
+    ASSERT_TRUE(::PeekMessage(&msg, nullptr, WM_APP, WM_APP + 99, PM_REMOVE));
+    EXPECT_EQ(msg.hwnd, nullptr);
+    EXPECT_EQ(msg.lParam, 2);
+    view.PostMessage(WM_APP + 5);
+    QTimer::singleShot(0, [&] { QTest::keyClick(view.widget(), Qt::Key_F7); });
+    EXPECT_TRUE(thread->PumpMessage());
+    EXPECT_EQ(journal, (std::vector<std::string>{"view 5"}));
+    EXPECT_TRUE(thread->PumpMessage()) << "waits for input";
+    EXPECT_EQ(journal.back(), "view handler");
+    ::PostQuitMessage(0);
+    EXPECT_FALSE(thread->PumpMessage());
+    tvx::afx::takeQuit();
+}
+
+TEST_F(Core, DroppedFilesAreNamedByTheirHandle) {
+    std::vector<std::string> names;
+    view.on[WM_DROPFILES] = [&] {
+        const auto drop = reinterpret_cast<HDROP>(AfxGetCurrentMessage()->wParam);
+        char name[16];
+        for (UINT i = 0; i < DragQueryFile(drop, 0xFFFFFFFF, nullptr, 0); ++i) {
+            names.emplace_back(name, DragQueryFile(drop, i, name, sizeof(name)));
+        }
+        EXPECT_EQ(DragQueryFile(drop, 0, name, 4), 3U) << "a short buffer gets the beginning";
+        DragFinish(drop);
+        EXPECT_EQ(DragQueryFile(drop, 0xFFFFFFFF, nullptr, 0), 0U);
+    };
+    view.DragAcceptFiles();
+    QMimeData data;
+    data.setUrls({QUrl::fromLocalFile("/a.brd"), QUrl("http://host/b.brd"), QUrl::fromLocalFile("/c.brd")});
+    QDropEvent event(QPointF(5, 5), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(view.widget(), &event);
+    EXPECT_TRUE(AfxGetThread()->PumpMessage()) << "told once the other program has its answer";
+    ASSERT_EQ(names.size(), 2U) << "what is no file is left out";
+    EXPECT_NE(names[1].find("c.brd"), std::string::npos) << names[1];
+}
+
 TEST_F(Core, CapturedMouseComesToTheCapturingWindow) {
     CPoint seen(-1, -1);
     view.on[WM_MOUSEMOVE] = [&] {
@@ -311,6 +384,20 @@ TEST_F(Core, DestructionTellsParentsFirstAndEndsChildrenFirst) {
     frame.DestroyWindow();
     EXPECT_EQ(order, (std::vector<std::string>{"frame destroy", "view destroy", "view gone", "frame gone"}));
     EXPECT_EQ(view.m_hWnd, nullptr);
+}
+
+TEST_F(Core, OwnedWindowsMayEndEachOtherWithTheirOwner) {
+    Probe first, second;
+    for (Probe* popup : {&first, &second}) {
+        ASSERT_TRUE(popup->CreateEx(0, AfxRegisterWndClass(0), "popup", WS_POPUP, 0, 0, 50, 50, frame.m_hWnd, nullptr));
+    }
+    first.on[WM_DESTROY] = [&] { second.DestroyWindow(); };
+    second.on[WM_DESTROY] = [&] { frame.DestroyWindow(); };
+    AfxGetApp()->m_pMainWnd = nullptr;
+    frame.DestroyWindow();
+    for (const Probe* window : {&first, &second, &frame, &view}) {
+        EXPECT_EQ(window->m_hWnd, nullptr) << window->name;
+    }
 }
 
 TEST_F(Core, RegisteredMessagesAreOneNumberPerText) {

@@ -17,6 +17,7 @@ TEST(Keys, AreFollowedWhileAMenuHasTheKeyboard) {
     QWidget* widget = tvx::afx::peerOf(frame.m_hWnd);
     QTest::keyPress(widget, Qt::Key_Alt, Qt::AltModifier);
     EXPECT_TRUE(tvx::afx::isKeyDown(VK_MENU));
+    EXPECT_LT(GetAsyncKeyState(VK_MENU), 0);
 
     QMenu menu;
     menu.addAction("item");
@@ -24,6 +25,7 @@ TEST(Keys, AreFollowedWhileAMenuHasTheKeyboard) {
     ASSERT_TRUE(QTest::qWaitForWindowExposed(&menu));
     QTest::keyRelease(&menu, Qt::Key_Alt);
     EXPECT_FALSE(tvx::afx::isKeyDown(VK_MENU));
+    EXPECT_EQ(GetAsyncKeyState(VK_MENU), 0);
     menu.close();
     frame.DestroyWindow();
 }

@@ -173,6 +173,7 @@ TEST_F(Frame, AcceleratorsRestWhileAMenuIsOpen) {
 }
 
 TEST_F(Frame, TablesByHandle) {
+    openNote();
     const ACCEL entries[] = {{FVIRTKEY | FCONTROL, 'Q', 100}, {0, 'x', 101}};
     const HACCEL table = CreateAcceleratorTable(entries, 2);
     ASSERT_NE(table, nullptr);
@@ -180,6 +181,11 @@ TEST_F(Frame, TablesByHandle) {
     ACCEL copy[1] = {};
     EXPECT_EQ(CopyAcceleratorTable(table, copy, 1), 1);
     EXPECT_EQ(copy[0].cmd, 100);
+    MSG letter{AfxGetMainWnd()->GetSafeHwnd(), WM_CHAR, 'x', 1, 0, {}};
+    EXPECT_TRUE(TranslateAccelerator(letter.hwnd, table, &letter));
+    letter.wParam = 'y';
+    EXPECT_FALSE(TranslateAccelerator(letter.hwnd, table, &letter));
+    EXPECT_EQ(LoadAccelerators(nullptr, MAKEINTRESOURCE(999)), nullptr);
     EXPECT_TRUE(DestroyAcceleratorTable(table));
     EXPECT_FALSE(DestroyAcceleratorTable(table));
     EXPECT_EQ(CopyAcceleratorTable(table, nullptr, 0), 0);

@@ -51,6 +51,16 @@ TEST_F(MenuList, FindsCommandsInPopupsAndChangesThem) {
     EXPECT_FALSE(menu.DeleteMenu(501, MF_BYCOMMAND));
 }
 
+TEST_F(MenuList, HasOneDefaultItemInAPopup) {
+    EXPECT_EQ(menu.GetSafeHmenu(), menu.m_hMenu);
+    const auto isDefault = [this](UINT item) { return tvx::afx::findItem(menu, item, MF_BYCOMMAND).item().isDefault; };
+    EXPECT_TRUE(menu.SetDefaultItem(ID_FILE_NEW));
+    EXPECT_TRUE(menu.SetDefaultItem(ID_FILE_SAVE));
+    EXPECT_FALSE(isDefault(ID_FILE_NEW));
+    EXPECT_TRUE(isDefault(ID_FILE_SAVE));
+    EXPECT_FALSE(menu.SetDefaultItem(999));
+}
+
 TEST_F(MenuList, OwnsItsPopups) {
     const HMENU file = menu.GetSubMenu(0)->m_hMenu;
     EXPECT_TRUE(menu.RemoveMenu(0, MF_BYPOSITION));

@@ -142,6 +142,13 @@ TEST(Text, IsAsWideAsMeasuredAndTheSameInPieces) {
         }
         EXPECT_EQ(x, whole.GetTextExtent(text.c_str(), -1).cx) << face;
         EXPECT_EQ(whole.picture(), pieces.picture()) << face;
+        SIZE size;
+        EXPECT_TRUE(GetTextExtentPoint32(whole, text.c_str(), 4, &size));
+        EXPECT_EQ(CSize(size), whole.GetTextExtent("AVAW", 4)) << face;
+        int widths[2] = {};
+        EXPECT_TRUE(whole.GetCharWidth('A', 'B', widths));
+        EXPECT_EQ(widths[0], whole.GetTextExtent("A", 1).cx) << face;
+        EXPECT_EQ(widths[1], whole.GetTextExtent("B", 1).cx) << face;
     }
 }
 

@@ -80,7 +80,9 @@ TEST(Handles, OfDeletedContextsMakeEveryCallFail) {
 TEST(GdiObject, OwnsItsHandle) {
     HGDIOBJ handle = nullptr;
     {
-        CPen pen(PS_DOT, 3, RGB(9, 8, 7));
+        const LOGPEN described = {PS_DOT, {3, 0}, RGB(9, 8, 7)};
+        CPen pen;
+        ASSERT_TRUE(pen.CreatePenIndirect(&described));
         handle = pen.GetSafeHandle();
         EXPECT_EQ(CPen::FromHandle(pen), &pen);
         EXPECT_FALSE(pen.CreatePen(PS_SOLID, 1, 0)) << "it holds one already";
@@ -97,6 +99,29 @@ TEST(GdiObject, OwnsItsHandle) {
     EXPECT_TRUE(brush.Attach(handle));
     EXPECT_TRUE(brush.DeleteObject());
     EXPECT_FALSE(brush.DeleteObject());
+}
+
+TEST(GdiObject, OfABrushIsMadeFromItsOwnDescription) {
+    CBitmap pattern;
+    pattern.CreateBitmap(8, 8, 1, 32, nullptr);
+    CBrush hatched(HS_CROSS, RGB(1, 2, 3)), solid(RGB(4, 5, 6)), patterned(&pattern), empty, none;
+    empty.CreateStockObject(NULL_BRUSH);
+    for (const CBrush* brush : {&hatched, &solid, &patterned, &empty}) {
+        LOGBRUSH record, again;
+        ASSERT_TRUE(brush->GetLogBrush(&record));
+        CBrush copy;
+        ASSERT_TRUE(copy.CreateBrushIndirect(&record)) << record.lbStyle;
+        ASSERT_TRUE(copy.GetLogBrush(&again));
+        EXPECT_EQ(again.lbStyle, record.lbStyle);
+        EXPECT_EQ(again.lbColor, record.lbColor);
+        EXPECT_EQ(again.lbHatch, record.lbHatch);
+    }
+    const LOGBRUSH unknown = {99, 0, 0};
+    EXPECT_FALSE(none.CreateBrushIndirect(&unknown));
+    EXPECT_FALSE(none.GetLogBrush(nullptr));
+    CBrush system;
+    ASSERT_TRUE(system.CreateSysColorBrush(COLOR_WINDOW));
+    EXPECT_EQ(system.m_hObject, GetSysColorBrush(COLOR_WINDOW));
 }
 
 TEST(GdiObject, OfABareHandleLivesUntilIdleAndOwnsNothing) {
@@ -132,6 +157,8 @@ TEST(SelectObject, AnswersTheToolBefore) {
     EXPECT_EQ(dc.GetCurrentPen(), &red);
     EXPECT_EQ(dc.SelectObject(black), &red);
     EXPECT_EQ(dc.SelectStockObject(NULL_BRUSH)->m_hObject, GetStockObject(WHITE_BRUSH));
+    EXPECT_EQ(dc.GetCurrentBrush()->m_hObject, GetStockObject(NULL_BRUSH));
+    EXPECT_EQ(dc.GetCurrentBitmap(), &dc.bitmap);
     CPen none;
     EXPECT_EQ(dc.SelectObject(&none), nullptr);
     EXPECT_EQ(dc.SelectObject(static_cast<CPen*>(nullptr)), nullptr);
@@ -290,6 +317,44 @@ TEST(Region, CombinesAreas) {
     EXPECT_FALSE(result.PtInRegion(15, 9));
     CRgn none;
     EXPECT_EQ(none.CombineRgn(&left, &right, RGN_OR), RGN_ERROR);
+    EXPECT_EQ(none.OffsetRgn(1, 1), RGN_ERROR);
+}
+
+TEST(Region, IsMovedReplacedAndFilled) {
+    CRgn region;
+    const CRect start(2, 2, 6, 6);
+    ASSERT_TRUE(region.CreateRectRgnIndirect(&start));
+    EXPECT_EQ(region.OffsetRgn(-2, 1), SIMPLEREGION);
+    const CRect touching(4, 3, 9, 9), crossing(3, 3, 9, 9);
+    EXPECT_FALSE(region.RectInRegion(&touching)) << "right edges do not belong to it";
+    EXPECT_TRUE(region.RectInRegion(&crossing));
+    MemoryDc dc(8, 5);
+    CBrush red(RGB(255, 0, 0)), blue(RGB(0, 0, 255));
+    dc.SetWindowOrg(3, 3); // regions are in device units, whatever the mapping
+    EXPECT_TRUE(dc.FillRgn(&region, &red));
+    region.SetRectRgn(7, 2, 5, 0);
+    EXPECT_TRUE(dc.FillRgn(&region, &blue));
+    EXPECT_EQ(dc.picture(), ".....bb.\n"
+                            ".....bb.\n"
+                            "........\n"
+                            "rrrr....\n"
+                            "rrrr....\n");
+    CRgn none;
+    EXPECT_FALSE(dc.FillRgn(&none, &red));
+}
+
+TEST(Region, OfAPolygonFollowsTheFillMode) {
+    // A square drawn round twice, the second time inside of the first.
+    const POINT points[] = {{0, 0}, {9, 0}, {9, 9}, {0, 9}, {0, 0}, {3, 3}, {6, 3}, {6, 6}, {3, 6}, {3, 3}};
+    for (const int mode : {ALTERNATE, WINDING}) {
+        CRgn region;
+        ASSERT_TRUE(region.CreatePolygonRgn(points, 10, mode));
+        EXPECT_TRUE(region.PtInRegion(1, 5));
+        EXPECT_EQ(region.PtInRegion(4, 5), mode == WINDING);
+        EXPECT_FALSE(region.PtInRegion(9, 5));
+    }
+    CRgn none;
+    EXPECT_FALSE(none.CreatePolygonRgn(points, 1, WINDING));
 }
 
 } // namespace
