@@ -69,8 +69,8 @@ public:
     void NextDlgCtrl() const;
     void PrevDlgCtrl() const;
     /// @}
-    /// Moves the keyboard to this control and selects its text, as validating handlers do; null changes nothing. Plain
-    /// SetFocus would leave the default button and the selection as they were.
+    /// Moves the keyboard to this control and selects its text, as validating handlers do; null changes nothing.
+    /// SetFocus alone leaves the selection as it was.
     void GotoDlgCtrl(CWnd* control);
     /// The default button that Enter presses: its number in the low half, DC_HASDEFID in the high one; 0 for none.
     DWORD GetDefID() const;
