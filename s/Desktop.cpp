@@ -1,5 +1,7 @@
 #include "s/Desktop.h"
 
+#include "s/MainWindow.h"
+
 namespace {
 
 HWND handleOf(unsigned long windowId) {
@@ -34,8 +36,7 @@ private:
 } // namespace
 
 unsigned long Gui_Desktop::GetMainWindowID() {
-    const CWinThread* thread = AfxGetThread();
-    return thread && thread->m_pMainWnd ? identifierOf(thread->m_pMainWnd->m_hWnd) : 0;
+    return identifierOf(MainWindowHandle());
 }
 
 unsigned long Gui_Desktop::GetDialogWindowID(HWND dialog) {

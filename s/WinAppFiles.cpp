@@ -3,10 +3,10 @@
 
 #include "afxdlgs.h"
 #include "s/FileName.h"
+#include "s/MainWindow.h"
 
 HWND Gui_WinApp::GetOwnerForFileDialog() {
-    const CWinThread* thread = AfxGetThread();
-    return thread && thread->m_pMainWnd ? thread->m_pMainWnd->m_hWnd : nullptr;
+    return MainWindowHandle();
 }
 
 CString Gui_WinApp::GetInitialDirForFileDialog(const CString& fileName) {

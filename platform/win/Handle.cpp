@@ -2,14 +2,13 @@
 
 #include "platform/win/Process.h"
 #include "platform/win/detail/KernelObject.h"
+#include "platform/win/detail/NumberTable.h"
 
 #include <cerrno>
 #include <chrono>
 #include <fcntl.h>
-#include <mutex>
 #include <poll.h>
 #include <unistd.h>
-#include <unordered_map>
 #include <utility>
 
 namespace tvx::win {
@@ -21,40 +20,21 @@ struct Entry {
     Inheritance inheritance = Inheritance::None;
 };
 
-/// The handles of the process. Numbers are never used twice, so that a stale one is always noticed.
-class Handles {
-public:
-    static Handles& instance() {
-        // Never destroyed: static objects of hosts may hold handles.
-        static auto* handles = new Handles;
-        return *handles;
-    }
+/// The handles of the process. Never destroyed: static objects of hosts may hold handles.
+NumberTable<Entry>& handles() {
+    static auto* table = new NumberTable<Entry>;
+    return *table;
+}
 
-    HANDLE add(Entry entry) {
-        const std::lock_guard lock(m_mutex);
-        m_last += 4;
-        m_entries.emplace(m_last, std::move(entry));
-        return reinterpret_cast<HANDLE>(m_last);
-    }
+std::uintptr_t numberOf(HANDLE handle) {
+    return reinterpret_cast<std::uintptr_t>(handle);
+}
 
-    Entry find(HANDLE handle) const {
-        const std::lock_guard lock(m_mutex);
-        const auto found = m_entries.find(reinterpret_cast<std::uintptr_t>(handle));
-        return found == m_entries.end() ? Entry() : found->second;
-    }
-
-    /// The entry comes back, so that its object ends outside the lock.
-    Entry take(HANDLE handle) {
-        const std::lock_guard lock(m_mutex);
-        auto node = m_entries.extract(reinterpret_cast<std::uintptr_t>(handle));
-        return node ? std::move(node.mapped()) : Entry();
-    }
-
-private:
-    mutable std::mutex m_mutex;
-    std::unordered_map<std::uintptr_t, Entry> m_entries;
-    std::uintptr_t m_last = 0;
-};
+Entry entryOf(HANDLE handle) {
+    Entry found;
+    handles().with(numberOf(handle), [&](const Entry& entry) { found = entry; });
+    return found;
+}
 
 using Clock = std::chrono::steady_clock;
 
@@ -107,11 +87,11 @@ short waitReadable(int descriptor, DWORD timeout) {
 }
 
 HANDLE makeHandle(std::shared_ptr<KernelObject> object, Inheritance inheritance) {
-    return Handles::instance().add({std::move(object), inheritance});
+    return reinterpret_cast<HANDLE>(handles().add({std::move(object), inheritance}));
 }
 
 std::shared_ptr<KernelObject> objectOf(HANDLE handle) {
-    std::shared_ptr<KernelObject> object = Handles::instance().find(handle).object;
+    std::shared_ptr<KernelObject> object = entryOf(handle).object;
     if (!object) {
         SetLastError(ERROR_INVALID_HANDLE);
     }
@@ -119,7 +99,7 @@ std::shared_ptr<KernelObject> objectOf(HANDLE handle) {
 }
 
 bool isInheritable(HANDLE handle) {
-    return Handles::instance().find(handle).inheritance == Inheritance::Inheritable;
+    return entryOf(handle).inheritance == Inheritance::Inheritable;
 }
 
 } // namespace tvx::win
@@ -127,7 +107,7 @@ bool isInheritable(HANDLE handle) {
 using namespace tvx::win;
 
 BOOL CloseHandle(HANDLE handle) {
-    if (Handles::instance().take(handle).object) {
+    if (handles().take(numberOf(handle)).object) {
         return TRUE;
     }
     SetLastError(ERROR_INVALID_HANDLE);

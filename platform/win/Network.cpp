@@ -3,53 +3,25 @@
 #include "platform/base/Text.h"
 #include "platform/win/Error.h"
 #include "platform/win/detail/DriveTable.h"
+#include "platform/win/detail/NumberTable.h"
 
 #include <algorithm>
 #include <cstring>
-#include <map>
-#include <mutex>
 
 namespace {
 
 using tvx::win::Drive;
+using tvx::win::NumberTable;
 
 struct Enumeration {
     std::shared_ptr<const tvx::win::DriveTable> table;
     std::size_t next = 0; ///< of the table's drives
 };
 
-/// The enumerations that are open, by a number that is never used twice.
-class Enumerations {
-public:
-    static Enumerations& instance() {
-        static auto* enumerations = new Enumerations;
-        return *enumerations;
-    }
-
-    HANDLE open(Enumeration enumeration) {
-        const std::lock_guard lock(m_mutex);
-        m_open.emplace(++m_last, std::move(enumeration));
-        return reinterpret_cast<HANDLE>(m_last);
-    }
-
-    bool close(HANDLE handle) {
-        const std::lock_guard lock(m_mutex);
-        return m_open.erase(reinterpret_cast<std::uintptr_t>(handle)) > 0;
-    }
-
-    /// Runs a function with the enumeration behind a handle.
-    template <typename Function>
-    DWORD with(HANDLE handle, Function function) {
-        const std::lock_guard lock(m_mutex);
-        const auto found = m_open.find(reinterpret_cast<std::uintptr_t>(handle));
-        return found == m_open.end() ? ERROR_INVALID_HANDLE : function(found->second);
-    }
-
-private:
-    std::mutex m_mutex;
-    std::map<std::uintptr_t, Enumeration> m_open;
-    std::uintptr_t m_last = 0;
-};
+NumberTable<Enumeration>& enumerations() {
+    static auto* open = new NumberTable<Enumeration>;
+    return *open;
+}
 
 /// Fills the caller's buffer: records from its beginning, texts from its end.
 class ResourceBuffer {
@@ -125,7 +97,7 @@ DWORD WNetOpenEnumA(DWORD scope, DWORD type, DWORD /*usage*/, NETRESOURCEA* cont
     if (scope != RESOURCE_CONNECTED || type > RESOURCETYPE_DISK) {
         return ERROR_NOT_SUPPORTED;
     }
-    *handle = Enumerations::instance().open({tvx::win::currentDrives(), 0});
+    *handle = reinterpret_cast<HANDLE>(enumerations().add({tvx::win::currentDrives(), 0}));
     return NO_ERROR;
 }
 
@@ -133,10 +105,13 @@ DWORD WNetEnumResourceA(HANDLE handle, DWORD* count, void* buffer, DWORD* size) 
     if (!count || !size || (!buffer && *size > 0)) {
         return ERROR_INVALID_PARAMETER;
     }
-    return Enumerations::instance().with(
-        handle, [&](Enumeration& enumeration) { return fill(enumeration, *count, buffer, *size); });
+    DWORD answer = ERROR_INVALID_HANDLE;
+    enumerations().with(reinterpret_cast<std::uintptr_t>(handle),
+                        [&](Enumeration& enumeration) { answer = fill(enumeration, *count, buffer, *size); });
+    return answer;
 }
 
 DWORD WNetCloseEnum(HANDLE handle) {
-    return Enumerations::instance().close(handle) ? ERROR_SUCCESS : ERROR_INVALID_HANDLE;
+    const Enumeration closed = enumerations().take(reinterpret_cast<std::uintptr_t>(handle));
+    return closed.table ? ERROR_SUCCESS : ERROR_INVALID_HANDLE;
 }

@@ -53,7 +53,7 @@ public:
     int SetItemData(int index, DWORD_PTR data) {
         return static_cast<int>(SendMessage(CB_SETITEMDATA, static_cast<WPARAM>(index), static_cast<LPARAM>(data)));
     }
-    /// The same as a pointer, which stays the caller's.
+    /// The number a line carries as a pointer; (void*)-1 (CB_ERR) for a line that does not exist.
     void* GetItemDataPtr(int index) const {
         return reinterpret_cast<void*>(GetItemData(index));
     }
@@ -92,7 +92,9 @@ public:
     BOOL SetEditSel(int start, int end) {
         return static_cast<BOOL>(SendMessage(CB_SETEDITSEL, 0, MAKELONG(start, end)));
     }
-    /// How much can be typed into the field; 0 for no limit.
+    /// How many bytes the user may have in the field; 0 for no limit, as from the start. What would make it longer is
+    /// refused as a whole. Texts that the program sets may be longer; the limit rests until one is short enough again.
+    /// FALSE for a box that is not typed into.
     BOOL LimitText(int limit) {
         return static_cast<BOOL>(SendMessage(CB_LIMITTEXT, static_cast<WPARAM>(limit)));
     }
@@ -108,7 +110,7 @@ public:
     void GetDroppedControlRect(RECT* rect) const {
         SendMessage(CB_GETDROPPEDCONTROLRECT, 0, reinterpret_cast<LPARAM>(rect));
     }
-    /// The least width of the open list, in pixels.
+    /// Sets the least width of the open list in pixels and answers it. The list is never narrower than the box.
     int SetDroppedWidth(UINT width) {
         return static_cast<int>(SendMessage(CB_SETDROPPEDWIDTH, width));
     }
@@ -116,7 +118,8 @@ public:
     int GetItemHeight(int index) const {
         return static_cast<int>(SendMessage(CB_GETITEMHEIGHT, static_cast<WPARAM>(index)));
     }
-    /// Sets the height of all lines, in pixels.
+    /// Sets the height of all lines and of the field in pixels, whatever `index` is: -1 (the field) or any line.
+    /// Answers CB_OKAY.
     int SetItemHeight(int index, UINT height) {
         return static_cast<int>(SendMessage(CB_SETITEMHEIGHT, static_cast<WPARAM>(index), static_cast<LPARAM>(height)));
     }

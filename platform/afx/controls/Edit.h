@@ -50,11 +50,11 @@ public:
     BOOL SetReadOnly(BOOL readOnly = TRUE) {
         return static_cast<BOOL>(SendMessage(EM_SETREADONLY, static_cast<WPARAM>(readOnly)));
     }
-    /// 0 shows what is typed.
+    /// Hides what is typed; 0 shows it. The desktop's own dot stands for each character, whatever `character` is.
     void SetPasswordChar(char character) {
         SendMessage(EM_SETPASSWORDCHAR, static_cast<WPARAM>(static_cast<unsigned char>(character)));
     }
-    /// What is shown instead of the text, 0 for the text itself.
+    /// What SetPasswordChar was told, '*' for a control created with ES_PASSWORD, 0 when the text is shown.
     char GetPasswordChar() const {
         return static_cast<char>(SendMessage(EM_GETPASSWORDCHAR));
     }
@@ -102,7 +102,7 @@ public:
     void EmptyUndoBuffer() {
         SendMessage(EM_EMPTYUNDOBUFFER);
     }
-    /// Moves the selection to the clipboard.
+    /// Moves the selection to the clipboard; a read-only control only copies it. Nothing happens without a selection.
     void Cut() {
         SendMessage(WM_CUT);
     }

@@ -39,10 +39,6 @@ public:
     void ResetContent() {
         SendMessage(LB_RESETCONTENT);
     }
-    /// Makes room for many lines before they are added.
-    int InitStorage(int lines, UINT bytes) {
-        return static_cast<int>(SendMessage(LB_INITSTORAGE, static_cast<WPARAM>(lines), bytes));
-    }
     /// Bytes of a line, without the final zero.
     int GetTextLen(int index) const {
         return static_cast<int>(SendMessage(LB_GETTEXTLEN, static_cast<WPARAM>(index)));
@@ -61,7 +57,7 @@ public:
     int SetItemData(int index, DWORD_PTR data) {
         return static_cast<int>(SendMessage(LB_SETITEMDATA, static_cast<WPARAM>(index), static_cast<LPARAM>(data)));
     }
-    /// The same as a pointer, which stays the caller's.
+    /// The number a line carries as a pointer; (void*)-1 (LB_ERR) for a line that does not exist.
     void* GetItemDataPtr(int index) const {
         return reinterpret_cast<void*>(GetItemData(index));
     }
@@ -124,11 +120,11 @@ public:
     int SetCaretIndex(int index, BOOL scroll = TRUE) {
         return static_cast<int>(SendMessage(LB_SETCARETINDEX, static_cast<WPARAM>(index), scroll));
     }
-    /// Sets the line that an extended selection begins at.
+    /// Sets the line at which the next extension by Shift begins; what is selected now stays.
     void SetAnchorIndex(int index) {
         SendMessage(LB_SETANCHORINDEX, static_cast<WPARAM>(index));
     }
-    /// The line that an extended selection begins at.
+    /// The line at which an extension by Shift begins, -1 before there was any.
     int GetAnchorIndex() const {
         return static_cast<int>(SendMessage(LB_GETANCHORINDEX));
     }
@@ -166,7 +162,9 @@ public:
     int GetHorizontalExtent() const {
         return static_cast<int>(SendMessage(LB_GETHORIZONTALEXTENT));
     }
-    /// Tab stops in dialog units, for lists with LBS_USETABSTOPS.
+    /// Sets the tab stops of a list with LBS_USETABSTOPS, in horizontal dialog units of the list's font and in rising
+    /// order; the numbers are copied. One stop is the distance of all; behind the last of several, and with none, they
+    /// stand 32 units apart. Answers TRUE.
     BOOL SetTabStops(int count, int* stops) {
         return static_cast<BOOL>(
             SendMessage(LB_SETTABSTOPS, static_cast<WPARAM>(count), reinterpret_cast<LPARAM>(stops)));

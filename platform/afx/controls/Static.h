@@ -18,12 +18,16 @@ public:
     HICON SetIcon(HICON icon) {
         return reinterpret_cast<HICON>(SendMessage(STM_SETIMAGE, IMAGE_ICON, reinterpret_cast<LPARAM>(icon)));
     }
+    /// The icon shown, null for none. It belongs to whoever set it; one that a template named belongs to the control's
+    /// resources and is never to be destroyed.
     HICON GetIcon() const {
         return reinterpret_cast<HICON>(SendMessage(STM_GETIMAGE, IMAGE_ICON));
     }
+    /// The same for a bitmap. A control shows one picture: this turns an SS_ICON control into an SS_BITMAP one.
     HBITMAP SetBitmap(HBITMAP bitmap) {
         return reinterpret_cast<HBITMAP>(SendMessage(STM_SETIMAGE, IMAGE_BITMAP, reinterpret_cast<LPARAM>(bitmap)));
     }
+    /// The bitmap shown, null for none; it belongs to whoever set it.
     HBITMAP GetBitmap() const {
         return reinterpret_cast<HBITMAP>(SendMessage(STM_GETIMAGE, IMAGE_BITMAP));
     }

@@ -78,6 +78,7 @@ std::string_view trimmed(const CString& value) {
 /// A whole number that fits the range; nothing else may stand beside it.
 bool parseWhole(const CString& value, long long min, long long max, long long& number) {
     std::string_view view = trimmed(value);
+    // std::from_chars knows no plus sign.
     if (!view.empty() && view.front() == '+') {
         view.remove_prefix(1);
     }
@@ -203,6 +204,7 @@ void DDX_Check(CDataExchange* dx, int id, int& value) {
     if (dx->m_bSaveAndValidate) {
         value = static_cast<int>(::SendMessageA(control, BM_GETCHECK, 0, 0));
     } else {
+        // A member that was never set shows no mark.
         value = value >= 0 && value <= 2 ? value : 0;
         ::SendMessageA(control, BM_SETCHECK, static_cast<WPARAM>(value), 0);
     }
@@ -216,6 +218,7 @@ void DDX_Radio(CDataExchange* dx, int id, int& value) {
     int index = 0;
     bool first = true;
     const auto style = [&] { return static_cast<DWORD>(::GetWindowLongPtrA(control, GWL_STYLE)); };
+    // The group ends before the next control with WS_GROUP. What stands in it beside radio buttons does not count.
     while (control && (first || (style() & WS_GROUP) == 0)) {
         first = false;
         if ((::SendMessageA(control, WM_GETDLGCODE, 0, 0) & DLGC_RADIOBUTTON) != 0) {
@@ -259,6 +262,7 @@ CString lineOf(HWND control, const ListMessages& messages) {
 bool selectWhole(HWND control, const CString& value, UINT find, UINT setCurrent) {
     const LRESULT index =
         ::SendMessageA(control, find, static_cast<WPARAM>(-1), reinterpret_cast<LPARAM>(value.GetString()));
+    // Without such a line, -1 takes the former choice away.
     ::SendMessageA(control, setCurrent, static_cast<WPARAM>(index), 0);
     return index >= 0;
 }

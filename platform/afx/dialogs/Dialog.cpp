@@ -150,6 +150,7 @@ BOOL CDialog::Create(LPCSTR templateName, CWnd* parent) {
 
 BOOL CDialog::createFrom(const tvx::DialogTemplate& description, CWnd* parent, bool modal) {
     CREATESTRUCT cs{};
+    // A page's template says WS_CHILD; run by DoModal it is a window of its own all the same.
     const bool child = (description.style & WS_CHILD) != 0 && !modal;
     cs.lpszClass = dialogClass;
     cs.lpszName = description.title.c_str();
@@ -188,6 +189,7 @@ bool place(DialogWindow& dialog, const tvx::DialogTemplate& description, CWnd& o
         corner = QCursor::pos() - QPoint(rect.width() / 2, rect.height() / 2);
     }
     guarded([&] { dialog.setClientSize(corner, rect.size()); });
+    // Templates that leave the place to the framework stand at 0, 0.
     const bool noPlace = rect.topLeft().isNull() && (description.style & (DS_ABSALIGN | DS_CENTERMOUSE)) == 0;
     const bool centred = !dialog.isChild() && ((description.style & DS_CENTER) != 0 || noPlace || !over);
     if (centred) {

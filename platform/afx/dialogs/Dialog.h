@@ -63,20 +63,21 @@ public:
     /// modeless one.
     void EndDialog(int result);
 
-    /// Moves the keyboard to the next or previous control with WS_TABSTOP, or to this one; text is selected as by Tab.
+    /// Moves the keyboard to the control behind or before the one that has it. Only controls with WS_TABSTOP that are
+    /// seen and enabled count, the last is followed by the first, and text is selected as by Tab.
+    /// @{
     void NextDlgCtrl() const;
     void PrevDlgCtrl() const;
+    /// @}
+    /// Moves the keyboard to this control and selects its text, as validating handlers do; null changes nothing. Plain
+    /// SetFocus would leave the default button and the selection as they were.
     void GotoDlgCtrl(CWnd* control);
     /// The default button that Enter presses: its number in the low half, DC_HASDEFID in the high one; 0 for none.
     DWORD GetDefID() const;
+    /// Makes another button the default one, 0 none. While a push button has the keyboard, Enter presses that one.
     void SetDefID(UINT id);
     /// Turns dialog units into pixels of this dialog's font.
     void MapDialogRect(RECT* rect) const;
-    /// The number that WM_COMMANDHELP asks the application's help for; 0 for none. That of the template at first. F1
-    /// sends ID_HELP to the main window instead.
-    void SetHelpID(UINT id) {
-        m_nIDHelp = id;
-    }
 
     BOOL PreTranslateMessage(MSG* message) override;
     /// The dialog's own handlers, then, for plain commands, those of its owner and of the application.
@@ -97,6 +98,8 @@ protected:
     afx_msg LRESULT HandleInitDialog(WPARAM wParam, LPARAM lParam);
     DECLARE_MESSAGE_MAP()
 
+    /// The number that WM_COMMANDHELP asks the application's help for, 0 for none. That of the template at first. F1
+    /// sends ID_HELP to the main window instead.
     UINT m_nIDHelp = 0;
     LPCSTR m_lpszTemplateName = nullptr;
     CWnd* m_pParentWnd = nullptr;

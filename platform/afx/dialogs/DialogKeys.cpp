@@ -7,6 +7,7 @@
 #include "platform/afx/core/Wnd.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Keys.h"
+#include "platform/afx/core/detail/Menus.h"
 #include "platform/afx/dialogs/detail/DialogWindow.h"
 
 #include <QApplication>
@@ -23,6 +24,7 @@ UINT codeOf(Window& window, const MSG* msg = nullptr) {
 }
 
 bool isUsable(const Window& window) {
+    // By the style, not by what is seen: the first control is looked for before the dialog is shown.
     return window.isEnabled() && (window.style() & WS_VISIBLE) != 0;
 }
 
@@ -66,6 +68,7 @@ Window* nextTabItem(Window& dialog, const Window* from, Direction direction) {
     if (place == controls.end()) {
         place = controls.begin();
     } else {
+        // The control itself comes last: it is the answer when there is no other.
         std::rotate(controls.begin(), std::next(place), controls.end());
     }
     const auto isStop = [](const Window* window) { return (window->style() & WS_TABSTOP) != 0; };
@@ -103,6 +106,7 @@ namespace {
 
 bool onTab(Window& dialog, Window* focus) {
     const Direction direction = isKeyDown(VK_SHIFT) ? Direction::Backward : Direction::Forward;
+    // Where there is nowhere to go, the key is the dialog's all the same.
     if (Window* next = nextTabItem(dialog, focus, direction)) {
         focusControl(*next);
     }
@@ -140,6 +144,7 @@ bool press(Window& dialog, int id) {
 
 bool onEnter(Window& dialog, Window* focus) {
     const UINT code = focus ? codeOf(*focus) : 0;
+    // A push button that has the keyboard is the default one for that time.
     if ((code & (DLGC_DEFPUSHBUTTON | DLGC_UNDEFPUSHBUTTON)) != 0) {
         armIdle();
         SendMessageA(focus->handle(), BM_CLICK, 0, 0);
@@ -152,25 +157,12 @@ bool onEnter(Window& dialog, Window* focus) {
 
 // --- mnemonics ---
 
-QChar mnemonicOf(const QString& text) {
-    for (int at = 0; at + 1 < text.size(); ++at) {
-        if (text.at(at) != QLatin1Char('&')) {
-            continue;
-        }
-        if (text.at(at + 1) != QLatin1Char('&')) {
-            return text.at(at + 1).toUpper();
-        }
-        ++at;
-    }
-    return {};
-}
-
 /// The controls whose text carries this mnemonic, hidden and disabled ones left out.
-std::vector<Window*> withMnemonic(const std::vector<Window*>& controls, QChar letter) {
+std::vector<Window*> withMnemonic(const std::vector<Window*>& controls, char32_t letter) {
     std::vector<Window*> found;
     for (Window* window : controls) {
         const auto* control = dynamic_cast<const Control*>(window);
-        if (control && mnemonicOf(control->mnemonicText()) == letter) {
+        if (control && accessKey(fromQt(control->mnemonicText())) == letter) {
             found.push_back(window);
         }
     }
@@ -209,9 +201,7 @@ bool activate(const std::vector<Window*>& controls, Window* chosen, bool unique)
 bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
     std::vector<Window*> controls;
     collect(dialog, controls);
-    const auto codePoint = static_cast<char32_t>(character);
-    const QString letter = QString::fromUcs4(&codePoint, 1).toUpper();
-    const auto found = withMnemonic(controls, letter.at(0));
+    const auto found = withMnemonic(controls, QChar::toLower(static_cast<char32_t>(character)));
     if (found.empty()) {
         return false;
     }
@@ -227,6 +217,7 @@ bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
 
 bool onKey(Window& dialog, Window* focus, const MSG& msg) {
     const UINT code = focus ? codeOf(*focus, &msg) : 0;
+    // With Alt, keys are mnemonics, which come as WM_SYSCHAR, or the menu's.
     if ((code & DLGC_WANTALLKEYS) != 0 || isKeyDown(VK_MENU)) {
         return false;
     }

@@ -7,6 +7,7 @@
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/SystemPath.h"
+#include "platform/base/Text.h"
 #include "platform/win/FrameworkIds.h"
 
 #include <QFileDialog>
@@ -29,7 +30,7 @@ CFileDialog::CFileDialog(BOOL openDialog, LPCSTR defaultExtension, LPCSTR fileNa
     m_ofn.nFilterIndex = 1;
     m_ofn.lpstrDefExt = defaultExtension ? m_defaultExtension.GetString() : nullptr;
     if (fileName) {
-        std::strncpy(m_fileName, fileName, sizeof(m_fileName) - 1);
+        tvx::text::copyCut(fileName, m_fileName, sizeof(m_fileName));
     }
     if (filter) {
         m_filter = filter;
@@ -68,6 +69,7 @@ QStringList filtersOf(LPCSTR text) {
 class Dialog : public QFileDialog {
 public:
     explicit Dialog(QWidget* over) : QFileDialog(over) {
+        // A desktop's own dialog would wait in a loop of its own, and close without asking the host.
         setOption(QFileDialog::DontUseNativeDialog);
         setWindowModality(Qt::ApplicationModal);
     }
@@ -79,10 +81,13 @@ public:
         guarded([this] { hide(); });
         return answer == QDialog::Accepted;
     }
+    /// The toolkit calls this from slots of its own. A host whose OnFileNameOK throws ends the loop with that.
     void done(int result) override {
-        if (result != QDialog::Accepted || isAccepted()) {
-            m_loop.end(result);
-        }
+        storing([&] {
+            if (result != QDialog::Accepted || isAccepted()) {
+                m_loop.end(result);
+            }
+        });
     }
 
 private:

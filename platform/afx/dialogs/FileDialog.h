@@ -28,8 +28,8 @@
 
 /// What a file dialog is told and answers. Texts belong to whoever sets them and must live until DoModal has returned.
 struct OPENFILENAMEA {
-    DWORD lStructSize;
-    HWND hwndOwner; ///< The window it stands over.
+    DWORD lStructSize; ///< Size of this record in bytes; set, and not looked at.
+    HWND hwndOwner;    ///< The window it stands over.
     HINSTANCE hInstance;
     LPCSTR lpstrFilter; ///< Description, zero, pattern ("*.brd;*.txt"), zero, ..., and one more zero; null: all files.
     LPSTR lpstrCustomFilter;
@@ -90,6 +90,8 @@ public:
     CString GetFileTitle() const;
     /// The first of several chosen files (OFN_ALLOWMULTISELECT); null when there are none.
     POSITION GetStartPosition() const;
+    /// The full name of the chosen file at a position, which moves on to the next one: null behind the last. Empty for
+    /// a position that is null already.
     CString GetNextPathName(POSITION& position) const;
 
 protected:

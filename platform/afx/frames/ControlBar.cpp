@@ -113,6 +113,7 @@ BOOL CControlBar::PreTranslateMessage(MSG* message) {
 }
 
 LRESULT CControlBar::OnIdleUpdateCmdUI(WPARAM disable, LPARAM) {
+    // Nobody sees the states of a hidden bar; the idle time after it is shown brings them.
     if (!m_hWnd || !IsWindowVisible()) {
         return 0;
     }

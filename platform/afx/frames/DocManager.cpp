@@ -79,13 +79,7 @@ void CDocManager::OnFileOpen() {
 
 namespace {
 
-/// Appends one filter; each text ends with a zero.
-void addFilter(std::string& filters, const CString& description, const CString& pattern) {
-    filters.append(description.GetString()).push_back('\0');
-    filters.append(pattern.GetString()).push_back('\0');
-}
-
-void addFilter(std::string& filters, const CDocTemplate& docTemplate, CString& defaultExtension) {
+void addFilter(CString& filters, const CDocTemplate& docTemplate, CString& defaultExtension) {
     CString name;
     CString extension;
     if (!docTemplate.GetDocString(extension, CDocTemplate::filterExt) || extension.IsEmpty() ||
@@ -95,14 +89,14 @@ void addFilter(std::string& filters, const CDocTemplate& docTemplate, CString& d
     if (defaultExtension.IsEmpty()) {
         defaultExtension = extension.Mid(1);
     }
-    addFilter(filters, name, CString("*") + extension);
+    filters += name + "|*" + extension + "|";
 }
 
 } // namespace
 
 BOOL CDocManager::DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog,
                                    CDocTemplate* docTemplate) {
-    std::string filters;
+    CString filters;
     CString defaultExtension;
     if (docTemplate) {
         addFilter(filters, *docTemplate, defaultExtension);
@@ -113,13 +107,12 @@ BOOL CDocManager::DoPromptFileName(CString& fileName, UINT titleId, DWORD flags,
     }
     CString allFiles;
     allFiles.LoadString(AFX_IDS_ALLFILTER);
-    addFilter(filters, allFiles, "*.*");
+    filters += allFiles + "|*.*||";
     CString title;
     title.LoadString(titleId);
 
-    CFileDialog dialog(openDialog, nullptr, fileName, flags | OFN_OVERWRITEPROMPT);
+    CFileDialog dialog(openDialog, nullptr, fileName, flags | OFN_OVERWRITEPROMPT, filters);
     dialog.m_ofn.lpstrTitle = title;
-    dialog.m_ofn.lpstrFilter = filters.c_str();
     dialog.m_ofn.lpstrDefExt = defaultExtension.IsEmpty() ? nullptr : defaultExtension.GetString();
     dialog.m_ofn.nFilterIndex = 1;
     if (dialog.DoModal() != IDOK) {
@@ -168,6 +161,7 @@ void activate(const CDocument& document) {
 CDocument* CDocManager::OpenDocumentFile(LPCSTR fileName) {
     CString name(fileName);
     name.Trim();
+    // Names that come from other programs may stand in quotation marks.
     if (name.GetLength() > 1 && name[0] == '"' && name[name.GetLength() - 1] == '"') {
         name = name.Mid(1, name.GetLength() - 2);
     }

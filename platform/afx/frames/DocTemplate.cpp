@@ -39,6 +39,7 @@ CDocTemplate::Confidence CDocTemplate::MatchDocType(LPCSTR path, CDocument*& mat
     CString wanted;
     const bool native = GetDocString(wanted, filterExt) && !wanted.IsEmpty() &&
                         tvx::text::compareNoCase(wanted.View(), extensionOf(path).View()) == 0;
+    // A file with another extension may still be one of these: opening it tells.
     return native ? yesAttemptNative : yesAttemptForeign;
 }
 

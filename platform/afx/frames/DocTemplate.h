@@ -47,10 +47,6 @@ public:
 
     ~CDocTemplate() override;
 
-    /// Number of the resources: menu, accelerators, icon, string.
-    UINT GetResourceID() const {
-        return m_nIDResource;
-    }
     /// A part of the string. FALSE when it is missing; `text` is empty then.
     virtual BOOL GetDocString(CString& text, DocStringIndex index) const;
     /// How well a file fits. The base compares the extension, without case.

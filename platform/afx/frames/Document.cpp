@@ -78,6 +78,7 @@ CView* CDocument::GetNextView(POSITION& position) const {
 }
 
 void CDocument::UpdateAllViews(CView* sender, LPARAM hint, CObject* object) {
+    // A view's handler may end other views, which must not be told then.
     const auto views = m_views;
     for (CView* view : views) {
         if (view != sender && std::find(m_views.begin(), m_views.end(), view) != m_views.end()) {
@@ -89,7 +90,9 @@ void CDocument::UpdateAllViews(CView* sender, LPARAM hint, CObject* object) {
 void CDocument::SendInitialUpdate() {
     const auto views = m_views;
     for (CView* view : views) {
-        view->OnInitialUpdate();
+        if (std::find(m_views.begin(), m_views.end(), view) != m_views.end()) {
+            view->OnInitialUpdate();
+        }
     }
 }
 
@@ -153,6 +156,7 @@ BOOL CDocument::OnOpenDocument(LPCSTR path) {
     SetModifiedFlag(); // so that a failure half-way is not taken for the old contents
     try {
         CWaitCursor wait;
+        // An empty file is an empty document; Serialize would fail at its end.
         if (file->GetLength() != 0) {
             serialize(*this, *file, CArchive::load);
         }
@@ -311,6 +315,7 @@ bool CDocument::askForPath(CString& path, BOOL replace) {
     path = m_strPathName;
     if (path.IsEmpty() && replace) {
         path = m_strTitle;
+        // A title may hold what a file's name cannot: it is offered up to there.
         const int unfit = path.FindOneOf("#%;/\\:*?\"<>|");
         if (unfit >= 0) {
             path = path.Left(unfit);
@@ -360,8 +365,4 @@ void CDocument::OnFileClose() {
     if (SaveModified()) {
         OnCloseDocument();
     }
-}
-
-void CDocument::OnUpdateFileSave(CCmdUI* item) {
-    item->Enable(IsModified());
 }

@@ -77,7 +77,7 @@ public:
     virtual void OnChangedViewList();
     /// Puts numbers (":1", ":2") behind the title where several frames show this document, and updates the captions.
     virtual void UpdateFrameCounts();
-    /// Sends the views their first update.
+    /// Calls OnInitialUpdate of every view: for a host that fills the document anew by other means than opening a file.
     void SendInitialUpdate();
 
     // --- life of the contents; FALSE means that it failed or was refused and the user has been told ---
@@ -129,9 +129,6 @@ public:
     afx_msg void OnFileSaveAs();
     afx_msg void OnFileClose();
     /// @}
-    /// Greys its item while there is nothing to save. The base does not bind it: a host that wants this binds it to
-    /// ID_FILE_SAVE.
-    afx_msg void OnUpdateFileSave(CCmdUI* item);
 
 protected:
     friend class CDocTemplate;

@@ -97,6 +97,7 @@ BOOL CFrameWnd::PreCreateWindow(CREATESTRUCT& cs) {
     if (!cs.lpszClass) {
         cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, ::LoadCursorA(nullptr, IDC_ARROW));
     }
+    // The document comes first: task lists cut captions at their end.
     if ((cs.style & FWS_ADDTOTITLE) != 0) {
         cs.style |= FWS_PREFIXTITLE;
     }
@@ -117,6 +118,7 @@ BOOL CFrameWnd::LoadFrame(UINT id, DWORD style, CWnd* parent, CCreateContext* co
     }
     m_hMenuDefault = ::GetMenu(m_hWnd);
     LoadAccelTable(MAKEINTRESOURCE(id));
+    // With a context, the template sends it when the document is filled.
     if (!context) {
         SendMessageToDescendants(WM_INITIALUPDATE, 0, 0, TRUE, TRUE);
     }
@@ -129,6 +131,7 @@ BOOL CFrameWnd::Create(LPCSTR className, LPCSTR title, DWORD style, const RECT& 
     if (menuName) {
         menu = ::LoadMenuA(AfxFindResourceHandle(menuName, RT_MENU), menuName);
         if (!menu) {
+            // As after a creation that was refused: a frame that has no window deletes itself.
             PostNcDestroy();
             return FALSE;
         }
@@ -157,6 +160,7 @@ int CFrameWnd::OnCreateHelper(CREATESTRUCT* cs, CCreateContext* context) {
     if (CWnd::OnCreate(cs) == -1 || !OnCreateClient(cs, context)) {
         return -1;
     }
+    // Posted, because the status bar is made by the derived class behind this.
     PostMessage(WM_SETMESSAGESTRING, AFX_IDS_IDLEMESSAGE);
     RecalcLayout();
     return 0;
@@ -185,6 +189,7 @@ void CFrameWnd::InitialUpdateFrame(CDocument* document, BOOL makeVisible) {
     if (!view) {
         view = DYNAMIC_DOWNCAST(CView, GetDescendantWindow(AFX_IDW_PANE_FIRST, TRUE));
         if (view) {
+            // The view hears of it below, when it has its first contents.
             SetActiveView(view, FALSE);
         }
     }
@@ -285,6 +290,7 @@ void CFrameWnd::UpdateFrameTitleForDocument(LPCSTR documentName) {
     if (!name.IsEmpty()) {
         text = documentFirst ? name + " - " + m_strTitle : m_strTitle + " - " + name;
     }
+    // Called at idle times as well: hosts and the desktop are told of a caption only when it changes.
     CString before;
     GetWindowText(before);
     if (before != text) {
@@ -339,6 +345,7 @@ bool CFrameWnd::closeDocument() {
     for (POSITION at = document->GetFirstViewPosition(); at;) {
         const CView* view = document->GetNextView(at);
         if (view->GetParentFrame() != this) {
+            // Another frame shows the document too, so that only this one goes.
             document->PreCloseFrame(this);
             return false;
         }
@@ -358,6 +365,7 @@ void CFrameWnd::OnClose() {
             return;
         }
         const HWND self = m_hWnd;
+        // The end of many documents takes its time; the user need not watch it.
         app->HideApplication();
         app->CloseAllDocuments(FALSE);
         if (!::IsWindow(self)) {

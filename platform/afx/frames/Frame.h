@@ -136,7 +136,9 @@ public:
     virtual void OnUpdateFrameMenu(HMENU alternative);
     /// The accelerators in force now: the document type's or the frame's own.
     virtual HACCEL GetDefaultAccelerator();
-    /// Whether this frame is the only one of its document. Used before a document is closed with its frame.
+    /// Brings menus' and bars' states of all frames that are seen up to date now, not only when the application is
+    /// idle: their update handlers are called.
+    /// @param except a frame to leave out; null for none
     static void UpdateAllFrames(const CWnd* except);
     /// @}
 
@@ -157,10 +159,6 @@ public:
     void ShowControlBar(CControlBar* bar, BOOL show, BOOL delay);
     /// The bar with an identifier, null when the frame has none.
     CControlBar* GetControlBar(UINT id);
-    /// The bars of this frame, in order of creation.
-    const std::vector<CControlBar*>& GetControlBars() const {
-        return m_bars;
-    }
     /// Tells where each bar stands; a value to keep and to hand to SetDockState.
     void GetDockState(CDockState& state) const;
     /// Puts the bars where `state` says. Records of bars that the frame does not have, and sides at which a bar may not
@@ -186,9 +184,6 @@ public:
     virtual CWnd* GetMessageBar();
 
     BOOL IsFrameWnd() const override;
-    BOOL IsTracking() const {
-        return m_nIDTracking != 0 && m_nIDTracking != AFX_IDS_IDLEMESSAGE;
-    }
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
     /// @}

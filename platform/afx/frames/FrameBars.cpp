@@ -103,6 +103,7 @@ void CFrameWnd::RecalcLayout(BOOL) {
     const Window* pane = state->child(AFX_IDW_PANE_FIRST);
     guarded([&] {
         placePane(*main, pane ? pane->widget() : nullptr);
+        // Hosts ask for places right behind this call; the toolkit would lay out only in its loop.
         main->layout()->activate();
     });
     if (Window* still = Window::from(m_hWnd); still == state) {
@@ -133,6 +134,7 @@ void CFrameWnd::DockControlBar(CControlBar* bar, UINT side, const RECT* rect) {
     guarded([&] {
         tools->setAllowedAreas(areasOf(allowed));
         tools->setMovable(true);
+        // A bar that the user has hidden must not come back by being moved.
         const bool shown = !tools->isHidden();
         QToolBar* before = rect ? barAt(*main, area, QPoint(rect->left, rect->top), tools) : nullptr;
         if (before) {

@@ -132,6 +132,7 @@ void CFrameWnd::SetDockState(const CDockState& state) {
 
 /// Docks the bars as their records say; bars without one stand behind them.
 void CFrameWnd::dockBars(const std::vector<const CControlBarInfo*>& records) {
+    // Half the range, so that the rows of bars without a record can be added to it.
     constexpr int behindAll = std::numeric_limits<int>::max() / 2;
     const Window* window = GetState();
     QMainWindow* main = window ? mainWindowOf(*window) : nullptr;

@@ -49,6 +49,7 @@ void CFrameWnd::updateMenuItems(CMenu& popup) {
             }
             element.DoUpdate(this, FALSE);
         } else if (element.m_nID != 0) {
+            // The commands from 0xF000 up are the window's, which handles them without a handler.
             element.DoUpdate(this, m_bAutoMenuEnable && element.m_nID < 0xF000 ? TRUE : FALSE);
         }
         // A handler may have put items in or taken some out, such as a list of files.
@@ -67,6 +68,8 @@ void CFrameWnd::updateMenuItems(CMenu& popup) {
 void CFrameWnd::OnMenuSelect(UINT item, UINT flags, HMENU) {
     CFrameWnd* top = GetTopLevelFrame();
     UINT prompt = item;
+    // So the platform tells that the menu has closed. System commands lie 16 apart and their prompts 1; all frames of
+    // the Window menu share one.
     if (flags == 0xFFFF) {
         prompt = AFX_IDS_IDLEMESSAGE;
     } else if (item == 0 || (flags & (MF_SEPARATOR | MF_POPUP)) != 0) {

@@ -146,6 +146,7 @@ void CMDIChildWnd::OnMDIActivate(BOOL activate, CWnd* activated, CWnd*) {
     }
     if (activate && view) {
         view->OnActivateView(TRUE, view, view);
+        // A control of this frame that was clicked has the keyboard already, and keeps it.
         const HWND focus = ::GetFocus();
         if (focus != view->m_hWnd && !::IsChild(m_hWnd, focus)) {
             view->SetFocus();
@@ -188,6 +189,7 @@ void CMDIChildWnd::OnUpdateFrameTitle(BOOL addToTitle) {
     if (before == text) {
         return;
     }
+    // A maximised child's name is part of the main frame's caption.
     SetWindowText(text);
     if (CMDIFrameWnd* frame = GetMDIFrame()) {
         frame->OnUpdateFrameTitle(addToTitle);

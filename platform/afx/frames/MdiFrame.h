@@ -29,7 +29,7 @@ public:
     CMDIChildWnd* MDIGetActive(BOOL* maximized = nullptr) const;
     /// Makes a child frame the active one.
     void MDIActivate(CWnd* child);
-    /// Activates the next or the previous child frame.
+    /// Activates the next or the previous of the child frames that are seen, in order of creation and around.
     /// @{
     void MDINext();
     void MDIPrev();
@@ -57,8 +57,11 @@ public:
 
     /// Creates the client window. Called from OnCreateClient.
     virtual BOOL CreateClient(CREATESTRUCT* cs, CMenu* windowMenu);
-    /// Makes a new child frame without a document.
-    /// @param childClass a class derived from CMDIChildWnd; id: its resources
+    /// Makes a new child frame without a document, shows it and makes it active.
+    /// @param childClass a class derived from CMDIChildWnd, made with DECLARE_DYNCREATE
+    /// @param id of its resources, as for LoadFrame
+    /// @param menu,accelerators in force while it is active; they stay the caller's. Null menu: that of the resources
+    /// @return the frame, which deletes itself as frames do; null when the class is another one or creation was refused
     CMDIChildWnd* CreateNewChild(CRuntimeClass* childClass, UINT id, HMENU menu = nullptr,
                                  HACCEL accelerators = nullptr);
     /// The popup that lists the child frames, null when `menuBar` has none.
@@ -138,10 +141,6 @@ public:
     void OnUpdateFrameTitle(BOOL addToTitle) override;
     HACCEL GetDefaultAccelerator() override;
     CWnd* GetMessageBar() override;
-    /// The menu shown while this frame is active, null for the main frame's own.
-    HMENU GetMenuShared() const {
-        return m_hMenuShared;
-    }
 
     afx_msg void OnMDIActivate(BOOL activate, CWnd* activated, CWnd* deactivated);
     afx_msg int OnMouseActivate(CWnd* desktop, UINT hitTest, UINT message);

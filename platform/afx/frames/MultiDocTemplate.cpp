@@ -65,6 +65,7 @@ CDocument* CMultiDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
         AfxMessageBox(AFX_IDP_FAILED_TO_CREATE_DOC);
         return nullptr;
     }
+    // A frame that fails takes its view with it; the document must not delete itself with that.
     const BOOL autoDelete = std::exchange(document->m_bAutoDelete, FALSE);
     CFrameWnd* frame = CreateNewFrame(document, nullptr);
     document->m_bAutoDelete = autoDelete;

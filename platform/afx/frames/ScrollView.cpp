@@ -36,6 +36,7 @@ BOOL CScrollView::PreCreateWindow(CREATESTRUCT& cs) {
 void CScrollView::SetScrollSizes(int mapMode, SIZE total, const SIZE& page, const SIZE& line) {
     const int oldMode = std::exchange(m_mapMode, mapMode);
     m_totalLog = total;
+    // The screen's context: sizes may be told before the view has a window.
     CClientDC dc(nullptr);
     dc.SetMapMode(mapMode);
     const auto toDevice = [&dc](SIZE size) {
@@ -228,6 +229,7 @@ BOOL CScrollView::OnScroll(UINT code, UINT position, BOOL doScroll) {
     const int dx = distanceOf(LOBYTE(code), position, m_position.x, m_pageDev.cx, m_lineDev.cx, limit.x);
     const int dy = distanceOf(HIBYTE(code), position, m_position.y, m_pageDev.cy, m_lineDev.cy, limit.y);
     const BOOL moved = OnScrollBy(CSize(dx, dy), doScroll);
+    // Painted at once: while the slider is dragged, messages come faster than the loop gets to painting.
     if (moved && doScroll) {
         UpdateWindow();
     }
@@ -265,6 +267,7 @@ void CScrollView::OnVScroll(UINT code, UINT position, CScrollBar* bar) {
 }
 
 BOOL CScrollView::OnMouseWheel(UINT flags, short delta, CPoint point) {
+    // With a modifier key the wheel is the host's, mostly for zooming.
     if ((flags & (MK_SHIFT | MK_CONTROL)) != 0 || limits().y == 0) {
         return CView::OnMouseWheel(flags, delta, point);
     }
@@ -324,20 +327,36 @@ void CScrollView::OnSize(UINT type, int cx, int cy) {
 
 void CScrollView::ResizeParentToFit(BOOL shrinkOnly) {
     CFrameWnd* frame = GetParentFrame();
-    CRect client;
-    GetClientRect(&client);
     if (!frame || m_mapMode == 0) {
         return;
     }
+    CRect client;
+    CSize bars(0, 0);
+    if (m_mapMode != scaleToFit) {
+        // The bars that are there now may be gone in the new size, so what counts is the view without them.
+        const bool updating = std::exchange(m_updatingBars, true);
+        ShowScrollBar(SB_BOTH, TRUE);
+        GetClientRect(&client);
+        bars = client.Size();
+        ShowScrollBar(SB_BOTH, FALSE);
+        GetClientRect(&client);
+        bars = client.Size() - bars;
+        m_updatingBars = updating;
+    } else {
+        GetClientRect(&client);
+    }
     CSize wanted = m_mapMode == scaleToFit ? m_totalLog : m_totalDev;
     if (shrinkOnly) {
-        wanted.cx = std::min<LONG>(wanted.cx, client.Width());
-        wanted.cy = std::min<LONG>(wanted.cy, client.Height());
+        // Where a bar stays, its room is needed beside the drawing, or the other bar would come as well.
+        const CSize besides(wanted.cy > client.Height() ? bars.cx : 0, wanted.cx > client.Width() ? bars.cy : 0);
+        wanted.cx = std::min<LONG>(wanted.cx + besides.cx, client.Width());
+        wanted.cy = std::min<LONG>(wanted.cy + besides.cy, client.Height());
     }
     CRect outer;
     frame->GetWindowRect(&outer);
     frame->SetWindowPos(nullptr, 0, 0, outer.Width() + wanted.cx - client.Width(),
                         outer.Height() + wanted.cy - client.Height(), SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+    UpdateBars(); // the size may be the old one
 }
 
 void CScrollView::FillOutsideRect(CDC* dc, CBrush* brush) {

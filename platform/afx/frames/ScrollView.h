@@ -36,9 +36,11 @@ public:
     CSize GetTotalSize() const;
     /// Mapping mode and sizes as they were told; pixels for the sizes of a step.
     void GetDeviceScrollSizes(int& mapMode, SIZE& total, SIZE& page, SIZE& line) const;
-    /// Fills the screen-size frame: makes the frame as large as the drawing.
+    /// Makes the frame around the view so large that the whole drawing is seen; needs sizes and a frame.
+    /// @param shrinkOnly TRUE never enlarges the frame
     void ResizeParentToFit(BOOL shrinkOnly = TRUE);
-    /// The colour around a drawing smaller than the view is that of the view; it is drawn by OnDraw's own means.
+    /// Fills the part of the view right of and below a drawing that is smaller, for OnEraseBkgnd of a host that gives
+    /// the paper another colour. `dc` counts in pixels of the client area.
     void FillOutsideRect(CDC* dc, CBrush* brush);
 
     void OnPrepareDC(CDC* dc, CPrintInfo* info = nullptr) override;

@@ -65,6 +65,7 @@ CDocument* CSingleDocTemplate::OpenDocumentFile(LPCSTR path, BOOL makeVisible) {
         return nullptr;
     }
     if (!opened.frame) {
+        // A frame that fails takes its view with it; the document must not delete itself with that.
         const BOOL autoDelete = std::exchange(opened.document->m_bAutoDelete, FALSE);
         opened.frame = CreateNewFrame(opened.document, nullptr);
         opened.document->m_bAutoDelete = autoDelete;

@@ -33,24 +33,38 @@ QStatusBar* barOf(const CWnd& bar) {
     return state ? qobject_cast<QStatusBar*>(state->widget()) : nullptr;
 }
 
-QList<QLabel*> labelsOf(const QStatusBar& bar) {
-    return bar.findChildren<QLabel*>(QStringLiteral("pane"), Qt::FindDirectChildrenOnly);
-}
-
-QLabel* labelAt(const CWnd& bar, int index) {
-    const QStatusBar* widget = barOf(bar);
-    const auto labels = widget ? labelsOf(*widget) : QList<QLabel*>();
-    return index >= 0 && index < labels.size() ? labels[index] : nullptr;
-}
-
 /// A pane's label takes the space it is given, whatever its text.
 class PaneLabel : public QLabel {
 public:
-    using QLabel::QLabel;
+    explicit PaneLabel(QWidget* parent) : QLabel(parent) {
+        setObjectName(QStringLiteral("pane"));
+    }
+    bool stretches = false;
     QSize minimumSizeHint() const override {
         return {0, QLabel::minimumSizeHint().height()};
     }
 };
+
+struct PaneShape {
+    bool border = true;
+    bool stretch = false;
+    int width = 0;
+};
+
+/// The labels in the order of their panes.
+QList<PaneLabel*> labelsOf(const QStatusBar& bar) {
+    QList<PaneLabel*> labels;
+    for (QLabel* label : bar.findChildren<QLabel*>(QStringLiteral("pane"), Qt::FindDirectChildrenOnly)) {
+        labels.append(static_cast<PaneLabel*>(label));
+    }
+    return labels;
+}
+
+QLabel* labelAt(const CWnd& bar, int index) {
+    const QStatusBar* widget = barOf(bar);
+    const auto labels = widget ? labelsOf(*widget) : QList<PaneLabel*>();
+    return index >= 0 && index < labels.size() ? labels[index] : nullptr;
+}
 
 } // namespace
 
@@ -79,32 +93,55 @@ BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
         }
     }
     m_nCount = count;
-    rebuild();
+    showPanes();
     return TRUE;
 }
 
-void CStatusBar::rebuild() {
+namespace {
+
+/// Gives a label the look of its pane. The toolkit takes the share of free space with the place in the row only, so a
+/// label whose share changes is taken out and put back.
+void shapePane(QStatusBar& bar, PaneLabel& label, int index, const PaneShape& shape) {
+    label.setFrameStyle(shape.border ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
+    label.setMinimumWidth(shape.stretch ? 0 : shape.width);
+    label.setMaximumWidth(shape.stretch ? QWIDGETSIZE_MAX : shape.width);
+    if (std::exchange(label.stretches, shape.stretch) != shape.stretch) {
+        bar.removeWidget(&label);
+        bar.insertWidget(index, &label, shape.stretch ? 1 : 0);
+        label.show();
+    }
+}
+
+PaneLabel* addLabel(QStatusBar& bar) {
+    auto* label = new PaneLabel(&bar);
+    label->setTextFormat(Qt::PlainText);
+    label->setContentsMargins(2, 0, 2, 0);
+    bar.addWidget(label);
+    return label;
+}
+
+} // namespace
+
+/// Brings the labels into line with the panes. Panes change while the user looks at them and assistive programs hold
+/// them, so labels stay as long as their pane does.
+void CStatusBar::showPanes() {
     QStatusBar* widget = barOf(*this);
     if (!widget) {
         return;
     }
     guarded([&] {
-        for (QLabel* old : labelsOf(*widget)) {
-            widget->removeWidget(old);
-            delete old;
+        auto labels = labelsOf(*widget);
+        while (labels.size() > static_cast<qsizetype>(m_panes.size())) {
+            delete labels.takeLast();
         }
-        for (const Pane& pane : m_panes) {
-            auto* label = new PaneLabel(widget);
-            label->setObjectName(QStringLiteral("pane"));
-            label->setTextFormat(Qt::PlainText);
-            label->setContentsMargins(2, 0, 2, 0);
+        while (labels.size() < static_cast<qsizetype>(m_panes.size())) {
+            labels.append(addLabel(*widget));
+        }
+        for (int i = 0; i < m_nCount; ++i) {
+            const Pane& pane = m_panes[static_cast<std::size_t>(i)];
             const bool border = (pane.style & (SBPS_NOBORDERS | SBPS_POPOUT)) == 0;
-            label->setFrameStyle(border ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
             const bool stretch = (pane.style & SBPS_STRETCH) != 0;
-            widget->addWidget(label, stretch ? 1 : 0);
-            if (!stretch) {
-                label->setFixedWidth(pane.width + paneBorder);
-            }
+            shapePane(*widget, *labels[i], i, {border, stretch, pane.width + paneBorder});
         }
     });
     for (int i = 0; i < m_nCount; ++i) {
@@ -171,7 +208,7 @@ void CStatusBar::SetPaneStyle(int index, UINT style) {
     }
     const UINT old = std::exchange(m_panes[static_cast<std::size_t>(index)].style, style);
     if (((old ^ style) & ~UINT{SBPS_DISABLED}) != 0) {
-        rebuild();
+        showPanes();
     } else if (old != style) {
         showPane(index);
     }
@@ -195,7 +232,7 @@ void CStatusBar::SetPaneInfo(int index, UINT id, UINT style, int width) {
     pane.id = id;
     pane.style = style;
     pane.width = width;
-    rebuild();
+    showPanes();
 }
 
 CSize CStatusBar::CalcFixedLayout(BOOL stretch, BOOL horizontal) {
@@ -217,12 +254,7 @@ LRESULT CStatusBar::OnGetText(WPARAM size, LPARAM buffer) {
     if (size == 0 || buffer == 0) {
         return 0;
     }
-    const std::size_t room = std::min<std::size_t>(size - 1, static_cast<std::size_t>(text.GetLength()));
-    const std::size_t length = tvx::text::characterStart(text.View(), room);
-    auto* target = reinterpret_cast<char*>(buffer);
-    std::memcpy(target, text.GetString(), length);
-    target[length] = '\0';
-    return static_cast<LRESULT>(length);
+    return static_cast<LRESULT>(tvx::text::copyCut(text.View(), reinterpret_cast<char*>(buffer), size));
 }
 
 // --- states ---

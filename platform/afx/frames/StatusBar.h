@@ -82,7 +82,7 @@ private:
     bool has(int index) const {
         return index >= 0 && index < static_cast<int>(m_panes.size());
     }
-    void rebuild();
+    void showPanes();
     void showPane(int index);
     std::vector<Pane> m_panes;
 };

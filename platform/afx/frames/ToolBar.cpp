@@ -212,6 +212,7 @@ void CToolBar::showState(int index) {
         action->setVisible((button.style & TBBS_HIDDEN) == 0);
         action->setEnabled((button.style & TBBS_DISABLED) == 0);
         action->setCheckable((button.style & TBBS_CHECKBOX) != 0);
+        // The toolkit's buttons have two states; the third one looks pressed.
         action->setChecked((button.style & (TBBS_CHECKED | TBBS_INDETERMINATE)) != 0);
     });
 }

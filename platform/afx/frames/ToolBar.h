@@ -76,12 +76,14 @@ public:
     UINT GetButtonStyle(int index) const;
     /// Changes style and state of a button. An index outside the bar changes nothing.
     void SetButtonStyle(int index, UINT style);
-    /// Command, style and picture of a button; of a separator the picture's number is its width in pixels.
+    /// Command, style and picture of a button; of a separator the picture's number is its width in pixels. All are 0
+    /// for an index outside the bar.
     void GetButtonInfo(int index, UINT& id, UINT& style, int& image) const;
     /// Changes a button. A separator of a given width makes room for a control, which the host creates as the bar's
     /// child at GetItemRect.
     void SetButtonInfo(int index, UINT id, UINT style, int image);
-    /// Text below (or instead of) the picture; empty for none.
+    /// Shows a text below the picture of a button; null or empty takes it away. As soon as one button has a text, all
+    /// make room for one. FALSE for an index outside the bar.
     BOOL SetButtonText(int index, LPCSTR text);
     /// Text of a button; empty when it has none and for an index outside the bar.
     CString GetButtonText(int index) const;

@@ -31,6 +31,7 @@ BOOL CView::PreCreateWindow(CREATESTRUCT& cs) {
         cs.lpszClass = AfxRegisterWndClass(CS_DBLCLKS, ::LoadCursorA(nullptr, IDC_ARROW),
                                            reinterpret_cast<HBRUSH>(static_cast<INT_PTR>(COLOR_WINDOW + 1)));
     }
+    // Frames ask for a plain border; views wear it sunken.
     if ((cs.style & WS_BORDER) != 0) {
         cs.dwExStyle |= WS_EX_CLIENTEDGE;
         cs.style &= ~WS_BORDER;
@@ -80,10 +81,6 @@ void CView::OnPaint() {
     CPaintDC dc(this);
     OnPrepareDC(&dc);
     OnDraw(&dc);
-}
-
-BOOL CView::IsSelected(const CObject*) const {
-    return FALSE;
 }
 
 CScrollBar* CView::GetScrollBarCtrl(int bar) const {

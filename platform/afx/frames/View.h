@@ -46,8 +46,6 @@ public:
     virtual void OnActivateView(BOOL activate, CView* activated, CView* deactivated);
     /// Called when the frame is activated or deactivated.
     virtual void OnActivateFrame(UINT state, CFrameWnd* frame);
-    /// Whether an object is selected in the view. The base answers FALSE.
-    virtual BOOL IsSelected(const CObject* item) const;
 
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
     void PostNcDestroy() override;

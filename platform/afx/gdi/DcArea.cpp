@@ -266,7 +266,7 @@ BOOL CDC::DrawIcon(int x, int y, HICON icon) {
 }
 
 BOOL CDC::DrawIcon(POINT point, HICON icon) {
-    return drawIcon(m_hDC, pointOf(point), icon, {});
+    return drawIcon(m_hDC, toQt(point), icon, {});
 }
 
 BOOL DrawIconEx(HDC dc, int x, int y, HICON icon, int width, int height, UINT, HBRUSH background, UINT) {

@@ -55,7 +55,7 @@ QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
     QPolygon result;
     result.reserve(count);
     for (int i = 0; i < count; ++i) {
-        result << mapping.toPixel(pointOf(points[i]));
+        result << mapping.toPixel(toQt(points[i]));
     }
     return result;
 }
@@ -275,7 +275,7 @@ BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, Arc
     if (box.isEmpty()) {
         return TRUE;
     }
-    const ArcPixels arc(box, shape.mapping().toPixel(pointOf(rays[0])), shape.mapping().toPixel(pointOf(rays[1])),
+    const ArcPixels arc(box, shape.mapping().toPixel(toQt(rays[0])), shape.mapping().toPixel(toQt(rays[1])),
                         shape.dc->state.arcDirection);
     QPolygon outline = arc.pixels();
     if (kind == ArcShape::Pie) {

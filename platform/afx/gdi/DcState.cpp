@@ -237,7 +237,7 @@ void convert(HDC handle, Conversion conversion, std::span<POINT> points) {
         return;
     }
     for (POINT& point : points) {
-        point = asPoint((mapping->*conversion)(pointOf(point)));
+        point = asPoint((mapping->*conversion)(toQt(point)));
     }
 }
 
@@ -297,7 +297,7 @@ int CDC::GetClipBox(RECT* rect) const {
     // The screen has no pixels to open, but what fits on it is what can be asked about it.
     const QRegion clip =
         dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.canvas.clip;
-    *rect = rectOf(clip.boundingRect());
+    *rect = fromQt(clip.boundingRect());
     DPtoLP(rect);
     return regionKind(clip);
 }

@@ -1,9 +1,9 @@
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/detail/DeviceContext.h"
 #include "platform/afx/gdi/detail/TextLine.h"
+#include "platform/base/Text.h"
 
 #include <cmath>
-#include <cstring>
 #include <numbers>
 #include <optional>
 #include <vector>
@@ -220,10 +220,7 @@ int CDC::GetTextFace(int count, LPSTR name) const {
     if (count <= 0) {
         return 0;
     }
-    const int copied = std::min(length, count - 1);
-    std::memcpy(name, static_cast<LPCSTR>(face), static_cast<std::size_t>(copied));
-    name[copied] = '\0';
-    return copied;
+    return static_cast<int>(tvx::text::copyCut(face.View(), name, static_cast<std::size_t>(count)));
 }
 
 BOOL CDC::GetCharWidth(UINT first, UINT last, int* widths) const {

@@ -3,6 +3,7 @@
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/detail/DeviceContext.h"
 #include "platform/afx/gdi/detail/HandleMap.h"
+#include "platform/base/Text.h"
 
 #include <algorithm>
 #include <array>
@@ -277,7 +278,7 @@ HFONT CreateFontA(int height, int width, int escapement, int orientation, int we
     font.lfQuality = static_cast<BYTE>(quality);
     font.lfPitchAndFamily = static_cast<BYTE>(pitchAndFamily);
     if (faceName) {
-        std::memcpy(font.lfFaceName, faceName, strnlen(faceName, LF_FACESIZE - 1));
+        tvx::text::copyCut(faceName, font.lfFaceName, LF_FACESIZE);
     }
     return CreateFontIndirectA(&font);
 }

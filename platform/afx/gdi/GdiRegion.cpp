@@ -120,7 +120,7 @@ int CRgn::GetRgnBox(RECT* rect) const {
     if (!own || !rect) {
         return RGN_ERROR;
     }
-    *rect = rectOf(own->region.boundingRect());
+    *rect = fromQt(own->region.boundingRect());
     return regionKind(own->region);
 }
 
@@ -131,5 +131,5 @@ BOOL CRgn::PtInRegion(int x, int y) const {
 
 BOOL CRgn::RectInRegion(const RECT* rect) const {
     const auto own = findTool<RegionObject>(m_hObject);
-    return own && rect && own->region.intersects(rectOf(*rect));
+    return own && rect && own->region.intersects(toQt(*rect));
 }

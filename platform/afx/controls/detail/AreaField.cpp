@@ -23,6 +23,7 @@ public:
         count(0, 0);
         connectStoring(m_edit->document(), &QTextDocument::contentsChange, m_edit,
                        [this](int position, int, int added) { count(position, added); });
+        // Tab moves on by the keys of dialogs; what comes through to here is text.
         m_edit->setTabChangesFocus(false);
         m_edit->setLineWrapMode(options.wraps ? QPlainTextEdit::WidgetWidth : QPlainTextEdit::NoWrap);
         m_edit->setVerticalScrollBarPolicy(policy(options.verticalBar));
@@ -51,6 +52,7 @@ public:
     }
     void insert(const QString& text, Undo undo) override {
         if (undo == Undo::Forget) {
+            // With undo switched off the change is not recorded at all: logs that grow by the line would pay for each.
             forgetUndo();
             m_edit->setUndoRedoEnabled(false);
         }
@@ -62,6 +64,7 @@ public:
         }
     }
     void undo() override {
+        // One step each way, as hosts know it: undone twice, the change is there again.
         m_edit->document()->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
     }
     bool canUndo() const override {
@@ -128,6 +131,7 @@ public:
         return {block.position() + line.textStart(), block.text().mid(line.textStart(), line.textLength())};
     }
     int firstVisibleLine() const override {
+        // The bar of this widget counts lines, not pixels.
         return m_edit->verticalScrollBar()->value();
     }
     void scrollLines(int lines) override {
@@ -153,6 +157,7 @@ private:
     }
     /// Counts the paragraphs again that a change has touched.
     void count(int position, int added) {
+        // The toolkit's count of characters has the end of the last paragraph in it, where no block can be found.
         const QTextDocument& document = *m_edit->document();
         const int last = document.findBlock(std::min(position + added, document.characterCount() - 1)).blockNumber();
         const int behind = document.blockCount() - 1 - last;

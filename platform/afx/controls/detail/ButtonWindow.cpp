@@ -27,7 +27,7 @@ protected:
     void paintEvent(QPaintEvent* event) override {
         if (m_window.type() == BS_OWNERDRAW) {
             QPainter painter(this);
-            m_window.paintByOwner(painter);
+            storing([&] { m_window.paintByOwner(painter); });
             return;
         }
         Base::paintEvent(event);
@@ -96,6 +96,7 @@ QWidget* ButtonWindow::makeWidget(QWidget* parent) {
     case BS_AUTORADIOBUTTON:
         made = pushLike ? static_cast<QAbstractButton*>(new ButtonFace<QPushButton>(parent, *this))
                         : new ButtonFace<QRadioButton>(parent, *this);
+        // The toolkit takes all siblings for one group; groups of dialogs end at the next WS_GROUP.
         made->setAutoExclusive(false);
         break;
     default:
@@ -121,6 +122,7 @@ void ButtonWindow::widgetMade() {
 
 void ButtonWindow::applyType() {
     if (auto* push = dynamic_cast<QPushButton*>(widget())) {
+        // Which button Enter presses is decided by the keys of dialogs, not by the toolkit.
         push->setAutoDefault(false);
         push->setFlat((style() & BS_FLAT) != 0);
         showAsDefault(type() == BS_DEFPUSHBUTTON);
@@ -138,6 +140,7 @@ void ButtonWindow::applyText() {
     const bool picture = (style() & (BS_ICON | BS_BITMAP)) != 0;
     QString shown = picture ? QString() : text();
     if ((style() & BS_MULTILINE) != 0) {
+        // Beside the text there is the mark, or the edge of the button.
         const bool marked = dynamic_cast<QPushButton*>(widget()) == nullptr;
         shown = wrapped(shown, widget()->fontMetrics(), widget()->width() - (marked ? 20 : 8));
     }
@@ -299,6 +302,7 @@ LRESULT ButtonWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case BM_GETIMAGE:
         return reinterpret_cast<LRESULT>(m_picture);
     case WM_LBUTTONDBLCLK:
+        // For the other kinds the second press is one more click, which the toolkit makes of it.
         passEvent(*this, message);
         if (isRadio() || type() == BS_OWNERDRAW || (style() & BS_NOTIFY) != 0) {
             notify(BN_DOUBLECLICKED);
@@ -311,19 +315,10 @@ LRESULT ButtonWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 // --- painting ---
 
-bool ButtonWindow::paintByOwner(QPainter& painter) {
-    const HWND self = handle();
-    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
-    DRAWITEMSTRUCT item{};
-    item.CtlType = ODT_BUTTON;
-    item.rcItem = fromQt(widget()->rect());
-    item.itemState = (button()->isDown() ? ODS_SELECTED : 0U) | (widget()->hasFocus() ? ODS_FOCUS : 0U) |
-                     (isEnabled() ? 0U : ODS_DISABLED) | (m_shownAsDefault ? ODS_DEFAULT : 0U);
-    drawing.draw(item);
-    if (from(self)) {
-        painter.drawImage(0, 0, drawing.image());
-    }
-    return true;
+void ButtonWindow::paintByOwner(QPainter& painter) {
+    Control::paintByOwner(painter, ODT_BUTTON,
+                          (button()->isDown() ? ODS_SELECTED : 0U) | (widget()->hasFocus() ? ODS_FOCUS : 0U) |
+                              (m_shownAsDefault ? ODS_DEFAULT : 0U));
 }
 
 /// The title interrupts the frame's upper edge, as templates are drawn for; the toolkit's styles put it above.

@@ -41,8 +41,8 @@ public:
     void click();
     /// Shows or takes away the look of the default button.
     void showAsDefault(bool isDefault);
-    /// Draws an owner-drawn button; false when the toolkit is to draw it.
-    bool paintByOwner(QPainter& painter);
+    /// Has the parent draw an owner-drawn button.
+    void paintByOwner(QPainter& painter);
     void paintGroupBox(QPainter& painter) const;
 
 protected:

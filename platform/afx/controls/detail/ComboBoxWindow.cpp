@@ -5,6 +5,7 @@
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/base/Text.h"
 
 #include <QAbstractItemView>
 #include <QComboBox>
@@ -14,9 +15,8 @@
 #include <QStringListModel>
 #include <QStylePainter>
 #include <QStyledItemDelegate>
+#include <QValidator>
 #include <QWheelEvent>
-
-#include <cstring>
 
 namespace tvx::afx {
 
@@ -59,6 +59,19 @@ private:
 
 namespace {
 
+/// Refuses what the user types beyond a number of bytes. The toolkit's own limit counts units of UTF-16, and cuts what
+/// the program sets as well.
+class ByteLimit : public QValidator {
+public:
+    ByteLimit(QObject* parent, int limit) : QValidator(parent), m_limit(limit) {}
+    State validate(QString& input, int&) const override {
+        return hostBytes(input) <= m_limit ? Acceptable : Invalid;
+    }
+
+private:
+    int m_limit;
+};
+
 class ItemDelegate : public QStyledItemDelegate {
 public:
     ItemDelegate(QObject* parent, ComboBoxWindow& window) : QStyledItemDelegate(parent), m_window(window) {}
@@ -72,7 +85,7 @@ public:
             return;
         }
         const UINT state = (option.state & QStyle::State_Selected) != 0 ? ODS_SELECTED : 0U;
-        painter->drawImage(option.rect, m_window.paintItem(index.row(), option.rect.size(), state));
+        storing([&] { painter->drawImage(option.rect, m_window.paintItem(index.row(), option.rect.size(), state)); });
     }
 
 private:
@@ -85,7 +98,7 @@ public:
     void showPopup() override {
         if (!m_open) {
             m_open = true;
-            m_window.listShown(true);
+            storing([this] { m_window.listShown(true); });
         }
         QComboBox::showPopup();
     }
@@ -93,7 +106,7 @@ public:
         QComboBox::hidePopup();
         if (m_open) {
             m_open = false;
-            m_window.listShown(false);
+            storing([this] { m_window.listShown(false); });
         }
     }
 
@@ -117,7 +130,7 @@ protected:
         const QRect field = style()->subControlRect(QStyle::CC_ComboBox, &option, QStyle::SC_ComboBoxEditField, this);
         if (currentIndex() >= 0) {
             const UINT state = ODS_COMBOBOXEDIT | (hasFocus() ? ODS_FOCUS : 0U) | (isEnabled() ? 0U : ODS_DISABLED);
-            painter.drawImage(field, m_window.paintItem(currentIndex(), field.size(), state));
+            storing([&] { painter.drawImage(field, m_window.paintItem(currentIndex(), field.size(), state)); });
         }
     }
     void wheelEvent(QWheelEvent* event) override {
@@ -144,7 +157,9 @@ const WindowClassEntry comboBoxEntry("ComboBox", &makeComboBox);
 } // namespace
 
 ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
-    : Control(cs), m_model(std::make_unique<ComboModel>(*this)), m_openHeight(cs.cy) {}
+    : ListControl(cs, {ODT_COMBOBOX, CBS_OWNERDRAWFIXED | CBS_OWNERDRAWVARIABLE, CBS_HASSTRINGS}),
+      m_model(std::make_unique<ComboModel>(*this)),
+      m_openHeight(cs.cy) {}
 
 ComboBoxWindow::~ComboBoxWindow() {
     if (box()) {
@@ -158,11 +173,13 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     face->setModel(m_model.get());
     m_noLines = new QStringListModel(face);
     face->setItemDelegate(new ItemDelegate(face, *this));
+    // By default the toolkit adds to the lines what is typed and ended with Enter.
     face->setInsertPolicy(QComboBox::NoInsert);
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
     connectStoring(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
     if (isEditable()) {
         face->setEditable(true);
+        // The toolkit would complete what is typed with the first line that begins so.
         face->setCompleter(nullptr);
         connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
             const HWND self = handle();
@@ -194,6 +211,7 @@ void ComboBoxWindow::widgetMade() {
 
 void ComboBoxWindow::fontChanged() {
     Control::fontChanged();
+    // The lines of an owner-drawn box are as high as the owner answered, whatever the font.
     if (!isOwnerDrawn()) {
         m_itemHeight = widget()->fontMetrics().height() + 2;
     }
@@ -201,18 +219,14 @@ void ComboBoxWindow::fontChanged() {
 }
 
 void ComboBoxWindow::measure() {
-    MEASUREITEMSTRUCT item{};
-    item.CtlType = ODT_COMBOBOX;
-    item.CtlID = static_cast<UINT>(id());
-    item.itemHeight = static_cast<UINT>(m_itemHeight);
-    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
-    m_itemHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    m_itemHeight = askHeight(m_itemHeight);
     applyHeights();
 }
 
 void ComboBoxWindow::applyHeights() {
     const int closed = std::max(widget()->fontMetrics().height(), m_itemHeight) + 8;
     guarded([&] {
+        // The height that hosts give is that of the open list; closed, a box is as high as its line.
         widget()->setFixedHeight(closed);
         box()->setMaxVisibleItems(std::clamp((m_openHeight - closed) / m_itemHeight, 1, 100));
     });
@@ -234,6 +248,7 @@ QString ComboBoxWindow::text() const {
 }
 
 void ComboBoxWindow::setText(const QString& text) {
+    // The text of a box that is not typed into is its chosen line, and changes with the choice only.
     if (box() && isEditable()) {
         guarded([&] { field()->setText(text); });
     }
@@ -248,12 +263,6 @@ UINT ComboBoxWindow::dialogCode(const MSG* msg) const {
 
 UINT ComboBoxWindow::colorMessage() const {
     return isEditable() ? WM_CTLCOLOREDIT : WM_CTLCOLORLISTBOX;
-}
-
-void ComboBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
 }
 
 void ComboBoxWindow::focusMoved(bool got) {
@@ -276,6 +285,7 @@ void ComboBoxWindow::listShown(bool shown) {
         notify(CBN_DROPDOWN);
         return;
     }
+    // A list that closes without a choice tells so before it tells that it closes.
     if (!m_chosenWhileOpen) {
         notify(CBN_SELENDCANCEL);
     }
@@ -302,12 +312,7 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     if (index < -1 || index > m_items.count()) {
         return CB_ERR;
     }
-    ListItems::Item item;
-    if (hasStrings()) {
-        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
-    } else {
-        item.data = text;
-    }
+    ListItems::Item item = newItem(text);
     int place = 0;
     guarded([&] {
         // The toolkit chooses the first line of an empty box by itself; here only the user and the program choose.
@@ -328,15 +333,6 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     return place;
 }
 
-void ComboBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || !parent()) {
-        return;
-    }
-    DELETEITEMSTRUCT gone{ODT_COMBOBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
-                          static_cast<ULONG_PTR>(m_items.at(index).data)};
-    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
-}
-
 LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
     if (!m_items.isValid(index)) {
         return CB_ERR;
@@ -344,6 +340,7 @@ LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
     const int row = static_cast<int>(index);
     tellDeleted(row);
     guarded([&] {
+        // The toolkit would choose a neighbour of the line that goes; here nothing is chosen then.
         const int current = box()->currentIndex();
         m_model->removeAt(row, [&] { m_items.remove(row); });
         box()->setCurrentIndex(current == row ? -1 : current > row ? current - 1 : current);
@@ -352,9 +349,7 @@ LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
 }
 
 void ComboBoxWindow::reset() {
-    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-        tellDeleted(row);
-    }
+    tellAllDeleted();
     guarded([&] {
         m_model->replaceAll([&] { m_items.clear(); });
         box()->setCurrentIndex(-1);
@@ -362,28 +357,6 @@ void ComboBoxWindow::reset() {
             field()->clear();
         }
     });
-}
-
-LRESULT ComboBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
-    const auto start = static_cast<int>(after);
-    if (!hasStrings()) {
-        return m_items.findData(text, start);
-    }
-    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : CB_ERR;
-}
-
-LRESULT ComboBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
-    const auto row = static_cast<int>(index);
-    if (!m_items.isValid(row)) {
-        return CB_ERR;
-    }
-    const auto& item = m_items.at(row);
-    if (!hasStrings()) {
-        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
-        return sizeof(item.data);
-    }
-    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
-    return static_cast<LRESULT>(item.text.size());
 }
 
 LRESULT ComboBoxWindow::setCurrent(LONG_PTR index) {
@@ -414,18 +387,11 @@ LRESULT ComboBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, boo
     case CB_GETLBTEXT:
         return copyText(wParam, lParam);
     case CB_GETLBTEXTLEN:
-        if (!m_items.isValid(row)) {
-            return CB_ERR;
-        }
-        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+        return textLength(wParam);
     case CB_GETITEMDATA:
-        return m_items.isValid(row) ? m_items.at(row).data : CB_ERR;
+        return itemData(wParam);
     case CB_SETITEMDATA:
-        if (!m_items.isValid(row)) {
-            return CB_ERR;
-        }
-        m_items.at(row).data = lParam;
-        return CB_OKAY;
+        return setItemData(wParam, lParam);
     case CB_FINDSTRING:
         return find(wParam, lParam, ListItems::Match::Prefix);
     case CB_FINDSTRINGEXACT:
@@ -478,7 +444,10 @@ LRESULT ComboBoxWindow::fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bo
     }
     const QString text = field()->text();
     if (message == CB_LIMITTEXT) {
-        field()->setMaxLength(wParam == 0 ? 32767 : static_cast<int>(std::min<WPARAM>(wParam, 32767)));
+        const QValidator* old = field()->validator();
+        const int limit = text::clampToInt32(static_cast<LONG_PTR>(wParam));
+        field()->setValidator(limit > 0 ? new ByteLimit(field(), limit) : nullptr);
+        delete old;
         return TRUE;
     }
     if (message == CB_SETEDITSEL) {
@@ -512,9 +481,8 @@ LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
         return 0;
     }
     if (message == WM_DESTROY) {
-        for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-            tellDeleted(row);
-        }
+        // The owner frees its data while the control can still be asked about its lines.
+        tellAllDeleted();
         return 0;
     }
     return Control::defaultProc(message, wParam, lParam);

@@ -3,8 +3,7 @@
 /// @file
 /// Combo boxes.
 
-#include "platform/afx/controls/detail/Control.h"
-#include "platform/afx/controls/detail/ListItems.h"
+#include "platform/afx/controls/detail/ListControl.h"
 
 class QAbstractItemModel;
 class QComboBox;
@@ -16,7 +15,7 @@ class ComboModel;
 
 /// The "ComboBox" class. Its height in templates and calls is that of the opened box; closed it is one line high. A box
 /// whose list is always open (CBS_SIMPLE) opens its list like the others.
-class TVX_PLATFORM_API ComboBoxWindow : public Control {
+class TVX_PLATFORM_API ComboBoxWindow : public ListControl {
 public:
     explicit ComboBoxWindow(const CREATESTRUCT& cs);
     ~ComboBoxWindow() override;
@@ -27,17 +26,8 @@ public:
     UINT dialogCode(const MSG* msg) const override;
     UINT colorMessage() const override;
 
-    bool isOwnerDrawn() const {
-        return (style() & (CBS_OWNERDRAWFIXED | CBS_OWNERDRAWVARIABLE)) != 0;
-    }
-    bool hasStrings() const {
-        return !isOwnerDrawn() || (style() & CBS_HASSTRINGS) != 0;
-    }
     bool isEditable() const {
         return (style() & 3U) != CBS_DROPDOWNLIST;
-    }
-    const ListItems& items() const {
-        return m_items;
     }
     int itemHeight() const {
         return m_itemHeight;
@@ -52,7 +42,6 @@ protected:
     void widgetMade() override;
     void fontChanged() override;
     void focusMoved(bool got) override;
-    void applyColors(QPalette& palette, const QColor& text, const QColor& background) const override;
 
 private:
     QComboBox* box() const;
@@ -63,14 +52,10 @@ private:
     LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
     LRESULT removeItem(LONG_PTR index);
     void reset();
-    void tellDeleted(int index);
-    LRESULT find(WPARAM after, LPARAM text, ListItems::Match match) const;
-    LRESULT copyText(WPARAM index, LPARAM buffer) const;
     LRESULT setCurrent(LONG_PTR index);
     LRESULT itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     LRESULT listProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     LRESULT fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
-    ListItems m_items;
     std::unique_ptr<ComboModel> m_model;
     QAbstractItemModel* m_noLines = nullptr; ///< Of the widget, for the time after this window.
     int m_itemHeight = 15;

@@ -8,6 +8,7 @@
 
 #include <QApplication>
 #include <QFrame>
+#include <QPainter>
 
 namespace tvx::afx {
 
@@ -58,6 +59,7 @@ void Control::fontChanged() {
 }
 
 void Control::notify(int code) {
+    // What the handler changes may change the states of commands.
     armIdle();
     if (parent() && !isDestroyed()) {
         SendMessageA(parent()->handle(), WM_COMMAND, MAKEWPARAM(id(), code), reinterpret_cast<LPARAM>(handle()));
@@ -91,6 +93,7 @@ Control::Colors Control::chosenColors() const {
         return {};
     }
     Colors colors{true, fromColorRef(context->state.textColor).rgb(), 0};
+    // Any other brush, such as the hollow one, leaves the background transparent.
     if (brush->description.lbStyle == BS_SOLID) {
         const bool system = brush->systemColor >= 0;
         colors.background = fromColorRef(system ? GetSysColor(brush->systemColor) : brush->description.lbColor).rgb();
@@ -101,6 +104,7 @@ Control::Colors Control::chosenColors() const {
 void Control::askColors() {
     const HWND self = handle();
     const Colors colors = chosenColors();
+    // This runs in each paint request; setting a palette asks for another one.
     if (!from(self) || colors == m_colors) {
         return;
     }
@@ -117,6 +121,12 @@ void Control::applyColors(QPalette& palette, const QColor& text, const QColor& b
     palette.setColor(QPalette::Active, QPalette::WindowText, text);
     palette.setColor(QPalette::Inactive, QPalette::WindowText, text);
     palette.setColor(QPalette::Window, background);
+}
+
+void Control::applyFieldColors(QPalette& palette, const QColor& text, const QColor& background) {
+    palette.setColor(QPalette::Active, QPalette::Text, text);
+    palette.setColor(QPalette::Inactive, QPalette::Text, text);
+    palette.setColor(QPalette::Base, background);
 }
 
 LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
@@ -185,11 +195,18 @@ QImage OwnerPainting::image() const {
     return bitmapImage(m_bitmap);
 }
 
-std::string resourceText(const char* name) {
-    if (!name || !IS_INTRESOURCE(name)) {
-        return name ? name : "";
+void Control::paintByOwner(QPainter& painter, UINT type, UINT state) {
+    const HWND self = handle();
+    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
+    DRAWITEMSTRUCT item{};
+    item.CtlType = type;
+    item.rcItem = fromQt(widget()->rect());
+    item.itemState = state | (isEnabled() ? 0U : ODS_DISABLED);
+    drawing.draw(item);
+    // The owner may have ended the control while it drew.
+    if (from(self)) {
+        painter.drawImage(0, 0, drawing.image());
     }
-    return "#" + std::to_string(reinterpret_cast<std::uintptr_t>(name));
 }
 
 // --- controls that bring no behaviour yet ---

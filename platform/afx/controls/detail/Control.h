@@ -45,6 +45,8 @@ protected:
     }
     /// How the colours that the parent chose are put into a palette.
     virtual void applyColors(QPalette& palette, const QColor& text, const QColor& background) const;
+    /// The same for what is typed into or chosen from: its text stands on the palette's base.
+    static void applyFieldColors(QPalette& palette, const QColor& text, const QColor& background);
     /// Tells the parent of the keyboard's coming and going, where the kind has a notification for it.
     virtual void focusMoved(bool got) {}
     /// Whether the user can give the control the keyboard.
@@ -56,6 +58,9 @@ protected:
         return (style() & WS_BORDER) != 0 || (exStyle() & (WS_EX_CLIENTEDGE | WS_EX_STATICEDGE)) != 0;
     }
     void askColors();
+    /// Has the parent draw the whole control.
+    /// @param type ODT_... @param state ODS_..., without ODS_DISABLED
+    void paintByOwner(QPainter& painter, UINT type, UINT state);
 
 private:
     struct Colors {
@@ -90,8 +95,5 @@ private:
     HGDIOBJ m_oldBitmap = nullptr;
     HGDIOBJ m_oldFont = nullptr;
 };
-
-/// The name in a control's text that stands for a resource: "#123" for a number.
-std::string resourceText(const char* name);
 
 } // namespace tvx::afx

@@ -56,6 +56,7 @@ void EditWindow::widgetMade() {
     const QString text = Control::text();
     applyStyle();
     m_passwordChar = (style() & ES_PASSWORD) != 0 ? '*' : 0;
+    // The parent is not told of the text that the control is created with.
     ++m_quiet;
     m_field->setText(isMultiLine() ? plainLines(text) : firstLine(plainLines(text)));
     --m_quiet;
@@ -75,6 +76,7 @@ void EditWindow::applyStyle() {
                               : (style() & ES_CENTER) != 0 ? Qt::AlignHCenter
                                                            : Qt::AlignLeft);
         QPalette palette;
+        // A field that cannot be typed into looks like the window around it.
         if (isReadOnly()) {
             palette.setColor(QPalette::Base, QApplication::palette(widget()).color(QPalette::Window));
         }
@@ -140,9 +142,7 @@ UINT EditWindow::colorMessage() const {
 }
 
 void EditWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
+    applyFieldColors(palette, text, background);
 }
 
 // --- typing ---
@@ -154,6 +154,7 @@ void EditWindow::insert(QString text, Source source, Undo undo) {
     } else if ((style() & ES_LOWERCASE) != 0) {
         text = text.toLower();
     }
+    // The limit is the user's: the program may set and insert longer texts.
     if (source == Source::User) {
         const TextRange selection = m_field->selection();
         const int replaced = m_field->bytesAt(selection.last()) - m_field->bytesAt(selection.first());
@@ -276,6 +277,7 @@ LRESULT EditWindow::selectedBytes(WPARAM start, LPARAM end) const {
     if (end != 0) {
         *reinterpret_cast<DWORD*>(end) = static_cast<DWORD>(last);
     }
+    // Both places in one number where they fit; who has longer texts passes pointers.
     return first > 0xFFFF || last > 0xFFFF ? -1 : MAKELONG(first, last);
 }
 
@@ -387,6 +389,7 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     }
     switch (message) {
     case WM_GETTEXTLENGTH:
+        // The field counts along, so that a long text is not converted for its length alone.
         return m_field->bytes();
     case WM_CHAR:
         if (!typed(message, wParam)) {

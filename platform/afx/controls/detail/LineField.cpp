@@ -24,6 +24,7 @@ public:
     }
     void setText(const QString& text) override {
         m_edit->setText(text);
+        // A new text is shown from its beginning; the toolkit would show its end.
         m_edit->setCursorPosition(0);
     }
     TextRange selection() const override {
@@ -53,12 +54,14 @@ public:
         }
     }
     void undo() override {
+        // One step each way, as hosts know it: undone twice, the change is there again.
         m_edit->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
     }
     bool canUndo() const override {
         return m_edit->isUndoAvailable() || m_edit->isRedoAvailable();
     }
     void forgetUndo() override {
+        // The toolkit forgets its history with a new text only, and caret and mark of change with it.
         const TextRange range = selection();
         const bool modified = m_edit->isModified();
         const QSignalBlocker quiet(m_edit);

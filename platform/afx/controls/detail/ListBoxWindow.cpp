@@ -14,8 +14,6 @@
 #include <QStyle>
 #include <QStyleOption>
 
-#include <cstring>
-
 namespace tvx::afx {
 
 namespace {
@@ -23,6 +21,8 @@ namespace {
 /// Distance of a line's text from the left edge.
 constexpr int textIndent = 3;
 
+/// Between these overrides and the place of ours below stand frames of the toolkit, which cannot be unwound: what a
+/// host's handler throws is stored.
 class ListArea : public QAbstractScrollArea {
 public:
     ListArea(QWidget* parent, ListBoxWindow& window) : QAbstractScrollArea(parent), m_window(window) {
@@ -33,23 +33,26 @@ public:
 protected:
     void paintEvent(QPaintEvent* event) override {
         QPainter painter(viewport());
-        m_window.paint(painter, event->rect());
+        storing([&] { m_window.paint(painter, event->rect()); });
     }
     void mousePressEvent(QMouseEvent* event) override {
-        m_window.press(*event, false);
+        storing([&] { m_window.press(*event, false); });
     }
     void mouseDoubleClickEvent(QMouseEvent* event) override {
-        m_window.press(*event, true);
+        storing([&] { m_window.press(*event, true); });
     }
     void mouseMoveEvent(QMouseEvent* event) override {
-        m_window.drag(*event);
+        storing([&] { m_window.drag(*event); });
     }
     void keyPressEvent(QKeyEvent* event) override {
-        event->setAccepted(m_window.key(*event));
+        // A key whose handler failed is done with: the toolkit must not offer it to the parent as well.
+        bool taken = true;
+        storing([&] { taken = m_window.key(*event); });
+        event->setAccepted(taken);
     }
     void resizeEvent(QResizeEvent* event) override {
         QAbstractScrollArea::resizeEvent(event);
-        m_window.applyRange();
+        storing([this] { m_window.applyRange(); });
     }
     void focusInEvent(QFocusEvent* event) override {
         QAbstractScrollArea::focusInEvent(event);
@@ -84,6 +87,9 @@ const WindowClassEntry listBoxEntry("ListBox", &makeListBox);
 
 // --- making ---
 
+ListBoxWindow::ListBoxWindow(const CREATESTRUCT& cs)
+    : ListControl(cs, {ODT_LISTBOX, LBS_OWNERDRAWFIXED | LBS_OWNERDRAWVARIABLE, LBS_HASSTRINGS}) {}
+
 QWidget* ListBoxWindow::makeWidget(QWidget* parent) {
     m_area = new ListArea(parent, *this);
     return m_area;
@@ -97,6 +103,7 @@ void ListBoxWindow::widgetMade() {
 }
 
 void ListBoxWindow::applyBars() {
+    // With this style the bars stay when there is nothing to scroll, so that lines keep their width.
     const bool always = (style() & LBS_DISABLENOSCROLL) != 0;
     const auto policy = [&](DWORD bit) {
         return (style() & bit) == 0 ? Qt::ScrollBarAlwaysOff : always ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAsNeeded;
@@ -113,6 +120,7 @@ void ListBoxWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 
 void ListBoxWindow::fontChanged() {
     Control::fontChanged();
+    // The lines of an owner-drawn list are as high as the owner answered, whatever the font.
     if (!isOwnerDrawn()) {
         m_rowHeight = m_area->fontMetrics().height() + 2;
     }
@@ -121,12 +129,7 @@ void ListBoxWindow::fontChanged() {
 
 /// The parent says how high its lines are.
 void ListBoxWindow::measure() {
-    MEASUREITEMSTRUCT item{};
-    item.CtlType = ODT_LISTBOX;
-    item.CtlID = static_cast<UINT>(id());
-    item.itemHeight = static_cast<UINT>(m_area->fontMetrics().height() + 2);
-    SendMessageA(parent()->handle(), WM_MEASUREITEM, item.CtlID, reinterpret_cast<LPARAM>(&item));
-    m_rowHeight = std::clamp(static_cast<int>(item.itemHeight), 1, 1000);
+    m_rowHeight = askHeight(m_area->fontMetrics().height() + 2);
     applyRange();
 }
 
@@ -140,6 +143,7 @@ QRect ListBoxWindow::clientRect() const {
 
 void ListBoxWindow::setWindowRect(const QRect& rect) {
     QRect whole = rect;
+    // Lists show whole lines only, unless the style says that they need not.
     if ((style() & LBS_NOINTEGRALHEIGHT) == 0 && m_area) {
         const int frame = 2 * m_area->frameWidth();
         const int rows = (rect.height() - frame) / m_rowHeight;
@@ -156,12 +160,6 @@ void ListBoxWindow::focusMoved(bool got) {
     if ((style() & LBS_NOTIFY) != 0) {
         notify(got ? LBN_SETFOCUS : LBN_KILLFOCUS);
     }
-}
-
-void ListBoxWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
-    palette.setColor(QPalette::Active, QPalette::Text, text);
-    palette.setColor(QPalette::Inactive, QPalette::Text, text);
-    palette.setColor(QPalette::Base, background);
 }
 
 // --- rows and scrolling ---
@@ -208,6 +206,7 @@ int ListBoxWindow::visibleRows() const {
 }
 
 int ListBoxWindow::rowAt(int y) const {
+    // A point above the area means the line before the first one seen, so that dragging there scrolls.
     const int row = top() + (y >= 0 ? y / m_rowHeight : -1);
     return std::clamp(row, -1, m_items.count() - 1);
 }
@@ -229,12 +228,7 @@ void ListBoxWindow::showRow(int index) {
 // --- lines ---
 
 LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
-    ListItems::Item item;
-    if (hasStrings()) {
-        item.text = text != 0 ? reinterpret_cast<const char*>(text) : "";
-    } else {
-        item.data = text;
-    }
+    ListItems::Item item = newItem(text);
     if (index < -1 || index > m_items.count()) {
         return LB_ERR;
     }
@@ -246,16 +240,6 @@ LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     return place;
 }
 
-/// Hosts free what the data of an owner-drawn line points to when they are told of its end.
-void ListBoxWindow::tellDeleted(int index) {
-    if (!isOwnerDrawn() || !parent()) {
-        return;
-    }
-    DELETEITEMSTRUCT gone{ODT_LISTBOX, static_cast<UINT>(id()), static_cast<UINT>(index), handle(),
-                          static_cast<ULONG_PTR>(m_items.at(index).data)};
-    SendMessageA(parent()->handle(), WM_DELETEITEM, gone.CtlID, reinterpret_cast<LPARAM>(&gone));
-}
-
 LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
     if (!m_items.isValid(index)) {
         return LB_ERR;
@@ -263,6 +247,7 @@ LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
     const int row = static_cast<int>(index);
     tellDeleted(row);
     m_items.remove(row);
+    // The selection goes with its line, while the keyboard stays on the line that takes the place.
     m_current = m_current == row ? -1 : m_current > row ? m_current - 1 : m_current;
     m_caret = std::min(m_caret > row ? m_caret - 1 : m_caret, m_items.count() - 1);
     m_anchor = std::min(m_anchor > row ? m_anchor - 1 : m_anchor, m_items.count() - 1);
@@ -271,34 +256,10 @@ LRESULT ListBoxWindow::removeRow(LONG_PTR index) {
 }
 
 void ListBoxWindow::reset() {
-    for (int row = 0; isOwnerDrawn() && row < m_items.count(); ++row) {
-        tellDeleted(row);
-    }
+    tellAllDeleted();
     m_items.clear();
     m_current = m_caret = m_anchor = -1;
     contentChanged();
-}
-
-LRESULT ListBoxWindow::find(WPARAM after, LPARAM text, ListItems::Match match) const {
-    const auto start = static_cast<int>(after);
-    if (!hasStrings()) {
-        return m_items.findData(text, start);
-    }
-    return text != 0 ? m_items.find(reinterpret_cast<const char*>(text), start, match) : LB_ERR;
-}
-
-LRESULT ListBoxWindow::copyText(WPARAM index, LPARAM buffer) const {
-    const auto row = static_cast<int>(index);
-    if (!m_items.isValid(row)) {
-        return LB_ERR;
-    }
-    const auto& item = m_items.at(row);
-    if (!hasStrings()) {
-        std::memcpy(reinterpret_cast<void*>(buffer), &item.data, sizeof(item.data));
-        return sizeof(item.data);
-    }
-    std::memcpy(reinterpret_cast<void*>(buffer), item.text.c_str(), item.text.size() + 1);
-    return static_cast<LRESULT>(item.text.size());
 }
 
 LRESULT ListBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
@@ -318,18 +279,11 @@ LRESULT ListBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, bool
     case LB_GETTEXT:
         return copyText(wParam, lParam);
     case LB_GETTEXTLEN:
-        if (!m_items.isValid(row)) {
-            return LB_ERR;
-        }
-        return hasStrings() ? static_cast<LRESULT>(m_items.at(row).text.size()) : LRESULT{sizeof(LONG_PTR)};
+        return textLength(wParam);
     case LB_GETITEMDATA:
-        return m_items.isValid(row) ? m_items.at(row).data : LB_ERR;
+        return itemData(wParam);
     case LB_SETITEMDATA:
-        if (!m_items.isValid(row)) {
-            return LB_ERR;
-        }
-        m_items.at(row).data = lParam;
-        return LB_OKAY;
+        return setItemData(wParam, lParam);
     case LB_FINDSTRING:
         return find(wParam, lParam, ListItems::Match::Prefix);
     case LB_FINDSTRINGEXACT:
@@ -433,6 +387,7 @@ LRESULT ListBoxWindow::selectionProc(UINT message, WPARAM wParam, LPARAM lParam,
         if (!isMultiple()) {
             return LB_ERR;
         }
+        // A first line behind the last one means: take these lines out.
         selectRange(row, last, row <= last);
         return LB_OKAY;
     }
@@ -513,6 +468,7 @@ LRESULT ListBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return 0;
     }
     if (message == WM_DESTROY) {
+        // The owner frees its data while the control can still be asked about its lines.
         reset();
         return 0;
     }
@@ -549,6 +505,7 @@ void ListBoxWindow::moveCaret(int index, bool extend, bool toggle) {
     }
     showRow(index);
     refresh();
+    // A multiple selection is told of at each step: the same line may have come in or gone out.
     if (isMultiple() || before != m_current) {
         tellSelection();
     }
@@ -559,7 +516,7 @@ void ListBoxWindow::press(const QMouseEvent& event, bool twice) {
         return;
     }
     const int row = rowAt(event.position().toPoint().y());
-    m_pressed = true;
+    // The first of two presses has selected the line already.
     if (twice) {
         if ((style() & LBS_NOTIFY) != 0) {
             notify(LBN_DBLCLK);
@@ -581,6 +538,7 @@ void ListBoxWindow::drag(const QMouseEvent& event) {
 }
 
 bool ListBoxWindow::search(const QString& text) {
+    // From behind the keyboard's line and around, so that the same letter pressed again goes on.
     const int found = m_items.find(fromQt(text), m_caret, ListItems::Match::Prefix);
     if (found >= 0) {
         moveCaret(found, false, false);
@@ -589,6 +547,7 @@ bool ListBoxWindow::search(const QString& text) {
 }
 
 bool ListBoxWindow::key(const QKeyEvent& event) {
+    // One line less than is seen: the last line stays in sight as the first.
     const int page = std::max(visibleRows() - 1, 1);
     const int last = m_items.count() - 1;
     int target = m_caret;
@@ -666,6 +625,7 @@ void ListBoxWindow::paintRow(QPainter& painter, int index) const {
 }
 
 void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
+    // The owner may end the list while it draws a line.
     const HWND self = handle();
     OwnerPainting drawing(*this, m_area->viewport()->size(), m_area->viewport()->palette().color(QPalette::Base));
     for (int row = first; row <= last && row < m_items.count() && from(self); ++row) {

@@ -3,8 +3,7 @@
 /// @file
 /// List boxes.
 
-#include "platform/afx/controls/detail/Control.h"
-#include "platform/afx/controls/detail/ListItems.h"
+#include "platform/afx/controls/detail/ListControl.h"
 
 class QAbstractScrollArea;
 class QKeyEvent;
@@ -15,10 +14,9 @@ namespace tvx::afx {
 /// The "ListBox" class: lines of one height over a flat table, so that filling costs no measuring and painting only
 /// looks at what is seen. Several columns (LBS_MULTICOLUMN) and lines of different heights are not offered: such lists
 /// show one column, and the height asked for line 0.
-class TVX_PLATFORM_API ListBoxWindow : public Control {
+class TVX_PLATFORM_API ListBoxWindow : public ListControl {
 public:
-    using Control::Control;
-    ~ListBoxWindow() override = default;
+    explicit ListBoxWindow(const CREATESTRUCT& cs);
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     QWidget* clientWidget() const override;
     QRect clientRect() const override;
@@ -41,7 +39,6 @@ protected:
     void fontChanged() override;
     void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
     void focusMoved(bool got) override;
-    void applyColors(QPalette& palette, const QColor& text, const QColor& background) const override;
 
 private:
     bool isMultiple() const {
@@ -49,12 +46,6 @@ private:
     }
     bool isExtended() const {
         return (style() & LBS_EXTENDEDSEL) != 0;
-    }
-    bool isOwnerDrawn() const {
-        return (style() & (LBS_OWNERDRAWFIXED | LBS_OWNERDRAWVARIABLE)) != 0;
-    }
-    bool hasStrings() const {
-        return !isOwnerDrawn() || (style() & LBS_HASSTRINGS) != 0;
     }
     void applyBars();
     void measure();
@@ -69,9 +60,6 @@ private:
     LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
     LRESULT removeRow(LONG_PTR index);
     void reset();
-    void tellDeleted(int index);
-    LRESULT find(WPARAM after, LPARAM text, ListItems::Match match) const;
-    LRESULT copyText(WPARAM index, LPARAM buffer) const;
     LRESULT setCurrent(LONG_PTR index);
     LRESULT setSelected(bool selected, LONG_PTR index);
     void selectRange(int first, int last, bool selected);
@@ -88,14 +76,12 @@ private:
     LRESULT layoutProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
 
     QAbstractScrollArea* m_area = nullptr;
-    ListItems m_items;
     int m_current = -1; ///< the selected line of a single selection
     int m_caret = -1;
     int m_anchor = -1;
     int m_rowHeight = 15;
     int m_extent = 0;
     std::vector<int> m_tabStops; ///< pixels
-    bool m_pressed = false;
 };
 
 } // namespace tvx::afx

@@ -8,6 +8,7 @@ namespace tvx::afx {
 
 namespace {
 
+// Start and prime of the FNV-1a hash: a few instructions a byte, and texts are compared only where it agrees.
 constexpr std::uint32_t hashStart = 2166136261U;
 
 std::uint32_t hashStep(std::uint32_t hash, char byte) {
@@ -20,6 +21,7 @@ std::uint32_t keyOf(std::string_view text) {
     std::uint32_t key = hashStart;
     for (const char byte : text) {
         if (static_cast<unsigned char>(byte) >= 0x80) {
+            // Folding beyond ASCII may change the length, so it is done for the whole text.
             key = hashStart;
             for (const char folded : text::foldCase(text)) {
                 key = hashStep(key, folded);

@@ -62,10 +62,12 @@ void ScrollBarWindow::setInfo(const SCROLLINFO& info) {
     now.nPage = (info.fMask & SIF_PAGE) != 0 ? info.nPage : now.nPage;
     now.nPos = (info.fMask & SIF_POS) != 0 ? info.nPos : now.nPos;
     const int page = static_cast<int>(now.nPage);
+    // Kept, because the toolkit's range does not tell it any more.
     m_max = now.nMax;
     m_page = page;
     guarded([&] {
         bar()->setPageStep(std::max(page, 1));
+        // The platform's range holds the page that is seen; the toolkit's ends with the last position.
         bar()->setRange(now.nMin, std::max(now.nMin, now.nMax - std::max(page - 1, 0)));
         bar()->setValue(now.nPos);
     });

@@ -23,7 +23,7 @@ public:
 protected:
     void paintEvent(QPaintEvent*) override {
         QPainter painter(this);
-        m_window.paint(painter);
+        storing([&] { m_window.paint(painter); }); // an owner-drawn one asks the host
     }
 
 private:
@@ -94,6 +94,7 @@ LRESULT StaticWindow::setPicture(UINT kind, HANDLE picture) {
         setStyle((style() & ~DWORD{SS_TYPEMASK}) | (kind == IMAGE_ICON ? SS_ICON : SS_BITMAP), exStyle());
     }
     const QImage image = this->picture();
+    // A control takes the size of its picture, unless it is to centre or to stretch it.
     const bool keepsSize = (style() & (SS_CENTERIMAGE | SS_REALSIZECONTROL)) != 0;
     if (!image.isNull() && !keepsSize) {
         guarded([&] { setWindowRect(QRect(windowRect().topLeft(), image.size())); });
@@ -179,26 +180,14 @@ void StaticWindow::paintText(QPainter& painter, const QRect& area) const {
                                     QPalette::WindowText);
 }
 
-void StaticWindow::paintByOwner(QPainter& painter) {
-    const HWND self = handle();
-    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
-    DRAWITEMSTRUCT item{};
-    item.CtlType = ODT_STATIC;
-    item.rcItem = fromQt(widget()->rect());
-    item.itemState = isEnabled() ? 0 : ODS_DISABLED;
-    drawing.draw(item);
-    if (from(self)) {
-        painter.drawImage(0, 0, drawing.image());
-    }
-}
-
 void StaticWindow::paint(QPainter& painter) {
     QRect area = widget()->rect();
+    // Only a parent that chose colours has them filled in; else what lies below is seen.
     if (widget()->testAttribute(Qt::WA_SetPalette)) {
         painter.fillRect(area, widget()->palette().color(QPalette::Window));
     }
     if (type() == SS_OWNERDRAW) {
-        paintByOwner(painter);
+        paintByOwner(painter, ODT_STATIC, 0);
         return;
     }
     if (hasBorder() || (style() & SS_SUNKEN) != 0) {

@@ -35,7 +35,6 @@ private:
     void paintText(QPainter& painter, const QRect& area) const;
     void paintPicture(QPainter& painter, const QRect& area) const;
     bool paintShape(QPainter& painter, const QRect& area) const;
-    void paintByOwner(QPainter& painter);
     QImage picture() const;
     void loadPicture();
     LRESULT setPicture(UINT kind, HANDLE picture);

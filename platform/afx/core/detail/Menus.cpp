@@ -7,7 +7,6 @@
 #include "platform/win/Resource.h"
 
 #include <algorithm>
-#include <cstring>
 
 namespace tvx::afx {
 
@@ -368,11 +367,7 @@ int GetMenuStringA(HMENU menu, UINT item, LPSTR buffer, int size, UINT flags) {
     if (!buffer || size <= 0) {
         return static_cast<int>(text.size());
     }
-    const std::size_t room = std::min(text.size(), static_cast<std::size_t>(size) - 1);
-    const std::size_t length = ::tvx::text::characterStart(text, room);
-    std::memcpy(buffer, text.data(), length);
-    buffer[length] = '\0';
-    return static_cast<int>(length);
+    return static_cast<int>(::tvx::text::copyCut(text, buffer, static_cast<std::size_t>(size)));
 }
 
 HMENU GetSubMenu(HMENU menu, int position) {

@@ -5,6 +5,7 @@
 
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/detail/Placement.h"
+#include "platform/afx/gdi/detail/Geometry.h"
 #include "platform/base/Export.h"
 
 #include <QPointer>
@@ -273,18 +274,5 @@ TVX_PLATFORM_API QWidget* peerOf(HWND handle);
 /// replacement character and comes back as the same byte.
 TVX_PLATFORM_API QString toQt(const char* text);
 TVX_PLATFORM_API std::string fromQt(const QString& text);
-
-inline QRect toQt(const RECT& rect) {
-    return {rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top};
-}
-inline RECT fromQt(const QRect& rect) {
-    return {rect.x(), rect.y(), rect.x() + rect.width(), rect.y() + rect.height()};
-}
-inline QPoint toQt(const POINT& point) {
-    return {point.x, point.y};
-}
-inline POINT fromQt(const QPoint& point) {
-    return {point.x(), point.y()};
-}
 
 } // namespace tvx::afx

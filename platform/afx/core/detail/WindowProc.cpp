@@ -35,10 +35,7 @@ LRESULT Window::textProc(UINT message, WPARAM wParam, LPARAM lParam) {
     if (!buffer || wParam == 0) {
         return 0;
     }
-    const std::size_t length = text::characterStart(content, std::min<std::size_t>(wParam - 1, content.size()));
-    std::memcpy(buffer, content.data(), length);
-    buffer[length] = '\0';
-    return static_cast<LRESULT>(length);
+    return static_cast<LRESULT>(text::copyCut(content, buffer, wParam));
 }
 
 /// What happens with mouse messages that nobody took: the widget gets the event, and what it does not know goes on.

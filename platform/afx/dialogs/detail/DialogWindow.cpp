@@ -22,6 +22,8 @@
 #include <QWindow>
 
 #include <cstdio>
+#include <set>
+#include <string>
 
 namespace tvx::afx {
 
@@ -97,6 +99,7 @@ void DialogWindow::setWindowRect(const QRect& rect) {
         Window::setWindowRect(rect);
         return;
     }
+    // The limits that keep the user from sizing it would keep the program from it as well.
     widget()->setMinimumSize(0, 0);
     widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
     Window::setWindowRect(rect);
@@ -105,6 +108,7 @@ void DialogWindow::setWindowRect(const QRect& rect) {
 
 QMargins DialogWindow::expectedBorders() const {
     const bool framed = !isChild() && (style() & WS_CAPTION) == WS_CAPTION;
+    // A frame is known only of a window that is shown; the owner's is like the dialog's will be.
     const QWidget* over = framed && owner() ? owner()->widget() : nullptr;
     const QWindow* native = over && over->isVisible() ? over->windowHandle() : nullptr;
     return native ? native->frameMargins() : QMargins();
@@ -262,13 +266,27 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 namespace {
 
+/// Tells of a class that a template names and nobody has registered: the host forgot to, or relies on a control that
+/// does not exist here. Once for each class, as dialogs are opened again and again.
+void tellUnknownClass(const std::string& className) {
+    static std::set<std::string> told;
+    if (told.insert(className).second) {
+        std::fprintf(stderr, "Nobody has registered the window class %s: dialogs show an empty pane instead.\n",
+                     className.c_str());
+    }
+}
+
 HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
     const std::string caption = captionOf(item.title);
     const QRect place = dialog.map(item.rect);
     CREATESTRUCT cs{};
     const bool known = findWindowClass(item.className.c_str()) != nullptr;
+    if (!known) {
+        tellUnknownClass(item.className);
+    }
     cs.lpszClass = known ? item.className.c_str() : emptyPaneClass;
     cs.lpszName = caption.c_str();
+    // It is shown when it has its size; and an empty pane takes no keyboard.
     const DWORD later = WS_VISIBLE | (known ? 0U : DWORD{WS_TABSTOP});
     cs.style = static_cast<LONG>((item.style | WS_CHILD) & ~later);
     const bool edge = hasClientEdge(item.className) && (item.style & WS_BORDER) != 0;

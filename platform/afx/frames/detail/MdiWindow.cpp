@@ -100,6 +100,7 @@ void MdiClientWindow::activate(MdiChildWindow* child) {
     if (child) {
         std::erase(m_history, child);
         m_history.push_back(child);
+        // The toolkit answers with the signal that ends in follow().
         m_activating = true;
         guarded([&] { area()->setActiveSubWindow(child->subWindow()); });
         m_activating = false;
@@ -152,9 +153,11 @@ void MdiClientWindow::step(int direction) {
 }
 
 QRect MdiClientWindow::nextPlace() {
+    // Far enough that the caption of the frame below can be read.
     constexpr int offset = 26;
     constexpr int steps = 8;
     QSize room = area()->viewport()->size();
+    // Before the main frame is shown the area still has the toolkit's size for new widgets.
     if (!area()->isVisible()) {
         room = room.expandedTo(topLevel()->clientRect().size());
     }

@@ -19,6 +19,7 @@ namespace fs = std::filesystem;
 
 /// What a file made by this process is allowed, by its mask.
 mode_t defaultMode() {
+    // The mask can be read by setting it only.
     const mode_t mask = umask(0);
     umask(mask);
     return 0666 & ~mask;

@@ -2,6 +2,7 @@
 
 #include "platform/afx/gdi/detail/Fonts.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
+#include "platform/afx/gdi/detail/Geometry.h"
 #include "platform/afx/gdi/detail/Mapping.h"
 
 #include <memory>
@@ -125,15 +126,5 @@ private:
     DeviceContext& m_context;
     bool m_open;
 };
-
-inline RECT rectOf(const QRect& rect) {
-    return {rect.left(), rect.top(), rect.left() + rect.width(), rect.top() + rect.height()};
-}
-inline QRect rectOf(const RECT& rect) {
-    return {QPoint(rect.left, rect.top), QSize(distance(rect.left, rect.right), distance(rect.top, rect.bottom))};
-}
-inline QPoint pointOf(POINT point) {
-    return {point.x, point.y};
-}
 
 } // namespace tvx::afx

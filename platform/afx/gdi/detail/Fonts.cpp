@@ -190,8 +190,7 @@ LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
     LOGFONTA font{};
     font.lfHeight = -scaled(tenthsOfPoint, pixelsPerInch, 720);
     font.lfCharSet = DEFAULT_CHARSET;
-    const std::size_t length = text::characterStart(faceName, std::min<std::size_t>(faceName.size(), LF_FACESIZE - 1));
-    std::memcpy(font.lfFaceName, faceName.data(), length);
+    text::copyCut(faceName, font.lfFaceName, LF_FACESIZE);
     return font;
 }
 

@@ -5,7 +5,10 @@
 #include "platform/afx/gdi/Gdi.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 
+#include <QAbstractItemView>
 #include <QClipboard>
+#include <QComboBox>
+#include <QLineEdit>
 #include <QPlainTextEdit>
 
 namespace {
@@ -134,6 +137,34 @@ TEST_F(EditTest, ReadOnlyOnesKeepTheirText) {
     });
 }
 
+TEST_F(EditTest, CutsForgetsAndHides) {
+    with(ES_AUTOHSCROLL, [&] {
+        control.SetWindowText("secret");
+        control.SetModify();
+        EXPECT_TRUE(control.GetModify());
+        control.SetModify(FALSE);
+        EXPECT_FALSE(control.GetModify());
+        control.SetSel(0, 3);
+        control.Cut();
+        EXPECT_EQ(textOf(&control), "ret");
+        EXPECT_EQ(QApplication::clipboard()->text(), "sec");
+        EXPECT_TRUE(control.CanUndo());
+        control.EmptyUndoBuffer();
+        EXPECT_FALSE(control.CanUndo());
+        const auto& field = dynamic_cast<const QLineEdit&>(*tvx::afx::peerOf(control.m_hWnd));
+        EXPECT_EQ(control.GetPasswordChar(), 0);
+        control.SetPasswordChar('#');
+        EXPECT_EQ(control.GetPasswordChar(), '#');
+        EXPECT_NE(field.displayText(), QString("ret"));
+        control.SetPasswordChar(0);
+        EXPECT_EQ(field.displayText(), QString("ret"));
+        control.LimitText(4);
+        control.SetSel(3, 3);
+        type("xy");
+        EXPECT_EQ(textOf(&control), "retx");
+    });
+}
+
 TEST_F(EditTest, ManyLinesEndInCarriageReturnAndLineFeed) {
     with(ES_MULTILINE | ES_WANTRETURN | ES_AUTOHSCROLL | ES_AUTOVSCROLL | WS_VSCROLL, [&] {
         control.SetWindowText("first\r\nzweite ä\r\n\r\nlast");
@@ -206,6 +237,8 @@ TEST_F(ListBoxTest, SortsAndFindsWithoutCase) {
         control.SetItemData(3, 77);
         EXPECT_EQ(control.DeleteString(1), 6);
         EXPECT_EQ(control.GetItemData(2), 77U);
+        EXPECT_EQ(control.SetItemDataPtr(0, &control), LB_OKAY);
+        EXPECT_EQ(control.GetItemDataPtr(0), &control);
         EXPECT_EQ(control.GetTextLen(99), LB_ERR);
         EXPECT_EQ(control.DeleteString(99), LB_ERR);
     });
@@ -243,6 +276,16 @@ TEST_F(ListBoxTest, ExtendedSelectionsFollowShiftAndControl) {
         EXPECT_EQ(selected(), (std::vector<int>{4}));
         key(Qt::Key_Up, Qt::ShiftModifier);
         EXPECT_EQ(selected(), (std::vector<int>{3, 4}));
+        EXPECT_EQ(control.GetAnchorIndex(), 4);
+        EXPECT_EQ(control.GetCaretIndex(), 3);
+        control.SetAnchorIndex(0);
+        control.SetCaretIndex(1);
+        EXPECT_EQ(selected(), (std::vector<int>{3, 4})) << "nothing is selected by that";
+        key(Qt::Key_Down, Qt::ShiftModifier);
+        EXPECT_EQ(selected(), (std::vector<int>{0, 1, 2}));
+        control.SetSel(0, FALSE);
+        control.SelItemRange(FALSE, 1, 2);
+        control.SelItemRange(TRUE, 3, 4);
         control.SelItemRange(TRUE, 0, 1);
         EXPECT_EQ(control.GetSelCount(), 4);
         control.SetSel(-1, FALSE);
@@ -277,6 +320,34 @@ TEST_F(ListBoxTest, ScrollsThroughManyLines) {
         EXPECT_FALSE(outside);
         key(Qt::Key_End);
         EXPECT_EQ(control.GetCurSel(), 999);
+    });
+}
+
+TEST_F(ListBoxTest, AlignsColumnsAtTabStops) {
+    lines = {".\t|"};
+    with(LBS_USETABSTOPS, [&] {
+        // The second column's place in the first line, in pixels behind the first one's.
+        const auto column = [&] {
+            const QImage image = tvx::afx::peerOf(control.m_hWnd)->grab().toImage();
+            for (int x = 15; x < image.width(); ++x) {
+                for (int y = 4; y < 12; ++y) {
+                    if (image.pixelColor(x, y).lightness() < 128) {
+                        return x - 3;
+                    }
+                }
+            }
+            return -1;
+        };
+        // A dialog unit of this font has 6 / 4 pixels.
+        const struct {
+            std::vector<int> stops;
+            int place;
+        } cases[] = {{{}, 48}, {{20}, 30}, {{16, 60}, 24}, {{1, 40}, 60}};
+        for (const auto& each : cases) {
+            std::vector<int> stops = each.stops;
+            EXPECT_TRUE(control.SetTabStops(static_cast<int>(stops.size()), stops.data()));
+            EXPECT_NEAR(column(), each.place, 4) << testing::PrintToString(stops);
+        }
     });
 }
 
@@ -353,6 +424,10 @@ TEST_F(ComboBoxTest, ChoosesOnlyWhatItIsTold) {
         EXPECT_EQ(textOf(&control), "pear"); // what is chosen stays chosen
         control.SetItemData(0, 42);
         EXPECT_EQ(control.GetItemData(0), 42U);
+        control.SetItemDataPtr(1, &control);
+        EXPECT_EQ(control.GetItemDataPtr(1), &control);
+        EXPECT_EQ(control.GetLBTextLen(1), 10);
+        EXPECT_EQ(control.GetLBTextLen(9), CB_ERR);
         EXPECT_EQ(control.SelectString(-1, "FI"), 2);
         control.DeleteString(2);
         EXPECT_EQ(control.GetCurSel(), CB_ERR);
@@ -373,7 +448,30 @@ TEST_F(ComboBoxTest, OpensItsList) {
         EXPECT_FALSE(control.GetDroppedState());
         EXPECT_EQ(told(CBN_CLOSEUP), 1);
         EXPECT_TRUE(dialog.IsWindowVisible());
+        control.SetItemHeight(0, 40);
+        EXPECT_EQ(control.GetItemHeight(2), 40);
+        control.GetWindowRect(&closed);
+        EXPECT_GE(closed.Height(), 40);
+        EXPECT_EQ(control.SetDroppedWidth(333), 333);
+        control.ShowDropDown();
+        EXPECT_GE(dynamic_cast<QComboBox&>(*tvx::afx::peerOf(control.m_hWnd)).view()->width(), 333);
+        control.ShowDropDown(FALSE);
     });
+}
+
+TEST_F(ComboBoxTest, LimitsTypingInBytesButNotTheProgram) {
+    with(CBS_DROPDOWN, [&] {
+        EXPECT_TRUE(control.LimitText(4));
+        type("aäöb");
+        EXPECT_EQ(textOf(&control), "aäb") << "two bytes, and one was left";
+        control.SetCurSel(1);
+        EXPECT_EQ(textOf(&control), "Apple");
+        EXPECT_TRUE(control.LimitText(0));
+        control.SetWindowText("");
+        type("longer");
+        EXPECT_EQ(textOf(&control), "longer");
+    });
+    with(CBS_DROPDOWNLIST, [&] { EXPECT_EQ(control.LimitText(3), CB_ERR); });
 }
 
 TEST_F(ComboBoxTest, TakesWhatIsTyped) {
@@ -420,6 +518,11 @@ TEST_F(ButtonTest, MarksChangeByThemselvesOnlyInAutomaticKinds) {
 
 TEST_F(ButtonTest, AreNotPressedWhileDisabled) {
     with(BS_PUSHBUTTON, [&] {
+        control.SetState(TRUE);
+        EXPECT_EQ(control.GetState() & BST_PUSHED, UINT{BST_PUSHED});
+        control.SetState(FALSE);
+        EXPECT_EQ(control.GetState() & BST_PUSHED, 0U);
+        EXPECT_EQ(told(BN_CLICKED), 0) << "only looks so";
         click(&control);
         key(Qt::Key_Space);
         EXPECT_EQ(told(BN_CLICKED), 2);
@@ -427,6 +530,30 @@ TEST_F(ButtonTest, AreNotPressedWhileDisabled) {
         click(&control);
         EXPECT_EQ(told(BN_CLICKED), 2);
     });
+}
+
+TEST(Icons, StandOnButtonsAndStatics) {
+    ScriptedDialog dialog(IDD_EMPTY);
+    CButton button;
+    CStatic picture;
+    const HICON icon = ::LoadIconA(nullptr, IDI_HAND);
+    dialog.prepare = [&] {
+        ASSERT_TRUE(button.Create("Label", shown | BS_ICON, CRect(10, 10, 60, 60), &dialog, 1));
+        ASSERT_TRUE(picture.Create("", WS_CHILD | WS_VISIBLE | SS_ICON, CRect(70, 10, 71, 11), &dialog, 2));
+    };
+    dialog.script = [&] {
+        EXPECT_EQ(button.SetIcon(icon), nullptr);
+        EXPECT_EQ(button.SetIcon(icon), icon);
+        const auto& widget = dynamic_cast<const QAbstractButton&>(*tvx::afx::peerOf(button.m_hWnd));
+        EXPECT_FALSE(widget.icon().isNull());
+        EXPECT_EQ(widget.text(), QString());
+        EXPECT_EQ(picture.SetIcon(icon), nullptr);
+        EXPECT_EQ(picture.GetIcon(), icon);
+        CRect rect;
+        picture.GetClientRect(&rect);
+        EXPECT_EQ(rect, CRect(0, 0, 32, 32)) << "as large as its picture";
+    };
+    dialog.DoModal();
 }
 
 TEST(GroupBox, LetsWhatItSurroundsBeUsed) {

@@ -2,8 +2,11 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 
+#include <QAbstractScrollArea>
 #include <QComboBox>
+#include <QKeyEvent>
 #include <QLineEdit>
+#include <QPaintEvent>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScrollBar>
@@ -27,7 +30,7 @@ public:
 
 protected:
     LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
-        if (fails && (message == WM_COMMAND || message == WM_HSCROLL)) {
+        if (fails && (message == WM_COMMAND || message == WM_HSCROLL || message == WM_DRAWITEM)) {
             throw std::runtime_error("failed");
         }
         return CWnd::WindowProc(message, wParam, lParam);
@@ -43,6 +46,12 @@ Part& part(const CWnd& window) {
         throw std::logic_error("the window has no such part");
     }
     return *found;
+}
+
+/// Has a widget handle an event past the place where all events are caught, as the toolkit's own widgets do among each
+/// other.
+void handle(QObject& widget, QEvent&& event) {
+    widget.event(&event);
 }
 
 struct Signal {
@@ -69,6 +78,20 @@ const Signal cases[] = {
      }},
     {"ChoiceField", "ComboBox", CBS_DROPDOWN,
      [](const CWnd& window) { part<QLineEdit>(window).textEdited(QStringLiteral("x")); }},
+    {"ChoiceOpened", "ComboBox", CBS_DROPDOWNLIST,
+     [](const CWnd& window) {
+         part<QComboBox>(window).showPopup();
+         part<QComboBox>(window).hidePopup();
+     }},
+    {"ListKey", "ListBox", LBS_NOTIFY,
+     [](const CWnd& window) {
+         window.SendMessage(LB_ADDSTRING, 0, reinterpret_cast<LPARAM>("one"));
+         handle(part<QAbstractScrollArea>(window), QKeyEvent(QEvent::KeyPress, Qt::Key_Down, Qt::NoModifier));
+     }},
+    {"OwnerDrawnButton", "Button", BS_OWNERDRAW,
+     [](const CWnd& window) { handle(part<QPushButton>(window), QPaintEvent(QRect(0, 0, 10, 10))); }},
+    {"OwnerDrawnStatic", "Static", SS_OWNERDRAW,
+     [](const CWnd& window) { handle(part<QWidget>(window), QPaintEvent(QRect(0, 0, 10, 10))); }},
 };
 
 } // namespace

@@ -96,6 +96,87 @@ TEST(DataExchange, KeepsTheDialogOpenUntilValuesAreInRange) {
     EXPECT_EQ(scale, 400);
 }
 
+TEST(DataExchange, ChecksEveryKindOfNumberAgainstItsRange) {
+    // Each takes the last value of its range, or the next one behind.
+    const struct {
+        void (*check)(CDataExchange* dx, bool inside);
+        const char* limit;
+    } cases[] = {
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxByte(dx, inside ? 250 : 251, 10, 250); }, "250"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxShort(dx, inside ? -7 : -8, -7, 7); }, "-7"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxLong(dx, inside ? -70000 : -70001, -70000, 0); }, "-70000"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxUInt(dx, 4000000000U - inside, 0, 3999999999U); },
+         "3999999999"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxDWord(dx, 4000000001U - inside, 1, 4000000000U); },
+         "4000000000"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxFloat(dx, inside ? 0.5F : 0.4999F, 0.5F, 1.0F); }, "0.5"},
+        {[](CDataExchange* dx, bool inside) { DDV_MinMaxDouble(dx, inside ? 2.25 : 2.2500001, -1, 2.25); }, "2.25"},
+    };
+    ExchangeDialog dialog;
+    dialog.script = [&] {
+        for (const auto& each : cases) {
+            bool inside = true;
+            dialog.exchange = [&](CDataExchange* dx) {
+                dx->PrepareEditCtrl(IDC_SCALE);
+                each.check(dx, inside);
+            };
+            EXPECT_TRUE(dialog.UpdateData(TRUE)) << each.limit;
+            inside = false;
+            EXPECT_TRUE(dialog.UpdateData(FALSE)) << "shown as it is";
+            BoxAnswer box;
+            EXPECT_FALSE(dialog.UpdateData(TRUE)) << each.limit;
+            EXPECT_NE(box.text.find(each.limit), std::string::npos) << box.text;
+            EXPECT_TRUE(waitForActive(dialog));
+        }
+    };
+    dialog.DoModal();
+}
+
+TEST(DataExchange, FindsLinesByWholeTextAndByPlace) {
+    ExchangeDialog dialog;
+    CScrollBar bar;
+    dialog.prepare = [&] {
+        ASSERT_TRUE(bar.Create(WS_CHILD | SBS_HORZ, CRect(0, 0, 50, 10), &dialog, 5000));
+        bar.SetScrollRange(0, 50);
+        for (const char* line : {"Dimensions", "Dim", "Border"}) {
+            dialog.SendDlgItemMessage(IDC_LAYERS, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line)); // sorted
+            dialog.SendDlgItemMessage(IDC_FONT, CB_ADDSTRING, 0, reinterpret_cast<LPARAM>(line));
+        }
+    };
+    dialog.script = [&] {
+        CString line = "Dim";
+        int index = 2;
+        CString font = "Dim";
+        int position = 20;
+        dialog.exchange = [&](CDataExchange* dx) {
+            DDX_LBStringExact(dx, IDC_LAYERS, line);
+            DDX_CBStringExact(dx, IDC_FONT, font);
+            DDX_Scroll(dx, 5000, position);
+        };
+        const auto chosen = [&](int id, UINT message) { return dialog.SendDlgItemMessage(id, message); };
+        EXPECT_TRUE(dialog.UpdateData(FALSE));
+        EXPECT_EQ(chosen(IDC_LAYERS, LB_GETCURSEL), 1);
+        EXPECT_EQ(chosen(IDC_FONT, CB_GETCURSEL), 1);
+        EXPECT_EQ(bar.GetScrollPos(), 20);
+        line = font = "Di"; // no line is only that, but the field takes any text
+        EXPECT_TRUE(dialog.UpdateData(FALSE));
+        EXPECT_EQ(chosen(IDC_LAYERS, LB_GETCURSEL), -1);
+        EXPECT_EQ(chosen(IDC_FONT, CB_GETCURSEL), -1);
+        bar.SetScrollPos(30);
+        EXPECT_TRUE(dialog.UpdateData(TRUE));
+        EXPECT_STREQ(line, "");
+        EXPECT_STREQ(font, "Di");
+        EXPECT_EQ(position, 30);
+        dialog.exchange = [&](CDataExchange* dx) { DDX_LBIndex(dx, IDC_LAYERS, index); };
+        EXPECT_TRUE(dialog.UpdateData(FALSE));
+        EXPECT_EQ(chosen(IDC_LAYERS, LB_GETCURSEL), 2);
+        dialog.SendDlgItemMessage(IDC_LAYERS, LB_SETCURSEL, 0);
+        EXPECT_TRUE(dialog.UpdateData(TRUE));
+        EXPECT_EQ(index, 0);
+    };
+    dialog.DoModal();
+}
+
 TEST(DataExchange, LimitsWhatCanBeTyped) {
     ExchangeDialog dialog;
     CString name;

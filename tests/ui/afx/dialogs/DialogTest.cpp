@@ -86,6 +86,20 @@ TEST(DialogTemplates, OpenWithControlsOfUnknownClassesAndFillBoxes) {
     dialog.DoModal();
 }
 
+TEST(DialogTemplates, TellOnceOfAClassThatNobodyRegistered) {
+    testing::internal::CaptureStderr();
+    for (int round = 0; round < 2; ++round) {
+        CDialog dialog;
+        EXPECT_TRUE(dialog.Create(IDD_STRANGE));
+        EXPECT_NE(dialog.GetDlgItem(IDC_NAME), nullptr) << "its pane stands there nevertheless";
+        dialog.DestroyWindow();
+    }
+    const std::string told = testing::internal::GetCapturedStderr();
+    const auto first = told.find("StrangeGauge");
+    EXPECT_NE(first, std::string::npos) << told;
+    EXPECT_EQ(told.find("StrangeGauge", first + 1), std::string::npos) << told;
+}
+
 TEST(DialogTemplates, AnswerMinusOneWhenMissing) {
     CDialog dialog(4711U);
     EXPECT_EQ(dialog.DoModal(), -1);
@@ -164,6 +178,26 @@ TEST(DialogKeys, EnterPressesTheFocusedButtonElseTheDefaultOne) {
         key(Qt::Key_Escape);
     };
     EXPECT_EQ(changed.DoModal(), IDCANCEL);
+}
+
+TEST(DialogKeys, ProgramsMoveTheKeyboardAsTheUserDoes) {
+    ShapeDialog dialog;
+    dialog.script = [&] {
+        dialog.SetDlgItemText(IDC_SCALE, "100");
+        dialog.GotoDlgCtrl(dialog.GetDlgItem(IDC_SCALE));
+        EXPECT_EQ(dialog.focus(), IDC_SCALE);
+        EXPECT_EQ(dialog.SendDlgItemMessage(IDC_SCALE, EM_GETSEL), MAKELONG(0, 3));
+        dialog.PrevDlgCtrl();
+        EXPECT_EQ(dialog.focus(), IDC_NAME);
+        dialog.PrevDlgCtrl();
+        EXPECT_EQ(dialog.focus(), ID_FILE_SAVE) << "around";
+        dialog.NextDlgCtrl();
+        EXPECT_EQ(dialog.focus(), IDC_NAME);
+        EXPECT_EQ(dialog.GetDefID(), static_cast<DWORD>(MAKELONG(IDOK, DC_HASDEFID)));
+        dialog.SetDefID(0);
+        EXPECT_EQ(dialog.GetDefID(), 0U);
+    };
+    dialog.DoModal();
 }
 
 TEST(DialogKeys, MnemonicsActOnce) {

@@ -2,6 +2,7 @@
 
 #define IDD_SHAPE 100
 #define IDD_EMPTY 101
+#define IDD_STRANGE 102
 
 #define IDC_NAME 1001
 #define IDC_SCALE 1002

@@ -5,6 +5,8 @@
 #include <QFileDialog>
 #include <QLineEdit>
 
+#include <stdexcept>
+
 using namespace frametest;
 
 using FileDialogs = FrameTest;
@@ -38,7 +40,7 @@ TEST_F(FileDialogs, OpenAnswersTheParts) {
                        "Boards (*.brd)|*.brd|All Files (*.*)|*.*||");
     const std::string folder = file("").string();
     dialog.m_ofn.lpstrInitialDir = folder.c_str();
-    dialog.m_ofn.lpstrTitle = "Pick a board";
+    dialog.GetOFN().lpstrTitle = "Pick a board";
     answer("some.picture.brd");
     ASSERT_EQ(dialog.DoModal(), IDOK);
     EXPECT_EQ(dialog.GetPathName(), driveName("some.picture.brd"));
@@ -80,6 +82,21 @@ TEST_F(FileDialogs, OverwritingIsAskedAbout) {
     answer("there.brd");
     EXPECT_EQ(dialog.DoModal(), IDOK);
     EXPECT_EQ(box.texts.size(), 1U);
+}
+
+TEST_F(FileDialogs, LetExceptionsOfTheHostsCheckOut) {
+    class Failing : public CFileDialog {
+    public:
+        Failing() : CFileDialog(FALSE) {}
+
+    protected:
+        BOOL OnFileNameOK() override {
+            throw std::runtime_error("no more names");
+        }
+    } dialog;
+    answer(file("any.brd").string());
+    EXPECT_THROW(dialog.DoModal(), std::runtime_error);
+    EXPECT_EQ(shownDialog(), nullptr);
 }
 
 TEST_F(FileDialogs, SaveAsAsksForTheName) {

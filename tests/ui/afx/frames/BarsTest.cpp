@@ -50,9 +50,30 @@ TEST_F(Bars, ButtonsFollowTheirCommands) {
     idle();
     EXPECT_TRUE(button(ID_TEST_GRID)->isChecked());
     view().grid = false;
-    idle();
+    CFrameWnd::UpdateAllFrames(frame);
+    EXPECT_TRUE(button(ID_TEST_GRID)->isChecked()) << "left out";
+    CFrameWnd::UpdateAllFrames(nullptr);
     EXPECT_FALSE(button(ID_TEST_GRID)->isChecked());
     EXPECT_EQ(CWnd::GetFocus(), &view()) << "buttons do not take the keyboard";
+}
+
+TEST_F(Bars, ButtonsAreToldAndAskedAbout) {
+    UINT id = 0;
+    UINT style = 0;
+    int image = 0;
+    frame->tools.GetButtonInfo(3, id, style, image);
+    EXPECT_EQ(std::tuple(id, style & 0xFFFF, image), std::tuple(UINT{ID_TEST_GRID}, UINT{TBBS_CHECKBOX}, 2));
+    frame->tools.GetButtonInfo(99, id, style, image);
+    EXPECT_EQ(std::tuple(id, style, image), std::tuple(0U, 0U, 0));
+    EXPECT_TRUE(frame->tools.SetButtonText(3, "Raster"));
+    EXPECT_FALSE(frame->tools.SetButtonText(99, "none"));
+    EXPECT_EQ(frame->tools.GetButtonText(3), "Raster");
+    EXPECT_EQ(frame->tools.GetButtonText(0), "");
+    EXPECT_EQ(button(ID_TEST_GRID)->text(), QString("Raster"));
+    EXPECT_EQ(button(ID_TEST_GRID)->toolButtonStyle(), Qt::ToolButtonTextUnderIcon);
+    frame->tools.SetHeight(90);
+    settle();
+    EXPECT_EQ(tools->height(), 90);
 }
 
 TEST_F(Bars, PlaceForAControl) {
@@ -137,5 +158,18 @@ TEST_F(Bars, StatusPanes) {
     status.GetItemRect(1, &wider);
     EXPECT_EQ(wider.Width(), second.Width() + 40);
     EXPECT_EQ(status.GetPaneText(1), "7 shapes");
+    status.SetPaneInfo(1, id, SBPS_STRETCH | SBPS_NOBORDERS, width);
+    status.SetPaneText(1, "8 shapes");
+    settle();
+    EXPECT_EQ(status.GetState()->widget()->findChildren<QLabel*>("pane"), labels) << "changed in place";
+    EXPECT_TRUE(labels[1]->isVisible());
+    EXPECT_EQ(labels[1]->text(), QString("8 shapes"));
+    EXPECT_EQ(labels[1]->frameShape(), QFrame::NoFrame);
+    EXPECT_GT(labels[1]->width(), wider.Width());
+    EXPECT_LT(labels[0]->x(), labels[1]->x());
+    EXPECT_LT(labels[1]->x(), labels[2]->x());
     EXPECT_EQ(titleOf(status), "Ready");
+    const UINT fewer[] = {ID_SEPARATOR, ID_INDICATOR_CAPS};
+    status.SetIndicators(fewer, 2);
+    EXPECT_EQ(status.GetState()->widget()->findChildren<QLabel*>("pane"), labels.first(2));
 }

@@ -46,6 +46,9 @@ TEST_F(Documents, ChangesReachTheOtherViews) {
     EXPECT_EQ(view().lastHint, 42);
     document().UpdateAllViews(&view(), 43);
     EXPECT_EQ(view().lastHint, 42) << "the sender knows";
+    document().SendInitialUpdate();
+    EXPECT_EQ(view().lastHint, 0);
+    EXPECT_EQ(view().updates, before + 2);
 }
 
 TEST_F(Documents, CloseAsksAboutChanges) {

@@ -75,6 +75,10 @@ TEST_F(Mdi, KeysWalkAndClose) {
     EXPECT_EQ(frame->MDIGetActive(), first);
     key(Qt::Key_F6, Qt::ControlModifier | Qt::ShiftModifier);
     EXPECT_EQ(frame->MDIGetActive(), third);
+    frame->MDINext();
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    frame->MDIPrev();
+    EXPECT_EQ(frame->MDIGetActive(), third);
     frame->MDIActivate(second);
     frame->MDIActivate(third);
     key(Qt::Key_F4, Qt::ControlModifier);
@@ -87,6 +91,19 @@ TEST_F(Mdi, KeysWalkAndClose) {
     EXPECT_EQ(barTexts(), QStringList({"File", "Edit", "View"}));
     EXPECT_EQ(titleOf(*frame), "Frame Test");
     EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
+}
+
+TEST_F(Mdi, ChildrenNeedNoDocument) {
+    CMDIChildWnd* board = open();
+    CMDIChildWnd* child = frame->CreateNewChild(RUNTIME_CLASS(CMDIChildWnd), IDR_TESTBOARD);
+    ASSERT_NE(child, nullptr);
+    EXPECT_EQ(frame->MDIGetActive(), child);
+    EXPECT_TRUE(child->IsWindowVisible());
+    EXPECT_EQ(child->GetActiveDocument(), nullptr);
+    EXPECT_EQ(barTexts(), QStringList({"Board", "Window"}));
+    EXPECT_EQ(frame->CreateNewChild(RUNTIME_CLASS(CFrameWnd), IDR_TESTBOARD), nullptr) << "no child frame";
+    child->SendMessage(WM_CLOSE);
+    EXPECT_EQ(frame->MDIGetActive(), board);
 }
 
 TEST_F(Mdi, WindowMenuListsTheChildren) {

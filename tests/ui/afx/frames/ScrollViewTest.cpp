@@ -87,6 +87,48 @@ TEST_F(Scrolling, ClimbsWithTheUnitsOfTheMapping) {
     EXPECT_EQ(view->GetDeviceScrollPosition(), CPoint(96, 96));
     EXPECT_EQ(view->GetScrollPosition(), CPoint(100, -100));
     EXPECT_EQ(view->GetTotalSize(), CSize(1000, 2000));
+    int mode = 0;
+    CSize total;
+    CSize page;
+    CSize line;
+    view->GetDeviceScrollSizes(mode, total, page, line);
+    EXPECT_EQ(mode, MM_LOENGLISH);
+    EXPECT_EQ(total, CSize(960, 1920));
+    EXPECT_EQ(page, CSize(96, 192));
+    EXPECT_EQ(line, CSize(9, 19));
+}
+
+TEST_F(Scrolling, FitsTheFrameToTheDrawing) {
+    const auto fitted = [this](CSize drawing, BOOL shrinkOnly) {
+        view->SetScrollSizes(MM_TEXT, drawing);
+        view->ResizeParentToFit(shrinkOnly);
+        settle();
+        CRect client;
+        view->GetClientRect(&client);
+        return client.Size();
+    };
+    EXPECT_EQ(fitted(CSize(200, 150), TRUE), CSize(200, 150));
+    EXPECT_EQ(fitted(CSize(400, 350), FALSE), CSize(400, 350));
+    EXPECT_EQ(fitted(CSize(200, 2000), TRUE).cx, 200) << "beside the bar that stays";
+    EXPECT_EQ(view->GetStyle() & (WS_HSCROLL | WS_VSCROLL), DWORD{WS_VSCROLL});
+    EXPECT_EQ(fitted(CSize(400, 350), FALSE), CSize(400, 350));
+    EXPECT_EQ(view->GetStyle() & (WS_HSCROLL | WS_VSCROLL), 0U) << "nothing is left to scroll";
+    // Beside and below a smaller drawing, and nowhere else.
+    view->SetScrollSizes(MM_TEXT, CSize(100, 50));
+    CClientDC screen(view);
+    CDC dc;
+    dc.CreateCompatibleDC(&screen);
+    CBitmap bitmap;
+    bitmap.CreateCompatibleBitmap(&screen, 400, 350);
+    CBitmap* before = dc.SelectObject(&bitmap);
+    dc.FillSolidRect(0, 0, 400, 350, RGB(255, 255, 255));
+    CBrush brush(RGB(255, 0, 0));
+    view->FillOutsideRect(&dc, &brush);
+    EXPECT_EQ(dc.GetPixel(99, 49), RGB(255, 255, 255));
+    EXPECT_EQ(dc.GetPixel(100, 49), RGB(255, 0, 0));
+    EXPECT_EQ(dc.GetPixel(99, 50), RGB(255, 0, 0));
+    EXPECT_EQ(dc.GetPixel(399, 349), RGB(255, 0, 0));
+    dc.SelectObject(before);
 }
 
 TEST_F(Scrolling, StaysInsideWhenTheDrawingShrinks) {
