@@ -339,22 +339,13 @@ TEST(Region, IsMovedReplacedAndFilled) {
                             "........\n"
                             "rrrr....\n"
                             "rrrr....\n");
-    CRgn none;
-    EXPECT_FALSE(dc.FillRgn(&none, &red));
-}
-
-TEST(Region, OfAPolygonFollowsTheFillMode) {
-    // A square drawn round twice, the second time inside of the first.
-    const POINT points[] = {{0, 0}, {9, 0}, {9, 9}, {0, 9}, {0, 0}, {3, 3}, {6, 3}, {6, 6}, {3, 6}, {3, 3}};
-    for (const int mode : {ALTERNATE, WINDING}) {
-        CRgn region;
-        ASSERT_TRUE(region.CreatePolygonRgn(points, 10, mode));
-        EXPECT_TRUE(region.PtInRegion(1, 5));
-        EXPECT_EQ(region.PtInRegion(4, 5), mode == WINDING);
-        EXPECT_FALSE(region.PtInRegion(9, 5));
-    }
-    CRgn none;
-    EXPECT_FALSE(none.CreatePolygonRgn(points, 1, WINDING));
+    CRgn triangle;
+    EXPECT_FALSE(dc.FillRgn(&triangle, &red));
+    const POINT corners[] = {{0, 0}, {8, 0}, {0, 8}};
+    EXPECT_FALSE(triangle.CreatePolygonRgn(corners, 1, ALTERNATE));
+    ASSERT_TRUE(triangle.CreatePolygonRgn(corners, 3, ALTERNATE));
+    EXPECT_TRUE(triangle.PtInRegion(3, 3));
+    EXPECT_FALSE(triangle.PtInRegion(5, 5));
 }
 
 } // namespace
