@@ -9,7 +9,6 @@
 namespace tvx::afx {
 
 /// The answers of both kinds' messages are the same numbers, so one function answers for either.
-static_assert(LB_ERR == CB_ERR && LB_OKAY == CB_OKAY);
 
 /// By what the two kinds differ where they do the same.
 struct ListKind {
