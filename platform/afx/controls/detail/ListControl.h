@@ -8,9 +8,8 @@
 
 namespace tvx::afx {
 
-/// The answers of both kinds' messages are the same numbers, so one function answers for either.
-
-/// By what the two kinds differ where they do the same.
+/// By what the two kinds differ where they do the same. What their messages answer are the same numbers (LB_ERR is
+/// CB_ERR), so one function answers for either.
 struct ListKind {
     UINT ownerType; ///< ODT_...: what owners are told that a line is of
     DWORD drawn;    ///< styles of which one has the owner draw the lines
