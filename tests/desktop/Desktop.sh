@@ -13,7 +13,8 @@ trap tidy EXIT
 # fail REASON: ends the test, with a picture of the screen where TVX_PICTURE names a file for it.
 fail() {
     [ -z "${TVX_PICTURE:-}" ] || import -window root "$TVX_PICTURE" || true
-    echo "FAIL: $1" >&2
+    echo "FAIL: $1, called from line ${BASH_LINENO[*]}; active: $(xdotool getactivewindow getwindowname 2>&1)" >&2
+    wmctrl -lG >&2 || true
     exit 1
 }
 # await REASON COMMAND...: waits for the command to succeed.

@@ -107,6 +107,7 @@ bar_is "it comes back at the bottom" MRUDockID 59422
 "$settings" set "$key\\ControlBar-Bar0" MRUDockID 59419
 start
 drag_bar 300 300
+await "the main window keeps the keyboard" active "$main"
 close
 bar_is "the tool bar was dragged out" Floating 1
 x=$(bar XPos) y=$(bar YPos)

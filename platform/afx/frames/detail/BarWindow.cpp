@@ -1,5 +1,6 @@
 #include "platform/afx/frames/detail/BarWindow.h"
 
+#include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/Frame.h"
 
 #include <QMainWindow>
@@ -30,7 +31,10 @@ std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
 /// the screen's corner; only what is told after the first painting counts.
 class Tools : public QToolBar {
 public:
-    using QToolBar::QToolBar;
+    /// Coming up on its own leaves the keyboard where it is: a bar is dragged out while the user works in a view.
+    Tools(const QString& title, QWidget* parent) : QToolBar(title, parent) {
+        setAttribute(Qt::WA_ShowWithoutActivating);
+    }
 
     QPoint place() const {
         return isVisible() ? m_place : pos();
@@ -84,6 +88,17 @@ void BarWindow::setWindowRect(const QRect& rect) {
     if (!placed) {
         Window::setWindowRect(rect);
     }
+}
+
+LRESULT BarWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    auto* bar = message == WM_CLOSE ? dynamic_cast<CControlBar*>(object()) : nullptr;
+    CFrameWnd* frame = bar ? bar->GetDockingFrame() : nullptr;
+    if (frame) {
+        // A floating bar that is closed must not end: the frame's menu brings it back.
+        frame->ShowControlBar(bar, FALSE, FALSE);
+        return 0;
+    }
+    return Window::defaultProc(message, wParam, lParam);
 }
 
 void BarWindow::show(int command) {

@@ -15,6 +15,7 @@ namespace tvx::afx {
 class TVX_PLATFORM_API BarWindow : public Window {
 public:
     using Window::Window;
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void setWindowRect(const QRect& rect) override;
     /// A floating bar of a frame that is not shown waits for it; see showFloating.
     void show(int command) override;

@@ -127,6 +127,12 @@ TEST_F(Bars, DockAndFloat) {
     EXPECT_TRUE(tools->isVisible());
     QTest::mouseClick(button(ID_TEST_DRAW), Qt::LeftButton);
     EXPECT_TRUE(noted("draw"));
+    tools->close();
+    idle();
+    ASSERT_TRUE(::IsWindow(frame->tools.m_hWnd)) << "a close request hides it, nothing more";
+    EXPECT_FALSE(frame->tools.IsVisible());
+    frame->ShowControlBar(&frame->tools, TRUE, FALSE);
+    EXPECT_TRUE(tools->isVisible());
     frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_BOTTOM);
     settle();
     EXPECT_FALSE(frame->tools.IsFloating());
