@@ -7,6 +7,7 @@
 #include <QMoveEvent>
 #include <QStatusBar>
 #include <QToolBar>
+#include <QWindow>
 
 #include <algorithm>
 #include <iterator>
@@ -45,6 +46,7 @@ protected:
         if (!event->spontaneous()) {
             m_place = pos();
             m_painted = false;
+            keepFromKeyboard();
         }
         QToolBar::showEvent(event);
     }
@@ -60,6 +62,19 @@ protected:
     }
 
 private:
+    /// A floating bar of buttons never takes the keyboard, and the caption of the frame stays that of the active
+    /// window. Window managers activate new windows of the active application whatever they ask for, so they are told
+    /// that this one takes no keyboard; bars with controls to type into do.
+    void keepFromKeyboard() {
+        const Window* bar = isWindow() && windowHandle() ? Window::of(this) : nullptr;
+        if (bar) {
+            const bool typed = std::ranges::any_of(bar->children(), [](const Window* child) {
+                return child->widget() && child->widget()->focusPolicy() != Qt::NoFocus;
+            });
+            windowHandle()->setFlag(Qt::WindowDoesNotAcceptFocus, !typed);
+        }
+    }
+
     QPoint m_place;
     bool m_painted = false;
 };
