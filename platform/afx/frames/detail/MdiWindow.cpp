@@ -263,7 +263,9 @@ void MdiChildWindow::widgetMade() {
 }
 
 void MdiChildWindow::iconChanged() {
-    const QImage image = iconImage(smallIcon ? smallIcon : bigIcon);
+    // Without one of its own it would show the toolkit's logo.
+    const HICON own = smallIcon ? smallIcon : bigIcon;
+    const QImage image = iconImage(own ? own : LoadIconA(nullptr, IDI_APPLICATION));
     if (!image.isNull()) {
         widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
     }

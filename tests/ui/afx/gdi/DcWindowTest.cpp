@@ -49,11 +49,16 @@ BEGIN_MESSAGE_MAP(TestWindow, CWnd)
 ON_WM_PAINT()
 END_MESSAGE_MAP()
 
-/// Lets everything be painted that waits to be painted.
+/// Lets everything be painted that waits to be painted. The toolkit puts updates off by some milliseconds; a paint that
+/// came as late as that would fall into the middle of a test on a slow machine.
 void settle() {
     QTest::qWait(0);
     QApplication::sendPostedEvents();
     QApplication::processEvents();
+    for (QWidget* top : QApplication::topLevelWidgets()) {
+        QEvent update(QEvent::UpdateRequest);
+        QApplication::sendEvent(top, &update);
+    }
 }
 
 class WindowDc : public testing::Test {
