@@ -98,10 +98,11 @@ namespace {
 
 constexpr int firstPredefined = 32512;
 
-/// The desktop's own pictures for the predefined icons, in the order of their numbers.
+/// The desktop's own pictures for the predefined icons, in the order of their numbers. The first stands for an
+/// application; the style's picture for that is the toolkit's logo, so a plain sheet takes its place.
 constexpr QStyle::StandardPixmap predefinedPictures[] = {
-    QStyle::SP_TitleBarMenuButton, QStyle::SP_MessageBoxCritical,    QStyle::SP_MessageBoxQuestion,
-    QStyle::SP_MessageBoxWarning,  QStyle::SP_MessageBoxInformation,
+    QStyle::SP_FileIcon,          QStyle::SP_MessageBoxCritical,    QStyle::SP_MessageBoxQuestion,
+    QStyle::SP_MessageBoxWarning, QStyle::SP_MessageBoxInformation,
 };
 
 HICON loadPredefined(LPCSTR name) {
