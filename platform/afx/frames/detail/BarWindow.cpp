@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <memory>
 
 namespace tvx::afx {
 
@@ -28,6 +29,20 @@ std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
     return std::make_unique<StatusBarWindow>(cs);
 }
 
+/// The toolkit's messages are not shown while this lives.
+class Hushed {
+public:
+    Hushed() : m_before(qInstallMessageHandler([](QtMsgType, const QMessageLogContext&, const QString&) {})) {}
+    ~Hushed() {
+        qInstallMessageHandler(m_before);
+    }
+    Hushed(const Hushed&) = delete;
+    Hushed& operator=(const Hushed&) = delete;
+
+private:
+    QtMessageHandler m_before;
+};
+
 /// A tool bar that knows where it floats. While a window manager takes in a new window, the place that it tells can be
 /// the screen's corner; only what is told after the first painting counts.
 class Tools : public QToolBar {
@@ -42,6 +57,11 @@ public:
     }
 
 protected:
+    bool event(QEvent* event) override {
+        // At the end of a drag the toolkit asks for the bar's activation, and tells users that it cannot have it.
+        const auto hushed = event->type() == QEvent::MouseButtonRelease ? std::make_unique<Hushed>() : nullptr;
+        return QToolBar::event(event);
+    }
     void showEvent(QShowEvent* event) override {
         if (!event->spontaneous()) {
             m_place = pos();
