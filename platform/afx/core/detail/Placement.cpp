@@ -24,6 +24,19 @@ namespace {
 /// state of the window; what differs after the second is what the desktop wants, as a smallest size or its own tiles.
 constexpr int mostAttempts = 2;
 
+/// Whether a window still stands. Handlers of what a change brings may end it, and its placement with it.
+class Standing {
+public:
+    explicit Standing(const Window& window) : m_window(&window), m_handle(window.handle()) {}
+    explicit operator bool() const {
+        return Window::from(m_handle) == m_window;
+    }
+
+private:
+    const Window* m_window;
+    HWND m_handle;
+};
+
 /// Wayland desktops keep the places of windows to themselves; what was asked for must not be lost over that.
 bool tellsPlaces() {
     return !QGuiApplication::platformName().startsWith(QLatin1String("wayland"));
@@ -86,14 +99,19 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
     } else if (isNormal()) {
         m_wish = Wish{rect, Measured::Frame, 1};
     }
+    const Standing standing(m_window);
     const QMargins around = borders();
     const QSize inside =
         rect.size() - expectedGrowth() - QSize(around.left() + around.right(), around.top() + around.bottom());
+    QWidget& moved = widget(); // outlives the window by a turn of the loop
     if (around.isNull()) {
-        widget().move(rect.topLeft());
-        widget().resize(inside.expandedTo({1, 1}));
+        moved.move(rect.topLeft());
+        moved.resize(inside.expandedTo({1, 1}));
     } else {
-        widget().setGeometry(QRect(rect.topLeft() + QPoint(around.left(), around.top()), inside.expandedTo({1, 1})));
+        moved.setGeometry(QRect(rect.topLeft() + QPoint(around.left(), around.top()), inside.expandedTo({1, 1})));
+    }
+    if (!standing) {
+        return;
     }
     if (isNormal()) {
         m_restored = rect;
@@ -104,7 +122,11 @@ void Placement::moveFrame(const QRect& rect, Measured measured) {
 
 void Placement::setRestored(const QRect& rect) {
     if (isNormal()) {
+        const Standing standing(m_window);
         m_window.setWindowRect(rect);
+        if (!standing) {
+            return;
+        }
         if (m_wish) {
             m_wish->measured = Measured::Frame;
         }
@@ -171,12 +193,13 @@ void Placement::ask() {
 /// The toolkit keeps a place to itself that it has told before, though the widget was given another one meanwhile:
 /// one that was asked for and then overtaken by maximising, or refused.
 void Placement::hearWithheld() {
+    const Standing standing(m_window);
     QWindow* native = widget().isWindow() ? widget().windowHandle() : nullptr;
     if (native && widget().size() != native->size()) {
         QResizeEvent resized(native->size(), widget().size());
         guarded([&] { QCoreApplication::sendEvent(native, &resized); });
     }
-    if (native && widget().geometry().topLeft() != native->position()) {
+    if (native && standing && widget().geometry().topLeft() != native->position()) {
         QMoveEvent moved(native->position(), widget().geometry().topLeft());
         guarded([&] { QCoreApplication::sendEvent(native, &moved); });
     }
@@ -184,8 +207,12 @@ void Placement::hearWithheld() {
 
 void Placement::answered() {
     m_asked = false;
+    const Standing standing(m_window);
     if (!isGone()) {
         hearWithheld();
+    }
+    if (!standing) {
+        return;
     }
     if (std::exchange(m_askAgain, false)) {
         if (!isGone()) {
@@ -226,9 +253,12 @@ void Placement::grant() {
     }
     Wish wish = *m_wish;
     ++wish.attempts;
+    const Standing standing(m_window);
     guarded([&] { m_window.setWindowRect(wanted); });
-    m_wish = wish;
-    ask();
+    if (standing) {
+        m_wish = wish;
+        ask();
+    }
 }
 
 void Placement::remember(const QRect& frame) {

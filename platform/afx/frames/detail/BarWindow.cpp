@@ -59,7 +59,8 @@ public:
 protected:
     bool event(QEvent* event) override {
         // At the end of a drag the toolkit asks for the bar's activation, and tells users that it cannot have it.
-        const auto hushed = event->type() == QEvent::MouseButtonRelease ? std::make_unique<Hushed>() : nullptr;
+        const bool dropped = event->type() == QEvent::MouseButtonRelease && isWindow();
+        const auto hushed = dropped ? std::make_unique<Hushed>() : nullptr;
         return QToolBar::event(event);
     }
     void showEvent(QShowEvent* event) override {

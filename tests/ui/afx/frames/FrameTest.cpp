@@ -37,6 +37,72 @@ TEST_F(Frame, FollowsItsSize) {
     EXPECT_EQ(after.Height(), before.Height() - 50);
 }
 
+namespace {
+
+/// Ends itself when it gets a new size or place.
+class ShyFrame : public CFrameWnd {
+public:
+    bool shy = false;
+
+protected:
+    void OnSize(UINT type, int cx, int cy) {
+        CFrameWnd::OnSize(type, cx, cy);
+        if (shy) {
+            DestroyWindow();
+        }
+    }
+    void PostNcDestroy() override {}
+    DECLARE_MESSAGE_MAP()
+};
+
+BEGIN_MESSAGE_MAP(ShyFrame, CFrameWnd)
+ON_WM_SIZE()
+END_MESSAGE_MAP()
+
+/// Keeps to itself what a window hears of its size, as the toolkit does with a size that it told before.
+class Withholding : public QObject {
+protected:
+    bool eventFilter(QObject*, QEvent* event) override {
+        return event->type() == QEvent::Resize;
+    }
+};
+
+} // namespace
+
+TEST_F(Frame, HearsOfASizeThatTheToolkitKeptToItself) {
+    NoteFrame& frame = openNote();
+    const QWidget& widget = *widgetOf(frame);
+    const QSize before = widget.size();
+    const QSize size = before + QSize(80, 60);
+    {
+        Withholding withholding;
+        widget.windowHandle()->installEventFilter(&withholding);
+        widget.windowHandle()->resize(size);
+        settle();
+    }
+    ASSERT_EQ(widget.size(), before);
+    frame.GetState()->placement()->changed();
+    EXPECT_TRUE(QTest::qWaitFor([&] { return widget.size() == size; }));
+}
+
+TEST_F(Frame, MayEndWhileItIsMoved) {
+    for (const bool placed : {false, true}) {
+        ShyFrame frame;
+        ASSERT_TRUE(frame.Create(nullptr, "Shy", WS_OVERLAPPEDWINDOW, CRect(10, 10, 310, 210)));
+        frame.ShowWindow(SW_SHOW);
+        settle();
+        frame.shy = true;
+        WINDOWPLACEMENT placement{sizeof(WINDOWPLACEMENT), 0, SW_SHOWNORMAL, {}, {}, {30, 40, 530, 440}};
+        if (placed) {
+            frame.SetWindowPlacement(&placement);
+        } else {
+            frame.MoveWindow(30, 40, 500, 400);
+        }
+        EXPECT_FALSE(::IsWindow(frame.m_hWnd));
+        settle();
+    }
+}
+
 TEST_F(Frame, FailsWithoutItsMenu) {
     auto* frame = new CFrameWnd; // deletes itself
     EXPECT_FALSE(frame->LoadFrame(777));
