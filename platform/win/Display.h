@@ -8,4 +8,14 @@ namespace tvx {
 /// millisecond; a toolkit that is told to use a display that does not answer ends the process.
 [[nodiscard]] TVX_PLATFORM_API bool canOpenDisplay();
 
+/// Which of the keys that stay on until they are pressed again are on.
+struct KeyLocks {
+    bool caps = false;
+    bool num = false;
+    bool scroll = false;
+};
+
+/// The lock keys as the lights of the X display's keyboard show them; none is on where no display answers.
+[[nodiscard]] TVX_PLATFORM_API KeyLocks keyLocks();
+
 } // namespace tvx

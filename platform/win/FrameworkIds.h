@@ -230,6 +230,7 @@
 #define TVX_IDS_FILE_OPEN 0xF323
 #define TVX_IDS_FILE_SAVE 0xF324
 #define TVX_IDS_FILE_CANCEL 0xF325
+#define TVX_IDS_TOOL_BAR 0xF326
 
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721

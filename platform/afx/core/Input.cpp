@@ -152,9 +152,9 @@ SHORT GetKeyState(int key) {
         down = isKeyDown(key);
         break;
     }
-    return down ? static_cast<SHORT>(0x8000) : SHORT{0};
+    return static_cast<SHORT>((down ? 0x8000 : 0) | (isKeyLocked(key) ? 1 : 0));
 }
 
 SHORT GetAsyncKeyState(int key) {
-    return GetKeyState(key);
+    return static_cast<SHORT>(GetKeyState(key) & 0x8000);
 }

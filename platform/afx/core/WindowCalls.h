@@ -108,8 +108,9 @@ TVX_PLATFORM_API HCURSOR SetCursor(HCURSOR cursor);
 /// One of the system's cursors (IDC_ARROW, ...), whatever the module. Null for any other: cursors in resources are not
 /// shown here. Cursors are shared and never destroyed.
 TVX_PLATFORM_API HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name);
-/// The state of a key or mouse button (VK_...): negative when down, else 0. Whether a lock key is on is not told, and
-/// keys that went down while another program had the keyboard are not known.
+/// The state of a key or mouse button (VK_...): negative when down; the lowest bit says of VK_CAPITAL, VK_NUMLOCK and
+/// VK_SCROLL whether they are on, as far as the desktop tells (a Wayland session does not). Keys that went down while
+/// another program had the keyboard are not known.
 TVX_PLATFORM_API SHORT GetKeyState(int key);
 /// The same: a program only hears of keys by its messages. A long calculation that wants to see Esc has to let them
 /// come (PeekMessage, PumpMessage) before it asks.

@@ -133,7 +133,9 @@ public:
     static const MSG* GetCurrentMessage();
     /// Offers a message to PreTranslateMessage of its target and of each ancestor up to `stop`.
     static BOOL WalkPreTranslateTree(HWND stop, MSG* message);
-    /// Handles the keys of a dialog (Tab, arrows, Enter, Esc, mnemonics). TRUE when the message was one.
+    /// Answers for the keys and the mouse of this window and its children as a dialog does: acts on Tab, arrows, Enter,
+    /// Esc and mnemonics, and leaves everything else to the window that it is for. TRUE for each such message, so that
+    /// nobody around or behind the dialog takes its keys; FALSE for other messages and other windows'.
     BOOL PreTranslateInput(MSG* message);
     /// The first WM_COMMAND/WM_NOTIFY handler of the parent's; called with notifications of this window before them.
     virtual BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result);

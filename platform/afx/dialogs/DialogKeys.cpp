@@ -275,5 +275,14 @@ using namespace tvx::afx;
 BOOL CWnd::PreTranslateInput(MSG* message) {
     Window* window = GetState();
     const bool key = message->message >= WM_KEYFIRST && message->message <= WM_KEYLAST;
-    return key && window && isDialogMessage(*window, *message) ? TRUE : FALSE;
+    const bool mouse = message->message >= WM_MOUSEFIRST && message->message <= WM_MOUSELAST;
+    const bool own = window && (message->hwnd == m_hWnd || ::IsChild(m_hWnd, message->hwnd));
+    if (!own || !(key || mouse)) {
+        return FALSE;
+    }
+    // What is typed into a window is its own, whatever a frame around it or behind it would do with the key.
+    if (mouse || !isDialogMessage(*window, *message)) {
+        handToWindow();
+    }
+    return TRUE;
 }

@@ -8,6 +8,7 @@
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/gdi/detail/ButtonImages.h"
 #include "platform/win/ExtensionModule.h"
+#include "platform/win/FrameworkIds.h"
 #include "platform/win/Resource.h"
 #include "platform/win/ToolBarTemplate.h"
 
@@ -82,8 +83,11 @@ BOOL CToolBar::Create(CWnd* parent, DWORD style, UINT id) {
 
 BOOL CToolBar::CreateEx(CWnd* parent, DWORD, DWORD style, CRect, UINT id) {
     SetBarStyle(style & barStyles);
-    CString name;
-    name.LoadString(id);
+    // Bars have the number of the command that shows them, whose short name is theirs.
+    CString name = CommandText(id).tip;
+    if (name.IsEmpty()) {
+        name.LoadString(TVX_IDS_TOOL_BAR);
+    }
     return CWnd::CreateEx(0, "ToolbarWindow32", name, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent, id);
 }
 

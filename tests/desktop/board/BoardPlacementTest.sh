@@ -117,6 +117,34 @@ bar_is "it comes back floating" Floating 1
 bar_is "where it was" XPos "$x"
 bar_is "where it was" YPos "$y"
 
+# The place of the floating bar's window, as variables.
+floating() {
+    eval "$(xwininfo -name Toolbar | awk '/Absolute upper-left X/{print "X="$4} /Absolute upper-left Y/{print "Y="$4}
+        /Width:/{print "WIDTH="$2}')"
+}
+start
+await "it has a window of its own, with its name" titled '^Toolbar$'
+X=0 Y=0 WIDTH=0
+floating
+xdotool mousemove $((X + WIDTH - 12)) $((Y + 10)) click 1
+await "the button in its caption closes it" untitled '^Toolbar$'
+active "$main" || fail "the main window keeps the keyboard"
+xdotool key --clearmodifiers alt+v
+xdotool key --clearmodifiers t
+await "the menu brings it back" titled '^Toolbar$'
+floating
+fromX=$((X + 60)) fromY=$((Y + 10))
+eval "$(inside)"
+xdotool mousemove $fromX $fromY mousedown 1
+for i in 1 2 3 4 5 6; do
+    xdotool mousemove $((fromX + (X + 8 - fromX) * i / 6)) $((fromY + (Y + 250 - fromY) * i / 6))
+done
+xdotool mouseup 1
+await "it docks where its caption was dragged to" untitled '^Toolbar$'
+close
+bar_is "it was docked at the left" MRUDockID 59420
+"$settings" set "$key\\ControlBar-Bar0" MRUDockID 59419
+
 start
 xdotool key --clearmodifiers alt+v
 xdotool key --clearmodifiers t

@@ -5,6 +5,8 @@
 #include <QAbstractTextDocumentLayout>
 #include <QPlainTextEdit>
 #include <QScrollBar>
+#include <QStyleOptionFrame>
+#include <QStylePainter>
 #include <QTextBlock>
 #include <QTextLayout>
 
@@ -16,10 +18,33 @@ Qt::ScrollBarPolicy policy(bool bar) {
     return bar ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
 }
 
+/// A field of many lines whose frame shows the keyboard as that of one line does; the toolkit's own frames do not.
+class AreaEdit : public QPlainTextEdit {
+public:
+    using QPlainTextEdit::QPlainTextEdit;
+
+protected:
+    bool event(QEvent* event) override {
+        if (event->type() == QEvent::Paint && hasFocus() && frameWidth() > 0) {
+            QStylePainter painter(this);
+            QStyleOptionFrame frame;
+            frame.initFrom(this);
+            frame.state |= QStyle::State_Sunken;
+            frame.lineWidth = frameWidth();
+            painter.drawPrimitive(QStyle::PE_FrameLineEdit, frame);
+            return true;
+        }
+        if (event->type() == QEvent::FocusIn || event->type() == QEvent::FocusOut) {
+            update();
+        }
+        return QPlainTextEdit::event(event);
+    }
+};
+
 class AreaField : public TextField {
 public:
     AreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed)
-        : m_edit(new QPlainTextEdit(parent)), m_wraps(options.wraps) {
+        : m_edit(new AreaEdit(parent)), m_wraps(options.wraps) {
         count(0, 0);
         connectStoring(m_edit->document(), &QTextDocument::contentsChange, m_edit,
                        [this](int position, int, int added) { count(position, added); });

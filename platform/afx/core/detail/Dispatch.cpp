@@ -29,6 +29,8 @@ bool idleDue = true;
 LONG idleCount = 0;
 /// Set while DispatchMessage hands on a message whose fetcher has pre-translated it, or has chosen not to.
 bool preTranslateDone = false;
+/// Set where pre-translation has answered for a message that its window is still to get.
+bool handedToWindow = false;
 
 /// Events on their way to the toolkit, which translateEvent must let through.
 thread_local const QEvent* passing = nullptr;
@@ -93,7 +95,15 @@ bool preTranslate(MSG& msg) {
         return false;
     }
     CWinThread* thread = AfxGetThread();
-    return thread && thread->PreTranslateMessage(&msg) != FALSE;
+    // Handlers may run loops of their own, each with answers of its own.
+    const bool outer = std::exchange(handedToWindow, false);
+    const bool answered = thread && thread->PreTranslateMessage(&msg) != FALSE;
+    const bool handed = std::exchange(handedToWindow, outer);
+    return answered && !handed;
+}
+
+void handToWindow() {
+    handedToWindow = true;
 }
 
 LRESULT dispatch(const MSG& msg, EventSource* source) {

@@ -49,6 +49,9 @@ bool takePassing(const QEvent* event);
 
 /// Offers a message to the pre-translation chain: target up to the main frame, then the thread. True when consumed.
 TVX_PLATFORM_API bool preTranslate(MSG& msg);
+/// Called within pre-translation by what answers for a message without acting on it: the walk ends, and the message
+/// goes to its window as one that nobody consumed.
+TVX_PLATFORM_API void handToWindow();
 /// Sends a message to its window, or calls its timer's function.
 TVX_PLATFORM_API LRESULT dispatch(const MSG& msg, EventSource* source = nullptr);
 /// What the loop does with each message: preTranslate, then dispatch.

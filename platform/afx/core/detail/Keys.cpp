@@ -1,10 +1,14 @@
 #include "platform/afx/core/detail/Keys.h"
 
 #include "platform/afx/core/Message.h"
+#include "platform/win/Display.h"
+
+#include <QGuiApplication>
 
 #include <algorithm>
 #include <array>
 #include <bitset>
+#include <optional>
 
 namespace tvx::afx {
 
@@ -114,6 +118,9 @@ int keypadKey(int key) {
     }
 }
 
+/// The lock keys as they were when somebody asked last; empty since the keyboard was used again.
+std::optional<KeyLocks> knownLocks;
+
 std::bitset<256>& keysDown() {
     static std::bitset<256> keys;
     return keys;
@@ -183,17 +190,36 @@ WPARAM buttonFlags(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers) {
 }
 
 void noteKey(int virtualKey, bool down) {
+    knownLocks.reset();
     if (virtualKey > 0 && virtualKey < 256) {
         keysDown().set(static_cast<std::size_t>(virtualKey), down);
     }
 }
 
 void forgetKeys() {
+    knownLocks.reset();
     keysDown().reset();
 }
 
 bool isKeyDown(int virtualKey) {
     return virtualKey > 0 && virtualKey < 256 && keysDown().test(static_cast<std::size_t>(virtualKey));
+}
+
+bool isKeyLocked(int virtualKey) {
+    if (!knownLocks) {
+        const bool told = QGuiApplication::platformName() == QLatin1String("xcb");
+        knownLocks = told ? keyLocks() : KeyLocks();
+    }
+    switch (virtualKey) {
+    case VK_CAPITAL:
+        return knownLocks->caps;
+    case VK_NUMLOCK:
+        return knownLocks->num;
+    case VK_SCROLL:
+        return knownLocks->scroll;
+    default:
+        return false;
+    }
 }
 
 } // namespace tvx::afx

@@ -24,5 +24,8 @@ void noteKey(int virtualKey, bool down);
 /// Forgets all keys; called when the application loses the keyboard, since releases are not seen from then on.
 void forgetKeys();
 TVX_PLATFORM_API bool isKeyDown(int virtualKey);
+/// Whether a lock key (VK_CAPITAL, VK_NUMLOCK, VK_SCROLL) is on. False for other keys, and where the desktop does not
+/// tell.
+bool isKeyLocked(int virtualKey);
 
 } // namespace tvx::afx

@@ -15,6 +15,7 @@
 #include <QApplication>
 #include <QKeyEvent>
 #include <QMainWindow>
+#include <QStyleOptionMenuItem>
 
 #include <unordered_map>
 
@@ -203,6 +204,14 @@ void FrameMenuBar::addEntry(const MenuItem& item, int index) {
     action->setEnabled(item.isEnabled());
 }
 
+void FrameMenuBar::initStyleOption(QStyleOptionMenuItem* option, const QAction* action) const {
+    QMenuBar::initStyleOption(option, action);
+    // Some styles show only an entry that is open; without this nobody sees which one the arrows would open.
+    if (hasFocus() && action == activeAction()) {
+        option->state |= QStyle::State_Sunken | QStyle::State_Selected;
+    }
+}
+
 bool FrameMenuBar::openByKey(char32_t key) {
     if (!isVisible()) {
         return false;
@@ -350,9 +359,8 @@ void updateSystemMenu(HWND handle) {
     const bool iconic = IsIconic(handle) != FALSE;
     const auto enable = [menu](UINT id, bool on) { EnableMenuItem(menu, id, on ? MF_ENABLED : MF_GRAYED); };
     enable(SC_RESTORE, zoomed || iconic);
-    // Child frames are moved and sized with the mouse only.
-    enable(SC_MOVE, !zoomed && !window->isChild());
-    enable(SC_SIZE, !zoomed && !window->isChild() && (window->style() & WS_THICKFRAME) != 0);
+    enable(SC_MOVE, !zoomed);
+    enable(SC_SIZE, !zoomed && !iconic && (window->style() & WS_THICKFRAME) != 0);
     enable(SC_MAXIMIZE, !zoomed && (window->style() & WS_MAXIMIZEBOX) != 0);
     enable(SC_MINIMIZE, !iconic && (window->style() & WS_MINIMIZEBOX) != 0);
 }

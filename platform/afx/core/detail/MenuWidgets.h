@@ -54,6 +54,9 @@ public:
     /// Opens the popup with an access key; 0 gives the bar the keyboard. False when there is no such popup.
     bool openByKey(char32_t key);
 
+protected:
+    void initStyleOption(QStyleOptionMenuItem* option, const QAction* action) const override;
+
 private:
     void menuChanged(HMENU menu) override;
     void rebuild();

@@ -48,6 +48,11 @@ public:
     /// The frame the window has when it is neither maximised nor minimised.
     QRect restored() const;
 
+    /// Whether the window is on its way to a place: something was asked of the desktop that it has not told yet.
+    bool isUnsettled() const {
+        return m_wish || m_asked || m_settle.isActive();
+    }
+
     /// Called directly before the window is shown.
     void aboutToShow();
     /// Called for every change of place, size or state.

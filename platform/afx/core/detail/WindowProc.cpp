@@ -1,5 +1,7 @@
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/KeyMove.h"
+#include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 
@@ -60,6 +62,12 @@ LRESULT Window::systemCommand(UINT command, LPARAM lParam) {
         return 0;
     case SC_RESTORE:
         show(SW_RESTORE);
+        return 0;
+    case SC_MOVE:
+        changeByKeys(m_handle, KeyChange::Place);
+        return 0;
+    case SC_SIZE:
+        changeByKeys(m_handle, KeyChange::Size);
         return 0;
     default:
         return 0;
@@ -183,6 +191,9 @@ LRESULT Window::systemKey(UINT message, WPARAM wParam, LPARAM lParam) {
     const HWND top = topLevel()->m_handle;
     const bool menuKey =
         (message == WM_SYSKEYUP && wParam == VK_MENU) || (message == WM_SYSKEYDOWN && wParam == VK_F10);
+    if (menuKey && wParam == VK_F10 && isKeyDown(VK_SHIFT)) {
+        return call(WM_CONTEXTMENU, reinterpret_cast<WPARAM>(m_handle), MAKELPARAM(-1, -1));
+    }
     if (menuKey) {
         return SendMessageA(top, WM_SYSCOMMAND, SC_KEYMENU, 0);
     }

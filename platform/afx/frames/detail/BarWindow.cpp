@@ -1,13 +1,13 @@
 #include "platform/afx/frames/detail/BarWindow.h"
 
+#include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/Frame.h"
+#include "platform/afx/frames/detail/ToolWidget.h"
 
 #include <QMainWindow>
-#include <QMoveEvent>
 #include <QStatusBar>
 #include <QToolBar>
-#include <QWindow>
 
 #include <algorithm>
 #include <iterator>
@@ -29,84 +29,13 @@ std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
     return std::make_unique<StatusBarWindow>(cs);
 }
 
-/// The toolkit's messages are not shown while this lives.
-class Hushed {
-public:
-    Hushed() : m_before(qInstallMessageHandler([](QtMsgType, const QMessageLogContext&, const QString&) {})) {}
-    ~Hushed() {
-        qInstallMessageHandler(m_before);
-    }
-    Hushed(const Hushed&) = delete;
-    Hushed& operator=(const Hushed&) = delete;
-
-private:
-    QtMessageHandler m_before;
-};
-
-/// A tool bar that knows where it floats. While a window manager takes in a new window, the place that it tells can be
-/// the screen's corner; only what is told after the first painting counts.
-class Tools : public QToolBar {
-public:
-    /// Coming up on its own leaves the keyboard where it is: a bar is dragged out while the user works in a view.
-    Tools(const QString& title, QWidget* parent) : QToolBar(title, parent) {
-        setAttribute(Qt::WA_ShowWithoutActivating);
-    }
-
-    QPoint place() const {
-        return isVisible() ? m_place : pos();
-    }
-
-protected:
-    bool event(QEvent* event) override {
-        // At the end of a drag the toolkit asks for the bar's activation, and tells users that it cannot have it.
-        const bool dropped = event->type() == QEvent::MouseButtonRelease && isWindow();
-        const auto hushed = dropped ? std::make_unique<Hushed>() : nullptr;
-        return QToolBar::event(event);
-    }
-    void showEvent(QShowEvent* event) override {
-        if (!event->spontaneous()) {
-            m_place = pos();
-            m_painted = false;
-            keepFromKeyboard();
-        }
-        QToolBar::showEvent(event);
-    }
-    void paintEvent(QPaintEvent* event) override {
-        m_painted = true;
-        QToolBar::paintEvent(event);
-    }
-    void moveEvent(QMoveEvent* event) override {
-        if (m_painted || !event->spontaneous()) {
-            m_place = event->pos();
-        }
-        QToolBar::moveEvent(event);
-    }
-
-private:
-    /// A floating bar of buttons never takes the keyboard, and the caption of the frame stays that of the active
-    /// window. Window managers activate new windows of the active application whatever they ask for, so they are told
-    /// that this one takes no keyboard; bars with controls to type into do.
-    void keepFromKeyboard() {
-        const Window* bar = isWindow() && windowHandle() ? Window::of(this) : nullptr;
-        if (bar) {
-            const bool typed = std::ranges::any_of(bar->children(), [](const Window* child) {
-                return child->widget() && child->widget()->focusPolicy() != Qt::NoFocus;
-            });
-            windowHandle()->setFlag(Qt::WindowDoesNotAcceptFocus, !typed);
-        }
-    }
-
-    QPoint m_place;
-    bool m_painted = false;
-};
-
 const WindowClassEntry barEntry("ToolbarWindow32", &makeBar);
 const WindowClassEntry statusBarEntry("msctls_statusbar32", &makeStatusBar);
 
 } // namespace
 
 QWidget* BarWindow::makeWidget(QWidget* parent) {
-    auto* bar = new Tools(text(), parent);
+    auto* bar = new ToolWidget(text(), parent);
     // Layouts are remembered under this name.
     bar->setObjectName(QStringLiteral("bar%1").arg(id()));
     bar->setMovable(false);
@@ -117,6 +46,13 @@ QWidget* StatusBarWindow::makeWidget(QWidget* parent) {
     auto* bar = new QStatusBar(parent);
     bar->setObjectName(QStringLiteral("bar%1").arg(id()));
     return bar;
+}
+
+void BarWindow::setText(const QString& text) {
+    Window::setText(text);
+    if (widget()) {
+        guarded([&] { widget()->setWindowTitle(text); });
+    }
 }
 
 void BarWindow::setWindowRect(const QRect& rect) {
@@ -191,14 +127,14 @@ DWORD sideOfDockBar(UINT dockBar) {
 void floatToolBar(QToolBar& bar, QPoint at) {
     const bool shown = !bar.isHidden();
     bar.setWindowFlags(Qt::Tool | Qt::FramelessWindowHint);
-    bar.setAttribute(Qt::WA_ShowWithoutActivating); // the frame keeps the keyboard
+    bar.setOrientation(Qt::Horizontal);
     bar.move(at);
     bar.adjustSize();
     bar.setVisible(shown && isFrameShown(bar));
 }
 
 QPoint placeOfFloating(const QToolBar& bar) {
-    const auto* tools = dynamic_cast<const Tools*>(&bar);
+    const auto* tools = dynamic_cast<const ToolWidget*>(&bar);
     return tools ? tools->place() : bar.pos();
 }
 

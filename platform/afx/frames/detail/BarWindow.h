@@ -16,6 +16,8 @@ class TVX_PLATFORM_API BarWindow : public Window {
 public:
     using Window::Window;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+    /// The text is the name in the caption of a floating tool bar.
+    void setText(const QString& text) override;
     void setWindowRect(const QRect& rect) override;
     /// A floating bar of a frame that is not shown waits for it; see showFloating.
     void show(int command) override;

@@ -2,8 +2,10 @@
 
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/Placement.h"
 #include "platform/afx/core/detail/PlainWindow.h"
 #include "platform/afx/frames/MdiFrame.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
@@ -15,6 +17,7 @@
 #include <QMdiSubWindow>
 
 #include <algorithm>
+#include <cmath>
 
 namespace tvx::afx {
 
@@ -74,6 +77,8 @@ QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
     area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setActivationOrder(QMdiArea::ActivationHistoryOrder);
     connectStoring(area, &QMdiArea::subWindowActivated, area, [this](const QMdiSubWindow* sub) { follow(sub); });
+    m_told.setSingleShot(true);
+    connectStoring(&m_told, &QTimer::timeout, area, [this] { roomTold(); });
     return area;
 }
 
@@ -128,7 +133,15 @@ void MdiClientWindow::forget(const MdiChildWindow& child) {
         m_active = nullptr;
         return;
     }
-    activate(m_history.empty() ? nullptr : m_history.back());
+    const bool maximized = child.widget()->isMaximized();
+    MdiChildWindow* next = m_history.empty() ? nullptr : m_history.back();
+    const HWND handle = next ? next->handle() : nullptr;
+    activate(next);
+    // Who works with maximised frames goes on with them when one closes.
+    Window* still = maximized ? from(handle) : nullptr;
+    if (still && still == m_active && !still->widget()->isHidden()) {
+        still->show(SW_SHOWMAXIMIZED);
+    }
 }
 
 std::vector<MdiChildWindow*> MdiClientWindow::shownChildren() const {
@@ -152,34 +165,101 @@ void MdiClientWindow::step(int direction) {
     activate(shown[static_cast<std::size_t>((at - shown.begin() + direction + count) % count)]);
 }
 
-QRect MdiClientWindow::nextPlace() {
+// --- places of child frames ---
+
+QSize MdiClientWindow::room() {
+    const QSize own = area()->maximumViewportSize();
+    // Before the main frame is shown the area still has the toolkit's size for new widgets.
+    return area()->isVisible() ? own : own.expandedTo(topLevel()->clientRect().size());
+}
+
+QRect MdiClientWindow::cascadePlace(int number) {
     // Far enough that the caption of the frame below can be read.
     constexpr int offset = 26;
     constexpr int steps = 8;
-    QSize room = area()->viewport()->size();
-    // Before the main frame is shown the area still has the toolkit's size for new widgets.
-    if (!area()->isVisible()) {
-        room = room.expandedTo(topLevel()->clientRect().size());
-    }
-    const int shift = (m_placed++ % steps) * offset;
-    return {QPoint(shift, shift), room * 2 / 3};
+    const int shift = (number % steps) * offset;
+    return {QPoint(shift, shift), room() * 2 / 3};
 }
 
-void MdiClientWindow::arrange(UINT type) {
+QRect MdiClientWindow::nextPlace(const MdiChildWindow& child) {
+    const int number = m_placed++;
+    const QRect place = cascadePlace(number);
+    if (!m_roomKnown) {
+        m_early.push_back({child.handle(), number, place});
+    }
+    return place;
+}
+
+/// A main frame that comes up maximised, or where it was left, has its size only when the desktop has told it. Child
+/// frames that were placed earlier, and that nobody has moved since, get the places that fit.
+void MdiClientWindow::placeAgain() {
+    if (m_roomKnown || !area()->isVisible()) {
+        return;
+    }
+    for (Early& early : m_early) {
+        auto* child = dynamic_cast<MdiChildWindow*>(from(early.child));
+        const QRect place = cascadePlace(early.number);
+        const QRect former = std::exchange(early.place, place);
+        Placement* own = child ? child->placement() : nullptr;
+        if (own && child->widget()->isMaximized() && own->restored() == former) {
+            own->setRestored(place);
+        } else if (child && child->widget()->geometry() == former) {
+            child->setWindowRect(place);
+        }
+    }
+    if (!m_told.isActive()) {
+        static_cast<void>(startWhenDesktopHasAnswered(m_told));
+    }
+}
+
+void MdiClientWindow::roomTold() {
+    const Placement* main = topLevel()->placement();
+    if (main && main->isUnsettled()) {
+        static_cast<void>(startWhenDesktopHasAnswered(m_told));
+        return;
+    }
+    m_roomKnown = true;
+    m_early.clear();
+}
+
+void MdiClientWindow::cascade() {
+    auto shown = shownChildren();
+    std::erase_if(shown, [](const MdiChildWindow* child) { return child->widget()->isMinimized(); });
+    m_placed = 0;
+    for (const MdiChildWindow* child : shown) {
+        guarded([&] {
+            child->subWindow()->showNormal();
+            child->subWindow()->setGeometry(cascadePlace(m_placed++));
+            child->subWindow()->raise();
+        });
+    }
+}
+
+/// A grid: as many columns (or rows, where they are to stand side by side) as give cells the shape of the room, one
+/// for up to three frames. The last ones hold one frame more where the grid does not come out even.
+void MdiClientWindow::tile(UINT type) {
     auto shown = shownChildren();
     std::erase_if(shown, [](const MdiChildWindow* child) { return child->widget()->isMinimized(); });
     const auto count = static_cast<int>(shown.size());
-    const QSize room = area()->viewport()->size();
-    for (int i = 0; i < count; ++i) {
-        QRect place(QPoint(0, room.height() * i / count), QPoint(room.width(), room.height() * (i + 1) / count));
-        if ((type & MDITILE_HORIZONTAL) == 0) {
-            place = QRect(QPoint(room.width() * i / count, 0), QPoint(room.width() * (i + 1) / count, room.height()));
+    const auto lines = static_cast<int>(std::sqrt(count));
+    const QSize size = room();
+    int next = 0;
+    for (int line = 0; line < lines; ++line) {
+        const int held = count / lines + (line >= lines - count % lines ? 1 : 0);
+        for (int i = 0; i < held; ++i) {
+            const auto cell = [&](int width, int height, int column, int columns, int row, int rows) {
+                return QRect(QPoint(width * column / columns, height * row / rows),
+                             QPoint(width * (column + 1) / columns - 1, height * (row + 1) / rows - 1));
+            };
+            const QRect place = (type & MDITILE_HORIZONTAL) != 0
+                                    ? cell(size.width(), size.height(), line, lines, i, held)
+                                    : cell(size.width(), size.height(), i, held, line, lines);
+            guarded([&] {
+                shown[static_cast<std::size_t>(next)]->subWindow()->showNormal();
+                shown[static_cast<std::size_t>(next)]->subWindow()->setGeometry(place);
+            });
+            ++next;
         }
-        place.adjust(0, 0, -1, -1);
-        guarded([&] {
-            shown[static_cast<std::size_t>(i)]->subWindow()->showNormal();
-            shown[static_cast<std::size_t>(i)]->subWindow()->setGeometry(place);
-        });
     }
 }
 
@@ -209,11 +289,14 @@ LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
         }
         return 0;
     case WM_MDITILE:
-        arrange(static_cast<UINT>(wParam));
+        tile(static_cast<UINT>(wParam));
         return TRUE;
     case WM_MDICASCADE:
-        guarded([this] { area()->cascadeSubWindows(); });
+        cascade();
         return TRUE;
+    case WM_SIZE:
+        placeAgain();
+        return Window::defaultProc(message, wParam, lParam);
     default:
         return Window::defaultProc(message, wParam, lParam);
     }
@@ -280,7 +363,7 @@ void MdiChildWindow::setText(const QString& text) {
 
 void MdiChildWindow::setWindowRect(const QRect& rect) {
     if (std::exchange(m_defaultPlace, false)) {
-        Window::setWindowRect(client().nextPlace());
+        Window::setWindowRect(client().nextPlace(*this));
         return;
     }
     Window::setWindowRect(rect);

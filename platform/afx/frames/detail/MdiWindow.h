@@ -6,6 +6,8 @@
 #include "platform/afx/core/detail/MenuWidgets.h"
 #include "platform/afx/core/detail/Window.h"
 
+#include <QTimer>
+
 class QMainWindow;
 class QMdiArea;
 class QMdiSubWindow;
@@ -31,7 +33,7 @@ public:
     /// Chooses another active child frame when one ends.
     void forget(const MdiChildWindow& child);
     /// Where a new child frame goes that asks for no place: each a little lower and further right than the last.
-    QRect nextPlace();
+    QRect nextPlace(const MdiChildWindow& child);
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
@@ -39,12 +41,26 @@ protected:
 private:
     void follow(const QMdiSubWindow* sub);
     void step(int direction);
-    void arrange(UINT type);
+    void tile(UINT type);
+    void cascade();
+    QSize room();
+    QRect cascadePlace(int number);
+    void placeAgain();
+    void roomTold();
     std::vector<MdiChildWindow*> shownChildren() const;
     MdiChildWindow* m_active = nullptr;
     std::vector<MdiChildWindow*> m_history; ///< The latest active one last.
     bool m_activating = false;
     int m_placed = 0;
+    /// Child frames whose places were chosen before the main frame had its size.
+    struct Early {
+        HWND child;
+        int number;
+        QRect place;
+    };
+    std::vector<Early> m_early;
+    QTimer m_told; ///< Runs out when the desktop has told the main frame's size.
+    bool m_roomKnown = false;
 };
 
 /// A child frame: a caption of the toolkit's around a main window of its own, with bars and a pane.

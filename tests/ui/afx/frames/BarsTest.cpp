@@ -125,17 +125,34 @@ TEST_F(Bars, DockAndFloat) {
     settle();
     EXPECT_TRUE(frame->tools.IsFloating());
     EXPECT_TRUE(tools->isVisible());
+    EXPECT_FALSE(tools->windowTitle().isEmpty());
+    EXPECT_FALSE(tools->windowTitle().contains('\n'));
+    frame->tools.SetWindowText("Shapes");
+    EXPECT_EQ(tools->windowTitle(), QString("Shapes"));
     QTest::mouseClick(button(ID_TEST_DRAW), Qt::LeftButton);
     EXPECT_TRUE(noted("draw"));
-    tools->close();
-    idle();
+    const auto buttons = tools->findChildren<QToolButton*>(QString(), Qt::FindDirectChildrenOnly);
+    const auto closer = std::find_if(buttons.begin(), buttons.end(), [](const QToolButton* each) {
+        return each->accessibleName() == QString("Close");
+    });
+    ASSERT_NE(closer, buttons.end());
+    EXPECT_TRUE(tools->rect().contains((*closer)->geometry()));
+    EXPECT_GE(button(ID_TEST_DRAW)->y(), (*closer)->geometry().bottom()) << "the buttons stand below the caption";
+    EXPECT_LE(button(ID_TEST_ORPHAN)->geometry().bottom(), tools->height());
+    QTest::mouseClick(*closer, Qt::LeftButton);
+    settle();
     ASSERT_TRUE(::IsWindow(frame->tools.m_hWnd)) << "a close request hides it, nothing more";
     EXPECT_FALSE(frame->tools.IsVisible());
     frame->ShowControlBar(&frame->tools, TRUE, FALSE);
     EXPECT_TRUE(tools->isVisible());
+    QTest::mouseDClick(tools, Qt::LeftButton, Qt::NoModifier, QPoint(20, 8));
+    settle();
+    EXPECT_FALSE(frame->tools.IsFloating()) << "a double click on the caption";
+    EXPECT_FALSE((*closer)->isVisible());
     frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_BOTTOM);
     settle();
-    EXPECT_FALSE(frame->tools.IsFloating());
+    EXPECT_EQ(button(ID_TEST_DRAW)->y(), tools->height() - 1 - button(ID_TEST_DRAW)->geometry().bottom())
+        << "without room for a caption";
     EXPECT_EQ(frame->GetControlBar(AFX_IDW_TOOLBAR), &frame->tools);
     EXPECT_EQ(frame->GetControlBar(4711), nullptr);
 }

@@ -280,3 +280,43 @@ TEST_F(Frame, ClickMakesAViewActive) {
     EXPECT_EQ(frame.GetActiveView(), frame.GetDlgItem(AFX_IDW_PANE_FIRST));
     EXPECT_EQ(CWnd::GetFocus(), frame.GetActiveView());
 }
+
+namespace {
+
+/// Deletes the first character of its field, then all of it, with keys that are the frame's accelerators too.
+void typeInto(CWnd& dialog) {
+    CWnd* field = dialog.GetDlgItem(IDC_TEST_TEXT);
+    field->SetWindowText("abc");
+    field->SetFocus();
+    field->SendMessage(EM_SETSEL, 0, 0);
+    key(Qt::Key_Delete);
+    EXPECT_EQ(titleOf(*field), "bc");
+    key(Qt::Key_A, Qt::ControlModifier);
+    key(Qt::Key_Delete);
+    EXPECT_EQ(titleOf(*field), "");
+    key(Qt::Key_F5);
+}
+
+} // namespace
+
+TEST_F(Frame, KeysOfADialogAreTheDialogsOwn) {
+    NoteFrame& frame = openNote();
+    key(Qt::Key_Delete);
+    ASSERT_EQ(journal(), std::vector<std::string>{"frame"}) << "an accelerator";
+    journal().clear();
+    CDialog modeless;
+    ASSERT_TRUE(modeless.Create(IDD_TESTKEYS, &frame));
+    settle();
+    typeInto(modeless);
+    modeless.DestroyWindow();
+    CDialog modal(IDD_TESTKEYS, &frame);
+    inDialog([&modal] {
+        typeInto(modal);
+        key(Qt::Key_Escape);
+    });
+    EXPECT_EQ(modal.DoModal(), IDCANCEL);
+    EXPECT_EQ(journal(), std::vector<std::string>{}) << "nothing happened to what is behind";
+    settle();
+    key(Qt::Key_Delete);
+    EXPECT_EQ(journal(), std::vector<std::string>{"frame"}) << "afterwards it is an accelerator again";
+}

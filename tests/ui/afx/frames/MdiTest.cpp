@@ -3,6 +3,8 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 
+#include <set>
+
 using namespace frametest;
 
 namespace {
@@ -164,6 +166,11 @@ TEST_F(Mdi, MaximizedChild) {
     frame->MDIActivate(first);
     settle();
     EXPECT_TRUE(first->IsZoomed());
+    CMDIChildWnd* third = open();
+    third->SendMessage(WM_CLOSE);
+    settle();
+    EXPECT_EQ(frame->MDIGetActive(), first);
+    EXPECT_TRUE(first->IsZoomed()) << "the next one comes up as large";
     frame->MDIActivate(second);
     settle();
     second->MDIRestore();
@@ -188,6 +195,57 @@ TEST_F(Mdi, TilesAndCascades) {
     frame->SendMessage(WM_COMMAND, ID_WINDOW_CASCADE);
     settle();
     EXPECT_NE(first->GetState()->widget()->y(), second->GetState()->widget()->y());
+    const QSize room = area()->viewport()->size();
+    EXPECT_GE(second->GetState()->widget()->height(), room.height() / 2);
+    for (int i = 0; i < 3; ++i) {
+        open();
+    }
+    frame->MDITile(MDITILE_HORIZONTAL);
+    settle();
+    std::set<std::pair<int, int>> columns;
+    int covered = 0;
+    for (const QMdiSubWindow* sub : area()->subWindowList()) {
+        columns.insert({sub->x(), sub->width()});
+        covered += sub->width() * sub->height();
+    }
+    EXPECT_EQ(columns.size(), 2U) << "five in a grid";
+    EXPECT_EQ(covered, room.width() * room.height());
+}
+
+TEST_F(Mdi, ChildrenOfAFrameThatIsStillToBePlacedFitIt) {
+    CMDIChildWnd* placed = open();
+    placed->MoveWindow(20, 30, 300, 200);
+    CMDIChildWnd* early = open();
+    const QSize before = early->GetState()->widget()->size();
+    // What a window manager does with a frame that comes up maximised: it tells its size later.
+    frame->GetState()->widget()->resize(frame->GetState()->widget()->size() * 2);
+    settle();
+    EXPECT_GT(early->GetState()->widget()->width(), before.width() * 3 / 2);
+    EXPECT_EQ(placed->GetState()->widget()->geometry(), QRect(20, 30, 300, 200)) << "where it was moved to";
+    QTest::qWait(50);
+    const QSize known = early->GetState()->widget()->size();
+    frame->GetState()->widget()->resize(frame->GetState()->widget()->size() / 2);
+    settle();
+    EXPECT_EQ(early->GetState()->widget()->size(), known) << "the user's own sizing leaves children alone";
+}
+
+TEST_F(Mdi, ChildrenMoveAndSizeByKeys) {
+    CMDIChildWnd* child = open();
+    child->MoveWindow(20, 30, 300, 200);
+    settle();
+    const auto change = [child](UINT command, const std::vector<Qt::Key>& keys) {
+        later([keys] {
+            for (const Qt::Key each : keys) {
+                key(each);
+            }
+        });
+        child->SendMessage(WM_SYSCOMMAND, command);
+        return child->GetState()->widget()->geometry();
+    };
+    EXPECT_EQ(change(SC_MOVE, {Qt::Key_Right, Qt::Key_Down, Qt::Key_Down, Qt::Key_Return}), QRect(28, 46, 300, 200));
+    EXPECT_EQ(change(SC_SIZE, {Qt::Key_Left, Qt::Key_Return}), QRect(28, 46, 292, 200));
+    EXPECT_EQ(change(SC_MOVE, {Qt::Key_Right, Qt::Key_Escape}), QRect(28, 46, 292, 200));
+    EXPECT_TRUE(journal().empty()) << "the keys are nobody else's";
 }
 
 TEST_F(Mdi, OpenFilesAreActivatedInsteadOfOpenedTwice) {

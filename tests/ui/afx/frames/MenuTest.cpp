@@ -1,4 +1,5 @@
 #include "platform/afx/core/Menu.h"
+#include "platform/afx/core/detail/MenuWidgets.h"
 #include "platform/afx/core/detail/Menus.h"
 #include "tests/ui/afx/frames/FrameTesting.h"
 
@@ -164,4 +165,56 @@ TEST_F(ContextMenu, SystemMenuIsTheWindowsOwn) {
     EXPECT_EQ(frame.GetSystemMenu(FALSE)->GetMenuItemCount(), before + 1);
     frame.GetSystemMenu(TRUE);
     EXPECT_EQ(frame.GetSystemMenu(FALSE)->GetMenuItemCount(), before);
+}
+
+namespace {
+
+class MenuKeysView : public NoteView {
+    DECLARE_DYNCREATE(MenuKeysView)
+
+public:
+    afx_msg void OnContextMenu(CWnd*, CPoint point) {
+        frametest::note(point == CPoint(-1, -1) ? "context menu by key" : "context menu by mouse");
+    }
+
+protected:
+    DECLARE_MESSAGE_MAP()
+};
+
+IMPLEMENT_DYNCREATE(MenuKeysView, NoteView)
+BEGIN_MESSAGE_MAP(MenuKeysView, NoteView)
+ON_WM_CONTEXTMENU()
+END_MESSAGE_MAP()
+
+} // namespace
+
+TEST_F(ContextMenu, OpensByKey) {
+    NoteFrame& frame = openNote();
+    CCreateContext context;
+    context.m_pNewViewClass = RUNTIME_CLASS(MenuKeysView);
+    context.m_pCurrentDoc = &document();
+    CWnd* added = frame.CreateView(&context, AFX_IDW_PANE_FIRST + 1);
+    ASSERT_NE(added, nullptr);
+    added->ShowWindow(SW_SHOW);
+    added->SetFocus();
+    key(Qt::Key_F10, Qt::ShiftModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{"context menu by key"});
+    EXPECT_FALSE(tvx::afx::menuHasKeyboard());
+}
+
+TEST_F(ContextMenu, TheBarShowsWhichEntryHasTheKeyboard) {
+    NoteFrame& frame = openNote();
+    auto* bar = qobject_cast<QMenuBar*>(widgetOf(frame)->menuWidget());
+    const QRect file = bar->actionGeometry(bar->actions()[0]);
+    const QRect edit = bar->actionGeometry(bar->actions()[1]);
+    const auto look = [&](const QRect& entry) { return bar->grab(entry).toImage(); };
+    const QImage plain = look(file);
+    const QImage plainEdit = look(edit);
+    key(Qt::Key_F10);
+    EXPECT_NE(look(file), plain);
+    key(Qt::Key_Right);
+    EXPECT_EQ(look(file), plain);
+    EXPECT_NE(look(edit), plainEdit);
+    key(Qt::Key_Escape);
+    EXPECT_EQ(look(edit), plainEdit);
 }
