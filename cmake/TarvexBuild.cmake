@@ -8,9 +8,12 @@ set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 set(CMAKE_EXPORT_COMPILE_COMMANDS ON)
 set(CMAKE_RUNTIME_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/bin")
 set(CMAKE_LIBRARY_OUTPUT_DIRECTORY "${PROJECT_BINARY_DIR}/lib")
-# A translated resource library is looked up beside its module, so programs and libraries keep their real paths.
-set(CMAKE_BUILD_RPATH_USE_ORIGIN ON)
+# A translated resource library is looked up beside its module, so programs and libraries keep their real paths. What is
+# built has the search path that it is installed with: the build's own one would be padded to that one's length with empty
+# entries, and the loader takes an empty entry for the current folder.
+set(CMAKE_BUILD_WITH_INSTALL_RPATH ON)
 set(CMAKE_INSTALL_RPATH "$ORIGIN;$ORIGIN/../lib")
+set(CMAKE_INSTALL_RPATH_USE_LINK_PATH ON)
 
 # ccache keeps what is compiled with precompiled headers only when it is told that their macros and times may be trusted.
 find_program(TVX_CCACHE ccache)

@@ -23,6 +23,10 @@ awk -v folder="$host" '
     cat "$work/log"
     fail "the application of the page is built"
 }
+"$(dirname "$0")/../../../scripts/checks/runpath" "$installed" "$out" >"$work/log" || {
+    cat "$work/log"
+    fail "neither the installation nor the application looks for libraries in the current folder"
+}
 "$out/marks" -smoketest || fail "its smoke test passes"
 
 sheet="$work/sheet.mks"
