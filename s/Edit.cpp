@@ -3,7 +3,9 @@
 #include "platform/base/Text.h"
 
 #include <algorithm>
+#include <string>
 #include <string_view>
+#include <vector>
 
 BEGIN_MESSAGE_MAP(Gui_Edit, CEdit)
 ON_WM_RBUTTONUP()
@@ -66,36 +68,85 @@ bool isWordStart(std::string_view text, std::size_t at) {
     return at == 0 || isSpaceAt(text, tvx::text::characterStart(text, at - 1));
 }
 
-/// Bytes of as many characters as `model` has. Letters that are equal without case need not have the same length.
-std::size_t lengthOfCharacters(std::string_view text, std::string_view model) {
-    std::size_t length = 0;
-    for (std::size_t at = 0; at < model.size(); at += tvx::text::characterLength(model, at)) {
-        length += tvx::text::characterLength(text, length);
-    }
-    return length;
+/// The characters of a text as a search compares them. None changes its place by that, but its bytes may.
+std::string compared(std::string_view text, Case sense) {
+    return sense == Case::Match ? std::string(text) : tvx::text::foldCase(text);
 }
 
-/// Where a match that begins at `at` ends; npos when none does.
-std::size_t matchEnd(std::string_view text, std::size_t at, const Search& search) {
-    const std::string_view rest = text.substr(at);
-    if (search.sense == Case::Match) {
-        return rest.starts_with(search.wanted) ? at + search.wanted.size() : std::string_view::npos;
+/// Finds a text in characters that come one by one, and never looks at one again: of what has matched so far it knows
+/// how much still does when the next one does not fit.
+class Matcher {
+public:
+    explicit Matcher(std::string_view wanted) {
+        for (std::size_t at = 0; at < wanted.size();) {
+            m_wanted.push_back(tvx::text::decode(wanted, at));
+        }
+        m_begins.resize(m_wanted.size());
+        m_shorter.push_back(0);
+        for (std::size_t i = 1; i < m_wanted.size(); ++i) {
+            advance(m_wanted[i]);
+            m_shorter.push_back(m_matched);
+        }
+        m_matched = 0;
     }
-    if (!tvx::text::startsWithNoCase(rest, search.wanted)) {
-        return std::string_view::npos;
+
+    /// Takes the character that begins at `place`. Whether the text that is looked for ends with it.
+    bool take(char32_t character, std::size_t place) {
+        m_begins[m_taken++ % m_begins.size()] = place;
+        advance(character);
+        return m_matched == m_wanted.size();
     }
-    return at + lengthOfCharacters(rest, search.wanted);
+    /// Where the text begins that has just been found.
+    std::size_t begin() const {
+        return m_begins[m_taken % m_begins.size()];
+    }
+
+private:
+    void advance(char32_t character) {
+        while (m_matched > 0 && (m_matched == m_wanted.size() || m_wanted[m_matched] != character)) {
+            m_matched = m_shorter[m_matched - 1];
+        }
+        m_matched += m_wanted[m_matched] == character ? 1 : 0;
+    }
+
+    std::u32string m_wanted;
+    std::vector<std::size_t> m_shorter; ///< for each length that matches, the next shorter one that does as well
+    std::vector<std::size_t> m_begins;  ///< of the latest characters, in turns
+    std::size_t m_matched = 0;
+    std::size_t m_taken = 0;
+};
+
+bool isAccepted(std::string_view text, const Found& found, Place place) {
+    const bool wordEnd = found.end == text.size() || isSpaceAt(text, found.end);
+    return place == Place::Any || (wordEnd && isWordStart(text, found.start));
+}
+
+/// Nothing stands everywhere, but not everywhere as a word.
+Found findNothing(std::string_view text, std::size_t start, Place place) {
+    for (std::size_t at = start; at < text.size(); at += tvx::text::characterLength(text, at)) {
+        if (isAccepted(text, {at, at}, place)) {
+            return {at, at};
+        }
+    }
+    return {std::string_view::npos, std::string_view::npos};
 }
 
 Found findFrom(std::string_view text, std::size_t start, const Search& search) {
-    bool wordStart = search.place == Place::Any || isWordStart(text, start);
-    for (std::size_t at = start; at < text.size(); at += tvx::text::characterLength(text, at)) {
-        const std::size_t end = wordStart ? matchEnd(text, at, search) : std::string_view::npos;
-        const bool wordEnd = search.place == Place::Any || end == text.size();
-        if (end != std::string_view::npos && (wordEnd || isSpaceAt(text, end))) {
-            return {at, end};
+    if (search.wanted.empty()) {
+        return findNothing(text, start, search.place);
+    }
+    Matcher matcher(compared(search.wanted, search.sense));
+    const std::string folded = compared(text.substr(start), search.sense);
+    std::size_t foldedAt = 0;
+    for (std::size_t at = start; at < text.size();) {
+        const std::size_t place = at;
+        at += tvx::text::characterLength(text, at);
+        if (matcher.take(tvx::text::decode(folded, foldedAt), place)) {
+            const Found found{matcher.begin(), at};
+            if (isAccepted(text, found, search.place)) {
+                return found;
+            }
         }
-        wordStart = search.place == Place::Any || isSpaceAt(text, at);
     }
     return {std::string_view::npos, std::string_view::npos};
 }
@@ -134,6 +185,7 @@ namespace {
 
 constexpr int limitOfLines = 60000;
 constexpr int limitOfLine = 30000;
+constexpr std::size_t longestCharacter = 4;
 
 int limitOf(CEdit& edit) {
     if (edit.GetLimitText() == 0) {
@@ -142,15 +194,36 @@ int limitOf(CEdit& edit) {
     return static_cast<int>(std::min<UINT>(edit.GetLimitText(), INT_MAX));
 }
 
-/// The end of `text` that the limit has room for, cut between characters, as the control can take it.
-CString lastPart(const CString& text, int limit) {
-    std::size_t start = static_cast<std::size_t>(std::max(text.GetLength() - limit, 0));
-    while (tvx::text::characterStart(text.View(), start) != start) {
+/// A text as the control will hold and count it: with one line, or with "\r\n" between its lines. Of one that is
+/// larger than the limit only an end is taken, which is larger too and may begin within a character.
+std::string asHeld(const CEdit& edit, std::string_view text, std::size_t limit) {
+    const bool manyLines = (edit.GetStyle() & ES_MULTILINE) != 0;
+    if (!manyLines) {
+        text = text.substr(0, text.find_first_of("\r\n"));
+    }
+    text = text.substr(text.size() - std::min(text.size(), limit + longestCharacter));
+    std::string held;
+    held.reserve(text.size());
+    for (std::size_t at = 0; at < text.size(); ++at) {
+        const char c = text[at];
+        if (c == '\r' || c == '\n') {
+            held += "\r\n";
+            at += text.substr(at).starts_with("\r\n") ? 1 : 0;
+        } else {
+            held += c == '\0' ? ' ' : c;
+        }
+    }
+    return held;
+}
+
+/// The end of a text that the limit has room for, cut between characters and not within a line end.
+std::string_view lastPart(std::string_view text, std::size_t limit) {
+    std::size_t start = text.size() - std::min(text.size(), limit);
+    while (tvx::text::characterStart(text, start) != start) {
         ++start;
     }
-    CString part(text.View().substr(start));
-    part.Replace('\0', ' ');
-    return part;
+    const bool splitsLineEnd = start > 0 && text[start - 1] == '\r' && text.substr(start).starts_with('\n');
+    return text.substr(splitsLineEnd ? start + 1 : start);
 }
 
 /// What the user sees of a control of many lines. When that is not the end, or something is selected, it stays while
@@ -209,18 +282,18 @@ void Gui_Edit::AppendText(CEdit& edit, const CString& text) {
     edit.GetSel(start, end);
     const bool selected = start != end;
     View view(edit, selected);
-    const int limit = limitOf(edit);
-    const CString added = lastPart(text, limit);
-    const int excess = added.GetLength() - (limit - edit.GetWindowTextLength());
-    if (excess > 0) {
-        const int dropped = dropOldest(edit, excess);
+    const auto limit = static_cast<std::size_t>(limitOf(edit));
+    const std::string held = asHeld(edit, text.View(), limit);
+    const auto old = static_cast<std::size_t>(edit.GetWindowTextLength());
+    if (held.size() + old > limit) {
+        const int dropped = dropOldest(edit, static_cast<int>(std::min(held.size() + old - limit, old)));
         start = std::max(start - dropped, 0);
         end = std::max(end - dropped, 0);
         view.textDropped();
     }
     const int length = edit.GetWindowTextLength();
     edit.SetSel(length, length, TRUE);
-    edit.ReplaceSel(added, FALSE);
+    edit.ReplaceSel(CString(lastPart(held, limit)), FALSE);
     if (selected) {
         edit.SetSel(start, end, TRUE);
     }

@@ -37,12 +37,13 @@ public:
     int FindTextA(unsigned long flags, _findtextexa* find);
 
     /// Appends a text and drops the oldest text that the control's limit has no room for; of a text larger than the
-    /// limit the end is kept. What was selected stays selected as far as it is still there, otherwise the caret stands
-    /// behind the new text. The view follows the new text when the end was in sight and nothing selected; else the
-    /// lines that the user looks at stay where they are.
+    /// limit the end is kept and nothing else. The limit is kept in what the control holds: a line end counts two
+    /// however it is written, and of a text for one line only the first counts. What was selected stays selected as
+    /// far as it is still there, otherwise the caret stands behind the new text. The view follows the new text when the
+    /// end was in sight and nothing selected; else the lines that the user looks at stay where they are.
     ///
-    /// A control without a limit (0) gets one: 60000, of one line 30000. Zero bytes become blanks. Nothing can be
-    /// undone afterwards.
+    /// A control without a limit (`SetLimitText(0)`) gets one: 60000, of one line 30000. Zero bytes become blanks.
+    /// Nothing can be undone afterwards.
     static void AppendText(CEdit& edit, const CString& text);
     /// The same for this control.
     void AppendText(const CString& text);

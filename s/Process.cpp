@@ -192,39 +192,38 @@ void Gui_Process::SetReleasePolicy(ReleasePolicy policy, unsigned long exitCode)
     m_record->SetPolicy(policy, static_cast<DWORD>(exitCode));
 }
 
-int Gui_Process::HasOutput() {
-    Record& record = *m_record;
-    record.lastError = 0;
+DWORD Gui_Process::Record::WaitingBytes() {
+    lastError = 0;
     DWORD waiting = 0;
-    if (isValid(record.outputPipe) && !PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr)) {
-        record.NoteError();
+    if (isValid(outputPipe) && !PeekNamedPipe(outputPipe, nullptr, 0, nullptr, &waiting, nullptr)) {
+        NoteError();
     }
-    return waiting > 0;
+    return waiting;
+}
+
+int Gui_Process::HasOutput() {
+    return m_record->WaitingBytes() > 0 || !m_record->unfinished.empty();
 }
 
 int Gui_Process::GetOutput(CString& text) {
     Record& record = *m_record;
-    record.lastError = 0;
-    if (!isValid(record.outputPipe)) {
-        return 0;
-    }
-    DWORD waiting = 0;
-    if (!PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, &waiting, nullptr)) {
-        record.NoteError();
-    }
-    if (waiting == 0) {
+    const DWORD waiting = record.WaitingBytes();
+    const std::string held = std::exchange(record.unfinished, {});
+    const int most = static_cast<int>(held.size() + waiting);
+    if (most == 0) {
         return 0;
     }
     // A larger buffer has no use for the old content.
-    if (text.GetAllocLength() <= static_cast<int>(waiting)) {
+    if (text.GetAllocLength() <= most) {
         text.Empty();
     }
     DWORD count = 0;
-    char* buffer = text.GetBuffer(static_cast<int>(waiting) + 1);
-    if (!ReadFile(record.outputPipe, buffer, waiting, &count, nullptr)) {
+    char* const buffer = text.GetBuffer(most + 1);
+    char* const behind = std::ranges::copy(held, buffer).out;
+    if (waiting > 0 && !ReadFile(record.outputPipe, behind, waiting, &count, nullptr)) {
         record.NoteError();
     }
-    text.ReleaseBuffer(static_cast<int>(count));
+    text.ReleaseBuffer(static_cast<int>(held.size() + count));
     return 1;
 }
 

@@ -74,7 +74,8 @@ public:
     /// A child with captured output is always terminated with 1: the call is ignored while one is held.
     void SetReleasePolicy(ReleasePolicy policy, unsigned long exitCode);
 
-    /// Whether captured output waits to be read: 1 or 0.
+    /// Whether captured output waits to be read: 1 or 0. Half a character or line end that AppendOutput holds back
+    /// waits too.
     int HasOutput();
     /// Reads all captured output that waits, as it is.
     /// @param text  replaced; unchanged when nothing waits
@@ -82,13 +83,15 @@ public:
     int GetOutput(CString& text);
     /// Appends the captured output that waits to a log, whose oldest text gives way at its limit
     /// (Gui_Edit::AppendText). A child that writes faster than the log takes it does not hold up the caller: what comes
-    /// during the call may be left for the next one.
-    /// @param lastChunk  receives the piece that was read last, when there was one; may be null
+    /// during the call may be left for the next one. Half a character or half a line end at the end of what has come is
+    /// held back for its rest, until the child has ended or for 200 milliseconds; then a further call appends it as it
+    /// is.
+    /// @param lastChunk  receives the piece that was appended last, when there was one; may be null
     /// @return whether anything was appended: 1 or 0
     int AppendOutput(CEdit& edit, CString* lastChunk);
-    /// Asks for one message as soon as there is something to do: output waits, no more can come, or the child has
-    /// ended. Ask again when it has been handled; messages come at most once a frame. Release and the window's end
-    /// withdraw the request.
+    /// Asks for one message as soon as there is something to do: output waits, what was held back has waited long
+    /// enough, no more can come, or the child has ended. Ask again when it has been handled; messages come at most once
+    /// a frame. Release and the window's end withdraw the request.
     /// @param window   one of this thread; it gets the message with two zeros
     /// @param message  its number; a later request with the same window and number replaces this one
     /// @return 1, or 0 when nothing is to be expected: no child, or GetExitCode has told its end and no output can come

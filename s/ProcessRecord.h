@@ -3,6 +3,7 @@
 #include "platform/win/Handle.h"
 #include "s/Process.h"
 
+#include <chrono>
 #include <string>
 
 /// What a process object knows of its child.
@@ -19,10 +20,17 @@ struct Gui_Process::Record {
     DWORD processId = 0;
     bool notifies = false;  ///< a message about the child was asked for
     CString chunk;          ///< what AppendOutput read last: its room is used again
-    std::string unfinished; ///< output that waits for its rest before it is shown
+    std::string unfinished; ///< read, but it waits for its rest before it is shown
+    std::chrono::steady_clock::time_point unfinishedSince;
 
     /// Asks for the exit code as long as the child runs.
     DWORD CurrentExitCode();
+    /// Bytes that can be read; notes the error when none can come any more.
+    DWORD WaitingBytes();
+    /// Takes half a character or half a line end from the end of what was read, to be read again with its rest.
+    void HoldBack(CString& text);
+    /// How long what is held back still waits for its rest.
+    std::chrono::milliseconds Patience() const;
     /// Withdraws requests for messages about the child.
     void StopNotifying();
     /// Keeps the error of a call of the platform that failed.

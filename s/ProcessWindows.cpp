@@ -21,6 +21,10 @@ namespace {
 /// How long output is read before the user's input gets its turn. What waits when the reading begins takes a fraction.
 constexpr std::chrono::milliseconds readingTime{8};
 
+/// How long the rest of a character or a line end is waited for. Programs write it at once unless their buffer was
+/// full.
+constexpr std::chrono::milliseconds patience{200};
+
 /// The most text that an edit control without a limit gets.
 constexpr std::size_t mostWithoutLimit = 60000;
 
@@ -61,31 +65,54 @@ std::size_t unfinishedLength(std::string_view text) {
 
 } // namespace
 
+void Gui_Process::Record::HoldBack(CString& text) {
+    const std::size_t length = unfinishedLength(text.View());
+    if (length > 0) {
+        const std::size_t rest = text.View().size() - length;
+        unfinished = text.View().substr(rest);
+        unfinishedSince = std::chrono::steady_clock::now();
+        text.Truncate(static_cast<int>(rest));
+    }
+}
+
+std::chrono::milliseconds Gui_Process::Record::Patience() const {
+    // A program that the child started may hold the pipe, but what the child began it does not end.
+    if (lastError == ERROR_BROKEN_PIPE || WaitForSingleObject(process, 0) == WAIT_OBJECT_0) {
+        return std::chrono::milliseconds(0);
+    }
+    const auto left = unfinishedSince + patience - std::chrono::steady_clock::now();
+    return std::max(std::chrono::ceil<std::chrono::milliseconds>(left), std::chrono::milliseconds(0));
+}
+
 int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
     using Clock = std::chrono::steady_clock;
     Record& record = *m_record;
     const auto deadline = Clock::now() + readingTime;
-    std::string text = std::exchange(record.unfinished, {});
     const std::size_t limit = limitOf(edit);
-    int found = 0;
+    std::string text;
     CString& chunk = record.chunk;
-    while (GetOutput(chunk)) {
-        found = 1;
+    const auto take = [&] {
         appendEnd(text, chunk.View(), limit);
-        if (lastChunk) {
+        if (lastChunk && !chunk.IsEmpty()) {
             *lastChunk = chunk;
         }
+    };
+    while (record.WaitingBytes() > 0) {
+        GetOutput(chunk);
+        record.HoldBack(chunk);
+        take();
         if (Clock::now() >= deadline) {
             break;
         }
     }
-    if (record.lastError != ERROR_BROKEN_PIPE) {
-        const std::size_t unfinished = unfinishedLength(text);
-        record.unfinished = text.substr(text.size() - unfinished);
-        text.resize(text.size() - unfinished);
+    // Asked for in this order: what the child wrote before its end is in the pipe by then.
+    const bool isDue = !record.unfinished.empty() && record.Patience().count() == 0;
+    if (isDue && record.WaitingBytes() == 0) {
+        chunk = CString(std::exchange(record.unfinished, {}));
+        take();
     }
     if (text.empty()) {
-        return found;
+        return 0;
     }
     Gui_Edit::AppendText(edit, CString(text));
     return 1;
@@ -98,11 +125,13 @@ int Gui_Process::NotifyWindow(HWND window, unsigned int message) {
     if (record.exitCode == STILL_ACTIVE) {
         handles[count++] = record.process;
     }
-    // A pipe at its end is readable for ever.
-    if (PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr)) {
+    // A pipe at its end is readable for ever: only what is held back is still to be shown then.
+    const bool isHeldBack = !record.unfinished.empty();
+    if (isHeldBack || PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr)) {
         handles[count++] = record.outputPipe;
     }
-    if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message)) {
+    const DWORD timeout = isHeldBack ? static_cast<DWORD>(record.Patience().count()) : INFINITE;
+    if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message, timeout)) {
         return 0;
     }
     record.notifies = true;

@@ -4,6 +4,7 @@
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/HandleWatches.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/win/Handle.h"
 #include "platform/win/detail/KernelObject.h"
 #include "platform/win/detail/ProcessObject.h"
 
@@ -30,9 +31,9 @@ using Objects = std::vector<std::shared_ptr<win::KernelObject>>;
 class Watch : public QObject {
 public:
     Watch(HWND window, UINT message) : m_window(window), m_message(message) {
-        m_nextFrame.setSingleShot(true);
-        m_nextFrame.setTimerType(Qt::PreciseTimer);
-        connectStoring(&m_nextFrame, &QTimer::timeout, this, [this] { post(); });
+        m_due.setSingleShot(true);
+        m_due.setTimerType(Qt::PreciseTimer);
+        connectStoring(&m_due, &QTimer::timeout, this, [this] { post(); });
     }
     ~Watch() override {
         disarm();
@@ -48,7 +49,7 @@ public:
         return std::ranges::find(m_handles, handle) != m_handles.end();
     }
 
-    void arm(std::span<const HANDLE> handles, Objects objects) {
+    void arm(std::span<const HANDLE> handles, Objects objects, DWORD timeout) {
         disarm();
         m_handles.assign(handles.begin(), handles.end());
         m_objects = std::move(objects);
@@ -57,10 +58,13 @@ public:
             connectStoring(notifier, &QSocketNotifier::activated, this, [this] { signalled(); });
             m_notifiers.push_back(notifier);
         }
+        if (timeout != INFINITE) {
+            m_due.start(std::max<std::chrono::milliseconds>(std::chrono::milliseconds(timeout), untilNextFrame()));
+        }
     }
 
     void disarm() {
-        m_nextFrame.stop();
+        m_due.stop();
         m_handles.clear();
         forgetObjects();
     }
@@ -69,16 +73,20 @@ private:
     void signalled() {
         // An object stays signalled: its notifier would call again at every turn of the loop.
         forgetObjects();
-        const auto wait = std::chrono::ceil<std::chrono::milliseconds>(m_lastPost + frame - Clock::now());
+        const auto wait = untilNextFrame();
         if (wait.count() > 0) {
-            m_nextFrame.start(wait);
+            m_due.start(wait);
         } else {
             post();
         }
     }
 
+    std::chrono::milliseconds untilNextFrame() const {
+        return std::chrono::ceil<std::chrono::milliseconds>(m_lastPost + frame - Clock::now());
+    }
+
     void post() {
-        m_handles.clear();
+        disarm();
         m_lastPost = Clock::now();
         PostMessage(m_window, m_message, 0, 0);
     }
@@ -98,7 +106,7 @@ private:
     std::vector<HANDLE> m_handles;
     Objects m_objects;
     std::vector<QSocketNotifier*> m_notifiers;
-    QTimer m_nextFrame;
+    QTimer m_due;
     Clock::time_point m_lastPost = Clock::now() - frame;
 };
 
@@ -137,7 +145,7 @@ void watchReleasedChildren() {
 
 using namespace tvx::afx;
 
-bool tvx::postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT message) {
+bool tvx::postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT message, DWORD timeout) {
     Objects objects;
     for (const HANDLE handle : handles) {
         objects.push_back(win::objectOf(handle));
@@ -145,7 +153,7 @@ bool tvx::postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT m
     if (!Window::from(window) || std::ranges::find(objects, nullptr) != objects.end()) {
         return false;
     }
-    watchOf(window, message).arm(handles, std::move(objects));
+    watchOf(window, message).arm(handles, std::move(objects), timeout);
     return true;
 }
 

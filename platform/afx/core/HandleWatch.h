@@ -12,6 +12,8 @@
 namespace tvx {
 
 /// Posts a message, once, as soon as one of the handles is signalled (see WaitForSingleObject); that may be so already.
+/// It is posted without that when some time has passed.
+///
 /// To be told again, call again when the message has been handled: then a child that writes faster than the window
 /// reads fills its pipe and not the window's messages.
 ///
@@ -22,8 +24,9 @@ namespace tvx {
 ///                 cancelPosts() is called, even when they are closed meanwhile.
 /// @param window   one of this thread. When it ends, the request ends.
 /// @param message  its number; both parameters are 0. A later call with the same window and number replaces this one.
+/// @param timeout  milliseconds until it is posted at the latest; `INFINITE`: only when a handle is signalled
 /// @return false when a handle or the window is none, with nothing changed
-TVX_PLATFORM_API bool postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT message);
+TVX_PLATFORM_API bool postWhenSignalled(std::span<const HANDLE> handles, HWND window, UINT message, DWORD timeout);
 
 /// Withdraws requests for a handle. Do so before closing it. A message that was posted already still arrives.
 TVX_PLATFORM_API void cancelPosts(HANDLE handle);

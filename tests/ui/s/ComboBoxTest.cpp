@@ -8,6 +8,7 @@
 
 #include <QAbstractItemView>
 #include <QComboBox>
+#include <QScrollBar>
 
 #include <string>
 
@@ -35,14 +36,20 @@ public:
         }
         combo.AddStringList(items, compare);
     }
-    /// The items that the open list shows at once.
-    int visibleItems() {
+    struct OpenList {
+        int rows; ///< that it shows at once
+        int rest; ///< pixels below them
+        bool isScrolled;
+    };
+    OpenList openList() {
         combo.ShowDropDown();
         const auto* box = dynamic_cast<QComboBox*>(tvx::afx::peerOf(combo.m_hWnd));
         EXPECT_TRUE(QTest::qWaitFor([&] { return box->view()->isVisible(); }));
-        const int rows = box->view()->viewport()->height() / combo.GetItemHeight(0);
+        const int height = box->view()->viewport()->height();
+        const int row = box->view()->visualRect(box->model()->index(0, 0)).height();
+        const OpenList list{height / row, height % row, box->view()->verticalScrollBar()->isVisible()};
         combo.ShowDropDown(FALSE);
-        return rows;
+        return list;
     }
 
     Gui_ComboBox combo;
@@ -82,17 +89,25 @@ TEST(ComboBox, DeletesFiltersAndSelectsByText) {
 }
 
 TEST(ComboBox, MakesRoomForItems) {
-    ComboWindow window;
-    window.merge({"1", "2", "3", "4", "5"}, nullptr);
-    CRect before;
-    window.combo.GetWindowRect(&before);
-    for (const auto& [asked, shown] : {std::pair(-1, 5), std::pair(3, 3), std::pair(9, 5)}) {
-        window.combo.SetSizeExact(asked);
-        CRect open;
-        window.combo.GetDroppedControlRect(&open);
-        EXPECT_EQ(open.Height(), (shown + 1) * window.combo.GetItemHeight(0) + window.combo.GetItemHeight(-1) + 4);
-        EXPECT_EQ(open.Width(), before.Width());
-        EXPECT_EQ(open.TopLeft(), before.TopLeft());
-        EXPECT_EQ(window.visibleItems(), shown);
+    for (const DWORD style : {CBS_DROPDOWNLIST, CBS_DROPDOWN}) {
+        ComboWindow window(style);
+        window.merge({"1", "2", "3", "4", "5"}, nullptr);
+        CRect before;
+        window.combo.GetWindowRect(&before);
+        for (const int height : {5, 15, 40}) {
+            window.combo.SetItemHeight(0, static_cast<UINT>(height));
+            for (const auto& [asked, shown] : {std::pair(-1, 5), std::pair(3, 3), std::pair(9, 5)}) {
+                window.combo.SetSizeExact(asked);
+                CRect open;
+                window.combo.GetDroppedControlRect(&open);
+                EXPECT_EQ(open.Height(), (shown + 1) * height + window.combo.GetItemHeight(-1) + 4);
+                EXPECT_EQ(open.Width(), before.Width());
+                EXPECT_EQ(open.TopLeft(), before.TopLeft());
+                const auto [rows, rest, isScrolled] = window.openList();
+                EXPECT_EQ(rows, shown) << height;
+                EXPECT_EQ(rest, 0) << height;
+                EXPECT_EQ(isScrolled, shown < 5) << height << " " << style << " " << asked;
+            }
+        }
     }
 }

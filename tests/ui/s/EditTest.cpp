@@ -109,6 +109,18 @@ TEST(Edit, FindsWordsInTextOfAnyLanguage) {
     EXPECT_EQ(window.find("ENDE", 0, 100, 2), 32);
 }
 
+TEST(Edit, FindsAmongTextsThatNearlyMatch) {
+    EditWindow window;
+    window.edit.SetWindowText("abababac aab aaab");
+    EXPECT_EQ(window.find("ababac", 0, 100, 0), 2);
+    EXPECT_EQ(window.find("aab", 0, 100, 6), 9);
+    EXPECT_EQ(window.find("AAAB", 0, 100, 2), 13);
+    EXPECT_EQ(window.find("", 3, 100, 0), 3);
+    // Comparing at every place would take 600 million steps.
+    window.edit.SetWindowText((std::string(50000, 'A') + "b").c_str());
+    EXPECT_EQ(window.find((std::string(25000, 'a') + "b").c_str(), 0, 60000, 0), 25000);
+}
+
 TEST(Edit, DropsTheOldestTextBeyondTheLimit) {
     EditWindow window;
     window.edit.SetLimitText(1000);
@@ -143,35 +155,44 @@ TEST(Edit, CutsBetweenCharactersOnly) {
     EXPECT_EQ(window.text(), "\r\n1234567");
     window.edit.AppendText("89"); // half of a line's end: all of it
     EXPECT_EQ(window.text(), "123456789");
-    window.edit.AppendText("€€€€"); // more than the limit: the last of it
-    EXPECT_EQ(window.text(), "9€€€");
+    window.edit.AppendText("€€€€"); // more than the limit: the last of it, and nothing old
+    EXPECT_EQ(window.text(), "€€€");
+}
+
+TEST(Edit, KeepsTheLimitInWhatTheControlCounts) {
+    const struct {
+        DWORD style;
+        const char* before;
+        const char* added;
+        const char* after;
+    } cases[] = {
+        {logStyle, "", "a\nb\nc\nd\n", "b\r\nc\r\nd\r\n"}, // each counts two
+        {logStyle, "12345678", "a\r", "2345678a\r\n"},
+        {logStyle, "old", "1\r\n3456789", "1\r\n3456789"}, // just the limit
+        {logStyle, "old", "a\n123456789", "123456789"},    // half of the line's end has no room
+        {logStyle, "old", "äa\n12345678", "\r\n12345678"},
+        {WS_CHILD, "12345678", "ab\r\n", "12345678ab"}, // the line's end is not taken
+        {WS_CHILD, "12345678", "abc\nlost", "2345678abc"},
+    };
+    for (const auto& [style, before, added, after] : cases) {
+        EditWindow window(style);
+        window.edit.SetLimitText(10);
+        window.edit.SetWindowText(before);
+        window.edit.AppendText(added);
+        EXPECT_EQ(window.text(), after) << added;
+    }
 }
 
 TEST(Edit, GetsALimitWhereItHasNone) {
-    class Unlimited : public Gui_Edit {
-    public:
-        UINT given = 0;
-
-    protected:
-        LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
-            if (message == EM_GETLIMITTEXT) {
-                return given;
-            }
-            if (message == EM_SETLIMITTEXT) {
-                given = static_cast<UINT>(wParam);
-            }
-            return Gui_Edit::WindowProc(message, wParam, lParam);
-        }
-    };
-    EditWindow window;
-    Unlimited lines;
-    lines.Create(logStyle, CRect(0, 0, 10, 10), &window, 2);
-    lines.AppendText("x");
-    EXPECT_EQ(lines.given, 60000u);
-    Unlimited line;
-    line.Create(WS_CHILD, CRect(0, 0, 10, 10), &window, 3);
-    line.AppendText("x");
-    EXPECT_EQ(line.given, 30000u);
+    for (const auto& [style, limit] : {std::pair<DWORD, UINT>{logStyle, 60000}, {WS_CHILD, 30000}}) {
+        EditWindow window(style);
+        window.edit.SetLimitText(0);
+        window.edit.SetWindowText(std::string(limit, 'x').c_str());
+        EXPECT_EQ(window.edit.GetLimitText(), 0u);
+        window.edit.AppendText("end");
+        EXPECT_EQ(window.edit.GetLimitText(), limit);
+        EXPECT_EQ(window.text(), std::string(limit - 3, 'x') + "end");
+    }
 }
 
 TEST(Edit, LeavesTheMenuOfARightClickToTheParent) {

@@ -12,6 +12,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <csignal>
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
@@ -140,9 +141,40 @@ TEST(ProcessOutput, WakesTheWindowUntilTheEnd) {
     EXPECT_EQ(window.process.GetExitCode(), 6u);
 }
 
+namespace {
+
+/// Lets a child wait at a place of its script until it is told to go on.
+class Gate {
+public:
+    Gate() : m_name((std::filesystem::temp_directory_path() / "gate").string()) {
+        EXPECT_EQ(::mkfifo(m_name.c_str(), 0600), 0);
+    }
+    ~Gate() {
+        std::filesystem::remove(m_name);
+    }
+    std::string script(const std::string& before, const std::string& behind) const {
+        return "sh -c \"" + before + "; cat " + m_name + "; " + behind + "\"";
+    }
+    void open() const {
+        std::ofstream(m_name).flush();
+    }
+
+private:
+    std::string m_name;
+};
+
+/// Starts a child and appends the first piece that it writes. The result is that of the call.
+int appendFirst(LogWindow& window, const std::string& commandLine) {
+    EXPECT_EQ(window.process.Run(commandLine.c_str(), nullptr, 1, 1), 1);
+    while (!window.process.HasOutput()) {
+        window.process.Wait(1);
+    }
+    return window.process.AppendOutput(window.edit, nullptr);
+}
+
+} // namespace
+
 TEST(ProcessOutput, IsNotCutInCharactersAndLineEnds) {
-    namespace fs = std::filesystem;
-    const std::string gate = (fs::temp_directory_path() / "gate").string();
     const struct {
         const char* first;
         const char* second;
@@ -154,20 +186,47 @@ TEST(ProcessOutput, IsNotCutInCharactersAndLineEnds) {
         {"\\360\\237\\230", "\\200", "", "\U0001F600"},
     };
     for (const auto& [first, second, shown, whole] : cases) {
-        ASSERT_EQ(::mkfifo(gate.c_str(), 0600), 0);
+        const Gate gate;
         LogWindow window;
-        const std::string script = std::string("printf '") + first + "'; cat " + gate + "; printf '" + second + "'";
-        ASSERT_EQ(window.process.Run(("sh -c \"" + script + "\"").c_str(), nullptr, 1, 1), 1);
-        while (!window.process.AppendOutput(window.edit, nullptr)) {
-            window.process.Wait(1);
-        }
+        const std::string printf = "printf '";
+        EXPECT_EQ(appendFirst(window, gate.script(printf + first + "'", printf + second + "'")), *shown ? 1 : 0);
         EXPECT_EQ(window.text(), shown);
-        std::ofstream(gate).flush();
+        EXPECT_EQ(window.process.HasOutput(), 1) << "the rest waits";
+        gate.open();
         window.process.Wait(0xFFFFFFFF);
         EXPECT_EQ(window.process.AppendOutput(window.edit, nullptr), 1);
         EXPECT_EQ(window.text(), whole);
-        fs::remove(gate);
+        EXPECT_EQ(window.process.HasOutput(), 0);
     }
+}
+
+TEST(ProcessOutput, WhatWaitsForItsRestIsNotLost) {
+    const Gate gate;
+    LogWindow window;
+    EXPECT_EQ(appendFirst(window, gate.script("sleep 1000 & printf 'a\\r'", "true")), 1);
+    EXPECT_EQ(window.text(), "a");
+    gate.open();
+    window.process.Wait(0xFFFFFFFF);
+    EXPECT_FALSE(window.process.IsActive());
+    EXPECT_TRUE(window.process.HasOutput());
+    EXPECT_TRUE(window.process.NotifyWindow(window.m_hWnd, outputMessage));
+    ASSERT_TRUE(QTest::qWaitFor([&] { return window.messages == 1; })); // though a grandchild holds the pipe
+    EXPECT_EQ(window.text(), "a\r\n");
+    EXPECT_FALSE(window.process.HasOutput());
+    ::kill(-static_cast<pid_t>(window.process.GetProcessId()), SIGKILL);
+    window.process.Release();
+
+    // Neither from who reads it another way.
+    CString text;
+    EXPECT_EQ(appendFirst(window, gate.script("printf 'b\\303'", "true")), 1);
+    EXPECT_EQ(window.process.GetOutput(text), 1);
+    EXPECT_EQ(text, "\xC3");
+    EXPECT_FALSE(window.process.HasOutput());
+    window.process.Release();
+
+    // Nor is it waited for without end.
+    ASSERT_TRUE(window.show("sh -c \"printf 'c\\r'; exec sleep 1000\""));
+    EXPECT_TRUE(QTest::qWaitFor([&] { return window.text() == "a\r\nbc\r\n"; }));
 }
 
 TEST(ProcessOutput, KeepsTheEndOfWhatIsMoreThanTheLimit) {
@@ -175,8 +234,7 @@ TEST(ProcessOutput, KeepsTheEndOfWhatIsMoreThanTheLimit) {
     window.edit.SetLimitText(20);
     ASSERT_TRUE(window.show("sh -c \"yes 12345678 | head -c 4999995; printf '<the end>'\""));
     ASSERT_TRUE(window.waitForEnd());
-    // The limit counts a line end as it came.
-    EXPECT_LE(window.edit.GetTextLength(), 22);
+    EXPECT_LE(window.edit.GetTextLength(), 20);
     EXPECT_TRUE(window.text().ends_with("78\r\n<the end>")) << window.text();
 }
 

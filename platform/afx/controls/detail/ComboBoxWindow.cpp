@@ -18,6 +18,8 @@
 #include <QValidator>
 #include <QWheelEvent>
 
+#include <utility>
+
 namespace tvx::afx {
 
 /// Shows the box's lines to the toolkit without copying them.
@@ -58,6 +60,9 @@ private:
 };
 
 namespace {
+
+/// Stands for the field where the index of a line is asked for.
+constexpr int fieldIndex = -1;
 
 /// Refuses what the user types beyond a number of bytes. The toolkit's own limit counts units of UTF-16, and cuts what
 /// the program sets as well.
@@ -172,13 +177,16 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     auto* face = new ComboFace(parent, *this);
     face->setModel(m_model.get());
     m_noLines = new QStringListModel(face);
+    // The list is made by what the box is just now. For one that is not typed into, some styles give it arrows that
+    // take the place of lines, and no scroll bar.
+    face->setEditable(true);
     face->setItemDelegate(new ItemDelegate(face, *this));
+    face->setEditable(isEditable());
     // By default the toolkit adds to the lines what is typed and ended with Enter.
     face->setInsertPolicy(QComboBox::NoInsert);
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
     connectStoring(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
     if (isEditable()) {
-        face->setEditable(true);
         // The toolkit would complete what is typed with the first line that begins so.
         face->setCompleter(nullptr);
         connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
@@ -212,23 +220,31 @@ void ComboBoxWindow::widgetMade() {
 void ComboBoxWindow::fontChanged() {
     Control::fontChanged();
     // The lines of an owner-drawn box are as high as the owner answered, whatever the font.
-    if (!isOwnerDrawn()) {
-        m_itemHeight = widget()->fontMetrics().height() + 2;
+    setItemHeight(isOwnerDrawn() ? m_itemHeight : widget()->fontMetrics().height() + 2);
+}
+
+void ComboBoxWindow::setItemHeight(int height) {
+    if (std::exchange(m_itemHeight, height) != height) {
+        // The list keeps the places of its lines from the last time that it was open.
+        guarded([this] { box()->view()->doItemsLayout(); });
     }
     applyHeights();
 }
 
 void ComboBoxWindow::measure() {
-    m_itemHeight = askHeight(m_itemHeight);
-    applyHeights();
+    setItemHeight(askHeight(m_itemHeight));
+}
+
+int ComboBoxWindow::fieldHeight() const {
+    return std::max(widget()->fontMetrics().height(), m_itemHeight);
 }
 
 void ComboBoxWindow::applyHeights() {
-    const int closed = std::max(widget()->fontMetrics().height(), m_itemHeight) + 8;
+    const int closed = fieldHeight() + 8;
     guarded([&] {
         // The height that hosts give is that of the open list; closed, a box is as high as its line.
         widget()->setFixedHeight(closed);
-        box()->setMaxVisibleItems(std::clamp((m_openHeight - closed) / m_itemHeight, 1, 100));
+        box()->setMaxVisibleItems(std::max((m_openHeight - closed) / m_itemHeight, 1));
     });
 }
 
@@ -423,10 +439,9 @@ LRESULT ComboBoxWindow::listProc(UINT message, WPARAM wParam, LPARAM lParam, boo
         return TRUE;
     }
     case CB_GETITEMHEIGHT:
-        return m_itemHeight;
+        return static_cast<int>(wParam) == fieldIndex ? fieldHeight() : m_itemHeight;
     case CB_SETITEMHEIGHT:
-        m_itemHeight = std::clamp(static_cast<int>(lParam), 1, 1000);
-        applyHeights();
+        setItemHeight(std::clamp(static_cast<int>(lParam), 1, 1000));
         return CB_OKAY;
     case CB_SETDROPPEDWIDTH:
         box()->view()->setMinimumWidth(static_cast<int>(wParam));

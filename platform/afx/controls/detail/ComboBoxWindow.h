@@ -47,6 +47,8 @@ private:
     QComboBox* box() const;
     QLineEdit* field() const;
     void measure();
+    int fieldHeight() const;
+    void setItemHeight(int height);
     void applyHeights();
     void chosen(int index);
     LRESULT add(LONG_PTR index, LPARAM text, bool sorted);

@@ -20,6 +20,8 @@ namespace {
 
 /// What can be typed into a control that no limit was set for.
 constexpr int defaultLimit = 30000;
+/// What stands for the absence of a limit.
+constexpr int noLimit = 0;
 
 std::unique_ptr<Window> makeEdit(const CREATESTRUCT& cs) {
     return std::make_unique<EditWindow>(cs);
@@ -159,7 +161,8 @@ void EditWindow::insert(QString text, Source source, Undo undo) {
         const TextRange selection = m_field->selection();
         const int replaced = m_field->bytesAt(selection.last()) - m_field->bytesAt(selection.first());
         const int kept = m_field->bytes() - replaced;
-        const int units = toolkitUnits(text, std::max(m_limit - kept, 0));
+        const int limit = m_limit == noLimit ? std::numeric_limits<int>::max() : m_limit;
+        const int units = toolkitUnits(text, std::max(limit - kept, 0));
         if (units < text.size()) {
             text.truncate(units);
             const HWND self = handle();
@@ -346,7 +349,7 @@ LRESULT EditWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
         m_field->setModified(wParam != 0);
         return 0;
     case EM_SETLIMITTEXT:
-        m_limit = wParam == 0 ? std::numeric_limits<int>::max() : text::clampToInt32(static_cast<LONG_PTR>(wParam));
+        m_limit = text::clampToInt32(static_cast<LONG_PTR>(wParam));
         return 0;
     case EM_GETLIMITTEXT:
         return m_limit;
