@@ -69,7 +69,7 @@ HDC CreateCompatibleDC(HDC dc) {
     static const HGDIOBJ onePixel = [] {
         QImage pixel(1, 1, QImage::Format_RGB32);
         pixel.fill(Qt::black);
-        return addGdiObject(BitmapObject{pixel, PixelFormat::Monochrome, nullptr}, GdiOwner::Stock);
+        return addGdiObject(BitmapObject{pixel, PixelFormat::Monochrome, nullptr, 1}, GdiOwner::Stock);
     }();
     auto target = std::make_unique<MemoryTarget>();
     target->bitmap = findTool<BitmapObject>(onePixel);

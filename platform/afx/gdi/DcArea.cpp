@@ -17,9 +17,9 @@ BOOL fillLogical(HDC handle, const RECT& rect, const BrushObject& brush, Rop2 ro
     }
     Drawing drawing(*dc);
     QImage pattern;
-    const auto ink = dc->brushInk(brush, rop, pattern);
+    const auto ink = dc->brushInk(drawing.canvas, brush, rop, pattern);
     if (drawing && ink) {
-        drawing.canvas.fill(dc->state.mapping.toPixels(rect), *ink);
+        drawing.canvas.fill(drawing.pixels(rect), *ink);
     }
     return TRUE;
 }
@@ -87,12 +87,12 @@ BOOL CDC::FillRgn(CRgn* region, CBrush* brush) {
     }
     Drawing drawing(*dc);
     QImage pattern;
-    const auto ink = dc->brushInk(*tool, Rop2::Copy, pattern);
+    const auto ink = dc->brushInk(drawing.canvas, *tool, Rop2::Copy, pattern);
     if (!drawing || !ink) {
         return TRUE;
     }
     for (const QRect& rect : area->region) {
-        drawing.canvas.fill(rect, *ink);
+        drawing.canvas.fill(drawing.canvas.pixels(rect), *ink);
     }
     return TRUE;
 }
@@ -229,8 +229,10 @@ void CDC::DrawFocusRect(const RECT* rect) {
         return;
     }
     // Every second pixel by its place, so that the dots stay where they are when the frame grows.
-    std::vector<QPoint> dots = framePixels(dc->state.mapping.toPixels(*rect), drawing.canvas.bounds());
-    std::erase_if(dots, [](QPoint point) { return ((point.x() + point.y()) & 1) != 0; });
+    std::vector<QPoint> dots = framePixels(drawing.pixels(*rect), drawing.canvas.bounds());
+    const QPoint first = drawing.canvas.pixel({});
+    std::erase_if(dots,
+                  [first](QPoint dot) { return ((dot.x() - first.x() + dot.y() - first.y()) & 1) != 0; });
     drawing.canvas.plot(dots, {whitePixel, Rop2::XorPen, nullptr, {}});
 }
 
@@ -250,11 +252,12 @@ BOOL drawIcon(HDC handle, QPoint logical, HICON icon, QSize size) {
     }
     Canvas& canvas = drawing.canvas;
     // Icons keep their size in pixels in every mapping mode, only their place is converted.
-    const QRect place(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size);
+    const QRect place =
+        canvas.pixels(QRect(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size));
     QPainter painter(canvas.image);
-    painter.setClipRegion(canvas.clip.translated(canvas.origin));
+    painter.setClipRegion(canvas.clip);
     painter.setRenderHint(QPainter::SmoothPixmapTransform);
-    painter.drawImage(place.translated(canvas.origin), image);
+    painter.drawImage(place, image);
     canvas.touch(place);
     return TRUE;
 }
@@ -287,7 +290,8 @@ BOOL CDC::SetPixelV(int x, int y, COLORREF color) {
     }
     Drawing drawing(*dc);
     if (drawing) {
-        drawing.canvas.plot(dc->state.mapping.toPixel(QPoint(x, y)), dc->ink(color));
+        Canvas& canvas = drawing.canvas;
+        canvas.fill(canvas.pixels(QRect(dc->state.mapping.toPixel(QPoint(x, y)), QSize(1, 1))), dc->ink(color));
     }
     return TRUE;
 }
@@ -310,7 +314,7 @@ COLORREF CDC::GetPixel(int x, int y) const {
         return CLR_INVALID;
     }
     Drawing drawing(*dc);
-    const QPoint point = dc->state.mapping.toPixel(QPoint(x, y));
+    const QPoint point = drawing.canvas.pixel(dc->state.mapping.toPixel(QPoint(x, y)));
     if (!drawing || !drawing.canvas.clip.contains(point)) {
         return CLR_INVALID;
     }

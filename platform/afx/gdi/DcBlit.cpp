@@ -39,17 +39,18 @@ BlitArea blitArea(const Mapping& mapping, const RECT& logical) {
 struct SourcePixels {
     QImage image; ///< a copy: source and target may be the same pixels
     QPoint offset;
+    QSize wanted; ///< pixels of the part asked for
 };
 
-SourcePixels readSource(DeviceContext& source, const QRect& wanted) {
+SourcePixels readSource(DeviceContext& source, const QRect& units) {
     Drawing drawing(source);
     if (!drawing) {
         return {};
     }
-    const Canvas& canvas = drawing.canvas;
-    const QRect exists = wanted & canvas.image->rect().translated(-canvas.origin);
-    return {exists.isEmpty() ? QImage() : canvas.image->copy(exists.translated(canvas.origin)),
-            exists.topLeft() - wanted.topLeft()};
+    const QRect wanted = drawing.canvas.pixels(units);
+    const QRect exists = wanted & drawing.canvas.image->rect();
+    return {exists.isEmpty() ? QImage() : drawing.canvas.image->copy(exists), exists.topLeft() - wanted.topLeft(),
+            wanted.size()};
 }
 
 /// Gives pixels the target's format: black and white become the target's text and background colours, and colours
@@ -76,19 +77,25 @@ void drawSource(DeviceContext& target, const BlitArea& to, DeviceContext& source
     if (!drawing || pixels.image.isNull()) {
         return;
     }
-    QPoint at = to.rect.topLeft() + pixels.offset;
+    const QRect place = drawing.canvas.pixels(to.rect);
+    if (place.isEmpty()) {
+        return;
+    }
+    QPoint at = place.topLeft() + pixels.offset;
     const bool mirroredX = to.mirroredX != from.mirroredX;
     const bool mirroredY = to.mirroredY != from.mirroredY;
-    if (from.rect.size() != to.rect.size() || mirroredX || mirroredY) {
-        const Stretch stretch{{from.rect.width(), to.rect.width(), mirroredX},
-                              {from.rect.height(), to.rect.height(), mirroredY},
-                              target.state.stretchMode};
-        at = to.rect.topLeft() + stretch.placeOf(QRect(pixels.offset, pixels.image.size())).topLeft();
+    if (pixels.wanted != place.size() || mirroredX || mirroredY) {
+        // Pixels that only the display has more of are not put together as those of a picture made smaller are.
+        const int mode = from.rect.size() == to.rect.size() ? COLORONCOLOR : target.state.stretchMode;
+        const Stretch stretch{{pixels.wanted.width(), place.width(), mirroredX},
+                              {pixels.wanted.height(), place.height(), mirroredY},
+                              mode};
+        at = place.topLeft() + stretch.placeOf(QRect(pixels.offset, pixels.image.size())).topLeft();
         pixels.image = stretch.apply(pixels.image, pixels.offset);
     }
     convertPixels(pixels.image, source, target);
     QImage pattern;
-    const Ink brush = target.brushInk(*target.state.brush, Rop2::Copy, pattern).value_or(Ink{});
+    const Ink brush = target.brushInk(drawing.canvas, *target.state.brush, Rop2::Copy, pattern).value_or(Ink{});
     drawing.canvas.blit(pixels.image, at, rop, brush);
 }
 

@@ -36,11 +36,11 @@ public:
     [[nodiscard]] const Mapping& mapping() const {
         return dc->state.mapping;
     }
-    /// Fills with the brush. @param area spans or a rectangle
+    /// Fills with the brush. @param area spans or a rectangle, in pixels
     template <class Area>
     void fill(const Area& area) {
         QImage pattern;
-        if (const auto ink = dc->brushInk(pattern)) {
+        if (const auto ink = dc->brushInk(canvas(), pattern)) {
             canvas().fill(area, *ink);
         }
     }
@@ -50,6 +50,21 @@ public:
 private:
     std::optional<Drawing> m_drawing;
 };
+
+QPolygonF placed(const Canvas& canvas, const QPolygonF& corners) {
+    QPolygonF result;
+    result.reserve(corners.size());
+    for (const QPointF& corner : corners) {
+        result << canvas.place(corner);
+    }
+    return result;
+}
+
+/// A polygon over pixels is filled as the area between the pixels' centres; its outline covers the rest.
+Spans areaOf(const Canvas& canvas, const QPolygonF& corners, FillRule rule) {
+    const std::array polygons = {placed(canvas, corners)};
+    return polygonSpans(polygons, rule, canvas.bounds());
+}
 
 QPolygon devicePoints(const Mapping& mapping, const POINT* points, int count) {
     QPolygon result;
@@ -106,8 +121,8 @@ BOOL CDC::PolylineTo(const POINT* points, int count) {
 
 namespace {
 
-/// Pixels of a rectangular shape's box in which its outline and filling go. Without an outline the right and bottom
-/// pixels stay free, as with it they belong to the outline.
+/// The box in which outline and filling of a rectangular shape go, in device units. Without an outline the right and
+/// bottom units stay free, as with it they belong to the outline.
 QRect shapeBox(const Shape& shape, const RECT& rect) {
     const QRect box = shape.mapping().toPixels(rect);
     return shape.dc->penInk() ? box : box.adjusted(0, 0, -1, -1);
@@ -130,20 +145,18 @@ QPolygon roundedPolygon(const QRect& box, QSize corner) {
 }
 
 void drawRounded(Shape& shape, const QRect& box, QSize corner) {
-    const Spans rows = roundRectSpans(box, corner);
-    shape.fill(rows);
-    Outline(*shape.dc, shape.canvas()).rounded(box, corner, rows);
+    shape.fill(roundedRows(shape.canvas(), box, corner));
+    Outline(*shape.dc, shape.canvas()).rounded(box, corner);
 }
 
 void drawLargeRounded(Shape& shape, const QRect& box, QSize corner) {
     const QPolygon polygon = roundedPolygon(box, corner);
-    const std::array polygons = {QPolygonF(polygon)};
-    shape.fill(polygonSpans(polygons, FillRule::Winding, shape.canvas().bounds()));
+    shape.fill(areaOf(shape.canvas(), QPolygonF(polygon), FillRule::Winding));
     Outline(*shape.dc, shape.canvas()).closed(polygon);
 }
 
 void drawRectangle(Shape& shape, const QRect& box) {
-    shape.fill(box);
+    shape.fill(shape.canvas().pixels(box));
     Outline(*shape.dc, shape.canvas()).rectangle(box);
 }
 
@@ -218,30 +231,30 @@ public:
     /// The pixels in drawing order, from start to end.
     [[nodiscard]] QPolygon pixels() const {
         if (isLarge(m_box)) {
-            return corners();
+            return corners().toPolygon();
         }
         std::vector<QPoint> all = outlineOf(ellipseSpans(m_box));
         std::erase_if(all, [&](QPoint point) { return turn(m_start, angle(point)) > m_sweep; });
         std::ranges::sort(all, {}, [&](QPoint point) { return turn(m_start, angle(point)); });
         return QPolygon(QList<QPoint>(all.begin(), all.end()));
     }
+    /// Corners of a polygon that stands for the line between the ellipse's outermost pixels' middles.
+    [[nodiscard]] QPolygonF corners() const {
+        constexpr int mostCorners = 4096;
+        const int count = std::min(mostCorners, 64 + m_box.width() + m_box.height());
+        QPolygonF result;
+        for (int i = 0; i <= count; ++i) {
+            const double direction = m_start + (m_counterClockwise ? -1 : 1) * m_sweep * i / count;
+            result << QPointF(m_box.left() + (m_box.width() - 1) * (1 + std::cos(direction)) / 2,
+                              m_box.top() + (m_box.height() - 1) * (1 + std::sin(direction)) / 2);
+        }
+        return result;
+    }
     [[nodiscard]] QPoint centre() const {
         return m_box.center();
     }
 
 private:
-    /// Corners of a polygon that stands for a large ellipse's pixels.
-    [[nodiscard]] QPolygon corners() const {
-        constexpr int cornerCount = 4096;
-        QPolygon result;
-        for (int i = 0; i <= cornerCount; ++i) {
-            const double direction = m_start + (m_counterClockwise ? -1 : 1) * m_sweep * i / cornerCount;
-            const double x = m_box.left() + (m_box.width() - 1) * (1 + std::cos(direction)) / 2;
-            const double y = m_box.top() + (m_box.height() - 1) * (1 + std::sin(direction)) / 2;
-            result << QPoint(static_cast<int>(std::lround(x)), static_cast<int>(std::lround(y)));
-        }
-        return result;
-    }
     /// Direction of a point in a picture where the ellipse is a circle: 0 right, growing clockwise.
     [[nodiscard]] double angle(QPoint point) const {
         const double x = 2.0 * (point.x() - m_box.left()) + 1 - m_box.width();
@@ -260,12 +273,6 @@ private:
     double m_sweep;
 };
 
-/// A polygon over pixels is filled as the area between the pixels' centres; its outline covers the rest.
-Spans areaOf(const QPolygon& corners, FillRule rule, const QRect& bounds) {
-    const std::array polygons = {QPolygonF(corners)};
-    return polygonSpans(polygons, rule, bounds);
-}
-
 BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, ArcShape kind) {
     Shape shape(handle);
     if (!shape.visible()) {
@@ -277,19 +284,16 @@ BOOL drawArc(HDC handle, const RECT& rect, const std::array<POINT, 2>& rays, Arc
     }
     const ArcPixels arc(box, shape.mapping().toPixel(toQt(rays[0])), shape.mapping().toPixel(toQt(rays[1])),
                         shape.dc->state.arcDirection);
-    QPolygon outline = arc.pixels();
+    const Canvas& canvas = shape.canvas();
+    // Where a unit has several pixels, those of the units' outline would show as steps.
+    QPolygonF outline = canvas.isPlain() ? QPolygonF(arc.pixels()) : arc.corners();
     if (kind == ArcShape::Pie) {
         outline << arc.centre();
     }
     if (kind != ArcShape::Arc) {
-        shape.fill(areaOf(outline, FillRule::Winding, shape.canvas().bounds()));
+        shape.fill(areaOf(canvas, outline, FillRule::Winding));
     }
-    Outline pen(*shape.dc, shape.canvas());
-    if (kind == ArcShape::Arc) {
-        pen.line(outline, Outline::LastPoint::Drawn);
-    } else {
-        pen.closed(outline);
-    }
+    Outline(*shape.dc, shape.canvas()).curve(outline, kind == ArcShape::Arc ? Outline::Ends::Open : Outline::Ends::Met);
     return TRUE;
 }
 
@@ -338,7 +342,7 @@ BOOL CDC::PolyPolygon(const POINT* points, const int* counts, int count) {
     std::vector<QPolygon> outlines;
     for (int i = 0; i < count; points += counts[i++]) {
         outlines.push_back(devicePoints(shape.mapping(), points, counts[i]));
-        areas.emplace_back(outlines.back());
+        areas.push_back(placed(shape.canvas(), QPolygonF(outlines.back())));
     }
     const FillRule rule = shape.dc->state.polyFillMode == WINDING ? FillRule::Winding : FillRule::Alternate;
     shape.fill(polygonSpans(areas, rule, shape.canvas().bounds()));

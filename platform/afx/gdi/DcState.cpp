@@ -296,7 +296,7 @@ int CDC::GetClipBox(RECT* rect) const {
     Drawing drawing(*dc);
     // The screen has no pixels to open, but what fits on it is what can be asked about it.
     const QRegion clip =
-        dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.canvas.clip;
+        dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.visible;
     *rect = fromQt(clip.boundingRect());
     DPtoLP(rect);
     return regionKind(clip);
@@ -308,7 +308,7 @@ BOOL CDC::PtVisible(int x, int y) const {
         return FALSE;
     }
     Drawing drawing(*dc);
-    return drawing && drawing.canvas.clip.contains(dc->state.mapping.toPixel(QPoint(x, y)));
+    return drawing && drawing.visible.contains(dc->state.mapping.toPixel(QPoint(x, y)));
 }
 
 BOOL CDC::PtVisible(POINT point) const {
@@ -321,7 +321,7 @@ BOOL CDC::RectVisible(const RECT* rect) const {
         return FALSE;
     }
     Drawing drawing(*dc);
-    return drawing && drawing.canvas.clip.intersects(dc->state.mapping.toPixels(*rect));
+    return drawing && drawing.visible.intersects(dc->state.mapping.toPixels(*rect));
 }
 
 namespace {

@@ -81,7 +81,7 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
     const Mapping& mapping = dc->state.mapping;
     // Hosts fill rectangles by this call with an empty text, so the rectangle does not wait for a font.
     if (rect && (options & ETO_OPAQUE) && drawing) {
-        drawing.canvas.fill(mapping.toPixels(*rect), dc->ink(dc->state.backColor));
+        drawing.canvas.fill(drawing.pixels(*rect), dc->ink(dc->state.backColor));
     }
     if (!font) {
         return FALSE;
@@ -96,7 +96,7 @@ BOOL CDC::ExtTextOut(int x, int y, UINT options, const RECT* rect, LPCSTR text, 
     const TextPlace place = placeText(*font, dc->state.textAlign, start, line.width());
     if (drawing) {
         if (rect && (options & ETO_CLIPPED)) {
-            drawing.canvas.clip &= mapping.toPixels(*rect);
+            drawing.canvas.clip &= drawing.pixels(*rect);
         }
         // The rectangle filled above stands in for the background of the text's own cell.
         if (dc->state.backMode == OPAQUE && !(options & ETO_OPAQUE)) {

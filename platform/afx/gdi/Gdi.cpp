@@ -187,7 +187,7 @@ BOOL CBrush::CreatePatternBrush(CBitmap* bitmap) {
     }
     BrushObject brush;
     brush.description = {static_cast<UINT>(BS_PATTERN), 0, reinterpret_cast<UINT_PTR>(source.handle)};
-    brush.pattern = source->image.copy();
+    brush.pattern = source->plainImage().copy();
     brush.patternFormat = source->format;
     return Attach(addGdiObject(std::move(brush)));
 }
@@ -327,9 +327,9 @@ int copyRecord(const Record& record, int count, LPVOID buffer) {
 BITMAP describe(const BitmapObject& bitmap) {
     const int bits = bitmap.format == PixelFormat::Monochrome ? 1 : 32;
     BITMAP record{};
-    record.bmWidth = bitmap.image.width();
-    record.bmHeight = bitmap.image.height();
-    record.bmWidthBytes = (bitmap.image.width() * bits + 15) / 16 * 2;
+    record.bmWidth = bitmap.size().width();
+    record.bmHeight = bitmap.size().height();
+    record.bmWidthBytes = (record.bmWidth * bits + 15) / 16 * 2;
     record.bmPlanes = 1;
     record.bmBitsPixel = static_cast<WORD>(bits);
     return record;

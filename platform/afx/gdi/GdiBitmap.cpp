@@ -12,6 +12,12 @@ using namespace tvx::afx;
 
 namespace {
 
+/// Leaves only the pixels that the host knows of: it reads or writes them by number.
+void makePlain(BitmapObject& bitmap) {
+    bitmap.image = bitmap.plainImage();
+    bitmap.ratio = 1;
+}
+
 /// Rows of a bitmap as `GetBitmapBits` gives them: from the top, padded to even numbers of bytes.
 std::size_t rowBytes(const BitmapObject& bitmap) {
     const std::size_t bits = bitmap.format == PixelFormat::Monochrome ? 1 : 32;
@@ -74,7 +80,7 @@ HBITMAP CreateBitmap(int width, int height, UINT planes, UINT bitsPerPixel, LPCV
 
 HBITMAP CreateCompatibleBitmap(HDC dc, int width, int height) {
     const auto context = findContext(dc);
-    return context ? addBitmap(width, height, context->target->format()) : nullptr;
+    return context ? addBitmap(width, height, context->target->format(), context->target->ratio()) : nullptr;
 }
 
 BOOL CBitmap::CreateBitmap(int width, int height, UINT planes, UINT bitsPerPixel, LPCVOID bits) {
@@ -94,7 +100,9 @@ DWORD CBitmap::GetBitmapBits(DWORD count, LPVOID bits) const {
     if (!bitmap || !bits) {
         return 0;
     }
-    const std::vector<BYTE> all = allBits(*bitmap);
+    BitmapObject plain = *bitmap;
+    makePlain(plain);
+    const std::vector<BYTE> all = allBits(plain);
     const std::size_t copied = std::min<std::size_t>(count, all.size());
     std::memcpy(bits, all.data(), copied);
     return static_cast<DWORD>(copied);
@@ -105,6 +113,7 @@ DWORD CBitmap::SetBitmapBits(DWORD count, LPCVOID bits) {
     if (!bitmap || !bits) {
         return 0;
     }
+    makePlain(*bitmap);
     std::vector<BYTE> all = allBits(*bitmap);
     const std::size_t copied = std::min<std::size_t>(count, all.size());
     std::memcpy(all.data(), bits, copied);

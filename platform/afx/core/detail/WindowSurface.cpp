@@ -9,6 +9,7 @@
 #include <QPainter>
 #include <QWindow>
 
+#include <cmath>
 #include <utility>
 
 namespace tvx::afx {
@@ -42,10 +43,6 @@ QImage* WindowSurface::storeImage() const {
     return dynamic_cast<QImage*>(m_store->paintDevice());
 }
 
-bool WindowSurface::isDirect(const QImage* image) const {
-    return image && image->depth() == 32 && image->devicePixelRatio() == 1 && m_window.devicePixelRatio() == 1;
-}
-
 QImage* WindowSurface::open(const QRect& wanted) {
     QWindow* window = m_window.windowHandle();
     m_store = m_window.backingStore();
@@ -59,7 +56,7 @@ QImage* WindowSurface::open(const QRect& wanted) {
         m_store->beginPaint(QRegion());
     }
     QImage* image = storeImage();
-    if (isDirect(image)) {
+    if (image && image->depth() == 32) {
         m_alias = QImage(image->bits(), image->width(), image->height(), image->bytesPerLine(), QImage::Format_RGB32);
         return &m_alias;
     }
@@ -67,23 +64,36 @@ QImage* WindowSurface::open(const QRect& wanted) {
     return &m_copy;
 }
 
+namespace {
+
+/// A rectangle of a window in pixels.
+QRectF scaledRect(const QRect& units, double ratio) {
+    return {QPointF(units.topLeft()) * ratio, QSizeF(units.size()) * ratio};
+}
+
+QSize pixelSize(QSize units, double ratio) {
+    return {static_cast<int>(std::ceil(units.width() * ratio)), static_cast<int>(std::ceil(units.height() * ratio))};
+}
+
+} // namespace
+
 void WindowSurface::readCopy(const QImage* image, const QRect& wanted) {
-    if (m_copy.size() != m_window.size()) {
-        m_copy = QImage(m_window.size(), QImage::Format_RGB32);
+    if (const QSize size = pixelSize(m_window.size(), ratio()); m_copy.size() != size) {
+        m_copy = QImage(size, QImage::Format_RGB32);
         m_copy.fill(m_window.palette().color(QPalette::Window));
     }
     if (!image) {
         return; // pixels that cannot be read: what was drawn last has to do
     }
     QPainter painter(&m_copy);
-    const double ratio = image->devicePixelRatio();
     painter.setCompositionMode(QPainter::CompositionMode_Source);
-    painter.drawImage(QRectF(wanted), *image, QRectF(QPointF(wanted.topLeft()) * ratio, QSizeF(wanted.size()) * ratio));
+    const QRectF part = scaledRect(wanted, ratio());
+    painter.drawImage(part, *image, part);
 }
 
 void WindowSurface::writeCopy(const QRect& touched) {
     QPainter painter(m_store->paintDevice());
-    painter.drawImage(touched, m_copy, touched);
+    painter.drawImage(QRectF(touched), m_copy, scaledRect(touched, ratio()));
 }
 
 void WindowSurface::close(const QRect& touched, ShownBy shownBy) {
@@ -121,16 +131,48 @@ void WindowSurface::endPaint() {
     }
 }
 
+namespace {
+
+/// Shows a part of a store in a window and in the native windows inside of it, which cover their part of it.
+void flushInto(QBackingStore& store, QWindow& window, QRegion part, QPoint offset) {
+    const QObjectList& inner = window.children();
+    for (auto object = inner.rbegin(); object != inner.rend(); ++object) {
+        auto* child = qobject_cast<QWindow*>(*object);
+        if (child && child->isVisible() && child->surfaceType() == QSurface::RasterSurface) {
+            const QRect place = child->geometry();
+            flushInto(store, *child, (part & place).translated(-place.topLeft()), offset + place.topLeft());
+            part -= place;
+        }
+    }
+    if (!part.isEmpty()) {
+        store.flush(part, &window, offset);
+    }
+}
+
+/// The toolkit rounds what it shows to pixels, which can leave a part of one out.
+QRect withBrokenPixels(const QRect& units, double ratio) {
+    return ratio == std::floor(ratio) ? units : units.adjusted(-1, -1, 1, 1);
+}
+
+} // namespace
+
 void WindowSurface::flush() {
     if (m_painting > 0 || m_unshown.isEmpty()) {
         return;
     }
-    const QRect part = std::exchange(m_unshown, QRect()) & m_window.rect();
+    const QRect part = withBrokenPixels(std::exchange(m_unshown, QRect()), ratio()) & m_window.rect();
     QBackingStore* store = m_window.backingStore();
     QWindow* window = m_window.windowHandle();
-    if (store && window && m_window.isVisible() && !part.isEmpty()) {
-        store->flush(part, window);
+    if (!store || !window || !m_window.isVisible() || part.isEmpty()) {
+        return;
     }
+    if (const QImage* image = dynamic_cast<QImage*>(store->paintDevice()); image && !image->hasAlphaChannel()) {
+        // Displays that share no memory with the program are sent only what was announced. Pixels with an alpha would
+        // be cleared by that.
+        store->beginPaint(part);
+        store->endPaint();
+    }
+    flushInto(*store, *window, part, QPoint());
 }
 
 namespace {
@@ -191,7 +233,7 @@ QRegion drawableRegion(const QWidget& widget, WindowPart part) {
 WindowTarget::WindowTarget(QWidget& widget, WindowPart part, std::function<QRect()> area)
     : m_widget(&widget), m_part(part), m_area(std::move(area)) {}
 
-bool WindowTarget::open(Canvas& canvas) {
+bool WindowTarget::open(Canvas& canvas, QRegion& visible) {
     if (!m_widget || !m_widget->isVisible()) {
         return false;
     }
@@ -205,14 +247,12 @@ bool WindowTarget::open(Canvas& canvas) {
     const QRegion& clip = *m_drawable;
     const QPoint widgetOrigin = m_widget->mapTo(m_widget->window(), QPoint());
     m_origin = widgetOrigin + area.topLeft();
-    QImage* image = WindowSurface::of(*m_widget).open(clip.boundingRect().translated(widgetOrigin));
-    if (!image) {
-        return false;
-    }
-    canvas.image = image;
+    WindowSurface& surface = WindowSurface::of(*m_widget);
+    canvas.image = surface.open(clip.boundingRect().translated(widgetOrigin));
     canvas.origin = m_origin;
-    canvas.clip = clip.translated(-area.topLeft()) & image->rect().translated(-m_origin);
-    return true;
+    canvas.ratio = surface.ratio();
+    visible = clip.translated(-area.topLeft());
+    return canvas.image;
 }
 
 void WindowTarget::close(const QRect& touched) {
@@ -223,6 +263,10 @@ void WindowTarget::close(const QRect& touched) {
 
 QSize WindowTarget::size() const {
     return m_widget ? m_area().size() : QSize();
+}
+
+double WindowTarget::ratio() const {
+    return m_widget ? WindowSurface::of(*m_widget).ratio() : 1;
 }
 
 void WindowTarget::release() {
@@ -263,25 +307,27 @@ void PaintTarget::takePicture() {
     if (!device || (store && device == store->paintDevice())) {
         return;
     }
-    m_picture = QImage(m_widget->size(), QImage::Format_RGB32);
+    m_pictureRatio = device->devicePixelRatio();
+    m_picture = QImage(pixelSize(m_widget->size(), m_pictureRatio), QImage::Format_RGB32);
     m_picture.fill(m_widget->palette().color(m_widget->backgroundRole()));
     const QPoint place = painter.deviceTransform().map(QPoint());
     QPainter copier(&m_picture);
     if (const auto* pixmap = dynamic_cast<QPixmap*>(device)) {
-        copier.drawPixmap(-place, *pixmap);
+        copier.drawPixmap(m_picture.rect(), *pixmap, m_picture.rect().translated(place));
     } else if (const auto* image = dynamic_cast<QImage*>(device)) {
-        copier.drawImage(-place, *image);
+        copier.drawImage(m_picture.rect(), *image, m_picture.rect().translated(place));
     }
 }
 
-bool PaintTarget::open(Canvas& canvas) {
+bool PaintTarget::open(Canvas& canvas, QRegion& visible) {
     if (m_picture.isNull()) {
-        return m_window.open(canvas);
+        return m_window.open(canvas, visible);
     }
     const QRect area = m_area();
     canvas.image = &m_picture;
     canvas.origin = area.topLeft();
-    canvas.clip = (m_update & area & m_picture.rect()).translated(-area.topLeft());
+    canvas.ratio = m_pictureRatio;
+    visible = (m_update & area).translated(-area.topLeft());
     return true;
 }
 
@@ -297,11 +343,15 @@ QSize PaintTarget::size() const {
     return m_window.size();
 }
 
+double PaintTarget::ratio() const {
+    return m_picture.isNull() ? m_window.ratio() : m_pictureRatio;
+}
+
 void PaintTarget::release() {
     if (!m_picture.isNull() && m_widget && !m_drawn.isEmpty()) {
         QPainter painter(m_widget);
         painter.setClipRegion(m_update);
-        painter.drawImage(m_drawn, m_picture, m_drawn);
+        painter.drawImage(QRectF(m_drawn), m_picture, scaledRect(m_drawn, m_pictureRatio));
     }
     m_window.release();
 }

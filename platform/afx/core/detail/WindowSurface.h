@@ -25,13 +25,18 @@ public:
     /// The surface of the window that `widget` is in. It lives as long as that window.
     static WindowSurface& of(const QWidget& widget);
 
-    /// Opens the pixels as an RGB32 image in the window's coordinates. Null while the window is hidden or was never
-    /// painted: there is nothing to draw on then, and all of it will be painted anyway.
-    /// @param wanted the part that may be read or drawn, for windows whose pixels have to be copied
+    /// Opens the pixels as an RGB32 image that begins where the window does. Null while the window is hidden or was
+    /// never painted: there is nothing to draw on then, and all of it will be painted anyway.
+    /// @param wanted the part, in units of the window, that may be read or drawn, for windows whose pixels have to be
+    ///               copied
     [[nodiscard]] QImage* open(const QRect& wanted);
+    /// Pixels to a unit of the window.
+    [[nodiscard]] double ratio() const {
+        return m_window.devicePixelRatio();
+    }
     /// Who shows what was drawn: `flush`, or the toolkit at the end of its paint event.
     enum class ShownBy { Flush, Toolkit };
-    /// Ends what `open` began, with the part that was changed.
+    /// Ends what `open` began, with the part that was changed, in units of the window.
     void close(const QRect& touched, ShownBy shownBy);
     /// Shows what was drawn since the last time.
     void flush();
@@ -45,7 +50,6 @@ public:
 private:
     explicit WindowSurface(QWidget& window);
     [[nodiscard]] QImage* storeImage() const;
-    [[nodiscard]] bool isDirect(const QImage* image) const;
     void readCopy(const QImage* image, const QRect& wanted);
     void writeCopy(const QRect& touched);
     void showLater(const QRect& part);
@@ -72,9 +76,10 @@ public:
     /// @param area the part in the widget's coordinates, asked for in each operation; it may reach beyond the widget
     WindowTarget(QWidget& widget, WindowPart part, std::function<QRect()> area);
 
-    bool open(Canvas& canvas) override;
+    bool open(Canvas& canvas, QRegion& visible) override;
     void close(const QRect& touched) override;
     [[nodiscard]] QSize size() const override;
+    [[nodiscard]] double ratio() const override;
     void release() override;
 
     /// Nothing outside of this, in the widget's coordinates, is drawn.
@@ -98,9 +103,10 @@ public:
     PaintTarget(QWidget& widget, const QRegion& update, std::function<QRect()> area);
     ~PaintTarget() override;
 
-    bool open(Canvas& canvas) override;
+    bool open(Canvas& canvas, QRegion& visible) override;
     void close(const QRect& touched) override;
     [[nodiscard]] QSize size() const override;
+    [[nodiscard]] double ratio() const override;
     void release() override;
 
 private:
@@ -112,6 +118,7 @@ private:
     WindowTarget m_window;
     QPointer<WindowSurface> m_surface; ///< while the toolkit paints it
     QImage m_picture;                  ///< of the widget, when it is painted on anything else
+    double m_pictureRatio = 1;
     QRect m_drawn;
 };
 

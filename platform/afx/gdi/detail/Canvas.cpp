@@ -1,6 +1,7 @@
 #include "platform/afx/gdi/detail/Canvas.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace tvx::afx {
 
@@ -43,6 +44,47 @@ bool Ink::at(int x, int y, Pixel& pixel) const {
     const int line = wrapped(std::int64_t{y} - patternOrigin.y(), pattern->height());
     pixel = reinterpret_cast<const Pixel*>(pattern->constScanLine(line))[column];
     return (pixel & opaque) != 0;
+}
+
+namespace {
+
+/// The pixel that an edge between units is rounded to: a pixel belongs to the unit in which its middle lies.
+int firstPixel(int unit, double ratio) {
+    return ratio == 1 ? unit : static_cast<int>(std::ceil(unit * ratio - 0.5));
+}
+
+} // namespace
+
+QPoint Canvas::pixel(QPoint unit) const {
+    return {firstPixel(unit.x() + origin.x(), ratio), firstPixel(unit.y() + origin.y(), ratio)};
+}
+
+QRect Canvas::pixels(const QRect& units) const {
+    const QPoint end = pixel({units.x() + units.width(), units.y() + units.height()});
+    return {pixel(units.topLeft()), end - QPoint(1, 1)};
+}
+
+QRegion Canvas::pixels(const QRegion& units) const {
+    if (isPlain()) {
+        return units.translated(origin);
+    }
+    // The toolkit wants rectangles in bands; converted ones stay so, but one may have shrunk to nothing.
+    QRegion result;
+    for (const QRect& rect : units) {
+        result |= pixels(rect);
+    }
+    return result;
+}
+
+QRect Canvas::units(const QRect& pixels) const {
+    if (pixels.isEmpty()) {
+        return {};
+    }
+    const auto floored = [this](int pixel) { return static_cast<int>(std::floor(pixel / ratio)); };
+    const auto raised = [this](int pixel) { return static_cast<int>(std::ceil(pixel / ratio)); };
+    return QRect(QPoint(floored(pixels.left()), floored(pixels.top())),
+                 QPoint(raised(pixels.right() + 1) - 1, raised(pixels.bottom() + 1) - 1))
+        .translated(-origin);
 }
 
 void Canvas::fillClipped(const QRect& area, const Ink& ink) {

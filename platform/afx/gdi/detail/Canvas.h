@@ -38,22 +38,42 @@ struct Ink {
     Pixel color = blackPixel;
     Rop2 rop = Rop2::Copy;
     const QImage* pattern = nullptr; ///< Format_ARGB32; pixels with alpha 0 leave the target alone
-    QPoint patternOrigin;            ///< in the coordinates of the target's context
+    QPoint patternOrigin;
 
     /// The colour at a point; false where nothing is drawn.
     [[nodiscard]] bool at(int x, int y, Pixel& pixel) const;
 };
 
-/// An image that is open for drawing, with its place in a context's coordinates and what is visible of it.
-/// Points given to the members are in the context's device units; what lies outside the clipping area is left alone.
-class Canvas {
+/// An image that is open for drawing, and what is visible of it.
+///
+/// Hosts count in a context's device units. On a display that has more pixels a unit is a block of them: `pixels` gives
+/// the blocks of a rectangle, which lie side by side without gaps also where a unit is no whole number of pixels. All
+/// other members count in pixels of the image; what lies outside the clipping area is left alone.
+class TVX_PLATFORM_API Canvas {
 public:
     QImage* image = nullptr;
-    QPoint origin; ///< where (0, 0) of the context lies in the image
-    QRegion clip;  ///< in the context's coordinates, inside the image
+    QPoint origin;    ///< where (0, 0) of the context lies on the target, in units
+    double ratio = 1; ///< pixels to a unit, either way
+    QRegion clip;     ///< in pixels, inside the image
     PixelFormat format = PixelFormat::Color;
 
-    /// What has been changed so far, in the context's coordinates.
+    /// Whether a unit is a pixel.
+    [[nodiscard]] bool isPlain() const {
+        return ratio == 1;
+    }
+    /// The first pixel of a unit.
+    [[nodiscard]] QPoint pixel(QPoint unit) const;
+    /// The pixels of a rectangle of units.
+    [[nodiscard]] QRect pixels(const QRect& units) const;
+    [[nodiscard]] QRegion pixels(const QRegion& units) const;
+    /// A place between units as one between pixels.
+    [[nodiscard]] QPointF place(QPointF units) const {
+        return (units + origin) * ratio;
+    }
+    /// The units that pixels belong to, those only partly covered too.
+    [[nodiscard]] QRect units(const QRect& pixels) const;
+
+    /// The pixels that have been changed so far.
     [[nodiscard]] QRect touched() const {
         return m_touched;
     }
@@ -74,7 +94,7 @@ public:
     void blit(const QImage& source, QPoint at, Rop3 rop, const Ink& brush);
 
     [[nodiscard]] Pixel* row(int y) const {
-        return reinterpret_cast<Pixel*>(image->bits() + (y + origin.y()) * image->bytesPerLine()) + origin.x();
+        return reinterpret_cast<Pixel*>(image->bits() + y * image->bytesPerLine());
     }
 
 private:

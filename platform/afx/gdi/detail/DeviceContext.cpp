@@ -1,7 +1,12 @@
 #include "platform/afx/gdi/detail/DeviceContext.h"
 
+#include "platform/afx/toolkit/detail/Gui.h"
+
+#include <QGuiApplication>
+
 #include <algorithm>
 #include <array>
+#include <cmath>
 
 namespace tvx::afx {
 
@@ -17,16 +22,21 @@ HandleTable<DeviceContext>& contexts() {
 
 } // namespace
 
-bool MemoryTarget::open(Canvas& canvas) {
+bool MemoryTarget::open(Canvas& canvas, QRegion& visible) {
     canvas.image = &bitmap->image;
     canvas.origin = {};
-    canvas.clip = bitmap->image.rect();
+    canvas.ratio = bitmap->ratio;
     canvas.format = bitmap->format;
+    visible = QRect(QPoint(), bitmap->size());
     return true;
 }
 
 QSize MemoryTarget::size() const {
-    return bitmap->image.size();
+    return bitmap->size();
+}
+
+double MemoryTarget::ratio() const {
+    return bitmap->ratio;
 }
 
 PixelFormat MemoryTarget::format() const {
@@ -40,6 +50,10 @@ Tool<BitmapObject> MemoryTarget::select(Tool<BitmapObject> next) {
 
 QSize ScreenTarget::size() const {
     return {GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN)};
+}
+
+double ScreenTarget::ratio() const {
+    return ensureGui() ? qGuiApp->devicePixelRatio() : 1;
 }
 
 DeviceContext::DeviceContext(DcKind kind, std::unique_ptr<DrawTarget> target) : kind(kind), target(std::move(target)) {
@@ -81,8 +95,8 @@ std::optional<Ink> DeviceContext::penInk() const {
     return ink(pen.lopnColor, rop2FromCode(state.rop2));
 }
 
-std::optional<Ink> DeviceContext::brushInk(QImage& pattern) const {
-    return brushInk(*state.brush, rop2FromCode(state.rop2), pattern);
+std::optional<Ink> DeviceContext::brushInk(const Canvas& canvas, QImage& pattern) const {
+    return brushInk(canvas, *state.brush, rop2FromCode(state.rop2), pattern);
 }
 
 namespace {
@@ -132,7 +146,8 @@ QImage recolored(const QImage& image, Pixel black, Pixel white) {
 
 } // namespace
 
-std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, QImage& pattern) const {
+std::optional<Ink> DeviceContext::brushInk(const Canvas& canvas, const BrushObject& brush, Rop2 rop,
+                                           QImage& pattern) const {
     const LOGBRUSH& description = brush.description;
     if (description.lbStyle == BS_NULL) {
         return std::nullopt;
@@ -151,8 +166,11 @@ std::optional<Ink> DeviceContext::brushInk(const BrushObject& brush, Rop2 rop, Q
     } else {
         pattern = brush.pattern;
     }
+    if (const auto times = static_cast<int>(std::lround(canvas.ratio)); times > 1) {
+        pattern = pattern.scaled(pattern.size() * times);
+    }
     result.pattern = &pattern;
-    result.patternOrigin = state.brushOrigin;
+    result.patternOrigin = canvas.pixel(state.brushOrigin);
     return result;
 }
 
@@ -176,15 +194,19 @@ std::size_t contextCount() {
     return contexts().size();
 }
 
-Drawing::Drawing(DeviceContext& context) : m_context(context), m_open(context.target->open(canvas)) {
-    if (m_open && context.state.clip) {
-        canvas.clip &= *context.state.clip;
+Drawing::Drawing(DeviceContext& context) : m_context(context), m_open(context.target->open(canvas, visible)) {
+    if (!m_open) {
+        return;
     }
+    if (context.state.clip) {
+        visible &= *context.state.clip;
+    }
+    canvas.clip = canvas.pixels(visible) & canvas.image->rect();
 }
 
 Drawing::~Drawing() {
     if (m_open) {
-        m_context.target->close(canvas.touched());
+        m_context.target->close(canvas.units(canvas.touched()));
     }
 }
 

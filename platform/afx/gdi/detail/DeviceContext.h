@@ -15,12 +15,17 @@ namespace tvx::afx {
 class TVX_PLATFORM_API DrawTarget {
 public:
     virtual ~DrawTarget() = default;
-    /// Opens the pixels for one operation. False when nothing of them can be seen; `canvas` is then empty.
-    [[nodiscard]] virtual bool open(Canvas& canvas) = 0;
-    /// Ends the operation; `touched` is what has been changed, in the context's coordinates.
+    /// Opens the pixels for one operation. False when nothing of them can be seen; `canvas` is then empty. What can be
+    /// seen is left in `visible`, in units of the context; the canvas's own clipping area follows from it.
+    [[nodiscard]] virtual bool open(Canvas& canvas, QRegion& visible) = 0;
+    /// Ends the operation; `touched` is what has been changed, in units of the context.
     virtual void close(const QRect& touched) = 0;
-    /// Size of the whole target in pixels.
+    /// Size of the whole target in units.
     [[nodiscard]] virtual QSize size() const = 0;
+    /// Pixels to a unit, which compatible bitmaps have too.
+    [[nodiscard]] virtual double ratio() const {
+        return 1;
+    }
     /// Colour format of bitmaps that are compatible with the target.
     [[nodiscard]] virtual PixelFormat format() const {
         return PixelFormat::Color;
@@ -32,9 +37,10 @@ public:
 /// A memory context's bitmap.
 class MemoryTarget : public DrawTarget {
 public:
-    bool open(Canvas& canvas) override;
+    bool open(Canvas& canvas, QRegion& visible) override;
     void close(const QRect&) override {}
     [[nodiscard]] QSize size() const override;
+    [[nodiscard]] double ratio() const override;
     [[nodiscard]] PixelFormat format() const override;
     /// Exchanges the bitmap that is drawn on; the result is the one before.
     Tool<BitmapObject> select(Tool<BitmapObject> bitmap);
@@ -45,11 +51,12 @@ public:
 /// The screen: it can be measured, but not drawn to.
 class ScreenTarget : public DrawTarget {
 public:
-    bool open(Canvas&) override {
+    bool open(Canvas&, QRegion&) override {
         return false;
     }
     void close(const QRect&) override {}
     [[nodiscard]] QSize size() const override;
+    [[nodiscard]] double ratio() const override;
 };
 
 enum class DcKind { Memory, Window, Paint, Screen };
@@ -95,8 +102,9 @@ public:
     /// Pen and brush as ink; `patterns` holds the pixels of a hatch or picture as long as the ink is used.
     /// Empty for a null pen or brush.
     [[nodiscard]] std::optional<Ink> penInk() const;
-    [[nodiscard]] std::optional<Ink> brushInk(QImage& pattern) const;
-    [[nodiscard]] std::optional<Ink> brushInk(const BrushObject& brush, Rop2 rop, QImage& pattern) const;
+    [[nodiscard]] std::optional<Ink> brushInk(const Canvas& canvas, QImage& pattern) const;
+    [[nodiscard]] std::optional<Ink> brushInk(const Canvas& canvas, const BrushObject& brush, Rop2 rop,
+                                              QImage& pattern) const;
     /// `color` as the target can show it.
     [[nodiscard]] Ink ink(COLORREF color, Rop2 rop = Rop2::Copy) const;
 };
@@ -121,6 +129,13 @@ public:
         return m_open;
     }
     Canvas canvas;
+    /// What can be seen and is not clipped away, in units of the context.
+    QRegion visible;
+
+    /// The pixels of a rectangle in logical units.
+    [[nodiscard]] QRect pixels(const RECT& logical) const {
+        return canvas.pixels(m_context.state.mapping.toPixels(logical));
+    }
 
 private:
     DeviceContext& m_context;

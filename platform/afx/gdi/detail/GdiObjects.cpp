@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <utility>
 
 namespace tvx::afx {
@@ -26,13 +27,27 @@ DWORD GdiObject::type() const {
     return types[value.index()];
 }
 
-HBITMAP addBitmap(int width, int height, PixelFormat format) {
-    if (width <= 0 || height <= 0 || std::int64_t{width} * height > mostPixels) {
+QSize BitmapObject::size() const {
+    // Made a little larger, as a broken number of pixels was rounded up when the image was made.
+    const auto units = [this](int pixels) { return static_cast<int>(std::floor(pixels / ratio + 1e-6)); };
+    return {units(image.width()), units(image.height())};
+}
+
+QImage BitmapObject::plainImage() const {
+    return ratio == 1 ? image : image.scaled(size());
+}
+
+HBITMAP addBitmap(int width, int height, PixelFormat format, double ratio) {
+    if (width <= 0 || height <= 0 || std::int64_t{width} * height > mostPixels / (ratio * ratio)) {
         return nullptr;
     }
-    QImage image(width, height, QImage::Format_RGB32);
+    QImage image(static_cast<int>(std::ceil(width * ratio)), static_cast<int>(std::ceil(height * ratio)),
+                 QImage::Format_RGB32);
+    if (image.isNull()) {
+        return nullptr;
+    }
     image.fill(Qt::black);
-    return addBitmap(image, format);
+    return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(image), format, nullptr, ratio}));
 }
 
 HBITMAP addBitmap(const QImage& image, PixelFormat format) {
@@ -45,12 +60,12 @@ HBITMAP addBitmap(const QImage& image, PixelFormat format) {
         auto* row = reinterpret_cast<Pixel*>(pixels.scanLine(y));
         std::transform(row, row + pixels.width(), row, [](Pixel pixel) { return pixel | opaque; });
     }
-    return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(pixels), format, nullptr}));
+    return static_cast<HBITMAP>(addGdiObject(BitmapObject{std::move(pixels), format, nullptr, 1}));
 }
 
 QImage bitmapImage(HBITMAP bitmap) {
     const auto tool = findTool<BitmapObject>(bitmap);
-    return tool ? tool->image.copy() : QImage();
+    return tool ? tool->plainImage().copy() : QImage();
 }
 
 HandleTable<IconObject>& icons() {

@@ -35,6 +35,14 @@ struct BitmapObject {
     QImage image; ///< Format_RGB32
     PixelFormat format = PixelFormat::Color;
     HDC selectedInto = nullptr;
+    /// Pixels of the image for one that the host knows of: above 1 for a bitmap made compatible with a window on a
+    /// display that has more of them, so that what is drawn by way of it is as sharp as on the window.
+    double ratio = 1;
+
+    /// Size as the host knows it.
+    [[nodiscard]] QSize size() const;
+    /// The pixels that the host knows of.
+    [[nodiscard]] QImage plainImage() const;
 };
 
 struct RegionObject {
@@ -91,7 +99,7 @@ template <class T>
 }
 
 /// A bitmap of black pixels; null handle for sizes that cannot be had.
-[[nodiscard]] HBITMAP addBitmap(int width, int height, PixelFormat format);
+[[nodiscard]] HBITMAP addBitmap(int width, int height, PixelFormat format, double ratio = 1);
 /// A bitmap with these pixels. Takes any format of image.
 [[nodiscard]] TVX_PLATFORM_API HBITMAP addBitmap(const QImage& image, PixelFormat format = PixelFormat::Color);
 /// The pixels of a bitmap, null image for a handle that is none.

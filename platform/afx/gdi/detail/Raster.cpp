@@ -45,6 +45,22 @@ QPoint LinePixels::at(int index) const {
     return m_from + (m_steep ? QPoint(minor, major) : QPoint(major, minor));
 }
 
+QPolygonF LinePixels::stripe(Range range) const {
+    const QPointF start = QPointF(m_from) + QPointF(0.5, 0.5);
+    const double slope = static_cast<double>(m_minorDelta) / (std::int64_t{m_majorStep} * m_count);
+    // Backwards the first pixel's border is its far one.
+    const double first = m_majorStep * (range.first - 0.5);
+    const double last = m_majorStep * (range.last - 0.5);
+    const auto corner = [&](double major, double across) {
+        const double minor = major * slope + across;
+        return start + (m_steep ? QPointF(minor, major) : QPointF(major, minor));
+    };
+    const double low = std::min(first, last);
+    const double high = std::max(first, last);
+    const double side = m_steep ? 0.5 : -0.5;
+    return QPolygonF({corner(low, side), corner(high, side), corner(high, -side), corner(low, -side)});
+}
+
 namespace {
 
 /// How many pixels each end of row `row` of an ellipse of `size` lies inside the box.

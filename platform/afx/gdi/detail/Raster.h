@@ -45,6 +45,9 @@ public:
     [[nodiscard]] Range within(const QRect& bounds) const;
     /// Pixel number `index`.
     [[nodiscard]] QPoint at(int index) const;
+    /// The area of pixels `first` .. `last` - 1 without the steps between them: as wide as a pixel, with its ends on
+    /// pixel borders. The corners go clockwise.
+    [[nodiscard]] QPolygonF stripe(Range range) const;
     /// Calls `plot(index, point)` for the pixels of a range, in order.
     template <class Plot>
     void forEach(Range range, Plot plot) const;

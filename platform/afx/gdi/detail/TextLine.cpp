@@ -43,14 +43,21 @@ int TextLine::width() const {
     return m_font.metrics.horizontalAdvance(m_text);
 }
 
+/// From places along the line to pixels.
+QTransform TextLine::onBaseLine(const Canvas& canvas, QPoint left) const {
+    const QPointF start = canvas.place(left);
+    QTransform transform = QTransform::fromTranslate(start.x(), start.y());
+    transform.scale(canvas.ratio, canvas.ratio);
+    return transform.rotate(-m_font.angle);
+}
+
 void TextLine::fillBackground(Canvas& canvas, QPoint left, const Ink& ink) const {
     const QRect cell(0, -m_font.metrics.ascent(), width(), m_font.metrics.height());
     if (m_font.angle == 0) {
-        canvas.fill(cell.translated(left), ink);
+        canvas.fill(canvas.pixels(cell.translated(left)), ink);
         return;
     }
-    QTransform turned = QTransform::fromTranslate(left.x(), left.y());
-    turned.rotate(-m_font.angle);
+    const QTransform turned = onBaseLine(canvas, left);
     const std::array polygons = {turned.map(QPolygonF(QRectF(cell)))};
     canvas.fill(polygonSpans(polygons, FillRule::Winding, canvas.bounds()), ink);
 }
@@ -60,15 +67,15 @@ void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
         return;
     }
     QPainter painter(canvas.image);
-    painter.setClipRegion(canvas.clip.translated(canvas.origin));
+    painter.setClipRegion(canvas.clip);
     QFont font = m_font.font;
     if (canvas.format == PixelFormat::Monochrome) {
         font.setStyleStrategy(static_cast<QFont::StyleStrategy>(QFont::NoAntialias | QFont::PreferNoShaping));
     }
     painter.setFont(font);
     painter.setPen(QColor::fromRgb(color));
-    painter.translate(left + canvas.origin);
-    painter.rotate(-m_font.angle);
+    const QTransform transform = onBaseLine(canvas, left);
+    painter.setTransform(transform);
     if (m_advances.empty()) {
         painter.drawText(0, 0, m_text);
     } else {
@@ -82,8 +89,7 @@ void TextLine::draw(Canvas& canvas, QPoint left, Pixel color) const {
     // Slanted characters and those with advances of the caller's may leave their cells.
     const int margin = m_font.metrics.height();
     const QRect cell(0, -m_font.metrics.ascent(), width(), m_font.metrics.height());
-    canvas.touch(
-        QTransform().rotate(-m_font.angle).mapRect(cell).adjusted(-margin, -margin, margin, margin).translated(left));
+    canvas.touch(transform.mapRect(cell.adjusted(-margin, -margin, margin, margin)));
 }
 
 TabStops::TabStops(int count, const int* stops, int averageWidth) : m_every(std::max(1, 8 * averageWidth)) {

@@ -4,6 +4,7 @@
 #include "platform/afx/gdi/detail/Fonts.h"
 
 #include <QString>
+#include <QTransform>
 
 #include <string_view>
 #include <vector>
@@ -28,6 +29,8 @@ public:
     void draw(Canvas& canvas, QPoint left, Pixel color) const;
 
 private:
+    [[nodiscard]] QTransform onBaseLine(const Canvas& canvas, QPoint left) const;
+
     const RealizedFont& m_font;
     QString m_text;
     std::vector<int> m_advances;
