@@ -1,5 +1,6 @@
 #include "platform/afx/core/WindowCalls.h"
 
+#include "platform/afx/core/detail/BrokenPixels.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
@@ -476,7 +477,7 @@ BOOL RedrawWindow(HWND handle, const RECT* rect, HRGN region, UINT flags) {
     if (!window || !client) {
         return FALSE;
     }
-    const QRegion part = partToRepaint(*window, rect, region);
+    const QRegion part = withBrokenPixels(*client, partToRepaint(*window, rect, region)) & client->rect();
     guarded([&] {
         if ((flags & RDW_INVALIDATE) != 0) {
             client->update(part);

@@ -231,8 +231,7 @@ void CDC::DrawFocusRect(const RECT* rect) {
     // Every second pixel by its place, so that the dots stay where they are when the frame grows.
     std::vector<QPoint> dots = framePixels(drawing.pixels(*rect), drawing.canvas.bounds());
     const QPoint first = drawing.canvas.pixel({});
-    std::erase_if(dots,
-                  [first](QPoint dot) { return ((dot.x() - first.x() + dot.y() - first.y()) & 1) != 0; });
+    std::erase_if(dots, [first](QPoint dot) { return ((dot.x() - first.x() + dot.y() - first.y()) & 1) != 0; });
     drawing.canvas.plot(dots, {whitePixel, Rop2::XorPen, nullptr, {}});
 }
 
@@ -252,8 +251,7 @@ BOOL drawIcon(HDC handle, QPoint logical, HICON icon, QSize size) {
     }
     Canvas& canvas = drawing.canvas;
     // Icons keep their size in pixels in every mapping mode, only their place is converted.
-    const QRect place =
-        canvas.pixels(QRect(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size));
+    const QRect place = canvas.pixels(QRect(dc->state.mapping.toPixel(logical), size.isEmpty() ? image.size() : size));
     QPainter painter(canvas.image);
     painter.setClipRegion(canvas.clip);
     painter.setRenderHint(QPainter::SmoothPixmapTransform);

@@ -295,8 +295,7 @@ int CDC::GetClipBox(RECT* rect) const {
     }
     Drawing drawing(*dc);
     // The screen has no pixels to open, but what fits on it is what can be asked about it.
-    const QRegion clip =
-        dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.visible;
+    const QRegion clip = dc->kind == DcKind::Screen ? QRegion(QRect(QPoint(), dc->target->size())) : drawing.visible;
     *rect = fromQt(clip.boundingRect());
     DPtoLP(rect);
     return regionKind(clip);

@@ -1,3 +1,4 @@
+#include "platform/afx/core/detail/BrokenPixels.h"
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/core/detail/Dispatch.h"
@@ -468,6 +469,7 @@ bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     if (!receiver->isWidgetType()) {
         return false;
     }
+    repaintBrokenEdges(*static_cast<QWidget*>(receiver), *event);
     const bool input = isInput(event->type());
     // The toolkit forwards wheel and key events between widgets by sending them again; only the user's count. An
     // open menu or drop-down list has all input to itself.

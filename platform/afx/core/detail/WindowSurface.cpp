@@ -1,4 +1,5 @@
 #include "platform/afx/core/detail/WindowSurface.h"
+#include "platform/afx/core/detail/BrokenPixels.h"
 #include "platform/afx/core/detail/Connect.h"
 
 #include <QBackingStore>
@@ -23,6 +24,19 @@ QHash<const QWidget*, WindowSurface*>& surfaces() {
 
 } // namespace
 
+namespace {
+
+QImage* imageOf(QBackingStore& store) {
+    return dynamic_cast<QImage*>(store.paintDevice());
+}
+
+/// A store's pixels as one image in which a pixel is a unit.
+QImage plainAlias(QImage& image, QImage::Format format) {
+    return {image.bits(), image.width(), image.height(), image.bytesPerLine(), format};
+}
+
+} // namespace
+
 WindowSurface::WindowSurface(QWidget& window) : m_window(window) {
     connectStoring(&window, &QObject::destroyed, this, [this, key = &window] {
         surfaces().remove(key);
@@ -39,10 +53,6 @@ WindowSurface& WindowSurface::of(const QWidget& widget) {
     return *surface;
 }
 
-QImage* WindowSurface::storeImage() const {
-    return dynamic_cast<QImage*>(m_store->paintDevice());
-}
-
 QImage* WindowSurface::open(const QRect& wanted) {
     QWindow* window = m_window.windowHandle();
     m_store = m_window.backingStore();
@@ -55,9 +65,9 @@ QImage* WindowSurface::open(const QRect& wanted) {
     if (m_began) {
         m_store->beginPaint(QRegion());
     }
-    QImage* image = storeImage();
+    QImage* image = imageOf(*m_store);
     if (image && image->depth() == 32) {
-        m_alias = QImage(image->bits(), image->width(), image->height(), image->bytesPerLine(), QImage::Format_RGB32);
+        m_alias = plainAlias(*image, QImage::Format_RGB32);
         return &m_alias;
     }
     readCopy(image, wanted);
@@ -133,6 +143,25 @@ void WindowSurface::endPaint() {
 
 namespace {
 
+/// Tells the store what was drawn. Displays that share no memory with the program are sent only what was announced;
+/// but the toolkit clears what is announced where pixels have an alpha.
+void announce(QBackingStore& store, const QRegion& part) {
+    QImage* image = imageOf(store);
+    if (!image) {
+        return;
+    }
+    const QRect place = scaledRect(part.boundingRect(), image->devicePixelRatio()).toAlignedRect() & image->rect();
+    const QImage drawn = plainAlias(*image, image->format()).copy(place);
+    store.beginPaint(part);
+    if (drawn.hasAlphaChannel() && imageOf(store)) {
+        QImage cleared = plainAlias(*imageOf(store), drawn.format());
+        QPainter painter(&cleared);
+        painter.setCompositionMode(QPainter::CompositionMode_Source);
+        painter.drawImage(place.topLeft(), drawn);
+    }
+    store.endPaint();
+}
+
 /// Shows a part of a store in a window and in the native windows inside of it, which cover their part of it.
 void flushInto(QBackingStore& store, QWindow& window, QRegion part, QPoint offset) {
     const QObjectList& inner = window.children();
@@ -149,29 +178,19 @@ void flushInto(QBackingStore& store, QWindow& window, QRegion part, QPoint offse
     }
 }
 
-/// The toolkit rounds what it shows to pixels, which can leave a part of one out.
-QRect withBrokenPixels(const QRect& units, double ratio) {
-    return ratio == std::floor(ratio) ? units : units.adjusted(-1, -1, 1, 1);
-}
-
 } // namespace
 
 void WindowSurface::flush() {
     if (m_painting > 0 || m_unshown.isEmpty()) {
         return;
     }
-    const QRect part = withBrokenPixels(std::exchange(m_unshown, QRect()), ratio()) & m_window.rect();
+    const QRegion part = withBrokenPixels(m_window, std::exchange(m_unshown, QRect())) & m_window.rect();
     QBackingStore* store = m_window.backingStore();
     QWindow* window = m_window.windowHandle();
     if (!store || !window || !m_window.isVisible() || part.isEmpty()) {
         return;
     }
-    if (const QImage* image = dynamic_cast<QImage*>(store->paintDevice()); image && !image->hasAlphaChannel()) {
-        // Displays that share no memory with the program are sent only what was announced. Pixels with an alpha would
-        // be cleared by that.
-        store->beginPaint(part);
-        store->endPaint();
-    }
+    announce(*store, part);
     flushInto(*store, *window, part, QPoint());
 }
 

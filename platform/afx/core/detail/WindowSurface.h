@@ -49,7 +49,6 @@ public:
 
 private:
     explicit WindowSurface(QWidget& window);
-    [[nodiscard]] QImage* storeImage() const;
     void readCopy(const QImage* image, const QRect& wanted);
     void writeCopy(const QRect& touched);
     void showLater(const QRect& part);

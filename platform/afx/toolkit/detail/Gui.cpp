@@ -80,6 +80,8 @@ void makeApplication() {
     static int argc = 1;
     static std::string name = moduleFileName(nullptr);
     static char* argv[] = {name.data(), nullptr};
+    // A window of the system for one widget, as dialogs have that stand over a frame, makes none of its relatives'.
+    QCoreApplication::setAttribute(Qt::AA_DontCreateNativeWidgetSiblings);
     new GuiApplication(argc, argv); // the toolkit keeps it as qApp, to the end of the process
     threadOfWindows = GetCurrentThreadId();
     // The main window's end is the application's end, whatever other windows are or are not shown.

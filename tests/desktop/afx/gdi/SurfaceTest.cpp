@@ -64,6 +64,26 @@ TEST_F(SurfaceOnScreen, ShowsDrawingOfAContextThatIsKeptOpen) {
     EXPECT_EQ(dc.GetPixel(410, 310), RGB(255, 0, 0));
 }
 
+TEST_F(SurfaceOnScreen, ShowsDrawingBesideAndInNativeWindows) {
+    QWidget left(&window);
+    left.setGeometry(0, 0, 100, 200);
+    QWidget right(&window);
+    right.setGeometry(100, 0, 200, 200);
+    for (QWidget* child : {&left, &right}) {
+        child->setAttribute(Qt::WA_NativeWindow);
+        child->show();
+        EXPECT_TRUE(child->internalWinId());
+    }
+    EXPECT_TRUE(becomes(window, QPoint(150, 100), Qt::green));
+    QApplication::processEvents();
+    CDC dc;
+    dc.Attach(openContext(right));
+    dc.FillSolidRect(10, 10, 20, 20, RGB(255, 0, 0));
+    dc.DeleteDC();
+    EXPECT_TRUE(becomes(right, QPoint(15, 15), Qt::red));
+    EXPECT_EQ(shown(right, 9, 15), QColor(Qt::green));
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
