@@ -1,7 +1,6 @@
 #include "s/CommandLineInfo.h"
 
 #include "platform/base/Text.h"
-#include "platform/port/CmdOpcodes.h"
 #include "s/CommandLineState.h"
 #include "s/Record.h"
 
@@ -90,8 +89,10 @@ bool Gui_CommandLineInfo_Impl::ParseSwitch(const char* param) {
 
 /// Takes the abbreviations that the check of the options takes.
 bool Gui_CommandLineInfo_Impl::ParseAbbreviation(const Gui_CommandLineInfo& owner, const char* param) {
-    const UT_CMDOPCODES options(owner.GetCmdOpcodes());
-    const char* const name = options.optionname(param);
+    if (!m_options) {
+        m_options = std::make_unique<UT_CMDOPCODES>(owner.GetCmdOpcodes());
+    }
+    const char* const name = m_options->optionname(param);
     return name && ParseSwitch(name);
 }
 

@@ -42,6 +42,8 @@ class Gui_CommandLineInfo_Impl;
 /// so a host lists those it wants to take (`-f` apart, which is gone by then). Everything else goes to the base class,
 /// which takes the first plain word as the file to open.
 ///
+/// The option specification is asked for once, when the first switch comes that is none of these.
+///
 /// A word that begins with "/" and names an existing file or folder is that name and not a switch. Command files that
 /// cannot be read, or lead back to themselves, are errors: `ProcessCommandLine` shows them. If it is never called, they
 /// are issued when this object is destroyed.

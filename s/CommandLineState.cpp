@@ -28,6 +28,7 @@ void IssueCommandFileProblems(const CStringArray& problems) {
 
 Gui_CmdLineArgsArray::Gui_CmdLineArgsArray() {
     AfxGetApp()->ParseCommandLine(*this);
+    NoteMissingFile();
 }
 
 Gui_CmdLineArgsArray::~Gui_CmdLineArgsArray() {
@@ -38,14 +39,23 @@ Gui_CmdLineArgsArray::~Gui_CmdLineArgsArray() {
 
 void Gui_CmdLineArgsArray::ParseParam(const char* param, BOOL isSwitch, BOOL) {
     if (isSwitch) {
+        NoteMissingFile();
         m_commandFilePending = tvx::text::equalNoCase(param, "f");
+        m_hasCommandFile = false;
         if (!m_commandFilePending) {
             m_arguments.Add(CString('-') + param);
         }
     } else if (m_commandFilePending) {
+        m_hasCommandFile = true;
         ExpandCommandFile(*this, param, m_problems);
     } else {
         m_arguments.Add(CString(param));
+    }
+}
+
+void Gui_CmdLineArgsArray::NoteMissingFile() {
+    if (m_commandFilePending && !m_hasCommandFile) {
+        m_problems.Add("Option \"-f\" needs a command file after it.");
     }
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/port/CmdOpcodes.h"
 #include "s/CommandLineInfo.h"
 #include "s/Export.h"
 
@@ -61,6 +62,7 @@ private:
     IntStyleEnum m_style = Gui_CommandLineInfo::IntStyleNone;
     Expectation m_expectation = Expectation::Nothing;
     CStringArray m_problems;
+    std::unique_ptr<UT_CMDOPCODES> m_options; ///< the host's, once a switch was looked for among them
 };
 
 /// All words of the running application's command line, command files replaced by their words, in the form that the
@@ -79,12 +81,15 @@ public:
     int GetCount() const;
     /// The words as a vector, null when there is none. It points into this object.
     char** GetVector();
-    /// What is wrong with the command files.
+    /// What is wrong with the command files, also that a switch for them names none.
     const CStringArray& GetProblems() const;
 
 private:
+    void NoteMissingFile();
+
     std::unique_ptr<char*[]> m_vector;
     CStringArray m_arguments;
     int m_commandFilePending = 0;
+    bool m_hasCommandFile = false; ///< one came since it is pending
     CStringArray m_problems;
 };

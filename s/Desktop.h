@@ -20,8 +20,9 @@ public:
     /// The identifier of a window, such as a dialog.
     static unsigned long GetDialogWindowID(HWND dialog);
 
-    /// Brings a window to the front, restored when it was minimised, and makes it the active one. A window manager that
-    /// does not allow it shows that the window asks for attention.
+    /// Brings a window to the front, restored when it was minimised, and makes it the active one. When it is on another
+    /// virtual desktop, that one is gone to. A window manager that does not allow it shows that the window asks for
+    /// attention.
     /// @param windowId any number
     /// @return 0 when it is no window, or no longer; else 1
     static int ShowWindow(unsigned long windowId);

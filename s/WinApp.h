@@ -53,7 +53,9 @@ public:
     /// say: usage, errors and what is wrong with command files. Errors are shown when they are found as well.
     ///
     /// Call it after ParseCommandLine with the same object. With no word on the command line there is nothing to check.
-    /// @return 1: go on; 0: end, because something was shown or `-smoketest` was given
+    /// @return 1: go on; 0: end, because something was shown or `-smoketest` was given. The host answers FALSE from
+    ///     InitInstance then. After an error, one in a command file too, the process ends with the exit code 2 unless
+    ///     ExitInstance answers another one than 0; after help and a smoke test with 0
     int ProcessCommandLine(const Gui_CommandLineInfo& info);
 
     /// Runs the message loop until the application ends.

@@ -1,6 +1,7 @@
 // The check of the command line.
 #include "s/WinApp.h"
 
+#include "platform/afx/core/StartCode.h"
 #include "platform/port/CmdArgs.h"
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
@@ -12,6 +13,9 @@
 #include <memory>
 
 namespace {
+
+/// What the process ends with, by the custom of commands.
+constexpr int refusedCommandLine = 2;
 
 /// Whose messages the functions below collect: message managers take plain functions.
 Gui_WinAppData* s_target = nullptr;
@@ -40,20 +44,23 @@ void issueUsageSummary(const CString& opcodes) {
     }
 }
 
-/// Checks the words and leaves what there is to say in the target's pending text.
-void check(Gui_CmdLineArgsArray& arguments, const CString& opcodes) {
+/// Checks the words and leaves what there is to say in the target's pending text. False when something is wrong.
+bool check(Gui_CmdLineArgsArray& arguments, const CString& opcodes) {
+    bool isRight = arguments.GetProblems().GetSize() == 0;
     Gui_MessageManager manager(&showError, &collectStatus);
     Port_MsgDispatcher::addMsgMan(&manager);
     IssueCommandFileProblems(arguments.GetProblems());
     if (arguments.GetCount() > 0) {
         const UT_CMDARGS parser(arguments.GetCount(), arguments.GetVector(), opcodes, &issueUsageText,
                                 UT_CMDARGS::NoProgramName);
+        isRight = isRight && !parser.iserror();
         if (!parser.gaveusage() && parser.iserror()) {
             issueUsageSummary(opcodes);
             issueUsageText();
         }
     }
     Port_MsgDispatcher::removeMsgMan(&manager);
+    return isRight;
 }
 
 } // namespace
@@ -65,7 +72,9 @@ int Gui_WinApp::ProcessCommandLine(const Gui_CommandLineInfo& info) {
     info.m_impl->ForgetProblems();
     if (arguments.GetCount() > 0 || arguments.GetProblems().GetSize() > 0) {
         m_data->usageText = info.GetUsageText();
-        check(arguments, info.GetCmdOpcodes());
+        if (!check(arguments, info.GetCmdOpcodes())) {
+            tvx::afx::setStartCode(refusedCommandLine);
+        }
     }
     if (!m_data->pending.IsEmpty()) {
         AfxMessageBox(m_data->pending);

@@ -19,7 +19,7 @@
 namespace {
 
 constexpr std::size_t deepestNesting = 64;
-/// A file larger than this is no command file but a mistake, a device for example.
+/// A file larger than this is no command file but a mistake.
 constexpr std::size_t largestFile = 64u << 20;
 
 /// A file in expansion. Device and inode tell it whatever name leads to it.
@@ -45,8 +45,10 @@ std::string chainText() {
 
 class Descriptor {
 public:
+    /// Opening a pipe would wait for its writer.
     explicit Descriptor(const char* name)
-        : m_number(::open(tvx::systemPath(name).value_or(name).c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY)) {}
+        : m_number(::open(tvx::systemPath(name).value_or(name).c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK)) {
+    }
     ~Descriptor() {
         if (m_number >= 0) {
             ::close(m_number);
@@ -122,6 +124,10 @@ struct UT_CMDFILE::Impl {
         m_file.name = name;
         if (file.number() < 0 || ::fstat(file.number(), &status) != 0) {
             return refuseUnreadable(systemReason());
+        }
+        // Who goes through a command line twice would get nothing the second time, or wait for ever.
+        if (!S_ISREG(status.st_mode) && !S_ISDIR(status.st_mode)) {
+            return refuseUnreadable("it is a pipe or a device, and not a file");
         }
         m_file.device = status.st_dev;
         m_file.inode = status.st_ino;

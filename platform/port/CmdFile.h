@@ -19,8 +19,9 @@
 ///
 /// As long as the object lives its file counts as being expanded. A file that is being expanded already, under
 /// whatever name, is refused, and so is nesting beyond 64 files; a file that cannot be read or holds no text is refused
-/// too. A refusal is an error message that names the file, the reason and the chain of files that led there, and the
-/// file contributes no argument. The notation of command files is described in docs/command-line.md.
+/// too, and so are pipes and devices, without waiting for them. A refusal is an error message that names the file, the
+/// reason and the chain of files that led there, and the file contributes no argument. The notation of command files is
+/// described in docs/command-line.md.
 class TVX_PLATFORM_API UT_CMDFILE {
 public:
     /// Whether what is wrong with a file is issued as error messages. Code that goes through one command line several

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <array>
+#include <optional>
 #include <string_view>
 
 namespace tvx::desktop {
@@ -17,8 +18,9 @@ using detail::XSession;
 
 namespace {
 
-constexpr std::chrono::milliseconds patience{500};
-// The number of WM_STATE for minimised windows, and of the request to become one (window-manager conventions, 4.1.4).
+constexpr std::chrono::milliseconds patience{200};
+// The number of WM_STATE for windows that are not shown, and of the request to become one (window-manager
+// conventions, 4.1.4).
 constexpr std::uint32_t iconicState = 3;
 
 std::string hostName() {
@@ -57,9 +59,18 @@ bool hasStates(XConnection& x, WindowId window, std::initializer_list<xcb_atom_t
     return has;
 }
 
+/// The virtual desktop to go to for a window; none when it is on the current one, on all, or nobody has told.
+std::optional<std::uint32_t> otherDesktopOf(XConnection& x, WindowId window) {
+    constexpr std::uint32_t all = 0xFFFFFFFF;
+    const auto own = x.optionalNumber(window, x.ewmh()->_NET_WM_DESKTOP);
+    const auto current = x.optionalNumber(x.root(), x.ewmh()->_NET_CURRENT_DESKTOP);
+    return own && current && own != all && own != current ? own : std::nullopt;
+}
+
 bool isIconic(XConnection& x, WindowId window) {
-    return x.number(window, x.atom("WM_STATE")) == iconicState ||
-           hasStates(x, window, {x.ewmh()->_NET_WM_STATE_HIDDEN});
+    // Some window managers give the windows of other desktops the state of minimised ones.
+    return hasStates(x, window, {x.ewmh()->_NET_WM_STATE_HIDDEN}) ||
+           (x.number(window, x.atom("WM_STATE")) == iconicState && !otherDesktopOf(x, window));
 }
 
 bool isMaximized(XConnection& x, WindowId window) {
@@ -186,6 +197,9 @@ bool activate(WindowId window) {
     if (!isManaged(*x)) {
         raiseAlone(*x, window);
         return true;
+    }
+    if (const auto other = otherDesktopOf(*x, window)) {
+        xcb_ewmh_request_change_current_desktop(x->ewmh(), x->screen(), *other, x->now());
     }
     // As a task list does it: the user has asked for this window, so nothing that looks like stolen focus is refused.
     xcb_ewmh_request_change_active_window(x->ewmh(), x->screen(), window, XCB_EWMH_CLIENT_SOURCE_TYPE_OTHER, x->now(),

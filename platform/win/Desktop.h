@@ -45,8 +45,8 @@ using WindowId = std::uint32_t;
 /// The windows of other processes that the window manager manages, the topmost first.
 [[nodiscard]] TVX_PLATFORM_API std::vector<WindowId> windows();
 
-/// Restores the window if it is minimised, raises it and gives it the keyboard. Waits until the window manager has done
-/// it, for half a second at most.
+/// Restores the window if it is minimised, raises it and gives it the keyboard; the virtual desktop that it is on
+/// becomes the current one. Waits until the window manager has done it, for a fifth of a second at most.
 /// @return false when it has not: the window then asks for attention in the way the desktop shows that
 TVX_PLATFORM_API bool activate(WindowId window);
 

@@ -1,6 +1,7 @@
 #include "platform/afx/core/App.h"
 
 #include "platform/afx/core/CommandLineInfo.h"
+#include "platform/afx/core/StartCode.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Gdi.h"
@@ -320,7 +321,10 @@ void nameModule(CWinApp& app) {
     }
 }
 
+int startCode = 0;
+
 int runApplication(CWinApp& app) {
+    startCode = 0;
     if (!app.InitApplication()) {
         return 1;
     }
@@ -329,13 +333,20 @@ int runApplication(CWinApp& app) {
             app.m_pMainWnd->DestroyWindow();
         }
         const int exitCode = app.ExitInstance();
+        if (exitCode != 0 || startCode != 0) {
+            return exitCode != 0 ? exitCode : startCode;
+        }
         // A start that failed for want of a display must not look like one that had nothing to do.
-        return exitCode == 0 && wasDisplayMissed() ? 1 : exitCode;
+        return wasDisplayMissed() ? 1 : 0;
     }
     return app.Run();
 }
 
 } // namespace
+
+void tvx::afx::setStartCode(int exitCode) {
+    startCode = exitCode;
+}
 
 namespace {
 

@@ -32,11 +32,16 @@ xcb_atom_t XConnection::atom(const char* name) const {
 }
 
 std::uint32_t XConnection::number(xcb_window_t window, xcb_atom_t property) const {
+    return optionalNumber(window, property).value_or(0);
+}
+
+std::optional<std::uint32_t> XConnection::optionalNumber(xcb_window_t window, xcb_atom_t property) const {
     const std::string bytes = text(window, property);
     std::uint32_t value = 0;
-    if (bytes.size() >= sizeof value) {
-        std::memcpy(&value, bytes.data(), sizeof value);
+    if (bytes.size() < sizeof value) {
+        return std::nullopt;
     }
+    std::memcpy(&value, bytes.data(), sizeof value);
     return value;
 }
 

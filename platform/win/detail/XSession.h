@@ -9,6 +9,7 @@
 #include <initializer_list>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <string>
 
 namespace tvx::detail {
@@ -52,6 +53,8 @@ public:
 
     /// The first 32-bit number of a property, 0 when the window or the property is missing.
     [[nodiscard]] std::uint32_t number(xcb_window_t window, xcb_atom_t property) const;
+    /// The same, where 0 is a number like others.
+    [[nodiscard]] std::optional<std::uint32_t> optionalNumber(xcb_window_t window, xcb_atom_t property) const;
     /// The bytes of a property, up to 1 KiB.
     [[nodiscard]] std::string text(xcb_window_t window, xcb_atom_t property) const;
     /// The display's time at this moment. Window managers refuse requests that seem older than what the user did last.

@@ -20,9 +20,9 @@ expect() {
 expect 0 "" -smoketest
 expect 0 "Usage: board" -help
 expect 0 "Usage: board" /help
-expect 0 "not a whole number" -grid many
-expect 0 "Unknown option" -bogus
-expect 0 "missing.cmd" -f missing.cmd
+expect 2 "not a whole number" -grid many
+expect 2 "Unknown option" -bogus
+expect 2 "missing.cmd" -f missing.cmd
 expect 1 "There is no display" "$drawing"
 expect 1 "There is no display"
 exit 0

@@ -5,6 +5,9 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+#include <string>
+
 namespace {
 
 unsigned long idOf(HWND window) {
@@ -50,6 +53,25 @@ TEST(Desktop, BringsAWindowForwardFromAnApplicationWithWindowsOfItsOwn) {
     EXPECT_TRUE(isInFront(frame->m_hWnd));
     frame->DestroyWindow();
     EXPECT_TRUE(isInFront(peer.window));
+}
+
+TEST(Desktop, GoesToTheDesktopThatAWindowIsOn) {
+    const Peer first;
+    const Peer second;
+    ASSERT_TRUE(first.shown && second.shown);
+    const auto run = [](const std::string& command) { return std::system(command.c_str()) == 0; };
+    const auto isOn = [&](int desktop) {
+        return becomesTrue([&] { return run("test $(xdotool get_desktop) = " + std::to_string(desktop)); });
+    };
+    ASSERT_TRUE(run("xdotool set_num_desktops 2 && xdotool set_desktop_for_window " +
+                    std::to_string(idOf(first.window)) + " 1"));
+    ASSERT_TRUE(becomesTrue([&] { return GetForegroundWindow() == second.window; }));
+    EXPECT_FALSE(IsIconic(first.window));
+    EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(first.window)), 1);
+    EXPECT_TRUE(isOn(1));
+    EXPECT_TRUE(becomesTrue([&] { return GetForegroundWindow() == first.window; }));
+    EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(second.window)), 1);
+    EXPECT_TRUE(isOn(0));
 }
 
 TEST(Desktop, KnowsNoWindowWhereThereIsNone) {

@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <fstream>
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace {
@@ -157,9 +158,19 @@ TEST_F(CmdFile, NamesWhatCannotBeRead) {
     m_messages.messages.clear();
     EXPECT_EQ(expand(write("wide", {"-\0a\0", 4})), Words{});
     EXPECT_NE(onlyError().find("zero bytes"), std::string::npos);
+}
 
+TEST_F(CmdFile, RefusesPipesAndDevicesAtOnce) {
+    ASSERT_EQ(::mkfifo(path("pipe").c_str(), 0600), 0); // nobody writes to it
+    for (const std::string& name : {path("pipe"), std::string("/dev/zero"), std::string("/dev/null")}) {
+        m_messages.messages.clear();
+        EXPECT_EQ(expand(name), Words{});
+        EXPECT_NE(onlyError().find("it is a pipe or a device"), std::string::npos) << name;
+    }
     m_messages.messages.clear();
-    EXPECT_EQ(expand("/dev/zero"), Words{}) << "an endless file";
+    const std::string large = write("large", "");
+    fs::resize_file(large, (64u << 20) + 1);
+    EXPECT_EQ(expand(large), Words{});
     EXPECT_NE(onlyError().find("larger than 64 MB"), std::string::npos);
 }
 

@@ -18,6 +18,7 @@ using Words = std::vector<std::string>;
 class CommandLine : public Gui_CommandLineInfo {
 public:
     CString GetCmdOpcodes() const override {
+        ++timesAsked;
         return opcodes;
     }
     CString GetUsageText() const override {
@@ -33,6 +34,7 @@ public:
                       "scale real : Scale of the drawing.\n"
                       "<drawing> 0..* : Drawings to open.\n";
     Words seen;
+    mutable int timesAsked = 0;
 };
 
 /// What a start with these words leaves.
@@ -40,6 +42,7 @@ struct Outcome {
     CommandLine info;
     Words collected;
     int result = -1;
+    int exitCode = -1;
 };
 
 class CommandLineInfo : public testing::Test {
@@ -55,7 +58,7 @@ protected:
 
     /// Parses and checks as a host does.
     static void start(Outcome& outcome, const Words& words) {
-        theApp.start(words, [&] {
+        outcome.exitCode = theApp.start(words, [&] {
             theApp.ParseCommandLine(outcome.info);
             Gui_CmdLineArgsArray arguments;
             if (arguments.GetVector()) {
@@ -265,6 +268,42 @@ TEST_F(CommandLineInfo, ProblemsReachTheUserWithoutTheCheck) {
         theApp.ParseCommandLine(info);
     });
     EXPECT_EQ(timesIn(testing::internal::GetCapturedStderr(), "no such file"), 1);
+}
+
+TEST_F(CommandLineInfo, TellsByTheExitCodeThatItIsWrong) {
+    const std::string good = file("good.cmd", "-scale 2");
+    const struct {
+        Words words;
+        int exitCode;
+    } cases[] = {
+        {{}, 0},
+        {{"-scale", "2", "a.brd"}, 0},
+        {{"-smoketest"}, 0},
+        {{"-help"}, 0},
+        {{"-help", "-bogus"}, 0},
+        {{"-bogus"}, 2},
+        {{"-scale", "2kg"}, 2},
+        {{"-f", "missing.cmd"}, 2},
+        {{"-f", "missing.cmd", "-help"}, 2},
+        {{"-f", good}, 0},
+        {{"-f", good, "-f"}, 2}, // and no file behind it
+        {{"-f", "-smoketest"}, 2},
+        {{"-f", file("open.cmd", "-f")}, 2},
+    };
+    for (const auto& [words, exitCode] : cases) {
+        Outcome outcome;
+        start(outcome, words);
+        EXPECT_EQ(outcome.exitCode, exitCode) << testing::PrintToString(words);
+        EXPECT_EQ(exitCode != 0 && theApp.boxes.empty(), false) << "the user is told why";
+    }
+}
+
+TEST_F(CommandLineInfo, AsksForTheOptionsOnce) {
+    Outcome outcome;
+    outcome.info.opcodes = "layer none repeatable : Shows a layer.\n";
+    start(outcome, Words(1000, "-layer"));
+    EXPECT_EQ(outcome.result, 1);
+    EXPECT_EQ(outcome.info.timesAsked, 2) << "while it is parsed, and for the check";
 }
 
 TEST_F(CommandLineInfo, ManyWordsOfAFileArriveWhole) {

@@ -17,8 +17,9 @@ public:
 
     TestApp() : Gui_WinApp("testapp") {}
 
-    /// Starts with a command line of these words and runs @p body in place of InitInstance.
-    void start(std::vector<std::string> words, std::function<void()> body) {
+    /// Starts with a command line of these words and runs @p body in place of InitInstance. The result is what the
+    /// process would end with.
+    int start(std::vector<std::string> words, std::function<void()> body) {
         words.insert(words.begin(), "testapp");
         std::vector<char*> arguments;
         for (std::string& word : words) {
@@ -26,7 +27,7 @@ public:
         }
         boxes.clear();
         m_body = std::move(body);
-        AfxWinMain(static_cast<int>(arguments.size()), arguments.data());
+        return AfxWinMain(static_cast<int>(arguments.size()), arguments.data());
     }
 
     BOOL InitInstance() override {
