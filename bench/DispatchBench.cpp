@@ -90,7 +90,7 @@ void postedToolkitEvents(benchmark::State& state) {
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 
-BENCHMARK(postedToolkitEvents)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK(postedMessages)->Arg(1000000)->Unit(benchmark::millisecond);
+BENCHMARK(postedToolkitEvents)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK(postedMessages)->Arg(1000000)->Unit(benchmark::kMillisecond);
 
 } // namespace

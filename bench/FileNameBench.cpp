@@ -85,7 +85,7 @@ void existenceOf10000(benchmark::State& state) {
         }
     }
 }
-BENCHMARK(existenceOf10000)->Unit(benchmark::millisecond);
+BENCHMARK(existenceOf10000)->Unit(benchmark::kMillisecond);
 
 /// With the names made anew each time, as a host that walks a list of texts does.
 void existenceOf10000Texts(benchmark::State& state) {
@@ -95,7 +95,7 @@ void existenceOf10000Texts(benchmark::State& state) {
         }
     }
 }
-BENCHMARK(existenceOf10000Texts)->Unit(benchmark::millisecond);
+BENCHMARK(existenceOf10000Texts)->Unit(benchmark::kMillisecond);
 
 void existenceOf10000WithStat(benchmark::State& state) {
     for (auto _ : state) {
@@ -105,7 +105,7 @@ void existenceOf10000WithStat(benchmark::State& state) {
         }
     }
 }
-BENCHMARK(existenceOf10000WithStat)->Unit(benchmark::millisecond);
+BENCHMARK(existenceOf10000WithStat)->Unit(benchmark::kMillisecond);
 
 void existenceOf10000WithTheToolkit(benchmark::State& state) {
     std::vector<QString> names;
@@ -118,7 +118,7 @@ void existenceOf10000WithTheToolkit(benchmark::State& state) {
         }
     }
 }
-BENCHMARK(existenceOf10000WithTheToolkit)->Unit(benchmark::millisecond);
+BENCHMARK(existenceOf10000WithTheToolkit)->Unit(benchmark::kMillisecond);
 
 /// One that is missing: the folder's 10,000 entries are gone through for one that differs in case.
 void existenceOfAMissingOne(benchmark::State& state) {
@@ -127,6 +127,6 @@ void existenceOfAMissingOne(benchmark::State& state) {
         benchmark::DoNotOptimize(name.Exists());
     }
 }
-BENCHMARK(existenceOfAMissingOne)->Unit(benchmark::microsecond);
+BENCHMARK(existenceOfAMissingOne)->Unit(benchmark::kMicrosecond);
 
 } // namespace

@@ -65,7 +65,7 @@ void loadFile(benchmark::State& state) {
     }
     state.SetItemsProcessed(state.iterations() * 10000);
 }
-BENCHMARK(loadFile)->Unit(benchmark::millisecond);
+BENCHMARK(loadFile)->Unit(benchmark::kMillisecond);
 
 /// What each question costs while nothing has changed: the file is opened and its time is asked.
 void askUnchangedFile(benchmark::State& state) {
@@ -97,7 +97,7 @@ void loadFileWithTheStandardLibrary(benchmark::State& state) {
     }
     state.SetItemsProcessed(state.iterations() * 10000);
 }
-BENCHMARK(loadFileWithTheStandardLibrary)->Unit(benchmark::millisecond);
+BENCHMARK(loadFileWithTheStandardLibrary)->Unit(benchmark::kMillisecond);
 
 void loadFileWithTheToolkit(benchmark::State& state) {
     const Installation installation;
@@ -121,6 +121,6 @@ void loadFileWithTheToolkit(benchmark::State& state) {
     }
     state.SetItemsProcessed(state.iterations() * 10000);
 }
-BENCHMARK(loadFileWithTheToolkit)->Unit(benchmark::millisecond);
+BENCHMARK(loadFileWithTheToolkit)->Unit(benchmark::kMillisecond);
 
 } // namespace

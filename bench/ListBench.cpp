@@ -167,13 +167,13 @@ void filter(benchmark::State& state) {
     }
 }
 
-BENCHMARK_CAPTURE(listWidget, uniform, Widths::Ignored)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(listWidget, uniform_widths, Widths::Measured)->Unit(benchmark::millisecond);
-BENCHMARK(sortedListWidget)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(fill, Gui_ListBox, Widths::Ignored)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(fill, Gui_ListBox_widths, Widths::Measured)->Unit(benchmark::millisecond);
-BENCHMARK(merge)->Unit(benchmark::millisecond);
-BENCHMARK(sortedBox)->Unit(benchmark::millisecond);
-BENCHMARK(filter)->Unit(benchmark::millisecond);
+BENCHMARK_CAPTURE(listWidget, uniform, Widths::Ignored)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(listWidget, uniform_widths, Widths::Measured)->Unit(benchmark::kMillisecond);
+BENCHMARK(sortedListWidget)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(fill, Gui_ListBox, Widths::Ignored)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(fill, Gui_ListBox_widths, Widths::Measured)->Unit(benchmark::kMillisecond);
+BENCHMARK(merge)->Unit(benchmark::kMillisecond);
+BENCHMARK(sortedBox)->Unit(benchmark::kMillisecond);
+BENCHMARK(filter)->Unit(benchmark::kMillisecond);
 
 } // namespace

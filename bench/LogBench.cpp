@@ -130,11 +130,11 @@ void paintOnly(benchmark::State& state) {
     }
 }
 
-BENCHMARK_CAPTURE(textArea, hidden, Shown::No)->Arg(60000)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(append, hidden, Shown::No)->Arg(60000)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(textArea, shown, Shown::Yes)->Arg(60000)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK_CAPTURE(append, shown, Shown::Yes)->Arg(60000)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK(appendChunks)->Arg(60000)->Arg(1000000)->Unit(benchmark::millisecond);
-BENCHMARK(paintOnly)->Unit(benchmark::millisecond);
+BENCHMARK_CAPTURE(textArea, hidden, Shown::No)->Arg(60000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(append, hidden, Shown::No)->Arg(60000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(textArea, shown, Shown::Yes)->Arg(60000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(append, shown, Shown::Yes)->Arg(60000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK(appendChunks)->Arg(60000)->Arg(1000000)->Unit(benchmark::kMillisecond);
+BENCHMARK(paintOnly)->Unit(benchmark::kMillisecond);
 
 } // namespace

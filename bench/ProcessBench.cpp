@@ -2,6 +2,7 @@
 //
 // The draining cases are pinned: writer and reader on one core ("same") or on two ("other"). Placement by the scheduler
 // moves the results by a factor of three.
+#include "bench/SystemCalls.h"
 #include "platform/win/Process.h"
 #include "s/Process.h"
 
@@ -11,6 +12,7 @@
 #include <csignal>
 #include <cstring>
 #include <fcntl.h>
+#include <functional>
 #include <memory>
 #include <poll.h>
 #include <sched.h>
@@ -40,47 +42,60 @@ void pin(int core) {
     ::sched_setaffinity(0, sizeof set, &set);
 }
 
-// Starting: until the program runs. Its end is awaited outside the measured time.
+// Starting: until the program runs. Its end is awaited outside the measured time. "calls" are those of the system,
+// which count where each of them is slow, as in sandboxes.
 
-void startOurs(benchmark::State& state) {
+void countCalls(benchmark::State& state, const std::function<void()>& work) {
+    state.counters["calls"] = static_cast<double>(SystemCalls::of(work));
+}
+
+void runOurs(int capture) {
+    Gui_Process process;
+    SystemCalls::mark();
+    process.Run("/bin/true", nullptr, capture, 1);
+    SystemCalls::mark();
+    process.Wait(0xFFFFFFFF);
+}
+
+void startOurs(benchmark::State& state, int capture) {
     growTo200Megabytes();
     for (auto _ : state) {
         Gui_Process process;
-        process.Run("/bin/true", nullptr, 0, 1);
+        process.Run("/bin/true", nullptr, capture, 1);
         state.PauseTiming();
         process.Wait(0xFFFFFFFF);
         process.Release();
         state.ResumeTiming();
     }
+    countCalls(state, [capture] { runOurs(capture); });
 }
-BENCHMARK(startOurs)->Unit(benchmark::microsecond)->UseRealTime();
+BENCHMARK_CAPTURE(startOurs, alone, 0)->Unit(benchmark::kMicrosecond)->UseRealTime();
+BENCHMARK_CAPTURE(startOurs, captured, 1)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
-void startCapturedOurs(benchmark::State& state) {
-    growTo200Megabytes();
-    for (auto _ : state) {
-        Gui_Process process;
-        process.Run("/bin/true", nullptr, 1, 1);
-        state.PauseTiming();
-        process.Wait(0xFFFFFFFF);
-        process.Release();
-        state.ResumeTiming();
-    }
+pid_t spawn() {
+    char name[] = "/bin/true";
+    char* arguments[] = {name, nullptr};
+    pid_t child = 0;
+    ::posix_spawn(&child, name, nullptr, nullptr, arguments, environ);
+    return child;
 }
-BENCHMARK(startCapturedOurs)->Unit(benchmark::microsecond)->UseRealTime();
 
 void startPosixSpawn(benchmark::State& state) {
     growTo200Megabytes();
-    char name[] = "/bin/true";
-    char* arguments[] = {name, nullptr};
     for (auto _ : state) {
-        pid_t child = 0;
-        ::posix_spawn(&child, name, nullptr, nullptr, arguments, environ);
+        const pid_t child = spawn();
         state.PauseTiming();
         ::waitpid(child, nullptr, 0);
         state.ResumeTiming();
     }
+    countCalls(state, [] {
+        SystemCalls::mark();
+        const pid_t child = spawn();
+        SystemCalls::mark();
+        ::waitpid(child, nullptr, 0);
+    });
 }
-BENCHMARK(startPosixSpawn)->Unit(benchmark::microsecond)->UseRealTime();
+BENCHMARK(startPosixSpawn)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
 void startToolkit(benchmark::State& state) {
     growTo200Megabytes();
@@ -93,7 +108,7 @@ void startToolkit(benchmark::State& state) {
         state.ResumeTiming();
     }
 }
-BENCHMARK(startToolkit)->Unit(benchmark::microsecond)->UseRealTime();
+BENCHMARK(startToolkit)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
 // Draining 256 MiB. The range is 0 for small blocks ("head"), 1 for blocks of 1 MiB ("dd"), and 0 for one core, 1 for
 // two.
@@ -218,7 +233,7 @@ void drainToolkit(benchmark::State& state) {
 
 void placements(benchmark::internal::Benchmark* bench) {
     bench->ArgNames({"big", "other"})->ArgsProduct({{0, 1}, {0, 1}});
-    bench->Unit(benchmark::millisecond)->UseRealTime()->Iterations(3);
+    bench->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
 }
 BENCHMARK(drainOurs)->Apply(placements);
 BENCHMARK(drainLayer)->Apply(placements);
@@ -232,6 +247,11 @@ void aliveById(benchmark::State& state) {
     for (auto _ : state) {
         benchmark::DoNotOptimize(Gui_Process::IsActive(parent));
     }
+    countCalls(state, [parent] {
+        SystemCalls::mark();
+        Gui_Process::IsActive(parent);
+        SystemCalls::mark();
+    });
 }
 BENCHMARK(aliveById);
 

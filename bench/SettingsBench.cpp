@@ -159,7 +159,7 @@ void read(benchmark::State& state) {
     }
     RegCloseKey(key);
 }
-BENCHMARK(read)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond);
+BENCHMARK(read)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond);
 
 /// Each value the first time after somebody's write: nothing can be answered from memory.
 void readAfterAWrite(benchmark::State& state) {
@@ -180,7 +180,7 @@ void readAfterAWrite(benchmark::State& state) {
     }
     RegCloseKey(key);
 }
-BENCHMARK(readAfterAWrite)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond);
+BENCHMARK(readAfterAWrite)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond);
 
 void readWithTheDatabaseAlone(benchmark::State& state) {
     const Folder folder;
@@ -191,7 +191,7 @@ void readWithTheDatabaseAlone(benchmark::State& state) {
         benchmark::DoNotOptimize(database.read(valueName(i++ % 50)));
     }
 }
-BENCHMARK(readWithTheDatabaseAlone)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond);
+BENCHMARK(readWithTheDatabaseAlone)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond);
 
 void readWithTheToolkit(benchmark::State& state) {
     const Folder folder;
@@ -203,7 +203,7 @@ void readWithTheToolkit(benchmark::State& state) {
         benchmark::DoNotOptimize(settings.value("bench/" + QString::number(i++ % 50)).toString().toUtf8());
     }
 }
-BENCHMARK(readWithTheToolkit)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond);
+BENCHMARK(readWithTheToolkit)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond);
 
 // --- write one value for others and for good ---
 // Each time another text than before (the same one costs the database nothing), and all as many times (a log that grows
@@ -221,7 +221,7 @@ void write(benchmark::State& state) {
     }
     RegCloseKey(key);
 }
-BENCHMARK(write)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond)->UseRealTime()->Iterations(1500);
+BENCHMARK(write)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond)->UseRealTime()->Iterations(1500);
 
 void writeWithTheDatabaseAlone(benchmark::State& state) {
     const Folder folder;
@@ -237,7 +237,7 @@ void writeWithTheDatabaseAlone(benchmark::State& state) {
 BENCHMARK(writeWithTheDatabaseAlone)
     ->Arg(200)
     ->Arg(5000)
-    ->Unit(benchmark::microsecond)
+    ->Unit(benchmark::kMicrosecond)
     ->UseRealTime()
     ->Iterations(1500);
 
@@ -253,7 +253,7 @@ void writeWithTheToolkit(benchmark::State& state) {
         settings.sync();
     }
 }
-BENCHMARK(writeWithTheToolkit)->Arg(200)->Arg(5000)->Unit(benchmark::microsecond)->UseRealTime()->Iterations(100);
+BENCHMARK(writeWithTheToolkit)->Arg(200)->Arg(5000)->Unit(benchmark::kMicrosecond)->UseRealTime()->Iterations(100);
 
 void writeHundredTogether(benchmark::State& state) {
     const Folder folder;
@@ -275,7 +275,7 @@ void writeHundredTogether(benchmark::State& state) {
     }
     RegCloseKey(key);
 }
-BENCHMARK(writeHundredTogether)->Unit(benchmark::microsecond)->UseRealTime();
+BENCHMARK(writeHundredTogether)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
 // --- two processes write 2,000 values each ---
 
@@ -366,7 +366,7 @@ void twoProcessesWrite(benchmark::State& state) {
     state.counters["lost"] = lost;
     state.counters["worst_ms"] = worst;
 }
-BENCHMARK(twoProcessesWrite)->Unit(benchmark::millisecond)->UseRealTime()->Iterations(3);
+BENCHMARK(twoProcessesWrite)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
 
 void twoProcessesWriteWithTheDatabaseAlone(benchmark::State& state) {
     double worst = 0;
@@ -385,6 +385,6 @@ void twoProcessesWriteWithTheDatabaseAlone(benchmark::State& state) {
     }
     state.counters["worst_ms"] = worst;
 }
-BENCHMARK(twoProcessesWriteWithTheDatabaseAlone)->Unit(benchmark::millisecond)->UseRealTime()->Iterations(3);
+BENCHMARK(twoProcessesWriteWithTheDatabaseAlone)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
 
 } // namespace

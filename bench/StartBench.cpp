@@ -154,8 +154,8 @@ void bareWindow(benchmark::State& state) {
 }
 
 // Interleaved by the runner's option --benchmark_enable_random_interleaving=true.
-BENCHMARK(bareWindow)->UseManualTime()->Unit(benchmark::millisecond)->Iterations(10)->Repetitions(5);
-BENCHMARK(board)->UseManualTime()->Unit(benchmark::millisecond)->Iterations(10)->Repetitions(5);
+BENCHMARK(bareWindow)->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(10)->Repetitions(5);
+BENCHMARK(board)->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(10)->Repetitions(5);
 
 } // namespace
 

@@ -47,7 +47,7 @@ void splitMegabyte(benchmark::State& state) {
         benchmark::DoNotOptimize(std::unique_ptr<CStringArray>(text.GetStringArray(";", 1, 0))->GetSize());
     }
 }
-BENCHMARK(splitMegabyte)->Unit(benchmark::millisecond);
+BENCHMARK(splitMegabyte)->Unit(benchmark::kMillisecond);
 
 void splitMegabyteWithTheToolkit(benchmark::State& state) {
     const QString text = QString::fromStdString(megabyte());
@@ -55,7 +55,7 @@ void splitMegabyteWithTheToolkit(benchmark::State& state) {
         benchmark::DoNotOptimize(text.split(u';', Qt::SkipEmptyParts).size());
     }
 }
-BENCHMARK(splitMegabyteWithTheToolkit)->Unit(benchmark::millisecond);
+BENCHMARK(splitMegabyteWithTheToolkit)->Unit(benchmark::kMillisecond);
 
 /// A separator outside ASCII is compared character by character.
 void splitMegabyteAtWideCharacters(benchmark::State& state) {
@@ -64,6 +64,6 @@ void splitMegabyteAtWideCharacters(benchmark::State& state) {
         benchmark::DoNotOptimize(std::unique_ptr<CStringArray>(text.GetStringArray("¤;", 1, 1))->GetSize());
     }
 }
-BENCHMARK(splitMegabyteAtWideCharacters)->Unit(benchmark::millisecond);
+BENCHMARK(splitMegabyteAtWideCharacters)->Unit(benchmark::kMillisecond);
 
 } // namespace

@@ -116,18 +116,18 @@ template <typename Matcher>
 void add(const std::string& who) {
     for (const char* pattern : {"*.cpp", "*a*b*c*", "m?in*", "*xyz*"}) {
         benchmark::RegisterBenchmark((std::string(pattern) + '/' + who).c_str(), manyNames<Matcher>, pattern)
-            ->Unit(benchmark::microsecond);
+            ->Unit(benchmark::kMicrosecond);
     }
     const std::string many(10000, 'a');
     constexpr const char* attack = "*a*a*a*a*a*b";
     benchmark::RegisterBenchmark(("attack on a.../" + who).c_str(), longText<Matcher>, attack, many)
-        ->Unit(benchmark::microsecond);
+        ->Unit(benchmark::kMicrosecond);
     benchmark::RegisterBenchmark(("attack on ba.../" + who).c_str(), longText<Matcher>, attack, "b" + many)
-        ->Unit(benchmark::microsecond);
+        ->Unit(benchmark::kMicrosecond);
     benchmark::RegisterBenchmark(("*aaaaaaaab* on a.../" + who).c_str(), longText<Matcher>, "*aaaaaaaab*", many)
-        ->Unit(benchmark::microsecond);
+        ->Unit(benchmark::kMicrosecond);
     benchmark::RegisterBenchmark(("*a?a?a?b* on a.../" + who).c_str(), longText<Matcher>, "*a?a?a?b*", many)
-        ->Unit(benchmark::microsecond);
+        ->Unit(benchmark::kMicrosecond);
 }
 
 const bool added = [] {

@@ -14,6 +14,7 @@ namespace {
 constexpr unsigned long crashBits = 0xC0000000;
 constexpr WORD showHidden = 0;
 constexpr WORD showNormally = 5;
+constexpr DWORD smallPipe = 4096;
 
 bool isValid(HANDLE handle) {
     return handle != INVALID_HANDLE_VALUE;
@@ -42,7 +43,9 @@ struct Pipe {
 
     bool Create(PipeEnds ends) {
         const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
-        if (!CreatePipe(&readEnd, &writeEnd, &inheritable, 0)) {
+        // Little is written to a child.
+        const DWORD size = ends == PipeEnds::OnlyReadingForChild ? smallPipe : 0;
+        if (!CreatePipe(&readEnd, &writeEnd, &inheritable, size)) {
             return false;
         }
         const HANDLE self = GetCurrentProcess();

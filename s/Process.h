@@ -55,8 +55,8 @@ public:
     /// @param timeout  not used: programs do not tell when their window is there
     int RunWaitForWindow(const char* commandLine, const char* directory, unsigned long timeout);
 
-    /// What the child ended with: 259 while it runs, 0xFFFFFFFF without a child. A child that a signal ended has a code
-    /// beginning with 0xC or 0x8.
+    /// What the child ended with: 259 while it runs, 0xFFFFFFFF without a child. A child that crashed has a code
+    /// beginning with 0xC or 0x8; one that was stopped by a signal 128 and the signal's number.
     unsigned long GetExitCode();
     /// Whether the child still runs: 1 or 0.
     int IsActive();

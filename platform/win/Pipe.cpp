@@ -32,13 +32,15 @@ int waitingBytes(int pipe) {
 
 } // namespace
 
-BOOL CreatePipe(HANDLE* readEnd, HANDLE* writeEnd, const SECURITY_ATTRIBUTES* attributes, DWORD /*size*/) {
+BOOL CreatePipe(HANDLE* readEnd, HANDLE* writeEnd, const SECURITY_ATTRIBUTES* attributes, DWORD size) {
     int ends[2];
     if (::pipe2(ends, O_CLOEXEC) != 0) {
         return failed(tvx::errorFromErrno(errno));
     }
     // The system's own size does where it allows no more.
-    ::fcntl(ends[0], F_SETPIPE_SZ, capacity);
+    if (size == 0) {
+        ::fcntl(ends[0], F_SETPIPE_SZ, capacity);
+    }
     const Inheritance inheritance =
         attributes && attributes->bInheritHandle ? Inheritance::Inheritable : Inheritance::None;
     *readEnd = makeHandle(std::make_shared<PipeObject>(Descriptor(ends[0])), inheritance);

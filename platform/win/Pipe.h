@@ -26,7 +26,7 @@ struct SECURITY_ATTRIBUTES {
 /// so that a child that writes much seldom waits for its reader.
 /// @param readEnd, writeEnd  receive the handles, which the caller closes; unchanged on failure
 /// @param attributes         whether both ends may be given to a child; null: they may not
-/// @param size               not used
+/// @param size               0: as told above; else the pipe has the system's own size, 64 KiB
 /// @return FALSE with `ERROR_TOO_MANY_OPEN_FILES` when the process has no descriptors left
 TVX_PLATFORM_API BOOL CreatePipe(HANDLE* readEnd, HANDLE* writeEnd, const SECURITY_ATTRIBUTES* attributes, DWORD size);
 

@@ -16,14 +16,17 @@ inline constexpr DWORD STILL_ACTIVE = 259; ///< What GetExitCodeProcess gives fo
 inline constexpr DWORD PROCESS_QUERY_INFORMATION = 0x0400; ///< The right to ask about a process.
 
 /// @{
-/// Exit codes of processes that a signal ended. A signal without a code of its own gives 0xC0000000 and its number; so
-/// does, with the number 0, an end whose code nobody can tell.
+/// Exit codes of processes that a signal ended because they had failed. SIGQUIT, SIGSYS, SIGXCPU and SIGXFSZ give
+/// 0xC0000000 and their number; so does, with the number 0, an end whose code nobody can tell. Signals by which
+/// somebody ends a program that has not failed (SIGTERM, SIGHUP, SIGKILL, SIGPIPE and the others) give 128 and their
+/// number.
 inline constexpr DWORD STATUS_BREAKPOINT = 0x80000003;
 inline constexpr DWORD STATUS_ACCESS_VIOLATION = 0xC0000005;
 inline constexpr DWORD STATUS_IN_PAGE_ERROR = 0xC0000006;
 inline constexpr DWORD STATUS_ILLEGAL_INSTRUCTION = 0xC000001D;
 inline constexpr DWORD STATUS_INTEGER_DIVIDE_BY_ZERO = 0xC0000094;
 inline constexpr DWORD STATUS_CONTROL_C_EXIT = 0xC000013A;
+inline constexpr DWORD STATUS_ASSERTION_FAILURE = 0xC0000420;
 /// @}
 
 inline constexpr DWORD STARTF_USESHOWWINDOW = 0x001; ///< `wShowWindow` of a start-up record counts.

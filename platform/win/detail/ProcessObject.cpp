@@ -12,7 +12,10 @@ namespace tvx::win {
 
 namespace {
 
+/// Of signals for programs that have failed, for which the system would write down their memory.
 constexpr DWORD signalBase = 0xC0000000;
+/// Of signals that only end a program, as shells count them.
+constexpr DWORD stoppedBase = 128;
 
 /// Collects an ended child. False when it runs, or when somebody else has collected it.
 bool collectStatus(int process, siginfo_t& status) {
@@ -45,10 +48,17 @@ DWORD exitCodeOf(const siginfo_t& status) {
         return STATUS_INTEGER_DIVIDE_BY_ZERO;
     case SIGBUS:
         return STATUS_IN_PAGE_ERROR;
+    case SIGABRT:
+        return STATUS_ASSERTION_FAILURE;
     case SIGTRAP:
         return STATUS_BREAKPOINT;
-    default:
+    case SIGQUIT:
+    case SIGSYS:
+    case SIGXCPU:
+    case SIGXFSZ:
         return signalBase + static_cast<DWORD>(status.si_status);
+    default:
+        return stoppedBase + static_cast<DWORD>(status.si_status);
     }
 }
 
@@ -56,7 +66,10 @@ ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
     : KernelObject(std::move(process)), m_kinship(kinship) {}
 
 ProcessObject::~ProcessObject() {
-    if (m_kinship == Kinship::Child && exitCode() == STILL_ACTIVE && !m_code) {
+    if (m_kinship == Kinship::Stranger) {
+        return;
+    }
+    if (exitCode() == STILL_ACTIVE && !m_code) {
         ReleasedChildren::instance().add(std::move(m_descriptor));
     }
     ReleasedChildren::instance().collect();

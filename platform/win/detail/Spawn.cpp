@@ -1,11 +1,15 @@
 #include "platform/win/detail/Spawn.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <csignal>
+#include <cstdint>
 #include <fcntl.h>
+#include <linux/sched.h>
 #include <memory>
 #include <sched.h>
 #include <sys/resource.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -19,46 +23,50 @@ struct Start {
     const SpawnRequest& request;
     SpawnStep step = SpawnStep::Start;
     int error = 0;
+    bool hasHandlers = false; ///< the handlers of this process are still the child's
 };
 
 constexpr std::size_t stackSize = 64 * 1024;
 
-/// A handler of the host's would run in the host's memory; and a host that ignores broken pipes or the ends of its
-/// children does so for itself.
-void resetSignals() {
+void setDefault(int number) {
+    struct sigaction action = {};
+    ::sigaction(number, &action, nullptr);
+}
+
+/// A handler of the host's would run in the host's memory.
+void resetHandlers() {
     for (int number = 1; number < NSIG; ++number) {
         struct sigaction action = {};
-        if (::sigaction(number, nullptr, &action) != 0 || action.sa_handler == SIG_DFL) {
-            continue;
+        if (::sigaction(number, nullptr, &action) == 0 && action.sa_handler != SIG_DFL &&
+            action.sa_handler != SIG_IGN) {
+            setDefault(number);
         }
-        if (action.sa_handler == SIG_IGN && number != SIGPIPE && number != SIGCHLD) {
-            continue;
-        }
-        action = {};
-        ::sigaction(number, &action, nullptr);
     }
 }
 
-int openStandard(int descriptor) {
-    const int source = descriptor == nullDevice ? ::open("/dev/null", O_RDWR) : descriptor;
-    // Above the three, where placing one does not overwrite another.
-    return ::fcntl(source, F_DUPFD, 3);
+/// The descriptor that is to become the standard one of that index, out of the way of the other two.
+int sourceOf(int descriptor, int index) {
+    return descriptor > STDERR_FILENO || descriptor == index ? descriptor : ::fcntl(descriptor, F_DUPFD, 3);
+}
+
+/// What this process itself does not have, the child does not get.
+bool place(int source, int index) {
+    if (source == index) {
+        ::fcntl(index, F_SETFD, 0);
+        return true;
+    }
+    return source < 0 ? ::close(index) == 0 || errno == EBADF : ::dup2(source, index) >= 0;
 }
 
 bool placeStandard(const std::array<int, 3>& standard) {
+    const bool needsNull = std::ranges::find(standard, nullDevice) != standard.end();
+    const int null = needsNull ? ::open("/dev/null", O_RDWR) : -1;
     std::array<int, 3> sources{};
-    for (std::size_t index = 0; index < standard.size(); ++index) {
-        sources[index] = openStandard(standard[index]);
+    for (int index = 0; index < 3; ++index) {
+        const int wanted = standard[static_cast<std::size_t>(index)];
+        sources[static_cast<std::size_t>(index)] = sourceOf(wanted == nullDevice ? null : wanted, index);
     }
-    for (std::size_t index = 0; index < standard.size(); ++index) {
-        // What this process itself does not have, the child does not get.
-        if (sources[index] < 0) {
-            ::close(static_cast<int>(index));
-        } else if (::dup2(sources[index], static_cast<int>(index)) < 0) {
-            return false;
-        }
-    }
-    return true;
+    return place(sources[0], 0) && place(sources[1], 1) && place(sources[2], 2);
 }
 
 void closeOthers() {
@@ -73,7 +81,12 @@ void closeOthers() {
 }
 
 bool prepare(Start& start) {
-    resetSignals();
+    if (start.hasHandlers) {
+        resetHandlers();
+    }
+    // A host that ignores broken pipes or the ends of its children does so for itself.
+    setDefault(SIGPIPE);
+    setDefault(SIGCHLD);
     ::setsid();
     if (!placeStandard(start.request.standard)) {
         return false;
@@ -95,6 +108,49 @@ __attribute__((no_sanitize("address"))) int runChild(void* data) {
     }
     start.error = errno;
     return 127;
+}
+
+/// Runs the child on a stack, with no handler of this process's, and waits until the program has started or failed to.
+/// This takes one call of the system, which the C library does not offer: its own function for it would return in the
+/// child, on the stack of the caller. -1 where the system or the processor is another one, and on failure.
+pid_t cloneWithoutHandlers([[maybe_unused]] Start& start, [[maybe_unused]] std::byte* stack,
+                           [[maybe_unused]] int& process) {
+#if defined(__x86_64__) && defined(CLONE_CLEAR_SIGHAND)
+    clone_args arguments{};
+    arguments.flags = CLONE_VM | CLONE_VFORK | CLONE_PIDFD | CLONE_CLEAR_SIGHAND;
+    arguments.pidfd = reinterpret_cast<std::uintptr_t>(&process);
+    arguments.exit_signal = SIGCHLD;
+    arguments.stack = reinterpret_cast<std::uintptr_t>(stack);
+    arguments.stack_size = stackSize;
+    long result = SYS_clone3;
+    asm volatile("syscall\n\t"
+                 "testq %%rax, %%rax\n\t"
+                 "jnz 1f\n\t"
+                 "xorl %%ebp, %%ebp\n\t" // the outermost frame
+                 "movq %[start], %%rdi\n\t"
+                 "callq *%[run]\n\t"
+                 "movl %%eax, %%edi\n\t"
+                 "movl %[exit], %%eax\n\t"
+                 "syscall\n\t"
+                 "hlt\n"
+                 "1:"
+                 : "+a"(result)
+                 : "D"(&arguments),
+                   "S"(sizeof arguments), [start] "r"(&start), [run] "r"(&runChild), [exit] "i"(SYS_exit)
+                 : "rcx", "r11", "memory", "cc");
+    return result < 0 ? -1 : static_cast<pid_t>(result);
+#else
+    return -1;
+#endif
+}
+
+pid_t cloneChild(Start& start, std::byte* stack, int& process) {
+    const pid_t id = cloneWithoutHandlers(start, stack, process);
+    if (id >= 0) {
+        return id;
+    }
+    start.hasHandlers = true;
+    return ::clone(&runChild, stack + stackSize, CLONE_VM | CLONE_VFORK | CLONE_PIDFD | SIGCHLD, &start, &process);
 }
 
 /// Keeps signals away from the thread: their handlers must not run in the child.
@@ -130,8 +186,7 @@ SpawnResult spawn(const SpawnRequest& request) {
     SpawnResult result;
     {
         const SignalsBlocked blocked;
-        result.id = ::clone(&runChild, stack.get() + stackSize, CLONE_VM | CLONE_VFORK | CLONE_PIDFD | SIGCHLD, &start,
-                            &process);
+        result.id = cloneChild(start, stack.get(), process);
         result.error = result.id < 0 ? errno : start.error;
     }
     if (result.id < 0) {
