@@ -1,5 +1,6 @@
 #include "s/Bitmap.h"
 
+#include "platform/win/Files.h"
 #include "s/BitmapFile.h"
 
 #include <new>
@@ -63,7 +64,9 @@ HBITMAP createBitmap(CDC* dc, const BitmapFile& file) {
 
 Gui_Bitmap::LoadError load(HBITMAP& bitmap, const char* fileName, CDC* dc) {
     CFile file;
-    if (!fileName || !file.Open(fileName, CFile::modeRead | CFile::shareDenyNone)) {
+    // A pipe would keep the caller waiting, a device might never end.
+    if (!fileName || tvx::fileKind(fileName) != tvx::FileKind::File ||
+        !file.Open(fileName, CFile::modeRead | CFile::shareDenyNone)) {
         return Gui_Bitmap::CannotOpen;
     }
     BitmapFile read;

@@ -11,7 +11,7 @@ Gui_CommandLineInfo::Gui_CommandLineInfo() : m_impl(MakeRecord<Gui_CommandLineIn
 Gui_CommandLineInfo::~Gui_CommandLineInfo() = default;
 
 void Gui_CommandLineInfo::ParseParam(const char* param, BOOL isSwitch, BOOL isLast) {
-    if (!m_impl->ParseParam(*this, param, isSwitch)) {
+    if (!tvx::allocating([&] { return m_impl->ParseParam(*this, param, isSwitch); })) {
         CCommandLineInfo::ParseParam(param, isSwitch, isLast);
     }
     if (m_impl->IsNoSplashSwitch()) {
@@ -32,7 +32,12 @@ Gui_CommandLineInfo::IntStyleEnum Gui_CommandLineInfo::GetStyleSwitch() const {
 }
 
 Gui_CommandLineInfo_Impl::~Gui_CommandLineInfo_Impl() {
-    IssueCommandFileProblems(m_problems);
+    // A destructor has nobody to tell that the heap is exhausted.
+    try {
+        tvx::allocating([this] { IssueCommandFileProblems(m_problems); });
+    } catch (CMemoryException* exception) {
+        exception->Delete();
+    }
 }
 
 int Gui_CommandLineInfo_Impl::IsSmokeTestSwitch() const {

@@ -47,7 +47,7 @@ void Gui_CmdLineArgsArray::ParseParam(const char* param, BOOL isSwitch, BOOL) {
         }
     } else if (m_commandFilePending) {
         m_hasCommandFile = true;
-        ExpandCommandFile(*this, param, m_problems);
+        tvx::allocating([&] { ExpandCommandFile(*this, param, m_problems); });
     } else {
         m_arguments.Add(CString(param));
     }
@@ -65,7 +65,7 @@ int Gui_CmdLineArgsArray::GetCount() const {
 
 char** Gui_CmdLineArgsArray::GetVector() {
     if (!m_vector && GetCount() > 0) {
-        m_vector = std::make_unique<char*[]>(static_cast<std::size_t>(GetCount()));
+        m_vector = tvx::allocating([this] { return std::make_unique<char*[]>(static_cast<std::size_t>(GetCount())); });
         for (int i = 0; i < GetCount(); ++i) {
             m_vector[i] = m_arguments[i].GetBuffer();
         }

@@ -74,7 +74,8 @@ int Gui_FileName::IsDirectory() const {
 }
 
 int Gui_FileName::IsFile() const {
-    return kindOf(*this) == tvx::FileKind::File;
+    const tvx::FileKind kind = kindOf(*this);
+    return kind == tvx::FileKind::File || kind == tvx::FileKind::Device;
 }
 
 int Gui_FileName::IsWritable() const {

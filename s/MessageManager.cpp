@@ -18,14 +18,38 @@ Gui_MessageManager::Gui_MessageManager(Callback errorCallback, Callback statusCa
 
 Gui_MessageManager::~Gui_MessageManager() = default;
 
-void Gui_MessageManager::msgWrite(MsgType type, const wchar_t* text) {
+namespace {
+
+/// The lines that a message is shown in, as the formatting hands them over.
+class Lines {
+public:
+    wchar_t** array = nullptr;
     int count = 0;
-    wchar_t** lines = msgFormat(type, getClean(), getMaxLineWidth(), text, &count);
-    CString out;
-    for (int i = 0; i < count; ++i) {
-        out += UT_STR::WstrToMbstr(lines[i]).c_str();
+
+    Lines() = default;
+    ~Lines() {
+        UT_STR::WDelStrings(array, count);
     }
-    UT_STR::WDelStrings(lines, count);
+    Lines(const Lines&) = delete;
+    Lines& operator=(const Lines&) = delete;
+
+    CString joined() const {
+        CString text;
+        for (int i = 0; i < count; ++i) {
+            text += UT_STR::WstrToMbstr(array[i]).c_str();
+        }
+        return text;
+    }
+};
+
+} // namespace
+
+void Gui_MessageManager::msgWrite(MsgType type, const wchar_t* text) {
+    const CString out = tvx::allocating([&] {
+        Lines lines;
+        lines.array = msgFormat(type, getClean(), getMaxLineWidth(), text, &lines.count);
+        return lines.joined();
+    });
     if (type >= MsgTypeError && type <= MsgTypeFatal) {
         writeError(out);
     } else {

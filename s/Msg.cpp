@@ -95,6 +95,6 @@ const CString& Gui_Msg::expanded() {
 
 CString Gui_Msg::Format(const char* format, int number) {
     CString text;
-    text.Format(format, number);
+    text.Format(format ? format : "", number);
     return text;
 }

@@ -5,6 +5,8 @@
 #include "s/SettingsKey.h"
 
 #include <optional>
+#include <string>
+#include <string_view>
 #include <utility>
 
 namespace {
@@ -16,8 +18,12 @@ constexpr int versionLength = 4;
 constexpr DWORD longestNumber = 20;
 
 CString installedVersion() {
-    const CString version = CString(Port::Version::getValue("version").c_str()).Left(versionLength);
-    return version.IsEmpty() ? CString(defaultVersion) : version;
+    const std::string version = Port::Version::getValue("version").c_str();
+    std::size_t length = 0;
+    for (int i = 0; i < versionLength; ++i) {
+        length += tvx::text::characterLength(version, length);
+    }
+    return length == 0 ? CString(defaultVersion) : CString(std::string_view(version).substr(0, length));
 }
 
 } // namespace

@@ -109,12 +109,13 @@ const char* Gui_String::GetEndOfLineChars() {
     return "\r\n";
 }
 
-CStringArray* Gui_String::GetStringArray(const char* separators, int skipEmpty, int ignoreQuotes) const {
+namespace {
+
+std::unique_ptr<CStringArray> split(std::string_view text, const char* separators, int skipEmpty, int ignoreQuotes) {
     const std::string given = separators ? separators : "";
     const CharacterSet skipped(given);
     const CharacterSet stops(ignoreQuotes ? given : given + "\"'");
     auto fields = MakeRecord<CStringArray>();
-    const std::string_view text = View();
     std::size_t start = 0;
     for (std::size_t at = stops.find(text, 0); at < text.size(); at = stops.find(text, start)) {
         if (at > start || !skipEmpty) {
@@ -128,5 +129,11 @@ CStringArray* Gui_String::GetStringArray(const char* separators, int skipEmpty, 
     if (start < text.size()) {
         add(*fields, text.substr(start));
     }
-    return fields.release();
+    return fields;
+}
+
+} // namespace
+
+CStringArray* Gui_String::GetStringArray(const char* separators, int skipEmpty, int ignoreQuotes) const {
+    return tvx::allocating([&] { return split(View(), separators, skipEmpty, ignoreQuotes); }).release();
 }

@@ -72,7 +72,7 @@ int Gui_WinApp::ProcessCommandLine(const Gui_CommandLineInfo& info) {
     info.m_impl->ForgetProblems();
     if (arguments.GetCount() > 0 || arguments.GetProblems().GetSize() > 0) {
         m_data->usageText = info.GetUsageText();
-        if (!check(arguments, info.GetCmdOpcodes())) {
+        if (!tvx::allocating([&] { return check(arguments, info.GetCmdOpcodes()); })) {
             tvx::afx::setStartCode(refusedCommandLine);
         }
     }

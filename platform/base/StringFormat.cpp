@@ -37,7 +37,7 @@ void CStringT<char>::Format(UINT formatId, ...) {
 }
 
 void CStringT<char>::FormatV(LPCSTR format, std::va_list arguments) {
-    *this = CStringT(tvx::text::formatV(format, arguments));
+    *this = tvx::allocating([&] { return CStringT(tvx::text::formatV(format, arguments)); });
 }
 
 void CStringT<char>::AppendFormat(LPCSTR format, ...) {
@@ -56,7 +56,7 @@ void CStringT<char>::AppendFormat(UINT formatId, ...) {
 }
 
 void CStringT<char>::AppendFormatV(LPCSTR format, std::va_list arguments) {
-    append(tvx::text::formatV(format, arguments));
+    append(tvx::allocating([&] { return tvx::text::formatV(format, arguments); }));
 }
 
 BOOL CStringT<char>::LoadString(UINT id) {
@@ -65,7 +65,7 @@ BOOL CStringT<char>::LoadString(UINT id) {
 
 BOOL CStringT<char>::LoadString(HINSTANCE module, UINT id) {
     std::string text;
-    if (!tvx::loadString(module, id, text)) {
+    if (!tvx::allocating([&] { return tvx::loadString(module, id, text); })) {
         return FALSE;
     }
     assign(text);

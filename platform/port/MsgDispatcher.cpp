@@ -6,10 +6,19 @@
 
 namespace {
 
-/// The registered managers, the first to be asked last. Never destroyed: managers with static storage outlive `main`.
+/// Never destroyed: managers with static storage outlive `main`. Nor does it take memory: managers whose making fails
+/// for want of it ask for it too.
+union Managers {
+    std::vector<Port_MsgMan*> list;
+    constexpr Managers() : list() {}
+    // NOLINTNEXTLINE(modernize-use-equals-default): that one would be deleted
+    ~Managers() {}
+};
+
+/// The registered managers, the first to be asked last.
 std::vector<Port_MsgMan*>& registered() {
-    static auto& managers = *new std::vector<Port_MsgMan*>;
-    return managers;
+    static Managers managers;
+    return managers.list;
 }
 
 Port_MsgMan& builtIn() {

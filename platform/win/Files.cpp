@@ -215,7 +215,8 @@ tvx::FileKind tvx::fileKind(LPCSTR name) {
     if (!location) {
         return FileKind::None;
     }
-    return S_ISDIR(location->state.st_mode) ? FileKind::Folder : FileKind::File;
+    const mode_t mode = location->state.st_mode;
+    return S_ISDIR(mode) ? FileKind::Folder : S_ISREG(mode) ? FileKind::File : FileKind::Device;
 }
 
 std::string tvx::fullName(std::string_view name) {

@@ -101,7 +101,12 @@ inline DWORD GetFullPathName(LPCSTR name, DWORD size, LPSTR buffer, LPSTR* fileP
 namespace tvx {
 
 /// What there is under a name.
-enum class FileKind { None, File, Folder };
+enum class FileKind {
+    None,
+    File,
+    Folder,
+    Device, ///< or a pipe: reading may wait for ever
+};
 
 /// Tells what there is under a name, links followed, in half the time that GetFileAttributesA takes: whether it may be
 /// written is not asked. FileKind::None, with the last error, when that cannot be told.

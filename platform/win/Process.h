@@ -80,7 +80,8 @@ struct PROCESS_INFORMATION {
 /// @param information  receives handles and ids; unchanged on failure
 /// @return FALSE on failure, also when the program was found but could not be started: `ERROR_FILE_NOT_FOUND`,
 ///         `ERROR_PATH_NOT_FOUND`, `ERROR_ACCESS_DENIED` (not executable), `ERROR_BAD_EXE_FORMAT` (no program),
-///         `ERROR_DIRECTORY`, `ERROR_FILENAME_EXCED_RANGE` (command line too long), `ERROR_INVALID_PARAMETER` (empty)
+///         `ERROR_DIRECTORY`, `ERROR_FILENAME_EXCED_RANGE` (program's name or command line too long),
+///         `ERROR_INVALID_PARAMETER` (empty)
 TVX_PLATFORM_API BOOL CreateProcessA(LPCSTR application, LPSTR commandLine,
                                      const SECURITY_ATTRIBUTES* processAttributes,
                                      const SECURITY_ATTRIBUTES* threadAttributes, BOOL inherit, DWORD flags,

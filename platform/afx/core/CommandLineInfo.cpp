@@ -1,5 +1,6 @@
 #include "platform/afx/core/CommandLineInfo.h"
 
+#include "platform/base/Exception.h"
 #include "platform/base/Text.h"
 
 #include <filesystem>
@@ -73,8 +74,11 @@ tvx::afx::CommandLineWord tvx::afx::takeApart(const char* word) {
     if (word[0] != '-' && word[0] != '/') {
         return {word, false};
     }
-    std::error_code ignored;
-    if (word[0] == '/' && std::filesystem::exists(word, ignored)) {
+    const auto exists = [word] {
+        std::error_code ignored;
+        return std::filesystem::exists(word, ignored);
+    };
+    if (word[0] == '/' && tvx::allocating(exists)) {
         return {word, false};
     }
     return {word + 1, true};

@@ -232,7 +232,10 @@ int AfxMessageBox(UINT textId, UINT type, UINT helpId) {
 }
 
 int CWnd::MessageBox(LPCSTR text, LPCSTR caption, UINT type) {
-    return ::MessageBoxA(m_hWnd, text, caption ? caption : AfxGetAppName(), type);
+    // The name for display, as AfxMessageBox has it.
+    const CWinApp* app = AfxGetApp();
+    const LPCSTR name = app && app->m_pszAppName ? app->m_pszAppName : AfxGetAppName();
+    return ::MessageBoxA(m_hWnd, text, caption ? caption : name, type);
 }
 
 BOOL MessageBeep(UINT) {

@@ -51,6 +51,11 @@ void CControlBar::OnDestroy() {
     CWnd::OnDestroy();
 }
 
+DWORD CControlBar::GetBarStyle() const {
+    const DWORD side = sideOfDockBar(GetDockSide());
+    return side != 0 ? (m_dwStyle & ~DWORD{CBRS_ALIGN_ANY}) | side : m_dwStyle;
+}
+
 void CControlBar::SetBarStyle(DWORD style) {
     m_dwStyle = style;
 }

@@ -43,10 +43,8 @@ public:
     int GetCount() const {
         return m_nCount;
     }
-    /// The CBRS_... bits.
-    DWORD GetBarStyle() const {
-        return m_dwStyle;
-    }
+    /// The CBRS_... bits. Of a docked bar they tell the side that it is docked at now.
+    DWORD GetBarStyle() const;
     /// Replaces the CBRS_... bits. The side takes effect when the frame lays itself out.
     void SetBarStyle(DWORD style);
     /// Allows the bar to be moved by the user and docked at these sides (CBRS_ALIGN_...); 0 lets it float only.

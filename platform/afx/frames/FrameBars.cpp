@@ -72,7 +72,7 @@ void CFrameWnd::addBar(CControlBar* bar) {
     }
     guarded([&] {
         if (auto* tools = qobject_cast<QToolBar*>(widget)) {
-            main->addToolBar(firstArea(bar->GetBarStyle()), tools);
+            main->addToolBar(firstArea(bar->m_dwStyle), tools);
         } else {
             attachStatusBar(*main, widget);
         }

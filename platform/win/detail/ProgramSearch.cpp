@@ -25,6 +25,9 @@ DWORD checkProgram(const std::string& file) {
     if (status.type() == fs::file_type::regular) {
         return ::access(file.c_str(), X_OK) == 0 ? ERROR_SUCCESS : ERROR_ACCESS_DENIED;
     }
+    if (error == std::errc::filename_too_long) {
+        return ERROR_FILENAME_EXCED_RANGE;
+    }
     if (status.type() != fs::file_type::not_found) {
         return ERROR_ACCESS_DENIED;
     }

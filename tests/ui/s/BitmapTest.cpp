@@ -10,6 +10,7 @@
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <sys/stat.h>
 
 namespace {
 
@@ -106,6 +107,11 @@ TEST(Bitmap, TellsWhyAFileIsNotLoaded) {
     EXPECT_EQ(Gui_Bitmap::LoadBitmapFromFile(handle, "/no/such/file.bmp", nullptr, &error), 0);
     EXPECT_EQ(error, Gui_Bitmap::CannotOpen);
     EXPECT_EQ(Gui_Bitmap::LoadBitmapFromFile(handle, nullptr, nullptr, nullptr), 0);
+    const auto pipe = std::filesystem::temp_directory_path() / "pipe";
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0); // nobody writes to it
+    EXPECT_EQ(Gui_Bitmap::LoadBitmapFromFile(handle, pipe.c_str(), nullptr, &error), 0);
+    EXPECT_EQ(error, Gui_Bitmap::CannotOpen);
+    std::filesystem::remove(pipe);
     EXPECT_EQ(load("This is a text and no picture at all.\n"), Gui_Bitmap::NotSupported);
     EXPECT_EQ(load(""), Gui_Bitmap::NotSupported);
     EXPECT_EQ(load(FileBytes({3, 2, 24, std::string(24, '\x7F')}).bytes), Gui_Bitmap::TooShort);

@@ -51,6 +51,7 @@ TEST(Msg, NumbersAreDecimal) {
     message << -12 << 0 << 2147483647;
     EXPECT_STREQ(message, "-12 0 2147483647");
     EXPECT_STREQ(Gui_Msg::Format("%d items", 3), "3 items");
+    EXPECT_STREQ(Gui_Msg::Format(nullptr, 3), "");
 }
 
 TEST(Msg, KeepsItsTextUntilItBeginsAnew) {

@@ -127,6 +127,8 @@ TEST_F(Profile, TakesTenOneForAVersionThatNobodyKnows) {
     EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\10.1");
     install("9");
     EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\9");
+    install("1.äöü"); // characters are taken, not bytes
+    EXPECT_EQ(Gui_Profile::GetKeyLocation("board", false, false, true), "Common\\1.äö");
 }
 
 TEST_F(Profile, KeepsARecordOfFirstInstances) {

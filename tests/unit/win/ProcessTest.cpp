@@ -170,6 +170,9 @@ TEST_F(ProcessFiles, FailuresOfTheStartAreTold) {
         {"\"" + path + "\"", ERROR_ACCESS_DENIED},
         {"\"" + path + "\\no-program\" x", ERROR_BAD_EXE_FORMAT},
         {"true " + std::string(200000, 'x'), ERROR_FILENAME_EXCED_RANGE},
+        {std::string(300, 'x') + " a", ERROR_FILENAME_EXCED_RANGE},
+        {"\"" + path + "/" + std::string(300, 'x') + "\"", ERROR_FILENAME_EXCED_RANGE},
+        {"C:\\" + std::string(5000, 'x'), ERROR_FILENAME_EXCED_RANGE},
         {"", ERROR_INVALID_PARAMETER},
         {" \t", ERROR_INVALID_PARAMETER},
     };

@@ -18,6 +18,7 @@
 #include <stdexcept>
 #include <string>
 #include <thread>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -444,6 +445,22 @@ TEST_F(Core, MessageBoxesBelongToWindowsThatAreSeen) {
     EXPECT_EQ(owner, nullptr);
     EXPECT_GT(width,
               QFontMetrics(QApplication::font()).horizontalAdvance("A caption that is much longer than the text"));
+}
+
+TEST_F(Core, MessageBoxesOfWindowsHaveTheCaptionOfTheApplications) {
+    const LPCSTR name = std::exchange(AfxGetApp()->m_pszAppName, "A name for display");
+    for (const bool isOfWindow : {true, false}) {
+        QString caption;
+        QTimer::singleShot(0, [&] {
+            QWidget* box = QApplication::activeModalWidget();
+            ASSERT_NE(box, nullptr);
+            caption = box->windowTitle();
+            QTest::keyClick(box, Qt::Key_Escape);
+        });
+        isOfWindow ? view.MessageBox("text") : AfxMessageBox("text");
+        EXPECT_EQ(caption, "A name for display");
+    }
+    AfxGetApp()->m_pszAppName = name;
 }
 
 TEST_F(Core, LastReportsOutliveHandlersThatFailAgain) {

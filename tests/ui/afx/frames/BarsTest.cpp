@@ -120,6 +120,7 @@ TEST_F(Bars, DockAndFloat) {
     frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_LEFT);
     settle();
     EXPECT_EQ(frame->tools.GetDockSide(), UINT{AFX_IDW_DOCKBAR_LEFT});
+    EXPECT_EQ(frame->tools.GetBarStyle() & CBRS_ALIGN_ANY, DWORD{CBRS_ALIGN_LEFT});
     EXPECT_GT(tools->height(), tools->width());
     frame->FloatControlBar(&frame->tools, CPoint(200, 200));
     settle();
