@@ -103,8 +103,8 @@ public:
 
     /// @name Whole names
     ///
-    /// A missing mount is the current drive, missing folders are the current folder, unless a default stands in for
-    /// them. A default that is not null but empty leaves its part empty.
+    /// A missing mount is the current drive, missing folders are those of the current folder, whatever drive that one
+    /// lies on, unless a default stands in for them. A default that is not null but empty leaves its part empty.
     /// @{
 
     /// Mount and path.

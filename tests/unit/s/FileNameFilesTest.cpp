@@ -52,6 +52,7 @@ TEST_F(FileNameFiles, AreCompletedWithTheCurrentDriveAndFolder) {
     EXPECT_EQ(full(""), "D:\\deep\\");
     EXPECT_EQ(full("\\f"), "D:\\f");
     EXPECT_EQ(full("E:f"), "E:\\deep\\f");
+    EXPECT_EQ(full("E:"), "E:\\deep\\");
     EXPECT_EQ(full("E:\\f"), "E:\\f");
     enter("../../work");
     EXPECT_EQ(full("f"), "D:\\f");
