@@ -1,5 +1,7 @@
 #include "platform/win/detail/RegistryConnection.h"
 
+#include <algorithm>
+
 namespace tvx::registry {
 
 namespace {
@@ -40,12 +42,10 @@ constexpr std::array<const char*, static_cast<std::size_t>(Sql::Count)> statemen
 
 /// Called by the database while another process writes; `tries` begins anew with each wait.
 int waitForOthers(void* context, int tries) {
-    auto& patience = *static_cast<std::optional<Patience>*>(context);
-    if (tries == 0 || !patience) {
-        patience.emplace();
-    }
-    return patience->wait() ? 1 : 0;
+    return static_cast<Waiting*>(context)->wait(tries == 0) ? 1 : 0;
 }
+
+constexpr const char* manner = "PRAGMA temp_store = MEMORY; PRAGMA synchronous = FULL";
 
 } // namespace
 
@@ -82,7 +82,7 @@ Connection::~Connection() {
     sqlite3_close(m_database);
 }
 
-int Connection::open(const std::string& file) {
+int Connection::open(const std::string& file, Waiting& waiting) {
     // A file that may not be written is opened for reading by the database itself.
     const int result = sqlite3_open_v2(file.c_str(), &m_database,
                                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | SQLITE_OPEN_PRIVATECACHE, nullptr);
@@ -90,10 +90,17 @@ int Connection::open(const std::string& file) {
         return result;
     }
     sqlite3_extended_result_codes(m_database, 1);
-    sqlite3_busy_handler(m_database, &waitForOthers, &m_patience);
+    sqlite3_busy_handler(m_database, &waitForOthers, &waiting);
     sqlite3_db_config(m_database, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
     sqlite3_db_config(m_database, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
-    return execute("PRAGMA synchronous = FULL; PRAGMA temp_store = MEMORY");
+    return execute(manner);
+}
+
+int Connection::openToReplace(const std::string& file, Waiting& waiting) {
+    // This looks at the file as far as it can be, and so shares its log with others.
+    (void)open(file, waiting);
+    sqlite3_db_config(m_database, SQLITE_DBCONFIG_RESET_DATABASE, 1, nullptr);
+    return execute(manner);
 }
 
 int Connection::execute(const char* sql) {
@@ -113,12 +120,16 @@ std::optional<std::int64_t> Connection::number(const char* sql) {
     return answer;
 }
 
-std::string Connection::text(const char* sql) {
+std::optional<std::string> Connection::text(const char* sql) {
     sqlite3_stmt* statement = nullptr;
-    std::string answer;
-    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) == SQLITE_OK &&
-        sqlite3_step(statement) == SQLITE_ROW) {
-        answer = reinterpret_cast<const char*>(sqlite3_column_text(statement, 0));
+    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK) {
+        return std::nullopt;
+    }
+    const int step = sqlite3_step(statement);
+    std::optional<std::string> answer;
+    if (step == SQLITE_ROW || step == SQLITE_DONE) {
+        const unsigned char* text = step == SQLITE_ROW ? sqlite3_column_text(statement, 0) : nullptr;
+        answer = text ? reinterpret_cast<const char*>(text) : "";
     }
     sqlite3_finalize(statement);
     return answer;
@@ -127,38 +138,63 @@ std::string Connection::text(const char* sql) {
 Query Connection::query(Sql sql) {
     const auto index = static_cast<std::size_t>(sql);
     sqlite3_stmt*& statement = m_statements[index];
+    int result = SQLITE_OK;
     if (!statement) {
-        sqlite3_prepare_v3(m_database, statements[index], -1, SQLITE_PREPARE_PERSISTENT, &statement, nullptr);
+        result = sqlite3_prepare_v3(m_database, statements[index], -1, SQLITE_PREPARE_PERSISTENT, &statement, nullptr);
     }
-    return Query(statement);
-}
-
-void Connection::forEachRow(const char* sql, const std::function<void(const Query& row)>& take) {
-    sqlite3_stmt* statement = nullptr;
-    if (sqlite3_prepare_v2(m_database, sql, -1, &statement, nullptr) != SQLITE_OK) {
-        return;
-    }
-    {
-        Query rows(statement);
-        while (rows.step() == SQLITE_ROW) {
-            take(rows);
-        }
-    }
-    sqlite3_finalize(statement);
+    return {statement, result};
 }
 
 int Query::step() {
-    return m_statement ? sqlite3_step(m_statement) : SQLITE_SCHEMA;
+    return m_statement ? sqlite3_step(m_statement) : m_error;
+}
+
+sqlite3_file* Connection::file() const {
+    sqlite3_file* file = nullptr;
+    const int result = sqlite3_file_control(m_database, "main", SQLITE_FCNTL_FILE_POINTER, &file);
+    return result == SQLITE_OK && file && file->pMethods ? file : nullptr;
+}
+
+std::optional<std::string> Connection::fileBytes() const {
+    constexpr sqlite3_int64 most = 1 << 30;
+    constexpr sqlite3_int64 step = 4096;
+    sqlite3_file* const opened = file();
+    sqlite3_int64 size = 0;
+    if (!opened || opened->pMethods->xFileSize(opened, &size) != SQLITE_OK || size > most) {
+        return std::nullopt;
+    }
+    std::string bytes(static_cast<std::size_t>(size), '\0');
+    for (sqlite3_int64 at = 0; at < size; at += step) {
+        const auto length = static_cast<int>(std::min(step, size - at));
+        (void)opened->pMethods->xRead(opened, bytes.data() + at, length, at);
+    }
+    return bytes;
+}
+
+Replacement::Replacement(Connection& file, Connection& fresh)
+    : m_backup(sqlite3_backup_init(file.m_database, "main", fresh.m_database, "main")) {}
+
+Replacement::~Replacement() {
+    sqlite3_backup_finish(m_backup);
+}
+
+int Replacement::begin() {
+    return m_backup ? sqlite3_backup_step(m_backup, 0) : SQLITE_NOMEM;
+}
+
+int Replacement::end() {
+    constexpr int allPages = -1;
+    const int result = sqlite3_backup_step(m_backup, allPages);
+    return result == SQLITE_DONE ? SQLITE_OK : result;
 }
 
 bool Connection::shareLog() {
     constexpr int regionSize = 32768; // the database maps its index in regions of this size (walformat.html, 2.0)
-    sqlite3_file* file = nullptr;
+    sqlite3_file* const opened = file();
     void* region = nullptr;
     const bool hasMemory =
-        sqlite3_file_control(m_database, "main", SQLITE_FCNTL_FILE_POINTER, &file) == SQLITE_OK && file &&
-        file->pMethods && file->pMethods->iVersion >= 2 && text("PRAGMA journal_mode") == "wal" &&
-        file->pMethods->xShmMap(file, 0, regionSize, 0, const_cast<void volatile**>(&region)) == SQLITE_OK;
+        opened && opened->pMethods->iVersion >= 2 && text("PRAGMA journal_mode") == "wal" &&
+        opened->pMethods->xShmMap(opened, 0, regionSize, 0, const_cast<void volatile**>(&region)) == SQLITE_OK;
     m_log = hasMemory ? static_cast<const volatile std::uint32_t*>(region) : nullptr;
     return m_log != nullptr;
 }

@@ -5,7 +5,6 @@
 
 #include <array>
 #include <cstdint>
-#include <functional>
 #include <optional>
 #include <sqlite3.h>
 #include <string>
@@ -36,10 +35,11 @@ enum class Sql {
 /// One use of a prepared statement: arguments are bound in order, and the statement is free again when this ends.
 class Query {
 public:
-    explicit Query(sqlite3_stmt* statement) : m_statement(statement) {}
+    /// @param error  why there is no statement: the file could not be looked at, or is of another version
+    Query(sqlite3_stmt* statement, int error) : m_statement(statement), m_error(error) {}
     ~Query() {
         if (!m_statement) {
-            return; // could not be prepared: a file of another version
+            return;
         }
         sqlite3_reset(m_statement);
         sqlite3_clear_bindings(m_statement);
@@ -61,6 +61,7 @@ public:
 
 private:
     sqlite3_stmt* m_statement;
+    int m_error;
     int m_bound = 0;
 };
 
@@ -73,15 +74,19 @@ public:
     Connection& operator=(const Connection&) = delete;
 
     /// Opens an existing file. Results are the database's (SQLITE_OK, ...).
-    [[nodiscard]] int open(const std::string& file);
+    /// @param waiting  of the store; must live as long as this connection
+    [[nodiscard]] int open(const std::string& file, Waiting& waiting);
+    /// Opens a file whatever is in it, to be filled by a Replacement.
+    [[nodiscard]] int openToReplace(const std::string& file, Waiting& waiting);
     [[nodiscard]] int execute(const char* sql);
     /// Asks for one number; nothing when that fails, with the reason in error().
     [[nodiscard]] std::optional<std::int64_t> number(const char* sql);
-    /// Asks for one text; empty when that fails.
-    [[nodiscard]] std::string text(const char* sql);
+    /// Asks for one text, empty when there is no answer; nothing when that fails, with the reason in error().
+    [[nodiscard]] std::optional<std::string> text(const char* sql);
     [[nodiscard]] Query query(Sql sql);
-    /// Hands out the rows of a question up to its end or the first that cannot be read.
-    void forEachRow(const char* sql, const std::function<void(const Query& row)>& take);
+    /// The bytes of the file without those of its log, zeros where the disk cannot read them. (Reading them past the
+    /// database would end its locks.) Nothing when there are too many for a file of settings.
+    [[nodiscard]] std::optional<std::string> fileBytes() const;
 
     /// Result of the last call that failed, with its details.
     [[nodiscard]] int error() const {
@@ -107,10 +112,31 @@ public:
     void keepLogOnClose();
 
 private:
+    friend class Replacement;
+    [[nodiscard]] sqlite3_file* file() const;
+
     sqlite3* m_database = nullptr;
-    std::optional<Patience> m_patience; ///< of the wait that is going on
     const volatile std::uint32_t* m_log = nullptr;
     std::array<sqlite3_stmt*, static_cast<std::size_t>(Sql::Count)> m_statements{};
+};
+
+/// Puts what one database holds in the place of what another one holds. Others see all of it at once, whether they have
+/// the file open or not. Takes everything back unless end() has succeeded.
+class Replacement {
+public:
+    /// @param file   by openToReplace()
+    /// @param fresh  what the file is to hold; may still be written between begin() and end()
+    Replacement(Connection& file, Connection& fresh);
+    ~Replacement();
+    Replacement(const Replacement&) = delete;
+    Replacement& operator=(const Replacement&) = delete;
+
+    /// From now on nobody else writes to the file.
+    [[nodiscard]] int begin();
+    [[nodiscard]] int end();
+
+private:
+    sqlite3_backup* m_backup;
 };
 
 } // namespace tvx::registry

@@ -1,20 +1,19 @@
 #include "platform/win/detail/RegistryFile.h"
 
 #include "platform/win/Error.h"
-#include "platform/win/detail/Patience.h"
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
 #include <climits>
-#include <cstdio>
 #include <cstdlib>
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <pwd.h>
 #include <string_view>
-#include <sys/file.h>
 #include <sys/stat.h>
 #include <sys/vfs.h>
 #include <unistd.h>
@@ -97,6 +96,23 @@ std::string asideName(const fs::path& file) {
         name = stem + "-" + std::to_string(i) + file.extension().string();
     }
     return name;
+}
+
+/// Makes a file that is private to the user, and waits until the disk has it.
+bool writeNew(const std::string& file, std::string_view bytes) {
+    const int descriptor = ::open(file.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0600);
+    while (descriptor >= 0 && !bytes.empty()) {
+        const ssize_t written = ::write(descriptor, bytes.data(), bytes.size());
+        if (written < 0 && errno != EINTR) {
+            break;
+        }
+        bytes.remove_prefix(static_cast<std::size_t>(std::max<ssize_t>(written, 0)));
+    }
+    const bool isKept = descriptor >= 0 && bytes.empty() && ::fsync(descriptor) == 0;
+    if (descriptor >= 0) {
+        ::close(descriptor);
+    }
+    return isKept;
 }
 
 /// Folders for copies, best first.
@@ -189,36 +205,27 @@ DWORD makeFile(const std::string& file) {
     return ERROR_SUCCESS;
 }
 
-FolderLock::FolderLock(const std::string& file)
-    : m_folder(::open(fs::path(file).parent_path().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)) {
-    for (Patience patience; m_folder >= 0 && !m_isHeld;) {
-        m_isHeld = flock(m_folder, LOCK_EX | LOCK_NB) == 0;
-        if (!m_isHeld && (errno != EWOULDBLOCK || !patience.wait())) {
-            return;
-        }
-    }
+std::string contentsOf(const std::string& file) {
+    std::ifstream stream(file, std::ios::binary);
+    return {std::istreambuf_iterator<char>(stream), {}};
 }
 
-FolderLock::~FolderLock() {
-    if (m_folder >= 0) {
-        ::close(m_folder);
-    }
-}
-
-std::optional<std::string> setAside(const std::string& file) {
+std::optional<std::string> keepAside(const std::string& file, std::string_view bytes, std::string_view log) {
     std::string aside = asideName(file);
-    if (std::rename(file.c_str(), aside.c_str()) != 0) {
-        return std::nullopt;
+    if (writeNew(aside, bytes) && (log.empty() || writeNew(aside + "-wal", log))) {
+        return aside;
     }
-    // The log belongs to the file it stood beside: with another one it would do harm.
-    if (std::rename((file + "-wal").c_str(), (aside + "-wal").c_str()) != 0) {
-        unlink((file + "-wal").c_str());
-    }
-    if (std::rename((file + "-journal").c_str(), (aside + "-journal").c_str()) != 0) {
-        unlink((file + "-journal").c_str());
-    }
-    unlink((file + "-shm").c_str());
-    return aside;
+    removeAside(aside);
+    return std::nullopt;
+}
+
+void removeAside(const std::string& aside) {
+    unlink(aside.c_str());
+    unlink((aside + "-wal").c_str());
+}
+
+void removeShared(const std::string& copy) {
+    unlink((copy + "-shm").c_str());
 }
 
 FileCopy::FileCopy(const std::string& file) {

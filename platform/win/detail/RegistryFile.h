@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <sys/types.h>
 
 namespace tvx::registry {
@@ -52,29 +53,20 @@ struct FileStamp {
 /// @return the platform's number
 [[nodiscard]] DWORD makeFile(const std::string& file);
 
-/// Held by the process that creates a file or sets one aside; the others wait. Let go by the system when the process
-/// ends.
-class FolderLock {
-public:
-    /// Waits for at most five seconds.
-    explicit FolderLock(const std::string& file);
-    ~FolderLock();
-    FolderLock(const FolderLock&) = delete;
-    FolderLock& operator=(const FolderLock&) = delete;
+/// The bytes of a file, none when there is no such file. Not for a database's file that this process has open: that
+/// would end its locks.
+[[nodiscard]] std::string contentsOf(const std::string& file);
 
-    [[nodiscard]] bool isHeld() const {
-        return m_isHeld;
-    }
-
-private:
-    int m_folder;
-    bool m_isHeld = false;
-};
-
-/// Gives a damaged file, with what the database keeps beside it, a new name in the same folder: "registry.db" becomes
-/// "registry-damaged-20260131-235959.db". To be called under the folder's lock.
+/// Keeps what a damaged file and its log held under a new name in the same folder, private to the user: that of
+/// "registry.db" as "registry-damaged-20260131-235959.db". It is on the disk when this returns.
 /// @return the new name; nothing when that was not possible
-[[nodiscard]] std::optional<std::string> setAside(const std::string& file);
+[[nodiscard]] std::optional<std::string> keepAside(const std::string& file, std::string_view bytes,
+                                                   std::string_view log);
+
+/// Takes back what keepAside() has made.
+void removeAside(const std::string& aside);
+/// Removes what the database has made beside a copy that was only looked at.
+void removeShared(const std::string& copy);
 
 /// A copy of a file and its log in a folder of its own in memory or among the temporary files, for reading what is in a
 /// place where nothing can be written. Deleted with this object.

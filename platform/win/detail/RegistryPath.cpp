@@ -4,6 +4,7 @@
 #include "platform/win/Error.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace tvx::registry {
 
@@ -12,6 +13,7 @@ namespace {
 constexpr std::size_t longestPart = 255;
 constexpr std::size_t longestValueName = 16383;
 constexpr std::size_t longestPath = 32767;
+constexpr std::ptrdiff_t mostLevels = 512;
 
 } // namespace
 
@@ -31,8 +33,18 @@ DWORD append(KeyPath& path, std::string_view subKey) {
         }
         path.spelled += part;
     }
+    if (std::ranges::count(path.spelled, '\\') >= mostLevels) {
+        return ERROR_INVALID_PARAMETER;
+    }
     path.folded = text::foldCase(path.spelled);
     return ERROR_SUCCESS;
+}
+
+std::optional<KeyPath> soundKey(std::string_view path, std::string_view name) {
+    KeyPath key;
+    const bool isOne = name.find('\\') == std::string_view::npos && append(key, parentOf(path)) == ERROR_SUCCESS &&
+                       key.folded == parentOf(path) && append(key, name) == ERROR_SUCCESS && key.folded == path;
+    return isOne && !name.empty() ? std::optional(std::move(key)) : std::nullopt;
 }
 
 bool isValueName(std::string_view name) {

@@ -2,6 +2,7 @@
 
 #include "platform/base/Types.h"
 
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -15,8 +16,13 @@ struct KeyPath {
 };
 
 /// Appends what a caller wrote behind a path. Backslashes too many are passed over.
-/// @return the platform's number: a part with more than 255 characters is `ERROR_INVALID_PARAMETER`
+/// @return the platform's number: a part with more than 255 characters, or more than 512 levels of keys, is
+///         `ERROR_INVALID_PARAMETER`
 [[nodiscard]] DWORD append(KeyPath& path, std::string_view subKey);
+
+/// A key other than the root as a file has it: its path without case, and its name.
+/// @return nothing when it cannot be one: the name is not that of the path, or nobody could have made the key
+[[nodiscard]] std::optional<KeyPath> soundKey(std::string_view path, std::string_view name);
 
 /// Whether a value may have this name: up to 16,383 characters.
 [[nodiscard]] bool isValueName(std::string_view name);

@@ -1,73 +1,88 @@
-#include "platform/win/detail/RegistryConnection.h"
-#include "platform/win/detail/RegistryStore.h"
+#include "platform/win/detail/RegistrySalvage.h"
 
-#include <map>
-#include <utility>
+#include "platform/base/Text.h"
+#include "platform/win/detail/RegistryImage.h"
+
+#include <optional>
 
 namespace tvx::registry {
 
 namespace {
 
-/// What can be read of a damaged file.
-struct Salvage {
-    struct Key {
-        std::string path;
-        std::string name;
-    };
+template <typename Type>
+const Type* as(const Image::Row& row, std::size_t column) {
+    return std::get_if<Type>(&row.columns[column]);
+}
 
-    std::map<std::int64_t, Key> keys;
-    std::map<std::pair<std::int64_t, std::string>, Value> values; ///< by key and name without case
-};
+/// A key from its row: a number that stands for none, its parent's, path and name.
+std::optional<KeyPath> keyOf(const Image::Row& row) {
+    if (!row.isOfTable || row.columns.size() != 4) {
+        return std::nullopt;
+    }
+    const auto* const path = as<std::string>(row, 2);
+    const auto* const name = as<std::string>(row, 3);
+    return path && name ? soundKey(*path, *name) : std::nullopt;
+}
 
-/// Reads from both ends, each time up to the first damaged page.
-Salvage read(const std::string& file) {
+/// A key from the index of paths, which has it without case: path and number.
+std::optional<std::pair<std::int64_t, KeyPath>> indexedKeyOf(const Image::Row& row) {
+    if (row.isOfTable || row.columns.size() != 2) {
+        return std::nullopt;
+    }
+    const auto* const path = as<std::string>(row, 0);
+    const auto* const number = as<std::int64_t>(row, 1);
+    auto key = path && number ? soundKey(*path, lastPart(*path)) : std::nullopt;
+    return key ? std::optional(std::pair(*number, std::move(*key))) : std::nullopt;
+}
+
+void takeValue(const Image::Row& row, Salvage& result) {
+    if (row.isOfTable || row.columns.size() != 5) {
+        return;
+    }
+    const auto* const key = as<std::int64_t>(row, 0);
+    const auto* const folded = as<std::string>(row, 1);
+    const auto* const name = as<std::string>(row, 2);
+    const auto* const type = as<std::int64_t>(row, 3);
+    const auto* const data = as<Image::Bytes>(row, 4);
+    if (key && folded && name && type && data && isValueName(*name) && text::foldCase(*name) == *folded) {
+        result.values.try_emplace({*key, *folded}, Value{*name, static_cast<DWORD>(*type), data->data});
+    }
+}
+
+Salvage read(std::string_view file, std::string_view log, std::uint32_t pageSize) {
+    // Where the tables and the index of paths begin: they are made in this order.
+    constexpr Image::Number keys = 2;
+    constexpr Image::Number paths = 3;
+    constexpr Image::Number values = 5;
     Salvage result;
-    Connection damaged;
-    if (damaged.open(file) != SQLITE_OK) {
-        return result;
-    }
-    damaged.keepLogOnClose();
-    for (const char* sql :
-         {"SELECT id, path, name FROM key ORDER BY id", "SELECT id, path, name FROM key ORDER BY id DESC"}) {
-        damaged.forEachRow(sql, [&](const Query& row) {
-            result.keys.try_emplace(row.number(0), Salvage::Key{std::string(row.bytes(1)), std::string(row.bytes(2))});
-        });
-    }
-    for (const char* sql : {"SELECT key, folded, name, type, data FROM value ORDER BY key, folded",
-                            "SELECT key, folded, name, type, data FROM value ORDER BY key DESC, folded DESC"}) {
-        damaged.forEachRow(sql, [&](const Query& row) {
-            result.values.try_emplace(
-                {row.number(0), std::string(row.bytes(1))},
-                Value{std::string(row.bytes(2)), static_cast<DWORD>(row.number(3)), std::string(row.bytes(4))});
-        });
-    }
+    result.keys.try_emplace(1); // the root
+    std::map<std::int64_t, KeyPath> indexed;
+    Image(file, log, pageSize).forEachRow({keys, paths, values}, [&](const Image::Row& row) {
+        if (auto key = keyOf(row)) {
+            result.keys.try_emplace(row.number, std::move(*key));
+        } else if (auto found = indexedKeyOf(row)) {
+            indexed.insert(std::move(*found));
+        } else {
+            takeValue(row, result);
+        }
+    });
+    result.keys.merge(indexed);
     return result;
 }
 
 } // namespace
 
-std::size_t Store::takeOver(const std::string& damaged) {
-    const Salvage salvage = read(damaged);
-    if (salvage.values.empty() || ensureOpen(Intent::Write) != ERROR_SUCCESS || m_mode != Mode::Shared) {
-        return 0;
+Salvage salvage(std::string_view file, std::string_view log) {
+    constexpr std::uint32_t usual = 4096;
+    Salvage result = read(file, log, usual);
+    // The head may be what is damaged.
+    if (const auto named = Image::pageSizeOf(file); named && *named != usual) {
+        Salvage other = read(file, log, *named);
+        if (other.values.size() > result.values.size()) {
+            return other;
+        }
     }
-    std::size_t saved = 0;
-    const DWORD result = together([&] {
-        for (const auto& [id, key] : salvage.keys) {
-            // Keys above one are older, and have been added with their spelling.
-            (void)m_connection->query(Sql::AddKey).bind(parentOf(key.path)).bind(key.path).bind(key.name).step();
-            (void)addLevels({key.path, key.path});
-        }
-        for (const auto& [id, value] : salvage.values) {
-            const auto key = salvage.keys.find(id.first);
-            if (key == salvage.keys.end() || askValue(key->second.path, id.second).result != ERROR_FILE_NOT_FOUND) {
-                continue; // nobody knows whose it is, or somebody has written a newer one
-            }
-            saved += insertValue(key->second.path, id.second, value) == ERROR_SUCCESS ? 1 : 0;
-        }
-        return ERROR_SUCCESS;
-    });
-    return result == ERROR_SUCCESS ? saved : 0;
+    return result;
 }
 
 } // namespace tvx::registry

@@ -47,6 +47,9 @@ DWORD Store::run(Intent intent, Operation operation) {
 template <typename Operation>
 DWORD Store::change(Operation operation) {
     const DWORD result = run(Intent::Write, [&] { return m_mode == Mode::Shared ? operation() : m_writeError; });
+    if (result == ERROR_SUCCESS) {
+        m_waiting.end();
+    }
     if (result == ERROR_DISK_FULL || result == ERROR_BUSY || result == ERROR_REGISTRY_IO_FAILED) {
         tell(Fault::NotSaved, "Settings could not be saved in " + m_file + ". " + errorText(result));
     }

@@ -2,14 +2,17 @@
 
 #include "platform/base/Export.h"
 #include "platform/win/Error.h"
+#include "platform/win/detail/Patience.h"
 #include "platform/win/detail/RegistryFile.h"
 #include "platform/win/detail/RegistryPath.h"
+#include "platform/win/detail/RegistryValue.h"
 
 #include <atomic>
 #include <cstdint>
 #include <functional>
 #include <memory>
 #include <mutex>
+#include <optional>
 #include <set>
 #include <string>
 #include <thread>
@@ -20,12 +23,7 @@
 namespace tvx::registry {
 
 class Connection;
-
-struct Value {
-    std::string name; ///< as it was first written
-    DWORD type = 0;
-    std::string data;
-};
+struct Salvage;
 
 /// Where an enumeration stands, so that the next name is found without counting from the beginning.
 struct Cursor {
@@ -85,6 +83,10 @@ public:
     enum class Log { Merge, Keep };
     /// Closes the file; the next operation opens it again. Does nothing within a transaction.
     void close(Log log = Log::Merge);
+    /// Looks at the contents again when the file is opened next, as another process would.
+    void forgetChecks() {
+        m_checked = {};
+    }
     /// Leaves an open transaction to the process that this one is a fork of.
     void leaveToParent();
 
@@ -126,14 +128,26 @@ private:
     DWORD openFile(Intent intent);
     DWORD connect(const std::string& file);
     DWORD checkSchema();
+    /// What a file says of itself; nothing when it cannot be asked.
+    struct Head {
+        std::int64_t id = 0;
+        std::int64_t version = 0;
+        std::int64_t tables = 0;
+
+        [[nodiscard]] bool isNew() const {
+            return id == 0 && tables == 0;
+        }
+    };
+    [[nodiscard]] std::optional<Head> head();
+    DWORD checkContents(std::int64_t version);
     [[nodiscard]] bool isOfNewerVersion(std::int64_t version);
     DWORD initialise();
     DWORD openCopy(DWORD reason);
     DWORD createFile();
     DWORD replaceDamaged();
-    std::size_t takeOver(const std::string& damaged);
+    DWORD beginAnew();
+    DWORD takeOver(const Salvage& found, std::size_t& saved);
     void chooseJournal();
-    [[nodiscard]] bool isEmptyDatabase();
     [[nodiscard]] bool isCurrent() const;
 
     /// The platform's number for a result of the database.
@@ -144,12 +158,14 @@ private:
     std::string m_name; ///< where the file is expected
     std::string m_file; ///< where links lead from there
     FileIdentity m_identity;
+    FileIdentity m_checked; ///< the file whose contents have been looked at
     FileStamp m_stamp;
     FileStamp m_logStamp;
     Mode m_mode = Mode::Closed;
     DWORD m_writeError = ERROR_ACCESS_DENIED; ///< what a write is answered where none is possible
     bool m_inTransaction = false;
     bool m_isLost = false; ///< the process is the child of one that forked within a transaction
+    Waiting m_waiting;
     std::unique_ptr<Connection> m_connection;
     std::unique_ptr<FileCopy> m_copy;
     std::unique_ptr<Memory> m_memory;

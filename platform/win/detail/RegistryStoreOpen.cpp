@@ -1,5 +1,6 @@
 #include "platform/win/detail/RegistryConnection.h"
 #include "platform/win/detail/RegistryMemory.h"
+#include "platform/win/detail/RegistrySchema.h"
 #include "platform/win/detail/RegistryStore.h"
 
 #include <cstdlib>
@@ -8,20 +9,6 @@
 namespace tvx::registry {
 
 namespace {
-
-constexpr std::int64_t applicationId = 0x54565852; // "TVXR", as file(1) sees it
-constexpr std::int64_t schemaVersion = 1;
-constexpr const char* schema = "BEGIN IMMEDIATE;"
-                               "CREATE TABLE key (id INTEGER PRIMARY KEY, parent INTEGER NOT NULL,"
-                               " path TEXT NOT NULL UNIQUE, name TEXT NOT NULL);"
-                               "CREATE INDEX key_parent ON key (parent, path);"
-                               "CREATE TABLE value (key INTEGER NOT NULL, folded TEXT NOT NULL, name TEXT NOT NULL,"
-                               " type INTEGER NOT NULL, data BLOB NOT NULL, PRIMARY KEY (key, folded)) WITHOUT ROWID;"
-                               "INSERT INTO key VALUES (1, 0, '', '');"
-                               "PRAGMA application_id = 1414944850;"
-                               "PRAGMA user_version = 1;"
-                               "COMMIT";
-static_assert(applicationId == 1414944850 && schemaVersion == 1);
 
 struct Stores {
     Store user{Hive::User};
@@ -76,6 +63,7 @@ void closeStores() {
     for (Store* store : {&stores().user, &stores().machine}) {
         const std::lock_guard lock(store->mutex);
         store->close();
+        store->forgetChecks();
     }
 }
 
@@ -93,13 +81,8 @@ void Store::close(Log log) {
 }
 
 void Store::closeConnection(Log log) {
-    // Merging deletes the log by its name. Where another file has taken the place, or takes it right now, that would be
-    // the other file's.
-    std::optional<FolderLock> lock;
-    if (log == Log::Merge && m_mode == Mode::Shared) {
-        lock.emplace(m_file);
-    }
-    if (!lock || !lock->isHeld() || !isCurrent()) {
+    // Merging deletes the log by its name. Where another file has taken the place, that would be the other file's.
+    if (log == Log::Keep || m_mode != Mode::Shared || !isCurrent()) {
         m_connection->keepLogOnClose();
     }
     m_connection.reset();
@@ -160,7 +143,6 @@ DWORD Store::createFile() {
     // its place at the moment.
     DWORD result = m_file == m_name ? makeFolderOf(m_file) : ERROR_SUCCESS;
     if (result == ERROR_SUCCESS) {
-        const FolderLock lock(m_file); // not while a damaged one and its log are being set aside
         result = makeFile(m_file);
     }
     if (result != ERROR_SUCCESS) {
@@ -177,7 +159,7 @@ DWORD Store::openFile(Intent intent) {
     }
     close(Log::Keep);
     if (m_identity == FileIdentity{} || m_identity != identityOf(m_name)) {
-        return open(intent); // somebody has set it aside just now
+        return open(intent); // somebody has taken it away just now
     }
     const bool isPlaceBad =
         result == ERROR_ACCESS_DENIED || result == ERROR_DISK_FULL || result == ERROR_REGISTRY_IO_FAILED;
@@ -187,7 +169,7 @@ DWORD Store::openFile(Intent intent) {
 DWORD Store::connect(const std::string& file) {
     m_identity = identityOf(m_name); // first: should another file come in between, it is noticed by the next call
     m_connection = std::make_unique<Connection>();
-    DWORD result = failed(m_connection->open(file));
+    DWORD result = failed(m_connection->open(file, m_waiting));
     if (result == ERROR_SUCCESS) {
         result = checkSchema();
     }
@@ -200,37 +182,42 @@ DWORD Store::connect(const std::string& file) {
     return ERROR_SUCCESS;
 }
 
-DWORD Store::checkSchema() {
+std::optional<Store::Head> Store::head() {
     const auto id = m_connection->number("PRAGMA application_id");
     const auto version = id ? m_connection->number("PRAGMA user_version") : std::nullopt;
-    if (!version) {
-        return failed(m_connection->error());
+    const auto tables = version ? m_connection->number("SELECT count(*) FROM sqlite_schema") : std::nullopt;
+    return tables ? std::optional(Head{*id, *version, *tables}) : std::nullopt;
+}
+
+DWORD Store::checkSchema() {
+    // All from one moment: another process may be making the store right now.
+    (void)m_connection->execute("BEGIN");
+    const std::optional<Head> found = head();
+    const DWORD result = found ? ERROR_SUCCESS : failed(m_connection->error());
+    (void)m_connection->execute("COMMIT");
+    if (!found) {
+        return result;
     }
-    const bool isNew = *id == 0 && isEmptyDatabase();
-    if (*id != applicationId && !isNew) {
+    if (found->id != schema::applicationId && !found->isNew()) {
         tell(Fault::Unusable, "The settings cannot be used: " + m_file + " belongs to another program.");
         return ERROR_BAD_FORMAT;
     }
-    const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::Machine || isOfNewerVersion(*version);
+    const bool isForReading = m_connection->isReadOnly() || m_hive == Hive::Machine || isOfNewerVersion(found->version);
     m_mode = m_copy ? Mode::Copy : isForReading ? Mode::ReadOnly : Mode::Shared;
     if (m_mode == Mode::Shared) {
         chooseJournal();
     }
-    return isNew ? initialise() : ERROR_SUCCESS;
+    return found->isNew() ? initialise() : checkContents(found->version);
 }
 
 bool Store::isOfNewerVersion(std::int64_t version) {
-    if (version <= schemaVersion) {
+    if (version <= schema::version) {
         return false;
     }
     tell(Fault::Newer, "The settings in " + m_file +
                            " were written by a newer version of this software. They are read as far as possible and "
                            "not changed.");
     return true;
-}
-
-bool Store::isEmptyDatabase() {
-    return m_connection->number("SELECT count(*) FROM sqlite_schema") == 0;
 }
 
 void Store::chooseJournal() {
@@ -246,18 +233,13 @@ DWORD Store::initialise() {
     if (m_mode != Mode::Shared) {
         return ERROR_FILE_NOT_FOUND;
     }
-    const FolderLock lock(m_file);
-    if (!lock.isHeld()) {
-        return ERROR_BUSY;
-    }
-    if (!isEmptyDatabase()) {
-        return ERROR_SUCCESS; // another process was faster
-    }
-    const int result = m_connection->execute(schema);
-    if (result != SQLITE_OK) {
-        (void)m_connection->execute("ROLLBACK");
-    }
-    return failed(result);
+    return together([&]() -> DWORD {
+        const std::optional<Head> found = head();
+        if (!found || !found->isNew()) {
+            return found ? ERROR_SUCCESS : failed(m_connection->error()); // another process was faster
+        }
+        return failed(m_connection->execute(schema::make));
+    });
 }
 
 DWORD Store::openCopy(DWORD reason) {
@@ -274,29 +256,6 @@ DWORD Store::openCopy(DWORD reason) {
     close();
     tell(Fault::Unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
     return reason;
-}
-
-DWORD Store::replaceDamaged() {
-    const FileIdentity damaged = m_identity;
-    const bool isOurs = m_hive == Hive::User && !m_copy;
-    close(Log::Keep);
-    std::optional<std::string> aside;
-    if (isOurs) {
-        const FolderLock lock(m_file);
-        if (lock.isHeld() && identityOf(m_name) != damaged) {
-            return ERROR_SUCCESS; // another process has set it aside already
-        }
-        aside = lock.isHeld() ? setAside(m_file) : std::nullopt;
-    }
-    if (!aside) {
-        tell(Fault::Unusable, "The settings cannot be used: " + m_file + " is damaged.");
-        return ERROR_ACCESS_DENIED;
-    }
-    const std::size_t saved = takeOver(*aside);
-    m_notices.push_back("The file of your settings, " + m_file + ", is damaged. It was kept as " + *aside + ". " +
-                        (saved == 0 ? std::string("No setting in it could be read.")
-                                    : std::to_string(saved) + " settings in it could be read and were kept."));
-    return ERROR_SUCCESS;
 }
 
 } // namespace tvx::registry

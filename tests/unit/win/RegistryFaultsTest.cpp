@@ -6,6 +6,7 @@
 #include "RegistrySandbox.h"
 
 #include <algorithm>
+#include <array>
 #include <fstream>
 #include <iterator>
 #include <memory>
@@ -130,28 +131,142 @@ TEST_F(RegistryFaults, DamageInsideIsFoundWhenItIsMet) {
     EXPECT_EQ(key.write("a", "1"), 0);
 }
 
-TEST_F(RegistryFaults, OneOfSeveralProcessesSetsADamagedFileAside) {
-    put(std::string(5000, 'x'));
+/// What may happen to the file of 400 settings, and how many of them must come through it.
+struct Damage {
+    const char* what;
+    void (*apply)(std::string& bytes);
+    int saved;
+};
+constexpr std::size_t pageSize = 4096;
+const Damage damages[] = {
+    {"its head is lost", [](std::string& bytes) { bytes.replace(0, 100, 100, 'x'); }, 400},
+    {"its head names another size of pages", [](std::string& bytes) { bytes.replace(16, 2, std::string("\2\0", 2)); },
+     400},
+    {"its first page is lost", [](std::string& bytes) { bytes.replace(0, pageSize, pageSize, '\xA5'); }, 400},
+    {"the page of the keys is lost", [](std::string& bytes) { bytes.replace(pageSize, pageSize, pageSize, 'k'); }, 400},
+    {"a tenth is cut off", [](std::string& bytes) { bytes.resize(bytes.size() * 9 / 10); }, 300},
+    {"half of it is cut off", [](std::string& bytes) { bytes.resize(bytes.size() / 2); }, 100},
+    {"a page says that it holds nothing", [](std::string& bytes) { bytes.replace(10 * pageSize + 3, 2, 2, '\0'); },
+     350},
+    {"the root of the values is lost", [](std::string& bytes) { bytes.replace(4 * pageSize, 8, 8, '\xFF'); }, 380},
+    {"all of it is lost", [](std::string& bytes) { bytes.assign(5000, 'x'); }, 0},
+};
+
+/// Six processes that start at once find the damage; each writes two settings.
+void writeByManyAtOnce(const std::string& path, int& told) {
     std::vector<std::unique_ptr<ChildProcess>> children;
-    for (int i = 0; i < 4; ++i) {
-        children.push_back(std::make_unique<ChildProcess>([i](ChildProcess& parent) {
+    for (int i = 0; i < 6; ++i) {
+        children.push_back(std::make_unique<ChildProcess>([&, i](ChildProcess& parent) {
+            static int notices;
+            notices = 0;
+            tvx::setRegistryNotice([](const std::string&) { ++notices; });
             (void)parent.receive();
-            const LSTATUS result = TestKey(path).write(std::to_string(i).c_str(), "1");
-            parent.send(result != 0 ? 100 : static_cast<int>(notices.size()));
+            const TestKey key(path);
+            const bool isWritten = key.write(("first" + std::to_string(i)).c_str(), "1") == 0 &&
+                                   key.write(("second" + std::to_string(i)).c_str(), "2") == 0;
+            tvx::registry::closeStores();
+            parent.send(isWritten ? notices : 100);
         }));
     }
     for (const auto& child : children) {
         child->send(0);
     }
-    int told = 0;
     for (const auto& child : children) {
         told += child->receive();
     }
-    EXPECT_EQ(told, 1);
-    EXPECT_EQ(setAside().size(), 1u);
-    for (int i = 0; i < 4; ++i) {
-        EXPECT_EQ(TestKey(path).read(std::to_string(i).c_str()), "1");
+}
+
+TEST_F(RegistryFaults, OneOfSeveralProcessesMendsADamagedFile) {
+    {
+        const TestKey key(path);
+        tvx::RegistryTransaction transaction;
+        ASSERT_EQ(transaction.begin(), 0);
+        for (int i = 0; i < 400; ++i) {
+            key.write(("Name" + std::to_string(i)).c_str(), std::string(i == 7 ? 20000 : 200, 'v'));
+        }
+        ASSERT_EQ(transaction.commit(), 0);
     }
+    tvx::registry::closeStores();
+    const std::string whole = contents(m_sandbox.file);
+    for (const Damage& damage : damages) {
+        SCOPED_TRACE(damage.what);
+        std::string damaged = whole;
+        damage.apply(damaged);
+        put(damaged);
+        int told = 0;
+        writeByManyAtOnce(path, told);
+        EXPECT_EQ(told, 1);
+        ASSERT_EQ(setAside().size(), 1u);
+        EXPECT_TRUE(contents(setAside().front()) == damaged) << "kept byte for byte";
+        fs::remove(setAside().front());
+        int saved = 0;
+        const TestKey key(path);
+        for (int i = 0; i < 400; ++i) {
+            const std::string value = key.read(("Name" + std::to_string(i)).c_str());
+            saved += value == std::string(i == 7 ? 20000 : 200, 'v') ? 1 : 0;
+        }
+        EXPECT_GE(saved, damage.saved);
+        for (int i = 0; i < 6; ++i) {
+            EXPECT_EQ(key.read(("first" + std::to_string(i)).c_str()), "1");
+            EXPECT_EQ(key.read(("second" + std::to_string(i)).c_str()), "2");
+        }
+    }
+}
+
+TEST_F(RegistryFaults, WhatAKilledWriterLeftInTheLogIsTakenOverFromADamagedFile) {
+    ChildProcess writer([](ChildProcess& parent) {
+        const TestKey key(path);
+        key.write("a", "old");
+        tvx::registry::closeStores();
+        key.write("a", "new");
+        parent.send(0);
+        (void)parent.receive();
+    });
+    ASSERT_EQ(writer.receive(), 0);
+    writer.kill();
+    std::fstream(m_sandbox.file, std::ios::binary | std::ios::in | std::ios::out) << std::string(100, 'x');
+    EXPECT_EQ(TestKey(path).read("a"), "new");
+    EXPECT_EQ(TestKey(path).write("b", "1"), 0);
+    EXPECT_EQ(notices.size(), 1u);
+}
+
+TEST_F(RegistryFaults, HostileContentsAreNotUsed) {
+    static constexpr const char* endless =
+        "WITH RECURSIVE endless (id, parent, path, name) AS (SELECT 1, 0, '', '' UNION ALL SELECT id, 1, 'software', "
+        "'Software' FROM endless) SELECT * FROM endless";
+    const std::string hostile[] = {
+        "UPDATE key SET parent = 1 WHERE id = 1",
+        "UPDATE key SET parent = id WHERE name = 'Tarvex'",
+        "UPDATE key SET name = '' WHERE name = 'Tarvex'",
+        std::string("ALTER TABLE key RENAME TO old; CREATE VIEW key AS ") + endless,
+        "CREATE TRIGGER trap AFTER INSERT ON value BEGIN DELETE FROM value; END",
+        "PRAGMA writable_schema = ON; UPDATE sqlite_schema SET sql = replace(sql, 'name TEXT', 'name BLOB')",
+    };
+    for (const std::string& sql : hostile) {
+        SCOPED_TRACE(sql);
+        TestKey(path).write("a", "1");
+        run(m_sandbox.file, sql.c_str());
+        notices.clear();
+        RegistrySandbox::use(m_sandbox.file);
+        HKEY software = nullptr;
+        ASSERT_EQ(RegOpenKeyExA(HKEY_CURRENT_USER, "Software", 0, KEY_READ, &software), 0);
+        std::array<char, 20> name{};
+        DWORD size = name.size();
+        EXPECT_EQ(RegEnumKeyExA(software, 1, name.data(), &size, nullptr, nullptr, nullptr, nullptr),
+                  LSTATUS{ERROR_NO_MORE_ITEMS});
+        RegCloseKey(software);
+        EXPECT_EQ(notices.size(), 1u);
+        EXPECT_EQ(TestKey(path).write("b", "2"), 0);
+        EXPECT_EQ(TestKey(path).read("b"), "2");
+    }
+    EXPECT_EQ(setAside().size(), std::size(hostile));
+    // A file that says of itself that it is one, in another encoding of texts.
+    tvx::registry::closeStores();
+    fs::remove(m_sandbox.file);
+    run(m_sandbox.file, "PRAGMA encoding = 'UTF-16'; CREATE TABLE key (id); PRAGMA application_id = 1414944850;"
+                        "PRAGMA user_version = 1");
+    EXPECT_EQ(TestKey(path).write("b", "2"), 0);
+    EXPECT_EQ(TestKey(path).read("b"), "2");
 }
 
 TEST_F(RegistryFaults, LinkStaysALink) {
