@@ -152,7 +152,7 @@ const Damage damages[] = {
     {"all of it is lost", [](std::string& bytes) { bytes.assign(5000, 'x'); }, 0},
 };
 
-/// Six processes that start at once find the damage; each writes two settings.
+/// Six processes that start at once; each writes two settings.
 void writeByManyAtOnce(const std::string& path, int& told) {
     std::vector<std::unique_ptr<ChildProcess>> children;
     for (int i = 0; i < 6; ++i) {
@@ -210,6 +210,21 @@ TEST_F(RegistryFaults, OneOfSeveralProcessesMendsADamagedFile) {
             EXPECT_EQ(key.read(("first" + std::to_string(i)).c_str()), "1");
             EXPECT_EQ(key.read(("second" + std::to_string(i)).c_str()), "2");
         }
+    }
+}
+
+TEST_F(RegistryFaults, SeveralProcessesBeginTheFirstFileTogether) {
+    for (int round = 0; round < 5; ++round) {
+        int told = 0;
+        writeByManyAtOnce(path, told);
+        EXPECT_EQ(told, 0) << "nothing refused, nobody else's file";
+        const TestKey key(path);
+        for (int i = 0; i < 6; ++i) {
+            EXPECT_EQ(key.read(("first" + std::to_string(i)).c_str()), "1");
+            EXPECT_EQ(key.read(("second" + std::to_string(i)).c_str()), "2");
+        }
+        tvx::registry::closeStores();
+        fs::remove_all(m_sandbox.file.parent_path());
     }
 }
 
