@@ -84,9 +84,7 @@ LSTATUS withStore(Hive hive, Operation operation) {
         result = operation(store);
         notices = store.takeNotices();
     }
-    if (!notices.empty()) {
-        deliver(notices);
-    }
+    deliver(notices);
     return static_cast<LSTATUS>(result);
 }
 
@@ -271,15 +269,26 @@ LSTATUS RegEnumValueA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWO
 
 namespace tvx {
 
+namespace {
+
+/// Lets the store go after a transaction, and then tells the user what there is to tell.
+void release(Store& store) {
+    const std::vector<std::string> notices = store.takeNotices();
+    store.mutex.unlock();
+    deliver(notices);
+}
+
+} // namespace
+
 LSTATUS RegistryTransaction::begin() {
     Store& store = Store::of(Hive::User);
     store.mutex.lock();
-    const LSTATUS result = withStore(Hive::User, [](Store& user) { return user.begin(); });
+    const DWORD result = store.begin();
     m_isOpen = result == ERROR_SUCCESS;
     if (!m_isOpen) {
-        store.mutex.unlock();
+        release(store);
     }
-    return result;
+    return static_cast<LSTATUS>(result);
 }
 
 LSTATUS RegistryTransaction::commit() {
@@ -287,9 +296,10 @@ LSTATUS RegistryTransaction::commit() {
         return ERROR_INVALID_FUNCTION;
     }
     m_isOpen = false;
-    const LSTATUS result = withStore(Hive::User, [](Store& user) { return user.commit(); });
-    Store::of(Hive::User).mutex.unlock();
-    return result;
+    Store& store = Store::of(Hive::User);
+    const DWORD result = store.commit();
+    release(store);
+    return static_cast<LSTATUS>(result);
 }
 
 RegistryTransaction::~RegistryTransaction() {
@@ -298,7 +308,7 @@ RegistryTransaction::~RegistryTransaction() {
     }
     Store& store = Store::of(Hive::User);
     store.rollback();
-    store.mutex.unlock();
+    release(store);
 }
 
 } // namespace tvx

@@ -2,6 +2,7 @@
 
 #include "OutputWindow.h"
 #include "Resource.h"
+#include "platform/win/Registry.h"
 #include "s/Profile.h"
 #include "s/QueryDlg.h"
 
@@ -59,12 +60,22 @@ void CMainFrame::ActivateFrame(int command) {
     CMDIFrameWnd::ActivateFrame(command);
 }
 
-void CMainFrame::OnClose() {
+void CMainFrame::saveWindows() {
+    // Together: where another program holds the settings, this is waited for once.
+    tvx::RegistryTransaction together;
+    if (together.begin() != ERROR_SUCCESS) {
+        return;
+    }
     WINDOWPLACEMENT placement;
     if (GetWindowPlacement(&placement)) {
         Gui_Profile::WriteWindowPlacement(placement, nullptr, nullptr);
     }
     Gui_Profile::WriteBarState(this, nullptr);
+    (void)together.commit();
+}
+
+void CMainFrame::OnClose() {
+    saveWindows();
     CMDIFrameWnd::OnClose();
 }
 

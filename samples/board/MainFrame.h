@@ -17,6 +17,8 @@ public:
     afx_msg void OnRunCommand();
 
 private:
+    void saveWindows();
+
     bool m_placed = false;
     CToolBar m_toolBar;
     CStatusBar m_statusBar;

@@ -10,8 +10,8 @@
 #include <cstring>
 #include <fstream>
 #include <iostream>
-#include <iterator>
 #include <optional>
+#include <sstream>
 
 namespace settings {
 
@@ -238,19 +238,24 @@ void exportText(std::vector<std::string> given, Streams& streams) {
     }
 }
 
+/// What is in a stream. Where that cannot be read, as where a folder has been named, an iterator over it would throw.
+std::string readAll(std::istream& in, const std::string& place) {
+    std::ostringstream text;
+    if (in && in.peek() != std::istream::traits_type::eof()) {
+        text << in.rdbuf();
+    }
+    if (!in && !in.eof()) {
+        throw FileFault{place + ": " + std::strerror(errno)};
+    }
+    return text.str();
+}
+
 std::string readFile(const std::string& file, std::istream& in) {
     if (file == "-") {
-        return {std::istreambuf_iterator<char>(in), {}};
+        return readAll(in, "standard input");
     }
     std::ifstream stream(file, std::ios::binary);
-    std::string text;
-    if (stream) {
-        text.assign(std::istreambuf_iterator<char>(stream), {});
-    }
-    if (!stream || stream.bad()) {
-        throw FileFault{file + ": " + std::strerror(errno)};
-    }
-    return text;
+    return readAll(stream, file);
 }
 
 void importText(std::vector<std::string> given, Streams& streams) {

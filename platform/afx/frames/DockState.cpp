@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/App.h"
 #include "platform/win/FrameworkIds.h"
+#include "platform/win/Registry.h"
 
 #include <charconv>
 #include <memory>
@@ -101,6 +102,12 @@ void CDockState::LoadState(LPCSTR profileName) {
 }
 
 void CDockState::SaveState(LPCSTR profileName) const {
+    // Many values: a busy store is waited for once, and a bar is never half kept.
+    tvx::RegistryTransaction together;
+    const LSTATUS begun = together.begin();
+    if (begun != ERROR_SUCCESS && begun != ERROR_INVALID_FUNCTION) { // the second: the caller has begun one
+        return;
+    }
     int count = 0;
     for (INT_PTR i = 0; i < m_arrBarInfo.GetSize(); ++i) {
         if (const auto* info = static_cast<const CControlBarInfo*>(m_arrBarInfo[i])) {
@@ -108,4 +115,5 @@ void CDockState::SaveState(LPCSTR profileName) const {
         }
     }
     writeNumber(summarySection(profileName), "Bars", count);
+    (void)together.commit();
 }

@@ -11,12 +11,14 @@
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
 #include <pwd.h>
+#include <sstream>
 #include <string_view>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <sys/vfs.h>
 #include <unistd.h>
+#include <vector>
 
 namespace tvx::registry {
 
@@ -42,7 +44,9 @@ std::string home() {
 
 std::string userFile() {
     if (const std::string_view named = environment("TVX_REGISTRY"); !named.empty()) {
-        return fs::absolute(named).string();
+        std::error_code error; // the current folder may be gone
+        const fs::path file = fs::absolute(named, error);
+        return error ? std::string() : file.string();
     }
     // Relative names in these variables are to be ignored.
     if (const std::string_view folder = environment("XDG_CONFIG_HOME"); folder.starts_with('/')) {
@@ -120,12 +124,38 @@ std::array<std::string, 4> copyPlaces() {
     return {std::string(environment("XDG_RUNTIME_DIR")), "/dev/shm", std::string(environment("TMPDIR")), "/tmp"};
 }
 
-std::string makeCopyFolder(const std::string& place) {
-    if (!place.starts_with('/')) {
-        return {};
+constexpr const char* copyFolderName = "tvx-settings-";
+
+/// Opens a folder of copies and locks it, which says that a process uses it: the lock goes with the process.
+/// @return the descriptor, -1 when it is none of the user's or in use
+int lockCopyFolder(const fs::path& folder) {
+    const int descriptor = ::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC);
+    struct stat status{};
+    if (descriptor >= 0 && fstat(descriptor, &status) == 0 && status.st_uid == geteuid() &&
+        flock(descriptor, LOCK_EX | LOCK_NB) == 0 && identityOf(folder) == FileIdentity{status.st_dev, status.st_ino}) {
+        return descriptor;
     }
-    std::string folder = place + "/tvx-settings-XXXXXX";
-    return mkdtemp(folder.data()) ? folder : std::string();
+    if (descriptor >= 0) {
+        ::close(descriptor);
+    }
+    return -1;
+}
+
+/// Removes the copies that processes have left which were ended from outside.
+void clearCopies(const std::string& place) {
+    std::error_code error;
+    std::vector<fs::path> folders;
+    for (fs::directory_iterator entry(place, error), end; !error && entry != end; entry.increment(error)) {
+        if (entry->path().filename().string().starts_with(copyFolderName)) {
+            folders.push_back(entry->path());
+        }
+    }
+    for (const fs::path& folder : folders) {
+        if (const int descriptor = lockCopyFolder(folder); descriptor >= 0) {
+            fs::remove_all(folder, error);
+            ::close(descriptor);
+        }
+    }
 }
 
 } // namespace
@@ -139,7 +169,8 @@ std::string resolve(const std::string& name) {
     std::error_code error;
     for (int i = 0; i < longestLinkChain && fs::is_symlink(path, error); ++i) {
         const fs::path target = fs::read_symlink(path, error);
-        path = (path.parent_path() / target).lexically_normal(); // an absolute target stands alone
+        const fs::path folder = fs::canonical(path.parent_path(), error); // what stands above ".." is not its link
+        path = (error ? path.parent_path() : folder) / target;            // an absolute target stands alone
     }
     return path.string();
 }
@@ -206,8 +237,12 @@ DWORD makeFile(const std::string& file) {
 }
 
 std::string contentsOf(const std::string& file) {
-    std::ifstream stream(file, std::ios::binary);
-    return {std::istreambuf_iterator<char>(stream), {}};
+    const std::ifstream stream(file, std::ios::binary);
+    std::ostringstream bytes;
+    if (stream) {
+        bytes << stream.rdbuf(); // an iterator would throw where something that is no file has the name
+    }
+    return bytes.str();
 }
 
 std::optional<std::string> keepAside(const std::string& file, std::string_view bytes, std::string_view log) {
@@ -230,8 +265,7 @@ void removeShared(const std::string& copy) {
 
 FileCopy::FileCopy(const std::string& file) {
     for (const std::string& place : copyPlaces()) {
-        m_folder = makeCopyFolder(place);
-        if (m_folder.empty()) {
+        if (!makeFolder(place)) {
             continue;
         }
         std::error_code error;
@@ -245,14 +279,35 @@ FileCopy::FileCopy(const std::string& file) {
             m_name = copy;
             return;
         }
-        fs::remove_all(m_folder, error);
+        removeFolder();
     }
 }
 
-FileCopy::~FileCopy() {
+bool FileCopy::makeFolder(const std::string& place) {
+    if (!place.starts_with('/')) {
+        return false;
+    }
+    clearCopies(place);
+    while (m_lock < 0) {
+        m_folder = place + "/" + copyFolderName + "XXXXXX";
+        if (!mkdtemp(m_folder.data())) {
+            return false;
+        }
+        m_lock = lockCopyFolder(m_folder); // another process may have taken it for one that was left
+    }
+    return true;
+}
+
+void FileCopy::removeFolder() {
     std::error_code error;
+    fs::remove_all(m_folder, error);
+    ::close(m_lock);
+    m_lock = -1;
+}
+
+FileCopy::~FileCopy() {
     if (!m_name.empty()) {
-        fs::remove_all(m_folder, error);
+        removeFolder();
     }
 }
 

@@ -69,7 +69,8 @@ void removeAside(const std::string& aside);
 void removeShared(const std::string& copy);
 
 /// A copy of a file and its log in a folder of its own in memory or among the temporary files, for reading what is in a
-/// place where nothing can be written. Deleted with this object.
+/// place where nothing can be written. Deleted with this object; what processes left that were ended from outside is
+/// deleted by the next one.
 class FileCopy {
 public:
     explicit FileCopy(const std::string& file);
@@ -83,7 +84,11 @@ public:
     }
 
 private:
+    [[nodiscard]] bool makeFolder(const std::string& place);
+    void removeFolder();
+
     std::string m_folder;
+    int m_lock = -1;
     std::string m_name;
 };
 

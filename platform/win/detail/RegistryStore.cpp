@@ -46,7 +46,11 @@ DWORD Store::run(Intent intent, Operation operation) {
 /// The same with an operation that writes.
 template <typename Operation>
 DWORD Store::change(Operation operation) {
-    const DWORD result = run(Intent::Write, [&] { return m_mode == Mode::Shared ? operation() : m_writeError; });
+    return written(run(Intent::Write, [&] { return m_mode == Mode::Shared ? operation() : m_writeError; }));
+}
+
+/// Tells what could not be written.
+DWORD Store::written(DWORD result) {
     if (result == ERROR_SUCCESS) {
         m_waiting.end();
     }
@@ -300,7 +304,7 @@ DWORD Store::commit() {
         (void)m_connection->query(Sql::Rollback).step();
     }
     m_inTransaction = false;
-    return result;
+    return written(result);
 }
 
 void Store::rollback() {
@@ -349,7 +353,7 @@ void Store::tell(Fault fault, std::string text) {
 }
 
 std::vector<std::string> Store::takeNotices() {
-    return std::exchange(m_notices, {});
+    return m_inTransaction ? std::vector<std::string>() : std::exchange(m_notices, {});
 }
 
 } // namespace tvx::registry

@@ -90,6 +90,7 @@ public:
     /// Leaves an open transaction to the process that this one is a fork of.
     void leaveToParent();
 
+    /// What the user is to be told; nothing within a transaction, while others wait.
     [[nodiscard]] std::vector<std::string> takeNotices();
 
 private:
@@ -111,6 +112,7 @@ private:
     DWORD run(Intent intent, Operation operation);
     template <typename Operation>
     DWORD change(Operation operation);
+    DWORD written(DWORD result);
     DWORD together(const std::function<DWORD()>& operation);
     template <typename Question>
     Reply remembered(std::string_view subject, std::string_view detail, Question question);

@@ -118,6 +118,9 @@ DWORD Store::ensureOpen(Intent intent) {
 DWORD Store::open(Intent intent) {
     close();
     m_name = locate(m_hive);
+    if (m_name.empty() && intent == Intent::Write) {
+        tell(Fault::NotSaved, "Settings cannot be saved: there is no folder to keep them in.");
+    }
     if (m_name.empty()) {
         return intent == Intent::Read ? ERROR_FILE_NOT_FOUND : ERROR_PATH_NOT_FOUND;
     }
@@ -254,7 +257,9 @@ DWORD Store::openCopy(DWORD reason) {
         return ERROR_SUCCESS;
     }
     close();
-    tell(Fault::Unusable, "The settings in " + m_file + " cannot be read. " + errorText(reason));
+    // What a full disk lets nobody read cannot be written either: that is told once.
+    tell(reason == ERROR_DISK_FULL ? Fault::NotSaved : Fault::Unusable,
+         "The settings in " + m_file + " cannot be read. " + errorText(reason));
     return reason;
 }
 

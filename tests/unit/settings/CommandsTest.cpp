@@ -105,6 +105,19 @@ TEST_F(Commands, ImportAllOrNothing) {
     EXPECT_EQ(everything(), "REGEDIT4\n\n[HKEY_CURRENT_USER\\new]\n\"a\"=\"1\"\n\n");
 }
 
+TEST_F(Commands, TellOfPlacesThatAreOfNoUse) {
+    EXPECT_EQ(run({"import", m_sandbox.folder.string()}), Outcome::BadFile);
+    EXPECT_EQ(m_errors, "tvxsettings: " + m_sandbox.folder.string() + ": Is a directory\n");
+    const auto before = std::filesystem::current_path();
+    const auto gone = m_sandbox.folder / "gone";
+    std::filesystem::create_directory(gone);
+    std::filesystem::current_path(gone);
+    std::filesystem::remove(gone);
+    RegistrySandbox::use("registry.db");
+    EXPECT_EQ(run({"set", "Software", "a", "1"}), Outcome::Failed);
+    std::filesystem::current_path(before);
+}
+
 TEST_F(Commands, ExplainThemselves) {
     EXPECT_EQ(run({"--help"}), Outcome::Done);
     EXPECT_NE(m_out.find("import FILE"), std::string::npos);

@@ -285,8 +285,10 @@ TEST_F(RegistryFaults, HostileContentsAreNotUsed) {
 }
 
 TEST_F(RegistryFaults, LinkStaysALink) {
-    const fs::path target = m_sandbox.folder / "elsewhere.db";
-    fs::create_directories(m_sandbox.file.parent_path());
+    // The folder of the link is one, too: ".." is what stands above the folder that it leads to.
+    const fs::path target = m_sandbox.folder / "away" / "elsewhere.db";
+    fs::create_directories(m_sandbox.folder / "away" / "real");
+    fs::create_directory_symlink(m_sandbox.folder / "away" / "real", m_sandbox.file.parent_path());
     fs::create_symlink("../elsewhere.db", m_sandbox.file);
     EXPECT_EQ(TestKey(path, TestKey::Way::Open).result, LSTATUS{ERROR_FILE_NOT_FOUND}) << "leads nowhere so far";
     EXPECT_EQ(TestKey(path).write("a", "1"), 0);
@@ -308,6 +310,25 @@ TEST_F(RegistryFaults, LinkIntoAMissingFolderIsLeftAlone) {
     EXPECT_FALSE(fs::exists(m_sandbox.folder / "unplugged"));
     EXPECT_TRUE(fs::is_symlink(m_sandbox.file));
     EXPECT_EQ(notices.size(), 1u);
+}
+
+TEST_F(RegistryFaults, NoHomeAtAllIsToldOnceWhenSomethingIsToBeSaved) {
+    if (geteuid() != 0) {
+        GTEST_SKIP() << "nobody else can become a user who is not known";
+    }
+    ChildProcess child([](ChildProcess& parent) {
+        for (const char* name : {"TVX_REGISTRY", "XDG_CONFIG_HOME", "HOME"}) {
+            unsetenv(name);
+        }
+        if (setresuid(54321, 54321, 54321) != 0) {
+            parent.send(100);
+        }
+        (void)TestKey(path, TestKey::Way::Open).read("a");
+        const auto afterReading = notices.size();
+        const bool isRefused = TestKey(path).result != 0 && TestKey(path).result != 0;
+        parent.send(isRefused && afterReading == 0 ? static_cast<int>(notices.size()) : 100);
+    });
+    EXPECT_EQ(child.receive(), 1);
 }
 
 TEST_F(RegistryFaults, FolderInThePlaceOfTheFile) {
@@ -372,6 +393,11 @@ TEST_F(RegistryFaults, ReadOnlyFolderIsReadWithWhatAKilledWriterLeft) {
     });
     ASSERT_EQ(writer.receive(), 0);
     writer.kill();
+    const fs::path run = m_sandbox.folder / "run";
+    const fs::path left = run / "tvx-settings-aaaaaa";
+    fs::create_directories(left);
+    std::ofstream(left / "registry.db") << "of a process that was ended from outside";
+    setenv("XDG_RUNTIME_DIR", run.c_str(), 1);
     becomeOrdinary();
     const fs::path folder = m_sandbox.file.parent_path();
     fs::remove(m_sandbox.file.string() + "-shm");
@@ -380,6 +406,8 @@ TEST_F(RegistryFaults, ReadOnlyFolderIsReadWithWhatAKilledWriterLeft) {
     EXPECT_EQ(key.read("a"), "1");
     EXPECT_EQ(key.write("a", "2"), LSTATUS{ERROR_ACCESS_DENIED});
     EXPECT_TRUE(notices.empty());
+    EXPECT_FALSE(fs::exists(left));
+    EXPECT_FALSE(fs::is_empty(run)) << "our own copy";
     fs::permissions(folder, fs::perms::owner_all);
     EXPECT_EQ(key.write("a", "2"), 0) << "as soon as it is possible";
     EXPECT_EQ(key.read("a"), "2");
@@ -430,6 +458,17 @@ TEST_F(RegistryOnFullDisk, WhatDoesNotFitIsToldOnceAndTheRestStays) {
     ASSERT_LT(kept, 1000);
     EXPECT_EQ(key.write("another", std::string(9000, 'v')), LSTATUS{ERROR_DISK_FULL});
     EXPECT_EQ(notices.size(), 1u);
+    RegistrySandbox::use(m_disk / "." / "registry.db"); // another name, so the fault is a new one
+    {
+        tvx::RegistryTransaction transaction;
+        EXPECT_EQ(transaction.begin(), 0);
+        for (int i = 0; i < 100; ++i) {
+            (void)key.write(("more" + std::to_string(i)).c_str(), std::string(20000, 'v'));
+        }
+        EXPECT_EQ(notices.size(), 1u) << "nobody is told while others wait";
+        EXPECT_NE(transaction.commit(), 0);
+    }
+    EXPECT_EQ(notices.size(), 2u);
     for (int i = 0; i < kept; ++i) {
         EXPECT_EQ(key.read(std::to_string(i).c_str()), std::string(2000, 'v'));
     }

@@ -165,6 +165,12 @@ TEST_F(Registry, RefusesWhatAKeyWasNotOpenedFor) {
     EXPECT_EQ(RegCloseKey(handle), LSTATUS{ERROR_INVALID_HANDLE});
     EXPECT_EQ(RegCloseKey(HKEY_CURRENT_USER), 0);
     EXPECT_EQ(TestKey(std::string(256, 'x')).result, LSTATUS{ERROR_INVALID_PARAMETER});
+    std::string levels = "x";
+    for (int i = 1; i < 512; ++i) {
+        levels += "\\x";
+    }
+    EXPECT_EQ(TestKey(levels).result, 0);
+    EXPECT_EQ(TestKey(levels + "\\x").result, LSTATUS{ERROR_INVALID_PARAMETER});
 }
 
 TEST_F(Registry, AnswersClassesOfTheUserBeforeThoseOfTheMachine) {
