@@ -102,9 +102,39 @@ function(tvx_add_translations target)
   add_dependencies(${target} ${target}-translations)
 endfunction()
 
+# Makes TARGET find headers that its sources name in another case than the file's, or with backslashes. Sources, headers
+# and the resource script are looked through before they are compiled, and again when one of them changes.
+function(_tvx_find_headers target)
+  set(folder "${CMAKE_CURRENT_BINARY_DIR}/${target}.includes")
+  set(includes "$<TARGET_PROPERTY:${target},INCLUDE_DIRECTORIES>")
+  set(systems ${CMAKE_CXX_IMPLICIT_INCLUDE_DIRECTORIES})
+  list(TRANSFORM systems PREPEND "--system;")
+  set(sources)
+  foreach(source IN LISTS ARGN)
+    cmake_path(ABSOLUTE_PATH source NORMALIZE)
+    list(APPEND sources "${source}")
+  endforeach()
+  add_custom_command(
+    OUTPUT "${folder}.stamp"
+    COMMAND Tarvex::IncludeFinder
+      --output "${folder}" --stamp "${folder}.stamp" --depfile "${folder}.d"
+      "$<$<BOOL:${includes}>:-I;$<JOIN:${includes},;-I;>>"
+      ${systems}
+      ${sources}
+    DEPENDS ${sources} Tarvex::IncludeFinder
+    DEPFILE "${folder}.d"
+    COMMENT "Looking for the headers of ${target}"
+    COMMAND_EXPAND_LISTS
+    VERBATIM)
+  add_custom_target(${target}-includes DEPENDS "${folder}.stamp")
+  add_dependencies(${target} ${target}-includes)
+  target_include_directories(${target} PRIVATE "${folder}/1/2/3/4")
+endfunction()
+
 # tvx_add_application(NAME SOURCES file... [RESOURCES script.rc] [TRANSLATIONS language script...] [LIBRARIES library...]):
 # a program of the family. Its sources hold one global application object and no main; the layer's entry point runs the
 # object. TRANSLATIONS are those of tvx_add_translations.
+# Sources of old applications compile as they are: docs/moving-an-application.md tells what is done for them.
 function(tvx_add_application name)
   cmake_parse_arguments(PARSE_ARGV 1 ARG "" "RESOURCES" "SOURCES;TRANSLATIONS;LIBRARIES")
   if(ARG_UNPARSED_ARGUMENTS OR NOT ARG_SOURCES)
@@ -114,6 +144,11 @@ function(tvx_add_application name)
   add_executable(${name} ${ARG_SOURCES})
   target_include_directories(${name} PRIVATE "${CMAKE_CURRENT_SOURCE_DIR}")
   target_link_libraries(${name} PRIVATE $<TARGET_NAME_IF_EXISTS:Tarvex::Main> Tarvex::GuiUtilities ${ARG_LIBRARIES})
+  _tvx_find_headers(${name} ${ARG_SOURCES} ${ARG_RESOURCES})
+  # Old names of library functions and types; handlers in message maps without "&", which clang cannot read.
+  target_compile_options(${name} PRIVATE
+    "$<$<COMPILE_LANGUAGE:CXX>:SHELL:-include compatibility.h>"
+    $<$<COMPILE_LANG_AND_ID:CXX,GNU>:-fms-extensions>)
   if(ARG_RESOURCES)
     tvx_compile_resources(${name} "${ARG_RESOURCES}")
   endif()

@@ -5,7 +5,7 @@ include(CMakePackageConfigHelpers)
 set(package_dir "${CMAKE_INSTALL_LIBDIR}/cmake/Tarvex")
 set(header_dir "${CMAKE_INSTALL_INCLUDEDIR}/tarvex")
 
-install(TARGETS TarvexPlatform TarvexMain GuiUtilities tvx-rc EXPORT TarvexTargets
+install(TARGETS TarvexPlatform TarvexMain GuiUtilities tvx-rc tvx-includes EXPORT TarvexTargets
   RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}"
   LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}"
   ARCHIVE DESTINATION "${CMAKE_INSTALL_LIBDIR}")

@@ -58,9 +58,9 @@ public:
     constexpr CSize() noexcept : SIZE{0, 0} {}
     constexpr CSize(int width, int height) noexcept : SIZE{width, height} {}
     constexpr CSize(SIZE size) noexcept : SIZE(size) {}
-    constexpr explicit CSize(POINT point) noexcept : SIZE{point.x, point.y} {}
+    constexpr CSize(POINT point) noexcept : SIZE{point.x, point.y} {}
     /// Width in the low half of a packed number, height in the high half, both signed.
-    constexpr explicit CSize(DWORD packed) noexcept
+    constexpr CSize(DWORD packed) noexcept
         : SIZE{static_cast<SHORT>(LOWORD(packed)), static_cast<SHORT>(HIWORD(packed))} {}
     /// Sets both members.
     constexpr void SetSize(int width, int height) noexcept {
@@ -101,9 +101,9 @@ public:
     constexpr CPoint() noexcept : POINT{0, 0} {}
     constexpr CPoint(int x, int y) noexcept : POINT{x, y} {}
     constexpr CPoint(POINT point) noexcept : POINT(point) {}
-    constexpr explicit CPoint(SIZE size) noexcept : POINT{size.cx, size.cy} {}
+    constexpr CPoint(SIZE size) noexcept : POINT{size.cx, size.cy} {}
     /// The position of a mouse message: x in the low half of the packed number, y in the high half, both signed.
-    constexpr explicit CPoint(LPARAM packed) noexcept
+    constexpr CPoint(LPARAM packed) noexcept
         : POINT{static_cast<SHORT>(LOWORD(static_cast<DWORD>(packed))),
                 static_cast<SHORT>(HIWORD(static_cast<DWORD>(packed)))} {}
     /// Sets both members.
@@ -395,6 +395,12 @@ public:
         return CRect(rect) += point;
     }
     friend constexpr CRect operator+(const CRect& rect, SIZE size) noexcept {
+        return CRect(rect) += size;
+    }
+    friend constexpr CRect operator+(POINT point, const CRect& rect) noexcept {
+        return CRect(rect) += point;
+    }
+    friend constexpr CRect operator+(SIZE size, const CRect& rect) noexcept {
         return CRect(rect) += size;
     }
     friend constexpr CRect operator+(const CRect& rect, LPCRECT by) noexcept {

@@ -3,6 +3,7 @@
 /// @file
 /// The framework's basics: text, run-time classes, exceptions, files, archives, geometry.
 
+#define __AFX_H__ // hosts ask whether this header came first
 #include "platform/base/Archive.h"
 #include "platform/base/Exception.h"
 #include "platform/base/File.h"

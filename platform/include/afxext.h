@@ -3,6 +3,7 @@
 /// @file
 /// The framework's bars.
 
+#define __AFXEXT_H__ // hosts ask whether this header came first
 #include "afxwin.h"
 #include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/DockState.h"

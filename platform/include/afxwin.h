@@ -3,6 +3,7 @@
 /// @file
 /// The framework of windows: application, frames, views, documents, dialogs, controls, menus, drawing.
 
+#define __AFXWIN_H__ // hosts ask whether this header came first
 #include "afx.h"
 #include "afxcoll.h"
 #include "platform/afx/controls/Controls.h"
@@ -28,6 +29,7 @@
 #include "platform/afx/frames/View.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
+#include "platform/afx/gdi/HandleCalls.h"
 #include "platform/win/Drives.h"
 #include "platform/win/Error.h"
 #include "platform/win/ExtensionModule.h"
@@ -36,6 +38,7 @@
 #include "platform/win/Locale.h"
 #include "platform/win/Module.h"
 #include "platform/win/Network.h"
+#include "platform/win/Process.h"
 #include "platform/win/Registry.h"
 #include "platform/win/Resource.h"
 #include "platform/win/ResourceConstants.h"

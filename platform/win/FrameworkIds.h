@@ -79,6 +79,9 @@
 #define ID_NEXT_PANE 0xE150
 #define ID_PREV_PANE 0xE151
 
+/* The choice of a font */
+#define ID_FORMAT_FONT 0xE160
+
 /* View commands: each bar's number is its command */
 #define AFX_IDW_CONTROLBAR_FIRST 0xE800
 #define AFX_IDW_CONTROLBAR_LAST 0xE8FF
@@ -208,7 +211,7 @@
 #define AFX_IDP_ARCH_BADCLASS 0xF1D6
 #define AFX_IDP_ARCH_BADSCHEMA 0xF1D7
 
-/* Texts of the system's own parts: message boxes, system menus, file dialogs */
+/* Texts of the system's own parts: message boxes, system menus, dialogs of files, colours and fonts, printing */
 #define TVX_IDS_OK 0xF300
 #define TVX_IDS_CANCEL 0xF301
 #define TVX_IDS_ABORT 0xF302
@@ -231,6 +234,9 @@
 #define TVX_IDS_FILE_SAVE 0xF324
 #define TVX_IDS_FILE_CANCEL 0xF325
 #define TVX_IDS_TOOL_BAR 0xF326
+#define TVX_IDS_NO_PRINTER 0xF330
+#define TVX_IDS_COLOR 0xF331
+#define TVX_IDS_FONT 0xF332
 
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721

@@ -52,6 +52,16 @@ TVX_PLATFORM_API DWORD WNetOpenEnumA(DWORD scope, DWORD type, DWORD usage, NETRE
 ///     by the next call; `ERROR_INVALID_HANDLE`
 TVX_PLATFORM_API DWORD WNetEnumResourceA(HANDLE handle, DWORD* count, void* buffer, DWORD* size);
 
+/// The same calls by the names without their suffix.
+/// @{
+inline DWORD WNetOpenEnum(DWORD scope, DWORD type, DWORD usage, NETRESOURCEA* container, HANDLE* handle) {
+    return WNetOpenEnumA(scope, type, usage, container, handle);
+}
+inline DWORD WNetEnumResource(HANDLE handle, DWORD* count, void* buffer, DWORD* size) {
+    return WNetEnumResourceA(handle, count, buffer, size);
+}
+/// @}
+
 /// Ends an enumeration.
 /// @return NO_ERROR or `ERROR_INVALID_HANDLE`
 TVX_PLATFORM_API DWORD WNetCloseEnum(HANDLE handle);

@@ -88,8 +88,19 @@ TVX_PLATFORM_API BOOL CreateProcessA(LPCSTR application, LPSTR commandLine,
                                      LPVOID environment, LPCSTR directory, const STARTUPINFOA* startup,
                                      PROCESS_INFORMATION* information);
 
+/// As `CreateProcessA`.
+inline BOOL CreateProcess(LPCSTR application, LPSTR commandLine, const SECURITY_ATTRIBUTES* processAttributes,
+                          const SECURITY_ATTRIBUTES* threadAttributes, BOOL inherit, DWORD flags, LPVOID environment,
+                          LPCSTR directory, const STARTUPINFO* startup, PROCESS_INFORMATION* information) {
+    return CreateProcessA(application, commandLine, processAttributes, threadAttributes, inherit, flags, environment,
+                          directory, startup, information);
+}
+
 /// Tells how this process was asked to start: `wShowWindow` when it is to be hidden.
 TVX_PLATFORM_API void GetStartupInfoA(STARTUPINFOA* startup);
+inline void GetStartupInfo(STARTUPINFO* startup) {
+    GetStartupInfoA(startup);
+}
 
 /// Waits until a child has its first window and is idle. Programs of this system do not tell when they are; the answer
 /// is at once the one for programs without windows, `WAIT_FAILED`.

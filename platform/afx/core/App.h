@@ -116,6 +116,22 @@ public:
     virtual BOOL WriteProfileBinary(LPCSTR section, LPCSTR entry, LPBYTE data, UINT size);
     /// @}
 
+    /// Calls that hosts make in InitInstance and that have nothing to do here: the desktop opens files by its own
+    /// entries of applications, and draws controls in its own style.
+    /// @{
+
+    /// There is no list of recent files yet, of which `count` would be the length.
+    void LoadStdProfileSettings(UINT count = 4) {}
+    void EnableShellOpen() {}
+    void RegisterShellFileTypes(BOOL withPrinting = FALSE) {}
+    BOOL Enable3dControls() {
+        return TRUE;
+    }
+    BOOL Enable3dControlsStatic() {
+        return TRUE;
+    }
+    /// @}
+
     /// Documents.
     /// @{
 
@@ -223,6 +239,9 @@ TVX_PLATFORM_API int AfxMessageBox(LPCSTR text, UINT type = MB_OK, UINT helpId =
 TVX_PLATFORM_API int AfxMessageBox(UINT textId, UINT type = MB_OK, UINT helpId = static_cast<UINT>(-1));
 /// A message box with a caption of its own over `owner` (may be null).
 TVX_PLATFORM_API int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type);
+inline int MessageBox(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
+    return MessageBoxA(owner, text, caption, type);
+}
 /// The desktop's one sound for mistakes, whatever the type; none without a display. Always TRUE.
 TVX_PLATFORM_API BOOL MessageBeep(UINT type);
 /// Puts texts into the places "%1" and "%2" of a string resource, which every module may have.

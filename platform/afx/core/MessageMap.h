@@ -18,6 +18,9 @@
 /// @endcode
 ///
 /// Each macro names the signature its handler must have; a handler of another signature does not compile.
+///
+/// Older sources leave the "&" out, and the class before a handler of their own: ON_COMMAND(ID_EDIT_COPY, OnEditCopy).
+/// g++ takes that from hosts that tvx_add_application builds (-fms-extensions); clang does not.
 
 #include "platform/afx/core/CmdTarget.h"
 
@@ -351,6 +354,7 @@ protected:                                                                      
 #define ON_CBN_KILLFOCUS(id, memberFxn) ON_CONTROL(CBN_KILLFOCUS, id, memberFxn)
 #define ON_CBN_EDITCHANGE(id, memberFxn) ON_CONTROL(CBN_EDITCHANGE, id, memberFxn)
 #define ON_CBN_DROPDOWN(id, memberFxn) ON_CONTROL(CBN_DROPDOWN, id, memberFxn)
+#define ON_CBN_SELENDOK(id, memberFxn) ON_CONTROL(CBN_SELENDOK, id, memberFxn)
 #define ON_CBN_CLOSEUP(id, memberFxn) ON_CONTROL(CBN_CLOSEUP, id, memberFxn)
 
 #define ON_WM_CREATE() TVX_ON_MESSAGE(WM_CREATE, (&::tvx::afx::onCreate<&ThisClass::OnCreate>))
@@ -367,6 +371,7 @@ protected:                                                                      
 #define ON_WM_CLOSE() TVX_ON_MESSAGE(WM_CLOSE, (&::tvx::afx::onNothing<&ThisClass::OnClose>))
 #define ON_WM_QUERYENDSESSION()                                                                                        \
     TVX_ON_MESSAGE(WM_QUERYENDSESSION, (&::tvx::afx::onNothing<&ThisClass::OnQueryEndSession>))
+#define ON_WM_QUERYDRAGICON() TVX_ON_MESSAGE(WM_QUERYDRAGICON, (&::tvx::afx::onNothing<&ThisClass::OnQueryDragIcon>))
 #define ON_WM_ENDSESSION() TVX_ON_MESSAGE(WM_ENDSESSION, (&::tvx::afx::onFlag<&ThisClass::OnEndSession>))
 #define ON_WM_ERASEBKGND() TVX_ON_MESSAGE(WM_ERASEBKGND, (&::tvx::afx::onContext<&ThisClass::OnEraseBkgnd>))
 #define ON_WM_SYSCOLORCHANGE() TVX_ON_MESSAGE(WM_SYSCOLORCHANGE, (&::tvx::afx::onNothing<&ThisClass::OnSysColorChange>))
@@ -424,6 +429,10 @@ protected:                                                                      
 #define ON_WM_MBUTTONDOWN() TVX_ON_MESSAGE(WM_MBUTTONDOWN, (&::tvx::afx::onPoint<&ThisClass::OnMButtonDown>))
 #define ON_WM_MBUTTONUP() TVX_ON_MESSAGE(WM_MBUTTONUP, (&::tvx::afx::onPoint<&ThisClass::OnMButtonUp>))
 #define ON_WM_MDIACTIVATE() TVX_ON_MESSAGE(WM_MDIACTIVATE, (&::tvx::afx::onMdiActivate<&ThisClass::OnMDIActivate>))
+#define ON_WM_WINDOWPOSCHANGING()                                                                                      \
+    TVX_ON_MESSAGE(WM_WINDOWPOSCHANGING, (&::tvx::afx::onPointer<WINDOWPOS, &ThisClass::OnWindowPosChanging>))
+#define ON_WM_WINDOWPOSCHANGED()                                                                                       \
+    TVX_ON_MESSAGE(WM_WINDOWPOSCHANGED, (&::tvx::afx::onPointer<WINDOWPOS, &ThisClass::OnWindowPosChanged>))
 #define ON_WM_DROPFILES() TVX_ON_MESSAGE(WM_DROPFILES, (&::tvx::afx::onHandle<&ThisClass::OnDropFiles>))
 #define ON_WM_SETTINGCHANGE()                                                                                          \
     TVX_ON_MESSAGE(WM_SETTINGCHANGE, (&::tvx::afx::onSettingChange<&ThisClass::OnSettingChange>))

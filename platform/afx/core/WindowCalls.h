@@ -116,6 +116,22 @@ TVX_PLATFORM_API SHORT GetKeyState(int key);
 /// come (PeekMessage, PumpMessage) before it asks.
 TVX_PLATFORM_API SHORT GetAsyncKeyState(int key);
 
+/// The caret: a mark in a window that shows where text is entered, blinking as the desktop's does. There is one for all
+/// windows. A window makes it when it gets the keyboard and destroys it when it loses it; it comes hidden. Under the
+/// caret the window is painted again each time it goes. FALSE when the caret is not that window's (null: any).
+/// @{
+
+/// @param bitmap whose size is taken; null or 1 (grey): `width` and `height`, where 0 is the width of a border
+TVX_PLATFORM_API BOOL CreateCaret(HWND window, HBITMAP bitmap, int width, int height);
+TVX_PLATFORM_API BOOL DestroyCaret();
+/// Pixels of the client area.
+TVX_PLATFORM_API BOOL SetCaretPos(int x, int y);
+TVX_PLATFORM_API BOOL GetCaretPos(POINT* point);
+/// A caret that was hidden several times has to be shown as often.
+TVX_PLATFORM_API BOOL ShowCaret(HWND window);
+TVX_PLATFORM_API BOOL HideCaret(HWND window);
+/// @}
+
 /// The dialog units of the system font (SYSTEM_FONT), in pixels: width in the low half, height in the high one. A
 /// horizontal dialog unit is a quarter of the width, a vertical one an eighth of the height.
 TVX_PLATFORM_API LONG GetDialogBaseUnits();
@@ -131,6 +147,18 @@ TVX_PLATFORM_API BOOL KillTimer(HWND window, UINT_PTR id);
 
 /// The same calls by the names without their suffix.
 /// @{
+inline HWND FindWindow(LPCSTR className, LPCSTR text) {
+    return FindWindowA(className, text);
+}
+inline int GetClassName(HWND window, LPSTR buffer, int size) {
+    return GetClassNameA(window, buffer, size);
+}
+inline LONG_PTR GetWindowLongPtr(HWND window, int index) {
+    return GetWindowLongPtrA(window, index);
+}
+inline LONG_PTR SetWindowLongPtr(HWND window, int index, LONG_PTR value) {
+    return SetWindowLongPtrA(window, index, value);
+}
 inline LONG_PTR GetWindowLong(HWND window, int index) {
     return GetWindowLongPtrA(window, index);
 }
@@ -139,6 +167,9 @@ inline LONG_PTR SetWindowLong(HWND window, int index, LONG_PTR value) {
 }
 inline BOOL SetWindowText(HWND window, LPCSTR text) {
     return SetWindowTextA(window, text);
+}
+inline int GetWindowTextLength(HWND window) {
+    return GetWindowTextLengthA(window);
 }
 inline int GetWindowText(HWND window, LPSTR buffer, int size) {
     return GetWindowTextA(window, buffer, size);

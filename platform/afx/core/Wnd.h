@@ -7,6 +7,7 @@
 #include "platform/afx/core/MessageMap.h"
 #include "platform/afx/core/WindowCalls.h"
 
+class CBitmap;
 class CDC;
 class CDataExchange;
 class CFont;
@@ -205,8 +206,13 @@ public:
     void MoveWindow(int x, int y, int width, int height, BOOL repaint = TRUE);
     void MoveWindow(const RECT* rect, BOOL repaint = TRUE);
     /// Moves, sizes, reorders, shows or hides in one step (SWP_...).
-    /// @param insertAfter a sibling to stand behind, null: in front of all; not looked at with SWP_NOZORDER
+    /// @param insertAfter a sibling to stand behind, null: in front of all; not looked at with SWP_NOZORDER. Or one of
+    /// wndTop (in front of all), wndBottom (behind all), wndTopMost (before other applications, too), wndNoTopMost
     BOOL SetWindowPos(const CWnd* insertAfter, int x, int y, int cx, int cy, UINT flags);
+    static const CWnd& wndTop;
+    static const CWnd& wndBottom;
+    static const CWnd& wndTopMost;
+    static const CWnd& wndNoTopMost;
     /// How the window is shown and where it is when it is neither minimised nor maximised: what is kept from one run to
     /// the next. FALSE without a window.
     BOOL GetWindowPlacement(WINDOWPLACEMENT* placement) const;
@@ -302,6 +308,9 @@ public:
     static CWnd* FindWindow(LPCSTR className, LPCSTR text);
     /// The innermost window of this process at a point of the screen; null for none.
     static CWnd* WindowFromPoint(POINT point);
+    /// The first child at a point of the client area, hidden and disabled ones included; the window itself where no
+    /// child is, null outside of it.
+    CWnd* ChildWindowFromPoint(POINT point) const;
     /// @}
 
     /// Activation, focus, capture.
@@ -321,6 +330,30 @@ public:
     /// Sends all mouse messages here until ReleaseCapture, wherever the pointer is.
     CWnd* SetCapture();
     static CWnd* GetCapture();
+    /// @}
+
+    /// The caret; the calls of the same name (WindowCalls.h) tell more.
+    /// @{
+
+    /// Makes the caret, hidden: of a bitmap's size, or of a size in pixels (0: the width of a border).
+    void CreateCaret(CBitmap* bitmap);
+    void CreateSolidCaret(int width, int height) {
+        ::CreateCaret(m_hWnd, nullptr, width, height);
+    }
+    /// Carets have one look: the same as CreateSolidCaret.
+    void CreateGrayCaret(int width, int height) {
+        ::CreateCaret(m_hWnd, nullptr, width, height);
+    }
+    static void SetCaretPos(POINT point) {
+        ::SetCaretPos(point.x, point.y);
+    }
+    static CPoint GetCaretPos();
+    void ShowCaret() {
+        ::ShowCaret(m_hWnd);
+    }
+    void HideCaret() {
+        ::HideCaret(m_hWnd);
+    }
     /// @}
 
     /// Timers.
@@ -420,8 +453,9 @@ public:
     /// ((-1, -1) when the keyboard asked for a menu). Windows that come as arguments may be temporary or null.
     ///
     /// What differs: the desktop draws the frames of top-level windows, so there are no messages of the non-client area
-    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange, OnHelpInfo and
-    /// those of the session's end are called for messages that hosts send: the layer sends none of these.
+    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange, OnHelpInfo,
+    /// OnQueryDragIcon, OnWindowPosChanging, OnWindowPosChanged and those of the session's end are called for messages
+    /// that hosts send: the layer sends none of these. OnMove and OnSize tell of a new place.
     /// @{
 
     afx_msg void OnActivate(UINT state, CWnd* other, BOOL minimized);
@@ -481,6 +515,7 @@ public:
     afx_msg void OnNcRButtonUp(UINT hitTest, CPoint point);
     afx_msg void OnNcPaint();
     afx_msg void OnPaint();
+    afx_msg HCURSOR OnQueryDragIcon();
     afx_msg BOOL OnQueryEndSession();
     afx_msg BOOL OnSetCursor(CWnd* window, UINT hitTest, UINT message);
     afx_msg void OnSettingChange(UINT flags, LPCSTR section);
@@ -488,6 +523,8 @@ public:
     afx_msg void OnSize(UINT type, int cx, int cy);
     afx_msg void OnSysColorChange();
     afx_msg void OnTimer(UINT_PTR id);
+    afx_msg void OnWindowPosChanged(WINDOWPOS* place);
+    afx_msg void OnWindowPosChanging(WINDOWPOS* place);
     /// @}
 protected:
     friend class tvx::afx::Window;
@@ -507,6 +544,8 @@ protected:
     DECLARE_MESSAGE_MAP()
 
 private:
+    // For the marks that stand for an order: no window has their handles.
+    explicit CWnd(HWND mark) : m_hWnd(mark) {}
     // Out of line, where the compiler cannot conclude that the object is not null.
     static HWND HandleOf(const CWnd* window);
     CWnd* m_pOwner = nullptr;

@@ -151,6 +151,12 @@ BOOL CWnd::SetWindowPos(const CWnd* insertAfter, int x, int y, int cx, int cy, U
     return ::SetWindowPos(m_hWnd, handleOf(insertAfter), x, y, cx, cy, flags);
 }
 
+// They are never destroyed: the end of the process would take them for windows.
+const CWnd& CWnd::wndTop = *new CWnd(HWND_TOP);
+const CWnd& CWnd::wndBottom = *new CWnd(HWND_BOTTOM);
+const CWnd& CWnd::wndTopMost = *new CWnd(HWND_TOPMOST);
+const CWnd& CWnd::wndNoTopMost = *new CWnd(HWND_NOTOPMOST);
+
 BOOL CWnd::GetWindowPlacement(WINDOWPLACEMENT* placement) const {
     return ::GetWindowPlacement(m_hWnd, placement);
 }
@@ -356,6 +362,10 @@ CWnd* CWnd::GetDesktopWindow() {
 
 CWnd* CWnd::FindWindow(LPCSTR className, LPCSTR text) {
     return FromHandle(::FindWindowA(className, text));
+}
+
+CWnd* CWnd::ChildWindowFromPoint(POINT point) const {
+    return FromHandle(::ChildWindowFromPoint(m_hWnd, point));
 }
 
 CWnd* CWnd::WindowFromPoint(POINT point) {

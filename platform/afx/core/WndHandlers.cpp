@@ -231,6 +231,10 @@ void CWnd::OnPaint() {
     Default();
 }
 
+HCURSOR CWnd::OnQueryDragIcon() {
+    return reinterpret_cast<HCURSOR>(Default());
+}
+
 BOOL CWnd::OnQueryEndSession() {
     return static_cast<BOOL>(Default());
 }
@@ -265,3 +269,11 @@ BEGIN_MESSAGE_MAP(CWnd, CCmdTarget)
     ON_WM_NCDESTROY()
 END_MESSAGE_MAP()
 // clang-format on
+
+void CWnd::OnWindowPosChanged(WINDOWPOS*) {
+    Default();
+}
+
+void CWnd::OnWindowPosChanging(WINDOWPOS*) {
+    Default();
+}

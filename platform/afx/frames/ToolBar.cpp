@@ -310,6 +310,47 @@ CSize CToolBar::CalcFixedLayout(BOOL stretch, BOOL horizontal) {
     return CControlBar::CalcFixedLayout(stretch, horizontal);
 }
 
+// --- buttons by their commands ---
+
+bool CToolBarCtrl::has(int id, UINT state) const {
+    return (m_bar.GetButtonStyle(m_bar.CommandToIndex(static_cast<UINT>(id))) & state) != 0;
+}
+
+BOOL CToolBarCtrl::change(int id, UINT state, bool on) {
+    const int index = m_bar.CommandToIndex(static_cast<UINT>(id));
+    const UINT style = m_bar.GetButtonStyle(index);
+    m_bar.SetButtonStyle(index, on ? style | state : style & ~state);
+    return index >= 0;
+}
+
+BOOL CToolBarCtrl::EnableButton(int id, BOOL enable) {
+    return change(id, TBBS_DISABLED, !enable);
+}
+
+BOOL CToolBarCtrl::CheckButton(int id, BOOL check) {
+    return change(id, TBBS_CHECKBOX, true) && change(id, TBBS_CHECKED, check != FALSE);
+}
+
+BOOL CToolBarCtrl::HideButton(int id, BOOL hide) {
+    return change(id, TBBS_HIDDEN, hide != FALSE);
+}
+
+BOOL CToolBarCtrl::IsButtonEnabled(int id) const {
+    return m_bar.CommandToIndex(static_cast<UINT>(id)) >= 0 && !has(id, TBBS_DISABLED);
+}
+
+BOOL CToolBarCtrl::IsButtonChecked(int id) const {
+    return has(id, TBBS_CHECKED);
+}
+
+BOOL CToolBarCtrl::IsButtonHidden(int id) const {
+    return has(id, TBBS_HIDDEN);
+}
+
+int CToolBarCtrl::GetButtonCount() const {
+    return m_bar.GetCount();
+}
+
 // --- states ---
 
 namespace {

@@ -21,6 +21,32 @@
 #define TBSTYLE_TOOLTIPS 0x0100
 #define TBSTYLE_FLAT 0x0800
 
+class CToolBar;
+
+/// The buttons of a tool bar, each named by its command. CToolBar::GetToolBarCtrl answers it. What update handlers say
+/// of a command counts more: they are asked whenever the application is idle.
+class TVX_PLATFORM_API CToolBarCtrl {
+public:
+    explicit CToolBarCtrl(CToolBar& bar) : m_bar(bar) {}
+
+    /// Change a button's state. FALSE when the bar has no button of that command, as in the calls that ask.
+    /// @{
+    BOOL EnableButton(int id, BOOL enable = TRUE);
+    BOOL CheckButton(int id, BOOL check = TRUE);
+    BOOL HideButton(int id, BOOL hide = TRUE);
+    /// @}
+    BOOL IsButtonEnabled(int id) const;
+    BOOL IsButtonChecked(int id) const;
+    BOOL IsButtonHidden(int id) const;
+    /// Buttons and separators.
+    int GetButtonCount() const;
+
+private:
+    BOOL change(int id, UINT state, bool on);
+    bool has(int id, UINT state) const;
+    CToolBar& m_bar;
+};
+
 /// A tool bar: buttons with pictures from one bitmap, separators, and places for other controls.
 ///
 /// Buttons send their commands to the frame; their states come from the commands' update handlers. The tip of a button
@@ -88,6 +114,11 @@ public:
     /// Text of a button; empty when it has none and for an index outside the bar.
     CString GetButtonText(int index) const;
 
+    /// The buttons by their commands; it lives as long as the bar.
+    CToolBarCtrl& GetToolBarCtrl() const {
+        return m_control;
+    }
+
     void OnUpdateCmdUI(CFrameWnd* target, BOOL disable) override;
     CSize CalcFixedLayout(BOOL stretch, BOOL horizontal) override;
 
@@ -108,6 +139,7 @@ private:
     }
     void rebuild();
     void showState(int index);
+    mutable CToolBarCtrl m_control{*this};
     std::vector<Button> m_buttons;
     CSize m_buttonSize{24, 22};
     CSize m_imageSize{16, 15};

@@ -1,8 +1,10 @@
 #include "platform/afx/frames/View.h"
 
+#include "platform/afx/core/App.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/frames/Document.h"
 #include "platform/afx/gdi/Dc.h"
+#include "platform/win/FrameworkIds.h"
 
 #include <QWidget>
 
@@ -81,6 +83,31 @@ void CView::OnPaint() {
     CPaintDC dc(this);
     OnPrepareDC(&dc);
     OnDraw(&dc);
+}
+
+// --- printing ---
+
+void CView::OnFilePrint() {
+    CPrintInfo info;
+    OnPreparePrinting(&info);
+}
+
+void CView::OnFilePrintPreview() {
+    CPrintInfo info;
+    OnPreparePrinting(&info);
+}
+
+BOOL CView::OnPreparePrinting(CPrintInfo* info) {
+    return DoPreparePrinting(info);
+}
+
+BOOL CView::DoPreparePrinting(CPrintInfo*) {
+    AfxMessageBox(TVX_IDS_NO_PRINTER, MB_OK | MB_ICONINFORMATION);
+    return FALSE;
+}
+
+void CView::OnPrint(CDC* dc, CPrintInfo*) {
+    OnDraw(dc);
 }
 
 CScrollBar* CView::GetScrollBarCtrl(int bar) const {

@@ -7,7 +7,38 @@
 
 class CBrush;
 class CDocument;
-struct CPrintInfo;
+
+/// What printing would be told. There is no printer here: hosts fill it in and read it, nothing looks at it.
+struct CPrintInfo {
+    BOOL m_bPreview = FALSE; ///< Always FALSE, as m_bDirect.
+    BOOL m_bDirect = FALSE;
+    BOOL m_bContinuePrinting = TRUE; ///< FALSE would end the loop over the pages.
+    UINT m_nCurPage = 1;             ///< The page to be printed.
+    UINT m_nNumPreviewPages = 0;
+    LPVOID m_lpUserData = nullptr; ///< The host's own.
+    CRect m_rectDraw;              ///< Where a page may be drawn: nowhere.
+    CString m_strPageDesc;
+
+    /// The first and the last page; of unknown length at first.
+    /// @{
+    void SetMinPage(UINT page) {
+        m_minPage = page;
+    }
+    void SetMaxPage(UINT page) {
+        m_maxPage = page;
+    }
+    UINT GetMinPage() const {
+        return m_minPage;
+    }
+    UINT GetMaxPage() const {
+        return m_maxPage;
+    }
+    /// @}
+
+private:
+    UINT m_minPage = 1;
+    UINT m_maxPage = 0xFFFF;
+};
 
 /// Shows (part of) a document and takes the user's input for it. Its document's template makes it with its frame; the
 /// object deletes itself when its window has ended.
@@ -46,6 +77,24 @@ public:
     virtual void OnActivateView(BOOL activate, CView* activated, CView* deactivated);
     /// Called when the frame is activated or deactivated.
     virtual void OnActivateFrame(UINT state, CFrameWnd* frame);
+
+    /// Printing. There is no printer here: the two commands ask OnPreparePrinting, and DoPreparePrinting, where a
+    /// derived class's ends, tells the user so. The other members are there to be overridden; nobody calls them.
+    /// @{
+
+    /// In the map of a derived class these answer ID_FILE_PRINT and ID_FILE_PRINT_PREVIEW.
+    afx_msg void OnFilePrint();
+    afx_msg void OnFilePrintPreview();
+    /// Whether printing is to begin. The base asks DoPreparePrinting.
+    virtual BOOL OnPreparePrinting(CPrintInfo* info);
+    /// Tells that there is no printer, and answers FALSE.
+    BOOL DoPreparePrinting(CPrintInfo* info);
+    virtual void OnBeginPrinting(CDC* dc, CPrintInfo* info) {}
+    /// Draws a page. The base calls OnDraw.
+    virtual void OnPrint(CDC* dc, CPrintInfo* info);
+    virtual void OnEndPrinting(CDC* dc, CPrintInfo* info) {}
+    virtual void OnEndPrintPreview(CDC* dc, CPrintInfo* info, POINT point, class CPreviewView* view) {}
+    /// @}
 
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
     void PostNcDestroy() override;

@@ -393,6 +393,10 @@ TVX_PLATFORM_API int FillRect(HDC dc, const RECT* rect, HBRUSH brush);
 TVX_PLATFORM_API BOOL DrawIconEx(HDC dc, int x, int y, HICON icon, int width, int height, UINT step, HBRUSH background,
                                  UINT flags);
 
+/// As `GetTextMetricsA`.
+inline BOOL GetTextMetrics(HDC dc, TEXTMETRIC* metrics) {
+    return GetTextMetricsA(dc, metrics);
+}
 /// As `GetTextExtentPoint32A`.
 inline BOOL GetTextExtentPoint32(HDC dc, LPCSTR text, int count, SIZE* size) {
     return GetTextExtentPoint32A(dc, text, count, size);

@@ -230,6 +230,9 @@ public:
     int GetRgnBox(RECT* rect) const;
     /// Whether the pixel belongs to the region.
     BOOL PtInRegion(int x, int y) const;
+    BOOL PtInRegion(POINT point) const {
+        return PtInRegion(point.x, point.y);
+    }
     /// Whether any of the rectangle belongs to the region.
     BOOL RectInRegion(const RECT* rect) const;
 };
@@ -269,6 +272,13 @@ TVX_PLATFORM_API DWORD GetObjectType(HGDIOBJ object);
 /// A predefined tool (BLACK_PEN, NULL_BRUSH, DEFAULT_GUI_FONT, ...); null for an unknown number. Not to be deleted.
 TVX_PLATFORM_API HGDIOBJ GetStockObject(int index);
 
+/// As `CreateFontA`.
+inline HFONT CreateFont(int height, int width, int escapement, int orientation, int weight, DWORD italic,
+                        DWORD underline, DWORD strikeOut, DWORD charSet, DWORD outPrecision, DWORD clipPrecision,
+                        DWORD quality, DWORD pitchAndFamily, LPCSTR faceName) {
+    return CreateFontA(height, width, escapement, orientation, weight, italic, underline, strikeOut, charSet,
+                       outPrecision, clipPrecision, quality, pitchAndFamily, faceName);
+}
 /// As `CreateFontIndirectA`.
 inline HFONT CreateFontIndirect(const LOGFONT* description) {
     return CreateFontIndirectA(description);

@@ -1,0 +1,66 @@
+#include "platform/afx/dialogs/FontDialog.h"
+
+#include "platform/afx/dialogs/detail/ToolkitDialog.h"
+#include "platform/afx/gdi/detail/Fonts.h"
+#include "platform/afx/toolkit/detail/Gui.h"
+#include "platform/base/Text.h"
+#include "platform/win/FrameworkIds.h"
+
+#include <QFontDialog>
+#include <QFontInfo>
+
+#include <cmath>
+
+using namespace tvx::afx;
+
+IMPLEMENT_DYNAMIC(CFontDialog, CWnd)
+
+namespace {
+
+constexpr double pixelsOfPoint = 96.0 / 72; // there are 96 pixels to an inch
+
+LOGFONT describe(const QFont& font) {
+    LOGFONT description{};
+    description.lfHeight = static_cast<LONG>(-std::lround(QFontInfo(font).pointSizeF() * pixelsOfPoint));
+    description.lfWeight = font.weight();
+    description.lfItalic = font.italic() ? 1 : 0;
+    description.lfUnderline = font.underline() ? 1 : 0;
+    description.lfStrikeOut = font.strikeOut() ? 1 : 0;
+    description.lfCharSet = DEFAULT_CHARSET;
+    tvx::text::copyCut(fromQt(font.family()), description.lfFaceName, sizeof(description.lfFaceName));
+    return description;
+}
+
+} // namespace
+
+CFontDialog::CFontDialog(LOGFONT* initial, DWORD flags, CDC*, CWnd* parent) {
+    m_cf.hwndOwner = parent ? parent->m_hWnd : nullptr;
+    m_cf.Flags = flags | (initial ? CF_INITTOLOGFONTSTRUCT : 0);
+    if (initial) {
+        m_lf = *initial;
+    }
+    m_cf.lpLogFont = &m_lf;
+}
+
+INT_PTR CFontDialog::DoModal() {
+    if (!ensureGui()) {
+        return IDCANCEL;
+    }
+    ToolkitDialog<QFontDialog> dialog(m_cf.hwndOwner, TVX_IDS_FONT);
+    dialog.setOption(QFontDialog::MonospacedFonts, (m_cf.Flags & CF_FIXEDPITCHONLY) != 0);
+    const bool isGiven = (m_cf.Flags & CF_INITTOLOGFONTSTRUCT) != 0 && m_cf.lpLogFont;
+    QFont first = controlFont(isGiven ? *m_cf.lpLogFont : pointFont(80, ""));
+    // The dialog offers sizes in points.
+    first.setPointSizeF(std::round(QFontInfo(first).pixelSize() / pixelsOfPoint));
+    dialog.setCurrentFont(first);
+    if (!dialog.ask()) {
+        return IDCANCEL;
+    }
+    const QFont chosen = dialog.currentFont();
+    m_lf = describe(chosen);
+    m_cf.iPointSize = static_cast<int>(std::lround(QFontInfo(chosen).pointSizeF() * 10));
+    if (m_cf.lpLogFont) {
+        *m_cf.lpLogFont = m_lf;
+    }
+    return IDOK;
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "platform/afx/core/App.h"
+#include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/OwnText.h"
+#include "platform/afx/core/detail/Window.h"
+
+#include <QDialog>
+
+namespace tvx::afx {
+
+/// One of the toolkit's dialogs on a loop of ours, so that an exception of a handler gets out of it.
+/// @tparam Base the toolkit's class, whose option DontUseNativeDialog is set: a desktop's own dialog would wait in a
+///         loop of its own
+template <class Base>
+class ToolkitDialog : public Base {
+public:
+    /// @param owner the window that it stands over; null: the main window
+    /// @param title string resource of the caption
+    ToolkitDialog(HWND owner, UINT title) : Base(parentFor(owner)) {
+        this->setOption(Base::DontUseNativeDialog);
+        this->setWindowModality(Qt::ApplicationModal);
+        this->setWindowTitle(ownText(title));
+    }
+    /// Shows it and answers whether the user chose OK.
+    bool ask() {
+        guarded([this] { this->show(); });
+        const int answer = m_loop.run();
+        guarded([this] { this->hide(); });
+        return answer == QDialog::Accepted;
+    }
+    void done(int result) override {
+        storing([&] { m_loop.end(result); });
+    }
+
+private:
+    static QWidget* parentFor(HWND owner) {
+        const CWnd* main = AfxGetMainWnd();
+        Window* over = Window::from(owner || !main ? owner : main->m_hWnd);
+        return over ? over->topLevel()->widget() : nullptr;
+    }
+    ModalLoop m_loop;
+};
+
+} // namespace tvx::afx

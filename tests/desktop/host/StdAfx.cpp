@@ -1,0 +1,3 @@
+// stdafx.cpp : source file that includes just the standard includes
+
+#include "stdafx.h"
