@@ -9,7 +9,6 @@
 #include "platform/base/Types.h"
 
 #include <algorithm>
-#include <cctype>
 #include <cerrno>
 #include <concepts>
 #include <cstdarg>
@@ -27,50 +26,34 @@ using std::min;
 /// @{
 template <class Left, class Right>
     requires(std::is_arithmetic_v<Left> && std::is_arithmetic_v<Right> && !std::same_as<Left, Right>)
-constexpr auto min(Left left, Right right) {
-    using Common = std::common_type_t<Left, Right>;
-    return std::min(static_cast<Common>(left), static_cast<Common>(right));
+constexpr std::common_type_t<Left, Right> min(Left left, Right right) {
+    return std::min<std::common_type_t<Left, Right>>(left, right);
 }
 template <class Left, class Right>
     requires(std::is_arithmetic_v<Left> && std::is_arithmetic_v<Right> && !std::same_as<Left, Right>)
-constexpr auto max(Left left, Right right) {
-    using Common = std::common_type_t<Left, Right>;
-    return std::max(static_cast<Common>(left), static_cast<Common>(right));
+constexpr std::common_type_t<Left, Right> max(Left left, Right right) {
+    return std::max<std::common_type_t<Left, Right>>(left, right);
 }
 /// @}
-#define __min(left, right) min(left, right)
-#define __max(left, right) max(left, right)
 
 // Types
 #define VOID void
 #define CONST const
-#define __int8 char
-#define __int16 short
-#define __int32 int
 #define __int64 long long
 using UCHAR = unsigned char;
-using BOOLEAN = BYTE;
-using FLOAT = float;
 using PVOID = void*;
-using PSTR = char*;
-using PCSTR = const char*;
 using PBYTE = BYTE*;
-using PWORD = WORD*;
-using PDWORD = DWORD*;
-using LPWORD = WORD*;
-using LPINT = int*;
-using LPLONG = LONG*;
-using LPBOOL = BOOL*;
-using LPHANDLE = HANDLE*;
 using errno_t = int;
 
 /// A moment in units of 100 nanoseconds since 1601. Nothing here tells or takes one.
 struct FILETIME {
+    /// The halves of the number.
     DWORD dwLowDateTime;
     DWORD dwHighDateTime;
 };
 /// A moment in parts. Nothing here tells or takes one.
 struct SYSTEMTIME {
+    /// Months begin with 1, days of the week with 0 for Sunday.
     WORD wYear;
     WORD wMonth;
     WORD wDayOfWeek;
@@ -87,10 +70,8 @@ struct SYSTEMTIME {
 #define __cdecl
 #define _cdecl
 #define __stdcall
-#define _stdcall
 #define __fastcall
 #define __declspec(what)
-#define __forceinline inline
 
 // Sizes of buffers for names of files and their parts
 #define _MAX_PATH MAX_PATH
@@ -118,9 +99,7 @@ constexpr int MulDiv(int number, int numerator, int denominator) {
 
 // Memory
 #define ZeroMemory(target, size) std::memset((target), 0, (size))
-#define FillMemory(target, size, byte) std::memset((target), (byte), (size))
 #define CopyMemory(target, source, size) std::memcpy((target), (source), (size))
-#define MoveMemory(target, source, size) std::memmove((target), (source), (size))
 
 /// Texts without regard to case, letter by letter in UTF-8.
 /// @{
@@ -145,13 +124,11 @@ inline char* strlwr(char* text) {
 /// @}
 #define strcmpi stricmp
 #define _stricmp stricmp
-#define _strcmpi stricmp
 #define _strnicmp strnicmp
 #define _strupr strupr
 #define _strlwr strlwr
 #define _strdup strdup
 #define _snprintf std::snprintf
-#define _vsnprintf std::vsnprintf
 #define _atoi64 std::atoll
 
 /// Writes a number in a base of 2 to 36; only the base 10 knows a sign. Room for 33 characters is enough.
@@ -169,7 +146,6 @@ inline char* itoa(int number, char* buffer, int base) {
 }
 #define _itoa itoa
 #define ltoa(number, buffer, base) itoa(static_cast<int>(number), buffer, base)
-#define _ltoa ltoa
 
 /// Copies or appends at most `count` bytes of a text when all of them and a zero have room in a buffer of `size` bytes.
 /// @return 0; ERANGE when there is too little room: the buffer is empty then
@@ -201,18 +177,8 @@ errno_t strcat_s(char (&buffer)[Size], const char* text) {
     return strcat_s(buffer, Size, text);
 }
 /// @}
-/// What printf makes of a format, cut to the buffer.
+/// What printf makes of a format, cut to a buffer of 1024 bytes.
 /// @return bytes written, the zero not counted
-/// @{
-inline int sprintf_s(char* buffer, std::size_t size, const char* format, ...) __attribute__((format(printf, 3, 4)));
-inline int sprintf_s(char* buffer, std::size_t size, const char* format, ...) {
-    std::va_list arguments;
-    va_start(arguments, format);
-    const std::string text = tvx::text::formatV(format, arguments);
-    va_end(arguments);
-    return static_cast<int>(tvx::text::copyCut(text, buffer, size));
-}
-/// Into a buffer of 1024 bytes at least.
 inline int wsprintf(char* buffer, const char* format, ...) __attribute__((format(printf, 2, 3)));
 inline int wsprintf(char* buffer, const char* format, ...) {
     std::va_list arguments;
@@ -221,8 +187,7 @@ inline int wsprintf(char* buffer, const char* format, ...) {
     va_end(arguments);
     return static_cast<int>(tvx::text::copyCut(text, buffer, 1024));
 }
-/// @}
-#define wsprintfA wsprintf
+#define sprintf_s std::snprintf
 
 // Texts by the names of the system
 #define lstrlen(text) static_cast<int>(std::strlen(text))
@@ -247,17 +212,12 @@ inline int wsprintf(char* buffer, const char* format, ...) {
 #define _tcstol std::strtol
 #define _tcstod std::strtod
 #define _tcsdup strdup
-#define _tcsupr strupr
 #define _tcslwr strlwr
 #define _tcscpy_s strcpy_s
 #define _tcscat_s strcat_s
+#define _tcsupr strupr
 #define _stprintf std::sprintf
+#define _stprintf_s std::snprintf
 #define _sntprintf std::snprintf
-#define _stprintf_s sprintf_s
-#define _vsntprintf std::vsnprintf
 #define _ttoi std::atoi
 #define _ttol std::atol
-#define _itot itoa
-#define _tfopen std::fopen
-#define _istdigit std::isdigit
-#define _istspace std::isspace

@@ -1,7 +1,9 @@
 #include "tools/includes/Forwarder.h"
 
 #include <exception>
+#include <functional>
 #include <iostream>
+#include <map>
 
 namespace {
 
@@ -15,28 +17,19 @@ Makes files for included headers that are named in another case than the file's,
 )";
 
 /// Reads the command line; answers whether it was complete.
-bool readOptions(int count, char** words, includes::Options& options) {
-    for (int i = 1; i < count; ++i) {
-        const std::string word = words[i];
-        if (!word.starts_with("-")) {
-            options.sources.emplace_back(word);
-            continue;
-        }
-        if (++i == count) {
-            return false;
-        }
-        if (word == "-I") {
-            options.folders.emplace_back(words[i]);
-        } else if (word == "--system") {
-            options.systems.emplace_back(words[i]);
-        } else if (word == "--output") {
-            options.output = words[i];
-        } else if (word == "--stamp") {
-            options.stamp = words[i];
-        } else if (word == "--depfile") {
-            options.dependencies = words[i];
-        } else {
-            return false;
+bool readOptions(const std::vector<std::string>& words, includes::Options& options) {
+    const std::map<std::string, std::function<void(const std::string&)>> switches = {
+        {"-I", [&](const std::string& value) { options.folders.emplace_back(value); }},
+        {"--system", [&](const std::string& value) { options.systems.emplace_back(value); }},
+        {"--output", [&](const std::string& value) { options.output = value; }},
+        {"--stamp", [&](const std::string& value) { options.stamp = value; }},
+        {"--depfile", [&](const std::string& value) { options.dependencies = value; }}};
+    for (std::size_t i = 0; i < words.size(); ++i) {
+        const auto found = switches.find(words[i]);
+        if (found == switches.end()) {
+            options.sources.emplace_back(words[i]);
+        } else if (++i < words.size()) {
+            found->second(words[i]);
         }
     }
     return !options.sources.empty() && !options.output.empty() && !options.stamp.empty();
@@ -46,7 +39,7 @@ bool readOptions(int count, char** words, includes::Options& options) {
 
 int main(int argc, char** argv) {
     includes::Options options;
-    if (!readOptions(argc, argv, options)) {
+    if (!readOptions({argv + 1, argv + argc}, options)) {
         std::cerr << usage;
         return 2;
     }
@@ -57,6 +50,6 @@ int main(int argc, char** argv) {
         return 0;
     } catch (const std::exception& error) {
         std::cerr << "tvx-includes: " << error.what() << "\n";
+        return 1;
     }
-    return 1;
 }

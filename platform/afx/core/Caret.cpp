@@ -67,10 +67,15 @@ QPointer<Caret>& caret() {
     return current;
 }
 
-/// The caret if it is that window's (null: any), else null.
-Caret* caretOf(HWND window) {
+/// Does something with the caret if it is that window's (null: any), else answers FALSE.
+template <class Call>
+BOOL withCaret(HWND window, Call&& call) {
     Caret* current = caret();
-    return current && (!window || current->window() == window) ? current : nullptr;
+    if (!current || (window && current->window() != window)) {
+        return FALSE;
+    }
+    guarded([&] { call(*current); });
+    return TRUE;
 }
 
 QPoint clientOrigin(HWND handle) {
@@ -100,50 +105,28 @@ BOOL CreateCaret(HWND handle, HBITMAP bitmap, int width, int height) {
 }
 
 BOOL DestroyCaret() {
-    const bool existed = !caret().isNull();
-    guarded([] { delete caret(); });
-    return existed;
+    return withCaret(nullptr, [](const Caret& current) { delete &current; });
 }
 
 BOOL SetCaretPos(int x, int y) {
-    Caret* current = caretOf(nullptr);
-    guarded([&] {
-        if (current) {
-            current->move(clientOrigin(current->window()) + QPoint(x, y));
-            current->begin();
-        }
+    return withCaret(nullptr, [&](Caret& current) {
+        current.move(clientOrigin(current.window()) + QPoint(x, y));
+        current.begin();
     });
-    return current != nullptr;
 }
 
 BOOL GetCaretPos(POINT* point) {
-    const Caret* current = caretOf(nullptr);
-    *point = current ? CPoint(current->x(), current->y()) : CPoint();
-    if (current) {
-        const QPoint origin = clientOrigin(current->window());
-        *point = CPoint(*point) - CSize(origin.x(), origin.y());
-    }
-    return current != nullptr;
+    *point = {};
+    return withCaret(nullptr,
+                     [&](const Caret& current) { *point = fromQt(current.pos() - clientOrigin(current.window())); });
 }
 
 BOOL ShowCaret(HWND window) {
-    Caret* current = caretOf(window);
-    guarded([&] {
-        if (current) {
-            current->count(-1);
-        }
-    });
-    return current != nullptr;
+    return withCaret(window, [](Caret& current) { current.count(-1); });
 }
 
 BOOL HideCaret(HWND window) {
-    Caret* current = caretOf(window);
-    guarded([&] {
-        if (current) {
-            current->count(1);
-        }
-    });
-    return current != nullptr;
+    return withCaret(window, [](Caret& current) { current.count(1); });
 }
 
 void CWnd::CreateCaret(CBitmap* bitmap) {

@@ -93,7 +93,6 @@ public:
     /// Draws a page. The base calls OnDraw.
     virtual void OnPrint(CDC* dc, CPrintInfo* info);
     virtual void OnEndPrinting(CDC* dc, CPrintInfo* info) {}
-    virtual void OnEndPrintPreview(CDC* dc, CPrintInfo* info, POINT point, class CPreviewView* view) {}
     /// @}
 
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;

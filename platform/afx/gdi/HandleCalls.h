@@ -2,249 +2,138 @@
 
 /// @file
 /// The drawing calls by handle: each is the CDC member of its name for the context that a handle stands for, and
-/// answers what that answers, for a handle that is no context what the member answers without one.
+/// answers what that answers; for a handle that is no context, what the member answers without one.
 
 #include "platform/afx/gdi/Dc.h"
 
-#include <utility>
-
 namespace tvx::afx {
 
-/// Calls a member through the object of a context, or through one that holds nothing.
-template <class Call>
-auto through(HDC dc, Call&& call) {
-    CDC none;
-    CDC* context = CDC::FromHandle(dc);
-    return std::forward<Call>(call)(context ? *context : none);
-}
+/// The object of a context, or one that holds nothing.
+class HandleDc {
+public:
+    explicit HandleDc(HDC dc) : m_context(CDC::FromHandle(dc)) {}
+    CDC* operator->() {
+        return m_context ? m_context : &m_none;
+    }
+    /// What a call answers whose member has no result, or one that is not asked for.
+    BOOL isThere() const {
+        return m_context != nullptr;
+    }
+    /// The same, when `value` has been stored where `before` points, unless that is null.
+    template <class Value>
+    BOOL store(const Value& value, Value* before) const {
+        if (before) {
+            *before = value;
+        }
+        return isThere();
+    }
+
+private:
+    CDC m_none;
+    CDC* m_context;
+};
 
 } // namespace tvx::afx
 
-/// Drawing, modes, mapping and clipping. The calls whose name ends in "Ex" store the value before where the last
-/// argument points, if it is not null.
+// A call that hands its arguments on: result, name, parameters behind the context, arguments.
+#define TVX_BY_HANDLE(result, name, parameters, ...)                                                                   \
+    inline result name(HDC dc TVX_PARAMETERS parameters) {                                                             \
+        return tvx::afx::HandleDc(dc)->name(__VA_ARGS__);                                                              \
+    }
+#define TVX_PARAMETERS(...) __VA_OPT__(, ) __VA_ARGS__
+
+/// Drawing
 /// @{
+TVX_BY_HANDLE(BOOL, LineTo, (int x, int y), x, y)
+TVX_BY_HANDLE(BOOL, Polyline, (const POINT* points, int count), points, count)
+TVX_BY_HANDLE(BOOL, Polygon, (const POINT* points, int count), points, count)
+TVX_BY_HANDLE(BOOL, Rectangle, (int left, int top, int right, int bottom), left, top, right, bottom)
+TVX_BY_HANDLE(BOOL, RoundRect, (int left, int top, int right, int bottom, int cx, int cy), left, top, right, bottom, cx,
+              cy)
+TVX_BY_HANDLE(BOOL, Ellipse, (int left, int top, int right, int bottom), left, top, right, bottom)
+TVX_BY_HANDLE(BOOL, Arc, (int left, int top, int right, int bottom, int x1, int y1, int x2, int y2), left, top, right,
+              bottom, x1, y1, x2, y2)
+TVX_BY_HANDLE(BOOL, Pie, (int left, int top, int right, int bottom, int x1, int y1, int x2, int y2), left, top, right,
+              bottom, x1, y1, x2, y2)
+TVX_BY_HANDLE(BOOL, DrawEdge, (RECT * rect, UINT edge, UINT flags), rect, edge, flags)
+TVX_BY_HANDLE(BOOL, DrawIcon, (int x, int y, HICON icon), x, y, icon)
+TVX_BY_HANDLE(BOOL, PatBlt, (int x, int y, int width, int height, DWORD rop), x, y, width, height, rop)
+TVX_BY_HANDLE(BOOL, StretchBlt,
+              (int x, int y, int width, int height, HDC source, int sourceX, int sourceY, int sourceWidth,
+               int sourceHeight, DWORD rop),
+              x, y, width, height, CDC::FromHandle(source), sourceX, sourceY, sourceWidth, sourceHeight, rop)
+TVX_BY_HANDLE(BOOL, TextOut, (int x, int y, LPCSTR text, int count), x, y, text, count)
+TVX_BY_HANDLE(BOOL, ExtTextOut,
+              (int x, int y, UINT options, const RECT* rect, LPCSTR text, UINT count, const int* advances), x, y,
+              options, rect, text, count, advances)
+TVX_BY_HANDLE(int, DrawText, (LPCSTR text, int count, RECT* rect, UINT format), text, count, rect, format)
 inline BOOL MoveToEx(HDC dc, int x, int y, POINT* before) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        const CPoint old = c.MoveTo(x, y);
-        if (before) {
-            *before = old;
-        }
-        return c.m_hDC ? TRUE : FALSE;
-    });
+    tvx::afx::HandleDc context(dc);
+    return context.store<POINT>(context->MoveTo(x, y), before);
 }
-inline BOOL LineTo(HDC dc, int x, int y) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.LineTo(x, y); });
-}
-inline BOOL Polyline(HDC dc, const POINT* points, int count) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Polyline(points, count); });
-}
-inline BOOL Polygon(HDC dc, const POINT* points, int count) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Polygon(points, count); });
-}
-inline BOOL Rectangle(HDC dc, int left, int top, int right, int bottom) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Rectangle(left, top, right, bottom); });
-}
-inline BOOL RoundRect(HDC dc, int left, int top, int right, int bottom, int cornerWidth, int cornerHeight) {
-    return tvx::afx::through(dc,
-                             [&](CDC& c) { return c.RoundRect(left, top, right, bottom, cornerWidth, cornerHeight); });
-}
-inline BOOL Ellipse(HDC dc, int left, int top, int right, int bottom) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Ellipse(left, top, right, bottom); });
-}
-inline BOOL Arc(HDC dc, int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Arc(left, top, right, bottom, startX, startY, endX, endY); });
-}
-inline BOOL Pie(HDC dc, int left, int top, int right, int bottom, int startX, int startY, int endX, int endY) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.Pie(left, top, right, bottom, startX, startY, endX, endY); });
-}
-inline int FrameRect(HDC dc, const RECT* rect, HBRUSH brush) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        c.FrameRect(rect, CBrush::FromHandle(brush));
-        return c.m_hDC ? 1 : 0;
-    });
+inline BOOL FrameRect(HDC dc, const RECT* rect, HBRUSH brush) {
+    tvx::afx::HandleDc context(dc);
+    context->FrameRect(rect, CBrush::FromHandle(brush));
+    return context.isThere();
 }
 inline BOOL InvertRect(HDC dc, const RECT* rect) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        c.InvertRect(rect);
-        return c.m_hDC ? TRUE : FALSE;
-    });
+    tvx::afx::HandleDc context(dc);
+    context->InvertRect(rect);
+    return context.isThere();
 }
 inline BOOL DrawFocusRect(HDC dc, const RECT* rect) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        c.DrawFocusRect(rect);
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL DrawEdge(HDC dc, RECT* rect, UINT edge, UINT flags) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.DrawEdge(rect, edge, flags); });
-}
-inline BOOL DrawIcon(HDC dc, int x, int y, HICON icon) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.DrawIcon(x, y, icon); });
-}
-inline BOOL PatBlt(HDC dc, int x, int y, int width, int height, DWORD rop) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.PatBlt(x, y, width, height, rop); });
-}
-inline BOOL StretchBlt(HDC dc, int x, int y, int width, int height, HDC source, int sourceX, int sourceY,
-                       int sourceWidth, int sourceHeight, DWORD rop) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        return c.StretchBlt(x, y, width, height, CDC::FromHandle(source), sourceX, sourceY, sourceWidth, sourceHeight,
-                            rop);
-    });
-}
-inline BOOL TextOut(HDC dc, int x, int y, LPCSTR text, int count) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.TextOut(x, y, text, count); });
-}
-inline BOOL ExtTextOut(HDC dc, int x, int y, UINT options, const RECT* rect, LPCSTR text, UINT count,
-                       const int* advances) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.ExtTextOut(x, y, options, rect, text, count, advances); });
-}
-inline int DrawText(HDC dc, LPCSTR text, int count, RECT* rect, UINT format) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.DrawText(text, count, rect, format); });
-}
-inline COLORREF SetTextColor(HDC dc, COLORREF color) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetTextColor(color); });
-}
-inline COLORREF SetBkColor(HDC dc, COLORREF color) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetBkColor(color); });
-}
-inline int SetBkMode(HDC dc, int mode) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetBkMode(mode); });
-}
-inline int SetROP2(HDC dc, int mode) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetROP2(mode); });
-}
-inline int SetMapMode(HDC dc, int mode) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetMapMode(mode); });
-}
-inline int SetStretchBltMode(HDC dc, int mode) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetStretchBltMode(mode); });
-}
-inline UINT SetTextAlign(HDC dc, UINT flags) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SetTextAlign(flags); });
-}
-inline COLORREF GetTextColor(HDC dc) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.GetTextColor(); });
-}
-inline COLORREF GetBkColor(HDC dc) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.GetBkColor(); });
-}
-inline BOOL SetViewportOrgEx(HDC dc, int x, int y, POINT* before) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        const POINT old = c.SetViewportOrg(x, y);
-        if (before) {
-            *before = old;
-        }
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL SetWindowOrgEx(HDC dc, int x, int y, POINT* before) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        const POINT old = c.SetWindowOrg(x, y);
-        if (before) {
-            *before = old;
-        }
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL SetViewportExtEx(HDC dc, int cx, int cy, SIZE* before) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        const SIZE old = c.SetViewportExt(cx, cy);
-        if (before) {
-            *before = old;
-        }
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL SetWindowExtEx(HDC dc, int cx, int cy, SIZE* before) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        const SIZE old = c.SetWindowExt(cx, cy);
-        if (before) {
-            *before = old;
-        }
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL LPtoDP(HDC dc, POINT* points, int count) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        c.LPtoDP(points, count);
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline BOOL DPtoLP(HDC dc, POINT* points, int count) {
-    return tvx::afx::through(dc, [&](CDC& c) {
-        c.DPtoLP(points, count);
-        return c.m_hDC ? TRUE : FALSE;
-    });
-}
-inline int SaveDC(HDC dc) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SaveDC(); });
-}
-inline BOOL RestoreDC(HDC dc, int saved) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.RestoreDC(saved); });
-}
-inline int SelectClipRgn(HDC dc, HRGN region) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.SelectClipRgn(CRgn::FromHandle(region)); });
-}
-inline int IntersectClipRect(HDC dc, int left, int top, int right, int bottom) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.IntersectClipRect(left, top, right, bottom); });
-}
-inline int ExcludeClipRect(HDC dc, int left, int top, int right, int bottom) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.ExcludeClipRect(left, top, right, bottom); });
-}
-inline int GetClipBox(HDC dc, RECT* rect) {
-    return tvx::afx::through(dc, [&](CDC& c) { return c.GetClipBox(rect); });
+    tvx::afx::HandleDc context(dc);
+    context->DrawFocusRect(rect);
+    return context.isThere();
 }
 /// @}
 
-/// Tools by handle. Who creates one deletes it with DeleteObject; null on failure.
+/// State of the context
+/// @{
+TVX_BY_HANDLE(int, SaveDC, ())
+TVX_BY_HANDLE(BOOL, RestoreDC, (int saved), saved)
+TVX_BY_HANDLE(COLORREF, SetTextColor, (COLORREF color), color)
+TVX_BY_HANDLE(COLORREF, GetTextColor, ())
+TVX_BY_HANDLE(COLORREF, SetBkColor, (COLORREF color), color)
+TVX_BY_HANDLE(COLORREF, GetBkColor, ())
+TVX_BY_HANDLE(int, SetBkMode, (int mode), mode)
+TVX_BY_HANDLE(int, SetROP2, (int mode), mode)
+TVX_BY_HANDLE(int, SetStretchBltMode, (int mode), mode)
+TVX_BY_HANDLE(UINT, SetTextAlign, (UINT flags), flags)
+TVX_BY_HANDLE(int, SetMapMode, (int mode), mode)
+TVX_BY_HANDLE(int, SelectClipRgn, (HRGN region), CRgn::FromHandle(region))
+TVX_BY_HANDLE(int, IntersectClipRect, (int left, int top, int right, int bottom), left, top, right, bottom)
+TVX_BY_HANDLE(int, ExcludeClipRect, (int left, int top, int right, int bottom), left, top, right, bottom)
+TVX_BY_HANDLE(int, GetClipBox, (RECT * rect), rect)
+inline BOOL SetViewportOrgEx(HDC dc, int x, int y, POINT* before) {
+    tvx::afx::HandleDc context(dc);
+    return context.store<POINT>(context->SetViewportOrg(x, y), before);
+}
+inline BOOL SetWindowOrgEx(HDC dc, int x, int y, POINT* before) {
+    tvx::afx::HandleDc context(dc);
+    return context.store<POINT>(context->SetWindowOrg(x, y), before);
+}
+inline BOOL SetViewportExtEx(HDC dc, int cx, int cy, SIZE* before) {
+    tvx::afx::HandleDc context(dc);
+    return context.store<SIZE>(context->SetViewportExt(cx, cy), before);
+}
+inline BOOL SetWindowExtEx(HDC dc, int cx, int cy, SIZE* before) {
+    tvx::afx::HandleDc context(dc);
+    return context.store<SIZE>(context->SetWindowExt(cx, cy), before);
+}
+/// @}
+
+/// Tools by handle; null on failure. Who creates one deletes it with DeleteObject.
 /// @{
 inline HBRUSH CreateHatchBrush(int hatch, COLORREF color) {
-    CBrush tool;
-    tool.CreateHatchBrush(hatch, color);
-    return static_cast<HBRUSH>(tool.Detach());
-}
-inline HBRUSH CreateBrushIndirect(const LOGBRUSH* description) {
-    CBrush tool;
-    tool.CreateBrushIndirect(description);
-    return static_cast<HBRUSH>(tool.Detach());
+    return static_cast<HBRUSH>(CBrush(hatch, color).Detach());
 }
 inline HBRUSH CreatePatternBrush(HBITMAP bitmap) {
-    CBrush tool;
-    tool.CreatePatternBrush(CBitmap::FromHandle(bitmap));
-    return static_cast<HBRUSH>(tool.Detach());
-}
-inline HPEN CreatePenIndirect(const LOGPEN* description) {
-    CPen tool;
-    tool.CreatePenIndirect(description);
-    return static_cast<HPEN>(tool.Detach());
+    return static_cast<HBRUSH>(CBrush(CBitmap::FromHandle(bitmap)).Detach());
 }
 inline HRGN CreateRectRgn(int left, int top, int right, int bottom) {
-    CRgn tool;
-    tool.CreateRectRgn(left, top, right, bottom);
-    return static_cast<HRGN>(tool.Detach());
-}
-inline HRGN CreateRectRgnIndirect(const RECT* rect) {
-    CRgn tool;
-    tool.CreateRectRgnIndirect(rect);
-    return static_cast<HRGN>(tool.Detach());
-}
-inline HRGN CreateEllipticRgn(int left, int top, int right, int bottom) {
-    CRgn tool;
-    tool.CreateEllipticRgn(left, top, right, bottom);
-    return static_cast<HRGN>(tool.Detach());
-}
-inline HRGN CreatePolygonRgn(const POINT* points, int count, int mode) {
-    CRgn tool;
-    tool.CreatePolygonRgn(points, count, mode);
-    return static_cast<HRGN>(tool.Detach());
-}
-/// Combines two regions into `target`, which must exist; the result is its kind.
-inline int CombineRgn(HRGN target, HRGN first, HRGN second, int mode) {
-    CRgn* region = CRgn::FromHandle(target);
-    return region ? region->CombineRgn(CRgn::FromHandle(first), CRgn::FromHandle(second), mode) : ERROR;
-}
-inline BOOL PtInRegion(HRGN region, int x, int y) {
-    const CRgn* area = CRgn::FromHandle(region);
-    return area && area->PtInRegion(x, y);
+    CRgn region;
+    region.CreateRectRgn(left, top, right, bottom);
+    return static_cast<HRGN>(region.Detach());
 }
 /// @}

@@ -22,17 +22,11 @@ BEGIN_MESSAGE_MAP(CLedgerApp, CWinApp)
     ON_COMMAND(ID_FILE_OPEN, CWinApp::OnFileOpen)
 END_MESSAGE_MAP()
 
-CLedgerApp::CLedgerApp()
-{
-}
-
 CLedgerApp theApp;
 
 BOOL CLedgerApp::InitInstance()
 {
-    INITCOMMONCONTROLSEX controls;
-    controls.dwSize = sizeof(controls);
-    controls.dwICC = ICC_WIN95_CLASSES;
+    INITCOMMONCONTROLSEX controls = { sizeof(controls), ICC_WIN95_CLASSES };
     InitCommonControlsEx(&controls);
     InitCommonControls();
     if (!AfxOleInit())
@@ -56,7 +50,6 @@ BOOL CLedgerApp::InitInstance()
         RUNTIME_CLASS(CMainFrame),       // main SDI frame window
         RUNTIME_CLASS(CLedgerView));
     AddDocTemplate(pDocTemplate);
-
     EnableShellOpen();
     RegisterShellFileTypes(TRUE);
 
@@ -64,7 +57,6 @@ BOOL CLedgerApp::InitInstance()
     ParseCommandLine(cmdInfo);
     if (!ProcessShellCommand(cmdInfo))
         return FALSE;
-
     m_pMainWnd->ShowWindow(SW_SHOW);
     m_pMainWnd->UpdateWindow();
     m_pMainWnd->DragAcceptFiles();
@@ -74,47 +66,22 @@ BOOL CLedgerApp::InitInstance()
 class CAboutDlg : public CDialog
 {
 public:
-    CAboutDlg();
+    CAboutDlg() : CDialog(CAboutDlg::IDD) {}
 
-    //{{AFX_DATA(CAboutDlg)
     enum { IDD = IDD_ABOUTBOX };
-    //}}AFX_DATA
-
-    //{{AFX_VIRTUAL(CAboutDlg)
-    protected:
-    virtual void DoDataExchange(CDataExchange* pDX);    // DDX/DDV support
-    //}}AFX_VIRTUAL
 
 protected:
     //{{AFX_MSG(CAboutDlg)
-    afx_msg HCURSOR OnQueryDragIcon();
+    afx_msg HCURSOR OnQueryDragIcon() { return CDialog::OnQueryDragIcon(); }
     //}}AFX_MSG
     DECLARE_MESSAGE_MAP()
 };
-
-CAboutDlg::CAboutDlg() : CDialog(CAboutDlg::IDD)
-{
-    //{{AFX_DATA_INIT(CAboutDlg)
-    //}}AFX_DATA_INIT
-}
-
-void CAboutDlg::DoDataExchange(CDataExchange* pDX)
-{
-    CDialog::DoDataExchange(pDX);
-    //{{AFX_DATA_MAP(CAboutDlg)
-    //}}AFX_DATA_MAP
-}
 
 BEGIN_MESSAGE_MAP(CAboutDlg, CDialog)
     //{{AFX_MSG_MAP(CAboutDlg)
     ON_WM_QUERYDRAGICON()
     //}}AFX_MSG_MAP
 END_MESSAGE_MAP()
-
-HCURSOR CAboutDlg::OnQueryDragIcon()
-{
-    return CDialog::OnQueryDragIcon();
-}
 
 void CLedgerApp::OnAppAbout()
 {

@@ -1,32 +1,13 @@
 // LedgerDoc.cpp : implementation of the CLedgerDoc class
 
 #include "stdafx.h"
-#include "Ledger.h"
-
 #include "ledgerdoc.h"
 
 IMPLEMENT_DYNCREATE(CLedgerDoc, CDocument)
 
-CLedgerDoc::CLedgerDoc()
-{
-}
-
-CLedgerDoc::~CLedgerDoc()
-{
-}
-
-BOOL CLedgerDoc::OnNewDocument()
-{
-    if (!CDocument::OnNewDocument())
-        return FALSE;
-    m_strText.Empty();
-    return TRUE;
-}
-
 void CLedgerDoc::AddLine(LPCTSTR lpszLine)
 {
-    m_strText += lpszLine;
-    m_strText += _T("\n");
+    m_strText = m_strText + lpszLine + _T("\n");
     SetModifiedFlag();
     UpdateAllViews(NULL);
 }

@@ -5,7 +5,6 @@
 
 #include "LedgerDoc.h"
 #include "ledgerview.h"
-#include "names.h"
 #include "Parts\options.h"
 
 const UINT WM_ADDLINE = ::RegisterWindowMessage(_T("Ledger.AddLine"));
@@ -40,15 +39,6 @@ CLedgerView::CLedgerView()
     m_bRuled = FALSE;
 }
 
-CLedgerView::~CLedgerView()
-{
-}
-
-BOOL CLedgerView::PreCreateWindow(CREATESTRUCT& cs)
-{
-    return CView::PreCreateWindow(cs);
-}
-
 void CLedgerView::OnDraw(CDC* pDC)
 {
     CLedgerDoc* pDoc = GetDocument();
@@ -79,7 +69,6 @@ void CLedgerView::OnDraw(CDC* pDC)
     ::DeleteObject(hFont);
 }
 
-/////////////////////////////////////////////////////////////////////////////
 // CLedgerView printing
 
 BOOL CLedgerView::OnPreparePrinting(CPrintInfo* pInfo)
@@ -106,12 +95,6 @@ void CLedgerView::OnEndPrinting(CDC* /*pDC*/, CPrintInfo* /*pInfo*/)
 {
 }
 
-void CLedgerView::OnEndPrintPreview(CDC* pDC, CPrintInfo* pInfo, POINT point, CPreviewView* pView)
-{
-    CView::OnEndPrintPreview(pDC, pInfo, point, pView);
-}
-
-/////////////////////////////////////////////////////////////////////////////
 // CLedgerView message handlers
 
 void CLedgerView::PlaceCaret()

@@ -1,41 +1,30 @@
 // LedgerView.h : interface of the CLedgerView class
 
-#if !defined(AFX_LEDGERVIEW_H__4C1D7B2B_INCLUDED_)
-#define AFX_LEDGERVIEW_H__4C1D7B2B_INCLUDED_
-
 class CLedgerView : public CView
 {
 protected: // create from serialization only
     CLedgerView();
     DECLARE_DYNCREATE(CLedgerView)
 
-// Attributes
 public:
-    CLedgerDoc* GetDocument();
+    CLedgerDoc* GetDocument() { return (CLedgerDoc*)m_pDocument; }
     LOGFONT     m_logFont;
     COLORREF    m_crText;
     BOOL        m_bRuled;
     CString     m_strTyped;     // the line that has no end yet
 
-// Operations
     void PlaceCaret();
     int  LineHeight() { return -MulDiv(m_logFont.lfHeight, 3, 2); }
 
     //{{AFX_VIRTUAL(CLedgerView)
-    public:
     virtual void OnDraw(CDC* pDC);  // overridden to draw this view
-    virtual BOOL PreCreateWindow(CREATESTRUCT& cs);
     protected:
     virtual BOOL OnPreparePrinting(CPrintInfo* pInfo);
     virtual void OnBeginPrinting(CDC* pDC, CPrintInfo* pInfo);
     virtual void OnPrint(CDC* pDC, CPrintInfo* pInfo);
     virtual void OnEndPrinting(CDC* pDC, CPrintInfo* pInfo);
-    virtual void OnEndPrintPreview(CDC* pDC, CPrintInfo* pInfo, POINT point, CPreviewView* pView);
     //}}AFX_VIRTUAL
 
-    virtual ~CLedgerView();
-
-protected:
     //{{AFX_MSG(CLedgerView)
     afx_msg void OnChar(UINT nChar, UINT nRepCnt, UINT nFlags);
     afx_msg void OnSetFocus(CWnd* pOldWnd);
@@ -51,9 +40,5 @@ protected:
     DECLARE_MESSAGE_MAP()
 };
 
-#ifndef _DEBUG  // debug version in LedgerView.cpp
-inline CLedgerDoc* CLedgerView::GetDocument()
-   { return (CLedgerDoc*)m_pDocument; }
-#endif
-
-#endif // !defined(AFX_LEDGERVIEW_H__4C1D7B2B_INCLUDED_)
+// In Names.cpp: calls what old sources call, and tells what is not as it should be.
+void TellNames(CLedgerView& view, CStringArray& lines);

@@ -5,12 +5,6 @@
 
 #include "MainFrm.h"
 
-#ifdef _DEBUG
-#define new DEBUG_NEW
-#undef THIS_FILE
-static char THIS_FILE[] = __FILE__;
-#endif
-
 IMPLEMENT_DYNCREATE(CMainFrame, CFrameWnd)
 
 BEGIN_MESSAGE_MAP(CMainFrame, CFrameWnd)
@@ -28,19 +22,10 @@ static UINT indicators[] =
     ID_INDICATOR_NUM,
 };
 
-CMainFrame::CMainFrame()
-{
-}
-
-CMainFrame::~CMainFrame()
-{
-}
-
 int CMainFrame::OnCreate(LPCREATESTRUCT lpCreateStruct)
 {
     if (CFrameWnd::OnCreate(lpCreateStruct) == -1)
         return -1;
-
     if (!m_wndToolBar.CreateEx(this, TBSTYLE_FLAT, WS_CHILD | WS_VISIBLE | CBRS_TOP
         | CBRS_GRIPPER | CBRS_TOOLTIPS | CBRS_FLYBY | CBRS_SIZE_DYNAMIC) ||
         !m_wndToolBar.LoadToolBar(IDR_MAINFRAME))
@@ -51,11 +36,7 @@ int CMainFrame::OnCreate(LPCREATESTRUCT lpCreateStruct)
     if (!m_wndStatusBar.Create(this) ||
         !m_wndStatusBar.SetIndicators(indicators,
           sizeof(indicators)/sizeof(UINT)))
-    {
-        TRACE0("Failed to create status bar\n");
         return -1;      // fail to create
-    }
-
     m_wndToolBar.EnableDocking(CBRS_ALIGN_ANY);
     EnableDocking(CBRS_ALIGN_ANY);
     DockControlBar(&m_wndToolBar);
@@ -64,11 +45,9 @@ int CMainFrame::OnCreate(LPCREATESTRUCT lpCreateStruct)
 
 BOOL CMainFrame::PreCreateWindow(CREATESTRUCT& cs)
 {
-    if (!CFrameWnd::PreCreateWindow(cs))
-        return FALSE;
     cs.cx = min(640, GetSystemMetrics(SM_CXSCREEN));
     cs.cy = min(cs.cx * 3L / 4, (LONG)480);
-    return TRUE;
+    return CFrameWnd::PreCreateWindow(cs);
 }
 
 void CMainFrame::OnWindowPosChanging(WINDOWPOS FAR* lpwndpos)
@@ -82,15 +61,3 @@ void CMainFrame::OnWindowPosChanged(WINDOWPOS FAR* lpwndpos)
     CFrameWnd::OnWindowPosChanged(lpwndpos);
     lpwndpos->flags |= SWP_NOMOVE;
 }
-
-#ifdef _DEBUG
-void CMainFrame::AssertValid() const
-{
-    CFrameWnd::AssertValid();
-}
-
-void CMainFrame::Dump(CDumpContext& dc) const
-{
-    CFrameWnd::Dump(dc);
-}
-#endif //_DEBUG

@@ -2,8 +2,9 @@
 
 #include "stdafx.h"
 #include "mainfrm.h"
-#include "Names.h"
-#include "resource.h"
+#include "ledgerdoc.h"
+#include "ledgerview.h"
+#include "RESOURCE.H"
 
 static void Tell(CStringArray& lines, LPCTSTR lpszName, BOOL bRight)
 {
@@ -49,11 +50,9 @@ static void TellDrawing(CStringArray& lines)
     HGDIOBJ hOldBitmap = ::SelectObject(hDC, hBitmap);
     BOOL bRight = ::PatBlt(hDC, 0, 0, 100, 100, WHITENESS);
     HBRUSH hBrush = ::CreateHatchBrush(HS_CROSS, RGB(255, 0, 0));
-    LOGBRUSH lb = { BS_SOLID, RGB(0, 0, 255), 0 };
-    HBRUSH hSolid = ::CreateBrushIndirect(&lb);
+    HBRUSH hSolid = ::CreateSolidBrush(RGB(0, 0, 255));
     HBRUSH hPattern = ::CreatePatternBrush(hBitmap);
-    LOGPEN lp = { PS_SOLID, { 1, 0 }, RGB(255, 0, 0) };
-    HPEN hPen = ::CreatePenIndirect(&lp);
+    HPEN hPen = ::CreatePen(PS_SOLID, 1, RGB(255, 0, 0));
     bRight = bRight && hBrush && hPattern;
     int nSaved = ::SaveDC(hDC);
     ::SelectObject(hDC, hPen);
@@ -88,25 +87,19 @@ static void TellDrawing(CStringArray& lines)
 
     POINT before;
     SIZE extent;
-    CPoint point(2, 2);
-    bRight = ::SetMapMode(hDC, MM_ANISOTROPIC) == MM_TEXT && ::SetWindowExtEx(hDC, 1, 1, NULL) &&
-        ::SetViewportExtEx(hDC, 3, 3, &extent) && ::SetViewportOrgEx(hDC, 1, 0, &before) && before.x == 0 &&
-        ::SetWindowOrgEx(hDC, 0, 0, NULL) && ::LPtoDP(hDC, &point, 1) && point == CPoint(7, 6) &&
-        ::DPtoLP(hDC, &point, 1) && point == CPoint(2, 2) && ::SetMapMode(hDC, MM_TEXT) == MM_ANISOTROPIC;
+    bRight = ::SetMapMode(hDC, MM_ANISOTROPIC) == MM_TEXT && ::SetWindowExtEx(hDC, 2, 2, NULL) &&
+        ::SetViewportExtEx(hDC, 6, 6, NULL) && ::SetViewportExtEx(hDC, 3, 3, &extent) && extent.cx == 6 &&
+        ::SetWindowOrgEx(hDC, 5, 0, NULL) && ::SetWindowOrgEx(hDC, 0, 0, &before) && before.x == 5 &&
+        ::SetViewportOrgEx(hDC, 1, 0, &before) && before.x == 0 && ::SetMapMode(hDC, MM_TEXT) == MM_ANISOTROPIC;
     HRGN hRgn = ::CreateRectRgn(0, 0, 50, 50);
-    HRGN hRound = ::CreateEllipticRgn(0, 0, 50, 50);
-    HRGN hPolygon = ::CreatePolygonRgn(points, 3, WINDING);
-    HRGN hOther = ::CreateRectRgnIndirect(rect);
-    bRight = bRight && hPolygon && hOther && ::CombineRgn(hRgn, hRgn, hRound, RGN_AND) == COMPLEXREGION &&
-        ::PtInRegion(hRgn, 25, 25) && !::PtInRegion(hRgn, 1, 1);
     ::SetViewportOrgEx(hDC, 0, 0, NULL);
     CRect clip;
-    bRight = bRight && ::SelectClipRgn(hDC, hRgn) == COMPLEXREGION && ::SelectClipRgn(hDC, NULL) == SIMPLEREGION &&
+    bRight = bRight && ::SelectClipRgn(hDC, hRgn) == SIMPLEREGION && ::SelectClipRgn(hDC, NULL) == SIMPLEREGION &&
         ::IntersectClipRect(hDC, 0, 0, 30, 30) == SIMPLEREGION && ::ExcludeClipRect(hDC, 0, 0, 10, 30) == SIMPLEREGION &&
         ::GetClipBox(hDC, clip) == SIMPLEREGION && clip == CRect(10, 0, 30, 30) && !::LineTo(NULL, 1, 1);
     Tell(lines, "mapping and clipping", bRight);
 
-    HGDIOBJ objects[] = { hRgn, hRound, hPolygon, hOther, hFont, hPen, hBrush, hSolid, hPattern };
+    HGDIOBJ objects[] = { hRgn, hFont, hPen, hBrush, hSolid, hPattern };
     ::SelectObject(hDC, hOldBitmap);
     for (int i = 0; i < (int)ARRAYSIZE(objects); i++)
         ::DeleteObject(objects[i]);
@@ -162,12 +155,12 @@ static void TellSystem(CStringArray& lines)
     Tell(lines, "system", bRight);
 }
 
-void TellNames(CWnd& wnd, CStringArray& lines)
+void TellNames(CLedgerView& view, CStringArray& lines)
 {
     TellTexts(lines);
     TellGeometry(lines);
     TellDrawing(lines);
-    TellWindows(wnd, lines);
+    TellWindows(view, lines);
     TellSystem(lines);
-    ::MessageBox(wnd, _T("All names have been called."), _T("Names"), MB_OK);
+    ::MessageBox(view, _T("All names have been called."), _T("Names"), MB_OK);
 }

@@ -1,5 +1,4 @@
-// stdafx.h : include file for standard system include files, or project
-//  specific include files that are used frequently, but are changed infrequently
+// stdafx.h : include file for standard system include files
 
 #if !defined(AFX_STDAFX_H__4C1D7B21_INCLUDED_)
 #define AFX_STDAFX_H__4C1D7B21_INCLUDED_
@@ -12,11 +11,9 @@
 
 #include <AfxWin.h>         // core and standard components
 #include <afxext.h>         // extensions
-#include <afxdisp.h>        // automation classes
-#include <afxdtctl.h>       // controls of dates and times
-#ifndef _AFX_NO_AFXCMN_SUPPORT
+#include <afxdisp.h>
+#include <afxdtctl.h>
 #include <afxcmn.h>         // common controls
-#endif // _AFX_NO_AFXCMN_SUPPORT
 #include <afxdlgs.h>
 #include <afxcview.h>
 #include <afxmt.h>
@@ -28,7 +25,5 @@
 #include <shlobj.h>
 #include <MMSystem.h>
 #include <TChar.h>
-
-//{{AFX_INSERT_LOCATION}}
 
 #endif // !defined(AFX_STDAFX_H__4C1D7B21_INCLUDED_)

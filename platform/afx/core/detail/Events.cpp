@@ -450,6 +450,16 @@ void watchKeys(const QEvent& event) {
     }
     const auto& key = static_cast<const QKeyEvent&>(event);
     const bool down = event.type() == QEvent::KeyPress;
+    // The toolkit drops the release of a key whose press opened a modal dialog when it comes before that has the
+    // keyboard; later keys tell that a modifier is up.
+    const bool isModifier = key.key() >= Qt::Key_Shift && key.key() <= Qt::Key_Alt;
+    for (const auto& [flag, modifier] :
+         {std::pair(Qt::ShiftModifier, VK_SHIFT), std::pair(Qt::ControlModifier, VK_CONTROL),
+          std::pair(Qt::AltModifier, VK_MENU)}) {
+        if (!isModifier && !key.modifiers().testFlag(flag)) {
+            noteKey(modifier, false);
+        }
+    }
     if (down || !key.isAutoRepeat()) {
         noteKey(virtualKey(key), down);
     }

@@ -1,8 +1,5 @@
 // Options.h : the dialog of the options
 
-#if !defined(AFX_OPTIONS_H__4C1D7B31_INCLUDED_)
-#define AFX_OPTIONS_H__4C1D7B31_INCLUDED_
-
 #include "..\Resource.h"
 
 class COptions : public CDialog
@@ -17,17 +14,12 @@ public:
     int         m_nCurrency;
     //}}AFX_DATA
 
-    //{{AFX_VIRTUAL(COptions)
-    protected:
-    virtual void DoDataExchange(CDataExchange* pDX);    // DDX/DDV support
-    //}}AFX_VIRTUAL
-
 protected:
+    virtual void DoDataExchange(CDataExchange* pDX);    // DDX/DDV support
+
     //{{AFX_MSG(COptions)
     virtual BOOL OnInitDialog();
     afx_msg void OnSelendokCurrency();
     //}}AFX_MSG
     DECLARE_MESSAGE_MAP()
 };
-
-#endif // !defined(AFX_OPTIONS_H__4C1D7B31_INCLUDED_)

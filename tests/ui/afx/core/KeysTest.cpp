@@ -30,4 +30,18 @@ TEST(Keys, AreFollowedWhileAMenuHasTheKeyboard) {
     frame.DestroyWindow();
 }
 
+// The Ctrl of a command is released before the command's dialog has the keyboard: the toolkit drops that release.
+TEST(Keys, TellThatAModifierIsUp) {
+    CWnd frame;
+    ASSERT_TRUE(frame.CreateEx(0, AfxRegisterWndClass(0), "frame", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 200, 100,
+                               nullptr, nullptr));
+    QWidget* widget = tvx::afx::peerOf(frame.m_hWnd);
+    QTest::keyPress(widget, Qt::Key_Control, Qt::ControlModifier);
+    QTest::keyPress(widget, Qt::Key_P, Qt::ControlModifier);
+    EXPECT_TRUE(tvx::afx::isKeyDown(VK_CONTROL));
+    QTest::keyPress(widget, Qt::Key_F8);
+    EXPECT_FALSE(tvx::afx::isKeyDown(VK_CONTROL));
+    frame.DestroyWindow();
+}
+
 } // namespace

@@ -188,6 +188,39 @@ TEST_F(Wnd, RepaintsWhatIsAskedForAndNothingWhileItIsNotTo) {
     EXPECT_EQ(view.painted, (std::vector<CRect>{CRect(0, 0, 100, 80)}));
 }
 
+TEST_F(Wnd, TheCaretIsSeenWhileItIsShown) {
+    const auto isMarked = [&](int x, int y) {
+        const QImage picture = tvx::afx::peerOf(frame.m_hWnd)->grab().toImage();
+        return picture.pixelColor(x, y) == QPalette().color(QPalette::WindowText);
+    };
+    EXPECT_FALSE(ShowCaret(frame)) << "there is none";
+    frame.CreateGrayCaret(3, 12);
+    CWnd::SetCaretPos(CPoint(20, 30));
+    EXPECT_EQ(CWnd::GetCaretPos(), CPoint(20, 30));
+    EXPECT_FALSE(isMarked(21, 35));
+    frame.ShowCaret();
+    EXPECT_TRUE(isMarked(20, 30) && isMarked(22, 41));
+    EXPECT_FALSE(isMarked(23, 30) || isMarked(20, 42));
+    frame.HideCaret();
+    frame.HideCaret();
+    frame.ShowCaret();
+    EXPECT_FALSE(isMarked(21, 35)) << "hidden twice";
+    frame.ShowCaret();
+    EXPECT_TRUE(isMarked(21, 35));
+
+    CBitmap bitmap;
+    ASSERT_TRUE(bitmap.CreateBitmap(8, 4, 1, 1, nullptr));
+    frame.CreateCaret(&bitmap);
+    frame.ShowCaret();
+    EXPECT_TRUE(isMarked(7, 3));
+    EXPECT_FALSE(isMarked(8, 3) || isMarked(21, 35)) << "there is one caret";
+    EXPECT_FALSE(HideCaret(GetDesktopWindow())) << "it is another window's";
+    EXPECT_TRUE(DestroyCaret());
+    EXPECT_FALSE(DestroyCaret());
+    EXPECT_FALSE(isMarked(7, 3));
+    frame.DestroyWindow();
+}
+
 TEST_F(Wnd, ButtonsAreMarkedAndReachedByGroup) {
     const struct {
         int id;
