@@ -189,29 +189,32 @@ TEST_F(Wnd, RepaintsWhatIsAskedForAndNothingWhileItIsNotTo) {
 }
 
 TEST_F(Wnd, TheCaretIsSeenWhileItIsShown) {
+    CWnd sheet;
+    ASSERT_TRUE(sheet.Create(AfxRegisterWndClass(0, nullptr, static_cast<HBRUSH>(GetStockObject(WHITE_BRUSH))), "",
+                             WS_VISIBLE, CRect(100, 0, 200, 80), &frame, 2));
     const auto isMarked = [&](int x, int y) {
-        const QImage picture = tvx::afx::peerOf(frame.m_hWnd)->grab().toImage();
+        const QImage picture = tvx::afx::peerOf(sheet.m_hWnd)->grab().toImage();
         return picture.pixelColor(x, y) == QPalette().color(QPalette::WindowText);
     };
     EXPECT_FALSE(ShowCaret(frame)) << "there is none";
-    frame.CreateGrayCaret(3, 12);
+    sheet.CreateGrayCaret(3, 12);
     CWnd::SetCaretPos(CPoint(20, 30));
     EXPECT_EQ(CWnd::GetCaretPos(), CPoint(20, 30));
     EXPECT_FALSE(isMarked(21, 35));
-    frame.ShowCaret();
+    sheet.ShowCaret();
     EXPECT_TRUE(isMarked(20, 30) && isMarked(22, 41));
     EXPECT_FALSE(isMarked(23, 30) || isMarked(20, 42));
-    frame.HideCaret();
-    frame.HideCaret();
-    frame.ShowCaret();
+    sheet.HideCaret();
+    sheet.HideCaret();
+    sheet.ShowCaret();
     EXPECT_FALSE(isMarked(21, 35)) << "hidden twice";
-    frame.ShowCaret();
+    sheet.ShowCaret();
     EXPECT_TRUE(isMarked(21, 35));
 
     CBitmap bitmap;
     ASSERT_TRUE(bitmap.CreateBitmap(8, 4, 1, 1, nullptr));
-    frame.CreateCaret(&bitmap);
-    frame.ShowCaret();
+    sheet.CreateCaret(&bitmap);
+    sheet.ShowCaret();
     EXPECT_TRUE(isMarked(7, 3));
     EXPECT_FALSE(isMarked(8, 3) || isMarked(21, 35)) << "there is one caret";
     EXPECT_FALSE(HideCaret(GetDesktopWindow())) << "it is another window's";
