@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Installs what this project needs from Debian 12's own packages, and only what is missing.
 #
-#   scripts/setup.sh GROUP...     groups: build, display, tour, test, bench, check, fuzz, coverage
+#   scripts/setup.sh GROUP...     groups: build, wayland, display, tour, test, bench, check, fuzz, coverage
 #
 # Runs as root or through sudo, and never asks. Installs nothing where nothing is missing.
 # TVX_SKIP_SETUP=1 skips it, for systems with other package names.
@@ -20,6 +20,7 @@ build    libsqlite3-dev   the settings store
 build    libxcb1-dev      talks to the window manager
 build    libxcb-ewmh-dev  raises windows of other processes
 build    llvm             llvm-rc compiles resource scripts
+wayland  qt6-wayland      the toolkit's plug-in for Wayland sessions
 display  xvfb             a display where there is none
 display  openbox          the window manager on that display
 display  fonts-dejavu-core  the font that tests and pictures are laid out with

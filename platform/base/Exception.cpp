@@ -1,6 +1,7 @@
 #include "platform/base/Exception.h"
 
 #include "platform/base/StringSource.h"
+#include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
 
 #include <algorithm>
@@ -134,7 +135,7 @@ LPCSTR archiveCauseText(int cause) {
 
 CString withFileName(LPCSTR format, const CString& fileName) {
     CString text(format);
-    text.Replace("%1", fileName.IsEmpty() ? "An unnamed file" : fileName.GetString());
+    text.Replace("%1", fileName.IsEmpty() ? "An unnamed file" : tvx::shownName(fileName.GetString()).c_str());
     return text;
 }
 

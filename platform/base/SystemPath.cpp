@@ -228,6 +228,10 @@ std::string driveName(std::string_view path) {
     return name;
 }
 
+std::string shownName(std::string_view name) {
+    return systemPath(name).value_or(std::string(name));
+}
+
 std::string currentFolderName() {
     return driveName(currentFolder());
 }

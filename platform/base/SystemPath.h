@@ -57,6 +57,10 @@ enum class PathUse {
 /// lies on no drive, or that holds a backslash, cannot be written so and stays as it is.
 [[nodiscard]] TVX_PLATFORM_API std::string driveName(std::string_view path);
 
+/// A name as messages show it: in the system's form, so that it can be pasted into a file dialog or a shell. A name
+/// whose drive or share is unknown stays as it is.
+[[nodiscard]] TVX_PLATFORM_API std::string shownName(std::string_view name);
+
 /// The current folder in the framework's form, such as "C:\work", and in the system's where it lies on no drive. Empty
 /// when it has been removed.
 [[nodiscard]] TVX_PLATFORM_API std::string currentFolderName();

@@ -86,6 +86,7 @@ std::string summary(const OptionSpec& spec) {
     for (const OptionRule& rule : spec.options) {
         addEntry(text, withValue(rule) + std::string(remark(rule)), rule.help);
     }
+    addEntry(text, "-f <file> ...", spec.commandFileHelp);
     return wrapped(text);
 }
 

@@ -18,4 +18,8 @@ struct KeyLocks {
 /// The lock keys as the lights of the X display's keyboard show them; none is on where no display answers.
 [[nodiscard]] TVX_PLATFORM_API KeyLocks keyLocks();
 
+/// The same of the Wayland compositor that the environment names (`WAYLAND_DISPLAY`, or `WAYLAND_SOCKET` for a process
+/// that was given its connection).
+[[nodiscard]] TVX_PLATFORM_API bool canOpenWaylandDisplay();
+
 } // namespace tvx

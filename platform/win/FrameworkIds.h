@@ -234,9 +234,12 @@
 #define TVX_IDS_FILE_SAVE 0xF324
 #define TVX_IDS_FILE_CANCEL 0xF325
 #define TVX_IDS_TOOL_BAR 0xF326
+#define TVX_IDS_FILE_SAVE_IN 0xF327
 #define TVX_IDS_NO_PRINTER 0xF330
 #define TVX_IDS_COLOR 0xF331
 #define TVX_IDS_FONT 0xF332
+#define TVX_IDS_IS_FOLDER 0xF333
+#define TVX_IDS_IS_PIPE 0xF334
 
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721

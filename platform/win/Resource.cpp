@@ -5,6 +5,8 @@
 #include "platform/win/detail/ByteReader.h"
 #include "platform/win/detail/ModuleTable.h"
 
+#include <tuple>
+
 namespace {
 
 using tvx::detail::ModuleTable;
@@ -112,6 +114,23 @@ namespace tvx {
 ResourceBytes resourceBytes(HMODULE module, LPCSTR name, LPCSTR type) {
     const ResourceEntry* entry = findEntry(module, type, name, std::nullopt);
     return entry ? entry->data : ResourceBytes();
+}
+
+std::string firstResource(HMODULE module, LPCSTR type) {
+    const std::string wanted = detail::resourceKey(type);
+    // Numbers are written as "#128": they come behind names, and a shorter one is a lower one.
+    const auto place = [](const std::string& name) {
+        return std::tuple(name.starts_with('#'), name.starts_with('#') ? name.size() : 0, name);
+    };
+    std::string first;
+    for (const ResourceIndex* index : ModuleTable::instance().indexes(module)) {
+        for (const ResourceEntry& entry : index->entries()) {
+            if (entry.type == wanted && (first.empty() || place(entry.name) < place(first))) {
+                first = entry.name;
+            }
+        }
+    }
+    return first;
 }
 
 std::optional<std::string> resourceString(HMODULE module, UINT id) {

@@ -81,6 +81,10 @@ namespace tvx {
 /// The data of a resource of one module, empty when it has none of that name. Sets the last error as `FindResourceA`.
 [[nodiscard]] TVX_PLATFORM_API ResourceBytes resourceBytes(HMODULE module, LPCSTR name, LPCSTR type);
 
+/// The name of the module's first resource of a type, as FindResourceA takes it: of named ones the first in the order
+/// of the alphabet, else that of the lowest number ("#128"). Empty when the module has none.
+[[nodiscard]] TVX_PLATFORM_API std::string firstResource(HMODULE module, LPCSTR type);
+
 /// A string of one module's string table in UTF-8, nothing when it has none (an empty one counts as none).
 [[nodiscard]] TVX_PLATFORM_API std::optional<std::string> resourceString(HMODULE module, UINT id);
 

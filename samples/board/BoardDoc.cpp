@@ -1,7 +1,7 @@
 #include "BoardDoc.h"
 
 #include "Resource.h"
-#include "s/FileName.h"
+#include "platform/base/SystemPath.h"
 #include "s/Msg.h"
 
 #include <string>
@@ -10,12 +10,6 @@
 namespace {
 
 constexpr ULONGLONG largestFile = 64 * 1024 * 1024;
-
-/// A drawing's name as messages show it: they stay readable however deep the drawing lies.
-CString shown(LPCSTR path) {
-    constexpr int room = 80;
-    return Gui_FileName(path).GetAbbreviatedName(room, TRUE);
-}
 
 /// A word of a damaged file, which may be anything, cut to what a message has room for.
 CString shown(std::string word) {
@@ -87,7 +81,7 @@ BOOL CBoardDoc::OnOpenDocument(LPCSTR path) {
         if (length > largestFile) {
             ReleaseFile(file, TRUE);
             CString message;
-            message.Format(IDS_TOO_LARGE, shown(path).GetString());
+            message.Format(IDS_TOO_LARGE, tvx::shownName(path).c_str());
             AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
             return FALSE;
         }
@@ -107,7 +101,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     board::ReadResult result = board::readDrawing(text);
     if (!result.ok()) {
         CString message;
-        message.Format(IDS_DAMAGED, shown(path).GetString(), result.line, sentence(result).GetString());
+        message.Format(IDS_DAMAGED, tvx::shownName(path).c_str(), result.line, sentence(result).GetString());
         AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
         return FALSE;
     }

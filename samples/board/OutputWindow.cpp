@@ -1,6 +1,7 @@
 #include "OutputWindow.h"
 
 #include "platform/win/Error.h"
+#include "s/Edit.h"
 #include "s/Msg.h"
 
 namespace {
@@ -9,7 +10,7 @@ namespace {
 constexpr UINT outputMessage = WM_APP + 1;
 
 /// More than anybody reads, and little enough to be laid out at once.
-constexpr UINT mostText = 200000;
+constexpr int mostText = 200000;
 
 /// What a program reports that was stopped, as if by the interrupt keys.
 constexpr unsigned long stopped = 0xC000013A;
@@ -68,7 +69,7 @@ BOOL COutputWindow::OnInitDialog() {
     CRect client;
     GetClientRect(&client);
     m_size = client.Size();
-    m_output.SetLimitText(mostText);
+    m_output.SetLimitText(2 * mostText); // room for what comes before old lines go
     showState();
     m_process.NotifyWindow(m_hWnd, outputMessage);
     return TRUE;
@@ -76,9 +77,22 @@ BOOL COutputWindow::OnInitDialog() {
 
 LRESULT COutputWindow::OnOutput(WPARAM, LPARAM) {
     m_process.AppendOutput(m_output, nullptr);
+    dropOldLines();
     showState();
     m_process.NotifyWindow(m_hWnd, outputMessage);
     return 0;
+}
+
+// Whole lines go, so that the first one shown is no rest of one. The library drops what exceeds a limit, and keeps what
+// the user looks at or has selected.
+void COutputWindow::dropOldLines() {
+    const int excess = m_output.GetWindowTextLength() - mostText;
+    const int kept = excess > 0 ? m_output.LineIndex(m_output.LineFromChar(excess) + 1) : -1;
+    if (kept > 0) {
+        m_output.SetLimitText(static_cast<UINT>(m_output.GetWindowTextLength() - kept));
+        Gui_Edit::AppendText(m_output, "");
+        m_output.SetLimitText(2 * mostText);
+    }
 }
 
 void COutputWindow::showState() {

@@ -2,7 +2,6 @@
 
 #include "Resource.h"
 #include "afxwin.h"
-#include "s/Edit.h"
 #include "s/Process.h"
 
 /// Runs a program and shows what it writes, as it comes. Each run has a window of its own, which can be stopped and
@@ -24,11 +23,12 @@ protected:
 
 private:
     COutputWindow() = default;
+    void dropOldLines();
     void showState();
     void place(CWnd& control, int moveX, int moveY, int growX, int growY);
 
     Gui_Process m_process;
-    Gui_Edit m_output;
+    CEdit m_output;
     CStatic m_state;
     CButton m_stop;
     CSize m_size; ///< of the client area, as the controls are laid out now

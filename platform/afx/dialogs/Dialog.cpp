@@ -141,7 +141,7 @@ BOOL CDialog::Create(LPCSTR templateName, CWnd* parent) {
     }
     m_pParentWnd = parent ? parent : AfxGetMainWnd();
     if (!ensureGui()) {
-        std::fputs("There is no display to show a dialog on: set DISPLAY.\n", stderr);
+        tellMissingDisplay();
         return FALSE;
     }
     const auto description = loadTemplate(templateName);
@@ -249,7 +249,7 @@ BOOL CDialog::OnInitDialog() {
 
 int CDialog::DoModal() {
     if (!ensureGui()) {
-        std::fputs("There is no display to show a dialog on: set DISPLAY.\n", stderr);
+        tellMissingDisplay();
         return -1;
     }
     const auto description = loadTemplate(m_lpszTemplateName);

@@ -12,6 +12,10 @@
 
 #include <QFileDialog>
 #include <QFileInfo>
+#include <QHeaderView>
+#include <QPushButton>
+#include <QScreen>
+#include <QTreeView>
 
 #include <cstring>
 
@@ -72,6 +76,7 @@ public:
         // A desktop's own dialog would wait in a loop of its own, and close without asking the host.
         setOption(QFileDialog::DontUseNativeDialog);
         setWindowModality(Qt::ApplicationModal);
+        showColumnsWhole();
     }
     std::function<bool()> isAccepted;
 
@@ -90,13 +95,34 @@ public:
         });
     }
 
+    /// Pictures on the buttons come and go with the desktop's style; no other dialog of the framework has them.
+    void clearButtons() {
+        for (auto* button : findChildren<QPushButton*>()) {
+            button->setIcon(QIcon());
+        }
+    }
+
 private:
+    /// The columns behind the name are as wide as what they show, and the name takes the rest.
+    void showColumnsWhole() {
+        auto* list = findChild<QTreeView*>(QStringLiteral("treeView"));
+        if (!list) {
+            return;
+        }
+        QHeaderView* header = list->header();
+        header->setStretchLastSection(false);
+        header->setSectionResizeMode(QHeaderView::ResizeToContents);
+        header->setSectionResizeMode(0, QHeaderView::Stretch);
+        const QSize room = screen()->availableGeometry().size() * 9 / 10;
+        resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(110, 70)).boundedTo(room));
+    }
+
     ModalLoop m_loop;
 };
 
 void labelDialog(Dialog& dialog, bool open) {
     dialog.setWindowTitle(ownText(open ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE));
-    dialog.setLabelText(QFileDialog::LookIn, ownText(TVX_IDS_FILE_LOOK_IN));
+    dialog.setLabelText(QFileDialog::LookIn, ownText(open ? TVX_IDS_FILE_LOOK_IN : TVX_IDS_FILE_SAVE_IN));
     dialog.setLabelText(QFileDialog::FileName, ownText(TVX_IDS_FILE_NAME));
     dialog.setLabelText(QFileDialog::FileType, ownText(TVX_IDS_FILE_TYPE));
     dialog.setLabelText(QFileDialog::Accept, ownText(open ? TVX_IDS_FILE_OPEN : TVX_IDS_FILE_SAVE));
@@ -111,6 +137,7 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
                        : several           ? QFileDialog::ExistingFiles
                                            : QFileDialog::ExistingFile);
     labelDialog(dialog, open);
+    dialog.clearButtons();
     dialog.setOption(QFileDialog::DontConfirmOverwrite, (record.Flags & OFN_OVERWRITEPROMPT) == 0);
     if (record.lpstrTitle) {
         dialog.setWindowTitle(toQt(record.lpstrTitle));

@@ -10,11 +10,14 @@
 #include "platform/win/RegistryNotice.h"
 
 #include <QApplication>
+#include <QClipboard>
+#include <QGridLayout>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QMessageBox>
 #include <QPointer>
 #include <QPushButton>
+#include <QRegularExpression>
 #include <QScreen>
 
 #include <algorithm>
@@ -79,6 +82,18 @@ QMessageBox::Icon iconOf(UINT type) {
     }
 }
 
+/// A text that can be broken within words that are wider than a line, as names of deep files are: behind separators.
+QString breakable(QString text, const QFontMetrics& metrics, int width) {
+    static const QRegularExpression word(QStringLiteral("\\S+"));
+    for (QRegularExpressionMatchIterator words = word.globalMatch(text); words.hasNext();) {
+        const QString wide = words.next().captured();
+        if (metrics.horizontalAdvance(wide) > width) {
+            text.replace(wide, QString(wide).replace(QLatin1Char('/'), QStringLiteral("/\u200B")));
+        }
+    }
+    return text;
+}
+
 /// A box whose buttons end our own loop. The toolkit's own exec would let no exception out.
 class Box : public QMessageBox {
 public:
@@ -87,12 +102,14 @@ public:
     int ask(const char* text, const char* caption) {
         setWindowTitle(toQt(caption));
         setTextFormat(Qt::PlainText);
-        setText(toQt(text));
-        makeRoom();
+        setTextInteractionFlags(Qt::TextSelectableByMouse);
+        m_text = toQt(text);
+        setText(m_text);
         setIcon(iconOf(m_type));
         for (const BoxButton& button : buttonsOf(m_type)) {
             addButton(button);
         }
+        layOut();
         setWindowModality(Qt::ApplicationModal);
         const QPointer<QWidget> before = QApplication::activeWindow();
         guarded([this] {
@@ -124,28 +141,57 @@ protected:
             finish(escapeAnswer(m_type));
             return;
         }
+        if (event->matches(QKeySequence::Copy)) {
+            QApplication::clipboard()->setText(m_text);
+            return;
+        }
         QMessageBox::keyPressEvent(event);
     }
 
 private:
-    /// The toolkit breaks lines at 500 pixels; texts that come with line ends of their own keep theirs. A short text
-    /// leaves room for the caption.
-    void makeRoom() {
+    void layOut() {
         auto* label = findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
-        if (!label) {
+        auto* grid = qobject_cast<QGridLayout*>(layout());
+        if (!label || !grid) {
             return;
         }
+        makeRoom(*label);
+        label->setAlignment(Qt::AlignTop | Qt::AlignLeft);
+        if (icon() != NoIcon) {
+            // A short text stands in the middle of the icon's height; the toolkit would put it higher or lower.
+            const qreal rest = iconPixmap().deviceIndependentSize().height() - label->sizeHint().height();
+            label->setContentsMargins(2, static_cast<int>(std::max(rest / 2, 0.0)), 0, 0);
+            return;
+        }
+        label->setIndent(0);
+        for (int i = 0; i < grid->count(); ++i) {
+            if (QSpacerItem* gap = grid->itemAt(i)->spacerItem()) { // where the icon would be
+                gap->changeSize(0, 0, QSizePolicy::Fixed, QSizePolicy::Fixed);
+            }
+        }
+        grid->setHorizontalSpacing(0);
+        grid->invalidate();
+    }
+
+    /// The toolkit breaks lines at 500 pixels; texts that come with line ends of their own keep theirs. A short text
+    /// leaves room for the caption.
+    void makeRoom(QLabel& label) {
         constexpr int captionButtons = 110;
-        const QFontMetrics metrics = label->fontMetrics();
+        constexpr int besideText = 100; // icon and margins
+        const QFontMetrics metrics = label.fontMetrics();
         const int caption = metrics.horizontalAdvance(windowTitle()) + captionButtons;
-        int width = caption > label->sizeHint().width() ? caption : 0;
+        // The toolkit makes no box wider than this, and cuts what does not fit.
+        const int available = screen()->availableGeometry().width();
+        const int most = (available <= 1024 ? available * 3 / 5 : std::min(available - 480, 1000)) - besideText;
+        int width = caption > label.sizeHint().width() ? caption : 0;
         if (text().contains(QLatin1Char('\n'))) {
-            const int lines = metrics.size(0, text()).width() + 2 * label->margin() + 2;
-            width = std::max(width, std::min(lines, screen()->availableGeometry().width() * 3 / 5));
+            const int lines = metrics.size(0, text()).width() + 2 * label.margin() + 2;
+            width = std::max(width, std::min(lines, most));
         }
         if (width > 0) {
-            label->setMinimumWidth(width);
+            label.setMinimumWidth(width);
         }
+        label.setText(breakable(text(), metrics, most));
     }
 
     void addButton(const BoxButton& entry) {
@@ -165,6 +211,7 @@ private:
     }
 
     UINT m_type;
+    QString m_text; ///< As it was given; what is shown may have been made breakable.
     ModalLoop m_loop;
 };
 
@@ -211,7 +258,12 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
     const std::string error = !caption ? fromQt(ownText(TVX_IDS_ERROR)) : std::string();
     caption = caption ? caption : error.c_str();
     if (!ensureGui()) {
-        std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
+        const UINT icon = type & MB_ICONMASK;
+        if (icon == 0 || icon == MB_ICONINFORMATION) { // what was asked for, as a summary of the command line is
+            std::printf("%s\n", shown(text).c_str());
+        } else {
+            std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
+        }
         return defaultOf(type).answer;
     }
     Box box(visibleOwner(owner), type);

@@ -5,6 +5,9 @@
 #include "platform/afx/dialogs/FileDialog.h"
 #include "platform/afx/frames/DocTemplate.h"
 #include "platform/afx/frames/View.h"
+#include "platform/base/SystemPath.h"
+
+#include <cerrno>
 
 using namespace tvx::afx;
 
@@ -225,6 +228,12 @@ void CDocument::OnCloseDocument() {
 namespace {
 
 UINT messageOf(const CFileException& error, BOOL saving) {
+    if (error.m_lOsError == EISDIR) {
+        return TVX_IDS_IS_FOLDER;
+    }
+    if (error.m_lOsError == ESPIPE) {
+        return TVX_IDS_IS_PIPE;
+    }
     switch (error.m_cause) {
     case CFileException::fileNotFound:
     case CFileException::badPath:
@@ -257,14 +266,15 @@ void CDocument::ReportSaveLoadException(LPCSTR path, CException* error, BOOL sav
         return; // the user knows already
     }
     const UINT id = error ? messageOf(*error, saving) : 0;
+    const std::string name = tvx::shownName(path ? path : "");
     CString text;
     char description[512] = "";
     if (id != 0) {
-        AfxFormatString1(text, id, path);
+        AfxFormatString1(text, id, name.c_str());
     } else if (error && error->GetErrorMessage(description, sizeof(description))) {
         text = description;
     } else {
-        AfxFormatString1(text, fallback, path);
+        AfxFormatString1(text, fallback, name.c_str());
     }
     AfxMessageBox(text, MB_OK | MB_ICONEXCLAMATION, id != 0 ? id : fallback);
 }

@@ -114,6 +114,10 @@ private:
         if (!isName(rule.name)) {
             return refuse(quoted(rule.name) + " cannot be the name of an option");
         }
+        if (tvx::text::equalNoCase(rule.name, "f") && tvx::text::equalNoCase(kind, "text") && declaration.empty()) {
+            m_spec.commandFileHelp = help;
+            return;
+        }
         if (meansHelp(rule.name) || tvx::text::equalNoCase(rule.name, "f")) {
             return refuse(quoted(rule.name) + " has a fixed meaning on every command line");
         }

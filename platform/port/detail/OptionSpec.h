@@ -42,6 +42,7 @@ struct SpecProblem {
 struct TVX_PLATFORM_API OptionSpec {
     std::vector<OptionRule> options;
     PlainRule plain;
+    std::string commandFileHelp = "Take arguments from files."; ///< of "-f"
     std::vector<SpecProblem> problems;
 
     /// The options that @p word may mean, without regard to case: the one of exactly that name, else all whose names

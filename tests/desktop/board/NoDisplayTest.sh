@@ -25,4 +25,19 @@ expect 2 "Unknown option" -bogus
 expect 2 "missing.cmd" -f missing.cmd
 expect 1 "There is no display" "$drawing"
 expect 1 "There is no display"
+[[ $("$program" -help 2>/dev/null) == Usage:*"-f <file>"* ]] || {
+    echo "FAIL: what was asked for does not go to standard output" >&2
+    exit 1
+}
+
+# A compositor that nobody runs, then one that takes connections but that the toolkit has no plug-in for.
+export WAYLAND_DISPLAY=compositor
+expect 1 "There is no display" "$drawing"
+exec 9< <(exec perl -MIO::Socket::UNIX -e \
+    '$s = IO::Socket::UNIX->new(Local => shift, Listen => 1) or die; $| = 1; print "listens\n"; sleep 50' \
+    "$XDG_RUNTIME_DIR/$WAYLAND_DISPLAY")
+trap "kill $!" EXIT
+read -r _ <&9 || exit 1
+plugins=(/usr/lib/*/qt6/plugins/platforms/libqwayland-generic.so)
+[ -e "${plugins[0]}" ] || expect 1 "qt6-wayland" "$drawing"
 exit 0

@@ -7,7 +7,7 @@ set -euo pipefail
 . "$(dirname "$0")/../Desktop.sh"
 program=$1
 
-# Asks for a command as a user does.
+# Asks for a command as a user does: run TEXT [KEY...]
 run() {
     xdotool windowactivate --sync "$main" key --clearmodifiers alt+t
     xdotool key Return
@@ -15,7 +15,7 @@ run() {
     xdotool windowactivate --sync "$(window '^Run Command$')"
     xdotool key --clearmodifiers ctrl+a
     xdotool type --clearmodifiers "$1"
-    xdotool key Return
+    xdotool key --clearmodifiers "${@:2}" Return
     await "the question is gone" untitled "^Run Command$"
 }
 
@@ -31,6 +31,7 @@ cat >"$work/talk" <<TALK
 echo \$\$ >$work/id
 echo first line
 cat $work/gate
+echo all but what fits into a pipe is read >$work/read
 exec sleep 1000
 TALK
 chmod +x "$work/talk"
@@ -40,7 +41,14 @@ await "the window of the program appears" titled "$work/talk"
 output=$(window "$work/talk")
 await "the program runs" test -s "$work/id"
 child=$(cat "$work/id")
-seq -f 'line %g' 20000 >"$work/gate"
+seq -f 'line-%g' 30000 >"$work/gate"
+await "the output is read" test -s "$work/read"
+# The first line left of many is whole: pasted into a field of one line it names a file.
+xdotool windowactivate --sync "$output" mousemove --window "$output" 100 60 click 1 key --clearmodifiers ctrl+a ctrl+c
+run "touch $work/first-" ctrl+v
+await "old lines are dropped whole" compgen -G "$work/first-line-[1-9]*"
+xdotool windowactivate --sync "$(window '^touch')" key Escape
+await "the window of the second program closes" untitled "^touch"
 xdotool windowactivate --sync "$output"
 xdotool key --clearmodifiers alt+s
 await "Stop ends the program" ended "$child"
@@ -58,5 +66,6 @@ await "closing the window ends the program" ended "$child"
 
 run "$work/missing"
 await "a program that is missing is told" titled "^Tarvex Board$"
+xprop -id "$(window '^Tarvex Board$')" _NET_WM_ICON | grep -q 'Icon (' || fail "the box has the application's icon"
 xdotool key Return
 ! ended "$board" || fail "the board lives"

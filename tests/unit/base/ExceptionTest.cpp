@@ -91,7 +91,7 @@ TEST(Exception, DescribesFileErrorsWithTheFile) {
     } catch (CFileException* e) {
         EXPECT_EQ(CFileException::fileNotFound, e->m_cause);
         EXPECT_EQ(ENOENT, e->m_lOsError);
-        EXPECT_EQ("C:\\a.brd was not found.", messageOf(*e));
+        EXPECT_EQ("/a.brd was not found.", messageOf(*e)) << "as the user knows the file";
         e->Delete();
     }
     EXPECT_EQ(CFileException::genericException, CFileException::ErrnoToException(ENOSYS));

@@ -140,6 +140,8 @@ TEST_F(TwoDrives, NamesOfTheSystemGetTheirDrive) {
     EXPECT_EQ("a\\b", tvx::driveName("a/b"));
     EXPECT_EQ("/odd\\name", tvx::driveName("/odd\\name"));
     EXPECT_EQ("", tvx::driveName(""));
+    EXPECT_EQ(folder + "/a/b", tvx::shownName("D:\\a\\b")) << "what the user sees has no drives";
+    EXPECT_EQ("X:\\a", tvx::shownName("X:\\a")) << "nobody knows where that is";
 }
 
 TEST_F(SystemPath, RefusesNamesThatCannotBe) {

@@ -133,7 +133,7 @@ TEST(OptionSpec, MistakesAreInternalErrorsThatNameTheLine) {
              {"scale real Scale of it",
               "\"Scale\" is neither \"required\" nor \"repeatable\" (help texts begin with \":\")"},
              {"GOOD none", "option \"GOOD\" is there already"},
-             {"f text", "\"f\" has a fixed meaning on every command line"},
+             {"f none", "\"f\" has a fixed meaning on every command line"},
              {"H none", "\"H\" has a fixed meaning on every command line"},
              {"help text", "option \"help\" cannot take a value or be required"},
              {": text", "there is nothing before \":\""},
@@ -164,9 +164,12 @@ TEST(CmdOpcodes, UsageShowsEveryOptionWithItsHelp) {
                                                  "      Scale; 1 is full size.\n"
                                                  "  -layer <text>  (repeatable)\n"
                                                  "  -help\n"
-                                                 "      Show this summary.\n");
+                                                 "      Show this summary.\n"
+                                                 "  -f <file> ...\n"
+                                                 "      Take arguments from files.\n");
     EXPECT_TRUE(text.starts_with("Usage: "));
-    EXPECT_EQ(usage("help none : Mine.").find("Show this summary"), std::string::npos);
+    const std::string own = usage("help none : Mine.\nf text : My files.");
+    EXPECT_NE(own.find("  -help\n      Mine.\n  -f <file> ...\n      My files.\n"), std::string::npos) << own;
 }
 
 TEST(CmdOpcodes, UsageWrapsAtEightyColumnsUnderTheHelp) {

@@ -51,6 +51,8 @@ TEST(Resource, NamesCompareWithoutCaseAndNumbersHaveAText) {
     EXPECT_EQ(textOf(tvx::resourceBytes(nullptr, "NOTES", "text")), "plain notes\n");
     EXPECT_NE(FindResourceA(nullptr, "grid", RT_BITMAP), nullptr);
     EXPECT_EQ(FindResourceA(nullptr, "#140", "#2"), FindResourceA(nullptr, MAKEINTRESOURCE(IDB_STRIPES), RT_BITMAP));
+    EXPECT_EQ(tvx::firstResource(nullptr, RT_GROUP_ICON), "#128");
+    EXPECT_EQ(tvx::firstResource(nullptr, "nothing"), "");
 }
 
 TEST(Resource, DataIsReachedThroughItsHandle) {

@@ -3,11 +3,14 @@
 #include "platform/afx/core/detail/Connect.h"
 
 #include <QAbstractTextDocumentLayout>
+#include <QMimeData>
 #include <QPlainTextEdit>
 #include <QScrollBar>
 #include <QStyleOptionFrame>
 #include <QStylePainter>
 #include <QTextBlock>
+#include <QTextCursor>
+#include <QTextDocumentFragment>
 #include <QTextLayout>
 
 namespace tvx::afx {
@@ -18,7 +21,8 @@ Qt::ScrollBarPolicy policy(bool bar) {
     return bar ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
 }
 
-/// A field of many lines whose frame shows the keyboard as that of one line does; the toolkit's own frames do not.
+/// The toolkit's field for many lines, with two habits of its own. Its frame shows the keyboard as that of one line
+/// does. Its text is offered to others as nothing but text, so that no word processor takes fonts and colours along.
 class AreaEdit : public QPlainTextEdit {
 public:
     using QPlainTextEdit::QPlainTextEdit;
@@ -38,6 +42,11 @@ protected:
             update();
         }
         return QPlainTextEdit::event(event);
+    }
+    QMimeData* createMimeDataFromSelection() const override {
+        auto* data = new QMimeData;
+        data->setText(textCursor().selection().toPlainText());
+        return data;
     }
 };
 

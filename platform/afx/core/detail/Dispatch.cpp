@@ -7,11 +7,17 @@
 #include "platform/afx/core/detail/MessageQueue.h"
 #include "platform/afx/core/detail/Timers.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/gdi/Gdi.h"
+#include "platform/afx/gdi/detail/GdiObjects.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Text.h"
+#include "platform/win/Module.h"
+#include "platform/win/Resource.h"
 
 #include <QAbstractEventDispatcher>
 #include <QApplication>
+#include <QIcon>
+#include <QPixmap>
 #include <QThread>
 
 #include <chrono>
@@ -166,10 +172,21 @@ void runIdle() {
 
 namespace {
 
+/// Windows without an icon of their own show the application's: the first that its resources have.
+void showApplicationIcon() {
+    const HMODULE application = GetModuleHandleA(nullptr);
+    const std::string name = firstResource(application, RT_GROUP_ICON);
+    const HICON icon = name.empty() ? nullptr : LoadIconA(application, name.c_str());
+    if (icon) {
+        QApplication::setWindowIcon(QIcon(QPixmap::fromImage(iconImage(icon))));
+    }
+}
+
 void startOnGuiThread() {
     connectStoring(QAbstractEventDispatcher::instance(), &QAbstractEventDispatcher::aboutToBlock, qApp, &runIdle);
     MessageQueue::instance().moveToThread(QThread::currentThread());
     watchReleasedChildren();
+    showApplicationIcon();
 }
 
 struct HooksEntry {

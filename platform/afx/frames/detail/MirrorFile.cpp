@@ -72,6 +72,21 @@ int copyOver(const std::string& from, const std::string& to) {
     return error;
 }
 
+bool fail(CFileException* error, int number, LPCTSTR fileName) {
+    if (error) {
+        error->m_cause = CFileException::ErrnoToException(number);
+        error->m_lOsError = number;
+        error->m_strFileName = fileName;
+    }
+    return false;
+}
+
+bool isPipe(LPCTSTR fileName) {
+    struct stat status{};
+    const auto path = systemPath(fileName ? fileName : "");
+    return path && ::stat(path->c_str(), &status) == 0 && S_ISFIFO(status.st_mode);
+}
+
 } // namespace
 
 MirrorFile::~MirrorFile() {
@@ -91,6 +106,9 @@ void MirrorFile::forget() {
 
 BOOL MirrorFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
     forget();
+    if (isPipe(fileName)) {
+        return fail(error, ESPIPE, fileName) ? TRUE : FALSE;
+    }
     if ((openFlags & modeCreate) == 0 || (openFlags & modeNoTruncate) != 0) {
         return CFile::Open(fileName, openFlags, error);
     }
@@ -98,17 +116,9 @@ BOOL MirrorFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
 }
 
 bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
-    const auto fail = [&](int number) {
-        if (error) {
-            error->m_cause = CFileException::ErrnoToException(number);
-            error->m_lOsError = number;
-            error->m_strFileName = fileName;
-        }
-        return false;
-    };
     const auto named = systemPath(fileName, PathUse::Creating);
     if (!named) {
-        return fail(ENOENT);
+        return fail(error, ENOENT, fileName);
     }
     std::error_code ignored;
     const fs::path resolved = fs::weakly_canonical(*named, ignored);
@@ -119,11 +129,11 @@ bool MirrorFile::openBeside(LPCTSTR fileName, CFileException* error) {
         return CFile::Open(fileName, modeCreate | modeReadWrite, error) != FALSE; // a device or the like
     }
     if (exists && ::access(target.c_str(), W_OK) != 0) {
-        return fail(errno);
+        return fail(error, errno, fileName);
     }
     const int descriptor = makeBeside(target, exists ? &status : nullptr);
     if (descriptor < 0) {
-        return fail(errno);
+        return fail(error, errno, fileName);
     }
     m_target = target.string();
     attach(descriptor);

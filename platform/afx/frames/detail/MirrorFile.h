@@ -13,6 +13,8 @@ namespace tvx::afx {
 ///
 /// Permissions are kept. A symbolic link goes on pointing to its file; a file with several names keeps them, since then
 /// the contents are copied into it. The same happens in folders that no new file can be made in.
+///
+/// A named pipe is refused with ESPIPE: opening it would wait for somebody at its other end.
 class TVX_PLATFORM_API MirrorFile : public CFile {
 public:
     MirrorFile() = default;

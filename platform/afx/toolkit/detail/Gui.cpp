@@ -7,14 +7,17 @@
 #include "platform/win/detail/LanguageTable.h"
 
 #include <QApplication>
+#include <QDir>
+#include <QJsonArray>
+#include <QJsonObject>
 #include <QLibraryInfo>
 #include <QLocale>
+#include <QPluginLoader>
 #include <QThread>
 #include <QTranslator>
 
 #include <clocale>
 #include <cstdio>
-#include <cstdlib>
 #include <cxxabi.h>
 #include <utility>
 
@@ -50,14 +53,59 @@ public:
 
 DWORD threadOfWindows = 0;
 
-bool askDisplay() {
-    const char* plugin = std::getenv("QT_QPA_PLATFORM");
-    // Whoever chooses a plugin knows that it needs no display, or has one.
-    if (plugin && *plugin != '\0') {
-        return true;
+/// Whether the toolkit has a plug-in for a kind of display.
+bool hasPlugin(const QString& kind) {
+    QStringList folders{qEnvironmentVariable("QT_QPA_PLATFORM_PLUGIN_PATH")};
+    for (const QString& path : QCoreApplication::libraryPaths()) {
+        folders.append(path + QStringLiteral("/platforms"));
     }
-    const char* wayland = std::getenv("WAYLAND_DISPLAY");
-    return (wayland && *wayland != '\0') || canOpenDisplay();
+    for (const QString& folder : folders) {
+        for (const QFileInfo& file : QDir(folder).entryInfoList(QDir::Files)) {
+            const QJsonObject description = QPluginLoader(file.filePath()).metaData();
+            const QJsonArray kinds = description[QLatin1String("MetaData")][QLatin1String("Keys")].toArray();
+            if (kinds.contains(QJsonValue(kind))) {
+                return true;
+            }
+        }
+    }
+    return false;
+}
+
+enum class Display { Answers, Missing, NoPlugin };
+
+/// What comes of a kind of display, as QT_QPA_PLATFORM names it: "wayland", "xcb", "offscreen:size=800x600". Without
+/// plug-in or display the toolkit would end the process.
+Display ask(const QString& choice) {
+    const QString kind = choice.section(QLatin1Char(':'), 0, 0).toLower();
+    if (kind == QLatin1String("xcb")) {
+        return canOpenDisplay() ? Display::Answers : Display::Missing;
+    }
+    if (!kind.startsWith(QLatin1String("wayland"))) {
+        return Display::Answers; // the others need none
+    }
+    return !canOpenWaylandDisplay() ? Display::Missing : hasPlugin(kind) ? Display::Answers : Display::NoPlugin;
+}
+
+/// Of several kinds the toolkit takes the first that it can show windows on.
+Display askDisplay() {
+    QString chosen = qEnvironmentVariable("QT_QPA_PLATFORM");
+    if (chosen.isEmpty()) {
+        chosen = QStringLiteral("wayland;xcb");
+    }
+    Display result = Display::Missing;
+    for (const QString& choice : chosen.split(QLatin1Char(';'), Qt::SkipEmptyParts)) {
+        const Display answer = ask(choice);
+        if (answer == Display::Answers) {
+            return answer;
+        }
+        result = answer == Display::NoPlugin ? answer : result;
+    }
+    return result;
+}
+
+Display display() {
+    static const Display answer = askDisplay();
+    return answer;
 }
 
 /// The toolkit's own texts (menus of text fields, lists of files) in the user's language, where they are installed.
@@ -103,8 +151,7 @@ DWORD guiThread() {
 }
 
 bool hasDisplay() {
-    static const bool answer = askDisplay();
-    return answer;
+    return display() == Display::Answers;
 }
 
 namespace {
@@ -115,7 +162,11 @@ bool displayMissed = false;
 
 void tellMissingDisplay() {
     if (!std::exchange(displayMissed, true)) {
-        std::fputs("There is no display to show windows on: set DISPLAY to one that answers.\n", stderr);
+        std::fputs(display() == Display::NoPlugin
+                       ? "The toolkit's plug-in for this display is not installed: for Wayland it is in the package "
+                         "qt6-wayland. An X display can be named with DISPLAY instead.\n"
+                       : "There is no display to show windows on: set DISPLAY to one that answers.\n",
+                   stderr);
     }
 }
 

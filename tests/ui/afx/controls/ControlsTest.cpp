@@ -9,6 +9,7 @@
 #include <QClipboard>
 #include <QComboBox>
 #include <QLineEdit>
+#include <QMimeData>
 #include <QPlainTextEdit>
 
 namespace {
@@ -121,20 +122,23 @@ TEST_F(EditTest, ChangesCaseAndRefusesLetters) {
 }
 
 TEST_F(EditTest, ReadOnlyOnesKeepTheirText) {
-    with(ES_READONLY | ES_AUTOHSCROLL, [&] {
-        control.SetWindowText("fixed");
-        type("x");
-        key(Qt::Key_Delete);
-        EXPECT_EQ(textOf(&control), "fixed");
-        control.SetSel(0, -1);
-        key(Qt::Key_C, Qt::ControlModifier);
-        EXPECT_EQ(QApplication::clipboard()->text(), "fixed");
-        control.SetReadOnly(FALSE);
-        type("x");
-        EXPECT_EQ(textOf(&control), "x");
-        control.Undo();
-        EXPECT_EQ(textOf(&control), "fixed");
-    });
+    for (const DWORD lines : {DWORD{0}, DWORD{ES_MULTILINE}}) {
+        with(lines | ES_READONLY | ES_AUTOHSCROLL, [&] {
+            control.SetWindowText("fixed");
+            type("x");
+            key(Qt::Key_Delete);
+            EXPECT_EQ(textOf(&control), "fixed");
+            control.SetSel(0, -1);
+            key(Qt::Key_C, Qt::ControlModifier);
+            EXPECT_EQ(QApplication::clipboard()->text(), "fixed");
+            EXPECT_FALSE(QApplication::clipboard()->mimeData()->hasHtml()) << "others get text without fonts";
+            control.SetReadOnly(FALSE);
+            type("x");
+            EXPECT_EQ(textOf(&control), "x");
+            control.Undo();
+            EXPECT_EQ(textOf(&control), "fixed");
+        });
+    }
 }
 
 TEST_F(EditTest, CutsForgetsAndHides) {

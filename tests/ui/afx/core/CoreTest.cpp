@@ -5,7 +5,10 @@
 #include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QApplication>
+#include <QClipboard>
 #include <QDropEvent>
+#include <QLabel>
+#include <QLayout>
 #include <QMessageBox>
 #include <QMimeData>
 #include <QTest>
@@ -461,6 +464,29 @@ TEST_F(Core, MessageBoxesOfWindowsHaveTheCaptionOfTheApplications) {
         EXPECT_EQ(caption, "A name for display");
     }
     AfxGetApp()->m_pszAppName = name;
+}
+
+TEST_F(Core, MessageBoxesPlaceTheirTextByTheIcon) {
+    const auto ask = [&](UINT type, const std::function<void(QMessageBox&, const QLabel&)>& look) {
+        QTimer::singleShot(0, [&] {
+            auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+            ASSERT_NE(box, nullptr);
+            look(*box, *box->findChild<QLabel*>("qt_msgbox_label"));
+            QTest::keyClick(box, Qt::Key_C, Qt::ControlModifier);
+            QTest::keyClick(box, Qt::Key_Escape);
+        });
+        ::MessageBoxA(view.m_hWnd, "One line.", "A caption", type);
+        EXPECT_EQ(QApplication::clipboard()->text(), "One line.");
+        QApplication::clipboard()->clear();
+    };
+    ask(MB_ICONERROR, [](const QMessageBox& box, const QLabel& label) {
+        const auto* icon = box.findChild<QLabel*>("qt_msgboxex_icon_label");
+        const int line = label.y() + label.contentsMargins().top() + label.fontMetrics().height() / 2;
+        EXPECT_NEAR(line, icon->y() + box.iconPixmap().deviceIndependentSize().height() / 2, 2);
+    });
+    ask(MB_OK, [](const QMessageBox& box, const QLabel& label) {
+        EXPECT_EQ(label.x() + label.indent(), box.layout()->contentsMargins().left()) << "no room for an icon";
+    });
 }
 
 TEST_F(Core, LastReportsOutliveHandlersThatFailAgain) {

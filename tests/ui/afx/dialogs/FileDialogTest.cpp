@@ -3,7 +3,10 @@
 
 #include <QComboBox>
 #include <QFileDialog>
+#include <QHeaderView>
 #include <QLineEdit>
+#include <QPushButton>
+#include <QTreeView>
 
 #include <stdexcept>
 
@@ -67,6 +70,15 @@ TEST_F(FileDialogs, SaveCompletesTheExtension) {
         ASSERT_NE(shown, nullptr);
         EXPECT_EQ(shown->selectedNameFilter(), QString("Boards (*.brd)"));
         EXPECT_EQ(shown->findChild<QLineEdit*>("fileNameEdit")->text(), QString("start.brd"));
+        EXPECT_EQ(shown->labelText(QFileDialog::LookIn), QString("Save in:"));
+        for (const auto* button : shown->findChildren<QPushButton*>()) {
+            EXPECT_TRUE(button->icon().isNull()) << button->text().toStdString();
+        }
+        const auto* header = shown->findChild<QTreeView*>("treeView")->header();
+        for (int column = 1; column < header->count(); ++column) {
+            EXPECT_GE(header->sectionSize(column), header->sectionSizeHint(column)) << column;
+        }
+        EXPECT_EQ(header->length(), header->viewport()->width()) << "the name takes the rest";
     });
     answer("fresh");
     ASSERT_EQ(dialog.DoModal(), IDOK);

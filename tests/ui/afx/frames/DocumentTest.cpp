@@ -93,7 +93,8 @@ TEST_F(Documents, FailedSaveKeepsTheFile) {
     BoxAnswer box("OK");
     EXPECT_FALSE(document().DoFileSave());
     ASSERT_EQ(box.texts.size(), 1U);
-    EXPECT_EQ(box.texts[0], std::string("The disk is full while writing ") + driveName("d.note").GetString() + ".");
+    EXPECT_EQ(box.texts[0], "The disk is full while writing " + file("d.note").string() + ".")
+        << "as the file dialogs name it";
     EXPECT_EQ(contents(file("d.note")), saved("good"));
     EXPECT_TRUE(document().IsModified());
     const auto entries = std::filesystem::directory_iterator(file(""));
@@ -116,9 +117,17 @@ TEST_F(Documents, FilesThatCannotBeOpened) {
     EXPECT_EQ(document().text, "mine") << "nothing is lost for a file that is not there";
     write(file("damaged.note"), "\x50short");
     EXPECT_EQ(AfxGetApp()->OpenDocumentFile(file("damaged.note").c_str()), nullptr);
-    ASSERT_EQ(box.texts.size(), 2U);
-    EXPECT_NE(box.texts[0].find("cannot be found"), std::string::npos);
+    std::filesystem::create_directory(file("folder.note"));
+    EXPECT_EQ(AfxGetApp()->OpenDocumentFile(file("folder.note").c_str()), nullptr);
+    ASSERT_EQ(mkfifo(file("pipe.note").c_str(), 0600), 0);
+    EXPECT_EQ(AfxGetApp()->OpenDocumentFile(file("pipe.note").c_str()), nullptr) << "nor is its other end waited for";
+    EXPECT_FALSE(document().DoSave(file("pipe.note").c_str()));
+    ASSERT_EQ(box.texts.size(), 5U);
+    EXPECT_EQ(box.texts[0].find(file("missing.note").string() + "\nThis file cannot be found."), 0U);
     EXPECT_NE(box.texts[1].find("unexpected file format"), std::string::npos);
+    EXPECT_EQ(box.texts[2], file("folder.note").string() + " is a folder, not a file.");
+    EXPECT_EQ(box.texts[3], file("pipe.note").string() + " is a pipe, not a file.");
+    EXPECT_EQ(box.texts[4], box.texts[3]);
     EXPECT_EQ(document().GetPathName(), "") << "an empty document under no name";
     EXPECT_FALSE(document().IsModified());
 }
