@@ -6,6 +6,7 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
+#include <QAccessible>
 #include <QCheckBox>
 #include <QPainter>
 #include <QPushButton>
@@ -108,6 +109,14 @@ QWidget* ButtonWindow::makeWidget(QWidget* parent) {
     }
     connectStoring(made, &QAbstractButton::clicked, made, [this] { click(); });
     return made;
+}
+
+int ButtonWindow::accessibleRole() const {
+    if (type() == BS_GROUPBOX) {
+        return QAccessible::Grouping;
+    }
+    // The toolkit takes a button that does not release its siblings itself for a check box.
+    return qobject_cast<QRadioButton*>(widget()) ? QAccessible::RadioButton : QAccessible::NoRole;
 }
 
 QAbstractButton* ButtonWindow::button() const {

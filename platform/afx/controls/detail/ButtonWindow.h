@@ -18,6 +18,7 @@ public:
     bool passesMouse() const override {
         return type() == BS_GROUPBOX;
     }
+    int accessibleRole() const override;
     UINT dialogCode(const MSG* msg) const override;
     UINT colorMessage() const override;
     QString mnemonicText() const override {

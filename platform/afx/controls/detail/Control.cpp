@@ -1,5 +1,6 @@
 #include "platform/afx/controls/detail/Control.h"
 
+#include "platform/afx/controls/detail/StaticWindow.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/gdi/Dc.h"
@@ -40,6 +41,12 @@ void Control::widgetMade() {
     widget()->lower();
     applyFocusPolicy();
     fontChanged();
+    const auto& siblings = parent()->children();
+    if (takesFocus() && siblings.size() > 1) {
+        if (auto* label = dynamic_cast<StaticWindow*>(siblings[siblings.size() - 2])) {
+            label->labelFor(*this);
+        }
+    }
 }
 
 void Control::applyFocusPolicy() {

@@ -7,6 +7,7 @@
 #include "platform/base/Text.h"
 
 #include <QAbstractScrollArea>
+#include <QAccessible>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
@@ -100,6 +101,10 @@ void ListBoxWindow::widgetMade() {
     Control::widgetMade();
     // The height is rounded to whole lines only now that their height is known.
     setWindowRect(windowRect());
+}
+
+int ListBoxWindow::accessibleRole() const {
+    return QAccessible::List;
 }
 
 void ListBoxWindow::applyBars() {

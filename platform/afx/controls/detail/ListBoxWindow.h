@@ -21,6 +21,7 @@ public:
     QWidget* clientWidget() const override;
     QRect clientRect() const override;
     void setWindowRect(const QRect& rect) override;
+    int accessibleRole() const override;
     UINT dialogCode(const MSG* msg) const override;
     UINT colorMessage() const override {
         return WM_CTLCOLORLISTBOX;

@@ -1,5 +1,6 @@
 #include "platform/afx/controls/detail/StaticWindow.h"
 
+#include "platform/afx/core/detail/Accessible.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/gdi/Gdi.h"
@@ -7,6 +8,7 @@
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Resource.h"
 
+#include <QLabel>
 #include <QPainter>
 #include <QStyle>
 #include <QStyleOption>
@@ -16,9 +18,12 @@ namespace tvx::afx {
 
 namespace {
 
-class StaticFace : public QWidget {
+/// A label of the toolkit, for what assistive tools know of labels. It draws itself.
+class StaticFace : public QLabel {
 public:
-    StaticFace(QWidget* parent, StaticWindow& window) : QWidget(parent), m_window(window) {}
+    StaticFace(QWidget* parent, StaticWindow& window) : QLabel(parent), m_window(window) {
+        setTextFormat(Qt::PlainText);
+    }
 
 protected:
     void paintEvent(QPaintEvent*) override {
@@ -46,7 +51,7 @@ QWidget* StaticWindow::makeWidget(QWidget* parent) {
 
 void StaticWindow::widgetMade() {
     Control::widgetMade();
-    widget()->setAccessibleName(text());
+    tellText();
     loadPicture();
 }
 
@@ -59,14 +64,29 @@ void StaticWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 void StaticWindow::setText(const QString& text) {
     Control::setText(text);
     if (widget()) {
-        widget()->setAccessibleName(text);
+        tellText();
         widget()->update();
     }
 }
 
+bool StaticWindow::isText() const {
+    return type() <= SS_RIGHT || type() == SS_SIMPLE || type() == SS_LEFTNOWORDWRAP;
+}
+
+/// Tells the label its text without marks of access keys: those are the dialog's affair.
+void StaticWindow::tellText() {
+    const QString shown = isText() ? text() : QString();
+    static_cast<QLabel*>(widget())->setText((style() & SS_NOPREFIX) == 0 ? withoutMarks(shown) : shown);
+}
+
+void StaticWindow::labelFor(Control& next) {
+    if (isText()) {
+        static_cast<QLabel*>(widget())->setBuddy(next.widget());
+    }
+}
+
 QString StaticWindow::mnemonicText() const {
-    const bool isText = type() <= SS_RIGHT || type() == SS_SIMPLE || type() == SS_LEFTNOWORDWRAP;
-    return isText && (style() & SS_NOPREFIX) == 0 ? text() : QString();
+    return isText() && (style() & SS_NOPREFIX) == 0 ? text() : QString();
 }
 
 // --- pictures ---

@@ -17,6 +17,8 @@ public:
         return (style() & SS_NOTIFY) == 0;
     }
     QString mnemonicText() const override;
+    /// Called when the next control is made: tells assistive tools that the text, if there is one, stands for it.
+    void labelFor(Control& next);
     /// Draws the control into its widget.
     void paint(QPainter& painter);
 
@@ -32,6 +34,8 @@ private:
     DWORD type() const {
         return style() & SS_TYPEMASK;
     }
+    bool isText() const;
+    void tellText();
     void paintText(QPainter& painter, const QRect& area) const;
     void paintPicture(QPainter& painter, const QRect& area) const;
     bool paintShape(QPainter& painter, const QRect& area) const;

@@ -1,6 +1,7 @@
 #include "platform/afx/core/detail/Dispatch.h"
 
 #include "platform/afx/core/App.h"
+#include "platform/afx/core/detail/Accessible.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/HandleWatches.h"
 #include "platform/afx/core/detail/Loop.h"
@@ -187,6 +188,7 @@ void startOnGuiThread() {
     MessageQueue::instance().moveToThread(QThread::currentThread());
     watchReleasedChildren();
     showApplicationIcon();
+    answerAssistiveTools();
 }
 
 struct HooksEntry {

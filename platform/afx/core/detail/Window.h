@@ -161,6 +161,10 @@ public:
     /// Sends WM_SIZE or WM_MOVE when size or place differ from those told last.
     void tellGeometry();
 
+    /// What assistive tools take the window for, a number of QAccessible::Role; 0 when its widget tells it better.
+    virtual int accessibleRole() const {
+        return 0;
+    }
     virtual QString text() const {
         return m_text;
     }

@@ -16,6 +16,7 @@
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Resource.h"
 
+#include <QAccessible>
 #include <QApplication>
 #include <QFontMetrics>
 #include <QScreen>
@@ -79,6 +80,10 @@ void DialogWindow::widgetMade() {
         fixSize();
     }
     widget()->setMouseTracking(true);
+}
+
+int DialogWindow::accessibleRole() const {
+    return QAccessible::Dialog;
 }
 
 void DialogWindow::styleChanged(DWORD oldStyle, DWORD) {

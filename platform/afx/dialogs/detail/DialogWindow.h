@@ -19,6 +19,7 @@ public:
     ~DialogWindow() override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void setWindowRect(const QRect& rect) override;
+    int accessibleRole() const override;
     /// Those of the owner, which has a caption as most dialogs do: sizes that a host computes for the whole window
     /// then come out right before the desktop has told them.
     QMargins expectedBorders() const override;

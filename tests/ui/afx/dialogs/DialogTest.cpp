@@ -3,6 +3,7 @@
 #include "platform/afx/core/App.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/win/FrameworkIds.h"
+#include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 
 #include <QScreen>
@@ -374,3 +375,42 @@ TEST(Dialogs, ChooseTheColoursOfTheirControls) {
 }
 
 } // namespace
+
+// --- assistive tools ---
+
+TEST(AccessibleDialog, TellsRolesNamesAndLabelsInTabOrder) {
+    ScriptedDialog dialog(IDD_SHAPE);
+    dialog.script = [&] {
+        const auto partOf = [&](int id) {
+            return QAccessible::queryAccessibleInterface(tvx::afx::peerOf(dialog.GetDlgItem(id)->m_hWnd));
+        };
+        QAccessibleInterface* whole = QAccessible::queryAccessibleInterface(tvx::afx::peerOf(dialog.m_hWnd));
+        EXPECT_EQ(accessibleTree(*whole), R"(Dialog "Shape"
+ StaticText "Name:"
+ EditableText "Name:" < Name:
+ StaticText "Scale:"
+ EditableText "Scale:" < Scale:
+ Grouping "Kind"
+ RadioButton "Line"
+ RadioButton "Circle"
+ RadioButton "Arc"
+ CheckBox "Visible"
+ List ""
+ ComboBox ""
+ ComboBox ""
+  EditableText ""
+ Border ""
+ Button "OK"
+ Button "Cancel"
+ Button "Apply"
+ Button "Save"
+)");
+        QAccessibleInterface* circle = partOf(IDC_CIRCLE);
+        EXPECT_EQ(whole->indexOfChild(circle), 6);
+        EXPECT_FALSE(circle->state().checked);
+        circle->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+        EXPECT_TRUE(circle->state().checked);
+        EXPECT_EQ(dialog.codes(IDC_CIRCLE, BN_CLICKED), 1);
+    };
+    EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
+}

@@ -1,6 +1,7 @@
 #include "platform/afx/core/Menu.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
 #include "platform/afx/core/detail/Menus.h"
+#include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/frames/FrameTesting.h"
 
 using namespace frametest;
@@ -217,4 +218,71 @@ TEST_F(ContextMenu, TheBarShowsWhichEntryHasTheKeyboard) {
     EXPECT_NE(look(edit), plainEdit);
     key(Qt::Key_Escape);
     EXPECT_EQ(look(edit), plainEdit);
+}
+
+// --- assistive tools ---
+
+TEST_F(FrameTest, TellsAssistiveToolsPartsOfAFrameByName) {
+    NoteFrame& frame = openNote();
+    frame.tools.SetWindowText("Drawing");
+    frame.SendMessage(WM_SETMESSAGESTRING, AFX_IDS_IDLEMESSAGE); // the pointer may stand on a button
+    EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(widgetOf(frame))), R"(Window "Note - Frame Test"
+ MenuBar ""
+  MenuItem "File"
+  MenuItem "Edit"
+  MenuItem "View"
+ Client ""
+  Client ""
+ ToolBar "Drawing"
+  Button "Draw"
+  Button "Locked"
+  Separator ""
+  CheckBox "Grid"
+  Button "Orphan"
+ StatusBar ""
+  Grip ""
+  StaticText "Ready"
+  StaticText "000 shapes"
+  StaticText ""
+)");
+    QMenu* menu = clickBar(frame, "File");
+    EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(menu)), R"(PopupMenu ""
+ MenuItem "New"
+ MenuItem "Save"
+ Separator ""
+ MenuItem "Close"
+)");
+    QAccessibleInterface* save = QAccessible::queryAccessibleInterface(itemOf(*menu, "Save"));
+    EXPECT_EQ(save->text(QAccessible::Accelerator), "Ctrl+S");
+    EXPECT_EQ(save->parent()->object(), menu);
+    EXPECT_EQ(save->rect().size(), menu->actionGeometry(itemOf(*menu, "Save")).size());
+    EXPECT_FALSE(save->state().focused);
+    menu->setActiveAction(itemOf(*menu, "Save"));
+    EXPECT_TRUE(save->state().focused);
+    key(Qt::Key_Escape);
+    menu = clickBar(frame, "Edit");
+    QAccessibleInterface* draw = QAccessible::queryAccessibleInterface(itemOf(*menu, "Draw"));
+    draw->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+    settle();
+    EXPECT_TRUE(noted("draw"));
+    key(Qt::Key_Escape);
+}
+
+TEST_F(FrameTest, TellsAssistiveToolsOfChildFramesOnce) {
+    const BoardsFrame& frame = openBoards();
+    boards().OpenDocumentFile(nullptr);
+    settle();
+    EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(widgetOf(frame))), R"(Window "Board1 - Frame Test"
+ MenuBar ""
+  MenuItem "Board"
+  MenuItem "Window"
+ LayeredPane ""
+  Window "Board1"
+   Client ""
+    Client ""
+     Client ""
+ StatusBar ""
+  Grip ""
+  StaticText "Ready"
+)");
 }
