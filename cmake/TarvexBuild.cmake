@@ -15,13 +15,9 @@ set(CMAKE_BUILD_WITH_INSTALL_RPATH ON)
 set(CMAKE_INSTALL_RPATH "$ORIGIN;$ORIGIN/../lib")
 set(CMAKE_INSTALL_RPATH_USE_LINK_PATH ON)
 
-# ccache keeps what is compiled with precompiled headers only when it is told that their macros and times may be trusted.
 find_program(TVX_CCACHE ccache)
 if(TVX_CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
-  # No base folder: a precompiled header names the files it was made from, so one from another tree of these sources
-  # would bring them in twice.
-  set(launcher "${CMAKE_COMMAND}" -E env CCACHE_SLOPPINESS=pch_defines,time_macros CCACHE_BASEDIR= CCACHE_HASHDIR=1
-    "${TVX_CCACHE}")
+  set(launcher "${CMAKE_CURRENT_LIST_DIR}/compile-cached" "${TVX_CCACHE}")
   set(CMAKE_C_COMPILER_LAUNCHER ${launcher})
   set(CMAKE_CXX_COMPILER_LAUNCHER ${launcher})
 endif()
