@@ -24,7 +24,9 @@ TXT
 }
 "$work/out/board" -smoketest
 # The texts come from the host, the library and the layer, in the user's language.
-said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1)
+code=0
+said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1) || code=$?
+[ "$code" -eq 2 ] || { echo "FAIL: exit code $code of a wrong command line"; exit 1; }
 [[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
 
 ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
