@@ -52,10 +52,6 @@ int failuresOf(const std::function<void()>& function) {
     return memory;
 }
 
-[[gnu::noinline]] void* operator new[](std::size_t size) {
-    return operator new(size);
-}
-
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
 }
