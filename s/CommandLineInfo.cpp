@@ -34,7 +34,10 @@ Gui_CommandLineInfo::IntStyleEnum Gui_CommandLineInfo::GetStyleSwitch() const {
 Gui_CommandLineInfo_Impl::~Gui_CommandLineInfo_Impl() {
     // A destructor has nobody to tell that the heap is exhausted.
     try {
-        tvx::allocating([this] { IssueCommandFileProblems(m_problems); });
+        tvx::allocating([this] {
+            EndExpectation();
+            IssueCommandFileProblems(m_problems);
+        });
     } catch (CMemoryException* exception) {
         exception->Delete();
     }
@@ -58,7 +61,7 @@ Gui_CommandLineInfo_Impl::IntStyleEnum Gui_CommandLineInfo_Impl::GetStyleSwitch(
 
 bool Gui_CommandLineInfo_Impl::ParseParam(Gui_CommandLineInfo& owner, const char* param, BOOL isSwitch) {
     if (isSwitch) {
-        m_expectation = Expectation::Nothing;
+        EndExpectation();
         return ParseSwitch(param) || ParseAbbreviation(owner, param);
     }
     switch (m_expectation) {
@@ -66,6 +69,7 @@ bool Gui_CommandLineInfo_Impl::ParseParam(Gui_CommandLineInfo& owner, const char
         ParseStyle(param);
         return true;
     case Expectation::CommandFile:
+        m_hasCommandFile = true;
         ExpandCommandFile(owner, param, m_problems);
         return true;
     case Expectation::Nothing:
@@ -111,6 +115,13 @@ void Gui_CommandLineInfo_Impl::ParseStyle(const char* param) {
     }
 }
 
+void Gui_CommandLineInfo_Impl::EndExpectation() {
+    NoteMissingCommandFile(m_expectation == Expectation::CommandFile, m_hasCommandFile, m_problems);
+    m_expectation = Expectation::Nothing;
+    m_hasCommandFile = false;
+}
+
 void Gui_CommandLineInfo_Impl::ForgetProblems() {
+    EndExpectation();
     m_problems.RemoveAll();
 }

@@ -45,8 +45,9 @@ class Gui_CommandLineInfo_Impl;
 /// The option specification is asked for once, when the first switch comes that is none of these.
 ///
 /// A word that begins with "/" and names an existing file or folder is that name and not a switch. Command files that
-/// cannot be read, or lead back to themselves, are errors: `ProcessCommandLine` shows them. If it is never called, they
-/// are issued when this object is destroyed.
+/// cannot be read, or lead back to themselves, and `-f` without a file are errors: `ProcessCommandLine` shows them. If
+/// it is never called, they are issued when this object is destroyed. An exhausted heap raises the framework's memory
+/// exception.
 class GUI_API Gui_CommandLineInfo : public CCommandLineInfo {
 public:
     /// How the application is to talk to its user.

@@ -20,6 +20,12 @@ void ExpandCommandFile(CCommandLineInfo& parser, const char* name, CStringArray&
     }
 }
 
+void NoteMissingCommandFile(bool isPending, bool hasFile, CStringArray& problems) {
+    if (isPending && !hasFile) {
+        problems.Add("Option \"-f\" needs a command file after it.");
+    }
+}
+
 void IssueCommandFileProblems(const CStringArray& problems) {
     for (INT_PTR i = 0; i < problems.GetSize(); ++i) {
         WinAppOrigin(__LINE__).issueError("%s", problems[i].GetString());
@@ -28,7 +34,7 @@ void IssueCommandFileProblems(const CStringArray& problems) {
 
 Gui_CmdLineArgsArray::Gui_CmdLineArgsArray() {
     AfxGetApp()->ParseCommandLine(*this);
-    NoteMissingFile();
+    NoteMissingCommandFile(m_commandFilePending != 0, m_hasCommandFile, m_problems);
 }
 
 Gui_CmdLineArgsArray::~Gui_CmdLineArgsArray() {
@@ -39,7 +45,7 @@ Gui_CmdLineArgsArray::~Gui_CmdLineArgsArray() {
 
 void Gui_CmdLineArgsArray::ParseParam(const char* param, BOOL isSwitch, BOOL) {
     if (isSwitch) {
-        NoteMissingFile();
+        NoteMissingCommandFile(m_commandFilePending != 0, m_hasCommandFile, m_problems);
         m_commandFilePending = tvx::text::equalNoCase(param, "f");
         m_hasCommandFile = false;
         if (!m_commandFilePending) {
@@ -50,12 +56,6 @@ void Gui_CmdLineArgsArray::ParseParam(const char* param, BOOL isSwitch, BOOL) {
         tvx::allocating([&] { ExpandCommandFile(*this, param, m_problems); });
     } else {
         m_arguments.Add(CString(param));
-    }
-}
-
-void Gui_CmdLineArgsArray::NoteMissingFile() {
-    if (m_commandFilePending && !m_hasCommandFile) {
-        m_problems.Add("Option \"-f\" needs a command file after it.");
     }
 }
 

@@ -17,6 +17,9 @@
 /// @param problems receives a text for the file that is refused, and for each quote that is not closed
 GUI_API void ExpandCommandFile(CCommandLineInfo& parser, const char* name, CStringArray& problems);
 
+/// Adds a problem when a switch for command files has come and no file behind it.
+void NoteMissingCommandFile(bool isPending, bool hasFile, CStringArray& problems);
+
 /// Issues each text as an error message.
 GUI_API void IssueCommandFileProblems(const CStringArray& problems);
 
@@ -55,12 +58,14 @@ private:
     bool ParseSwitch(const char* param);
     bool ParseAbbreviation(const Gui_CommandLineInfo& owner, const char* param);
     void ParseStyle(const char* param);
+    void EndExpectation();
 
     int m_smokeTest = 0;
     int m_help = 0;
     int m_noSplash = 0;
     IntStyleEnum m_style = Gui_CommandLineInfo::IntStyleNone;
     Expectation m_expectation = Expectation::Nothing;
+    bool m_hasCommandFile = false; ///< one came since they are expected
     CStringArray m_problems;
     std::unique_ptr<UT_CMDOPCODES> m_options; ///< the host's, once a switch was looked for among them
 };
@@ -85,8 +90,6 @@ public:
     const CStringArray& GetProblems() const;
 
 private:
-    void NoteMissingFile();
-
     std::unique_ptr<char*[]> m_vector;
     CStringArray m_arguments;
     int m_commandFilePending = 0;

@@ -171,7 +171,8 @@ int Gui_Edit::FindTextA(unsigned long flags, _findtextexa* find) {
     if (start < 0 || start >= text.GetLength() || !find->lpstrText) {
         return -1;
     }
-    const auto [first, end] = findFrom(text.View(), static_cast<std::size_t>(start), searchFor(find->lpstrText, flags));
+    const auto [first, end] = tvx::allocating(
+        [&] { return findFrom(text.View(), static_cast<std::size_t>(start), searchFor(find->lpstrText, flags)); });
     if (first == std::string_view::npos) {
         return -1;
     }
@@ -283,7 +284,7 @@ void Gui_Edit::AppendText(CEdit& edit, const CString& text) {
     const bool selected = start != end;
     View view(edit, selected);
     const auto limit = static_cast<std::size_t>(limitOf(edit));
-    const std::string held = asHeld(edit, text.View(), limit);
+    const std::string held = tvx::allocating([&] { return asHeld(edit, text.View(), limit); });
     const auto old = static_cast<std::size_t>(edit.GetWindowTextLength());
     if (held.size() + old > limit) {
         const int dropped = dropOldest(edit, static_cast<int>(std::min(held.size() + old - limit, old)));

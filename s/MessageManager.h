@@ -17,6 +17,8 @@
 /// Port_MsgDispatcher::removeMsgMan(&manager);
 /// @endcode
 ///
+/// An exhausted heap raises the framework's memory exception from the place that issues the message.
+///
 /// A host that wants every error in a message box, also those of an application started from the desktop, whose
 /// standard error nobody reads, keeps one without callbacks registered as long as it runs.
 class GUI_API Gui_MessageManager : public Port_MsgManDefault {

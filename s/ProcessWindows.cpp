@@ -92,7 +92,7 @@ int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
     std::string text;
     CString& chunk = record.chunk;
     const auto take = [&] {
-        appendEnd(text, chunk.View(), limit);
+        tvx::allocating([&] { appendEnd(text, chunk.View(), limit); });
         if (lastChunk && !chunk.IsEmpty()) {
             *lastChunk = chunk;
         }

@@ -55,6 +55,7 @@ public:
     /// @param separators   the characters that end a field; null counts as none
     /// @param skipEmpty    non-zero: runs of separators count as one and empty fields are left out
     /// @param ignoreQuotes non-zero: quotes are ordinary characters
-    /// @return the fields, in order; the caller deletes the array. A separator at the end adds no empty field.
+    /// @return the fields, in order; the caller deletes the array. A separator at the end adds no empty field. An
+    ///     exhausted heap raises the framework's memory exception.
     CStringArray* GetStringArray(const char* separators, int skipEmpty, int ignoreQuotes) const;
 };

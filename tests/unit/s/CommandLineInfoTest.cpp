@@ -263,11 +263,13 @@ TEST_F(CommandLineInfo, ACycleIsReportedOnceWithItsChain) {
 
 TEST_F(CommandLineInfo, ProblemsReachTheUserWithoutTheCheck) {
     testing::internal::CaptureStderr();
-    theApp.start({"-f", "no such file"}, [] {
+    theApp.start({"-f", "no such file", "-f"}, [] {
         CommandLine info;
         theApp.ParseCommandLine(info);
     });
-    EXPECT_EQ(timesIn(testing::internal::GetCapturedStderr(), "no such file"), 1);
+    const std::string said = testing::internal::GetCapturedStderr();
+    EXPECT_EQ(timesIn(said, "no such file"), 1);
+    EXPECT_EQ(timesIn(said, "needs a command file"), 1);
 }
 
 TEST_F(CommandLineInfo, TellsByTheExitCodeThatItIsWrong) {
