@@ -30,7 +30,7 @@ struct Gui_Process::Record {
     /// Takes half a character or half a line end from the end of what was read, to be read again with its rest.
     void HoldBack(CString& text);
     /// How long what is held back still waits for its rest.
-    std::chrono::milliseconds Patience() const;
+    std::chrono::milliseconds Patience(std::chrono::steady_clock::time_point now) const;
     /// Withdraws requests for messages about the child.
     void StopNotifying();
     /// Keeps the error of a call of the platform that failed.

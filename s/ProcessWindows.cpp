@@ -75,19 +75,19 @@ void Gui_Process::Record::HoldBack(CString& text) {
     }
 }
 
-std::chrono::milliseconds Gui_Process::Record::Patience() const {
+std::chrono::milliseconds Gui_Process::Record::Patience(std::chrono::steady_clock::time_point now) const {
     // A program that the child started may hold the pipe, but what the child began it does not end.
     if (lastError == ERROR_BROKEN_PIPE || WaitForSingleObject(process, 0) == WAIT_OBJECT_0) {
         return std::chrono::milliseconds(0);
     }
-    const auto left = unfinishedSince + patience - std::chrono::steady_clock::now();
+    const auto left = unfinishedSince + patience - now;
     return std::max(std::chrono::ceil<std::chrono::milliseconds>(left), std::chrono::milliseconds(0));
 }
 
 int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
     using Clock = std::chrono::steady_clock;
     Record& record = *m_record;
-    const auto deadline = Clock::now() + readingTime;
+    const auto begin = Clock::now();
     const std::size_t limit = limitOf(edit);
     std::string text;
     CString& chunk = record.chunk;
@@ -101,12 +101,12 @@ int Gui_Process::AppendOutput(CEdit& edit, CString* lastChunk) {
         GetOutput(chunk);
         record.HoldBack(chunk);
         take();
-        if (Clock::now() >= deadline) {
+        if (Clock::now() >= begin + readingTime) {
             break;
         }
     }
     // Asked for in this order: what the child wrote before its end is in the pipe by then.
-    const bool isDue = !record.unfinished.empty() && record.Patience().count() == 0;
+    const bool isDue = !record.unfinished.empty() && record.Patience(begin).count() == 0;
     if (isDue && record.WaitingBytes() == 0) {
         chunk = CString(std::exchange(record.unfinished, {}));
         take();
@@ -130,7 +130,8 @@ int Gui_Process::NotifyWindow(HWND window, unsigned int message) {
     if (isHeldBack || PeekNamedPipe(record.outputPipe, nullptr, 0, nullptr, nullptr, nullptr)) {
         handles[count++] = record.outputPipe;
     }
-    const DWORD timeout = isHeldBack ? static_cast<DWORD>(record.Patience().count()) : INFINITE;
+    const auto now = std::chrono::steady_clock::now();
+    const DWORD timeout = isHeldBack ? static_cast<DWORD>(record.Patience(now).count()) : INFINITE;
     if (count == 0 || !tvx::postWhenSignalled(std::span(handles).first(count), window, message, timeout)) {
         return 0;
     }

@@ -60,12 +60,15 @@ TEST(Desktop, GoesToTheDesktopThatAWindowIsOn) {
     const Peer second;
     ASSERT_TRUE(first.shown && second.shown);
     const auto run = [](const std::string& command) { return std::system(command.c_str()) == 0; };
-    const auto isOn = [&](int desktop) {
-        return becomesTrue([&] { return run("test $(xdotool get_desktop) = " + std::to_string(desktop)); });
+    const std::string id = std::to_string(idOf(first.window));
+    const auto answers = [&](const std::string& question, int answer) {
+        return becomesTrue([&] { return run("test $(xdotool " + question + ") = " + std::to_string(answer)); });
     };
-    ASSERT_TRUE(run("xdotool set_num_desktops 2 && xdotool set_desktop_for_window " +
-                    std::to_string(idOf(first.window)) + " 1"));
+    const auto isOn = [&](int desktop) { return answers("get_desktop", desktop); };
+    ASSERT_TRUE(run("xdotool set_num_desktops 2 && xdotool set_desktop_for_window " + id + " 1"));
+    ASSERT_TRUE(answers("get_desktop_for_window " + id, 1));
     ASSERT_TRUE(becomesTrue([&] { return GetForegroundWindow() == second.window; }));
+    ASSERT_TRUE(isOn(0));
     EXPECT_FALSE(IsIconic(first.window));
     EXPECT_EQ(Gui_Desktop::ShowWindow(idOf(first.window)), 1);
     EXPECT_TRUE(isOn(1));
