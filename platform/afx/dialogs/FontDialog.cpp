@@ -6,10 +6,13 @@
 #include "platform/base/Text.h"
 #include "platform/win/FrameworkIds.h"
 
+#include <QFontDatabase>
 #include <QFontDialog>
 #include <QFontInfo>
 
+#include <climits>
 #include <cmath>
+#include <utility>
 
 using namespace tvx::afx;
 
@@ -31,6 +34,26 @@ LOGFONT describe(const QFont& font) {
     return description;
 }
 
+/// The font as the dialog knows it: of an installed family, with the name of its style, in points. Without that name
+/// the dialog takes the first style that the family has.
+QFont named(const LOGFONT& description) {
+    QFont font = controlFont(description);
+    const QFontInfo real(font);
+    font.setFamily(real.family());
+    font.setPointSizeF(std::round(real.pixelSize() / pixelsOfPoint));
+    // Of styles that differ in width only, the one without a word for it is the usual one.
+    std::pair<qsizetype, qsizetype> nearest{INT_MAX, INT_MAX};
+    for (const QString& style : QFontDatabase::styles(font.family())) {
+        const QFont candidate = QFontDatabase::font(font.family(), style, font.pointSize());
+        const std::pair<qsizetype, qsizetype> distance{std::abs(candidate.weight() - font.weight()), style.size()};
+        if (candidate.italic() == font.italic() && distance < nearest) {
+            nearest = distance;
+            font.setStyleName(style);
+        }
+    }
+    return font;
+}
+
 } // namespace
 
 CFontDialog::CFontDialog(LOGFONT* initial, DWORD flags, CDC*, CWnd* parent) {
@@ -49,10 +72,7 @@ INT_PTR CFontDialog::DoModal() {
     ToolkitDialog<QFontDialog> dialog(m_cf.hwndOwner, TVX_IDS_FONT);
     dialog.setOption(QFontDialog::MonospacedFonts, (m_cf.Flags & CF_FIXEDPITCHONLY) != 0);
     const bool isGiven = (m_cf.Flags & CF_INITTOLOGFONTSTRUCT) != 0 && m_cf.lpLogFont;
-    QFont first = controlFont(isGiven ? *m_cf.lpLogFont : pointFont(80, ""));
-    // The dialog offers sizes in points.
-    first.setPointSizeF(std::round(QFontInfo(first).pixelSize() / pixelsOfPoint));
-    dialog.setCurrentFont(first);
+    dialog.setCurrentFont(named(isGiven ? *m_cf.lpLogFont : pointFont(80, "")));
     if (!dialog.ask()) {
         return IDCANCEL;
     }

@@ -16,6 +16,7 @@
 #include <QMenuBar>
 #include <QScrollBar>
 #include <QWheelEvent>
+#include <QWindow>
 
 namespace tvx::afx {
 
@@ -300,11 +301,12 @@ void TopLevelWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
     const Qt::WindowFlags flags = windowFlags(style(), exStyle());
     widget()->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
     if (flags != windowFlags(oldStyle, oldExStyle)) {
-        // The toolkit hides a window whose flags change.
-        const bool shown = !widget()->isHidden();
+        // Told by the widget, the toolkit would make the desktop's window anew: handles would no longer name it.
         guarded([&] {
-            widget()->setWindowFlags(flags);
-            widget()->setVisible(shown);
+            widget()->overrideWindowFlags(flags);
+            if (QWindow* native = widget()->windowHandle()) {
+                native->setFlags(flags);
+            }
         });
     }
 }

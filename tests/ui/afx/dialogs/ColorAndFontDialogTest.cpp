@@ -48,10 +48,16 @@ TEST(FontDialog, AnswersTheFontInPixelsAndPoints) {
         [](QFontDialog& shown) {
             EXPECT_EQ(shown.currentFont().pointSize(), 12);
             EXPECT_TRUE(shown.currentFont().bold());
+            EXPECT_FALSE(shown.currentFont().italic());
         },
         Qt::Key_Escape);
     EXPECT_EQ(dialog.DoModal(), IDCANCEL);
     EXPECT_TRUE(dialog.IsBold());
+    CFontDialog plain;
+    answer<QFontDialog>(
+        [](QFontDialog& shown) { EXPECT_FALSE(shown.currentFont().bold() || shown.currentFont().italic()); });
+    EXPECT_EQ(plain.DoModal(), IDOK);
+    EXPECT_FALSE(plain.IsBold());
 
     QString family;
     answer<QFontDialog>([&](QFontDialog& shown) {
