@@ -4,10 +4,12 @@
 #
 #   MovedApplicationTest.sh CMAKE BUILD_DIR COMPILER
 set -euo pipefail
-host=$(cd "$(dirname "$0")" && pwd)
-. "$host/../Desktop.sh"
+. "$(dirname "$0")/../Desktop.sh"
 cmake=$1 build=$2 compiler=$3
-installed="$work/tarvex" out="$work/out"
+host="$work/host" installed="$work/tarvex" out="$work/out"
+# Lines end as on the system that old sources come from.
+cp -r "$(dirname "$0")" "$host"
+find "$host" -name '*.h' -o -name '*.cpp' -o -name '*.rc*' | xargs sed -i 's/$/\r/'
 
 "$cmake" --install "$build" --prefix "$installed" >"$work/log" &&
     "$cmake" -S "$host" -B "$out" -G Ninja -DCMAKE_CXX_COMPILER="$compiler" -DCMAKE_PREFIX_PATH="$installed" \
