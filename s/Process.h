@@ -33,7 +33,7 @@ public:
     /// What Release does to a child that it holds.
     enum ReleasePolicy {
         LeaveRunning = 0,       ///< the child runs on, and nothing of it stays behind when it ends
-        TerminateOnRelease = 1, ///< the child is terminated
+        TerminateOnRelease = 1, ///< the child is terminated, as by Terminate
     };
 
     /// Holds no child. The release policy is `TerminateOnRelease` with exit code 1.
@@ -64,10 +64,14 @@ public:
     /// @param timeout  milliseconds; 0xFFFFFFFF waits for ever
     /// @return 0 when it has ended, 258 when the time ran out, 0xFFFFFFFF without a child
     unsigned long Wait(unsigned long timeout) const;
-    /// Ends the child at once; it cannot refuse. It is still held, and reports `exitCode` from then on.
+    /// Ends the child at once; it cannot refuse. It is still held, and reports `exitCode` from then on. Programs that
+    /// the child started end with it where they kept its process group, as the commands of a shell script do. Those of
+    /// a child that has ended already run on, and keep its pipes.
     /// @return 0 without a child, or when it has ended already
     int Terminate(unsigned long exitCode);
-    /// Lets go of the child as the release policy says, and of output that was not read. Nothing happens without one.
+    /// Lets go of the child as the release policy says, and of output that was not read. What the child has started
+    /// ends only where Terminate ends it: it runs on when the child is left running, and when the child had ended
+    /// before. Nothing happens without a child.
     void Release();
     /// Decides what Release does.
     /// @param exitCode  what a child that is terminated reports

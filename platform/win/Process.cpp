@@ -109,7 +109,7 @@ SpawnResult start(const Program& program, const std::optional<std::string>& dire
 }
 
 void hold(SpawnResult started, PROCESS_INFORMATION& information) {
-    const auto child = std::make_shared<ProcessObject>(std::move(started.process), Kinship::Child);
+    const auto child = std::make_shared<ProcessObject>(std::move(started.process), Kinship::Child, started.id);
     information.hProcess = makeHandle(child, Inheritance::None);
     information.hThread = makeHandle(child, Inheritance::None);
     information.dwProcessId = static_cast<DWORD>(started.id);

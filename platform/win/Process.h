@@ -126,7 +126,8 @@ TVX_PLATFORM_API HANDLE OpenProcess(DWORD access, BOOL inherit, DWORD processId)
 /// @return FALSE when `process` is no process
 TVX_PLATFORM_API BOOL GetExitCodeProcess(HANDLE process, DWORD* code);
 
-/// Ends a child at once; it cannot refuse. The call does not wait for the end.
+/// Ends a child at once; it cannot refuse. Those that it started end with it, and theirs, as far as they kept its
+/// process group (shells without job control do, `setsid` and daemons do not). The call does not wait for the end.
 /// @param process  from CreateProcessA; one from OpenProcess gives `ERROR_ACCESS_DENIED`, as does one that has ended
 /// @param code     what GetExitCodeProcess is to give from then on
 TVX_PLATFORM_API BOOL TerminateProcess(HANDLE process, UINT code);

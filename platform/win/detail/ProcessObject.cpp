@@ -62,8 +62,8 @@ DWORD exitCodeOf(const siginfo_t& status) {
     }
 }
 
-ProcessObject::ProcessObject(Descriptor process, Kinship kinship) noexcept
-    : KernelObject(std::move(process)), m_kinship(kinship) {}
+ProcessObject::ProcessObject(Descriptor process, Kinship kinship, pid_t group) noexcept
+    : KernelObject(std::move(process)), m_kinship(kinship), m_group(group) {}
 
 ProcessObject::~ProcessObject() {
     if (m_kinship == Kinship::Stranger) {
@@ -100,6 +100,10 @@ DWORD ProcessObject::terminate(DWORD code) {
     }
     if (::pidfd_send_signal(descriptor(), SIGKILL, nullptr, 0) != 0) {
         return errorFromErrno(errno);
+    }
+    // The group has its number from the child, and nobody else gets it before the child is collected.
+    if (m_group > 0) {
+        ::kill(-m_group, SIGKILL);
     }
     // The first order is the one that ends the child.
     if (!m_ordered) {

@@ -5,6 +5,7 @@
 #include <csignal>
 #include <mutex>
 #include <optional>
+#include <sys/types.h>
 #include <vector>
 
 namespace tvx::win {
@@ -15,19 +16,21 @@ enum class Kinship { Child, Stranger };
 /// A process, held by the system's reference to it.
 class ProcessObject : public KernelObject {
 public:
-    ProcessObject(Descriptor process, Kinship kinship) noexcept;
+    /// @param group  the number of a child's group; 0 for a stranger
+    ProcessObject(Descriptor process, Kinship kinship, pid_t group = 0) noexcept;
     /// A child that still runs is handed to the ReleasedChildren.
     ~ProcessObject() override;
 
     /// The code that the process ended with, `STILL_ACTIVE` while it runs. Collects a child that has ended.
     DWORD exitCode();
-    /// Kills a child, which then reports `code`. Answers `ERROR_SUCCESS` or why not.
+    /// Kills a child and what is left in its group; the child then reports `code`. Answers `ERROR_SUCCESS` or why not.
     DWORD terminate(DWORD code);
 
 private:
     DWORD collect();
 
     const Kinship m_kinship;
+    const pid_t m_group;
     std::mutex m_mutex;
     std::optional<DWORD> m_code;    ///< once the end was seen
     std::optional<DWORD> m_ordered; ///< what the child is to report when it was killed

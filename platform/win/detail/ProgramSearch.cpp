@@ -51,15 +51,17 @@ std::string absolute(const std::string& file) {
     return error ? file : path.string();
 }
 
+/// Entries of PATH that are empty or relative mean the current folder or are seen from it; they do not count.
 std::vector<std::string> searchedFolders() {
     std::vector<std::string> folders{fs::path(moduleFileName(nullptr)).parent_path().string()};
     const char* variable = std::getenv("PATH");
     std::string_view path = variable ? variable : "/usr/local/bin:/usr/bin:/bin";
     for (std::size_t end = 0; end != std::string_view::npos; path.remove_prefix(std::min(end + 1, path.size()))) {
         end = path.find(':');
-        folders.emplace_back(path.substr(0, end));
+        if (path.starts_with('/')) {
+            folders.emplace_back(path.substr(0, end));
+        }
     }
-    folders.emplace_back();
     return folders;
 }
 
@@ -89,8 +91,7 @@ void findByPath(Program& program, const std::string& name) {
 void findByName(Program& program, const std::string& name) {
     for (const std::string& folder : searchedFolders()) {
         for (const std::string& spelling : spellings(name)) {
-            std::string file = folder.empty() ? "" : folder + '/';
-            consider(program, file.append(spelling), spelling);
+            consider(program, folder + '/' + spelling, spelling);
             if (!program.file.empty()) {
                 return;
             }

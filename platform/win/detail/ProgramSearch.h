@@ -17,8 +17,9 @@ struct Program {
 };
 
 /// Finds the program of a command line. A name with folders is that file, seen from the current folder. Any other is
-/// looked for in the application's own folder, then along PATH, at last in the current folder: a file that somebody
-/// put beside a drawing never stands in for a program of the system. Where "name.exe" is missing, "name" will do.
+/// looked for in the application's own folder, then along PATH, and never in the current folder: a file that somebody
+/// put beside a drawing must not stand in for a program of the system that is missing. Where "name.exe" is missing,
+/// "name" will do.
 [[nodiscard]] TVX_PLATFORM_API Program findProgram(std::string_view commandLine);
 
 } // namespace tvx::win

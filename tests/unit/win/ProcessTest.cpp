@@ -137,6 +137,27 @@ TEST(Process, TellsItsExitCode) {
     EXPECT_EQ(sleeper.code(), 4711u);
 }
 
+TEST(Process, EndsWithThoseThatKeptItsGroup) {
+    const Child parent(shell("sleep 1000 & echo $!; setsid sleep 1000 & echo $!; wait"));
+    std::istringstream ids(parent.output(2));
+    DWORD kept = 0;
+    DWORD left = 0;
+    ASSERT_TRUE(ids >> kept >> left);
+    const HANDLE inGroup = OpenProcess(PROCESS_QUERY_INFORMATION, FALSE, kept);
+    const HANDLE outside = OpenProcess(PROCESS_QUERY_INFORMATION, FALSE, left);
+    ASSERT_TRUE(inGroup && outside);
+    while (::getpgid(static_cast<pid_t>(left)) != static_cast<pid_t>(left)) {
+        ::usleep(1000); // until it has left the group
+    }
+    EXPECT_TRUE(TerminateProcess(parent.information.hProcess, 7));
+    EXPECT_EQ(parent.code(), 7u);
+    EXPECT_EQ(WaitForSingleObject(inGroup, INFINITE), WAIT_OBJECT_0);
+    EXPECT_EQ(WaitForSingleObject(outside, 0), WAIT_TIMEOUT);
+    ::kill(static_cast<pid_t>(left), SIGKILL);
+    CloseHandle(inGroup);
+    CloseHandle(outside);
+}
+
 TEST(Process, DeathsBySignalHaveThePlatformsCodes) {
     const struct {
         const char* signal;
@@ -195,12 +216,19 @@ TEST_F(ProcessFiles, FindsProgramsAsThePlatformDoes) {
     EXPECT_EQ(Child("\"C:" + tool + ".EXE\" a").output(), tool + " a\n");
     EXPECT_EQ(Child("echo.exe a").output(), "a\n");
 
-    // A program of the system comes before a file in the current folder, which comes last.
+    // A program of the system comes before a file in the current folder, which does not count at all.
     write("echo", "#!/bin/sh\nprintf 'planted\\n'\n");
     const fs::path before = fs::current_path();
     fs::current_path(folder);
     EXPECT_EQ(Child("echo a").output(), "a\n");
+    const std::string path = std::getenv("PATH");
+    for (const std::string& entries : {path, ":" + path + ":", path + "::.:../my programs"}) {
+        ::setenv("PATH", entries.c_str(), 1);
+        EXPECT_EQ(Child("\"my tool\" a").error, ERROR_FILE_NOT_FOUND) << entries;
+    }
+    ::setenv("PATH", (path + ":" + folder.string()).c_str(), 1);
     EXPECT_EQ(Child("\"my tool\" a").output(), tool + " a\n");
+    ::setenv("PATH", path.c_str(), 1);
     EXPECT_EQ(Child("\"./my tool\" a", "/").output(), (folder / "./my tool").string() + " a\n");
     fs::current_path(before);
 }
