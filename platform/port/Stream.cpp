@@ -15,7 +15,7 @@ namespace Port {
 
 namespace {
 
-constexpr std::size_t chunkSize = 64 * 1024;
+constexpr std::size_t chunkSize = 4096;
 constexpr std::size_t longestCharacter = 4;
 
 /// Holds back the signal that a pipe without reader sends, which would end the process, for the length of a write.
