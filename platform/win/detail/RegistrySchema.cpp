@@ -23,6 +23,7 @@ struct Question {
 constexpr Question forAnyVersion[] = {
     {"SELECT count(*) FROM sqlite_schema WHERE type IN ('view', 'trigger') OR sql LIKE 'CREATE VIRTUAL%'", "0"},
     {"PRAGMA encoding", "UTF-8"},
+    {"PRAGMA integrity_check(1)", "ok"},
 };
 
 /// What the database keeps of the tables is the text they were made with.
@@ -35,6 +36,11 @@ constexpr Question forOurs[] = {
     {"SELECT count(*) FROM key k LEFT JOIN key p ON p.id = k.parent WHERE k.id <> 1 AND (p.id IS NULL OR k.name = ''"
      " OR instr(k.name, '\\') <> 0 OR substr(k.path, -1) = '\\' OR rtrim(k.path, replace(k.path, '\\', '')) <>"
      " CASE p.path WHEN '' THEN '' ELSE p.path || '\\' END)",
+     "0"},
+    // Where names are of ASCII alone, to be found without case is to be found in small letters.
+    {"SELECT count(*) FROM value WHERE folded <> lower(name) AND length(name) = length(CAST(name AS BLOB))", "0"},
+    {"SELECT count(*) FROM key WHERE length(path) = length(CAST(path AS BLOB))"
+     " AND substr(path, -length(name)) <> lower(name) AND id <> 1",
      "0"},
 };
 
@@ -54,7 +60,7 @@ const char* const make = TVX_KEY_TABLE ";" TVX_PARENT_INDEX ";" TVX_VALUE_TABLE 
                                        "PRAGMA application_id = 1414944850;"
                                        "PRAGMA user_version = 1";
 
-int examine(Connection& connection, std::int64_t version, Depth depth) {
+int examine(Connection& connection, std::int64_t version) {
     int result = SQLITE_OK;
     const auto next = [&](const Question& question) {
         result = result == SQLITE_OK ? ask(connection, question) : result;
@@ -62,7 +68,6 @@ int examine(Connection& connection, std::int64_t version, Depth depth) {
     for (const Question& question : forAnyVersion) {
         next(question);
     }
-    next({depth == Depth::Quick ? "PRAGMA quick_check(1)" : "PRAGMA integrity_check(1)", "ok"});
     for (const Question& question : forOurs) {
         if (version <= schema::version) {
             next(question);

@@ -13,13 +13,10 @@ inline constexpr std::int64_t version = 1;
 /// Makes the tables in an empty file, within a transaction.
 extern const char* const make;
 
-/// How closely the pages are looked at: as at each start, or also whether the indexes fit their tables.
-enum class Depth { Quick, Whole };
-
 /// Looks at a file of ours: nothing in it is damaged, it has our tables and nothing that could do anything by itself,
-/// and each key stands below its parent.
+/// each key stands below its parent, and names are those that they are found by.
 /// @param version  that of the file; of a newer one less is known
 /// @return SQLITE_OK, SQLITE_CORRUPT, or why it could not be looked at
-[[nodiscard]] int examine(Connection& connection, std::int64_t version, Depth depth);
+[[nodiscard]] int examine(Connection& connection, std::int64_t version);
 
 } // namespace tvx::registry::schema

@@ -21,7 +21,7 @@ bool isSound(const std::string& copy, Waiting& waiting) {
         if (connection.open(copy, waiting) == SQLITE_OK &&
             connection.number("PRAGMA application_id") == schema::applicationId) {
             const auto version = connection.number("PRAGMA user_version");
-            answer = version && schema::examine(connection, *version, schema::Depth::Whole) == SQLITE_OK;
+            answer = version && schema::examine(connection, *version) == SQLITE_OK;
         }
         connection.keepLogOnClose();
     }
@@ -53,7 +53,7 @@ DWORD Store::checkContents(std::int64_t version) {
     if (m_checked == m_identity) {
         return ERROR_SUCCESS;
     }
-    const DWORD result = failed(schema::examine(*m_connection, version, schema::Depth::Quick));
+    const DWORD result = failed(schema::examine(*m_connection, version));
     if (result == ERROR_SUCCESS) {
         m_checked = m_identity;
     }

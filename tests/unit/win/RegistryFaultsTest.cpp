@@ -254,6 +254,7 @@ TEST_F(RegistryFaults, HostileContentsAreNotUsed) {
         "UPDATE key SET parent = id WHERE name = 'Tarvex'",
         "UPDATE key SET name = '' WHERE name = 'Tarvex'",
         std::string("ALTER TABLE key RENAME TO old; CREATE VIEW key AS ") + endless,
+        "UPDATE value SET name = 'b'",
         "CREATE TRIGGER trap AFTER INSERT ON value BEGIN DELETE FROM value; END",
         "PRAGMA writable_schema = ON; UPDATE sqlite_schema SET sql = replace(sql, 'name TEXT', 'name BLOB')",
     };
