@@ -206,8 +206,8 @@ TVX_PLATFORM_API void AfxWriteStringLength(CArchive& archive, UINT_PTR length, B
 TVX_PLATFORM_API UINT_PTR AfxReadStringLength(CArchive& archive, int& characterSize);
 
 /// Stores elements of a collection, or loads them into their place. Types that have archive operators use these, other
-/// plain data go byte by byte; addresses and other types raise CNotSupportedException. Hosts specialise it for their
-/// own.
+/// plain data go byte by byte: whatever has neither virtual functions nor anything to do at its end. Addresses and
+/// other types raise CNotSupportedException. Hosts specialise it for their own.
 template <typename TYPE>
 void SerializeElements(CArchive& archive, TYPE* elements, INT_PTR count) {
     if constexpr (requires {
@@ -221,7 +221,8 @@ void SerializeElements(CArchive& archive, TYPE* elements, INT_PTR count) {
                 archive >> *element;
             }
         }
-    } else if constexpr (std::is_trivially_copyable_v<TYPE> && !std::is_pointer_v<TYPE>) {
+    } else if constexpr (std::is_trivially_destructible_v<TYPE> && !std::is_polymorphic_v<TYPE> &&
+                         !std::is_pointer_v<TYPE>) {
         for (TYPE* element = elements; element != elements + count; ++element) {
             if (archive.IsStoring()) {
                 archive.Write(element, sizeof(TYPE));

@@ -16,6 +16,7 @@
 /// @endcode
 
 #include "platform/base/Export.h"
+#include "platform/base/FormatArgument.h"
 #include "platform/base/Types.h"
 
 class CArchive;
@@ -185,6 +186,12 @@ extern TVX_PLATFORM_API CDumpContext afxDump;
 
 /// Writes a formatted line to standard error when the environment variable TVX_TRACE is set; see TRACE.
 TVX_PLATFORM_API void AfxTrace(LPCSTR format, ...) __attribute__((format(printf, 1, 2)));
+/// The same with strings among the arguments.
+template <class... Arguments>
+    requires(tvx::FormattedText<Arguments> || ...)
+void AfxTrace(LPCSTR format, Arguments... arguments) {
+    AfxTrace(format, tvx::formatArgument(arguments)...);
+}
 /// Reports a broken assertion on standard error and ends the process; see ASSERT.
 [[noreturn]] TVX_PLATFORM_API void AfxAssertFailed(LPCSTR condition, LPCSTR fileName, int line);
 /// Checks an object as ASSERT_VALID does: not null, and its own AssertValid.

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/base/Export.h"
+#include "platform/base/FormatArgument.h"
 #include "platform/base/Types.h"
 
 #include <compare>
@@ -26,14 +27,14 @@ class CStringT;
 /// A position outside the text raises CInvalidArgException where a character is asked for; ranges are cut to the text.
 /// A text that would be larger than 2 GB, or that no memory is left for, raises CMemoryException.
 ///
-/// Null pointers stand for the empty text. A string cannot be passed through "...": `printf("%s", text)` does not
-/// compile here. Pass `text.GetString()` or `(LPCTSTR)text`.
+/// Null pointers stand for the empty text. Format and TRACE take a string for "%s"; through the "..." of other calls it
+/// cannot be passed: `printf("%s", text)` does not compile here. Pass `text.GetString()` or `(LPCTSTR)text`.
 ///
 /// @code
 /// CString name = "drawing";
 /// name += ".brd";
 /// CString title;
-/// title.Format("%s (%d)", (LPCTSTR)name.Left(7), 3); // "drawing (3)"
+/// title.Format("%s (%d)", name.Left(7), 3); // "drawing (3)"
 /// @endcode
 template <>
 class TVX_PLATFORM_API CStringT<char> {
@@ -210,11 +211,37 @@ public:
     void Format(LPCSTR format, ...) __attribute__((format(printf, 2, 3)));
     /// The format is a string of the resources; an unknown one raises CInvalidArgException.
     void Format(UINT formatId, ...);
+    /// The same with strings among the arguments.
+    /// @{
+    template <class... Arguments>
+        requires(tvx::FormattedText<Arguments> || ...)
+    void Format(LPCSTR format, Arguments... arguments) {
+        Format(format, tvx::formatArgument(arguments)...);
+    }
+    template <class... Arguments>
+        requires(tvx::FormattedText<Arguments> || ...)
+    void Format(UINT formatId, Arguments... arguments) {
+        Format(formatId, tvx::formatArgument(arguments)...);
+    }
+    /// @}
     /// As Format(), with the arguments in a list.
     void FormatV(LPCSTR format, std::va_list arguments) __attribute__((format(printf, 2, 0)));
     /// Appends the formatted text.
     void AppendFormat(LPCSTR format, ...) __attribute__((format(printf, 2, 3)));
     void AppendFormat(UINT formatId, ...);
+    /// The same with strings among the arguments.
+    /// @{
+    template <class... Arguments>
+        requires(tvx::FormattedText<Arguments> || ...)
+    void AppendFormat(LPCSTR format, Arguments... arguments) {
+        AppendFormat(format, tvx::formatArgument(arguments)...);
+    }
+    template <class... Arguments>
+        requires(tvx::FormattedText<Arguments> || ...)
+    void AppendFormat(UINT formatId, Arguments... arguments) {
+        AppendFormat(formatId, tvx::formatArgument(arguments)...);
+    }
+    /// @}
     /// As AppendFormat(), with the arguments in a list.
     void AppendFormatV(LPCSTR format, std::va_list arguments) __attribute__((format(printf, 2, 0)));
 

@@ -160,8 +160,7 @@ public:
     /// @{
 
     /// Icons and cursors are looked for in the whole chain of modules, those named Standard are the system's (IDI_...,
-    /// IDC_...). They are shared and stay the framework's; null when there is none of that name or number. Of cursors
-    /// there are the system's only.
+    /// IDC_...). They are shared and stay the framework's; null when there is none of that name or number.
     HICON LoadIcon(LPCSTR name) const;
     HICON LoadIcon(UINT id) const;
     HICON LoadStandardIcon(LPCSTR name) const;

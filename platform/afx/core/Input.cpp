@@ -2,20 +2,27 @@
 #include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/gdi/detail/GdiObjects.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/win/Error.h"
+#include "platform/win/Picture.h"
 
 #include <QApplication>
 #include <QCursor>
+#include <QPixmap>
 
+#include <algorithm>
 #include <array>
+#include <map>
+#include <string>
+#include <utility>
 
 namespace tvx::afx {
 
 namespace {
 
 struct NamedCursor {
-    int id;
+    std::uintptr_t id;
     Qt::CursorShape shape;
 };
 
@@ -38,16 +45,45 @@ constexpr std::array<NamedCursor, 13> systemCursors{{
 HCURSOR shown = nullptr;
 HWND cursorWindow = nullptr;
 
+const NamedCursor* systemCursor(std::uintptr_t id) {
+    const auto* found = std::ranges::find(systemCursors, id, &NamedCursor::id);
+    return found != systemCursors.end() ? found : nullptr;
+}
+
+/// A cursor of the resources, which are handled as icons are; null when the module has none of that name.
+HCURSOR loadFromModule(HINSTANCE module, LPCSTR name) {
+    // Loaded once, as cursors are asked for anew with each move of the mouse.
+    static auto& loaded = *new std::map<std::pair<HINSTANCE, std::string>, HCURSOR>;
+    const std::string key =
+        IS_INTRESOURCE(name) ? '#' + std::to_string(reinterpret_cast<std::uintptr_t>(name)) : std::string(name);
+    HCURSOR& cursor = loaded[{module, key}];
+    if (cursor) {
+        return cursor;
+    }
+    if (const auto read = tvx::loadCursorPicture(module, name)) {
+        const QImage pixels(reinterpret_cast<const uchar*>(read->picture.pixels.data()), read->picture.width,
+                            read->picture.height, read->picture.width * 4, QImage::Format_ARGB32);
+        cursor = reinterpret_cast<HCURSOR>(addIcon(pixels.copy(), QPoint(read->hotX, read->hotY)));
+    }
+    return cursor;
+}
+
 } // namespace
 
 QCursor cursorOf(HCURSOR cursor) {
     const auto id = reinterpret_cast<std::uintptr_t>(cursor);
-    for (const NamedCursor& named : systemCursors) {
-        if (static_cast<std::uintptr_t>(named.id) == id) {
-            return QCursor(named.shape);
-        }
+    if (const NamedCursor* named = systemCursor(id)) {
+        return QCursor(named->shape);
     }
-    return QCursor(Qt::ArrowCursor);
+    // Pictures must not outlive the connection to the desktop.
+    static std::map<HCURSOR, QCursor> pictures;
+    [[maybe_unused]] static const bool cleared = (qAddPostRoutine([] { pictures.clear(); }), true);
+    if (const auto known = pictures.find(cursor); known != pictures.end()) {
+        return known->second;
+    }
+    const auto icon = icons().find(id);
+    return icon ? pictures[cursor] = QCursor(QPixmap::fromImage(icon->image), icon->hotSpot.x(), icon->hotSpot.y())
+                : QCursor(Qt::ArrowCursor);
 }
 
 bool Window::showClassCursor(WPARAM under) {
@@ -74,15 +110,12 @@ void noteCursorWindow(HWND window) {
 using namespace tvx::afx;
 
 HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name) {
-    if (!IS_INTRESOURCE(name)) {
-        SetLastError(ERROR_RESOURCE_NAME_NOT_FOUND);
-        return nullptr;
+    if (const HCURSOR own = module ? loadFromModule(module, name) : nullptr) {
+        return own;
     }
-    const auto id = static_cast<int>(reinterpret_cast<std::uintptr_t>(name));
-    for (const auto& named : systemCursors) {
-        if (named.id == id) {
-            return reinterpret_cast<HCURSOR>(static_cast<std::uintptr_t>(id));
-        }
+    const auto id = reinterpret_cast<std::uintptr_t>(name);
+    if (systemCursor(id)) {
+        return reinterpret_cast<HCURSOR>(id);
     }
     SetLastError(ERROR_RESOURCE_NAME_NOT_FOUND);
     return nullptr;
@@ -95,7 +128,7 @@ HCURSOR SetCursor(HCURSOR cursor) {
     if (widget && cursor) {
         const QCursor wanted = cursorOf(cursor);
         // Handlers of WM_SETCURSOR set the same one at every move of the mouse; the display need not hear of it.
-        if (widget->cursor().shape() != wanted.shape() || !widget->testAttribute(Qt::WA_SetCursor)) {
+        if (widget->cursor() != wanted || !widget->testAttribute(Qt::WA_SetCursor)) {
             widget->setCursor(wanted);
         }
     } else if (widget) {

@@ -105,8 +105,8 @@ TVX_PLATFORM_API BOOL GetCursorPos(POINT* point);
 TVX_PLATFORM_API BOOL SetCursorPos(int x, int y);
 /// Shows a cursor over the window that the pointer is in; meant for WM_SETCURSOR handlers. Answers the previous one.
 TVX_PLATFORM_API HCURSOR SetCursor(HCURSOR cursor);
-/// One of the system's cursors (IDC_ARROW, ...), whatever the module. Null for any other: cursors in resources are not
-/// shown here. Cursors are shared and never destroyed.
+/// A cursor of the module's resources, or one of the system's (IDC_ARROW, ...), which need no module. Null when there
+/// is none of that name or number. Cursors are shared and never destroyed.
 TVX_PLATFORM_API HCURSOR LoadCursorA(HINSTANCE module, LPCSTR name);
 /// The state of a key or mouse button (VK_...): negative when down; the lowest bit says of VK_CAPITAL, VK_NUMLOCK and
 /// VK_SCROLL whether they are on, as far as the desktop tells (a Wayland session does not). Keys that went down while

@@ -257,6 +257,8 @@ BOOL CWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
             return TRUE; // a disabled command is carried out by nobody
         }
         code = CN_COMMAND;
+    } else if (HeldNotifications::areHeldFrom(m_hWnd)) {
+        return TRUE;
     } else {
         LRESULT result = 0;
         if (SendChildNotifyLastMsg(control, WM_COMMAND, wParam, lParam, &result)) {
@@ -268,6 +270,9 @@ BOOL CWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
 
 BOOL CWnd::OnNotify(WPARAM wParam, LPARAM lParam, LRESULT* result) {
     auto* header = reinterpret_cast<NMHDR*>(lParam);
+    if (HeldNotifications::areHeldFrom(m_hWnd)) {
+        return TRUE;
+    }
     if (SendChildNotifyLastMsg(header->hwndFrom, WM_NOTIFY, wParam, lParam, result)) {
         return TRUE;
     }

@@ -2,6 +2,7 @@
 
 #include "platform/afx/controls/detail/ButtonWindow.h"
 #include "platform/afx/core/ControlMessages.h"
+#include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/dialogs/DataExchange.h"
 #include "platform/afx/dialogs/detail/DialogKeys.h"
@@ -115,6 +116,8 @@ void CWnd::DoDataExchange(CDataExchange*) {}
 
 BOOL CWnd::UpdateData(BOOL save) {
     CDataExchange dx(this, save);
+    // What the exchange itself changes is no act of the user's.
+    const HeldNotifications held(m_hWnd);
     try {
         DoDataExchange(&dx);
         return TRUE;

@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cstring>
 #include <span>
+#include <thread>
 
 namespace tvx::detail {
 
@@ -75,6 +76,21 @@ bool DesktopAnswers::ask() {
                    XCB_EVENT_MASK_SUBSTRUCTURE_REDIRECT | XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY,
                    reinterpret_cast<const char*>(&message));
     return xcb_flush(xcbOf(m_connection)) > 0;
+}
+
+std::optional<DesktopAnswers::Borders> DesktopAnswers::waitForBorders(std::chrono::milliseconds patience) {
+    const auto end = std::chrono::steady_clock::now() + patience;
+    if (!ask()) {
+        return std::nullopt;
+    }
+    do {
+        const auto reply = propertyOf(xcbOf(m_connection), m_window, m_atoms.borders);
+        if (const auto widths = numbersIn(reply); widths.size() == 4) {
+            return Borders{widths[0], widths[1], widths[2], widths[3]};
+        }
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    } while (std::chrono::steady_clock::now() < end);
+    return std::nullopt;
 }
 
 std::uint32_t DesktopAnswers::windowOf(const void* event) const {

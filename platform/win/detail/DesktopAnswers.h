@@ -2,7 +2,9 @@
 
 #include "platform/base/Types.h"
 
+#include <chrono>
 #include <cstdint>
+#include <optional>
 
 namespace tvx::detail {
 
@@ -23,6 +25,12 @@ public:
     /// Asks once more; each question gets an answer of its own, in the order of the questions.
     /// @return false when nobody will answer: there is no window manager, or it does not know the request
     [[nodiscard]] bool ask();
+    struct Borders {
+        std::uint32_t left, right, top, bottom;
+    };
+    /// The borders that a window with a caption will get. Asks and waits, unlike the rest.
+    /// @return nothing when nobody has answered in this time
+    [[nodiscard]] std::optional<Borders> waitForBorders(std::chrono::milliseconds patience);
     /// The window whose borders an event of the connection (an `xcb_generic_event_t`) tells; 0 for any other event.
     [[nodiscard]] std::uint32_t windowOf(const void* event) const;
     /// Whether that is the window that is never shown: an answer.

@@ -271,6 +271,20 @@ TEST(Archive, CollectionsAreStoredAsWhole) {
         EXPECT_EQ(CPoint(2999, -2999), loadedPoints[2999]);
         EXPECT_EQ("value", loadedMap["key"]);
     });
+    struct Corner { // plain data, though not by the language's rules
+        int x = 0;
+        Corner() = default;
+        Corner(const Corner& other) : x(other.x) {}
+        Corner& operator=(const Corner& other) = default;
+    };
+    CArray<Corner> corners;
+    corners.SetSize(2);
+    corners[1].x = 7;
+    const std::string cornerBytes = stored([&](CArchive& archive) { corners.Serialize(archive); });
+    EXPECT_EQ(2 + 2 * sizeof(Corner), cornerBytes.size());
+    corners.RemoveAll();
+    loadFrom(cornerBytes, [&](CArchive& archive) { corners.Serialize(archive); });
+    EXPECT_EQ(7, corners.GetAt(1).x);
     CPtrArray pointers;
     EXPECT_THROW(stored([&](CArchive& archive) { pointers.Add(&pointers), pointers.Serialize(archive); }),
                  CNotSupportedException*);

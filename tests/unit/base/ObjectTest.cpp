@@ -72,6 +72,7 @@ TEST(Diagnostics, TraceAndDumpSpeakOnlyWhenAsked) {
     const auto said = [&] {
         testing::internal::CaptureStderr();
         TRACE("traced %d\n", 7);
+        TRACE("traced %s\n", CString("text"));
         afxDump << circle;
         return testing::internal::GetCapturedStderr();
     };
@@ -80,7 +81,7 @@ TEST(Diagnostics, TraceAndDumpSpeakOnlyWhenAsked) {
     ::setenv("TVX_TRACE", "1", 1);
     const std::string text = said();
     ::unsetenv("TVX_TRACE");
-    EXPECT_TRUE(text.starts_with("traced 7\na CCircle at ")) << text;
+    EXPECT_TRUE(text.starts_with("traced 7\ntraced text\na CCircle at ")) << text;
     EXPECT_TRUE(text.ends_with("radius 0, next NULL\n")) << text;
 }
 

@@ -237,6 +237,12 @@ TEST(CString, FormatsAndAppends) {
     CString text;
     text.Format("%d items, %.1f %s", 3, 2.5, "mm");
     text.AppendFormat("%c%05d", ';', -42);
+    CString whole;
+    whole.Format("<%s> %d", text, 7);
+    whole.AppendFormat(" %.2s%s", CString("abc"), "d");
+    EXPECT_EQ("<" + text + "> 7 abd", whole);
+    whole.Format("%s%s", whole, whole.Left(1));
+    EXPECT_EQ("<" + text + "> 7 abd<", whole);
     EXPECT_EQ("3 items, 2.5 mm;-0042", text);
     // A lone surrogate has no text: the failure leaves the old one.
     const wchar_t lone[] = {static_cast<wchar_t>(0xD800), 0};

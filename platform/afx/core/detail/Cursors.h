@@ -1,5 +1,6 @@
 #pragma once
 
+#include "platform/base/Export.h"
 #include "platform/base/Types.h"
 
 #include <QCursor>
@@ -7,7 +8,7 @@
 namespace tvx::afx {
 
 /// The toolkit's cursor for a handle; the arrow for an unknown one.
-QCursor cursorOf(HCURSOR cursor);
+TVX_PLATFORM_API QCursor cursorOf(HCURSOR cursor);
 /// Tells which window the pointer is in, so that SetCursor knows where its cursor is to be shown.
 void noteCursorWindow(HWND window);
 

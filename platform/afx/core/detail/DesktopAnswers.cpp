@@ -10,6 +10,8 @@
 #include <QPointer>
 #include <QTimer>
 
+#include <chrono>
+#include <cmath>
 #include <deque>
 #include <memory>
 #include <utility>
@@ -102,6 +104,30 @@ Questions* questions() {
 }
 
 } // namespace
+
+namespace {
+
+QMargins askForBorders() {
+    using namespace std::chrono_literals;
+    const auto* x11 = qApp->nativeInterface<QNativeInterface::QX11Application>();
+    if (!x11 || !x11->connection()) {
+        return {};
+    }
+    // A window manager that is as busy as that is not waited for: the window is then told without its borders.
+    const auto borders = tvx::detail::DesktopAnswers(x11->connection()).waitForBorders(500ms);
+    const auto units = [](std::uint32_t pixels) {
+        return static_cast<int>(std::lround(pixels / qApp->devicePixelRatio()));
+    };
+    return borders ? QMargins(units(borders->left), units(borders->top), units(borders->right), units(borders->bottom))
+                   : QMargins();
+}
+
+} // namespace
+
+QMargins expectedWindowBorders() {
+    static const QMargins borders = askForBorders();
+    return borders;
+}
 
 Told startWhenDesktopHasAnswered(QTimer& timer) {
     Questions* asked = questions();

@@ -5,6 +5,8 @@
 
 #include "platform/base/Export.h"
 
+#include <QMargins>
+
 class QTimer;
 
 namespace tvx::afx {
@@ -18,5 +20,8 @@ enum class Told {
 /// Starts a timer when the window manager has done all that was asked of it before this call, and what it told of that
 /// has reached the windows. A timer that is gone by then is forgotten.
 TVX_PLATFORM_API Told startWhenDesktopHasAnswered(QTimer& timer);
+
+/// The borders that a window with a caption will get, none where nobody tells. The first call may wait for the answer.
+TVX_PLATFORM_API QMargins expectedWindowBorders();
 
 } // namespace tvx::afx

@@ -25,6 +25,7 @@
 #include <map>
 #include <mutex>
 #include <string>
+#include <utility>
 
 namespace tvx::afx {
 
@@ -169,6 +170,22 @@ void runIdle() {
         idleDue = true;
         QAbstractEventDispatcher::instance()->wakeUp();
     }
+}
+
+namespace {
+
+HWND heldWindow = nullptr;
+
+} // namespace
+
+HeldNotifications::HeldNotifications(HWND window) : m_before(std::exchange(heldWindow, window)) {}
+
+HeldNotifications::~HeldNotifications() {
+    heldWindow = m_before;
+}
+
+bool HeldNotifications::areHeldFrom(HWND window) {
+    return window && window == heldWindow;
 }
 
 namespace {

@@ -73,6 +73,19 @@ TVX_PLATFORM_API void armIdle();
 /// Makes idle work due if the thread finds the message worth it.
 void noteIdle(MSG& msg);
 
+/// Keeps what the controls of a window notify from it as long as this lives.
+class TVX_PLATFORM_API HeldNotifications {
+public:
+    explicit HeldNotifications(HWND window);
+    ~HeldNotifications();
+    HeldNotifications(const HeldNotifications&) = delete;
+    HeldNotifications& operator=(const HeldNotifications&) = delete;
+    static bool areHeldFrom(HWND window);
+
+private:
+    HWND m_before;
+};
+
 /// Frees windows that have ended, once no message is being handled any more.
 void bury(class Window* window);
 

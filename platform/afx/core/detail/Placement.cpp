@@ -145,7 +145,17 @@ QRect Placement::restored() const {
     return widget().isWindow() && !tellsPlaces() ? QRect(m_askedCorner, rect.size()) : rect;
 }
 
-void Placement::aboutToShow() {
+/// Window managers activate new windows of the active application whatever they ask for, unless they take no keyboard.
+void Placement::refuseKeyboard(bool refuse) {
+    QWindow* native = widget().isWindow() ? widget().windowHandle() : nullptr;
+    if (native && m_refusesKeyboard != refuse) {
+        m_refusesKeyboard = refuse;
+        native->setFlag(Qt::WindowDoesNotAcceptFocus, refuse);
+    }
+}
+
+void Placement::aboutToShow(Keyboard keyboard) {
+    refuseKeyboard(keyboard == Keyboard::Left && widget().isHidden());
     changed();
     QWindow* native = widget().windowHandle();
     if (!m_wish || widget().isVisible() || !native || !native->handle()) {
@@ -208,6 +218,9 @@ void Placement::hearWithheld() {
 void Placement::answered() {
     m_asked = false;
     const Standing standing(m_window);
+    if (!m_askAgain) {
+        refuseKeyboard(false);
+    }
     if (!isGone()) {
         hearWithheld();
     }

@@ -53,8 +53,10 @@ public:
         return m_wish || m_asked || m_settle.isActive();
     }
 
+    enum class Keyboard { Taken, Left };
     /// Called directly before the window is shown.
-    void aboutToShow();
+    /// @param keyboard Left: it stays with the window that has it, whatever the desktop does with new windows
+    void aboutToShow(Keyboard keyboard);
     /// Called for every change of place, size or state.
     void changed();
     /// Called when the desktop has told the widths of its borders.
@@ -77,6 +79,7 @@ private:
     bool isNormal() const;
     bool awaitsBorders() const;
     QSize expectedGrowth() const;
+    void refuseKeyboard(bool refuse);
     void settle();
     void ask();
     void hearWithheld();
@@ -91,6 +94,7 @@ private:
     QTimer m_answer; ///< Runs out when the desktop has done what it was asked.
     bool m_asked = false;
     bool m_askAgain = false;
+    bool m_refusesKeyboard = false; ///< Until the desktop has taken the window in.
     bool m_bordersTold = false;
     bool m_bordersComing = true; ///< False when the desktop tells nothing.
     std::optional<Wish> m_wish;

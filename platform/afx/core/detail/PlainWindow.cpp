@@ -329,10 +329,10 @@ void TopLevelWindow::applySizeLimits() {
 
 void showTopLevel(Window& window, int command) {
     QWidget& widget = *window.widget();
-    if (command != SW_HIDE && window.placement()) {
-        window.placement()->aboutToShow();
-    }
     const bool activate = command != SW_SHOWNOACTIVATE && command != SW_SHOWNA && command != SW_SHOWMINNOACTIVE;
+    if (command != SW_HIDE && window.placement()) {
+        window.placement()->aboutToShow(activate ? Placement::Keyboard::Taken : Placement::Keyboard::Left);
+    }
     widget.setAttribute(Qt::WA_ShowWithoutActivating, !activate);
     switch (command) {
     case SW_HIDE:
@@ -373,7 +373,26 @@ void TopLevelWindow::beforeShow(bool visible) {
     }
 }
 
+namespace {
+
+/// Shrinks a window that was never shown to its screen: hosts choose sizes for the screens that they were written on.
+void fitScreen(Window& window) {
+    const QRect area = window.widget()->screen()->availableGeometry();
+    QRect place = window.windowRect();
+    if (place.width() <= area.width() && place.height() <= area.height()) {
+        return;
+    }
+    place.setSize(place.size().boundedTo(area.size()));
+    place.moveCenter(area.center());
+    window.setWindowRect(place);
+}
+
+} // namespace
+
 void TopLevelWindow::showWidget(int command) {
+    if (command != SW_HIDE && !widget()->testAttribute(Qt::WA_WState_ExplicitShowHide)) {
+        fitScreen(*this);
+    }
     showTopLevel(*this, command);
 }
 

@@ -204,14 +204,19 @@ bool keepsItsPixels(const QWidget& child, WindowPart part) {
     return part == WindowPart::Client || !qobject_cast<const QMenuBar*>(&child);
 }
 
+/// What a widget covers of its parent: child frames have round corners.
+QRegion coveredBy(const QWidget& child) {
+    const QRegion mask = child.mask();
+    return mask.isEmpty() ? QRegion(child.geometry()) : mask.translated(child.pos());
+}
+
 void subtractChildren(QRegion& region, const QWidget& widget, WindowPart part) {
     for (const QObject* object : widget.children()) {
         const auto* child = qobject_cast<const QWidget*>(object);
         if (!child || !keepsItsPixels(*child, part)) {
             continue;
         }
-        const QRegion mask = child->mask();
-        region -= mask.isEmpty() ? QRegion(child->geometry()) : mask.translated(child->pos());
+        region -= coveredBy(*child);
     }
 }
 
@@ -225,7 +230,7 @@ void subtractDocumentsInFront(QRegion& region, const QWidget& widget) {
         for (auto i = siblings.indexOf(level) + 1; i < siblings.size(); ++i) {
             const auto* sibling = qobject_cast<const QMdiSubWindow*>(siblings[i]);
             if (sibling && !sibling->isHidden()) {
-                region -= QRect(widget.mapFrom(level->parentWidget(), sibling->pos()), sibling->size());
+                region -= coveredBy(*sibling).translated(widget.mapFrom(level->parentWidget(), QPoint()));
             }
         }
     }

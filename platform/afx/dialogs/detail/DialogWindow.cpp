@@ -5,6 +5,7 @@
 #include "platform/afx/controls/detail/ButtonWindow.h"
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/Wnd.h"
+#include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PlainWindow.h"
@@ -18,6 +19,7 @@
 
 #include <QAccessible>
 #include <QApplication>
+#include <QFontInfo>
 #include <QFontMetrics>
 #include <QScreen>
 #include <QWindow>
@@ -116,7 +118,10 @@ QMargins DialogWindow::expectedBorders() const {
     // A frame is known only of a window that is shown; the owner's is like the dialog's will be.
     const QWidget* over = framed && owner() ? owner()->widget() : nullptr;
     const QWindow* native = over && over->isVisible() ? over->windowHandle() : nullptr;
-    return native ? native->frameMargins() : QMargins();
+    if (native && !native->frameMargins().isNull()) {
+        return native->frameMargins();
+    }
+    return framed ? expectedWindowBorders() : QMargins();
 }
 
 void DialogWindow::setClientSize(QPoint corner, QSize inside) {
@@ -153,6 +158,20 @@ void DialogWindow::showWidget(int command) {
 
 // --- units and fonts ---
 
+namespace {
+
+/// Makes a template's font larger by as much as the desktop's is larger than the one that templates were laid out
+/// beside: who chose large menus reads dialogs as well. A smaller one would leave texts that nobody can read.
+void followDesktop(LOGFONTA& font) {
+    constexpr int usualPixels = 12; // of nine points, which a desktop has that nobody has set
+    const int desktop = QFontInfo(QApplication::font("QMenu")).pixelSize();
+    if (desktop > usualPixels) {
+        font.lfHeight = scaled(font.lfHeight, desktop, usualPixels);
+    }
+}
+
+} // namespace
+
 void DialogWindow::useFont(const DialogTemplate& description) {
     LOGFONTA font = pointFont(description.font ? description.font->pointSize * 10 : 80,
                               description.font ? description.font->faceName : "MS Shell Dlg");
@@ -160,6 +179,7 @@ void DialogWindow::useFont(const DialogTemplate& description) {
         font.lfWeight = description.font->weight;
         font.lfItalic = description.font->italic ? 1 : 0;
     }
+    followDesktop(font);
     const HFONT old = std::exchange(m_ownFont, CreateFontIndirectA(&font));
     SendMessageA(handle(), WM_SETFONT, reinterpret_cast<WPARAM>(m_ownFont), FALSE);
     DeleteObject(reinterpret_cast<HGDIOBJ>(old));

@@ -20,8 +20,8 @@ public:
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void setWindowRect(const QRect& rect) override;
     int accessibleRole() const override;
-    /// Those of the owner, which has a caption as most dialogs do: sizes that a host computes for the whole window
-    /// then come out right before the desktop has told them.
+    /// Those of the owner, which has a caption as most dialogs do, or those that the desktop promises: sizes that a
+    /// host computes for the whole window then come out right before the desktop has told them.
     QMargins expectedBorders() const override;
     /// Gives the area inside a size, and the window a corner.
     void setClientSize(QPoint corner, QSize inside);

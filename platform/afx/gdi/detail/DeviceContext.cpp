@@ -74,6 +74,9 @@ MemoryTarget* DeviceContext::memory() const {
 
 std::shared_ptr<const RealizedFont> DeviceContext::font() const {
     LOGFONTA device = state.font->description;
+    if (state.font.object->owner == GdiOwner::Stock) {
+        return realizeFont(device); // of the device, whatever the mapping
+    }
     const QSize size = state.mapping.sizeToDevice({std::abs(device.lfWidth), std::abs(device.lfHeight)});
     // A height that a mapping mode makes smaller than a pixel must not become 0, which means the default height.
     if (device.lfHeight != 0) {

@@ -296,6 +296,21 @@ TEST_F(FramesOnDesktop, HaveDialogsOverTheirMiddleInTheWholeSizeThatTheyGaveThem
     dialog.DestroyWindow();
 }
 
+TEST_F(FramesOnDesktop, KeepTheKeyboardWhenAWindowIsShownWithoutActivation) {
+    frame->ShowWindow(SW_SHOW);
+    ASSERT_TRUE(QTest::qWaitForWindowActive(frame->GetState()->widget()));
+    CDialog dialog;
+    ASSERT_TRUE(dialog.Create(IDD_EMPTY, frame.get()));
+    dialog.ShowWindow(SW_SHOWNOACTIVATE);
+    QWidget& widget = *dialog.GetState()->widget();
+    const auto mayBeGiven = [&] { return (widget.windowHandle()->flags() & Qt::WindowDoesNotAcceptFocus) == 0; };
+    ASSERT_TRUE(QTest::qWaitFor([&] { return widget.windowHandle()->isExposed() && mayBeGiven(); }, patience));
+    EXPECT_TRUE(frame->GetState()->widget()->isActiveWindow());
+    dialog.SetActiveWindow();
+    EXPECT_TRUE(QTest::qWaitFor([&] { return widget.isActiveWindow(); }, patience));
+    dialog.DestroyWindow();
+}
+
 TEST(DialogsOnDesktop, KeepTheirInsideAndStandWhereTheyStood) {
     CDialog dialog;
     ASSERT_TRUE(dialog.Create(IDD_EMPTY));
@@ -311,10 +326,13 @@ TEST(DialogsOnDesktop, KeepTheirInsideAndStandWhereTheyStood) {
     };
     const auto framed = [&] { return rect().Width() > client().Width(); };
     const CRect inside = client();
-    dialog.MoveWindow(200, 150, inside.Width(), inside.Height());
-    dialog.ShowWindow(SW_SHOW);
-    ASSERT_TRUE(QTest::qWaitFor([&] { return framed() && rect().TopLeft() == CPoint(200, 150); }, patience))
-        << words(rect());
+    const CSize outside = rect().Size();
+    EXPECT_TRUE(framed()) << "borders count before they are there";
+    dialog.MoveWindow(200, 150, outside.cx, outside.cy);
+    dialog.ShowWindow(SW_SHOWNOACTIVATE);
+    const QWindow& native = *dialog.GetState()->widget()->windowHandle();
+    ASSERT_TRUE(QTest::qWaitFor([&] { return native.frameMargins().top() > 0; }, patience));
+    ASSERT_TRUE(QTest::qWaitFor([&] { return rect() == CRect(CPoint(200, 150), outside); }, patience)) << words(rect());
     EXPECT_EQ(client(), inside) << "the borders are around it, not in it: " << words(client());
     const WINDOWPLACEMENT placement = placementOf(dialog);
     dialog.DestroyWindow();

@@ -8,6 +8,12 @@ class ExchangeDialog : public ScriptedDialog {
 public:
     ExchangeDialog() : ScriptedDialog(IDD_SHAPE) {}
     std::function<void(CDataExchange*)> exchange;
+    int changes = 0; ///< Changes of the name that its handler would have been told.
+
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override {
+        changes += id == IDC_NAME && code == EN_CHANGE ? 1 : 0;
+        return ScriptedDialog::OnCmdMsg(id, code, extra, info);
+    }
 
 protected:
     void DoDataExchange(CDataExchange* dx) override {
@@ -52,6 +58,21 @@ TEST(DataExchange, MovesValuesBothWays) {
     EXPECT_EQ(scale, -25.0);
     EXPECT_EQ(kind, 1);
     EXPECT_EQ(visible, 0);
+}
+
+TEST(DataExchange, FillsControlsWithoutANotification) {
+    ExchangeDialog dialog;
+    CString name = "Gear";
+    dialog.exchange = [&](CDataExchange* dx) { DDX_Text(dx, IDC_NAME, name); };
+    dialog.script = [&] {
+        name = "Shaft";
+        EXPECT_TRUE(dialog.UpdateData(FALSE));
+        EXPECT_EQ(textOf(dialog.GetDlgItem(IDC_NAME)), "Shaft");
+        EXPECT_EQ(dialog.changes, 0);
+        dialog.SetDlgItemText(IDC_NAME, "Wheel");
+        EXPECT_EQ(dialog.changes, 1);
+    };
+    dialog.DoModal();
 }
 
 TEST(DataExchange, RefusesWhatIsNoNumber) {

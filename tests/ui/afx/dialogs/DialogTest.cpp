@@ -74,6 +74,26 @@ TEST(DialogTemplates, PlaceControlsInUnitsOfTheFont) {
     EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
 }
 
+TEST(DialogTemplates, FollowTheFontSizeOfTheDesktop) {
+    const QFont before = QApplication::font();
+    const auto shownUnits = [](int desktopPixels) {
+        QFont font = QApplication::font();
+        font.setPixelSize(desktopPixels);
+        QApplication::setFont(font);
+        CDialog dialog;
+        EXPECT_TRUE(dialog.Create(IDD_EMPTY));
+        CRect units(0, 0, 4, 8);
+        dialog.MapDialogRect(&units);
+        dialog.DestroyWindow();
+        return units.Size();
+    };
+    EXPECT_EQ(shownUnits(9), CSize(6, 13)) << "never smaller than the template says";
+    const CSize twice = shownUnits(24);
+    EXPECT_NEAR(twice.cx, 12, 1);
+    EXPECT_NEAR(twice.cy, 26, 1);
+    QApplication::setFont(before);
+}
+
 TEST(DialogTemplates, OpenWithControlsOfUnknownClassesAndFillBoxes) {
     ShapeDialog dialog;
     dialog.script = [&] {

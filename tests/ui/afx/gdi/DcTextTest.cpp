@@ -107,6 +107,20 @@ TEST(Fonts, ScaleWithTheMappingMode) {
     EXPECT_GE(ink.right, device.cx - 3);
 }
 
+TEST(Fonts, OfTheStockKeepTheirSizeOnTheDevice) {
+    MemoryDc dc(200, 40);
+    for (const int stock : {SYSTEM_FONT, DEFAULT_GUI_FONT, ANSI_FIXED_FONT}) {
+        dc.SelectStockObject(stock);
+        dc.SetMapMode(MM_TEXT);
+        const CSize plain = dc.GetTextExtent("Application", 11);
+        dc.SetMapMode(MM_LOMETRIC);
+        CSize metric = dc.GetTextExtent("Application", 11);
+        dc.LPtoDP(&metric);
+        EXPECT_NEAR(metric.cx, plain.cx, 1) << stock;
+        EXPECT_NEAR(metric.cy, plain.cy, 1) << stock;
+    }
+}
+
 TEST(Fonts, KeepABrokenDescriptionHarmless) {
     LOGFONT description;
     std::memset(&description, 'x', sizeof description); // no NUL in the name, absurd numbers

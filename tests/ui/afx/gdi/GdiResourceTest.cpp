@@ -1,7 +1,10 @@
 #include "tests/data/resources/resource.h"
 #include "tests/ui/afx/gdi/MemoryDc.h"
 
+#include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
+#include "platform/win/ExtensionModule.h"
 
 #include <gtest/gtest.h>
 
@@ -40,6 +43,19 @@ TEST(Resources, AreLoadedByNumberAndByName) {
     const HBITMAP bare = LoadBitmapA(nullptr, MAKEINTRESOURCE(IDB_STRIPES));
     EXPECT_NE(bare, nullptr);
     EXPECT_TRUE(DeleteObject(bare));
+}
+
+TEST(Cursors, AreLoadedFromTheirModuleOrAreTheSystems) {
+    const HINSTANCE module = AfxGetInstanceHandle();
+    const HCURSOR pointer = LoadCursorA(module, MAKEINTRESOURCE(IDC_POINTER));
+    const QCursor shown = tvx::afx::cursorOf(pointer);
+    EXPECT_EQ(shown.shape(), Qt::BitmapCursor);
+    EXPECT_EQ(shown.hotSpot(), QPoint(1, 0));
+    EXPECT_EQ(shown.pixmap().size(), QSize(2, 2));
+    EXPECT_EQ(shown, tvx::afx::cursorOf(LoadCursorA(module, MAKEINTRESOURCE(IDC_POINTER)))) << "loaded once";
+    EXPECT_EQ(tvx::afx::cursorOf(LoadCursorA(nullptr, IDC_CROSS)).shape(), Qt::CrossCursor);
+    EXPECT_EQ(LoadCursorA(nullptr, MAKEINTRESOURCE(IDC_POINTER)), nullptr) << "that is none of the system's";
+    EXPECT_EQ(LoadCursorA(module, "no such cursor"), nullptr);
 }
 
 TEST(Icons, AreDrawnOverWhatIsThere) {

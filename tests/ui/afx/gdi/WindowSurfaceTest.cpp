@@ -229,6 +229,9 @@ TEST_F(Surface, DoesNotDrawOverDocumentsInFront) {
     dc.FillSolidRect(0, 0, 200, 200, plainRed);
     EXPECT_EQ(dc.GetPixel(covered.x(), covered.y()), CLR_INVALID);
     EXPECT_EQ(dc.GetPixel(5, 5), plainRed);
+    front->setMask(front->mask() - QRect(10, 10, 1, 1));
+    EXPECT_NE(dc.GetPixel(covered.x(), covered.y()), CLR_INVALID) << "seen through a corner cut out of the other";
+    front->clearMask();
     area.setActiveSubWindow(back);
     settle();
     EXPECT_NE(dc.GetPixel(covered.x(), covered.y()), CLR_INVALID);
