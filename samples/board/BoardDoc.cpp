@@ -46,22 +46,19 @@ BEGIN_MESSAGE_MAP(CBoardDoc, CDocument)
 END_MESSAGE_MAP()
 // clang-format on
 
-void CBoardDoc::Change(board::Drawing drawing) {
-    if (drawing == m_drawing) {
-        return;
+void CBoardDoc::Change(board::Change change) {
+    if (!change.isNothing()) {
+        Changed(m_history.make(std::move(change), m_drawing));
     }
-    m_history.remember(std::exchange(m_drawing, std::move(drawing)));
-    Changed();
 }
 
-void CBoardDoc::Changed() {
-    SetModifiedFlag(m_drawing != m_saved);
-    UpdateAllViews(nullptr);
+void CBoardDoc::Changed(const board::Change& change) {
+    SetModifiedFlag(!m_history.isSaved());
+    UpdateAllViews(nullptr, reinterpret_cast<LPARAM>(&change));
 }
 
 void CBoardDoc::DeleteContents() {
     m_drawing = {};
-    m_saved = {};
     m_history.clear();
 }
 
@@ -107,7 +104,6 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     }
     DeleteContents();
     m_drawing = std::move(result.drawing);
-    m_saved = m_drawing;
     SetModifiedFlag(FALSE);
     return TRUE;
 }
@@ -133,7 +129,7 @@ BOOL CBoardDoc::OnSaveDocument(LPCSTR path) {
         return FALSE;
     }
     ReleaseFile(file, FALSE);
-    m_saved = m_drawing;
+    m_history.save();
     SetModifiedFlag(FALSE);
     return TRUE;
 }
@@ -141,13 +137,11 @@ BOOL CBoardDoc::OnSaveDocument(LPCSTR path) {
 // --- undo ---
 
 void CBoardDoc::OnEditUndo() {
-    m_history.undo(m_drawing);
-    Changed();
+    Changed(m_history.undo(m_drawing));
 }
 
 void CBoardDoc::OnEditRedo() {
-    m_history.redo(m_drawing);
-    Changed();
+    Changed(m_history.redo(m_drawing));
 }
 
 void CBoardDoc::OnUpdateEditUndo(CCmdUI* item) {

@@ -3,7 +3,7 @@
 #include "Drawing.h"
 #include "afxwin.h"
 
-/// A drawing, with its file and the states that Undo goes through.
+/// A drawing, with its file and the changes that Undo goes through.
 class CBoardDoc : public CDocument {
     DECLARE_DYNCREATE(CBoardDoc)
 
@@ -11,8 +11,8 @@ public:
     const board::Drawing& GetDrawing() const {
         return m_drawing;
     }
-    /// Replaces the drawing, as a change that can be undone.
-    void Change(board::Drawing drawing);
+    /// Makes a change that can be undone. The views are told of it: their hint is a pointer to the board::Change.
+    void Change(board::Change change);
 
     BOOL OnOpenDocument(LPCSTR path) override;
     BOOL OnSaveDocument(LPCSTR path) override;
@@ -26,10 +26,9 @@ public:
 private:
     /// Adopts what was read, or tells the user what is wrong with it.
     BOOL Take(const char* path, const std::string& text);
-    void Changed();
+    void Changed(const board::Change& change);
 
     board::Drawing m_drawing;
-    board::Drawing m_saved; ///< As the file has it.
     board::History m_history;
 
     DECLARE_MESSAGE_MAP()

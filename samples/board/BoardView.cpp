@@ -85,12 +85,41 @@ void CBoardView::OnInitialUpdate() {
     CScrollView::OnInitialUpdate();
 }
 
-void CBoardView::OnUpdate(CView*, LPARAM, CObject*) {
+void CBoardView::OnUpdate(CView*, LPARAM hint, CObject*) {
     if (m_selected >= static_cast<int>(GetDocument()->GetDrawing().shapes.size())) {
         m_selected = -1;
     }
     ShowScrollArea();
-    Invalidate();
+    const auto* change = reinterpret_cast<const Change*>(hint);
+    if (!change) {
+        Invalidate();
+        return;
+    }
+    for (const auto* shapes : {&change->removed, &change->added}) {
+        for (const Shape& shape : *shapes) {
+            InvalidateArea(ReachOf(shape));
+        }
+    }
+    InvalidateMarked();
+}
+
+/// The shape that has handles: the draft, else the selected one.
+const Shape* CBoardView::Marked() const {
+    return m_draft ? &*m_draft : Selected();
+}
+
+void CBoardView::InvalidateArea(CRect area) {
+    area.InflateRect(handleReach, handleReach);
+    area.OffsetRect(-GetScrollPosition());
+    InvalidateRect(area);
+}
+
+// A large drawing is not drawn again for one shape: only where the shape with the handles was, and where it is now.
+void CBoardView::InvalidateMarked() {
+    InvalidateArea(m_markedArea);
+    if (const Shape* shape = Marked()) {
+        InvalidateArea(ReachOf(*shape));
+    }
 }
 
 void CBoardView::ShowScrollArea() {
@@ -101,16 +130,23 @@ void CBoardView::ShowScrollArea() {
 
 void CBoardView::OnDraw(CDC* dc) {
     DrawGrid(*dc);
+    CRect clip;
+    dc->GetClipBox(clip);
     const auto& shapes = GetDocument()->GetDrawing().shapes;
     for (int i = 0; i < static_cast<int>(shapes.size()); ++i) {
         const bool drafted = m_draft && !m_draftIsNew && i == m_selected;
-        DrawShape(*dc, drafted ? *m_draft : shapes[i]);
+        const Shape& shape = drafted ? *m_draft : shapes[i];
+        if (CRect().IntersectRect(clip, ReachOf(shape))) {
+            DrawShape(*dc, shape);
+        }
     }
     if (m_draft && m_draftIsNew) {
         DrawShape(*dc, *m_draft);
     }
-    if (const Shape* shape = m_draft ? &*m_draft : Selected()) {
-        DrawHandles(*dc, *shape);
+    const Shape* marked = Marked();
+    m_markedArea = marked ? ReachOf(*marked) : CRect();
+    if (marked) {
+        DrawHandles(*dc, *marked);
     }
 }
 
@@ -161,7 +197,7 @@ const Shape* CBoardView::Selected() const {
 void CBoardView::Select(int index) {
     if (index != m_selected) {
         m_selected = index;
-        Invalidate();
+        InvalidateMarked();
     }
 }
 
@@ -239,7 +275,7 @@ void CBoardView::OnMouseMove(UINT, CPoint point) {
         moveHandle(*m_draft, m_handle, place);
     }
     m_last = place;
-    Invalidate();
+    InvalidateMarked();
 }
 
 void CBoardView::OnLButtonUp(UINT, CPoint) {
@@ -264,7 +300,7 @@ void CBoardView::EndDrag(bool keep) {
         KeepDraft();
     }
     m_draft.reset();
-    Invalidate();
+    InvalidateMarked();
 }
 
 void CBoardView::KeepDraft() {
@@ -284,16 +320,20 @@ void CBoardView::KeepDraft() {
         }
         shape.text = dialog.GetText().GetString();
     }
-    Drawing drawing = GetDocument()->GetDrawing();
-    drawing.shapes.push_back(std::move(shape));
-    m_selected = static_cast<int>(drawing.shapes.size()) - 1;
-    GetDocument()->Change(std::move(drawing));
+    const Drawing& drawing = GetDocument()->GetDrawing();
+    const int number = static_cast<int>(drawing.shapes.size());
+    GetDocument()->Change(Change::addition(drawing, std::move(shape)));
+    Select(number);
 }
 
 void CBoardView::ReplaceSelected(Shape shape) {
-    Drawing drawing = GetDocument()->GetDrawing();
-    drawing.shapes[m_selected] = std::move(shape);
-    GetDocument()->Change(std::move(drawing));
+    GetDocument()->Change(Change::replacement(GetDocument()->GetDrawing(), m_selected, std::move(shape)));
+}
+
+void CBoardView::MoveSelected(int place) {
+    const Change change = Change::move(GetDocument()->GetDrawing(), m_selected, place);
+    m_selected = place;
+    GetDocument()->Change(change);
 }
 
 void CBoardView::OnLButtonDblClk(UINT flags, CPoint point) {
@@ -386,14 +426,9 @@ void CBoardView::OnUpdateFill(CCmdUI* item) {
 }
 
 void CBoardView::OnEditClear() {
-    Drawing drawing = GetDocument()->GetDrawing();
-    // The comments before the shape stay, with the shape that follows it.
-    const auto shape = drawing.shapes.begin() + m_selected;
-    std::string& after = shape + 1 == drawing.shapes.end() ? drawing.linesAfter : (shape + 1)->linesBefore;
-    after.insert(0, shape->linesBefore);
-    drawing.shapes.erase(shape);
+    const Change change = Change::deletion(GetDocument()->GetDrawing(), m_selected);
     m_selected = -1;
-    GetDocument()->Change(std::move(drawing));
+    GetDocument()->Change(change);
 }
 
 void CBoardView::OnEditText() {
@@ -406,17 +441,11 @@ void CBoardView::OnEditText() {
 }
 
 void CBoardView::OnToFront() {
-    Drawing drawing = GetDocument()->GetDrawing();
-    std::rotate(drawing.shapes.begin() + m_selected, drawing.shapes.begin() + m_selected + 1, drawing.shapes.end());
-    m_selected = static_cast<int>(drawing.shapes.size()) - 1;
-    GetDocument()->Change(std::move(drawing));
+    MoveSelected(static_cast<int>(GetDocument()->GetDrawing().shapes.size()) - 1);
 }
 
 void CBoardView::OnToBack() {
-    Drawing drawing = GetDocument()->GetDrawing();
-    std::rotate(drawing.shapes.begin(), drawing.shapes.begin() + m_selected, drawing.shapes.begin() + m_selected + 1);
-    m_selected = 0;
-    GetDocument()->Change(std::move(drawing));
+    MoveSelected(0);
 }
 
 void CBoardView::OnUpdateSelected(CCmdUI* item) {

@@ -68,7 +68,11 @@ private:
     void EndDrag(bool keep);
     void KeepDraft();
     void ReplaceSelected(board::Shape shape);
+    void MoveSelected(int place);
     void ShowScrollArea();
+    const board::Shape* Marked() const;
+    void InvalidateArea(CRect area);
+    void InvalidateMarked();
 
     void DrawGrid(CDC& dc) const;
     void DrawHandles(CDC& dc, const board::Shape& shape) const;
@@ -84,6 +88,7 @@ private:
     board::Point m_last;
     std::optional<board::Shape> m_draft; ///< The shape being drawn, moved or resized.
     bool m_draftIsNew = false;
+    CRect m_markedArea; ///< Where draft and handles were when they were drawn last, in the drawing's coordinates.
 
     DECLARE_MESSAGE_MAP()
 };

@@ -68,28 +68,87 @@ Point Drawing::extent() const {
     return corner;
 }
 
+namespace {
+
+/// Takes as many shapes out as `removed` has, and puts others in.
+void exchange(std::vector<Shape>& shapes, int from, const std::vector<Shape>& removed, int to,
+              const std::vector<Shape>& added) {
+    if (from == to && removed.size() == added.size()) { // the others need not move
+        std::copy(added.begin(), added.end(), shapes.begin() + from);
+        return;
+    }
+    shapes.erase(shapes.begin() + from, shapes.begin() + from + static_cast<std::ptrdiff_t>(removed.size()));
+    shapes.insert(shapes.begin() + to, added.begin(), added.end());
+}
+
+} // namespace
+
+Change Change::addition(const Drawing& drawing, Shape shape) {
+    const int end = static_cast<int>(drawing.shapes.size());
+    return {end, {}, end, {std::move(shape)}, {}};
+}
+
+Change Change::replacement(const Drawing& drawing, int number, Shape shape) {
+    return {number, {drawing.shapes[number]}, number, {std::move(shape)}, {}};
+}
+
+Change Change::deletion(const Drawing& drawing, int number) {
+    const Shape& shape = drawing.shapes[number];
+    Change change{number, {shape}, number, {}, {}};
+    if (number + 1 == static_cast<int>(drawing.shapes.size())) {
+        change.linesBehind = shape.linesBefore;
+    } else if (!shape.linesBefore.empty()) {
+        Shape next = drawing.shapes[number + 1];
+        change.removed.push_back(next);
+        next.linesBefore.insert(0, shape.linesBefore);
+        change.added.push_back(std::move(next));
+    }
+    return change;
+}
+
+Change Change::move(const Drawing& drawing, int from, int to) {
+    return {from, {drawing.shapes[from]}, to, {drawing.shapes[from]}, {}};
+}
+
+void Change::make(Drawing& drawing) const {
+    exchange(drawing.shapes, from, removed, to, added);
+    drawing.linesAfter.insert(0, linesBehind);
+}
+
+void Change::takeBack(Drawing& drawing) const {
+    drawing.linesAfter.erase(0, linesBehind.size());
+    exchange(drawing.shapes, to, added, from, removed);
+}
+
 void History::clear() {
-    m_past.clear();
-    m_future.clear();
+    *this = {};
 }
 
-void History::remember(Drawing before) {
-    m_past.push_back(std::move(before));
-    m_future.clear();
-}
-
-void History::undo(Drawing& current) {
-    if (canUndo()) {
-        m_future.push_back(std::exchange(current, std::move(m_past.back())));
-        m_past.pop_back();
+const Change& History::make(Change change, Drawing& drawing) {
+    if (m_saved > m_made) { // no way leads back there
+        m_saved.reset();
     }
+    m_changes.resize(m_made);
+    change.make(drawing);
+    m_changes.push_back(std::move(change));
+    ++m_made;
+    return m_changes.back();
 }
 
-void History::redo(Drawing& current) {
-    if (canRedo()) {
-        m_past.push_back(std::exchange(current, std::move(m_future.back())));
-        m_future.pop_back();
-    }
+const Change& History::undo(Drawing& drawing) {
+    const Change& change = m_changes[--m_made];
+    change.takeBack(drawing);
+    return change;
+}
+
+const Change& History::redo(Drawing& drawing) {
+    const Change& change = m_changes[m_made++];
+    change.make(drawing);
+    return change;
+}
+
+void History::save() {
+    m_saved = m_made;
 }
 
 } // namespace board

@@ -1,6 +1,8 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -96,26 +98,62 @@ struct ReadResult {
 /// The text of a drawing; reading it gives the same drawing.
 [[nodiscard]] std::string writeDrawing(const Drawing& drawing);
 
-/// The states of a drawing that Undo and Redo go through.
+/// One change of a drawing: some shapes leave, others come. It holds these shapes and no others, so that a change of a
+/// large drawing is small.
+struct Change {
+    int from = 0;               ///< The number of the first shape that leaves.
+    std::vector<Shape> removed; ///< The shapes that leave; they stand side by side.
+    int to = 0;                 ///< The number that the first shape has which comes, when the others have left.
+    std::vector<Shape> added;
+    std::string linesBehind; ///< Comments of a shape that left, put before the lines behind the last shape.
+
+    /// Puts a shape above all others.
+    [[nodiscard]] static Change addition(const Drawing& drawing, Shape shape);
+    /// Puts a shape in the place of another one.
+    [[nodiscard]] static Change replacement(const Drawing& drawing, int number, Shape shape);
+    /// Takes a shape away. The comments before it stay, with the shape that follows it.
+    [[nodiscard]] static Change deletion(const Drawing& drawing, int number);
+    /// Moves a shape to another place in the order of all.
+    [[nodiscard]] static Change move(const Drawing& drawing, int from, int to);
+
+    /// Whether making it leaves the drawing as it is.
+    [[nodiscard]] bool isNothing() const {
+        return from == to && removed == added && linesBehind.empty();
+    }
+    void make(Drawing& drawing) const;
+    void takeBack(Drawing& drawing) const;
+};
+
+/// The changes of a drawing that Undo and Redo go through.
 class History {
 public:
-    /// Forgets everything.
+    /// Forgets everything; the drawing counts as saved.
     void clear();
-    /// Remembers the state before a change; states that were undone are forgotten.
-    void remember(Drawing before);
+    /// Makes a change and remembers it; changes that were undone are forgotten.
+    /// @return the change, valid until the next one is made
+    const Change& make(Change change, Drawing& drawing);
     [[nodiscard]] bool canUndo() const {
-        return !m_past.empty();
+        return m_made > 0;
     }
     [[nodiscard]] bool canRedo() const {
-        return !m_future.empty();
+        return m_made < m_changes.size();
     }
-    /// Exchanges @p current for the state before, or the one after. Nothing happens when there is none.
-    void undo(Drawing& current);
-    void redo(Drawing& current);
+    /// Takes the last change back, or makes the one again that was taken back last. There must be one. The result as
+    /// of make().
+    const Change& undo(Drawing& drawing);
+    const Change& redo(Drawing& drawing);
+
+    /// Notes that the drawing's file has it as it is now.
+    void save();
+    /// Whether the drawing is as it was when it was saved.
+    [[nodiscard]] bool isSaved() const {
+        return m_saved == m_made;
+    }
 
 private:
-    std::vector<Drawing> m_past;
-    std::vector<Drawing> m_future;
+    std::vector<Change> m_changes;
+    std::size_t m_made = 0;                ///< How many of them are made; the others were taken back.
+    std::optional<std::size_t> m_saved{0}; ///< How many were made when the drawing was saved, if they still are known.
 };
 
 } // namespace board

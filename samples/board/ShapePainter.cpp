@@ -1,5 +1,7 @@
 #include "ShapePainter.h"
 
+#include <algorithm>
+
 using namespace board;
 
 namespace {
@@ -59,4 +61,24 @@ void DrawShape(CDC& dc, const Shape& shape) {
     drawOutline(dc, shape);
     dc.SelectObject(brushBefore);
     dc.SelectObject(penBefore);
+}
+
+CRect ReachOf(const Shape& shape) {
+    CRect reach = boxOf(shape);
+    if (shape.kind == ShapeKind::Text) {
+        // A text may run over the right and lower side of its box. Letters of the alphabet are hardly wider than high;
+        // others have more bytes. Lines are broken at blanks and beside characters of more than a byte.
+        const auto mayBreak = [](char c) { return c <= ' ' || c == '-'; }; // negative: a byte of several
+        const auto breaks = std::count_if(shape.text.begin(), shape.text.end(), mayBreak);
+        const int most = 2 * maxCoordinate;
+        const int wide =
+            shape.size * 5 / 4 * static_cast<int>(std::min<std::size_t>(shape.text.size(), most / shape.size));
+        const int high = shape.size * 2 * static_cast<int>(std::min<std::ptrdiff_t>(breaks + 1, most / shape.size));
+        reach.right = std::max<LONG>(reach.right, reach.left + wide);
+        reach.bottom = std::max<LONG>(reach.bottom, reach.top + high);
+    }
+    reach.InflateRect(shape.width, shape.width);
+    reach.right += 1;
+    reach.bottom += 1;
+    return reach;
 }

@@ -4,6 +4,7 @@
 #include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
+#include <malloc.h>
 #include <random>
 
 using namespace board;
@@ -126,20 +127,113 @@ TEST(Drawing, HitsTheTopmostShapeAndMovesWithinItsLimits) {
     EXPECT_EQ(shape.to.y - shape.from.y, 50);
 }
 
-TEST(History, GoesBackAndForthUntilSomethingNewIsDone) {
+Drawing drawingOf(int count) {
+    Drawing drawing;
+    for (int i = 0; i < count; ++i) {
+        drawing.shapes.emplace_back().linesBefore = "# " + std::to_string(i);
+    }
+    drawing.linesAfter = "# end";
+    return drawing;
+}
+
+Shape shapeOf(const std::string& text) {
+    Shape shape;
+    shape.text = text;
+    return shape;
+}
+
+/// A change of any kind, of any shape.
+Change anyChange(const Drawing& drawing, std::mt19937& random) {
+    const int count = static_cast<int>(drawing.shapes.size());
+    const int number = count > 0 ? static_cast<int>(random() % count) : 0;
+    switch (count > 0 ? random() % 5 : 0) {
+    case 0:
+        return Change::addition(drawing, shapeOf(std::to_string(random())));
+    case 1:
+        return Change::deletion(drawing, number);
+    case 2:
+        return Change::move(drawing, number, count - 1);
+    case 3:
+        return Change::move(drawing, number, 0);
+    default:
+        return Change::replacement(drawing, number, shapeOf(std::to_string(random())));
+    }
+}
+
+TEST(History, GoesThroughAllChangesBackAndForth) {
+    std::mt19937 random(3);
     History history;
-    Drawing current;
-    history.remember(current);
-    current.shapes.emplace_back();
-    const Drawing one = current;
-    history.undo(current);
-    EXPECT_TRUE(current.shapes.empty());
+    Drawing drawing = drawingOf(6);
+    std::vector<Drawing> states{drawing};
+    for (int i = 0; i < 400; ++i) {
+        history.make(anyChange(drawing, random), drawing);
+        states.push_back(drawing);
+    }
+    for (std::size_t at = states.size() - 1; at-- > 0;) {
+        history.undo(drawing);
+        ASSERT_EQ(drawing, states[at]) << at;
+    }
     EXPECT_FALSE(history.canUndo());
-    history.redo(current);
-    EXPECT_EQ(current, one);
-    history.undo(current);
-    history.remember(current);
-    EXPECT_FALSE(history.canRedo());
+    for (std::size_t at = 1; at < states.size(); ++at) {
+        history.redo(drawing);
+        ASSERT_EQ(drawing, states[at]) << at;
+    }
+    history.undo(drawing);
+    history.make(anyChange(drawing, random), drawing);
+    EXPECT_FALSE(history.canRedo()) << "something new was done";
+}
+
+TEST(Change, DeletionKeepsCommentsAndMovesKeepTheOthersInOrder) {
+    const auto order = [](const Drawing& drawing) {
+        std::string lines;
+        for (const Shape& shape : drawing.shapes) {
+            lines += shape.linesBefore + '|';
+        }
+        return lines + drawing.linesAfter;
+    };
+    Drawing drawing = drawingOf(4);
+    Change::move(drawing, 1, 3).make(drawing);
+    EXPECT_EQ(order(drawing), "# 0|# 2|# 3|# 1|# end");
+    Change::deletion(drawing, 1).make(drawing);
+    EXPECT_EQ(order(drawing), "# 0|# 2# 3|# 1|# end");
+    Change::deletion(drawing, 2).make(drawing);
+    EXPECT_EQ(order(drawing), "# 0|# 2# 3|# 1# end");
+    EXPECT_TRUE(Change::replacement(drawing, 0, drawing.shapes[0]).isNothing());
+}
+
+TEST(History, KnowsWhenTheDrawingIsAsItWasSaved) {
+    History history;
+    Drawing drawing = drawingOf(2);
+    EXPECT_TRUE(history.isSaved());
+    history.make(Change::deletion(drawing, 0), drawing);
+    EXPECT_FALSE(history.isSaved());
+    history.save();
+    history.undo(drawing);
+    EXPECT_FALSE(history.isSaved());
+    history.redo(drawing);
+    EXPECT_TRUE(history.isSaved());
+    history.undo(drawing);
+    history.make(Change::deletion(drawing, 0), drawing);
+    EXPECT_FALSE(history.isSaved()) << "as many changes, but others";
+    history.undo(drawing);
+    EXPECT_FALSE(history.isSaved());
+}
+
+TEST(History, HoldsWhatHasChangedAndNotTheWholeDrawing) {
+    const auto used = [] {
+        const struct mallinfo2 heap = mallinfo2();
+        return heap.uordblks + heap.hblkhd;
+    };
+    Drawing drawing = drawingOf(20000);
+    History history;
+    const std::size_t before = used();
+    constexpr int nudges = 100;
+    for (int i = 0; i < nudges; ++i) {
+        Shape shape = drawing.shapes[10000];
+        shape.moveBy(1, 0);
+        history.make(Change::replacement(drawing, 10000, shape), drawing);
+    }
+    EXPECT_LT(used() - before, nudges * 2000U);
 }
 
 } // namespace

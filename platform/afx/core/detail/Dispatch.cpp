@@ -17,8 +17,6 @@
 
 #include <QAbstractEventDispatcher>
 #include <QApplication>
-#include <QIcon>
-#include <QPixmap>
 #include <QThread>
 
 #include <chrono>
@@ -194,9 +192,8 @@ namespace {
 void showApplicationIcon() {
     const HMODULE application = GetModuleHandleA(nullptr);
     const std::string name = firstResource(application, RT_GROUP_ICON);
-    const HICON icon = name.empty() ? nullptr : LoadIconA(application, name.c_str());
-    if (icon) {
-        QApplication::setWindowIcon(QIcon(QPixmap::fromImage(iconImage(icon))));
+    if (!name.empty()) {
+        QApplication::setWindowIcon(windowIcon(LoadIconA(application, name.c_str())));
     }
 }
 

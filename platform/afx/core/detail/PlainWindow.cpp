@@ -249,10 +249,7 @@ QString TopLevelWindow::text() const {
 }
 
 void TopLevelWindow::iconChanged() {
-    const QImage image = iconImage(bigIcon ? bigIcon : smallIcon);
-    if (!image.isNull()) {
-        widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
-    }
+    widget()->setWindowIcon(windowIcon(bigIcon ? bigIcon : smallIcon)); // without one: the application's
 }
 
 void TopLevelWindow::setMenu(HMENU menu) {

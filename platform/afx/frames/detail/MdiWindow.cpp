@@ -11,7 +11,6 @@
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
 #include <QCloseEvent>
-#include <QIcon>
 #include <QMainWindow>
 #include <QMdiArea>
 #include <QMdiSubWindow>
@@ -348,10 +347,7 @@ void MdiChildWindow::widgetMade() {
 void MdiChildWindow::iconChanged() {
     // Without one of its own it would show the toolkit's logo.
     const HICON own = smallIcon ? smallIcon : bigIcon;
-    const QImage image = iconImage(own ? own : LoadIconA(nullptr, IDI_APPLICATION));
-    if (!image.isNull()) {
-        widget()->setWindowIcon(QIcon(QPixmap::fromImage(image)));
-    }
+    widget()->setWindowIcon(windowIcon(own ? own : LoadIconA(nullptr, IDI_APPLICATION)));
 }
 
 void MdiChildWindow::setText(const QString& text) {

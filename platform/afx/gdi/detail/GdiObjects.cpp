@@ -1,5 +1,7 @@
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
+#include <QPixmap>
+
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -84,6 +86,17 @@ HICON addIcon(const QImage& image, QPoint hotSpot) {
 QImage iconImage(HICON icon) {
     const auto object = icons().find(reinterpret_cast<std::uintptr_t>(icon));
     return object ? object->image : QImage();
+}
+
+QIcon windowIcon(HICON icon) {
+    const auto object = icons().find(reinterpret_cast<std::uintptr_t>(icon));
+    if (!object) {
+        return {};
+    }
+    if (object->windowIcon.isNull()) {
+        object->windowIcon = QIcon(QPixmap::fromImage(object->image));
+    }
+    return object->windowIcon;
 }
 
 } // namespace tvx::afx

@@ -5,6 +5,7 @@
 #include "platform/afx/gdi/detail/HandleTable.h"
 
 #include <QFont>
+#include <QIcon>
 #include <QImage>
 #include <QRegion>
 
@@ -108,11 +109,15 @@ template <class T>
 struct IconObject {
     QImage image; ///< Format_ARGB32, not premultiplied
     QPoint hotSpot;
+    QIcon windowIcon{}; ///< Of windows, made when first asked for.
 };
 [[nodiscard]] TVX_PLATFORM_API HandleTable<IconObject>& icons();
 /// An icon or cursor with these pixels, to be destroyed with `DestroyIcon`.
 [[nodiscard]] TVX_PLATFORM_API HICON addIcon(const QImage& image, QPoint hotSpot = {});
 /// The picture of an icon, null image for a handle that is none.
 [[nodiscard]] TVX_PLATFORM_API QImage iconImage(HICON icon);
+/// An icon as windows of the toolkit show it, null icon for a handle that is none. It is the same one for all windows:
+/// the toolkit keeps what it has scaled for each icon, long after the windows have ended.
+[[nodiscard]] QIcon windowIcon(HICON icon);
 
 } // namespace tvx::afx

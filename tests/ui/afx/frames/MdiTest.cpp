@@ -3,6 +3,7 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 
+#include <malloc.h>
 #include <set>
 
 using namespace frametest;
@@ -93,6 +94,22 @@ TEST_F(Mdi, KeysWalkAndClose) {
     EXPECT_EQ(barTexts(), QStringList({"File", "Edit", "View"}));
     EXPECT_EQ(titleOf(*frame), "Frame Test");
     EXPECT_EQ(AfxGetApp()->GetOpenDocumentCount(), 0);
+}
+
+TEST_F(Mdi, DocumentsThatWereClosedLeaveNothing) {
+    const auto openAndClose = [this](int times) {
+        for (int i = 0; i < times; ++i) {
+            open()->SendMessage(WM_CLOSE);
+            settle();
+            QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete); // else in the loop of Run only
+        }
+        const struct mallinfo2 heap = mallinfo2();
+        return heap.uordblks + heap.hblkhd;
+    };
+    constexpr int times = 100;
+    const auto before = static_cast<std::ptrdiff_t>(openAndClose(20)); // fills caches
+    const auto after = static_cast<std::ptrdiff_t>(openAndClose(times));
+    EXPECT_LT(after - before, times * 1000);
 }
 
 TEST_F(Mdi, ChildrenNeedNoDocument) {
