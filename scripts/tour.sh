@@ -112,7 +112,7 @@ picture start "The board with the drawings that were named on its command line."
 xdotool key --clearmodifiers alt+w
 picture window-menu "The Window menu lists the open drawings."
 xdotool key t
-picture tiled "The drawings side by side."
+picture tiled "Window, Tile shows all drawings at once."
 
 xdotool key --clearmodifiers ctrl+3
 drag 62 62 82 86
@@ -144,7 +144,7 @@ xdotool type 'seq -f "Meshing part %g of 8" 8'
 picture run-command "Tools, Run Command asks for a program to run."
 xdotool key Return
 await '^seq '
-picture output "Its output appears in a window of its own while it runs."
+picture output "Its output appears in a window of its own, which tells how the program ended."
 xdotool key Escape
 
 timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
@@ -160,7 +160,7 @@ answer
 
 start -grid many -bogus
 await 'Board'
-picture errors "A wrong command line is explained: each fault with its reason."
+picture errors "A wrong command line is explained: one fault after the other, each with its reason. This is the first."
 answer
 
 printf 'board 1\nrectangle 10 10 90 60\ncircle 10 10 40\n' >"$work/damaged.brd"

@@ -114,7 +114,7 @@ private:
         header->setSectionResizeMode(QHeaderView::ResizeToContents);
         header->setSectionResizeMode(0, QHeaderView::Stretch);
         const QSize room = screen()->availableGeometry().size() * 9 / 10;
-        resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(110, 70)).boundedTo(room));
+        resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(130, 70)).boundedTo(room));
     }
 
     ModalLoop m_loop;

@@ -182,7 +182,7 @@ private:
         const int caption = metrics.horizontalAdvance(windowTitle()) + captionButtons;
         // The toolkit makes no box wider than this, and cuts what does not fit.
         const int available = screen()->availableGeometry().width();
-        const int most = (available <= 1024 ? available * 3 / 5 : std::min(available - 480, 1000)) - besideText;
+        const int most = (available <= 1024 ? available * 4 / 5 : std::min(available - 480, 1000)) - besideText;
         int width = caption > label.sizeHint().width() ? caption : 0;
         if (text().contains(QLatin1Char('\n'))) {
             const int lines = metrics.size(0, text()).width() + 2 * label.margin() + 2;
