@@ -1,10 +1,7 @@
 #include "platform/afx/dialogs/FileDialog.h"
 
-#include "platform/afx/core/App.h"
-#include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Paths.h"
-#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/dialogs/detail/ToolkitDialog.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
@@ -13,7 +10,6 @@
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QHeaderView>
-#include <QPushButton>
 #include <QScreen>
 #include <QTreeView>
 
@@ -69,37 +65,20 @@ QStringList filtersOf(LPCSTR text) {
     return filters;
 }
 
-/// The toolkit's dialog on a loop of ours.
-class Dialog : public QFileDialog {
+class Dialog : public ToolkitDialog<QFileDialog> {
 public:
-    explicit Dialog(QWidget* over) : QFileDialog(over) {
-        // A desktop's own dialog would wait in a loop of its own, and close without asking the host.
-        setOption(QFileDialog::DontUseNativeDialog);
-        setWindowModality(Qt::ApplicationModal);
+    Dialog(HWND owner, UINT title) : ToolkitDialog(owner, title) {
         showColumnsWhole();
     }
     std::function<bool()> isAccepted;
 
-    bool ask() {
-        guarded([this] { show(); });
-        const int answer = m_loop.run();
-        guarded([this] { hide(); });
-        return answer == QDialog::Accepted;
-    }
     /// The toolkit calls this from slots of its own. A host whose OnFileNameOK throws ends the loop with that.
     void done(int result) override {
         storing([&] {
             if (result != QDialog::Accepted || isAccepted()) {
-                m_loop.end(result);
+                ToolkitDialog::done(result);
             }
         });
-    }
-
-    /// Pictures on the buttons come and go with the desktop's style; no other dialog of the framework has them.
-    void clearButtons() {
-        for (auto* button : findChildren<QPushButton*>()) {
-            button->setIcon(QIcon());
-        }
     }
 
 private:
@@ -116,12 +95,9 @@ private:
         const QSize room = screen()->availableGeometry().size() * 9 / 10;
         resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(130, 70)).boundedTo(room));
     }
-
-    ModalLoop m_loop;
 };
 
 void labelDialog(Dialog& dialog, bool open) {
-    dialog.setWindowTitle(ownText(open ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE));
     dialog.setLabelText(QFileDialog::LookIn, ownText(open ? TVX_IDS_FILE_LOOK_IN : TVX_IDS_FILE_SAVE_IN));
     dialog.setLabelText(QFileDialog::FileName, ownText(TVX_IDS_FILE_NAME));
     dialog.setLabelText(QFileDialog::FileType, ownText(TVX_IDS_FILE_TYPE));
@@ -137,7 +113,6 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
                        : several           ? QFileDialog::ExistingFiles
                                            : QFileDialog::ExistingFile);
     labelDialog(dialog, open);
-    dialog.clearButtons();
     dialog.setOption(QFileDialog::DontConfirmOverwrite, (record.Flags & OFN_OVERWRITEPROMPT) == 0);
     if (record.lpstrTitle) {
         dialog.setWindowTitle(toQt(record.lpstrTitle));
@@ -176,10 +151,7 @@ INT_PTR CFileDialog::DoModal() {
     if (!ensureGui()) {
         return IDCANCEL;
     }
-    const CWnd* main = AfxGetMainWnd();
-    const HWND owner = m_ofn.hwndOwner || !main ? m_ofn.hwndOwner : main->m_hWnd;
-    Window* over = Window::from(owner);
-    Dialog dialog(over ? over->topLevel()->widget() : nullptr);
+    Dialog dialog(m_ofn.hwndOwner, m_bOpenFileDialog ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE);
     fillDialog(dialog, m_ofn, m_bOpenFileDialog != FALSE);
     dialog.isAccepted = [this, &dialog] {
         const auto filters = dialog.nameFilters();

@@ -6,6 +6,7 @@
 #include "platform/afx/core/detail/Window.h"
 
 #include <QDialog>
+#include <QPushButton>
 
 namespace tvx::afx {
 
@@ -24,7 +25,13 @@ public:
     }
     /// Shows it and answers whether the user chose OK.
     bool ask() {
-        guarded([this] { this->show(); });
+        guarded([this] {
+            // Pictures on buttons come and go with the desktop's style; no other dialog of the framework has them.
+            for (auto* button : this->template findChildren<QPushButton*>()) {
+                button->setIcon(QIcon());
+            }
+            this->show();
+        });
         const int answer = m_loop.run();
         guarded([this] { this->hide(); });
         return answer == QDialog::Accepted;
