@@ -5,13 +5,14 @@ include(CMakePackageConfigHelpers)
 set(package_dir "${CMAKE_INSTALL_LIBDIR}/cmake/Tarvex")
 set(header_dir "${CMAKE_INSTALL_INCLUDEDIR}/tarvex")
 
-install(TARGETS TarvexPlatform TarvexMain GuiUtilities tvx-rc tvx-includes EXPORT TarvexTargets
+set(exported_targets TarvexPlatform TarvexMain GuiUtilities tvx-rc tvx-includes)
+install(TARGETS ${exported_targets} EXPORT TarvexTargets
   RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}"
   LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}"
   ARCHIVE DESTINATION "${CMAKE_INSTALL_LIBDIR}")
 install(TARGETS tvxsettings RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}")
 # Builds all of that, for builds that make less than everything.
-add_custom_target(installed DEPENDS TarvexPlatform TarvexMain GuiUtilities tvx-rc tvxsettings)
+add_custom_target(installed DEPENDS ${exported_targets} tvxsettings)
 install(FILES tools/settings/tvxsettings.1 DESTINATION "${CMAKE_INSTALL_MANDIR}/man1")
 
 # Headers keep their paths: sources name them "s/WinApp.h", "platform/win/Registry.h", or by the umbrella headers' names.
