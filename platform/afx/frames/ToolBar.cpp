@@ -188,7 +188,7 @@ void CToolBar::rebuild() {
             QAction* action = tools->addAction(toQt(button.text));
             const QRect part(button.image * m_imageSize.cx, 0, m_imageSize.cx, m_imageSize.cy);
             if (pictures.rect().contains(part)) {
-                action->setIcon(QIcon(QPixmap::fromImage(pictures.copy(part))));
+                action->setIcon(buttonIcon(pictures.copy(part)));
             }
             dressButton(*tools, *action, CommandText(button.id), m_dwStyle);
             tools->widgetForAction(action)->setMinimumSize(m_buttonSize.cx, m_buttonSize.cy);

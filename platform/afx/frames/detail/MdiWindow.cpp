@@ -8,12 +8,16 @@
 #include "platform/afx/core/detail/Placement.h"
 #include "platform/afx/core/detail/PlainWindow.h"
 #include "platform/afx/frames/MdiFrame.h"
+#include "platform/afx/gdi/detail/ButtonImages.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
+#include <QApplication>
 #include <QCloseEvent>
 #include <QMainWindow>
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QProxyStyle>
+#include <QStyleOption>
 
 #include <algorithm>
 #include <cmath>
@@ -28,10 +32,35 @@ std::unique_ptr<Window> makeClient(const CREATESTRUCT& cs) {
 
 const WindowClassEntry clientEntry("MDICLIENT", &makeClient);
 
+/// Draws captions as the application's style does. On a dark desktop the style draws the buttons of inactive ones in
+/// black all the same; those of active ones are light, so the caption is drawn as an active one in quiet colours.
+class CaptionStyle : public QProxyStyle {
+public:
+    CaptionStyle() : QProxyStyle(QApplication::style()->name()) {}
+
+    void drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
+                            const QWidget* widget) const override {
+        const auto* caption = qstyleoption_cast<const QStyleOptionTitleBar*>(option);
+        if (!caption || (caption->titleBarState & State_Active) != 0 || !isDarkPalette()) {
+            QProxyStyle::drawComplexControl(control, option, painter, widget);
+            return;
+        }
+        QStyleOptionTitleBar quiet = *caption;
+        quiet.titleBarState |= State_Active;
+        quiet.palette.setColor(QPalette::Highlight, caption->palette.color(QPalette::Window));
+        quiet.palette.setColor(QPalette::HighlightedText, caption->palette.color(QPalette::WindowText));
+        QProxyStyle::drawComplexControl(control, &quiet, painter, widget);
+    }
+};
+
 /// Asks its frame before it closes.
 class SubWindow : public QMdiSubWindow {
 public:
-    using QMdiSubWindow::QMdiSubWindow;
+    SubWindow() {
+        auto* style = new CaptionStyle;
+        style->setParent(this);
+        setStyle(style);
+    }
 
 protected:
     void closeEvent(QCloseEvent* event) override {

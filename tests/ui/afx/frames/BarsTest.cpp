@@ -39,6 +39,22 @@ TEST_F(Bars, ToolBarIsMadeFromItsResource) {
     EXPECT_FALSE(CToolBar().LoadToolBar(4711));
 }
 
+TEST_F(Bars, PicturesAreSeenOnADarkDesktop) {
+    const std::vector<DWORD> pixels(std::size_t{64} * 15, 0x202020);
+    const HBITMAP dark = CreateBitmap(64, 15, 1, 32, pixels.data());
+    frame->tools.SetBitmap(dark);
+    const auto shown = [this] {
+        return button(ID_TEST_LOCKED)->icon().pixmap(16, 15).toImage().pixelColor(8, 7).lightness();
+    };
+    const QPalette before = QApplication::palette();
+    EXPECT_EQ(shown(), 32);
+    QApplication::setPalette(QPalette(QColor(50, 50, 50), QColor(40, 40, 40)));
+    EXPECT_EQ(shown(), 223);
+    QApplication::setPalette(before);
+    EXPECT_EQ(shown(), 32);
+    DeleteObject(dark);
+}
+
 TEST_F(Bars, ButtonsFollowTheirCommands) {
     EXPECT_TRUE(button(ID_TEST_DRAW)->isEnabled());
     EXPECT_FALSE(button(ID_TEST_LOCKED)->isEnabled());

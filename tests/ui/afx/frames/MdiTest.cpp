@@ -322,3 +322,24 @@ TEST_F(Mdi, ChildrenKnowWhereTheyGoBackTo) {
     EXPECT_EQ(placement.showCmd, UINT{SW_SHOWNORMAL});
     EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(5, 6, 305, 206));
 }
+
+TEST_F(FrameTest, CaptionButtonsOfInactiveChildFramesAreSeenOnADarkDesktop) {
+    const BoardsFrame& frame = openBoards();
+    const QPalette before = QApplication::palette();
+    QApplication::setPalette(QPalette(QColor(50, 50, 50), QColor(40, 40, 40)));
+    boards().OpenDocumentFile(nullptr);
+    boards().OpenDocumentFile(nullptr);
+    settle();
+    for (QMdiSubWindow* child : widgetOf(frame)->findChildren<QMdiSubWindow*>()) {
+        const int height = child->style()->pixelMetric(QStyle::PM_TitleBarHeight, nullptr, child);
+        const QImage buttons = child->grab(QRect(child->width() - 3 * height, 0, 3 * height, height)).toImage();
+        int brightest = 0;
+        for (int y = 0; y < buttons.height(); ++y) {
+            for (int x = 0; x < buttons.width(); ++x) {
+                brightest = std::max(brightest, buttons.pixelColor(x, y).lightness());
+            }
+        }
+        EXPECT_GT(brightest, 200) << child->windowTitle().toStdString();
+    }
+    QApplication::setPalette(before);
+}
