@@ -25,6 +25,7 @@
 #include <cstdio>
 #include <cstring>
 #include <string>
+#include <string_view>
 #include <vector>
 
 using namespace tvx::afx;
@@ -259,7 +260,10 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
     caption = caption ? caption : error.c_str();
     if (!ensureGui()) {
         const UINT icon = type & MB_ICONMASK;
-        if (icon == 0 || icon == MB_ICONINFORMATION) { // what was asked for, as a summary of the command line is
+        const CWinApp* app = AfxGetApp();
+        const LPCSTR name = app ? (app->m_pszAppName ? app->m_pszAppName : AfxGetAppName()) : nullptr;
+        const bool own = name && std::string_view(caption) == name; // said by the application itself
+        if (own && (icon == 0 || icon == MB_ICONINFORMATION)) {     // asked for, as a summary of the command line is
             std::printf("%s\n", shown(text).c_str());
         } else {
             std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());
