@@ -1,6 +1,7 @@
 // The check of the command line.
 #include "s/WinApp.h"
 
+#include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/StartCode.h"
 #include "platform/port/CmdArgs.h"
 #include "platform/port/CmdOpcodes.h"
@@ -70,13 +71,16 @@ int Gui_WinApp::ProcessCommandLine(const Gui_CommandLineInfo& info) {
     Gui_CmdLineArgsArray arguments;
     // They are those that the collector has met too, and are reported from there.
     info.m_impl->ForgetProblems();
+    bool isRight = true;
     if (arguments.GetCount() > 0 || arguments.GetProblems().GetSize() > 0) {
         m_data->usageText = info.GetUsageText();
-        if (!tvx::allocating([&] { return check(arguments, info.GetCmdOpcodes()); })) {
-            tvx::afx::setStartCode(refusedCommandLine);
-        }
+        isRight = tvx::allocating([&] { return check(arguments, info.GetCmdOpcodes()); });
+    }
+    if (!isRight) {
+        tvx::afx::setStartCode(refusedCommandLine);
     }
     if (!m_data->pending.IsEmpty()) {
+        const auto summary = isRight ? std::make_unique<tvx::afx::AskedFor>() : nullptr;
         AfxMessageBox(m_data->pending);
         m_data->pending.Empty();
         return 0;

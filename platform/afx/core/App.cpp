@@ -1,5 +1,6 @@
 #include "platform/afx/core/App.h"
 
+#include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/CommandLineInfo.h"
 #include "platform/afx/core/StartCode.h"
 #include "platform/afx/core/detail/Loop.h"
@@ -322,6 +323,7 @@ void nameModule(CWinApp& app) {
 }
 
 int startCode = 0;
+int askedFor = 0;
 
 int runApplication(CWinApp& app) {
     startCode = 0;
@@ -346,6 +348,18 @@ int runApplication(CWinApp& app) {
 
 void tvx::afx::setStartCode(int exitCode) {
     startCode = exitCode;
+}
+
+AskedFor::AskedFor() {
+    ++askedFor;
+}
+
+AskedFor::~AskedFor() {
+    --askedFor;
+}
+
+bool AskedFor::isNow() {
+    return askedFor > 0;
 }
 
 namespace {

@@ -1,5 +1,6 @@
 #include "platform/afx/core/App.h"
 
+#include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
@@ -25,7 +26,6 @@
 #include <cstdio>
 #include <cstring>
 #include <string>
-#include <string_view>
 #include <vector>
 
 using namespace tvx::afx;
@@ -259,11 +259,7 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
     const std::string error = !caption ? fromQt(ownText(TVX_IDS_ERROR)) : std::string();
     caption = caption ? caption : error.c_str();
     if (!ensureGui()) {
-        const UINT icon = type & MB_ICONMASK;
-        const CWinApp* app = AfxGetApp();
-        const LPCSTR name = app ? (app->m_pszAppName ? app->m_pszAppName : AfxGetAppName()) : nullptr;
-        const bool own = name && std::string_view(caption) == name; // said by the application itself
-        if (own && (icon == 0 || icon == MB_ICONINFORMATION)) {     // asked for, as a summary of the command line is
+        if (AskedFor::isNow()) {
             std::printf("%s\n", shown(text).c_str());
         } else {
             std::fprintf(stderr, "%s: %s\n", caption, shown(text).c_str());

@@ -29,6 +29,10 @@ expect 1 "There is no display"
     echo "FAIL: what was asked for does not go to standard output" >&2
     exit 1
 }
+[ -z "$("$program" -bogus 2>/dev/null)" ] || {
+    echo "FAIL: what is wrong goes to standard output" >&2
+    exit 1
+}
 
 # A compositor that nobody runs, then one that takes connections but that the toolkit has no plug-in for.
 export WAYLAND_DISPLAY=compositor
