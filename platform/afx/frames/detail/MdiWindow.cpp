@@ -21,6 +21,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <functional>
 
 namespace tvx::afx {
 
@@ -99,8 +100,27 @@ Window* MdiClientWindow::heldChildFrame() const {
 
 // --- the client ---
 
+namespace {
+
+/// Tells when it comes up.
+class Area : public QMdiArea {
+public:
+    Area(QWidget* parent, std::function<void()> shown) : QMdiArea(parent), m_shown(std::move(shown)) {}
+
+protected:
+    void showEvent(QShowEvent* event) override {
+        QMdiArea::showEvent(event);
+        storing(m_shown);
+    }
+
+private:
+    std::function<void()> m_shown;
+};
+
+} // namespace
+
 QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
-    auto* area = new QMdiArea(parent);
+    auto* area = new Area(parent, [this] { placeAgain(); });
     area->setHorizontalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     area->setActivationOrder(QMdiArea::ActivationHistoryOrder);
@@ -221,17 +241,21 @@ QRect MdiClientWindow::nextPlace(const MdiChildWindow& child) {
 /// A main frame that comes up maximised, or where it was left, has its size only when the desktop has told it. Child
 /// frames that were placed earlier, and that nobody has moved since, get the places that fit.
 void MdiClientWindow::placeAgain() {
-    if (m_roomKnown || !area()->isVisible()) {
+    if (m_roomKnown || isDestroyed() || !area()->isVisible()) {
         return;
     }
+    // What moves may have a handler that opens another child frame.
+    const std::vector<Early> former = m_early;
     for (Early& early : m_early) {
+        early.place = cascadePlace(early.number);
+    }
+    for (const Early& early : former) {
         auto* child = dynamic_cast<MdiChildWindow*>(from(early.child));
         const QRect place = cascadePlace(early.number);
-        const QRect former = std::exchange(early.place, place);
         Placement* own = child ? child->placement() : nullptr;
-        if (own && child->widget()->isMaximized() && own->restored() == former) {
+        if (own && child->widget()->isMaximized() && own->restored() == early.place) {
             own->setRestored(place);
-        } else if (child && child->widget()->geometry() == former) {
+        } else if (child && child->widget()->geometry() == early.place) {
             child->setWindowRect(place);
         }
     }

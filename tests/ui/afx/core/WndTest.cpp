@@ -1,6 +1,7 @@
 #include "afxwin.h"
 #include "platform/afx/core/detail/Window.h"
 
+#include <QScreen>
 #include <QTest>
 
 #include <gtest/gtest.h>
@@ -247,6 +248,18 @@ TEST_F(Wnd, ButtonsAreMarkedAndReachedByGroup) {
     EXPECT_EQ(frame.GetNextDlgGroupItem(&windows[0], TRUE), &windows[2]);
     EXPECT_EQ(frame.GetNextDlgGroupItem(nullptr), nullptr);
     frame.DestroyWindow();
+}
+
+TEST_F(Wnd, FirstSizesFitTheScreen) {
+    CWnd large;
+    ASSERT_TRUE(
+        large.CreateEx(0, AfxRegisterWndClass(0), "large", WS_OVERLAPPEDWINDOW, 50, 50, 5000, 4000, nullptr, nullptr));
+    large.ShowWindow(SW_SHOW);
+    const QWidget* widget = tvx::afx::peerOf(large.m_hWnd);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return widget->frameGeometry() == widget->screen()->availableGeometry(); }));
+    large.MoveWindow(0, 0, 5000, 4000);
+    EXPECT_EQ(widget->frameGeometry().width(), 5000) << "later ones are as they are asked for";
+    large.DestroyWindow();
 }
 
 } // namespace

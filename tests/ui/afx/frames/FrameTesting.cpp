@@ -174,6 +174,13 @@ NoteFrame& FrameTest::openNote() {
 }
 
 BoardsFrame& FrameTest::openBoards() {
+    BoardsFrame& frame = makeBoards();
+    frame.ShowWindow(SW_SHOW);
+    showMain(frame);
+    return frame;
+}
+
+BoardsFrame& FrameTest::makeBoards() {
     CWinApp& app = *AfxGetApp();
     m_boards =
         new CMultiDocTemplate(IDR_TESTBOARD, RUNTIME_CLASS(Note), RUNTIME_CLASS(CMDIChildWnd), RUNTIME_CLASS(NoteView));
@@ -181,8 +188,6 @@ BoardsFrame& FrameTest::openBoards() {
     auto* frame = new BoardsFrame;
     EXPECT_TRUE(frame->LoadFrame(IDR_TESTMAIN));
     app.m_pMainWnd = frame;
-    frame->ShowWindow(SW_SHOW);
-    showMain(*frame);
     return *frame;
 }
 

@@ -125,6 +125,8 @@ protected:
     NoteFrame& openNote();
     /// The main frame of boards without any, shown and active.
     BoardsFrame& openBoards();
+    /// The same, not shown yet.
+    BoardsFrame& makeBoards();
     CMultiDocTemplate& boards() const {
         return *m_boards;
     }

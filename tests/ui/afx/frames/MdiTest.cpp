@@ -229,21 +229,29 @@ TEST_F(Mdi, TilesAndCascades) {
     EXPECT_EQ(covered, room.width() * room.height());
 }
 
-TEST_F(Mdi, ChildrenOfAFrameThatIsStillToBePlacedFitIt) {
-    CMDIChildWnd* placed = open();
+TEST_F(FrameTest, ChildrenOfAFrameThatIsStillToBePlacedFitIt) {
+    BoardsFrame& frame = makeBoards();
+    const auto open = [&] {
+        CDocument* document = boards().OpenDocumentFile(nullptr);
+        POSITION at = document->GetFirstViewPosition();
+        return document->GetNextView(at)->GetParentFrame();
+    };
+    CFrameWnd* placed = open();
     placed->MoveWindow(20, 30, 300, 200);
-    CMDIChildWnd* early = open();
-    const QSize before = early->GetState()->widget()->size();
+    const QWidget* early = open()->GetState()->widget();
+    const QSize before = early->size();
+    QWidget* main = frame.GetState()->widget();
+    frame.ShowWindow(SW_SHOW);
     // What a window manager does with a frame that comes up maximised: it tells its size later.
-    frame->GetState()->widget()->resize(frame->GetState()->widget()->size() * 2);
+    main->resize(main->size() * 2);
     settle();
-    EXPECT_GT(early->GetState()->widget()->width(), before.width() * 3 / 2);
+    EXPECT_GT(early->width(), before.width() * 3 / 2);
     EXPECT_EQ(placed->GetState()->widget()->geometry(), QRect(20, 30, 300, 200)) << "where it was moved to";
     QTest::qWait(50);
-    const QSize known = early->GetState()->widget()->size();
-    frame->GetState()->widget()->resize(frame->GetState()->widget()->size() / 2);
+    const QSize known = early->size();
+    main->resize(main->size() / 2);
     settle();
-    EXPECT_EQ(early->GetState()->widget()->size(), known) << "the user's own sizing leaves children alone";
+    EXPECT_EQ(early->size(), known) << "the user's own sizing leaves children alone";
 }
 
 TEST_F(Mdi, ChildrenMoveAndSizeByKeys) {
