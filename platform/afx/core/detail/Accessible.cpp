@@ -8,6 +8,7 @@
 #include <QMainWindow>
 #include <QMenu>
 #include <QMenuBar>
+#include <QRegularExpression>
 #include <QToolBar>
 
 #include <algorithm>
@@ -207,12 +208,15 @@ QAccessibleInterface* answer(const QString& className, QObject* object) {
 } // namespace
 
 QString withoutMarks(const QString& text) {
+    static const QRegularExpression keyBehind(QStringLiteral("\\(&.\\)")); // how texts without Latin letters have it
+    QString marked = text;
+    marked.remove(keyBehind);
     QString plain;
-    for (qsizetype i = 0; i < text.size(); ++i) {
-        if (text[i] == QLatin1Char('&') && i + 1 < text.size()) {
+    for (qsizetype i = 0; i < marked.size(); ++i) {
+        if (marked[i] == QLatin1Char('&') && i + 1 < marked.size()) {
             ++i; // of two the second is a character of the text
         }
-        plain += text[i];
+        plain += marked[i];
     }
     return plain;
 }

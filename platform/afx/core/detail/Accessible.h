@@ -10,7 +10,7 @@
 
 namespace tvx::afx {
 
-/// A text without the marks of access keys.
+/// A text without the marks of access keys: "&Close" and "閉じる(&C)" without "&" and "(&C)", "&&" as "&".
 TVX_PLATFORM_API QString withoutMarks(const QString& text);
 
 /// Has the toolkit ask here first. To be called once.

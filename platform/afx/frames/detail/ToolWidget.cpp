@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Accessible.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -12,7 +13,6 @@
 #include <QAction>
 #include <QLayout>
 #include <QMouseEvent>
-#include <QRegularExpression>
 #include <QStyleOptionDockWidget>
 #include <QStylePainter>
 #include <QToolButton>
@@ -39,13 +39,6 @@ private:
     QtMessageHandler m_before;
 };
 
-/// The text of a menu item without access key and short-cut.
-QString plainText(UINT id) {
-    QString text = ownText(id).section('\t', 0, 0);
-    static const QRegularExpression keyBehind(QStringLiteral("\\(&.\\)")); // how texts without Latin letters have it
-    return text.remove(keyBehind).remove('&');
-}
-
 CControlBar* barOf(const QWidget& widget) {
     const Window* window = Window::of(&widget);
     return window ? dynamic_cast<CControlBar*>(window->object()) : nullptr;
@@ -59,7 +52,7 @@ ToolWidget::ToolWidget(const QString& title, QWidget* parent)
     m_close->setAutoRaise(true);
     m_close->setFocusPolicy(Qt::NoFocus);
     m_close->setIcon(style()->standardIcon(QStyle::SP_TitleBarCloseButton, nullptr, this));
-    m_close->setToolTip(plainText(TVX_IDS_SYS_CLOSE));
+    m_close->setToolTip(withoutMarks(ownText(TVX_IDS_SYS_CLOSE).section('\t', 0, 0)));
     m_close->setAccessibleName(m_close->toolTip());
     m_close->hide();
     connectStoring(m_close, &QToolButton::clicked, this, [this] {
