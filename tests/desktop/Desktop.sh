@@ -36,6 +36,17 @@ titled() {
 untitled() {
     [ -z "$(window "$1")" ]
 }
+# begin TITLE COMMAND...: starts a program and gives its window the keyboard; they are in $process and $main then.
+begin() {
+    local title=$1
+    shift
+    "$@" &
+    process=$!
+    processes=("$process")
+    await "a window \"$title\" appears" titled "$title"
+    main=$(window "$title")
+    xdotool windowactivate --sync "$main"
+}
 # ended PROCESS
 ended() {
     ! kill -0 "$1" 2>/dev/null

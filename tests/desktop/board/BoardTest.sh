@@ -16,12 +16,7 @@ changed() {
     [ "$(sum)" != "$before" ]
 }
 start() {
-    "$program" "$@" &
-    process=$!
-    processes=("$process")
-    await "the window appears with the file's name" titled "plan with blanks.brd - Tarvex Board"
-    main=$(window "plan with blanks.brd - Tarvex Board")
-    xdotool windowactivate --sync "$main"
+    begin "plan with blanks.brd - Tarvex Board" "$program" "$@"
 }
 draw() {
     local X=0 Y=0 WIDTH=0 HEIGHT=0

@@ -21,12 +21,7 @@ find "$host" -name '*.h' -o -name '*.cpp' -o -name '*.rc*' | xargs sed -i 's/$/\
 
 sheet="$work/sheet.ldg"
 : >"$sheet"
-"$out/ledger" "$sheet" &
-process=$!
-processes=("$process")
-await "the window appears" titled "^sheet.ldg - Ledger$"
-main=$(window "^sheet.ldg - Ledger$")
-xdotool windowactivate --sync "$main"
+begin "^sheet.ldg - Ledger$" "$out/ledger" "$sheet"
 # holds TEXT: saves, and looks for a line of the sheet.
 holds() {
     xdotool key --clearmodifiers ctrl+s

@@ -31,12 +31,7 @@ awk -v folder="$host" '
 
 sheet="$work/sheet.mks"
 : >"$sheet"
-"$out/marks" "$sheet" &
-process=$!
-processes=("$process")
-await "the window appears" titled "sheet.mks - Tarvex Marks"
-main=$(window "sheet.mks - Tarvex Marks")
-xdotool windowactivate --sync "$main"
+begin "sheet.mks - Tarvex Marks" "$out/marks" "$sheet"
 stored() {
     [ "$(stat -c %s "$sheet")" -eq "$1" ]
 }

@@ -319,6 +319,9 @@ TEST(ProcessInheritance, SignalsAreAsTheyWereForTheUser) {
     ::sigprocmask(SIG_UNBLOCK, &blocked, nullptr);
     EXPECT_EQ(lineWith(status, "SigBlk"), "SigBlk:\t0000000000000000");
     EXPECT_EQ(lineWith(status, "SigIgn"), "SigIgn:\t0000000000000200");
+    for (const int number : {SIGPIPE, SIGUSR1, SIGUSR2}) {
+        ::signal(number, SIG_DFL);
+    }
 }
 
 namespace {
