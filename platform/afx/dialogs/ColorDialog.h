@@ -28,7 +28,9 @@ using CHOOSECOLOR = CHOOSECOLORA;
 ///
 /// @code
 /// CColorDialog dialog(m_color, 0, this);
-/// if (dialog.DoModal() == IDOK) m_color = dialog.GetColor();
+/// if (dialog.DoModal() == IDOK) {
+///     m_color = dialog.GetColor();
+/// }
 /// @endcode
 class TVX_PLATFORM_API CColorDialog : public CWnd {
     DECLARE_DYNAMIC(CColorDialog)

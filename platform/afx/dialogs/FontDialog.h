@@ -32,7 +32,9 @@ using CHOOSEFONT = CHOOSEFONTA;
 ///
 /// @code
 /// CFontDialog dialog(&m_logFont, CF_EFFECTS | CF_SCREENFONTS, nullptr, this);
-/// if (dialog.DoModal() == IDOK) dialog.GetCurrentFont(&m_logFont);
+/// if (dialog.DoModal() == IDOK) {
+///     dialog.GetCurrentFont(&m_logFont);
+/// }
 /// @endcode
 class TVX_PLATFORM_API CFontDialog : public CWnd {
     DECLARE_DYNAMIC(CFontDialog)

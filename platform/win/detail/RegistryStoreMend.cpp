@@ -119,6 +119,7 @@ DWORD Store::beginAnew() {
 
 DWORD Store::takeOver(const Salvage& found, std::size_t& saved) {
     std::vector<KeyPath> keys;
+    keys.reserve(found.keys.size());
     for (const auto& [id, key] : found.keys) {
         keys.push_back(key);
     }

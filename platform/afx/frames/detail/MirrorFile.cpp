@@ -107,7 +107,8 @@ void MirrorFile::forget() {
 BOOL MirrorFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
     forget();
     if (isPipe(fileName)) {
-        return fail(error, ESPIPE, fileName) ? TRUE : FALSE;
+        fail(error, ESPIPE, fileName);
+        return FALSE;
     }
     if ((openFlags & modeCreate) == 0 || (openFlags & modeNoTruncate) != 0) {
         return CFile::Open(fileName, openFlags, error);

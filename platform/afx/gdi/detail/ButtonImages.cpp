@@ -4,6 +4,7 @@
 
 #include <QApplication>
 #include <QIconEngine>
+#include <QPainter>
 #include <QPalette>
 #include <QPixmap>
 #include <QStyle>
