@@ -160,8 +160,18 @@ void DialogWindow::showWidget(int command) {
 
 namespace {
 
-/// Makes a template's font larger by as much as the desktop's is larger than the one that templates were laid out
-/// beside: who chose large menus reads dialogs as well. A smaller one would leave texts that nobody can read.
+constexpr int usualPoints = 8; // of templates' fonts, beside menus of the same size
+
+/// The desktop's font in the size of its menus, for templates that name the interface's font in its usual size;
+/// larger or smaller in the same measure for others, but never smaller than the template says.
+void useDesktopFont(LOGFONTA& font, int points) {
+    const QFont menus = QApplication::font("QMenu");
+    font.lfHeight = std::min(font.lfHeight, -scaled(QFontInfo(menus).pixelSize(), points, usualPoints));
+    text::copyCut(fromQt(QFontInfo(menus).family()), font.lfFaceName, LF_FACESIZE);
+}
+
+/// Makes another font larger by as much as the desktop's is larger than the one that templates were laid out beside:
+/// who chose large menus reads dialogs as well. A smaller one would leave texts that nobody can read.
 void followDesktop(LOGFONTA& font) {
     constexpr int usualPixels = 12; // of nine points, which a desktop has that nobody has set
     const int desktop = QFontInfo(QApplication::font("QMenu")).pixelSize();
@@ -173,13 +183,17 @@ void followDesktop(LOGFONTA& font) {
 } // namespace
 
 void DialogWindow::useFont(const DialogTemplate& description) {
-    LOGFONTA font = pointFont(description.font ? description.font->pointSize * 10 : 80,
-                              description.font ? description.font->faceName : "MS Shell Dlg");
-    if (description.font && description.extended) {
-        font.lfWeight = description.font->weight;
-        font.lfItalic = description.font->italic ? 1 : 0;
+    const DialogFont wanted = description.font.value_or(DialogFont{.faceName = "MS Shell Dlg"});
+    LOGFONTA font = pointFont(wanted.pointSize * 10, wanted.faceName);
+    if (description.extended) {
+        font.lfWeight = wanted.weight;
+        font.lfItalic = wanted.italic ? 1 : 0;
     }
-    followDesktop(font);
+    if (isInterfaceFace(wanted.faceName)) {
+        useDesktopFont(font, wanted.pointSize);
+    } else {
+        followDesktop(font);
+    }
     const HFONT old = std::exchange(m_ownFont, CreateFontIndirectA(&font));
     SendMessageA(handle(), WM_SETFONT, reinterpret_cast<WPARAM>(m_ownFont), FALSE);
     DeleteObject(reinterpret_cast<HGDIOBJ>(old));

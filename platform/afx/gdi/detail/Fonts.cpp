@@ -78,14 +78,31 @@ std::string_view faceName(const LOGFONTA& description) {
 
 } // namespace
 
-QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
-    QString wanted = QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
-    if (!faceName.empty() && QFontDatabase::hasFamily(wanted)) {
-        return wanted;
-    }
+namespace {
+
+bool isInstalled(std::string_view faceName) {
+    return !faceName.empty() &&
+           QFontDatabase::hasFamily(QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size())));
+}
+
+const Choices* substitutesFor(std::string_view faceName) {
     const auto* found = std::ranges::find_if(
         substitutes, [&](const Substitute& substitute) { return text::equalNoCase(substitute.face, faceName); });
-    return firstInstalled(found != std::end(substitutes) ? found->choices : choicesByFamily(pitchAndFamily));
+    return found != std::end(substitutes) ? &found->choices : nullptr;
+}
+
+} // namespace
+
+QString familyFor(std::string_view faceName, BYTE pitchAndFamily) {
+    if (isInstalled(faceName)) {
+        return QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size()));
+    }
+    const Choices* found = substitutesFor(faceName);
+    return firstInstalled(found ? *found : choicesByFamily(pitchAndFamily));
+}
+
+bool isInterfaceFace(std::string_view faceName) {
+    return !isInstalled(faceName) && substitutesFor(faceName) == &interface;
 }
 
 namespace {

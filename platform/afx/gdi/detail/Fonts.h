@@ -28,6 +28,8 @@ struct RealizedFont {
 
 /// The installed family that stands for a face name, chosen by pitch and family bits when the name is empty or unknown.
 [[nodiscard]] TVX_PLATFORM_API QString familyFor(std::string_view faceName, BYTE pitchAndFamily);
+/// Whether a face stands for that of labels and dialogs ("MS Shell Dlg" and its like) and is not itself installed.
+[[nodiscard]] bool isInterfaceFace(std::string_view faceName);
 
 /// The font for a description whose height and width are in device pixels. Fonts are kept: asking again is cheap.
 /// Null without a connection to the desktop.

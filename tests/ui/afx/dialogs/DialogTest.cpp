@@ -82,15 +82,19 @@ TEST(DialogTemplates, FollowTheFontSizeOfTheDesktop) {
         QApplication::setFont(font);
         CDialog dialog;
         EXPECT_TRUE(dialog.Create(IDD_EMPTY));
+        const QFontInfo shown(tvx::afx::peerOf(dialog.m_hWnd)->font());
+        EXPECT_EQ(shown.family(), QFontInfo(font).family()) << "one font for menus, boxes and dialogs";
+        EXPECT_GE(shown.pixelSize(), desktopPixels);
         CRect units(0, 0, 4, 8);
         dialog.MapDialogRect(&units);
         dialog.DestroyWindow();
         return units.Size();
     };
-    EXPECT_EQ(shownUnits(9), CSize(6, 13)) << "never smaller than the template says";
+    EXPECT_EQ(shownUnits(9), shownUnits(10)) << "never smaller than the template says";
+    const CSize usual = shownUnits(12);
     const CSize twice = shownUnits(24);
-    EXPECT_NEAR(twice.cx, 12, 1);
-    EXPECT_NEAR(twice.cy, 26, 1);
+    EXPECT_NEAR(twice.cx, 2 * usual.cx, 1);
+    EXPECT_NEAR(twice.cy, 2 * usual.cy, 1);
     QApplication::setFont(before);
 }
 
