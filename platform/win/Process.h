@@ -69,7 +69,7 @@ struct PROCESS_INFORMATION {
 /// The child is in a session of its own, so it outlives this process and its terminal. It inherits nothing but its
 /// three standard descriptors: those of the start-up record, or without `STARTF_USESTDHANDLES` this process's own.
 ///
-/// @param application  the program's file, not searched for; null takes the first word of the command line
+/// @param application  the program, looked for as that of a command line; null takes the first word of the command line
 /// @param commandLine  program and arguments; may be null when `application` is given
 /// @param processAttributes, threadAttributes  not used
 /// @param inherit      whether standard handles are handed on; FALSE makes them the null device

@@ -91,7 +91,7 @@ void findByPath(Program& program, const std::string& name) {
 void findByName(Program& program, const std::string& name) {
     for (const std::string& folder : searchedFolders()) {
         for (const std::string& spelling : spellings(name)) {
-            consider(program, (std::filesystem::path(folder) / spelling).string(), spelling);
+            consider(program, (fs::path(folder) / spelling).string(), spelling);
             if (!program.file.empty()) {
                 return;
             }

@@ -53,8 +53,11 @@ protected:
         sqlite3_close(database);
     }
     [[nodiscard]] std::vector<fs::path> setAside() const {
+        return setAside(m_sandbox.file.parent_path());
+    }
+    static std::vector<fs::path> setAside(const fs::path& folder) {
         std::vector<fs::path> found;
-        for (const auto& entry : fs::directory_iterator(m_sandbox.file.parent_path())) {
+        for (const auto& entry : fs::directory_iterator(folder)) {
             if (entry.path().filename().string().starts_with("registry-damaged-") &&
                 entry.path().extension() == ".db") {
                 found.push_back(entry.path());
@@ -487,6 +490,25 @@ TEST_F(RegistryOnFullDisk, StartsOnADiskThatIsFull) {
     fs::remove(m_disk / "ballast");
     EXPECT_EQ(key.write("a", "2"), 0) << "as soon as there is room";
     EXPECT_EQ(key.read("a"), "2");
+}
+
+TEST_F(RegistryOnFullDisk, DamageThatCannotBeSetAsideIsToldOnceAndMendedLater) {
+    TestKey(path).write("a", "1");
+    tvx::registry::closeStores();
+    const fs::path file = m_disk / "registry.db";
+    std::fstream(file, std::ios::in | std::ios::out | std::ios::binary) << std::string(100, 'x');
+    fill();
+    const std::string damaged = contents(file);
+    EXPECT_NE(TestKey(path).result, 0);
+    EXPECT_NE(TestKey(path).result, 0);
+    EXPECT_EQ(notices.size(), 1u);
+    EXPECT_TRUE(contents(file) == damaged);
+    fs::remove(m_disk / "ballast");
+    const TestKey key(path);
+    EXPECT_EQ(key.read("a"), "1") << "as soon as there is room for the copy";
+    EXPECT_EQ(key.write("a", "2"), 0);
+    ASSERT_EQ(setAside(m_disk).size(), 1u);
+    EXPECT_TRUE(contents(setAside(m_disk).front()) == damaged);
 }
 
 TEST_F(RegistryOnFullDisk, AFileThatCannotBeBegunIsTold) {
