@@ -245,12 +245,13 @@ TEST_F(FrameTest, TellsAssistiveToolsPartsOfAFrameByName) {
   StaticText "000 shapes"
   StaticText ""
 )");
+    frame.GetMenu()->ModifyMenu(ID_FILE_CLOSE, MF_BYCOMMAND, ID_FILE_CLOSE, "閉じる(&C)");
     QMenu* menu = clickBar(frame, "File");
     EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(menu)), R"(PopupMenu ""
  MenuItem "New"
  MenuItem "Save"
  Separator ""
- MenuItem "Close"
+ MenuItem "閉じる"
 )");
     QAccessibleInterface* save = QAccessible::queryAccessibleInterface(itemOf(*menu, "Save"));
     EXPECT_EQ(save->text(QAccessible::Accelerator), "Ctrl+S");
