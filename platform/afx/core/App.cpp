@@ -3,6 +3,7 @@
 #include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/CommandLineInfo.h"
 #include "platform/afx/core/StartCode.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Gdi.h"
@@ -174,14 +175,19 @@ void CWinApp::DoWaitCursor(int code) {
     }
 }
 
-void CWinApp::WinHelpA(DWORD_PTR, UINT) {}
+void CWinApp::WinHelpA(DWORD_PTR, UINT command) {
+    if (command != HELP_QUIT) {
+        const HelpAnswer answer;
+        AfxMessageBox(AFX_IDP_FAILED_TO_LAUNCH_HELP, MB_OK | MB_ICONEXCLAMATION, 0);
+    }
+}
 
 void CWinApp::WinHelpInternal(DWORD_PTR data, UINT command) {
     WinHelpA(data, command);
 }
 
 void CWinApp::OnHelp() {
-    WinHelpInternal(0, HELP_CONTEXT);
+    requestHelpAtKeyboard(m_pMainWnd ? m_pMainWnd->m_hWnd : nullptr);
 }
 
 void CWinApp::OnHelpIndex() {
@@ -197,7 +203,9 @@ void CWinApp::OnHelpUsing() {
 }
 
 void CWinApp::OnContextHelp() {
-    OnHelp();
+    if (m_pMainWnd && m_pMainWnd->IsFrameWnd()) {
+        m_pMainWnd->SendMessage(WM_COMMAND, ID_CONTEXT_HELP);
+    }
 }
 
 namespace {
@@ -224,12 +232,13 @@ private:
 
 } // namespace
 
-int CWinApp::DoMessageBox(LPCSTR text, UINT type, UINT) {
+int CWinApp::DoMessageBox(LPCSTR text, UINT type, UINT helpId) {
     const CWnd* over = CWnd::GetActiveWindow();
     if (!over) {
         over = GetMainWnd();
     }
     const WaitCursorPause pause;
+    const BoxHelp help(helpId != 0 ? HID_BASE_PROMPT + helpId : 0);
     return ::MessageBoxA(over ? over->m_hWnd : nullptr, text, m_pszAppName ? m_pszAppName : AfxGetAppName(), type);
 }
 

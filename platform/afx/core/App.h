@@ -65,6 +65,8 @@ public:
     LPCSTR m_pszRegistryKey = nullptr;
     /// Owned; null until the first AddDocTemplate.
     CDocManager* m_pDocManager = nullptr;
+    /// Whether the pointer chooses what to explain: see CFrameWnd::OnContextHelp.
+    BOOL m_bHelpMode = FALSE;
 
     /// The first call of a start, for what has to be there before InitInstance. FALSE ends the program with exit code
     /// 1, without ExitInstance.
@@ -177,8 +179,14 @@ public:
     virtual int DoMessageBox(LPCSTR text, UINT type, UINT helpId);
     /// Shows (1), ends (-1) or shows again (0) the wait cursor.
     virtual void DoWaitCursor(int code);
-    /// Every help request of the framework ends here. The base version has no viewer and answers nothing.
+    /// Every help request of the framework ends here. This system has no viewer of help files, so the base version
+    /// tells the user that help could not be started; HELP_QUIT does nothing.
+    /// @param data    what help is asked for: a context (HID_BASE_... and an identifier) or the address of a keyword
+    /// @param command one of the HELP_ commands
     virtual void WinHelpA(DWORD_PTR data, UINT command = HELP_CONTEXT);
+    void WinHelp(DWORD_PTR data, UINT command = HELP_CONTEXT) {
+        WinHelpA(data, command);
+    }
     /// Help requests of the framework's own windows; calls WinHelpA.
     virtual void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT);
 
@@ -193,7 +201,7 @@ public:
     afx_msg void OnFileOpen();
     /// Closes the main window as its close button does, so that documents are asked about.
     afx_msg void OnAppExit();
-    /// Help on where the user is; a frame's own OnHelp comes before it.
+    /// Help on where the keyboard is, as the help key asks for it.
     afx_msg void OnHelp();
     /// The list of topics: HELP_INDEX.
     afx_msg void OnHelpIndex();
@@ -201,7 +209,7 @@ public:
     afx_msg void OnHelpFinder();
     /// How help is used: HELP_HELPONHELP.
     afx_msg void OnHelpUsing();
-    /// The same as OnHelp: there is no mode in which the pointer chooses what to explain.
+    /// Lets the pointer choose what to explain, if the main window is a frame (WM_COMMAND with ID_CONTEXT_HELP).
     afx_msg void OnContextHelp();
 
     /// Hides the main window: the first step of the end.

@@ -389,6 +389,17 @@ using LPMSG = MSG*;
 #define HELP_CONTEXTPOPUP 0x0008
 #define HELP_FINDER 0x000B
 #define HELP_KEY 0x0101
+
+// Where the help contexts of commands, of dialogs and other resources, of messages and of bars begin: a context is one
+// of these and the identifier
+#define HID_BASE_COMMAND 0x00010000U
+#define HID_BASE_RESOURCE 0x00020000U
+#define HID_BASE_PROMPT 0x00030000U
+#define HID_BASE_CONTROL 0x00050000U
+
+// What a help request is about
+#define HELPINFO_WINDOW 0x0001
+#define HELPINFO_MENUITEM 0x0002
 #define CW_USEDEFAULT (static_cast<int>(0x80000000))
 
 /// What a window is created from; WM_CREATE carries a pointer to it.
@@ -469,14 +480,15 @@ struct SCROLLINFO {
     int nTrackPos; ///< Where the user holds the thumb while dragging it, else nPos. For reading only.
 };
 
-/// What WM_HELP carries a pointer to: the control that help was asked for. The message is for hosts that send it
-/// themselves; F1 in a dialog is the command ID_HELP of the main window, elsewhere a key like others.
+/// What WM_HELP carries a pointer to: what help is asked for. The message is sent for F1 and in the help mode of
+/// frames, to the window that is meant or the owner of the open menu; who does not take it hands it to its parent or
+/// owner by Default. docs/help-requests.md has the whole road.
 struct HELPINFO {
     UINT cbSize;           ///< sizeof(HELPINFO).
-    int iContextType;      ///< 1 for a control or window, 2 for a menu item.
-    int iCtrlId;           ///< The control's identifier or the item's command.
+    int iContextType;      ///< HELPINFO_WINDOW or HELPINFO_MENUITEM.
+    int iCtrlId;           ///< The control's identifier or the item's command; 0 for an item that opens a popup.
     HANDLE hItemHandle;    ///< The control's or the menu's handle.
-    DWORD_PTR dwContextId; ///< The number of the help page, 0 for none.
+    DWORD_PTR dwContextId; ///< The window's help number (SetWindowContextHelpId, or its template's), 0 for none.
     POINT MousePos;        ///< The pointer in screen pixels.
 };
 

@@ -435,7 +435,27 @@ public:
     void DragAcceptFiles(BOOL accept = TRUE);
     /// Passes a help request on to the application.
     virtual void WinHelpA(DWORD_PTR data, UINT command = HELP_CONTEXT);
+    void WinHelp(DWORD_PTR data, UINT command = HELP_CONTEXT) {
+        WinHelpA(data, command);
+    }
     virtual void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT);
+    /// The number that the window's help requests carry; controls of dialogs have their template's. 0 for none.
+    DWORD GetWindowContextHelpId() const;
+    BOOL SetWindowContextHelpId(DWORD context);
+
+    /// Commands of the Help menu, for the message maps of hosts: ON_COMMAND(ID_HELP_FINDER,
+    /// &CMDIFrameWnd::OnHelpFinder).
+    /// @{
+
+    /// Help on where the keyboard is, as the help key asks for it.
+    afx_msg void OnHelp();
+    /// The list of topics: HELP_INDEX.
+    afx_msg void OnHelpIndex();
+    /// The contents page: HELP_FINDER.
+    afx_msg void OnHelpFinder();
+    /// How help is used: HELP_HELPONHELP.
+    afx_msg void OnHelpUsing();
+    /// @}
 
     BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override;
     /// Whether WindowProc's caller should treat the window as a frame.
@@ -453,7 +473,7 @@ public:
     /// ((-1, -1) when the keyboard asked for a menu). Windows that come as arguments may be temporary or null.
     ///
     /// What differs: the desktop draws the frames of top-level windows, so there are no messages of the non-client area
-    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange, OnHelpInfo,
+    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange,
     /// OnQueryDragIcon, OnWindowPosChanging, OnWindowPosChanged and those of the session's end are called for messages
     /// that hosts send: the layer sends none of these. OnMove and OnSize tell of a new place.
     /// @{
@@ -475,6 +495,8 @@ public:
     afx_msg BOOL OnEraseBkgnd(CDC* dc);
     afx_msg UINT OnGetDlgCode();
     afx_msg void OnGetMinMaxInfo(MINMAXINFO* info);
+    /// The help key was pressed here, or help was asked for here in another way, or a window in or over this one has
+    /// not taken such a request. TRUE takes it; the base hands it on.
     afx_msg BOOL OnHelpInfo(HELPINFO* info);
     afx_msg void OnHScroll(UINT code, UINT position, CScrollBar* bar);
     afx_msg void OnVScroll(UINT code, UINT position, CScrollBar* bar);

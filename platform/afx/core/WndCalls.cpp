@@ -1,6 +1,7 @@
 #include "platform/afx/core/Wnd.h"
 
 #include "platform/afx/core/App.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PlainWindow.h"
 #include "platform/afx/gdi/Dc.h"
@@ -541,6 +542,35 @@ void CWnd::WinHelpInternal(DWORD_PTR data, UINT command) {
     if (CWinApp* app = AfxGetApp()) {
         app->WinHelpInternal(data, command);
     }
+}
+
+DWORD CWnd::GetWindowContextHelpId() const {
+    const Window* window = GetState();
+    return window ? window->helpContext : 0;
+}
+
+BOOL CWnd::SetWindowContextHelpId(DWORD context) {
+    Window* window = GetState();
+    if (window) {
+        window->helpContext = context;
+    }
+    return window ? TRUE : FALSE;
+}
+
+void CWnd::OnHelp() {
+    requestHelpAtKeyboard(m_hWnd);
+}
+
+void CWnd::OnHelpIndex() {
+    WinHelpInternal(0, HELP_INDEX);
+}
+
+void CWnd::OnHelpFinder() {
+    WinHelpInternal(0, HELP_FINDER);
+}
+
+void CWnd::OnHelpUsing() {
+    WinHelpInternal(0, HELP_HELPONHELP);
 }
 
 void CWnd::DragAcceptFiles(BOOL accept) {

@@ -31,9 +31,6 @@ END_MESSAGE_MAP()
 
 namespace {
 
-/// Where help contexts of dialogs begin, above those of commands.
-constexpr UINT helpBase = 0x20000;
-
 std::string nameOf(LPCSTR name) {
     return IS_INTRESOURCE(name) ? std::to_string(reinterpret_cast<std::uintptr_t>(name)) : std::string(name);
 }
@@ -313,15 +310,6 @@ BOOL CDialog::PreTranslateMessage(MSG* message) {
     if (CWnd::PreTranslateMessage(message)) {
         return TRUE;
     }
-    if (message->message == WM_KEYDOWN && message->wParam == VK_F1) {
-        CWnd* main = AfxGetMainWnd();
-        if (main && main->m_hWnd) {
-            main->SendMessage(WM_COMMAND, ID_HELP);
-        } else if (CWinApp* app = AfxGetApp()) {
-            app->OnCmdMsg(ID_HELP, CN_COMMAND, nullptr, nullptr);
-        }
-        return TRUE;
-    }
     // The keys of a child dialog belong to the dialog around it.
     const Window* window = GetState();
     if (window && window->isChild() && dynamic_cast<DialogWindow*>(window->parent())) {
@@ -349,7 +337,7 @@ BOOL CDialog::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info)
 
 LRESULT CDialog::OnCommandHelp(WPARAM, LPARAM context) {
     if (context == 0 && m_nIDHelp != 0) {
-        context = LPARAM{helpBase} + m_nIDHelp;
+        context = LPARAM{HID_BASE_RESOURCE} + m_nIDHelp;
     }
     CWinApp* app = AfxGetApp();
     if (context == 0 || !app) {

@@ -98,8 +98,8 @@ protected:
     afx_msg LRESULT HandleInitDialog(WPARAM wParam, LPARAM lParam);
     DECLARE_MESSAGE_MAP()
 
-    /// The number that WM_COMMANDHELP asks the application's help for, 0 for none. That of the template at first. F1
-    /// sends ID_HELP to the main window instead.
+    /// The number that the application's help is asked for when the help key is pressed in the dialog
+    /// (HID_BASE_RESOURCE is added); 0: the windows behind it are asked. That of the template at first.
     UINT m_nIDHelp = 0;
     LPCSTR m_lpszTemplateName = nullptr;
     CWnd* m_pParentWnd = nullptr;

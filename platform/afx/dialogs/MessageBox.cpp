@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -98,7 +99,13 @@ QString breakable(QString text, const QFontMetrics& metrics, int width) {
 /// A box whose buttons end our own loop. The toolkit's own exec would let no exception out.
 class Box : public QMessageBox {
 public:
-    Box(QWidget* over, UINT type) : QMessageBox(over), m_type(type) {}
+    /// @param owner  whom the box asks for help, null for the main window
+    Box(HWND owner, QWidget* over, UINT type)
+        : QMessageBox(over),
+          m_type(type),
+          m_owner(owner),
+          m_help(BoxHelp::take()),
+          m_hasHelp(!HelpAnswer::isUnderWay()) {}
 
     int ask(const char* text, const char* caption) {
         setWindowTitle(toQt(caption));
@@ -142,6 +149,10 @@ protected:
             finish(escapeAnswer(m_type));
             return;
         }
+        if (event->key() == Qt::Key_F1 && event->modifiers() == Qt::NoModifier && !event->isAutoRepeat()) {
+            askForHelp();
+            return;
+        }
         if (event->matches(QKeySequence::Copy)) {
             QApplication::clipboard()->setText(m_text);
             return;
@@ -150,6 +161,14 @@ protected:
     }
 
 private:
+    void askForHelp() {
+        // What help itself has to say would only be said again.
+        if (m_hasHelp) {
+            const CWnd* main = AfxGetMainWnd();
+            requestHelp(m_owner || !main ? m_owner : main->m_hWnd, m_help);
+        }
+    }
+
     void layOut() {
         auto* label = findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
         auto* grid = qobject_cast<QGridLayout*>(layout());
@@ -212,6 +231,9 @@ private:
     }
 
     UINT m_type;
+    HWND m_owner;
+    DWORD_PTR m_help; ///< Its context, 0 for none: then help is asked for on what it stands over.
+    bool m_hasHelp;
     QString m_text; ///< As it was given; what is shown may have been made breakable.
     ModalLoop m_loop;
 };
@@ -266,7 +288,7 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
         }
         return defaultOf(type).answer;
     }
-    Box box(visibleOwner(owner), type);
+    Box box(owner, visibleOwner(owner), type);
     return box.ask(shown(text).c_str(), caption);
 }
 

@@ -15,6 +15,7 @@ BEGIN_MESSAGE_MAP(CControlBar, CWnd)
     ON_WM_DESTROY()
     ON_MESSAGE(WM_IDLEUPDATECMDUI, &CControlBar::OnIdleUpdateCmdUI)
     ON_MESSAGE(WM_INITIALUPDATE, &CControlBar::OnInitialUpdate)
+    ON_MESSAGE(WM_HELPHITTEST, &CControlBar::OnHelpHitTest)
 END_MESSAGE_MAP()
 // clang-format on
 

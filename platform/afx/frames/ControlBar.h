@@ -80,6 +80,8 @@ public:
     afx_msg void OnDestroy();
     afx_msg LRESULT OnIdleUpdateCmdUI(WPARAM disable, LPARAM);
     afx_msg LRESULT OnInitialUpdate(WPARAM, LPARAM);
+    /// Answers what help mode is to explain at a point of the bar: the context of a button's command or of the bar.
+    afx_msg LRESULT OnHelpHitTest(WPARAM, LPARAM point);
 
 protected:
     friend class CFrameWnd;

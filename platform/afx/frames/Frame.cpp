@@ -42,7 +42,12 @@ BEGIN_MESSAGE_MAP(CFrameWnd, CWnd)
     ON_UPDATE_COMMAND_UI(ID_INDICATOR_CAPS, &CFrameWnd::OnUpdateKeyIndicator)
     ON_UPDATE_COMMAND_UI(ID_INDICATOR_NUM, &CFrameWnd::OnUpdateKeyIndicator)
     ON_UPDATE_COMMAND_UI(ID_INDICATOR_SCRL, &CFrameWnd::OnUpdateKeyIndicator)
+    ON_WM_HELPINFO()
+    ON_MESSAGE(WM_COMMANDHELP, &CFrameWnd::OnCommandHelp)
+    ON_MESSAGE(WM_EXITHELPMODE, &CFrameWnd::OnExitHelpMode)
     ON_COMMAND(ID_HELP, &CFrameWnd::OnHelp)
+    ON_COMMAND(ID_CONTEXT_HELP, &CFrameWnd::OnContextHelp)
+    ON_COMMAND(ID_DEFAULT_HELP, &CFrameWnd::OnHelpFinder)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -219,6 +224,7 @@ void CFrameWnd::PostNcDestroy() {
 }
 
 void CFrameWnd::OnDestroy() {
+    ExitHelpMode();
     // The menu of the document type is not the window's to destroy.
     if (m_hMenuDefault && ::GetMenu(m_hWnd) != m_hMenuDefault) {
         ::SetMenu(m_hWnd, m_hMenuDefault);
@@ -334,7 +340,7 @@ BOOL CFrameWnd::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* inf
 }
 
 BOOL CFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
-    return CWnd::OnCommand(wParam, lParam);
+    return (lParam == 0 && explains(LOWORD(wParam))) || CWnd::OnCommand(wParam, lParam) ? TRUE : FALSE;
 }
 
 bool CFrameWnd::closeDocument() {
@@ -412,7 +418,10 @@ void CFrameWnd::OnSetFocus(CWnd* previous) {
 }
 
 void CFrameWnd::OnSysCommand(UINT command, LPARAM parameter) {
-    CWnd::OnSysCommand(command, parameter);
+    const UINT item = command & 0xFFF0U;
+    if (item == SC_KEYMENU || !GetTopLevelFrame()->explains(item)) {
+        CWnd::OnSysCommand(command, parameter);
+    }
 }
 
 void CFrameWnd::OnEnterIdle(UINT reason, CWnd* who) {
@@ -453,10 +462,4 @@ void CFrameWnd::OnHScroll(UINT code, UINT position, CScrollBar*) {
 
 void CFrameWnd::OnVScroll(UINT code, UINT position, CScrollBar*) {
     forwardScroll(WM_VSCROLL, code, position);
-}
-
-void CFrameWnd::OnHelp() {
-    if (CWinApp* app = AfxGetApp()) {
-        app->OnHelp();
-    }
 }

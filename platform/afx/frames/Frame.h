@@ -74,8 +74,11 @@ public:
     HMENU m_hMenuDefault = nullptr;
     /// Number of the view (":1", ":2") when a document has several; -1 when no number is shown.
     int m_nWindow = -1;
-    /// The help context of the frame, 0 for none.
+    /// The number that the application's help is asked for when the help key is pressed in the frame
+    /// (HID_BASE_RESOURCE is added), 0 for none; LoadFrame takes that of the resources.
     UINT m_nIDHelp = 0;
+    /// Whether the pointer chooses what to explain.
+    BOOL m_bHelpMode = FALSE;
     /// The number of the message that the status line shows, and the one it showed before.
     UINT m_nIDTracking = 0;
     UINT m_nIDLastMessage = 0;
@@ -215,9 +218,22 @@ public:
     afx_msg void OnUpdateControlBarMenu(CCmdUI* item);
     afx_msg BOOL OnBarCheck(UINT id);
     afx_msg void OnUpdateKeyIndicator(CCmdUI* item);
-    afx_msg void OnHelp();
+    /// Turns a help request into WM_COMMANDHELP for the window that it is about, and then for those around it.
+    afx_msg BOOL OnHelpInfo(HELPINFO* info);
+    /// Asks the application for help: on `context`, else on the item of an open menu, else on the frame (m_nIDHelp).
+    /// FALSE when there is none of these.
+    afx_msg LRESULT OnCommandHelp(WPARAM, LPARAM context);
+    afx_msg LRESULT OnExitHelpMode(WPARAM, LPARAM);
+    /// ID_CONTEXT_HELP: begins or ends the mode in which the pointer chooses what to explain. What is clicked on, or
+    /// chosen in a menu, is explained instead of done; then, and by Esc, the mode is over.
+    afx_msg void OnContextHelp();
+    /// Ends that mode, if it is on.
+    virtual void ExitHelpMode();
     /// @}
 protected:
+    /// In help mode: ends it and explains a command. FALSE where the command is to be carried out.
+    bool explains(UINT command);
+
     friend class CControlBar;
     friend class CDocument;
     friend class CView;

@@ -1,5 +1,6 @@
 #include "platform/afx/core/App.h"
 #include "platform/afx/core/DropFiles.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/frames/Frame.h"
 
 // Menus and the status line of frames.
@@ -67,17 +68,12 @@ void CFrameWnd::updateMenuItems(CMenu& popup) {
 
 void CFrameWnd::OnMenuSelect(UINT item, UINT flags, HMENU) {
     CFrameWnd* top = GetTopLevelFrame();
-    UINT prompt = item;
-    // So the platform tells that the menu has closed. System commands lie 16 apart and their prompts 1; all frames of
-    // the Window menu share one.
+    UINT prompt = 0;
+    // So the platform tells that the menu has closed.
     if (flags == 0xFFFF) {
-        prompt = AFX_IDS_IDLEMESSAGE;
-    } else if (item == 0 || (flags & (MF_SEPARATOR | MF_POPUP)) != 0) {
-        prompt = 0;
-    } else if (item >= SC_SIZE && item < 0xF1F0) {
-        prompt = (item - SC_SIZE) / 16 + AFX_IDS_SCFIRST;
-    } else if (item >= AFX_IDM_FIRST_MDICHILD) {
-        prompt = AFX_IDS_MDICHILD;
+        prompt = top->m_bHelpMode ? AFX_IDS_HELPMODEMESSAGE : AFX_IDS_IDLEMESSAGE;
+    } else {
+        prompt = (flags & (MF_SEPARATOR | MF_POPUP)) != 0 ? 0 : tvx::afx::promptOf(item);
     }
     top->m_nIDTracking = prompt;
     if (top->m_nIDTracking != top->m_nIDLastMessage) {

@@ -17,6 +17,7 @@ IMPLEMENT_DYNCREATE(CMDIFrameWnd, CFrameWnd)
 BEGIN_MESSAGE_MAP(CMDIFrameWnd, CFrameWnd)
     ON_WM_DESTROY()
     ON_WM_ACTIVATE()
+    ON_MESSAGE(WM_COMMANDHELP, &CMDIFrameWnd::OnCommandHelp)
     ON_WM_INITMENUPOPUP()
     ON_UPDATE_COMMAND_UI(ID_WINDOW_ARRANGE, &CMDIFrameWnd::OnUpdateMDIWindowCmd)
     ON_UPDATE_COMMAND_UI(ID_WINDOW_CASCADE, &CMDIFrameWnd::OnUpdateMDIWindowCmd)
@@ -224,6 +225,9 @@ BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
 }
 
 BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
+    if (lParam == 0 && explains(LOWORD(wParam))) {
+        return TRUE;
+    }
     // A child frame may handle the command in an OnCommand of its own; it also comes along by the routing.
     CMDIChildWnd* child = MDIGetActive();
     if (child && child->SendMessage(WM_COMMAND, wParam, lParam) != 0) {

@@ -84,6 +84,8 @@ public:
     afx_msg BOOL OnMDIWindowCmd(UINT id);
     /// Window New: another frame with a view of the active document; without a document nothing happens.
     afx_msg void OnWindowNew();
+    /// Asks the active child frame first.
+    afx_msg LRESULT OnCommandHelp(WPARAM, LPARAM context);
 
 protected:
     friend class CMDIChildWnd;

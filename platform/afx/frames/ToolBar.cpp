@@ -24,6 +24,7 @@ IMPLEMENT_DYNAMIC(CToolBar, CControlBar)
 // clang-format off
 BEGIN_MESSAGE_MAP(CToolBar, CControlBar)
     ON_WM_DESTROY()
+    ON_MESSAGE(WM_HELPHITTEST, &CToolBar::OnHelpHitTest)
 END_MESSAGE_MAP()
 // clang-format on
 

@@ -123,6 +123,7 @@ public:
     CSize CalcFixedLayout(BOOL stretch, BOOL horizontal) override;
 
     afx_msg void OnDestroy();
+    afx_msg LRESULT OnHelpHitTest(WPARAM, LPARAM point);
 
 protected:
     DECLARE_MESSAGE_MAP()

@@ -400,10 +400,7 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         }
         return 0;
     case WM_KEYDOWN:
-        if (!editKey(wParam)) {
-            passEvent(*this, message);
-        }
-        return 0;
+        return editKey(wParam) ? 0 : Control::defaultProc(message, wParam, lParam);
     case WM_CUT:
         if (isReadOnly()) {
             m_field->copy();

@@ -3,6 +3,7 @@
 #include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Drops.h"
+#include "platform/afx/core/detail/HelpMode.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MessageQueue.h"
@@ -473,6 +474,9 @@ bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     }
     if (event->type() == QEvent::ApplicationStateChange) {
         forgetKeys();
+        if (QGuiApplication::applicationState() != Qt::ApplicationActive) {
+            leaveHelpMode();
+        }
         return false;
     }
     watchKeys(*event);
@@ -489,6 +493,10 @@ bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     Window* window = Window::of(receiver);
     if (!window || window->isDestroyed()) {
         return false;
+    }
+    if (input && helpModeTakes(*window, *receiver, *event)) {
+        result = true;
+        return true;
     }
     return input ? translateInput(*window, receiver, event) : translateOther(*window, receiver, event, result);
 }

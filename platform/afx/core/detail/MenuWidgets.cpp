@@ -4,6 +4,7 @@
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -142,6 +143,17 @@ void PopupMenu::hovered(QAction* action) {
     } else {
         sendSelect(m_host.owner, item.id, (item.flags & 0xFFU) | MF_HILITE | system, m_menu);
     }
+}
+
+void PopupMenu::keyPressEvent(QKeyEvent* event) {
+    const QAction* action = activeAction();
+    if (event->key() != Qt::Key_F1 || event->modifiers() != Qt::NoModifier || event->isAutoRepeat() || !action) {
+        QMenu::keyPressEvent(event);
+        return;
+    }
+    armIdle();
+    const MenuPlace place = findItem(m_menu, static_cast<UINT>(indexOf(*action)), MF_BYPOSITION);
+    requestMenuHelp(m_host.owner, m_menu, place && !place.item().popup ? place.item().id : 0);
 }
 
 void PopupMenu::chosen(QAction* action) {

@@ -32,6 +32,10 @@ public:
         return m_menu;
     }
 
+protected:
+    /// The help key asks for help on the chosen item.
+    void keyPressEvent(QKeyEvent* event) override;
+
 private:
     void fill();
     void addItem(const MenuItem& item, int index);

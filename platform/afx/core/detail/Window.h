@@ -136,6 +136,7 @@ public:
     HICON smallIcon = nullptr;
     HCURSOR classCursor = nullptr;
     HBRUSH classBrush = nullptr;
+    DWORD helpContext = 0; ///< What its help requests carry; 0 for none.
     /// What is to be repainted while WM_PAINT is handled, in client coordinates; empty outside of it.
     QRegion paintRegion;
     bool inPaint = false;
@@ -216,6 +217,8 @@ private:
     LRESULT mouseProc(UINT message, WPARAM wParam, LPARAM lParam);
     LRESULT systemCommand(UINT command, LPARAM lParam);
     LRESULT systemKey(UINT message, WPARAM wParam, LPARAM lParam);
+    LRESULT helpProc(const HELPINFO* info);
+    LRESULT keyDown(WPARAM key, LPARAM lParam);
     bool showClassCursor(WPARAM under);
 
     HWND m_handle = nullptr;

@@ -1,5 +1,6 @@
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/KeyMove.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
@@ -151,6 +152,10 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_CONTEXTMENU:
     case WM_MOUSEWHEEL:
         return parentProc(message, wParam, lParam);
+    case WM_HELP:
+        return helpProc(reinterpret_cast<const HELPINFO*>(lParam));
+    case WM_KEYDOWN:
+        return keyDown(wParam, lParam);
     case WM_CLOSE:
         destroy();
         return 0;
@@ -184,6 +189,28 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         passEvent(*this, message);
         return 0;
     }
+}
+
+/// A help request that nobody took goes on to what the window stands in or over.
+LRESULT Window::helpProc(const HELPINFO* info) {
+    const Window* above = m_parent ? m_parent : m_owner;
+    if (above) {
+        return SendMessageA(above->m_handle, WM_HELP, 0, reinterpret_cast<LPARAM>(info));
+    }
+    answerHelpRequest(*info, m_handle);
+    return TRUE;
+}
+
+/// The help key asks once, however long it is held.
+LRESULT Window::keyDown(WPARAM key, LPARAM lParam) {
+    const bool help = key == VK_F1 || key == VK_HELP;
+    const bool repeated = (lParam & (LPARAM{1} << 30)) != 0;
+    if (!help || repeated || isKeyDown(VK_SHIFT) || isKeyDown(VK_CONTROL) || isKeyDown(VK_MENU)) {
+        passEvent(*this, WM_KEYDOWN);
+        return 0;
+    }
+    requestHelp(m_handle);
+    return 0;
 }
 
 /// Keys with Alt that nobody took belong to the menu of the top-level window.

@@ -344,12 +344,14 @@ HWND makeControl(DialogWindow& dialog, const DialogItemTemplate& item) {
 
 bool makeControls(DialogWindow& dialog, const DialogTemplate& description) {
     bool complete = true;
+    dialog.helpContext = description.helpId;
     for (const DialogItemTemplate& item : description.items) {
         const HWND control = makeControl(dialog, item);
         if (!control) {
             complete = false;
             continue;
         }
+        Window::from(control)->helpContext = item.helpId;
         SendMessageA(control, WM_SETFONT, reinterpret_cast<WPARAM>(dialog.font), FALSE);
         // The font has changed the height of lines, and with it that of boxes that show whole lines only.
         const QRect place = dialog.map(item.rect);

@@ -11,11 +11,9 @@
 namespace {
 
 TEST(App, HelpCommandsEndAtTheApplicationsHelp) {
-    const std::pair<void (CWinApp::*)(), UINT> commands[] = {{&CWinApp::OnHelp, HELP_CONTEXT},
-                                                             {&CWinApp::OnHelpIndex, HELP_INDEX},
+    const std::pair<void (CWinApp::*)(), UINT> commands[] = {{&CWinApp::OnHelpIndex, HELP_INDEX},
                                                              {&CWinApp::OnHelpFinder, HELP_FINDER},
-                                                             {&CWinApp::OnHelpUsing, HELP_HELPONHELP},
-                                                             {&CWinApp::OnContextHelp, HELP_CONTEXT}};
+                                                             {&CWinApp::OnHelpUsing, HELP_HELPONHELP}};
     for (const auto& [command, expected] : commands) {
         testApplication.help.clear();
         (testApplication.*command)();
