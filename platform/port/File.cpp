@@ -67,6 +67,17 @@ void File::close(Stream* stream) {
     delete stream;
 }
 
+bool File::exist(const char* path) {
+    const std::optional<std::string> name = systemName(path);
+    struct stat status{};
+    return name && ::stat(name->c_str(), &status) == 0 && S_ISREG(status.st_mode);
+}
+
+bool File::canread(const char* path) {
+    const std::optional<std::string> name = exist(path) ? systemName(path) : std::nullopt;
+    return name && ::access(name->c_str(), R_OK) == 0;
+}
+
 bool File::getdatetime(const char* path, std::int64_t& time) {
     const std::optional<std::string> name = systemName(path);
     struct stat status{};

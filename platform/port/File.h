@@ -38,6 +38,11 @@ public:
     /// Closes and frees a stream from open; null is ignored.
     static void close(Stream* stream);
 
+    /// Whether there is a file of that name: no folder. Null names none.
+    [[nodiscard]] static bool exist(const char* path);
+    /// Whether there is such a file and this process may read it.
+    [[nodiscard]] static bool canread(const char* path);
+
     /// When a file was last changed.
     /// @param time receives the seconds since 1970, UTC; left alone on failure
     /// @return whether there is such a file

@@ -9,6 +9,7 @@
 #include <cstring>
 #include <ctime>
 #include <pthread.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace Port {
@@ -67,6 +68,14 @@ std::size_t readSome(int descriptor, char* to, std::size_t size) {
             return got > 0 ? static_cast<std::size_t>(got) : 0;
         }
     }
+}
+
+/// What a file has behind the place up to which it was read; 0 where that cannot be known.
+std::size_t sizeOfRest(int descriptor) {
+    struct stat status{};
+    const off_t at = ::lseek(descriptor, 0, SEEK_CUR);
+    const bool isKnown = at >= 0 && ::fstat(descriptor, &status) == 0 && status.st_size > at;
+    return isKnown ? static_cast<std::size_t>(status.st_size - at) : 0;
 }
 
 /// Length of the line end at the beginning of @p text.
@@ -134,6 +143,25 @@ int Stream::readline(char* to, int limit) {
 
 bool Stream::geteof() const {
     return m_eof;
+}
+
+std::string Stream::readall() {
+    std::string text = m_input.substr(m_consumed);
+    m_input.clear();
+    m_consumed = 0;
+    std::size_t length = text.size();
+    // One byte more than the file is said to have: the read that leaves it empty tells that the file ends there.
+    text.resize(length + sizeOfRest(m_descriptor) + 1);
+    while (const std::size_t got = readSome(m_descriptor, text.data() + length, text.size() - length)) {
+        length += got;
+        if (length == text.size()) {
+            text.resize(length + std::max(length, chunkSize));
+        }
+    }
+    text.resize(length);
+    m_exhausted = true;
+    m_eof = true;
+    return text;
 }
 
 /// Reads on until @p count bytes wait, or there are no more.

@@ -49,6 +49,8 @@ public:
     /// Whether the last readline ran into the end of the file: it found no line end behind what it read. So it does
     /// for what stands behind the last line end, be that text or nothing. A file that cannot be read on has ended.
     bool geteof() const;
+    /// Reads all that is left, line ends as they are. A file that cannot be read on has ended.
+    std::string readall();
 
 private:
     void buffer(std::size_t count);

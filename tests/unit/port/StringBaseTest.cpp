@@ -1,9 +1,7 @@
 #include "platform/port/StringBase.h"
 
-#include "platform/port/Env.h"
 #include "platform/port/Str.h"
 
-#include <cstdlib>
 #include <gtest/gtest.h>
 #include <map>
 #include <vector>
@@ -70,18 +68,6 @@ TEST(Str, WideConversionLosesNothing) {
     EXPECT_EQ(UT_STR::WstrToMbstr(nullptr), "");
     EXPECT_EQ(UT_STR::MbstrToWstr(nullptr), L"");
     UT_STR::WDelStrings(nullptr, 3);
-}
-
-TEST(Env, RootsAreTheUsersThenTheSharedOne) {
-    EXPECT_EQ(Port_Env::GetEnv(nullptr), nullptr);
-    EXPECT_EQ(Port_Env::GetEnv("TVX_NOT_SET_ANYWHERE"), nullptr);
-    ::setenv("TARVEX", "/opt/tarvex", 1);
-    ::setenv("MYTARVEX", "", 1);
-    EXPECT_EQ(Port_Env::GetRoots(), std::vector<std::string>{"/opt/tarvex"});
-    ::setenv("MYTARVEX", "/home/me/tarvex", 1);
-    EXPECT_EQ(Port_Env::GetRoots(), (std::vector<std::string>{"/home/me/tarvex", "/opt/tarvex"}));
-    ::unsetenv("MYTARVEX");
-    ::unsetenv("TARVEX");
 }
 
 } // namespace
