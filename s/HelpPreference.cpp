@@ -19,7 +19,7 @@ CString commonSetting(const char* entry) {
         path += CString("\\") + app->m_pszRegistryKey;
     }
     path += "\\Common\\Settings";
-    return SettingsKey(path, SettingsKey::Way::Read).text(entry).value_or(CString());
+    return RegistryText(HKEY_CURRENT_USER, path, entry).value_or(CString());
 }
 
 } // namespace

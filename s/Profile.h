@@ -114,6 +114,30 @@ public:
     static void WriteLogFont(LOGFONTA& font, const char* entry, const char* section);
     /// @}
 
+    /// Which programs open texts and pages: command lines that the user has named once for the whole family, else those
+    /// of the system. Nothing is reported when nothing is found, or when writing fails. docs/programs.md tells how they
+    /// are started.
+    /// @{
+
+    /// Reads the text editor: the user's, which may be empty, else the default one.
+    /// @return 1
+    static int ReadTextEditorName(CString& name);
+    /// Keeps the user's text editor.
+    static void WriteTextEditorName(const char* name);
+    /// The text editor where the user has named none: the one registered as the system's, else "wordpad.exe".
+    static void GetDefaultTextEditorName(CString& name);
+
+    /// Reads the web browser: the user's, else the default one.
+    /// @param name  receives the command line, in which "%1" stands for the address; unchanged when there is none
+    /// @return 1, or 0 when there is none
+    static int ReadWebBrowserName(CString& name);
+    /// Keeps the user's web browser; the empty text means the default one.
+    static void WriteWebBrowserName(const char* name);
+    /// The web browser where the user has named none: the one that opens ".htm" files, else Internet Explorer.
+    /// @param name  unchanged when there is none
+    static void GetDefaultWebBrowserName(CString& name);
+    /// @}
+
 private:
     Gui_Profile() = default;
 };

@@ -16,7 +16,6 @@ namespace {
 constexpr const char* placementEntry = "WindowPlacement";
 constexpr const char* fontEntry = "Font";
 constexpr const char* barProfile = "ControlBar";
-constexpr const char* familyKey = "Software\\Tarvex\\Common";
 constexpr char spaceInName = '~';
 
 /// Reads as many numbers, separated by commas, as there is room for.

@@ -5,22 +5,22 @@
 #include <cstdint>
 #include <optional>
 
-/// A key of the user's settings. Closes itself.
+/// The key of what all applications of the family share, below the root of the current user.
+inline constexpr const char* familyKey = "Software\\Tarvex\\Common";
+
+/// The text of a value, up to its first zero, of a key that is only looked at.
+/// @param path  below the root
+/// @param name  empty: the key's default value
+/// @return nothing when there is no such key or value
+[[nodiscard]] std::optional<CString> RegistryText(HKEY root, const char* path, const char* name);
+
+/// A key of the user's settings, open for reading and writing; made when it is missing. Closes itself.
 class SettingsKey {
 public:
-    enum class Way {
-        Change, ///< for reading and writing; the key is made when it is missing
-        Read    ///< a missing key has no values
-    };
-
     /// @param path  below the root of the current user
-    explicit SettingsKey(const char* path, Way way = Way::Change) {
-        if (way == Way::Read) {
-            RegOpenKeyExA(HKEY_CURRENT_USER, path, 0, KEY_READ, &m_key);
-        } else {
-            RegCreateKeyExA(HKEY_CURRENT_USER, path, 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE, nullptr,
-                            &m_key, nullptr);
-        }
+    explicit SettingsKey(const char* path) {
+        RegCreateKeyExA(HKEY_CURRENT_USER, path, 0, nullptr, REG_OPTION_NON_VOLATILE, KEY_READ | KEY_WRITE, nullptr,
+                        &m_key, nullptr);
     }
     ~SettingsKey() {
         RegCloseKey(m_key);

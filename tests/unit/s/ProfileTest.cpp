@@ -1,6 +1,6 @@
 #include "s/Profile.h"
 
-#include "StoreTest.h"
+#include "NoProgramsTest.h"
 #include "TestApp.h"
 #include "platform/port/Version.h"
 #include "s/Version.h"
@@ -168,6 +168,53 @@ TEST_F(Profile, ReadsNumbersOfOthersAsFarAsTheyAreNumbers) {
     EXPECT_EQ(number, 12);
     EXPECT_EQ(read("00000000000000000012", &number), 0) << "twenty characters do not fit";
     EXPECT_EQ(number, 7);
+}
+
+/// What has been asked for, or "unchanged" where nothing was found.
+CString answer(int (*read)(CString&)) {
+    CString name = "unchanged";
+    const int result = read(name);
+    EXPECT_EQ(result, name != "unchanged");
+    return name;
+}
+CString answer(void (*get)(CString&)) {
+    CString name = "unchanged";
+    get(name);
+    return name;
+}
+
+class ProfilePrograms : public NoProgramsTest {};
+
+TEST_F(ProfilePrograms, TextEditorIsTheUsersElseTheSystems) {
+    EXPECT_EQ(answer(&Gui_Profile::ReadTextEditorName), "wordpad.exe");
+    storeForMachine("Software\\Microsoft\\Windows\\CurrentVersion\\App Paths\\WORDPAD.EXE", " %ed% ");
+    EXPECT_EQ(answer(&Gui_Profile::ReadTextEditorName), " %ed% ") << "as it is stored";
+    Gui_Profile::WriteTextEditorName("kate -b");
+    EXPECT_EQ(stored(family, "TextEditor"), "kate -b");
+    EXPECT_EQ(answer(&Gui_Profile::ReadTextEditorName), "kate -b");
+    EXPECT_EQ(answer(&Gui_Profile::GetDefaultTextEditorName), " %ed% ");
+    Gui_Profile::WriteTextEditorName("");
+    EXPECT_EQ(answer(&Gui_Profile::ReadTextEditorName), "") << "an empty name is a choice too";
+}
+
+TEST_F(ProfilePrograms, WebBrowserIsTheUsersElseTheAssociatedElseTheLast) {
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "unchanged");
+    EXPECT_EQ(answer(&Gui_Profile::GetDefaultWebBrowserName), "unchanged");
+    EXPECT_EQ(stored(family, "Browser"), "<no key>") << "looking makes no key";
+    storeForMachine(lastBrowser, "\tiexplore ");
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "iexplore");
+    store("Software\\Classes\\.htm", "", "");
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "iexplore") << "an association with nothing";
+    associate(".htm", "  ");
+    EXPECT_EQ(answer(&Gui_Profile::GetDefaultWebBrowserName), "iexplore") << "a command of blanks is none";
+    associate(".htm", " browse \"%1\" ");
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "browse \"%1\"");
+    Gui_Profile::WriteWebBrowserName("  ");
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "  ") << "the user's blanks count";
+    EXPECT_EQ(answer(&Gui_Profile::GetDefaultWebBrowserName), "browse \"%1\"");
+    Gui_Profile::WriteWebBrowserName("");
+    EXPECT_EQ(stored(family, "Browser"), "");
+    EXPECT_EQ(answer(&Gui_Profile::ReadWebBrowserName), "browse \"%1\"");
 }
 
 } // namespace
