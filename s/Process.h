@@ -55,6 +55,24 @@ public:
     /// @param timeout  not used: programs do not tell when their window is there
     int RunWaitForWindow(const char* commandLine, const char* directory, unsigned long timeout);
 
+    /// Opens an address in a web browser: the user's, else that of the system, else the last resort. A browser that
+    /// does not start gives way to the next; when none starts, one message box says what was tried. The browser runs on
+    /// without being held, so it does not matter what this object holds. docs/programs.md has the rules.
+    /// @param url        an address such as "file:///opt/tarvex/doc/usenglish/board/index.html"
+    /// @param directory  where the browser starts; null or empty is the current directory
+    /// @param wait       not used: a browser that was started is all that is waited for
+    /// @param timeout    not used
+    /// @return 1 when a browser was started, else 0
+    int RunWebBrowser(const char* url, const char* directory, int wait, unsigned long timeout);
+    /// Opens a text in the user's text editor (Gui_Profile::ReadTextEditorName). Sets the release policy to
+    /// `LeaveRunning` with exit code 0.
+    /// @param fileName   written behind the editor's command line as it is: a name with blanks needs its quotes
+    /// @param directory  where the editor starts; null is the current directory
+    /// @param wait       not used
+    /// @param timeout    not used
+    /// @return as Run
+    int RunTextEditor(const char* fileName, const char* directory, int wait, unsigned long timeout);
+
     /// What the child ended with: 259 while it runs, 0xFFFFFFFF without a child. A child that crashed has a code
     /// beginning with 0xC or 0x8; one that was stopped by a signal 128 and the signal's number.
     unsigned long GetExitCode();

@@ -7,10 +7,12 @@
 
 /// The key of what all applications of the family share, below the root of the current user.
 inline constexpr const char* familyKey = "Software\\Tarvex\\Common";
+/// The user's web browser in that key.
+inline constexpr const char* browserEntry = "Browser";
 
 /// The text of a value, up to its first zero, of a key that is only looked at.
 /// @param path  below the root
-/// @param name  empty: the key's default value
+/// @param name  null: the key's default value
 /// @return nothing when there is no such key or value
 [[nodiscard]] std::optional<CString> RegistryText(HKEY root, const char* path, const char* name);
 

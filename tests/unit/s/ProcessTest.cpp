@@ -1,7 +1,7 @@
 #include "s/Process.h"
 
+#include "Children.h"
 #include "platform/win/Error.h"
-#include "platform/win/detail/ProcessObject.h"
 
 #include <gtest/gtest.h>
 
@@ -65,20 +65,6 @@ std::size_t openDescriptors() {
         ++count;
     }
     return count;
-}
-
-bool hasChildren() {
-    siginfo_t status;
-    return ::waitid(P_ALL, 0, &status, WEXITED | WNOHANG | WNOWAIT) == 0;
-}
-
-/// Waits until children that were let go have ended, and for their collection.
-void awaitReleased() {
-    auto& released = tvx::win::ReleasedChildren::instance();
-    while (released.count() > 0) {
-        tvx::win::waitReadable(released.bell(), 0xFFFFFFFF);
-        released.collect();
-    }
 }
 
 } // namespace

@@ -40,6 +40,8 @@ const std::map<UINT, std::string> strings = {
     {20081, "&Dock"},
     {20083, "%1: failed.\nPlease set environment variable TVX_GUI_HELP_BROWSER_PATH and run the program again. Trying "
             "system default browser.\n"},
+    {20084, "%1 runs in a sandbox (%2) and cannot read %3. The page was opened in another way."},
+    {20085, "%1 runs in a sandbox (%2) and cannot read %3."},
     {20086, "%1 : System default browser failed. Trying Internet Explorer.\n"},
     {20088, "System default browser not set. Trying Internet Explorer.\n"},
     {20089, "%1: failed.\nPlease install Internet Explorer or Netscape as system default browser."},
