@@ -4,7 +4,10 @@
 // moves the results by a factor of three.
 #include "bench/SystemCalls.h"
 #include "platform/win/Process.h"
+#include "platform/win/detail/ProcessObject.h"
+#include "platform/win/detail/RegistryStore.h"
 #include "s/Process.h"
+#include "s/Profile.h"
 
 #include <QProcess>
 
@@ -12,6 +15,7 @@
 #include <csignal>
 #include <cstring>
 #include <fcntl.h>
+#include <filesystem>
 #include <functional>
 #include <memory>
 #include <poll.h>
@@ -109,6 +113,29 @@ void startToolkit(benchmark::State& state) {
     }
 }
 BENCHMARK(startToolkit)->Unit(benchmark::kMicrosecond)->UseRealTime();
+
+/// A browser opened on an address: the settings are looked into, the command line is put together, the program starts.
+void startWebBrowser(benchmark::State& state) {
+    growTo200Megabytes();
+    const std::filesystem::path store = std::filesystem::temp_directory_path() / "tvx-bench-browser.db";
+    ::setenv("TVX_REGISTRY", store.c_str(), 1);
+    Gui_Profile::WriteWebBrowserName("/bin/true --new \"%1\"");
+    auto& released = tvx::win::ReleasedChildren::instance();
+    for (auto _ : state) {
+        if (!Gui_Process().RunWebBrowser("file:///usr/share/doc/index.html", nullptr, 1, 5000)) {
+            state.SkipWithError("the browser did not start");
+        }
+        state.PauseTiming();
+        while (released.count() > 0) {
+            tvx::win::waitReadable(released.bell(), INFINITE);
+            released.collect();
+        }
+        state.ResumeTiming();
+    }
+    tvx::registry::closeStores();
+    std::filesystem::remove(store);
+}
+BENCHMARK(startWebBrowser)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
 // Draining 256 MiB. The range is 0 for small blocks ("head"), 1 for blocks of 1 MiB ("dd"), and 0 for one core, 1 for
 // two.
