@@ -6,6 +6,7 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/dialogs/DialogWatch.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Exception.h"
 #include "platform/win/FrameworkIds.h"
@@ -288,6 +289,7 @@ int MessageBoxA(HWND owner, LPCSTR text, LPCSTR caption, UINT type) {
         }
         return defaultOf(type).answer;
     }
+    tvx::tellDialogOpens();
     Box box(owner, visibleOwner(owner), type);
     return box.ask(shown(text).c_str(), caption);
 }

@@ -298,14 +298,18 @@ void TopLevelWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
     const Qt::WindowFlags flags = windowFlags(style(), exStyle());
     widget()->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
     if (flags != windowFlags(oldStyle, oldExStyle)) {
-        // Told by the widget, the toolkit would make the desktop's window anew: handles would no longer name it.
-        guarded([&] {
-            widget()->overrideWindowFlags(flags);
-            if (QWindow* native = widget()->windowHandle()) {
-                native->setFlags(flags);
-            }
-        });
+        changeWindowFlags(*widget(), flags);
     }
+}
+
+void changeWindowFlags(QWidget& widget, Qt::WindowFlags flags) {
+    // Told by the widget, the toolkit would make the desktop's window anew: handles would no longer name it.
+    guarded([&] {
+        widget.overrideWindowFlags(flags);
+        if (QWindow* native = widget.windowHandle()) {
+            native->setFlags(flags);
+        }
+    });
 }
 
 void TopLevelWindow::applySizeLimits() {

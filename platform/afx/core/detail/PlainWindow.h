@@ -77,6 +77,8 @@ void setChildFrameFactory(WindowFactory factory);
 
 /// The toolkit's window flags for a framework window's styles.
 TVX_PLATFORM_API Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle);
+/// Gives the widget of a top-level window other flags, whether it is shown or not.
+TVX_PLATFORM_API void changeWindowFlags(QWidget& widget, Qt::WindowFlags flags);
 
 /// Does what a show command (SW_...) says with a top-level window's widget.
 TVX_PLATFORM_API void showTopLevel(Window& window, int command);

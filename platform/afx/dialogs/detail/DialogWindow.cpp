@@ -1,17 +1,18 @@
 #include "platform/afx/dialogs/detail/DialogWindow.h"
-#include "platform/afx/controls/detail/Control.h"
-#include "platform/afx/gdi/detail/Fonts.h"
 
 #include "platform/afx/controls/detail/ButtonWindow.h"
+#include "platform/afx/controls/detail/Control.h"
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/Wnd.h"
 #include "platform/afx/core/detail/DesktopAnswers.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PlainWindow.h"
+#include "platform/afx/dialogs/DialogWatch.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/gdi/detail/DeviceContext.h"
+#include "platform/afx/gdi/detail/Fonts.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Text.h"
 #include "platform/win/ExtensionModule.h"
@@ -67,13 +68,21 @@ DialogWindow::~DialogWindow() {
 
 // --- the window ---
 
+namespace {
+
+/// The dialog flag lets the window manager keep it over its owner, without entries of its own in task lists.
+Qt::WindowFlags flags(DWORD style, DWORD exStyle) {
+    return windowFlags(style, exStyle) | Qt::Dialog;
+}
+
+} // namespace
+
 QWidget* DialogWindow::makeWidget(QWidget* parent) {
     if (isChild()) {
         return new QWidget(parent);
     }
     QWidget* over = owner() ? owner()->widget() : nullptr;
-    // The dialog flag lets the window manager keep it over its owner, without entries of its own in task lists.
-    return new QWidget(over, windowFlags(style(), exStyle()) | Qt::Dialog);
+    return new QWidget(over, flags(style(), exStyle()));
 }
 
 void DialogWindow::widgetMade() {
@@ -88,7 +97,10 @@ int DialogWindow::accessibleRole() const {
     return QAccessible::Dialog;
 }
 
-void DialogWindow::styleChanged(DWORD oldStyle, DWORD) {
+void DialogWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
+    if (!isChild() && flags(style(), exStyle()) != flags(oldStyle, oldExStyle)) {
+        changeWindowFlags(*widget(), flags(style(), exStyle()));
+    }
     if (!isChild() && ((oldStyle ^ style()) & WS_THICKFRAME) != 0) {
         fixSize();
     }
@@ -151,6 +163,7 @@ void DialogWindow::showWidget(int command) {
         return;
     }
     if (command != SW_HIDE && widget()->isHidden()) {
+        tellDialogOpens();
         keepOnScreen();
     }
     showTopLevel(*this, command);

@@ -4,6 +4,7 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/dialogs/DialogWatch.h"
 
 #include <QDialog>
 #include <QPushButton>
@@ -25,6 +26,7 @@ public:
     }
     /// Shows it and answers whether the user chose OK.
     bool ask() {
+        tellDialogOpens();
         guarded([this] {
             // Pictures on buttons come and go with the desktop's style; no other dialog of the framework has them.
             for (auto* button : this->template findChildren<QPushButton*>()) {
