@@ -82,11 +82,3 @@ void Gui_WinApp::DoWaitCursor(int code) {
         SetCursorPos(position.x, position.y);
     }
 }
-
-void Gui_WinApp::WinHelpA(DWORD_PTR data, UINT command) {
-    CWinApp::WinHelpA(data, command);
-}
-
-void Gui_WinApp::WinHelpInternal(DWORD_PTR data, UINT command) {
-    WinHelpA(data, command);
-}

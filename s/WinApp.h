@@ -76,12 +76,20 @@ public:
     /// already is, so that the new shape shows before the user moves it.
     void DoWaitCursor(int code) override;
 
-    /// Every help request of the application ends here.
+    /// Every help request of the application ends here. One whose help file is a help map (Gui_Help::SetHelpFileName)
+    /// answers it with documents (Gui_BrowserHelp), another one with the platform's viewer, of which there is none
+    /// here.
     /// @param data    what help is asked for: a context number or a keyword, as @p command says
     /// @param command one of the HELP_ commands
     void WinHelpA(DWORD_PTR data, UINT command = HELP_CONTEXT) override;
     /// Hands the framework's own help requests to WinHelpA, so that an override of that gets all of them.
     void WinHelpInternal(DWORD_PTR data, UINT command = HELP_CONTEXT) override;
+
+    /// The address of the family's page on the web that sends on to the one in the user's language; more parameters may
+    /// be appended: GetRedirectUrl() + "&topic=support". The server is that of the build or the installation
+    /// (docs/installation.md). The page's language is Japanese, Korean or Chinese (traditional or simplified) when the
+    /// user's is, else English.
+    static CString GetRedirectUrl();
 
     /// The icon for the About box; it stays the application's.
     virtual HICON GetAppIcon() = 0;
@@ -163,6 +171,19 @@ public:
     /// Clears the record if it names this process.
     void UnregisterInstance();
     /// @}
+
+protected:
+    /// Commands of every application's Help menu; the application has them as soon as its menu names them.
+    /// @{
+
+    /// GUI_ID_HELP_MANUALS: opens the installed manuals in the PDF viewer.
+    afx_msg void OnCommonHelpOnlineDocuments();
+    /// GUI_ID_HELP_SUPPORT: opens the support page in the web browser.
+    afx_msg void OnCommonHelpSupportServices();
+    /// GUI_ID_HELP_ABOUT: shows the About box.
+    afx_msg void OnHelpAbout();
+    /// @}
+    DECLARE_MESSAGE_MAP()
 
 private:
     std::unique_ptr<Gui_WinAppData> m_data;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "afx.h"
+#include "s/BrowserHelp.h"
 #include "s/MessageOrigin.h"
 
 /// What the application object keeps for itself.
@@ -8,6 +9,7 @@ struct Gui_WinAppData {
     int registered = 0; ///< 1 once this process has made itself the first instance
     CString usageText;  ///< the host's text behind the usage summary
     CString pending;    ///< messages of the command-line check that are still to be shown
+    Gui_BrowserHelp help;
 };
 
 /// The origin of the messages that the application object issues.

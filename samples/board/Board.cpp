@@ -8,6 +8,7 @@
 #include "platform/port/MsgDispatcher.h"
 #include "s/Desktop.h"
 #include "s/FileName.h"
+#include "s/Help.h"
 #include "s/Locale.h"
 
 #include <algorithm>
@@ -48,33 +49,12 @@ CString CBoardCommandLine::GetUsageText() const {
     return text;
 }
 
-// --- the About box ---
-
-namespace {
-
-class CAboutDialog : public CDialog {
-public:
-    CAboutDialog() : CDialog(IDD_ABOUT) {}
-
-protected:
-    BOOL OnInitDialog() override {
-        CDialog::OnInitDialog();
-        CString title;
-        title.Format("%s %s", theApp.m_pszAppName, theApp.GetAppVersion().GetString());
-        SetDlgItemText(IDC_VERSION, title);
-        return TRUE;
-    }
-};
-
-} // namespace
-
 // --- the application ---
 
 CBoardApp theApp;
 
 // clang-format off
 BEGIN_MESSAGE_MAP(CBoardApp, Gui_WinApp)
-    ON_COMMAND(ID_APP_ABOUT, &CBoardApp::OnAppAbout)
     ON_COMMAND(ID_FILE_NEW, &CWinApp::OnFileNew)
     ON_COMMAND(ID_FILE_OPEN, &CWinApp::OnFileOpen)
 END_MESSAGE_MAP()
@@ -100,6 +80,11 @@ BOOL CBoardApp::InitInstance() {
         }
         RegisterInstance();
         m_single = true;
+    }
+    Gui_Help::SetHelpFileName("board.map");
+    if (info.m_bShowSplash) {
+        m_splash = std::make_unique<Gui_SplashDlg>(nullptr);
+        m_splash->Create(nullptr);
     }
     return ShowMainFrame(info);
 }
@@ -164,6 +149,16 @@ CString CBoardApp::GetAppVersion() {
     return version;
 }
 
-void CBoardApp::OnAppAbout() {
-    CAboutDialog().DoModal();
+BOOL CBoardApp::PreTranslateMessage(MSG* message) {
+    if (m_splash) {
+        m_splash->CheckMessage(message, m_pMainWnd);
+    }
+    return Gui_WinApp::PreTranslateMessage(message);
+}
+
+BOOL CBoardApp::OnIdle(LONG count) {
+    if (m_splash && !m_splash->CheckTimeout(m_pMainWnd)) {
+        m_splash.reset();
+    }
+    return Gui_WinApp::OnIdle(count);
 }

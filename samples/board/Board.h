@@ -2,8 +2,10 @@
 
 #include "s/CommandLineInfo.h"
 #include "s/MessageManager.h"
+#include "s/SplashDlg.h"
 #include "s/WinApp.h"
 
+#include <memory>
 #include <vector>
 
 /// The command line of the board: the switches of the family, the grid, one instance only, and any number of drawings.
@@ -34,10 +36,11 @@ public:
     HICON GetAppIcon() override;
     CString GetAppVersion() override;
 
+    BOOL PreTranslateMessage(MSG* message) override;
+    BOOL OnIdle(LONG count) override;
+
     /// Distance of the grid points in pixels; 0 for none.
     int m_grid = 10;
-
-    afx_msg void OnAppAbout();
 
 private:
     /// Whether this is to be the only board.
@@ -49,6 +52,8 @@ private:
 
     /// Shows errors in message boxes, those of handlers that have failed among them.
     Gui_MessageManager m_messages;
+    /// Shown while the application starts, null afterwards.
+    std::unique_ptr<Gui_SplashDlg> m_splash;
 
     DECLARE_MESSAGE_MAP()
 };

@@ -21,6 +21,8 @@ BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
     ON_WM_CREATE()
     ON_WM_CLOSE()
     ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
+    ON_COMMAND(ID_HELP_FINDER, &CMDIFrameWnd::OnHelpFinder)
+    ON_COMMAND(ID_HELP_SEARCH, &CMainFrame::OnHelpSearch)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -89,6 +91,7 @@ void CMainFrame::OnRunCommand() {
     query.SetPrompt(prompt);
     query.SetAnswer(m_lastCommand);
     query.SetAnswerFieldWidth(50);
+    query.SetHelpId(HID_BASE_COMMAND + ID_TOOLS_RUN_COMMAND);
     if (query.DoModal() != IDOK) {
         return;
     }
@@ -96,5 +99,22 @@ void CMainFrame::OnRunCommand() {
     if (!command.IsEmpty()) {
         m_lastCommand = command;
         COutputWindow::Run(command, this);
+    }
+}
+
+void CMainFrame::OnHelpSearch() {
+    CString title;
+    CString prompt;
+    title.LoadString(IDS_SEARCH_TITLE);
+    prompt.LoadString(IDS_SEARCH_PROMPT);
+    Gui_QueryDlg query(this);
+    query.SetTitle(title);
+    query.SetPrompt(prompt);
+    query.SetAnswer(m_lastKeyword);
+    query.SetAnswerFieldWidth(30);
+    query.SetHelpId(HID_BASE_COMMAND + ID_HELP_SEARCH);
+    if (query.DoModal() == IDOK) {
+        m_lastKeyword = query.GetAnswer();
+        WinHelp(reinterpret_cast<DWORD_PTR>(m_lastKeyword.GetString()), HELP_KEY);
     }
 }

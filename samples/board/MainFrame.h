@@ -15,6 +15,7 @@ public:
     afx_msg int OnCreate(CREATESTRUCT* cs);
     afx_msg void OnClose();
     afx_msg void OnRunCommand();
+    afx_msg void OnHelpSearch();
 
 private:
     void saveWindows();
@@ -23,6 +24,7 @@ private:
     CToolBar m_toolBar;
     CStatusBar m_statusBar;
     CString m_lastCommand;
+    CString m_lastKeyword;
 
     DECLARE_MESSAGE_MAP()
 };

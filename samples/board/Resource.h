@@ -3,10 +3,8 @@
 #define IDR_BOARDTYPE 129
 #define IDR_CONTEXT 130
 
-#define IDD_ABOUT 100
 #define IDD_TEXT 101
 #define IDD_OUTPUT 102
-#define IDC_VERSION 1000
 #define IDC_TEXT 1001
 #define IDC_OUTPUT 1002
 #define IDC_STATE 1003
@@ -24,6 +22,8 @@
 #define IDS_ENDED 209
 #define IDS_STOPPED 210
 #define IDS_CRASHED 211
+#define IDS_SEARCH_TITLE 212
+#define IDS_SEARCH_PROMPT 213
 
 /* What is wrong with a drawing, in the order of board::Fault. */
 #define IDS_FAULT_FIRST 220
@@ -60,3 +60,5 @@
 #define ID_INDICATOR_POSITION 32810
 
 #define ID_TOOLS_RUN_COMMAND 32820
+#define ID_TOOLS_WEB_BROWSER 32821
+#define ID_HELP_SEARCH 32830

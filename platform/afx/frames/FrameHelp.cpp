@@ -38,6 +38,11 @@ LRESULT CMDIFrameWnd::OnCommandHelp(WPARAM wParam, LPARAM context) {
 }
 
 void CFrameWnd::OnContextHelp() {
+    // The command reaches child frames first; the mode is the whole window's.
+    if (CFrameWnd* top = GetTopLevelFrame(); top != this) {
+        top->OnContextHelp();
+        return;
+    }
     if (m_bHelpMode) {
         ExitHelpMode();
         return;

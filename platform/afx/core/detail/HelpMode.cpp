@@ -43,7 +43,8 @@ bool takePress(const Window& window, const QMouseEvent& event) {
 }
 
 bool takeKey(const QKeyEvent& event) {
-    if (event.key() == Qt::Key_F1) {
+    // With modifiers it is the key that has begun the mode.
+    if (event.key() == Qt::Key_F1 && event.modifiers() == Qt::NoModifier) {
         leaveHelpMode();
         return false;
     }

@@ -85,6 +85,10 @@ TEST_F(HelpRequest, TheActiveChildFrameAnswersBeforeTheMainFrame) {
     EXPECT_EQ(take(), context(HID_BASE_RESOURCE + IDR_TESTBOARD)) << "from the view";
     frame.SendMessage(WM_HELP, 0, reinterpret_cast<LPARAM>(std::make_unique<HELPINFO>().get()));
     EXPECT_EQ(take(), context(HID_BASE_RESOURCE + IDR_TESTBOARD)) << "from the main frame";
+    frame.SendMessage(WM_COMMAND, ID_CONTEXT_HELP);
+    EXPECT_TRUE(frame.m_bHelpMode) << "the whole window's, though the child frame gets commands first";
+    QTest::mouseClick(tvx::afx::peerOf(frame.MDIGetActive()->GetActiveView()->m_hWnd), Qt::LeftButton);
+    EXPECT_EQ(take(), context(HID_BASE_RESOURCE + IDR_TESTBOARD));
     frame.MDIGetActive()->m_nIDHelp = 0;
     frame.m_nIDHelp = 0;
     key(Qt::Key_F1);
@@ -206,7 +210,7 @@ TEST_F(HelpRequest, TheBaseTellsThatThereIsNoViewerAndThatBoxHasNoHelp) {
 TEST_F(HelpRequest, InHelpModeAClickExplainsInsteadOfActing) {
     NoteFrame& frame = openNote();
     const auto enter = [&] { frame.SendMessage(WM_COMMAND, ID_CONTEXT_HELP); };
-    enter();
+    key(Qt::Key_F1, Qt::ShiftModifier);
     EXPECT_TRUE(frame.m_bHelpMode);
     EXPECT_TRUE(testApplication.m_bHelpMode);
     ASSERT_NE(QApplication::overrideCursor(), nullptr);
