@@ -9,6 +9,7 @@ namespace {
 
 constexpr std::string_view blanks = " \t";
 constexpr std::string_view headerMarks = " \t[]";
+constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
 constexpr std::size_t firstSlots = 64;
 
 std::string_view trimmed(std::string_view text) {
@@ -143,7 +144,6 @@ private:
         const HelpMapFile* file;
         std::string normalized;
         const char* at;
-        const char* bodyStart = nullptr;
         std::optional<std::size_t> section;
     };
     enum class Stop { AtEnd, AtInclude };
@@ -166,12 +166,13 @@ bool HelpMapText::Reader::open(const std::string& name) {
         return false;
     }
     unifyLineEnds(*text);
+    if (text->starts_with(byteOrderMark)) {
+        text->erase(0, byteOrderMark.size());
+    }
     const HelpMapFile& file = m_map.m_files.emplace_back(HelpMapFile{name, *std::move(text)});
-    constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
-    const char* const start = file.text.data() + (file.text.starts_with(byteOrderMark) ? byteOrderMark.size() : 0);
     std::string normalized = m_source.normalized(name);
     m_map.m_read.insert(normalized);
-    m_chain.push_back({&file, std::move(normalized), start, nullptr, std::nullopt});
+    m_chain.push_back({&file, std::move(normalized), file.text.data(), {}});
     return true;
 }
 
@@ -201,16 +202,19 @@ void HelpMapText::Reader::begin(Reading& reading, std::string_view header) {
     const std::string_view key = m_map.keyOf(header);
     if (!m_map.begin(key)) {
         m_source.remark(HelpMapRemark::DuplicateSection, *reading.file, trimmed(header), key);
-    } else if (!key.empty()) {
+        return;
+    }
+    m_map.m_sections.back().body = between(reading.at, reading.at);
+    if (!key.empty()) {
         reading.section = m_map.m_sections.size() - 1;
-        reading.bodyStart = reading.at;
     }
 }
 
 /// Ends the section that is being read, if there is one.
 void HelpMapText::Reader::end(Reading& reading, const char* bodyEnd) {
     if (reading.section) {
-        m_map.m_sections[*reading.section].body = between(reading.bodyStart, bodyEnd);
+        std::string_view& body = m_map.m_sections[*reading.section].body;
+        body = between(body.data(), bodyEnd);
         reading.section.reset();
     }
 }
