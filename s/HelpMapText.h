@@ -77,6 +77,10 @@ public:
     /// Takes the next line.
     /// @return false when there is none
     bool next(std::string_view& line);
+    /// Where the line behind it begins.
+    [[nodiscard]] const char* rest() const {
+        return m_rest.data();
+    }
 
 private:
     std::string_view m_rest;

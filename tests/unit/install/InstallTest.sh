@@ -30,5 +30,7 @@ said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1) || code=$?
 [[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
 
 ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
-"$work/moved/bin/tvxsettings" --help >/dev/null
-[ -s "$work/moved/share/man/man1/tvxsettings.1" ] || { echo "FAIL: no manual page"; exit 1; }
+for tool in tvxsettings helpmapcheck; do
+    "$work/moved/bin/$tool" --help >/dev/null
+    [ -s "$work/moved/share/man/man1/$tool.1" ] || { echo "FAIL: no manual page of $tool"; exit 1; }
+done
