@@ -234,31 +234,6 @@ TEST_F(HelpMap, SaysWhatIsWrongWithFilesAndIncludes) {
     EXPECT_EQ(m_messages.messages[1].type, Port_MsgMan::MsgTypeInternal);
 }
 
-/// What would take a deep stack or quadratic time.
-TEST_F(HelpMap, ReadsWhateverIsLarge) {
-    constexpr int chain = 10000;
-    for (int i = 0; i < chain; ++i) {
-        const std::string number = std::to_string(i);
-        makeMap("m" + number + ".map", "[topic " + number + "]\ntype=url\nfile=first\n#include m" +
-                                           std::to_string((i + 1) % chain) + "\nfile=" + number + "\n");
-    }
-    ASSERT_TRUE(m_map.Read(m_root + "/share/helpmap/m0.map"));
-    EXPECT_EQ(key("topic 9999").files, (Texts{"first", "9999"}));
-    EXPECT_EQ(key("topic 0").files, (Texts{"first", "0"}));
-
-    std::string text;
-    for (int i = 0; i < 1000000; ++i) {
-        text += "[key " + std::to_string(i) + "]\ntype=url\nfile=" + std::to_string(i) + "\n";
-    }
-    const std::string longLine(10000000, 'x');
-    ASSERT_TRUE(read(text + "[long]\ntype=url\nfile=" + longLine + "\n[" + longLine + "]\nfile=a\n"));
-    EXPECT_EQ(key("key 0").files, Texts{"0"});
-    EXPECT_EQ(key("key 999999").files, Texts{"999999"});
-    EXPECT_EQ(key("key 1000000"), Answer());
-    EXPECT_EQ(key("long").files, Texts{longLine});
-    EXPECT_NE(m_map.Find(longLine, ""), Gui_HelpMap::End());
-}
-
 TEST_F(HelpMap, LocatesDocuments) {
     const std::string guide = make(m_root + "/doc/usenglish/guide.htm");
     const std::string beside = make(m_root + "/share/helpmap/beside.htm");
