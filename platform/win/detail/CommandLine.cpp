@@ -1,10 +1,10 @@
 #include "platform/win/detail/CommandLine.h"
 
+#include "platform/base/Address.h"
 #include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
 
 #include <algorithm>
-#include <charconv>
 #include <climits>
 #include <filesystem>
 #include <optional>
@@ -71,45 +71,9 @@ bool isAbsolute(std::string_view name) {
     return name.starts_with("\\\\") || (hasDrive(name) && name.size() > 2 && (name[2] == '\\' || name[2] == '/'));
 }
 
-/// The byte that two hexadecimal digits name.
-std::optional<char> codedByte(std::string_view digits) {
-    unsigned value = 0;
-    const char* begin = digits.data();
-    const char* end = begin + digits.size();
-    const auto [read, error] = std::from_chars(begin, end, value, 16);
-    return digits.size() == 2 && read == end && error == std::errc() ? std::optional(static_cast<char>(value))
-                                                                     : std::nullopt;
-}
-
-std::string decoded(std::string_view address) {
-    std::string result;
-    for (std::size_t at = 0; at < address.size(); ++at) {
-        const std::optional<char> byte = address[at] == '%' ? codedByte(address.substr(at + 1, 2)) : std::nullopt;
-        result += byte.value_or(address[at]);
-        at += byte ? 2 : 0;
-    }
-    return result;
-}
-
-std::string encoded(std::string_view path) {
-    constexpr std::string_view kept =
-        "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789-._~/!$&'()*+,;=:@";
-    constexpr std::string_view digits = "0123456789ABCDEF";
-    std::string result;
-    for (const char character : path) {
-        const auto byte = static_cast<unsigned char>(character);
-        if (kept.find(character) != std::string_view::npos) {
-            result += character;
-        } else {
-            result.append({'%', digits[byte >> 4], digits[byte & 15]});
-        }
-    }
-    return result;
-}
-
 /// The name in a file address of the platform, "C:\a" for "file:///C|\a".
 std::optional<std::string> nameInAddress(const std::string& word) {
-    if (!text::equalNoCase(std::string_view(word).substr(0, 5), "file:")) {
+    if (!isFileAddress(word)) {
         return std::nullopt;
     }
     std::string name = word.substr(5);
@@ -123,7 +87,7 @@ std::optional<std::string> nameInAddress(const std::string& word) {
 }
 
 std::string addressOf(std::string_view path, std::string_view rest) {
-    return "file://" + encoded(path) + std::string(rest);
+    return "file://" + encodeAddress(path) + std::string(rest);
 }
 
 /// Addresses come with their characters as they are, from this family, or coded, from elsewhere; a file that exists
@@ -135,7 +99,7 @@ std::string addressForChild(const std::string& name, const std::string& word) {
         return plain ? addressOf(*plain, {}) : word;
     }
     const std::size_t place = std::min(name.find_first_of("?#"), name.size());
-    const std::optional<std::string> path = systemPath(decoded(std::string_view(name).substr(0, place)));
+    const std::optional<std::string> path = systemPath(decodeAddress(std::string_view(name).substr(0, place)));
     return path ? addressOf(*path, std::string_view(name).substr(place)) : word;
 }
 
