@@ -1,7 +1,9 @@
 #include "s/BrowserChain.h"
 
 #include "afxwin.h"
+#include "platform/base/Exception.h"
 #include "platform/port/Env.h"
+#include "platform/win/Associations.h"
 #include "res/resource.h"
 #include "s/Msg.h"
 #include "s/Process.h"
@@ -11,6 +13,9 @@
 #include <algorithm>
 #include <array>
 #include <memory>
+#include <optional>
+#include <set>
+#include <string>
 
 namespace {
 
@@ -45,7 +50,27 @@ bool start(const CString& commandLine, const CString& directory) {
     return browser.Run(commandLine, directory.IsEmpty() ? nullptr : directory.GetString(), 0, 0) == 1;
 }
 
-/// Opens one page; keeps what is to be said when that fails.
+/// A browser that was not tried, because it could not open the page.
+struct PassedOver {
+    const Candidate* candidate;
+    CString browser;
+    std::string obstacle;
+};
+
+/// Why a browser was passed over, in a sentence.
+CString reason(const PassedOver& passed, const CString& url) {
+    Gui_Msg sentence(passed.obstacle == "files only" ? GUI_IDS_BROWSER_FILES_ONLY : GUI_IDS_BROWSER_SANDBOXED);
+    sentence << passed.browser << passed.obstacle.c_str() << url;
+    return sentence.GetValue();
+}
+
+/// Whether something about a browser has not been said before in this process.
+bool isNews(const CString& browser) {
+    static std::set<std::string> said;
+    return tvx::allocating([&browser] { return said.insert(browser.GetString()).second; });
+}
+
+/// Opens one page; keeps what is to be said of the ways that were tried.
 class Launch {
 public:
     explicit Launch(const BrowserRequest& request) : m_request(request) {}
@@ -53,24 +78,60 @@ public:
     bool Try(const Candidate& candidate) {
         CString browser;
         if (!candidate.find(browser)) {
-            m_story += candidate.missing ? Gui_Msg(candidate.missing).GetValue() : CString();
+            Say(candidate.missing ? Gui_Msg(candidate.missing).GetValue() : CString());
             return false;
         }
-        const CString commandLine = Programs::CommandLineFor(withoutRemote(browser), m_request.url);
+        browser = withoutRemote(browser);
+        const std::string obstacle =
+            tvx::allocating([&] { return tvx::obstacleTo(browser.GetString(), m_request.url.GetString()); });
+        if (obstacle.empty()) {
+            return Start(candidate, browser, m_request.url);
+        }
+        if (!m_passedOver) {
+            m_passedOver = PassedOver{&candidate, browser, obstacle};
+        }
+        return false;
+    }
+    /// Lets the first browser that was passed over open the page where it is on the web.
+    bool TryOnWeb() {
+        return m_passedOver && !m_request.webUrl.IsEmpty() &&
+               Start(*m_passedOver->candidate, m_passedOver->browser, m_request.webUrl);
+    }
+    /// Tells why the page is not shown by the browser that it was meant for.
+    void ExplainDetour() const {
+        if (m_passedOver && isNews(m_passedOver->browser)) {
+            AfxMessageBox(reason(*m_passedOver, m_request.url) + "\n" + Gui_Msg(GUI_IDS_BROWSER_OTHER_WAY).GetValue());
+        }
+    }
+    /// Tells what was tried.
+    void ExplainFailure() {
+        if (m_passedOver) {
+            Say(reason(*m_passedOver, m_request.url));
+        }
+        AfxMessageBox(m_story);
+    }
+
+private:
+    bool Start(const Candidate& candidate, const CString& browser, const CString& url) {
+        const CString commandLine = Programs::CommandLineFor(browser, url);
         if (start(commandLine, m_request.directory)) {
             return true;
         }
         Gui_Msg failed(candidate.failed);
         failed << commandLine;
-        m_story += failed;
+        Say(failed.GetValue());
         return false;
     }
-    [[nodiscard]] const CString& Story() const {
-        return m_story;
+    /// The texts of the first steps end their lines, those of the last do not.
+    void Say(const CString& text) {
+        if (!m_story.IsEmpty() && m_story.Right(1) != "\n") {
+            m_story += "\n";
+        }
+        m_story += text;
     }
 
-private:
     const BrowserRequest& m_request;
+    std::optional<PassedOver> m_passedOver; ///< the first one
     CString m_story;
 };
 
@@ -78,9 +139,11 @@ private:
 
 int RunBrowserChain(const BrowserRequest& request) {
     Launch launch(request);
-    if (std::ranges::any_of(candidates, [&launch](const Candidate& candidate) { return launch.Try(candidate); })) {
+    if (std::ranges::any_of(candidates, [&launch](const Candidate& candidate) { return launch.Try(candidate); }) ||
+        launch.TryOnWeb()) {
+        launch.ExplainDetour();
         return 1;
     }
-    AfxMessageBox(launch.Story());
+    launch.ExplainFailure();
     return 0;
 }

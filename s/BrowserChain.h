@@ -5,10 +5,10 @@
 /// A page that is to be shown in a web browser.
 struct BrowserRequest {
     CString url;
-    CString directory;         ///< where the browser starts; empty: the current directory
+    CString directory = {};    ///< where the browser starts; empty: the current directory
     int wait = 0;              ///< kept for the caller's sake: nothing depends on it
     unsigned long timeout = 0; ///< likewise
-    CString webUrl;            ///< where the page is on the web when `url` is a local file; empty: nowhere
+    CString webUrl = {};       ///< where the page is on the web when `url` is a local file; empty: nowhere
 };
 
 /// Starts the first browser that can be started: the user's, the system's, the last resort. A browser that cannot read

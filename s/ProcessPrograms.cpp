@@ -7,7 +7,7 @@
 // Programs that open documents.
 
 int Gui_Process::RunWebBrowser(const char* url, const char* directory, int wait, unsigned long timeout) {
-    return RunBrowserChain({.url = url, .directory = directory, .wait = wait, .timeout = timeout, .webUrl = {}});
+    return RunBrowserChain({.url = url, .directory = directory, .wait = wait, .timeout = timeout});
 }
 
 int Gui_Process::RunTextEditor(const char* fileName, const char* directory, int /*wait*/, unsigned long /*timeout*/) {

@@ -4,6 +4,7 @@
 #include "TestApp.h"
 #include "platform/port/Version.h"
 #include "platform/win/Error.h"
+#include "s/BrowserChain.h"
 #include "s/PDFProcess.h"
 #include "s/PDFProfile.h"
 #include "s/Profile.h"
@@ -68,6 +69,13 @@ protected:
         theApp.boxes.clear();
         return texts;
     }
+    /// With "@" for the page.
+    static std::string shown(std::string words) {
+        for (std::size_t at = words.find(page); at != std::string::npos; at = words.find(page)) {
+            words.replace(at, std::string(page).size(), "@");
+        }
+        return words;
+    }
     static int browse(const char* directory = nullptr) {
         return Gui_Process().RunWebBrowser(page, directory, 1, 5000);
     }
@@ -97,11 +105,7 @@ TEST_F(WebBrowser, GetsTheAddressWhereItsCommandLineSays) {
     for (const auto& [commandLine, expected] : cases) {
         Gui_Profile::WriteWebBrowserName(commandLine.c_str());
         EXPECT_EQ(browse(), 1);
-        std::string words = started();
-        for (std::size_t at = words.find(page); at != std::string::npos; at = words.find(page)) {
-            words.replace(at, std::string(page).size(), "@");
-        }
-        EXPECT_EQ(words, expected) << commandLine;
+        EXPECT_EQ(shown(started()), expected) << commandLine;
     }
     EXPECT_EQ(boxes(), "");
 }
@@ -158,6 +162,57 @@ TEST_F(WebBrowser, GivesWayToTheNextUntilOneStarts) {
     EXPECT_EQ(browse("/no/such/folder"), 0);
     EXPECT_NE(boxes().find("browser " + std::string(page) + ": failed."), std::string::npos);
     EXPECT_FALSE(hasChildren());
+}
+
+TEST_F(WebBrowser, IsPassedOverWhereItCannotReadThePage) {
+    install("snap/bin/fox");
+    const std::string fox = (m_folder / "snap/bin/fox").string();
+    const std::string why = " runs in a sandbox (snap) and cannot read " + std::string(page) + ".";
+    const std::string detour = why + "\nThe page was opened in another way.";
+    const std::string noLast =
+        "Cannot find Internet Explorer program.\nPlease install Internet Explorer or Netscape as "
+        "system default browser.\n";
+    const struct {
+        std::string user;
+        std::string system;
+        const char* last;
+        const char* web;
+        const char* started; ///< "@" stands for the page
+        std::string told;
+    } cases[] = {
+        {fox, "system", "", "http://web", "system|@", "[" + fox + detour + "]"},
+        {fox, "system", "", "http://web", "system|@", ""}, // said once
+        {fox + " %1", fox, "last", "", "last|@", "[" + fox + " %1" + detour + "]"},
+        {"", fox, "", "http://web", "fox|http://web", ""},
+        {fox + " -x", fox, "", "http://web", "fox|-x|http://web", "[" + fox + " -x" + detour + "]"},
+        {"", fox, "", "", "", "[" + noLast + fox + why + "]"},
+        {"", fox + "\t", "none", "", "",
+         "[none " + std::string(page) + ": failed." + noLast.substr(38) + fox + why + "]"},
+    };
+    for (const auto& [user, system, last, web, expected, told] : cases) {
+        Gui_Profile::WriteWebBrowserName(user.c_str());
+        associate(".htm", system);
+        storeForMachine(lastBrowser, last);
+        EXPECT_EQ(RunBrowserChain({.url = page, .webUrl = web}), *expected != '\0');
+        EXPECT_EQ(shown(started()), expected) << user;
+        EXPECT_EQ(boxes(), told) << user;
+    }
+    EXPECT_EQ(Gui_Process().RunWebBrowser("http://web", nullptr, 0, 0), 1);
+    EXPECT_EQ(started(), "fox|http://web");
+    EXPECT_EQ(boxes(), "");
+}
+
+TEST_F(WebBrowser, SaysWhatFailedWhenTheWebDoesNotHelp) {
+    install("snap/bin/fox");
+    const std::string fox = (m_folder / "snap/bin/fox").string();
+    std::ofstream(fox) << "#!/none\n"; // can be found, but not started
+    associate(".htm", fox);
+    EXPECT_EQ(RunBrowserChain({.url = page, .webUrl = "http://web"}), 0);
+    EXPECT_EQ(boxes(),
+              "[Cannot find Internet Explorer program.\nPlease install Internet Explorer or Netscape as system "
+              "default browser.\n" +
+                  fox + " http://web : System default browser failed. Trying Internet Explorer.\n" + fox +
+                  " runs in a sandbox (snap) and cannot read " + page + ".]");
 }
 
 using TextEditor = ProgramsTest;

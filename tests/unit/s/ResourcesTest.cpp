@@ -40,9 +40,10 @@ const std::map<UINT, std::string> strings = {
     {20081, "&Dock"},
     {20083, "%1: failed.\nPlease set environment variable TVX_GUI_HELP_BROWSER_PATH and run the program again. Trying "
             "system default browser.\n"},
-    {20084, "%1 runs in a sandbox (%2) and cannot read %3. The page was opened in another way."},
-    {20085, "%1 runs in a sandbox (%2) and cannot read %3."},
+    {20084, "%1 runs in a sandbox (%2) and cannot read %3."},
+    {20085, "%1 opens files only and cannot show %3."},
     {20086, "%1 : System default browser failed. Trying Internet Explorer.\n"},
+    {20087, "The page was opened in another way."},
     {20088, "System default browser not set. Trying Internet Explorer.\n"},
     {20089, "%1: failed.\nPlease install Internet Explorer or Netscape as system default browser."},
     {20090, "Cannot find Internet Explorer program.\nPlease install Internet Explorer or Netscape as system default "
