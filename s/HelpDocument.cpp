@@ -7,18 +7,15 @@
 
 namespace {
 
-bool standsForItself(char character) {
-    const auto byte = static_cast<unsigned char>(character);
-    return byte > ' ' && byte < 0x7F && !std::strchr("\"%#?<>\\^`{|}", character);
-}
-
-CString encoded(const CString& path) {
+/// @param special  printable characters that do not stand for themselves
+CString encoded(const CString& part, const char* special) {
     CString text;
-    for (int i = 0; i < path.GetLength(); ++i) {
-        if (standsForItself(path[i])) {
-            text += path[i];
+    for (int i = 0; i < part.GetLength(); ++i) {
+        const auto byte = static_cast<unsigned char>(part[i]);
+        if (byte > ' ' && byte < 0x7F && !std::strchr(special, part[i])) {
+            text += part[i];
         } else {
-            text.AppendFormat("%%%02X", static_cast<unsigned char>(path[i]));
+            text.AppendFormat("%%%02X", byte);
         }
     }
     return text;
@@ -34,8 +31,9 @@ int anchorOf(const CString& document) {
 
 CString FileAddressOf(const CString& document) {
     const int anchor = anchorOf(document);
-    const CString path = encoded(document.Left(anchor));
-    return (path.Left(1) == "/" ? "file://" : "file:///") + path + document.Mid(anchor);
+    const CString path = encoded(document.Left(anchor), "\"%#?<>\\^`{|}");
+    // Anchors are written in maps as in addresses: a percent sign is one.
+    return (path.Left(1) == "/" ? "file://" : "file:///") + path + encoded(document.Mid(anchor), "\"<>");
 }
 
 CString ViewerArgumentOf(const CString& document) {

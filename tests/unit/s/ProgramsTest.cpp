@@ -1,7 +1,5 @@
 // Browsers, viewers, editors and tutorials: stand-ins write down how they were started.
-#include "Children.h"
-#include "NoProgramsTest.h"
-#include "TestApp.h"
+#include "RecordedProgramsTest.h"
 #include "platform/port/Version.h"
 #include "platform/win/Error.h"
 #include "s/BrowserChain.h"
@@ -26,48 +24,11 @@ namespace fs = std::filesystem;
 
 constexpr const char* page = "file:///opt/tarvex/doc/a%20b.html#%1";
 
-class ProgramsTest : public NoProgramsTest {
+class ProgramsTest : public RecordedProgramsTest {
 protected:
-    void SetUp() override {
-        NoProgramsTest::SetUp();
-        theApp.boxes.clear();
-        setenv("RECORD", record().c_str(), 1);
-        for (const char* name : {"PATH/browser", "PATH/system", "PATH/last", "my dir/browser"}) {
-            install(name);
-        }
-    }
     void TearDown() override {
         Port::Version::setReader(&Gui_InstallInfo::GetValue);
-        NoProgramsTest::TearDown();
-    }
-    /// A program that writes down its name, its arguments and where it runs.
-    void install(const fs::path& name) const {
-        fs::create_directories((m_folder / name).parent_path());
-        std::ofstream(m_folder / name) << "#!/bin/sh\n{ printf '%s|' \"${0##*/}\" \"$@\"; pwd; } >\"$RECORD.new\"; "
-                                          "/bin/mv \"$RECORD.new\" \"$RECORD\"\n";
-        fs::permissions(m_folder / name, fs::perms::owner_all);
-    }
-    [[nodiscard]] fs::path record() const {
-        return m_folder / "record";
-    }
-    /// What the started program has written down, without the folder unless it is not the current one.
-    [[nodiscard]] std::string started() const {
-        awaitReleased();
-        std::ifstream file(record());
-        std::string text((std::istreambuf_iterator<char>(file)), {});
-        fs::remove(record());
-        const std::string here = "|" + fs::current_path().string() + "\n";
-        return text.ends_with(here) ? text.substr(0, text.size() - here.size()) : text;
-    }
-    /// The texts of the message boxes since the last question, all of them plain.
-    static std::string boxes() {
-        std::string texts;
-        for (const TestApp::Box& box : theApp.boxes) {
-            EXPECT_EQ(box.type, UINT{MB_OK});
-            texts += "[" + box.text + "]";
-        }
-        theApp.boxes.clear();
-        return texts;
+        RecordedProgramsTest::TearDown();
     }
     /// With "@" for the page.
     static std::string shown(std::string words) {

@@ -1,0 +1,149 @@
+// Help requests as a user meets them: the choice among several topics, and what a request closes.
+#include "s/TopicIndexDlg.h"
+
+#include "s/BrowserHelp.h"
+#include "tests/ui/afx/TestApplication.h"
+#include "tests/ui/afx/dialogs/DialogTesting.h"
+#include "tests/unit/s/StoreTest.h"
+
+#include <QAbstractScrollArea>
+
+#include <fstream>
+#include <optional>
+
+namespace {
+
+namespace fs = std::filesystem;
+using Strings = Gui_TopicIndexDlg::Strings;
+
+/// Acts in the next modal dialog of the application, once that has the keyboard.
+void inDialog(std::function<void()> act) {
+    auto* timer = new QTimer(qApp);
+    QObject::connect(timer, &QTimer::timeout, timer, [timer, act = std::move(act)] {
+        const QWidget* dialog = QApplication::activeModalWidget();
+        const QWidget* focus = QApplication::focusWidget();
+        if (dialog && focus && focus->window() == dialog) {
+            timer->stop();
+            timer->deleteLater();
+            act();
+        }
+    });
+    timer->start(0);
+}
+
+/// The place of what the user chose, nothing when the dialog was cancelled.
+std::optional<int> choose(const Strings& files, const Strings& titles, std::function<void()> act) {
+    inDialog(std::move(act));
+    Gui_TopicIndexDlg dialog(files, titles, nullptr);
+    return dialog.DoModal() == IDOK ? std::optional(dialog.GetSelectedIndex()) : std::nullopt;
+}
+
+TEST(TopicIndexDlg, OffersSortedTitlesAndTellsThePlaceOfTheirFile) {
+    const Strings files{"z.htm", "a.htm", "m.htm"};
+    const Strings titles{"Zoom", "Axes", "Meshes", "A title without a file"};
+    EXPECT_EQ(choose(files, titles, [] { key(Qt::Key_Return); }), 1) << "the first line, \"Axes\"";
+    EXPECT_EQ(choose(files, titles,
+                     [] {
+                         key(Qt::Key_Down);
+                         key(Qt::Key_Down);
+                         key(Qt::Key_Down);
+                         key(Qt::Key_Return);
+                     }),
+              0)
+        << "the last line, \"Zoom\"";
+    EXPECT_EQ(choose(files, titles,
+                     [] {
+                         // The widget inside of the list's frame shows the lines.
+                         QWidget* lines = qobject_cast<QAbstractScrollArea*>(QApplication::focusWidget())->viewport();
+                         const QPoint second(20, lines->fontMetrics().height() * 3 / 2);
+                         QTest::mouseClick(lines, Qt::LeftButton, Qt::NoModifier, second);
+                         QTest::mouseDClick(lines, Qt::LeftButton, Qt::NoModifier, second);
+                     }),
+              2)
+        << "a double click on the second line";
+    EXPECT_EQ(choose(files, titles, [] { key(Qt::Key_Escape); }), std::nullopt);
+    EXPECT_EQ(choose(files, {}, [] { key(Qt::Key_Return); }), 0) << "nothing to choose from";
+}
+
+/// An installation whose help has two pages for one keyword.
+class HelpForUser : public StoreTest {
+protected:
+    void SetUp() override {
+        StoreTest::SetUp();
+        setenv("TARVEX", m_folder.c_str(), 1);
+        setenv("TVX_GUI_HELP_WEB_LOCATION", "https://web/", 1);
+        fs::create_directories(m_folder / "share/helpmap");
+        std::ofstream(m_folder / "share/helpmap/test.map")
+            << "[index Paste]\nfile = b.htm\ntitle = Pasting texts\nfile = a.htm\ntitle = Pasting shapes\n";
+        const fs::path browser = m_folder / "browser";
+        std::ofstream(browser) << "#!/bin/sh\necho \"$1\" >" << record().string() << ".new\nmv " << record().string()
+                               << ".new " << record().string() << "\n";
+        fs::permissions(browser, fs::perms::owner_all);
+        HKEY key = nullptr;
+        RegCreateKeyExA(HKEY_CURRENT_USER, "Software\\Tarvex\\Common", 0, nullptr, 0, KEY_WRITE, nullptr, &key,
+                        nullptr);
+        const std::string command = browser.string();
+        RegSetValueExA(key, "Browser", 0, REG_SZ, reinterpret_cast<const BYTE*>(command.c_str()),
+                       static_cast<DWORD>(command.size() + 1));
+        RegCloseKey(key);
+        ASSERT_EQ(m_help.SetHelpMapFileName("test.map"), 1);
+    }
+    void TearDown() override {
+        unsetenv("TARVEX");
+        unsetenv("TVX_GUI_HELP_WEB_LOCATION");
+        StoreTest::TearDown();
+    }
+    [[nodiscard]] fs::path record() const {
+        return m_folder / "record";
+    }
+    int help(const char* keyword) {
+        return m_help.BrowserHelp(reinterpret_cast<unsigned long>(keyword), HELP_KEY);
+    }
+    Gui_BrowserHelp m_help;
+};
+
+TEST_F(HelpForUser, SeveralTopicsAreOfferedAndTheChosenOneOpens) {
+    inDialog([] {
+        EXPECT_EQ(QApplication::activeModalWidget()->windowTitle(), "Topics Found");
+        key(Qt::Key_Down);
+        key(Qt::Key_Return);
+    });
+    EXPECT_EQ(help("Paste"), 1);
+    ASSERT_TRUE(QTest::qWaitFor([&] { return fs::exists(record()); }));
+    std::string address;
+    std::getline(std::ifstream(record()), address);
+    EXPECT_EQ(address, "https://web/b.htm") << "\"Pasting texts\" is the second title by its letters";
+    fs::remove(record());
+    inDialog([] { key(Qt::Key_Escape); });
+    EXPECT_EQ(help("Paste"), 1) << "the user wants none";
+    EXPECT_FALSE(fs::exists(record()));
+}
+
+TEST_F(HelpForUser, ARequestClosesMenusAndEndsHelpModeAndCapture) {
+    auto* frame = new CFrameWnd;
+    ASSERT_TRUE(frame->Create(nullptr, "Frame"));
+    CWnd child;
+    child.Create(nullptr, "", WS_CHILD | WS_VISIBLE, CRect(0, 0, 50, 50), frame, 1);
+    testApplication.m_pMainWnd = frame;
+    frame->ShowWindow(SW_SHOW);
+    frame->SendMessage(WM_COMMAND, ID_CONTEXT_HELP);
+    child.SetCapture();
+    CMenu menu;
+    menu.CreatePopupMenu();
+    menu.AppendMenu(MF_STRING, 100, "Item");
+    BoxAnswer answer;
+    QTimer::singleShot(0, [&] {
+        ASSERT_NE(QApplication::activePopupWidget(), nullptr);
+        EXPECT_EQ(m_help.OnCommand(1), 1);
+        EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+    });
+    menu.TrackPopupMenu(TPM_LEFTALIGN, 20, 20, frame);
+    EXPECT_EQ(answer.text, "Help not found for topic Help Context ID:  0x10001");
+    EXPECT_EQ(::GetCapture(), nullptr);
+    EXPECT_FALSE(frame->m_bHelpMode);
+    EXPECT_FALSE(testApplication.m_bHelpMode);
+    testApplication.m_pMainWnd = nullptr;
+    frame->DestroyWindow();
+}
+
+} // namespace
