@@ -141,6 +141,9 @@ Gui_HelpMap::Gui_HelpMap() : m_data(MakeRecord<Gui_HelpMapData>()) {}
 
 Gui_HelpMap::~Gui_HelpMap() = default;
 
+// Hosts know these operations with texts by value.
+// NOLINTBEGIN(performance-unnecessary-value-param)
+
 bool Gui_HelpMap::Read(String fileName) {
     InstalledMaps maps;
     if (!m_data->text.add(fileName.str(), maps)) {
@@ -236,3 +239,5 @@ Gui_HelpMap::String Gui_HelpMap::GetWebUrl(String name) const {
 String GetMapFileForPackage(String package) {
     return mapFile("helpmap/%s.map", package);
 }
+
+// NOLINTEND(performance-unnecessary-value-param)

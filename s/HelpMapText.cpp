@@ -145,13 +145,14 @@ private:
         std::string normalized;
         const char* at;
         std::optional<std::size_t> section;
+        const char* bodyStart = nullptr;
     };
     enum class Stop { AtEnd, AtInclude };
 
     bool open(const std::string& name);
     Stop readOn(Reading& reading);
-    void begin(Reading& reading, std::string_view header);
-    void end(Reading& reading, const char* bodyEnd);
+    void beginSection(Reading& reading, std::string_view header);
+    void endSection(Reading& reading, const char* bodyEnd);
     bool include(const HelpMapFile& file, std::string_view line);
     bool includeFound(const HelpMapFile& file, std::string_view line, const std::string& found);
 
@@ -172,7 +173,7 @@ bool HelpMapText::Reader::open(const std::string& name) {
     const HelpMapFile& file = m_map.m_files.emplace_back(HelpMapFile{name, *std::move(text)});
     std::string normalized = m_source.normalized(name);
     m_map.m_read.insert(normalized);
-    m_chain.push_back({&file, std::move(normalized), file.text.data(), {}});
+    m_chain.push_back({&file, std::move(normalized), file.text.data(), std::nullopt});
     return true;
 }
 
@@ -187,18 +188,18 @@ HelpMapText::Reader::Stop HelpMapText::Reader::readOn(Reading& reading) {
             ++start;
         }
         if (start < stop && *start == '[') {
-            this->end(reading, start);
-            begin(reading, between(start, stop));
+            endSection(reading, start);
+            beginSection(reading, between(start, stop));
         } else if (start < stop && *start == '#' && include(*reading.file, trimmed(between(start, stop)))) {
             return Stop::AtInclude;
         }
     }
-    this->end(reading, end);
+    endSection(reading, end);
     return Stop::AtEnd;
 }
 
 /// Begins a section, unless there is one of its key. The lines of one whose key is empty count for nothing.
-void HelpMapText::Reader::begin(Reading& reading, std::string_view header) {
+void HelpMapText::Reader::beginSection(Reading& reading, std::string_view header) {
     const std::string_view key = m_map.keyOf(header);
     if (!m_map.begin(key)) {
         m_source.remark(HelpMapRemark::DuplicateSection, *reading.file, trimmed(header), key);
@@ -207,14 +208,14 @@ void HelpMapText::Reader::begin(Reading& reading, std::string_view header) {
     m_map.m_sections.back().body = between(reading.at, reading.at);
     if (!key.empty()) {
         reading.section = m_map.m_sections.size() - 1;
+        reading.bodyStart = reading.at;
     }
 }
 
 /// Ends the section that is being read, if there is one.
-void HelpMapText::Reader::end(Reading& reading, const char* bodyEnd) {
+void HelpMapText::Reader::endSection(Reading& reading, const char* bodyEnd) {
     if (reading.section) {
-        std::string_view& body = m_map.m_sections[*reading.section].body;
-        body = between(body.data(), bodyEnd);
+        m_map.m_sections[*reading.section].body = between(reading.bodyStart, bodyEnd);
         reading.section.reset();
     }
 }

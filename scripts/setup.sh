@@ -35,7 +35,7 @@ test     wmctrl           asks the window manager in desktop tests
 test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
 bench    libbenchmark-dev the benchmark programs' framework
-bench    libglib2.0-dev   a peer of the wildcards
+bench    libglib2.0-dev   a peer of wildcards and help maps
 check    git              lists the files to check
 check    python3          the include, documentation and wording checks
 check    clang-format-19  the format check; other versions format differently

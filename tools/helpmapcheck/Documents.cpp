@@ -46,7 +46,9 @@ void Documents::addMissing(const std::string& document, std::vector<Fault>& faul
         }
         // Without the American one, users of other languages than those that have it get none.
         const bool isFallback = language == "usenglish";
-        faults.push_back({isFallback ? "missing" : "untranslated", document + " is not in " + language});
+        std::string text = document;
+        text.append(" is not in ").append(language);
+        faults.push_back({isFallback ? "missing" : "untranslated", std::move(text)});
     }
 }
 

@@ -57,7 +57,8 @@ std::string Installation::findDocument(const std::string& language, const std::s
 
 std::string Installation::find(const std::string& relativeName) const {
     for (const std::string& root : m_roots) {
-        std::string name = root + "/" + relativeName;
+        std::string name = root;
+        name.append("/").append(relativeName);
         if (Port::File::exist(name.c_str())) {
             return name;
         }

@@ -45,9 +45,9 @@ public:
         m_remarks.emplace(line.data(), Remark{kind, std::string(about)});
     }
 
-    /// What was said about the line at that place, if anything was.
-    [[nodiscard]] const Remark* remarkAt(const char* line) const {
-        const auto found = m_remarks.find(line);
+    /// What was said about the line that stands where this one does, if anything was.
+    [[nodiscard]] const Remark* remarkAt(std::string_view line) const {
+        const auto found = m_remarks.find(line.begin());
         return found == m_remarks.end() ? nullptr : &found->second;
     }
 
@@ -158,7 +158,7 @@ private:
             endSection();
             m_isIgnored = false;
         }
-        if (const Remark* remark = m_source.remarkAt(line.text.data()); remark && !line.text.empty()) {
+        if (const Remark* remark = m_source.remarkAt(line.text); remark && !line.text.empty()) {
             reportRemark(line, *remark);
         }
         if (line.text.starts_with('[')) {
