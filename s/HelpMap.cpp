@@ -75,18 +75,6 @@ public:
     }
 };
 
-/// A key: the first part and the words, joined with single blanks.
-String keyOf(const String& first, const String& words) {
-    String key = first;
-    String::Range word;
-    while (words.NextTokenRange(word, blanks)) {
-        key += " ";
-        key += words.Extract(word);
-    }
-    key.Trim(blanks);
-    return key;
-}
-
 String firstWord(const String& text) {
     String::Range word;
     return text.NextTokenRange(word, blanks) ? text.Extract(word) : String();
@@ -159,7 +147,7 @@ bool Gui_HelpMap::IsLoaded(String name) const {
 }
 
 Gui_HelpMap::Position Gui_HelpMap::Find(String first, String words) const {
-    const std::optional<std::size_t> found = m_data->text.find(keyOf(first, words).str());
+    const std::optional<std::size_t> found = m_data->text.find(HelpMapKey(first.str(), words.str()));
     return found ? Position{*found} : End();
 }
 

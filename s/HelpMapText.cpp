@@ -81,6 +81,16 @@ bool HelpMapLines::next(std::string_view& line) {
     return true;
 }
 
+std::string HelpMapKey(std::string_view first, std::string_view words) {
+    std::string key(first.substr(std::min(first.find_first_not_of(blanks), first.size())));
+    for (std::string_view word = takeWord(words, blanks); !word.empty(); word = takeWord(words, blanks)) {
+        // Blanks that end the first part stand before the words, if there are any.
+        key.append(key.empty() ? "" : " ").append(word);
+    }
+    key.erase(key.find_last_not_of(blanks) + 1);
+    return key;
+}
+
 HelpMapEntry ReadHelpMapEntry(std::string_view line) {
     const std::size_t equals = line.find('=');
     if (equals == std::string_view::npos || equals == 0 || equals == line.size() - 1) {

@@ -86,6 +86,10 @@ private:
     std::string_view m_rest;
 };
 
+/// The key that is looked up for a first part and words: they are joined with single blanks, the first part is taken as
+/// it is. No blanks or tabs are at its ends.
+[[nodiscard]] std::string HelpMapKey(std::string_view first, std::string_view words);
+
 /// Takes a trimmed line of a section apart. One that means nothing has no keyword.
 [[nodiscard]] HelpMapEntry ReadHelpMapEntry(std::string_view line);
 
