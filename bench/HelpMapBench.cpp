@@ -170,7 +170,7 @@ BENCHMARK(readWithGlib)->Unit(benchmark::kMillisecond);
 /// It keeps what it has read for the next object of the same file, so each gets a file of its own.
 void readWithTheToolkit(benchmark::State& state) {
     const std::string name = installation().mapName();
-    int i = 0;
+    static int i = 0;
     for (auto _ : state) {
         state.PauseTiming();
         const std::string copy = name + std::to_string(i++);

@@ -13,21 +13,36 @@
 #include "s/WebHosts.h"
 
 #include <initializer_list>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <utility>
 
-/// What a help map keeps for itself.
+using String = Port::StringBase<char>;
+using Strings = Gui_HelpMap::Strings;
+using Position = Gui_HelpMap::Position;
+
+/// What a help map keeps for itself, and what it does; the map turns an exhausted heap into the framework's exception.
 struct Gui_HelpMapData {
+    /// A key as it is asked for: the first part and the words behind it.
+    using Key = std::pair<const char*, String>;
+
+    bool read(const std::string& name);
+    [[nodiscard]] Position find(std::string_view first, std::string_view words) const;
+    [[nodiscard]] Gui_HelpMapRecord recordAt(Position position) const;
+    void resolve(Position position, Strings& files, Strings& titles, String& type) const;
+    /// Resolves the first of these keys that has a record; without any the outputs are empty.
+    void lookUp(std::initializer_list<Key> keys, Strings& files, Strings& titles, String& type) const;
+    [[nodiscard]] String locate(const String& name) const;
+    [[nodiscard]] String webUrl(const String& name) const;
+
     HelpMapText text;
     std::string fileName;  ///< of the last map read, as it was given
     std::string directory; ///< of that file, with its last "/"
 };
 
 namespace {
-
-using String = Port::StringBase<char>;
 
 constexpr const char* blanks = " \t";
 constexpr const char* notFound = "topic_not_found";
@@ -62,10 +77,9 @@ public:
             origin(__LINE__).issueError("Cannot read file %s . Please check the installation\n", name.c_str());
             return std::nullopt;
         }
-        Port::Stream* const stream = Port::File::open(name.c_str(), Port::File::AccessRead, Port::File::FlagText);
-        std::optional<std::string> text = stream ? std::optional(stream->readall()) : std::nullopt;
-        Port::File::close(stream);
-        return text;
+        const std::unique_ptr<Port::Stream, Port::File::Closer> stream(
+            Port::File::open(name.c_str(), Port::File::AccessRead, Port::File::FlagText));
+        return stream ? std::optional(stream->readall()) : std::nullopt;
     }
     void remark(HelpMapRemark remark, const HelpMapFile&, std::string_view line, std::string_view) override {
         if (remark == HelpMapRemark::IncludeWithoutSpace) {
@@ -78,22 +92,6 @@ public:
 String firstWord(const String& text) {
     String::Range word;
     return text.NextTokenRange(word, blanks) ? text.Extract(word) : String();
-}
-
-/// The first of these keys that has a record.
-Gui_HelpMap::Position firstOf(const Gui_HelpMap& map, std::initializer_list<std::pair<String, String>> keys) {
-    for (const auto& [first, words] : keys) {
-        if (const Gui_HelpMap::Position position = map.Find(first, words); position != Gui_HelpMap::End()) {
-            return position;
-        }
-    }
-    return Gui_HelpMap::End();
-}
-
-void clear(Gui_HelpMap::Strings& files, Gui_HelpMap::Strings& titles, String& type) {
-    files.clear();
-    titles.clear();
-    type = String();
 }
 
 bool isType(const String& type, const char* name) {
@@ -125,78 +123,53 @@ String installedDocument(const char* language, const String& name) {
 
 } // namespace
 
-Gui_HelpMap::Gui_HelpMap() : m_data(MakeRecord<Gui_HelpMapData>()) {}
-
-Gui_HelpMap::~Gui_HelpMap() = default;
-
-// Hosts know these operations with texts by value.
-// NOLINTBEGIN(performance-unnecessary-value-param)
-
-bool Gui_HelpMap::Read(String fileName) {
+bool Gui_HelpMapData::read(const std::string& name) {
     InstalledMaps maps;
-    if (!m_data->text.add(fileName.str(), maps)) {
+    if (!text.add(name, maps)) {
         return false;
     }
-    m_data->fileName = fileName.str();
-    m_data->directory = m_data->fileName.substr(0, m_data->fileName.rfind('/') + 1);
+    directory = name.substr(0, name.rfind('/') + 1);
+    fileName = name;
     return true;
 }
 
-bool Gui_HelpMap::IsLoaded(String name) const {
-    return m_data->fileName == name.str();
+Position Gui_HelpMapData::find(std::string_view first, std::string_view words) const {
+    const std::optional<std::size_t> found = text.find(HelpMapKey(first, words));
+    return found ? Position{*found} : Gui_HelpMap::End();
 }
 
-Gui_HelpMap::Position Gui_HelpMap::Find(String first, String words) const {
-    const std::optional<std::size_t> found = m_data->text.find(HelpMapKey(first.str(), words.str()));
-    return found ? Position{*found} : End();
+Gui_HelpMapRecord Gui_HelpMapData::recordAt(Position position) const {
+    return ReadHelpMapRecord(text.sections()[static_cast<std::size_t>(position)]);
 }
 
-void Gui_HelpMap::Resolve(Position position, Strings& files, Strings& titles, String& type) const {
-    if (position == End()) {
-        return;
-    }
-    const Gui_HelpMapRecord record = ReadHelpMapRecord(m_data->text.sections()[static_cast<std::size_t>(position)]);
-    clear(files, titles, type);
+void Gui_HelpMapData::resolve(Position position, Strings& files, Strings& titles, String& type) const {
+    const Gui_HelpMapRecord record = recordAt(position);
     type = record.type;
     const bool isUrl = isType(type, "url");
+    files.clear();
     for (const std::string_view name : record.files) {
-        files.push_back(isUrl ? String(name) : LocateDocument(name));
+        files.push_back(isUrl ? String(name) : locate(name));
         if (files.back().IsEmpty()) {
-            files.back() = GetWebUrl(name);
+            files.back() = webUrl(name);
             type = "url";
         }
     }
     titles.assign(record.titles.begin(), record.titles.end());
 }
 
-void Gui_HelpMap::LookupKey(String key, Strings& files, Strings& titles, String& type) const {
-    clear(files, titles, type);
-    Resolve(firstOf(*this, {{"", key}, {firstWord(key), notFound}, {"", notFound}}), files, titles, type);
-}
-
-void Gui_HelpMap::LookupIndex(String keyword, Strings& files, Strings& titles, String& type) const {
-    clear(files, titles, type);
-    Resolve(firstOf(*this, {{"index", keyword}, {"", keyword}, {"index", notFound}, {"", notFound}}), files, titles,
-            type);
-}
-
-Gui_HelpMap::String Gui_HelpMap::LookupContext(unsigned int contextId, String& type) const {
-    String number = "contents";
-    if (contextId != 0) {
-        number.Format("%u", contextId);
+void Gui_HelpMapData::lookUp(std::initializer_list<Key> keys, Strings& files, Strings& titles, String& type) const {
+    for (const auto& [first, words] : keys) {
+        if (const Position position = find(first, words.str()); position != Gui_HelpMap::End()) {
+            resolve(position, files, titles, type);
+            return;
+        }
     }
-    Strings files;
-    Strings titles;
+    files.clear();
+    titles.clear();
     type = String();
-    Resolve(firstOf(*this, {{"topic", number}, {"topic", notFound}, {"", notFound}}), files, titles, type);
-    return files.empty() ? String() : files.front();
 }
 
-Gui_HelpMap::String Gui_HelpMap::GetContents(String& type) const {
-    return LookupContext(0, type);
-}
-
-Gui_HelpMap::String Gui_HelpMap::LocateDocument(String name) const {
+String Gui_HelpMapData::locate(const String& name) const {
     if (Gui_HelpPreference().IsAlwaysGoToWeb()) {
         return {};
     }
@@ -207,25 +180,87 @@ Gui_HelpMap::String Gui_HelpMap::LocateDocument(String name) const {
     if (path.IsEmpty()) {
         path = installedDocument("usenglish", document);
     }
-    if (path.IsEmpty() && Port::File::canread((m_data->directory + document.str()).c_str())) {
-        path = spelled(m_data->directory + document.str());
+    if (path.IsEmpty() && Port::File::canread((directory + document.str()).c_str())) {
+        path = spelled(directory + document.str());
     }
     return path.IsEmpty() ? path : path + anchor;
 }
 
-Gui_HelpMap::String Gui_HelpMap::GetWebUrl(String name) const {
+String Gui_HelpMapData::webUrl(const String& name) const {
     String prefix = Gui_HelpPreference().GetUrlPrefix();
-    const Position position = Find("prefix helpurl", "");
-    if (prefix.IsEmpty() && position != End()) {
+    const Position position = find("prefix helpurl", "");
+    if (prefix.IsEmpty() && position != Gui_HelpMap::End()) {
         // As it stands: to locate it, as other documents are, would ask for the web location again.
-        const Gui_HelpMapRecord record = ReadHelpMapRecord(m_data->text.sections()[static_cast<std::size_t>(position)]);
+        const Gui_HelpMapRecord record = recordAt(position);
         prefix = record.files.empty() ? String() : String(record.files.front());
     }
     return (prefix.IsEmpty() ? DocumentationLocation() : prefix) + name;
 }
 
+Gui_HelpMap::Gui_HelpMap() : m_data(MakeRecord<Gui_HelpMapData>()) {}
+
+Gui_HelpMap::~Gui_HelpMap() = default;
+
+// Hosts know these operations with texts by value.
+// NOLINTBEGIN(performance-unnecessary-value-param)
+
+bool Gui_HelpMap::Read(String fileName) {
+    return tvx::allocating([&] { return m_data->read(fileName.str()); });
+}
+
+bool Gui_HelpMap::IsLoaded(String name) const {
+    return m_data->fileName == name.str();
+}
+
+Position Gui_HelpMap::Find(String first, String words) const {
+    return tvx::allocating([&] { return m_data->find(first.str(), words.str()); });
+}
+
+void Gui_HelpMap::Resolve(Position position, Strings& files, Strings& titles, String& type) const {
+    if (position != End()) {
+        tvx::allocating([&] { m_data->resolve(position, files, titles, type); });
+    }
+}
+
+void Gui_HelpMap::LookupKey(String key, Strings& files, Strings& titles, String& type) const {
+    tvx::allocating([&] {
+        m_data->lookUp({{"", key}, {"", firstWord(key) + " " + notFound}, {"", notFound}}, files, titles, type);
+    });
+}
+
+void Gui_HelpMap::LookupIndex(String keyword, Strings& files, Strings& titles, String& type) const {
+    tvx::allocating([&] {
+        m_data->lookUp({{"index", keyword}, {"", keyword}, {"index", notFound}, {"", notFound}}, files, titles, type);
+    });
+}
+
+String Gui_HelpMap::LookupContext(unsigned int contextId, String& type) const {
+    return tvx::allocating([&] {
+        String number = "contents";
+        if (contextId != 0) {
+            number.Format("%u", contextId);
+        }
+        Strings files;
+        Strings titles;
+        m_data->lookUp({{"topic", number}, {"topic", notFound}, {"", notFound}}, files, titles, type);
+        return files.empty() ? String() : files.front();
+    });
+}
+
+String Gui_HelpMap::GetContents(String& type) const {
+    return LookupContext(0, type);
+}
+
+String Gui_HelpMap::LocateDocument(String name) const {
+    return tvx::allocating([&] { return m_data->locate(name); });
+}
+
+String Gui_HelpMap::GetWebUrl(String name) const {
+    return tvx::allocating([&] { return m_data->webUrl(name); });
+}
+
 String GetMapFileForPackage(String package) {
-    return mapFile("helpmap/%s.map", package);
+    return tvx::allocating([&] { return mapFile("helpmap/%s.map", package); });
 }
 
 // NOLINTEND(performance-unnecessary-value-param)

@@ -1,5 +1,6 @@
 #include "s/HelpPreference.h"
 
+#include "afx.h"
 #include "platform/port/Env.h"
 #include "s/SettingsKey.h"
 #include "s/String.h"
@@ -35,8 +36,8 @@ bool Gui_HelpPreference::IsAlwaysGoToWeb() {
 }
 
 Port::StringBase<char> Gui_HelpPreference::GetUrlPrefix() {
-    if (const char* const location = Port_Env::GetEnv("TVX_GUI_HELP_WEB_LOCATION")) {
-        return location;
-    }
-    return commonSetting("HelpUrlPrefix").GetString();
+    return tvx::allocating([] {
+        const char* const location = Port_Env::GetEnv("TVX_GUI_HELP_WEB_LOCATION");
+        return Port::StringBase<char>(location ? location : commonSetting("HelpUrlPrefix").GetString());
+    });
 }

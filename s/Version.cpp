@@ -90,15 +90,9 @@ std::optional<std::pair<std::string, Entry>> parse(std::string_view line) {
 
 // --- the file ---
 
-struct CloseFile {
-    void operator()(Port::Stream* file) const {
-        Port::File::close(file);
-    }
-};
-
 /// The file, opened, and when it was last changed.
 struct OpenedFile {
-    std::unique_ptr<Port::Stream, CloseFile> stream;
+    std::unique_ptr<Port::Stream, Port::File::Closer> stream;
     std::optional<std::int64_t> changed;
 };
 

@@ -3,6 +3,7 @@
 #include "platform/base/Text.h"
 
 #include <algorithm>
+#include <climits>
 #include <dirent.h>
 #include <filesystem>
 #include <memory>
@@ -116,8 +117,12 @@ std::size_t existingLength(const std::string& path) {
     return length;
 }
 
-/// Corrects the spelling of the parts of a path that exist in another one.
+/// Corrects the spelling of the parts of a path that exist in another one. No file has a name too long for the system,
+/// and to look for its parts could take for ever.
 std::string corrected(const std::string& path, PathUse use) {
+    if (path.size() >= PATH_MAX) {
+        return path;
+    }
     std::size_t at = existingLength(path);
     std::string result = path.substr(0, at);
     while (at < path.size()) {

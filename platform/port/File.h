@@ -38,6 +38,13 @@ public:
     /// Closes and frees a stream from open; null is ignored.
     static void close(Stream* stream);
 
+    /// Closes the stream of a `std::unique_ptr<Port::Stream, Port::File::Closer>`.
+    struct Closer {
+        void operator()(Stream* stream) const {
+            close(stream);
+        }
+    };
+
     /// Whether there is a file of that name: no folder. Null names none.
     [[nodiscard]] static bool exist(const char* path);
     /// Whether there is such a file and this process may read it.

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <memory>
 #include <system_error>
 #include <utility>
 
@@ -67,10 +68,9 @@ std::string Installation::find(const std::string& relativeName) const {
 }
 
 std::optional<std::string> readFile(const std::string& name) {
-    Port::Stream* const stream = Port::File::open(name.c_str(), Port::File::AccessRead, Port::File::FlagText);
-    std::optional<std::string> text = stream ? std::optional(stream->readall()) : std::nullopt;
-    Port::File::close(stream);
-    return text;
+    const std::unique_ptr<Port::Stream, Port::File::Closer> stream(
+        Port::File::open(name.c_str(), Port::File::AccessRead, Port::File::FlagText));
+    return stream ? std::optional(stream->readall()) : std::nullopt;
 }
 
 } // namespace helpmap

@@ -4,6 +4,7 @@
 #include "res/resource.h"
 #include "s/CommandLineState.h"
 #include "s/FileName.h"
+#include "s/HelpMap.h"
 #include "s/MessageManager.h"
 #include "s/String.h"
 
@@ -133,4 +134,30 @@ TEST(Heap, AnExhaustedOneRaisesTheFrameworksExceptionFromFileNames) {
         EXPECT_GT(failuresOf([name] { (void)name->IsExecutable(); }), 0);
     }
     ::unsetenv("TVX_DRIVES");
+}
+
+TEST(Heap, AnExhaustedOneRaisesTheFrameworksExceptionFromHelpMaps) {
+    namespace fs = std::filesystem;
+    const std::string root = fs::temp_directory_path() / "an installation with a long name";
+    fs::create_directories(root + "/share/helpmap");
+    fs::current_path(root + "/share/helpmap");
+    std::ofstream("a.map") << "[topic  1]\nfile = a document with a long name.htm\n# b\ntitle = Title\n[topic 2]\n";
+    std::ofstream("b.map") << "[topic 3]\ntitle = no document";
+    ::setenv("TARVEX", root.c_str(), 1);
+    EXPECT_GT(failuresOf([] { EXPECT_FALSE(GetMapFileForPackage("a").IsEmpty()); }), 0);
+    EXPECT_GT(failuresOf([] {
+                  Gui_HelpMap read;
+                  EXPECT_TRUE(read.Read("a.map"));
+              }),
+              0);
+    Gui_HelpMap map;
+    EXPECT_TRUE(map.Read("a.map"));
+    EXPECT_GT(failuresOf([&] {
+                  Port::StringBase<char> type;
+                  EXPECT_FALSE(map.LookupContext(1, type).IsEmpty());
+              }),
+              0);
+    ::unsetenv("TARVEX");
+    fs::current_path("/");
+    fs::remove_all(root);
 }

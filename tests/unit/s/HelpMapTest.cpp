@@ -234,6 +234,15 @@ TEST_F(HelpMap, SaysWhatIsWrongWithFilesAndIncludes) {
     EXPECT_EQ(m_messages.messages[1].type, Port_MsgMan::MsgTypeInternal);
 }
 
+TEST_F(HelpMap, PassesOverNamesThatNoFileCanHave) {
+    std::string name;
+    for (int i = 0; i < 1000000; ++i) {
+        name += "a/";
+    }
+    ASSERT_TRUE(read("# " + name + "\n[k]\nfile=" + name + "\n"));
+    EXPECT_EQ(key("k").files, Texts{"https://web/" + name});
+}
+
 TEST_F(HelpMap, LocatesDocuments) {
     const std::string guide = make(m_root + "/doc/usenglish/guide.htm");
     const std::string beside = make(m_root + "/share/helpmap/beside.htm");
