@@ -1,4 +1,4 @@
-// A help map of 100,000 sections (10.9 MB) beside the same text read as an INI file by the toolkit and by GLib, and
+// A help map of 100,000 sections (12.4 MB) beside the same text read as an INI file by the toolkit and by GLib, and
 // beside the least that any reader must do: look for the lines of the mapped file and index its headers.
 #include "s/HelpMap.h"
 
