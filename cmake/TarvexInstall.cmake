@@ -10,10 +10,11 @@ install(TARGETS ${exported_targets} EXPORT TarvexTargets
   RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}"
   LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}"
   ARCHIVE DESTINATION "${CMAKE_INSTALL_LIBDIR}")
-install(TARGETS tvxsettings helpmapcheck RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}")
+install(TARGETS tvxsettings tvxopen helpmapcheck RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}")
 # Builds all of that, for builds that make less than everything.
-add_custom_target(installed DEPENDS ${exported_targets} tvxsettings helpmapcheck)
-install(FILES tools/settings/tvxsettings.1 tools/helpmapcheck/helpmapcheck.1 DESTINATION "${CMAKE_INSTALL_MANDIR}/man1")
+add_custom_target(installed DEPENDS ${exported_targets} tvxsettings tvxopen helpmapcheck)
+install(FILES tools/settings/tvxsettings.1 tools/open/tvxopen.1 tools/helpmapcheck/helpmapcheck.1
+  DESTINATION "${CMAKE_INSTALL_MANDIR}/man1")
 
 # Headers keep their paths: sources name them "s/WinApp.h", "platform/win/Registry.h", or by the umbrella headers' names.
 install(DIRECTORY s DESTINATION "${header_dir}" FILES_MATCHING PATTERN "*.h")

@@ -14,11 +14,12 @@ build    g++              C++20 compiler
 build    cmake            configures the build from CMakePresets.json
 build    ninja-build      runs the build
 build    ccache           keeps compiled objects between builds
-build    pkg-config       finds SQLite and xcb-ewmh
+build    pkg-config       finds SQLite, xcb-ewmh and GLib
 build    qt6-base-dev     real windows, text input and drawing behind the layer
 build    libsqlite3-dev   the settings store
 build    libxcb1-dev      talks to the window manager
 build    libxcb-ewmh-dev  raises windows of other processes
+build    libglib2.0-dev   the desktop's own reader of mimeapps.list
 build    llvm             llvm-rc compiles resource scripts
 wayland  qt6-wayland      the toolkit's plug-in for Wayland sessions
 display  xvfb             a display where there is none

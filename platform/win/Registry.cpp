@@ -3,6 +3,7 @@
 #include "platform/base/Text.h"
 #include "platform/win/detail/RegistryNotices.h"
 #include "platform/win/detail/RegistryStore.h"
+#include "platform/win/detail/SettingsSource.h"
 
 #include <algorithm>
 #include <cstring>
@@ -17,12 +18,19 @@ using namespace tvx::registry;
 namespace {
 
 struct OpenKey {
-    Hive hive = Hive::User;
+    const Chain* chain = nullptr;
+    std::size_t found = 0; ///< the first source that has the key
     KeyPath path;
     REGSAM access = KEY_ALL_ACCESS;
-    bool isClass = false; ///< looked up in the machine's settings where the user has none
-    Cursor keyCursor;     ///< guarded by the store's mutex, as is the next
+    Cursor keyCursor; ///< guarded by the store's mutex, as is the next
     Cursor valueCursor;
+
+    [[nodiscard]] Source& source() const {
+        return *chain->sources[found];
+    }
+    [[nodiscard]] bool asksToWrite() const {
+        return (access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY)) != 0;
+    }
 };
 using OpenKeyPointer = std::shared_ptr<OpenKey>;
 
@@ -62,10 +70,13 @@ public:
 
 private:
     HandleTable() {
-        m_keys[HKEY_CLASSES_ROOT] =
-            std::make_shared<OpenKey>(OpenKey{Hive::User, pathOf("Software\\Classes"), KEY_ALL_ACCESS, true, {}, {}});
-        m_keys[HKEY_CURRENT_USER] = std::make_shared<OpenKey>();
-        m_keys[HKEY_LOCAL_MACHINE] = std::make_shared<OpenKey>(OpenKey{Hive::Machine, {}, KEY_READ, false, {}, {}});
+        add(HKEY_CLASSES_ROOT, classesChain(), pathOf("Software\\Classes"), KEY_ALL_ACCESS);
+        add(HKEY_CURRENT_USER, userChain(), {}, KEY_ALL_ACCESS);
+        add(HKEY_LOCAL_MACHINE, machineChain(), {}, KEY_READ);
+    }
+
+    void add(HKEY root, const Chain& chain, KeyPath path, REGSAM access) {
+        m_keys[root] = std::make_shared<OpenKey>(OpenKey{&chain, 0, std::move(path), access, {}, {}});
     }
 
     std::mutex m_mutex;
@@ -73,32 +84,30 @@ private:
     std::uintptr_t m_last = 0x100;
 };
 
-/// Does something with the locked store of a hive, and then tells the user what there is to tell.
-template <typename Operation>
-LSTATUS withStore(Hive hive, Operation operation) {
-    Store& store = Store::of(hive);
-    std::vector<std::string> notices;
-    DWORD result = ERROR_SUCCESS;
-    {
-        const std::lock_guard lock(store.mutex);
-        result = operation(store);
-        notices = store.takeNotices();
-    }
-    deliver(notices);
-    return static_cast<LSTATUS>(result);
-}
-
-/// Does something with an open key that must have been opened with `rights`.
-template <typename Operation>
-LSTATUS withKey(HKEY handle, REGSAM rights, Operation operation) {
-    const OpenKeyPointer key = HandleTable::instance().find(handle);
+/// The open key that a call is about, which must have been opened with `rights`.
+/// @return why it cannot be used, or `ERROR_SUCCESS`
+LSTATUS openKey(HKEY handle, REGSAM rights, OpenKeyPointer& key) {
+    key = HandleTable::instance().find(handle);
     if (!key) {
         return ERROR_INVALID_HANDLE;
     }
-    if ((key->access & rights) != rights) {
-        return ERROR_ACCESS_DENIED;
-    }
-    return withStore(key->hive, [&](Store& store) { return operation(store, *key); });
+    return (key->access & rights) == rights ? ERROR_SUCCESS : ERROR_ACCESS_DENIED;
+}
+
+/// Reads something of an open key.
+template <typename Operation>
+LSTATUS reading(HKEY handle, REGSAM rights, Operation operation) {
+    OpenKeyPointer key;
+    const LSTATUS usable = openKey(handle, rights, key);
+    return usable == ERROR_SUCCESS ? static_cast<LSTATUS>(operation(*key)) : usable;
+}
+
+/// Changes something of an open key.
+template <typename Operation>
+LSTATUS writing(HKEY handle, REGSAM rights, Operation operation) {
+    return reading(handle, rights, [&](OpenKey& key) {
+        return withStore(key.chain->written, [&](Store& store) { return operation(store, key); });
+    });
 }
 
 std::string_view textOf(LPCSTR text) {
@@ -111,20 +120,40 @@ DWORD below(HKEY handle, LPCSTR subKey, REGSAM access, OpenKey& result) {
     if (!key) {
         return ERROR_INVALID_HANDLE;
     }
-    result = {key->hive, key->path, access, key->isClass, {}, {}};
+    result = {key->chain, 0, key->path, access, {}, {}};
     return append(result.path, textOf(subKey));
 }
 
-LSTATUS findKey(OpenKey& key) {
-    LSTATUS result = withStore(key.hive, [&](Store& store) { return store.findKey(key.path); });
-    if (result == ERROR_FILE_NOT_FOUND && key.isClass && key.hive == Hive::User) {
-        result = withStore(Hive::Machine, [&](Store& store) { return store.findKey(key.path); });
-        if (result == ERROR_SUCCESS) {
-            key.hive = Hive::Machine;
+/// Finds the first source that has the key.
+DWORD findKey(OpenKey& key) {
+    DWORD result = ERROR_FILE_NOT_FOUND;
+    for (key.found = 0; key.found < key.chain->sources.size(); ++key.found) {
+        result = key.source().findKey(key.path);
+        if (result != ERROR_FILE_NOT_FOUND) {
+            return result;
         }
     }
-    const bool asksToWrite = (key.access & (KEY_SET_VALUE | KEY_CREATE_SUB_KEY)) != 0;
-    return result == ERROR_SUCCESS && key.hive == Hive::Machine && asksToWrite ? ERROR_ACCESS_DENIED : result;
+    key.found = 0;
+    return result;
+}
+
+/// Whether a key that was found can be written where it is.
+bool isWritable(const OpenKey& key) {
+    return key.found == 0 && key.chain->written == Hive::User;
+}
+
+/// Asks each source from the key's first on: one that has the key need not have the value.
+DWORD readValue(const OpenKey& key, std::string_view name, std::shared_ptr<const Value>& value) {
+    const DWORD first = key.source().readValue(key.path, name, value);
+    DWORD result = first;
+    const bool isMissing = first == ERROR_FILE_NOT_FOUND;
+    for (std::size_t next = key.found + 1; isMissing && next < key.chain->sources.size(); ++next) {
+        result = key.chain->sources[next]->readValue(key.path, name, value);
+        if (result == ERROR_SUCCESS) {
+            return result;
+        }
+    }
+    return first;
 }
 
 /// Hands a value's type and bytes to a caller by the rules of RegQueryValueExA.
@@ -168,12 +197,16 @@ LSTATUS RegCreateKeyExA(HKEY key, LPCSTR subKey, DWORD, LPSTR, DWORD, REGSAM acc
         return static_cast<LSTATUS>(path);
     }
     bool created = false;
-    LSTATUS status = findKey(opened);
-    if (status == ERROR_FILE_NOT_FOUND) {
-        status = withStore(opened.hive, [&](Store& store) { return store.createKey(opened.path, created); });
+    DWORD status = findKey(opened);
+    if (status == ERROR_FILE_NOT_FOUND || (status == ERROR_SUCCESS && opened.asksToWrite() && !isWritable(opened))) {
+        opened.found = 0;
+        status = withStore(opened.chain->written, [&](Store& store) { return store.createKey(opened.path, created); });
+    }
+    if (status == ERROR_SUCCESS && opened.asksToWrite() && !isWritable(opened)) {
+        status = ERROR_ACCESS_DENIED;
     }
     if (status != ERROR_SUCCESS) {
-        return status;
+        return static_cast<LSTATUS>(status);
     }
     *result = HandleTable::instance().add(std::move(opened));
     if (disposition) {
@@ -190,11 +223,14 @@ LSTATUS RegOpenKeyExA(HKEY key, LPCSTR subKey, DWORD, REGSAM access, PHKEY resul
     if (const DWORD path = below(key, subKey, access, opened); path != ERROR_SUCCESS) {
         return static_cast<LSTATUS>(path);
     }
-    const LSTATUS status = findKey(opened);
+    DWORD status = findKey(opened);
+    if (status == ERROR_SUCCESS && opened.asksToWrite() && !isWritable(opened)) {
+        status = ERROR_ACCESS_DENIED;
+    }
     if (status == ERROR_SUCCESS) {
         *result = HandleTable::instance().add(std::move(opened));
     }
-    return status;
+    return static_cast<LSTATUS>(status);
 }
 
 LSTATUS RegCloseKey(HKEY key) {
@@ -205,9 +241,9 @@ LSTATUS RegQueryValueExA(HKEY key, LPCSTR name, LPDWORD, LPDWORD type, LPBYTE da
     if (data && !size) {
         return ERROR_INVALID_PARAMETER;
     }
-    return withKey(key, KEY_QUERY_VALUE, [&](Store& store, const OpenKey& open) {
+    return reading(key, KEY_QUERY_VALUE, [&](const OpenKey& open) {
         std::shared_ptr<const Value> value;
-        const DWORD result = store.readValue(open.path, textOf(name), value);
+        const DWORD result = readValue(open, textOf(name), value);
         return result == ERROR_SUCCESS ? copyValue(*value, type, data, size) : result;
     });
 }
@@ -216,14 +252,14 @@ LSTATUS RegSetValueExA(HKEY key, LPCSTR name, DWORD, DWORD type, const BYTE* dat
     if ((!data && size != 0) || !isValueName(textOf(name))) {
         return ERROR_INVALID_PARAMETER;
     }
-    return withKey(key, KEY_SET_VALUE, [&](Store& store, const OpenKey& open) {
+    return writing(key, KEY_SET_VALUE, [&](Store& store, const OpenKey& open) {
         const std::string_view bytes(reinterpret_cast<const char*>(data), size);
         return store.writeValue(open.path, {std::string(textOf(name)), type, std::string(bytes)});
     });
 }
 
 LSTATUS RegDeleteValueA(HKEY key, LPCSTR name) {
-    return withKey(key, KEY_SET_VALUE,
+    return writing(key, KEY_SET_VALUE,
                    [&](Store& store, const OpenKey& open) { return store.deleteValue(open.path, textOf(name)); });
 }
 
@@ -238,16 +274,17 @@ LSTATUS RegDeleteKeyA(HKEY key, LPCSTR subKey) {
     if (doomed.path.folded.empty()) {
         return ERROR_ACCESS_DENIED;
     }
-    return withStore(doomed.hive, [&](Store& store) { return store.deleteKey(doomed.path); });
+    return static_cast<LSTATUS>(
+        withStore(doomed.chain->written, [&](Store& store) { return store.deleteKey(doomed.path); }));
 }
 
 LSTATUS RegEnumKeyExA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWORD, LPSTR, LPDWORD, PFILETIME) {
     if (!name || !nameSize) {
         return ERROR_INVALID_PARAMETER;
     }
-    return withKey(key, KEY_ENUMERATE_SUB_KEYS, [&](Store& store, OpenKey& open) {
+    return reading(key, KEY_ENUMERATE_SUB_KEYS, [&](OpenKey& open) {
         std::string found;
-        const DWORD result = store.keyAt(open.path, index, open.keyCursor, found);
+        const DWORD result = open.source().keyAt(open.path, index, open.keyCursor, found);
         return result == ERROR_SUCCESS ? copyName(found, name, *nameSize) : result;
     });
 }
@@ -257,9 +294,9 @@ LSTATUS RegEnumValueA(HKEY key, DWORD index, LPSTR name, LPDWORD nameSize, LPDWO
     if (!name || !nameSize || (data && !size)) {
         return ERROR_INVALID_PARAMETER;
     }
-    return withKey(key, KEY_QUERY_VALUE, [&](Store& store, OpenKey& open) {
+    return reading(key, KEY_QUERY_VALUE, [&](OpenKey& open) {
         Value value;
-        DWORD result = store.valueAt(open.path, index, open.valueCursor, value);
+        DWORD result = open.source().valueAt(open.path, index, open.valueCursor, value);
         if (result == ERROR_SUCCESS) {
             result = copyName(value.name, name, *nameSize);
         }

@@ -1,29 +1,110 @@
 #include "platform/win/Associations.h"
 
+#include "platform/win/Pipe.h"
+#include "platform/win/Process.h"
 #include "tests/unit/SavedEnvironment.h"
+#include "tests/unit/win/RegistrySandbox.h"
 
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <functional>
+#include <iterator>
 #include <string>
+#include <sys/wait.h>
+#include <unistd.h>
 
 namespace fs = std::filesystem;
 
 namespace {
 
-/// A desktop of its own: folders for programs, desktop entries and permissions that go with the object.
+/// Runs something in a process of its own: the desktop's library reads the environment once.
+std::string inChild(const std::function<std::string()>& question) {
+    int ends[2];
+    if (pipe(ends) != 0) {
+        return "no pipe";
+    }
+    const pid_t child = fork();
+    if (child == 0) {
+        const std::string answer = question();
+        const bool isWritten = ::write(ends[1], answer.data(), answer.size()) == static_cast<ssize_t>(answer.size());
+        _exit(isWritten ? 0 : 1);
+    }
+    close(ends[1]);
+    std::string answer;
+    char buffer[4096];
+    for (ssize_t count = 0; (count = ::read(ends[0], buffer, sizeof buffer)) > 0;) {
+        answer.append(buffer, static_cast<std::size_t>(count));
+    }
+    close(ends[0]);
+    int status = 0;
+    waitpid(child, &status, 0);
+    return status == 0 ? answer : "the child has failed: " + answer;
+}
+
+/// The default value of a key, "<2>" when there is none.
+std::string valueOf(HKEY root, const std::string& key) {
+    return TestKey(key, TestKey::Way::Open, KEY_READ, root).read("");
+}
+
+/// The command of a class of documents, found as the library finds it.
+std::string commandOf(const std::string& extension) {
+    const std::string name = valueOf(HKEY_CLASSES_ROOT, extension);
+    return name.starts_with('<') ? name : valueOf(HKEY_CLASSES_ROOT, name + "\\shell\\open\\command");
+}
+
+/// What arrives at a program that a command of the settings is started with: its words, each in a line.
+std::string arrives(std::string command, const std::string& document) {
+    const bool hasMarker = command.find("%1") != std::string::npos;
+    for (std::size_t at = command.find("%1"); at != std::string::npos; at = command.find("%1", at + document.size())) {
+        command.replace(at, 2, document);
+    }
+    command += hasMarker ? "" : " " + document;
+    HANDLE output = nullptr;
+    HANDLE end = nullptr;
+    const SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
+    CreatePipe(&output, &end, &inheritable, 0);
+    STARTUPINFOA startup;
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdOutput = startup.hStdError = end;
+    PROCESS_INFORMATION process;
+    const BOOL started =
+        CreateProcessA(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &process);
+    CloseHandle(end);
+    std::string text;
+    char buffer[4096];
+    DWORD count = 0;
+    while (started && ReadFile(output, buffer, sizeof buffer, &count, nullptr)) {
+        text.append(buffer, count);
+    }
+    CloseHandle(output);
+    return text;
+}
+
+/// A desktop of its own: folders for programs, desktop entries and permissions that go with the object. Each program
+/// writes down its arguments.
 class Associations : public testing::Test {
 protected:
     void SetUp() override {
-        fs::create_directories(folder / "bin");
         fs::create_directories(folder / "snap/bin");
         setenv("HOME", (folder / "home").c_str(), 1);
         setenv("XDG_DATA_HOME", (folder / "data").c_str(), 1);
+        setenv("XDG_DATA_DIRS", (folder / "system").c_str(), 1);
+        setenv("XDG_CONFIG_HOME", (folder / "config").c_str(), 1);
+        setenv("XDG_CONFIG_DIRS", (folder / "etc").c_str(), 1);
+        setenv("XDG_RUNTIME_DIR", (folder / "run").c_str(), 1);
+        setenv("TVX_REGISTRY", (folder / "registry.db").c_str(), 1);
         setenv("PATH", ((folder / "bin").string() + ":/usr/bin:/bin").c_str(), 1);
+        unsetenv("BROWSER");
+        fs::create_directories(folder / "run");
+        for (const char* name : {"show", "other", "evince"}) {
+            program(name);
+        }
     }
     void TearDown() override {
+        tvx::registry::closeStores();
         fs::remove_all(folder);
     }
 
@@ -36,13 +117,109 @@ protected:
         return file.string();
     }
 
+    std::string program(const std::string& name) const {
+        return write("bin/" + name, "#!/bin/sh\necho " + name + "\nfor word do echo \"[$word]\"; done\n");
+    }
+
+    /// Installs a program that opens a type.
+    void entry(const std::string& name, const std::string& exec, const std::string& more = {},
+               const std::string& types = "text/html;application/pdf;text/plain;") const {
+        write("system/applications/" + name + ".desktop", "[Desktop Entry]\nType=Application\nName=" + name +
+                                                              "\nExec=" + exec + "\nMimeType=" + types + "\n" + more);
+        std::string cache = "[MIME Cache]\n";
+        for (const char* type : {"text/html", "application/pdf", "text/plain", "x-scheme-handler/http"}) {
+            std::string names;
+            for (const auto& file : fs::directory_iterator(folder / "system/applications")) {
+                std::ifstream stream(file.path());
+                const std::string text(std::istreambuf_iterator<char>(stream), {});
+                names += text.find(type) != std::string::npos ? file.path().filename().string() + ";" : "";
+            }
+            cache += std::string(type) + "=" + names + "\n";
+        }
+        write("system/applications/mimeinfo.cache", cache);
+    }
+
+    /// Makes a program the user's choice.
+    void choose(const std::string& lines) const {
+        write("config/mimeapps.list", lines);
+    }
+
     const SavedEnvironment environment;
     const fs::path folder = fs::canonical(fs::temp_directory_path()) / "associations";
 };
 
+TEST_F(Associations, AreTheCallsOfDesktopEntriesAsCommands) {
+    const std::string helper = TVX_TEST_HELPER;
+    const struct {
+        std::string exec;
+        std::string extension;
+        std::string command; ///< "@" stands for the helper
+        std::string arrived; ///< for the document "a b"
+    } rows[] = {
+        {"show %u", ".htm", "show \"%1\"", "show\n[a b]\n"},
+        {"show %U", ".html", "show \"%1\"", "show\n[a b]\n"},
+        {"show %f", ".htm", "@ --names show {} \"%1\"", "show\n[/x/a b]\n"},
+        {"show -a %F -b", ".htm", "@ --names show -a {} -b \"%1\"", "show\n[-a]\n[/x/a b]\n[-b]\n"},
+        {"show", ".htm", "@ --names show {} \"%1\"", "show\n[/x/a b]\n"},
+        {"show %u", ".pdf", "@ show {} \"%1\"", "show\n[/x/a b]\n"},
+        {"show", ".txt", "show \"%1\"", "show\n[a b]\n"},
+        {"show --x=%u", ".htm", "show \"--x=%1\"", "show\n[--x=a b]\n"},
+        {"show %i -n %c %k %v %u", ".htm", "show -n \"%1\"", "show\n[-n]\n[a b]\n"},
+        {R"(show "a b" "" 'q"q' "\\$x\\\\" %u)", ".htm", R"(show "a b" "" "q\"q" $x\ "%1")",
+         "show\n[a b]\n[]\n[q\"q]\n[$x\\]\n[a b]\n"},
+        {R"(show "\\"end\\\\ " %u)", ".htm", R"(show "\"end\ " "%1")", "show\n[\"end\\ ]\n[a b]\n"},
+        {"show 100%% {x} {} %u", ".htm", "@ show 100{25} {7B}x} {7B}} {} \"%1\"", "show\n[100%]\n[{x}]\n[{}]\n[a b]\n"},
+        {"env A=b show %u", ".htm", "env A=b show \"%1\"", "show\n[a b]\n"},
+        {"show @@u %U @@", ".txt", "@ show @@u {} @@ \"%1\"", "show\n[@@u]\n[file:///x/a%20b]\n[@@]\n"},
+    };
+    for (const auto& row : rows) {
+        entry("one", row.exec);
+        std::string command = row.command;
+        if (command.starts_with('@')) {
+            command.replace(0, 1, helper);
+        }
+        EXPECT_EQ(inChild([&] { return commandOf(row.extension); }), command) << row.exec;
+        const bool isHelped = row.arrived.find("/x/a") != std::string::npos;
+        EXPECT_EQ(arrives(command, isHelped ? "/x/a b" : "a b"), row.arrived) << row.exec;
+    }
+}
+
+TEST_F(Associations, FollowTheChoicesOfTheUser) {
+    const struct {
+        const char* what;
+        std::string choices;
+        std::string extension;
+        std::string program; ///< the first word of the command
+    } rows[] = {
+        {"one of the installed", "", ".txt", "other"},
+        {"the default", "[Default Applications]\ntext/plain=show.desktop\n", ".txt", "show"},
+        {"a missing default", "[Default Applications]\ntext/plain=gone.desktop;show.desktop\n", ".txt", "show"},
+        {"a removed one", "[Removed Associations]\ntext/plain=other.desktop\n", ".txt", "show"},
+        {"an added one", "[Added Associations]\ntext/html=show.desktop\n", ".htm", "show"},
+        {"nothing for pages: no editor stands in", "[Default Applications]\ntext/plain=show.desktop\n", ".htm", "<2>"},
+        {"the browser of addresses", "[Default Applications]\nx-scheme-handler/http=web.desktop\n", ".htm", "other"},
+        {"a terminal's is passed over", "[Default Applications]\ntext/plain=terminal.desktop\n", ".txt", "other"},
+        {"one whose program is missing", "[Default Applications]\ntext/plain=missing.desktop\n", ".txt", "other"},
+        {"one whose condition is missing", "[Default Applications]\ntext/plain=untried.desktop\n", ".txt", "other"},
+    };
+    entry("show", "show %u", {}, "text/plain;");
+    entry("other", "other %u", {}, "text/plain;");
+    entry("web", "other %u", {}, "");
+    entry("terminal", "show %u", "Terminal=true\n", "text/plain;");
+    entry("missing", "not-there %u", {}, "text/plain;");
+    entry("untried", "show %u", "TryExec=not-there\n", "text/plain;");
+    write("system/applications/mimeinfo.cache", "[MIME Cache]\ntext/plain=other.desktop;show.desktop;\n");
+    write("system/mime/subclasses", "text/html text/plain\n");
+    for (const auto& row : rows) {
+        choose(row.choices);
+        const std::string command = inChild([&] { return commandOf(row.extension); });
+        EXPECT_EQ(command.substr(0, command.find(' ')), row.program) << row.what;
+    }
+}
+
 TEST_F(Associations, TellWhatKeepsSandboxedProgramsFromDocuments) {
     write("usr/bin/snap", "#!/bin/sh\n");
-    write("bin/plain", "#!/bin/sh\n");
+    program("plain");
     write("bin/tvxopen", "#!/bin/sh\n");
     write("bin/flatpak", "#!/bin/sh\n");
     fs::create_symlink("../../usr/bin/snap", folder / "snap/bin/fox");
@@ -91,7 +268,6 @@ TEST_F(Associations, TellWhatKeepsSandboxedProgramsFromDocuments) {
         {"flatpak run org.app.None @@u \"%1\" @@", "/opt/a.pdf#page=2", ""},
         {"flatpak run org.app.None @@u \"%1\" @@", "/opt/a.htm", "flatpak"},
     };
-    unsetenv("BROWSER");
     for (const auto& row : rows) {
         EXPECT_EQ(tvx::obstacleTo(row.command, row.document), row.obstacle) << row.command << ": " << row.document;
     }

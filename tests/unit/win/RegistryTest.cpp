@@ -184,7 +184,15 @@ TEST_F(Registry, AnswersClassesOfTheUserBeforeThoseOfTheMachine) {
     EXPECT_EQ(TestKey(".brd", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "user");
     EXPECT_EQ(TestKey(".pdf", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "viewer");
     EXPECT_EQ(TestKey("Software\\Classes\\.brd", TestKey::Way::Open, KEY_READ, HKEY_LOCAL_MACHINE).read(""), "machine");
-    EXPECT_EQ(TestKey(".pdf", TestKey::Way::Create, KEY_WRITE, HKEY_CLASSES_ROOT).result, LSTATUS{ERROR_ACCESS_DENIED});
+    EXPECT_EQ(TestKey(".pdf", TestKey::Way::Open, KEY_WRITE, HKEY_CLASSES_ROOT).result, LSTATUS{ERROR_ACCESS_DENIED});
+    const TestKey own(".pdf", TestKey::Way::Create, KEY_READ | KEY_WRITE, HKEY_CLASSES_ROOT);
+    EXPECT_EQ(own.disposition, DWORD{REG_CREATED_NEW_KEY});
+    EXPECT_EQ(own.read(""), "viewer") << "the machine's, as long as the user has a key but no value";
+    own.write("", "own");
+    EXPECT_EQ(own.read(""), "own");
+    EXPECT_EQ(TestKey("Software\\Classes\\.pdf", TestKey::Way::Open, KEY_READ).read(""), "own");
+    EXPECT_EQ(RegDeleteKeyA(HKEY_CLASSES_ROOT, ".pdf"), 0);
+    EXPECT_EQ(TestKey(".pdf", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT).read(""), "viewer");
 }
 
 TEST_F(Registry, MakesFileAndFolderPrivateAndOnlyWhenSomethingIsWritten) {
