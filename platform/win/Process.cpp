@@ -198,3 +198,11 @@ BOOL TerminateProcess(HANDLE process, UINT code) {
     }
     return error == ERROR_SUCCESS ? TRUE : FALSE;
 }
+
+namespace tvx {
+
+void setLastInputTime(DWORD time) {
+    keepLastInputTime(time);
+}
+
+} // namespace tvx

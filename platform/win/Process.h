@@ -131,3 +131,12 @@ TVX_PLATFORM_API BOOL GetExitCodeProcess(HANDLE process, DWORD* code);
 /// @param process  from CreateProcessA; one from OpenProcess gives `ERROR_ACCESS_DENIED`, as does one that has ended
 /// @param code     what GetExitCodeProcess is to give from then on
 TVX_PLATFORM_API BOOL TerminateProcess(HANDLE process, UINT code);
+
+namespace tvx {
+
+/// Tells when the user last pressed a key or a button in this process's windows. Children that are started from then on
+/// get a startup id (`DESKTOP_STARTUP_ID`) of that time, so that the window manager brings their windows to the front.
+/// @param time  in the X display's time, in milliseconds; 0: there was no such input, and children get no id
+TVX_PLATFORM_API void setLastInputTime(DWORD time);
+
+} // namespace tvx

@@ -29,6 +29,9 @@ void readAddress(Document& document, std::string_view name) {
         return;
     }
     const std::size_t query = std::min(name.find('?'), name.size());
+    if (name.find('#', query) != std::string_view::npos) {
+        return; // no query holds this, so a place begins there
+    }
     document.file = tvx::decodeAddress(name.substr(0, query));
     document.query = name.substr(std::min(query + 1, name.size()));
 }

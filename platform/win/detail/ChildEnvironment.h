@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/base/Export.h"
+#include "platform/base/Types.h"
 
 #include <deque>
 #include <string>
@@ -12,7 +13,8 @@ namespace tvx::win {
 enum class StartShow { Normal, Hidden };
 
 /// The environment of a child: the process's own, with the user's values where the application's bundle had put its
-/// own for itself (docs/processes.md says how a bundle tells), and the wish to be hidden.
+/// own for itself (docs/processes.md says how a bundle tells), without what was meant for this process alone, and with
+/// the wish to be hidden, or on an X display with a startup id that belongs to what the user did last.
 ///
 /// Holds while the process's environment is not changed.
 class TVX_PLATFORM_API ChildEnvironment {
@@ -30,6 +32,9 @@ private:
     std::deque<std::string> m_own;
     std::vector<char*> m_block;
 };
+
+/// Keeps the time of the user's last key or click for the startup ids of children.
+void keepLastInputTime(DWORD time);
 
 /// How this process was asked to show its first window when it was started.
 StartShow askedStartShow();

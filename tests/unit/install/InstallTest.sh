@@ -30,7 +30,16 @@ said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1) || code=$?
 [[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
 
 ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
-for tool in tvxsettings helpmapcheck; do
+for tool in tvxsettings tvxopen helpmapcheck; do
     "$work/moved/bin/$tool" --help >/dev/null
     [ -s "$work/moved/share/man/man1/$tool.1" ] || { echo "FAIL: no manual page of $tool"; exit 1; }
 done
+# The desktop's viewer is called through the helper that was installed.
+mkdir -p "$work/data/applications"
+printf '[Desktop Entry]\nType=Application\nName=x\nExec=true %%f\nMimeType=application/pdf;\n' \
+    >"$work/data/applications/x.desktop"
+printf '[MIME Cache]\napplication/pdf=x.desktop;\n' >"$work/data/applications/mimeinfo.cache"
+command=$(XDG_DATA_HOME="$work/data" "$work/moved/bin/tvxsettings" get \
+    'HKCR\tarvex.desktop.application-pdf\shell\open\command' @)
+[ "$command" = "$work/moved/bin/tvxopen --names true {} \"%1\"" ] || { echo "FAIL: answered $command"; exit 1; }
+"$work/moved/bin/tvxopen" true /x.pdf

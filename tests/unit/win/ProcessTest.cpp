@@ -295,6 +295,24 @@ TEST(ProcessInheritance, TheEnvironmentIsTheUsers) {
     EXPECT_STREQ(std::getenv("LD_LIBRARY_PATH"), "/bundle/lib:/usr/lib") << "the host's own stays";
 }
 
+TEST(ProcessInheritance, AStartupIdIsFreshAndOfTheLastInput) {
+    ::setenv("DESKTOP_STARTUP_ID", "ours_TIME1", 1);
+    ::setenv("XDG_ACTIVATION_TOKEN", "ours", 1);
+    ::setenv("GIO_LAUNCHED_DESKTOP_FILE", "/ours.desktop", 1);
+    std::string text = Child("env").output();
+    EXPECT_EQ(lineWith(text, "DESKTOP_STARTUP_ID"), "") << "there was no input";
+    EXPECT_EQ(lineWith(text, "XDG_ACTIVATION_TOKEN"), "");
+    EXPECT_EQ(lineWith(text, "GIO_LAUNCHED"), "");
+    tvx::setLastInputTime(4'000'000'000);
+    const std::string first = lineWith(Child("env").output(), "DESKTOP_STARTUP_ID=");
+    const std::string second = lineWith(Child("env").output(), "DESKTOP_STARTUP_ID=");
+    EXPECT_TRUE(first.ends_with("_TIME4000000000")) << first;
+    EXPECT_TRUE(second.ends_with("_TIME4000000000")) << second;
+    EXPECT_NE(first, second);
+    EXPECT_EQ(lineWith(Child("env", nullptr, 0).output(), "DESKTOP_STARTUP_ID"), "") << "no window is wanted";
+    tvx::setLastInputTime(0);
+}
+
 TEST(ProcessInheritance, TheWishToBeHiddenReachesTheChildOnly) {
     EXPECT_EQ(lineWith(Child("env", nullptr, 0).output(), "TVX_START_HIDDEN"), "TVX_START_HIDDEN=1");
     STARTUPINFOA startup;

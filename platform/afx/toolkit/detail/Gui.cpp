@@ -2,12 +2,14 @@
 
 #include "platform/win/Display.h"
 #include "platform/win/Module.h"
+#include "platform/win/Process.h"
 #include "platform/win/ResourceConstants.h"
 #include "platform/win/Thread.h"
 #include "platform/win/detail/LanguageTable.h"
 
 #include <QApplication>
 #include <QDir>
+#include <QInputEvent>
 #include <QJsonArray>
 #include <QJsonObject>
 #include <QLibraryInfo>
@@ -32,10 +34,14 @@ constinit GuiHooks floorsAbove;
 /// event again at every ancestor, and exceptions could not be caught in them.
 class GuiApplication : public QApplication {
 public:
-    GuiApplication(int& argc, char** argv) : QApplication(argc, argv) {}
+    GuiApplication(int& argc, char** argv)
+        : QApplication(argc, argv), m_isOnX(platformName() == QLatin1String("xcb")) {}
 
     bool notify(QObject* receiver, QEvent* event) override {
         try {
+            if (m_isOnX && event->spontaneous()) {
+                noteInput(*event);
+            }
             bool result = true;
             if (floorsAbove.translate(receiver, event, result)) {
                 return result;
@@ -49,6 +55,23 @@ public:
             return true;
         }
     }
+
+private:
+    /// Keys and buttons count as the user's actions, for window managers as for the programs that are started by them.
+    static void noteInput(const QEvent& event) {
+        switch (event.type()) {
+        case QEvent::KeyPress:
+        case QEvent::KeyRelease:
+        case QEvent::MouseButtonPress:
+        case QEvent::MouseButtonRelease:
+            setLastInputTime(static_cast<DWORD>(static_cast<const QInputEvent&>(event).timestamp()));
+            break;
+        default:
+            break;
+        }
+    }
+
+    const bool m_isOnX;
 };
 
 DWORD threadOfWindows = 0;

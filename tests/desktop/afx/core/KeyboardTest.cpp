@@ -1,7 +1,10 @@
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/win/Display.h"
+#include "platform/win/Pipe.h"
+#include "platform/win/Process.h"
 
+#include <QKeyEvent>
 #include <QTest>
 #include <QWidget>
 
@@ -35,6 +38,50 @@ TEST(KeyboardOnDesktop, LockKeysAreOnUntilTheyArePressedAgain) {
     EXPECT_EQ(GetKeyState(VK_CAPITAL), 0);
     press("Num_Lock");
     EXPECT_TRUE(QTest::qWaitFor([] { return GetKeyState(VK_NUMLOCK) == 0; }));
+}
+
+/// Keeps the display's time of the keys that it gets.
+class TimedWindow : public QWidget {
+public:
+    quint64 released = 0;
+
+protected:
+    void keyReleaseEvent(QKeyEvent* event) override {
+        released = event->timestamp();
+    }
+};
+
+/// The startup id of a child.
+std::string startupIdOfChild() {
+    SECURITY_ATTRIBUTES inheritable{sizeof inheritable, nullptr, TRUE};
+    STARTUPINFOA startup;
+    HANDLE output = nullptr;
+    CreatePipe(&output, &startup.hStdOutput, &inheritable, 0);
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    PROCESS_INFORMATION child;
+    std::string line = "sh -c \"echo $DESKTOP_STARTUP_ID\"";
+    EXPECT_TRUE(CreateProcessA(nullptr, line.data(), nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &child));
+    CloseHandle(startup.hStdOutput);
+    std::string text;
+    char buffer[256];
+    for (DWORD count = 0; ReadFile(output, buffer, sizeof buffer, &count, nullptr);) {
+        text.append(buffer, count);
+    }
+    CloseHandle(output);
+    return text;
+}
+
+TEST(KeyboardOnDesktop, ChildrenAreStartedInTheNameOfTheLastKey) {
+    ASSERT_TRUE(tvx::afx::ensureGui());
+    EXPECT_EQ(startupIdOfChild(), "\n");
+    TimedWindow window;
+    window.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&window));
+    press("a");
+    ASSERT_TRUE(QTest::qWaitFor([&] { return window.released != 0; }));
+    const std::string end = "_TIME" + std::to_string(window.released) + "\n";
+    const std::string id = startupIdOfChild();
+    EXPECT_TRUE(id.ends_with(end)) << id << " instead of " << end;
 }
 
 } // namespace
