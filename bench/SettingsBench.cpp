@@ -12,6 +12,7 @@
 #include <chrono>
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <sqlite3.h>
 #include <string>
 #include <sys/wait.h>
@@ -386,5 +387,72 @@ void twoProcessesWriteWithTheDatabaseAlone(benchmark::State& state) {
     state.counters["worst_ms"] = worst;
 }
 BENCHMARK(twoProcessesWriteWithTheDatabaseAlone)->Unit(benchmark::kMillisecond)->UseRealTime()->Iterations(3);
+
+// --- the command of the desktop's default browser ---
+
+/// A desktop with one browser.
+void makeDesktop(const Folder& folder) {
+    const fs::path applications = fs::path(folder / "data") / "applications";
+    fs::create_directories(applications);
+    std::ofstream(applications / "x.desktop") << "[Desktop Entry]\nType=Application\nName=x\nExec=true %u\n"
+                                                 "MimeType=text/html;\n";
+    std::ofstream(applications / "mimeinfo.cache") << "[MIME Cache]\ntext/html=x.desktop;\n";
+    setenv("XDG_DATA_HOME", (folder / "data").c_str(), 1);
+    setenv("TVX_REGISTRY", (folder / "registry.db").c_str(), 1);
+}
+
+/// Reads as the library does: the class of the extension, then the command of the class.
+bool readBrowser() {
+    char text[1024];
+    for (const char* name : {".htm", "tarvex.desktop.text-html\\shell\\open\\command"}) {
+        HKEY key = nullptr;
+        DWORD size = sizeof text;
+        if (RegOpenKeyExA(HKEY_CLASSES_ROOT, name, 0, KEY_READ, &key) != 0 ||
+            RegQueryValueExA(key, "", nullptr, nullptr, reinterpret_cast<BYTE*>(text), &size) != 0) {
+            return false;
+        }
+        RegCloseKey(key);
+    }
+    return true;
+}
+
+/// In a process that has asked the desktop nothing before: with the loading of its library and of all entries.
+void readBrowserFirst(benchmark::State& state) {
+    const Folder folder;
+    makeDesktop(folder);
+    for (auto _ : state) {
+        std::array<int, 2> ends{};
+        double seconds = -1;
+        if (pipe(ends.data()) != 0) {
+            std::abort();
+        }
+        if (fork() == 0) {
+            const auto begin = std::chrono::steady_clock::now();
+            const bool isRead = readBrowser();
+            const std::chrono::duration<double> taken = std::chrono::steady_clock::now() - begin;
+            seconds = isRead ? taken.count() : -1;
+            _exit(::write(ends[1], &seconds, sizeof seconds) == sizeof seconds ? 0 : 1);
+        }
+        if (::read(ends[0], &seconds, sizeof seconds) != sizeof seconds || seconds < 0) {
+            state.SkipWithError("not read");
+        }
+        wait(nullptr);
+        close(ends[0]);
+        close(ends[1]);
+        state.SetIterationTime(seconds);
+    }
+}
+BENCHMARK(readBrowserFirst)->Unit(benchmark::kMicrosecond)->UseManualTime();
+
+void readBrowserAgain(benchmark::State& state) {
+    const Folder folder;
+    makeDesktop(folder);
+    for (auto _ : state) {
+        if (!readBrowser()) {
+            state.SkipWithError("not read");
+        }
+    }
+}
+BENCHMARK(readBrowserAgain)->Unit(benchmark::kMicrosecond);
 
 } // namespace

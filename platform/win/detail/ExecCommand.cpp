@@ -7,6 +7,20 @@ namespace tvx::win {
 
 namespace {
 
+std::string inQuotes(const std::string& word) {
+    std::string text = "\"";
+    std::size_t backslashes = 0;
+    for (const char character : word) {
+        if (character == '"') {
+            text.append(backslashes + 1, '\\'); // so that the quote, and each backslash before it, stays what it is
+        }
+        backslashes = character == '\\' ? backslashes + 1 : 0;
+        text += character;
+    }
+    text.append(backslashes, '\\');
+    return text + "\"";
+}
+
 /// Stands for the document; words hold no zero.
 constexpr char document = '\0';
 
@@ -113,8 +127,7 @@ std::string withMarker(const std::string& word) {
     if (word.find(document) == std::string::npos) {
         return quoted(word);
     }
-    std::string text = quoted(word + " ");
-    text.erase(text.size() - 2, 1);
+    std::string text = inQuotes(word);
     for (std::size_t at = text.find(document); at != std::string::npos; at = text.find(document)) {
         text.replace(at, 1, "%1");
     }
@@ -147,20 +160,8 @@ std::string commandFor(const std::vector<std::string>& words, Opens opens, const
 }
 
 std::string quoted(const std::string& word) {
-    if (!word.empty() && word.find_first_of(" \t\n\"") == std::string::npos) {
-        return word;
-    }
-    std::string text = "\"";
-    std::size_t backslashes = 0;
-    for (const char character : word) {
-        if (character == '"') {
-            text.append(backslashes + 1, '\\'); // so that the quote, and each backslash before it, stays what it is
-        }
-        backslashes = character == '\\' ? backslashes + 1 : 0;
-        text += character;
-    }
-    text.append(backslashes, '\\');
-    return text + "\"";
+    const bool isPlain = !word.empty() && word.find_first_of(" \t\n\"") == std::string::npos;
+    return isPlain ? word : inQuotes(word);
 }
 
 } // namespace tvx::win

@@ -56,7 +56,7 @@ std::string commandOf(const std::string& extension) {
 }
 
 /// What arrives at a program that a command of the settings is started with: its words, each in a line.
-std::string arrives(std::string command, const std::string& document) {
+std::string arrives(std::string command, const std::string& document, DWORD* id = nullptr) {
     const bool hasMarker = command.find("%1") != std::string::npos;
     for (std::size_t at = command.find("%1"); at != std::string::npos; at = command.find("%1", at + document.size())) {
         command.replace(at, 2, document);
@@ -73,6 +73,9 @@ std::string arrives(std::string command, const std::string& document) {
     const BOOL started =
         CreateProcessA(nullptr, command.data(), nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &process);
     CloseHandle(end);
+    if (id) {
+        *id = process.dwProcessId;
+    }
     std::string text;
     char buffer[4096];
     DWORD count = 0;
@@ -215,6 +218,117 @@ TEST_F(Associations, FollowTheChoicesOfTheUser) {
         const std::string command = inChild([&] { return commandOf(row.extension); });
         EXPECT_EQ(command.substr(0, command.find(' ')), row.program) << row.what;
     }
+}
+
+TEST_F(Associations, ComeBehindWhatIsStored) {
+    const char* editor = R"(Software\Microsoft\Windows\CurrentVersion\App Paths\WORDPAD.EXE)";
+    const char* browser = R"(Software\Classes\Applications\iexplore.exe\shell\open\command)";
+    const auto now = [&](HKEY root, const std::string& key) { return inChild([&] { return valueOf(root, key); }); };
+    entry("one", "show %u");
+    const std::string x = program("x-www-browser");
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, ".PDF"), "tarvex.desktop.application-pdf");
+    EXPECT_EQ(now(HKEY_LOCAL_MACHINE, R"(software\classes\.txt)"), "tarvex.desktop.text-plain");
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, R"(tarvex.desktop.text-plain\shell)"), "<2>") << "is there, and has no value";
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, R"(tarvex.desktop.text-plain\run)"), "<6>") << "is not there";
+    EXPECT_EQ(now(HKEY_LOCAL_MACHINE, editor), "show");
+    EXPECT_EQ(now(HKEY_LOCAL_MACHINE, browser), x + " \"%1\"");
+
+    const std::string machine = (folder / "etc/tarvex/registry.db").string();
+    RegistrySandbox::use(machine);
+    TestKey(R"(Software\Classes\.pdf)").write("", "machine.pdf");
+    TestKey(editor).write("Path", "somewhere");
+    TestKey(browser).write("", "machine's browser");
+    RegistrySandbox::use(folder / "registry.db");
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, ".pdf"), "machine.pdf");
+    EXPECT_EQ(now(HKEY_LOCAL_MACHINE, browser), "machine's browser");
+    EXPECT_EQ(now(HKEY_LOCAL_MACHINE, editor), "show") << "the machine's key has another value only";
+    TestKey(".txt", TestKey::Way::Create, KEY_WRITE, HKEY_CLASSES_ROOT).write("", "own.txt");
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, ".txt"), "own.txt");
+    EXPECT_EQ(now(HKEY_CLASSES_ROOT, ".htm"), "tarvex.desktop.text-html");
+
+    const std::string listed = inChild([] {
+        std::string names;
+        char name[256];
+        for (DWORD index = 0, size = sizeof name;
+             RegEnumKeyExA(HKEY_CLASSES_ROOT, index, name, &size, nullptr, nullptr, nullptr, nullptr) == 0;
+             ++index, size = sizeof name) {
+            names += std::string(name) + ";";
+        }
+        return names;
+    });
+    EXPECT_EQ(listed, ".txt;") << "what the user has stored";
+}
+
+TEST_F(Associations, KnowTheGenericBrowsers) {
+    const char* key = R"(Software\Classes\Applications\iexplore.exe\shell\open\command)";
+    const auto browser = [&] { return valueOf(HKEY_LOCAL_MACHINE, key); };
+    const auto file = [&](const char* name) { return (folder / "bin" / name).string() + " \"%1\""; };
+    setenv("PATH", (folder / "bin").c_str(), 1);
+    program("sensible-browser");
+    EXPECT_EQ(browser(), "<2>") << "sensible-browser alone leads nowhere";
+    program("lynx");
+    fs::create_symlink("lynx", folder / "bin/www-browser");
+    EXPECT_EQ(browser(), "<2>") << "there is no terminal";
+    fs::remove(folder / "bin/www-browser");
+    program("www-browser");
+    EXPECT_EQ(browser(), file("www-browser"));
+    program("gnome-www-browser");
+    EXPECT_EQ(browser(), file("gnome-www-browser"));
+    program("x-www-browser");
+    EXPECT_EQ(browser(), file("x-www-browser"));
+    setenv("BROWSER", "lynx", 1);
+    EXPECT_EQ(browser(), file("x-www-browser"));
+    setenv("BROWSER", "show", 1);
+    EXPECT_EQ(browser(), file("sensible-browser"));
+}
+
+TEST_F(Associations, AreFollowedWhenTheyChange) {
+    entry("one", "show %u");
+    entry("two", "other %u");
+    choose("[Default Applications]\ntext/plain=one.desktop\n");
+    const std::string both = inChild([&] {
+        const std::string before = commandOf(".txt");
+        choose("[Default Applications]\ntext/plain=two.desktop\n");
+        while (commandOf(".txt") == before) { // the desktop's library hears of it from the system
+            usleep(1000);
+        }
+        return before + " " + commandOf(".txt");
+    });
+    EXPECT_EQ(both, "show \"%1\" other \"%1\"");
+}
+
+TEST_F(Associations, ReachTheirProgramsThroughTheHelper) {
+    write("docs/a b.pdf", "x");
+    write("docs/c.htm", "<p id='s'>");
+    write("bin/own-id", "#!/bin/sh\necho $$\n");
+    const std::string docs = (folder / "docs").string();
+    const auto opened = [&](const std::string& exec, const std::string& extension, const std::string& document) {
+        entry("one", exec);
+        return arrives(inChild([&] { return commandOf(extension); }), document);
+    };
+    const std::string page = "evince\n[--page-index=12]\n[" + docs + "/a b.pdf]\n";
+    EXPECT_EQ(opened("evince %U", ".pdf", docs + "/a b.pdf#page=12"), page);
+    EXPECT_EQ(opened("evince", ".pdf", "C:" + docs + "\\a b.pdf#page=12"), page);
+    EXPECT_EQ(opened("evince %f", ".pdf", "file:///C|" + docs + "/a%20b.pdf#page=12"), page);
+    EXPECT_EQ(opened("show %f", ".htm", "file://" + docs + "/c.htm"), "show\n[" + docs + "/c.htm]\n");
+    const std::string led = opened("show %f", ".htm", "file://" + docs + "/c.htm#s");
+    EXPECT_TRUE(led.starts_with("show\n[" + (folder / "run/tvxopen/").string())) << led;
+    EXPECT_EQ(opened("show %u", ".htm", "https://www.example.org/?a=1&b#s"),
+              "show\n[https://www.example.org/?a=1&b#s]\n");
+
+    const char* editor = R"(Software\Microsoft\Windows\CurrentVersion\App Paths\WORDPAD.EXE)";
+    const auto edited = [&](const std::string& exec) {
+        entry("one", exec);
+        return arrives(inChild([&] { return valueOf(HKEY_LOCAL_MACHINE, editor); }), docs + "/c.htm");
+    };
+    EXPECT_EQ(edited("show -n %F"), "show\n[-n]\n[" + docs + "/c.htm]\n");
+    EXPECT_EQ(edited("show %f -n"), "show\n[" + docs + "/c.htm]\n[-n]\n");
+    EXPECT_EQ(edited("show --file=%f"), "show\n[--file=" + docs + "/c.htm]\n");
+
+    entry("one", "own-id %f");
+    DWORD id = 0;
+    const std::string said = arrives(inChild([] { return commandOf(".pdf"); }), "x.pdf", &id);
+    EXPECT_EQ(said, std::to_string(id) + "\n") << "no process stands between";
 }
 
 TEST_F(Associations, TellWhatKeepsSandboxedProgramsFromDocuments) {
