@@ -143,15 +143,22 @@ void Gui_SplashDlg::place() {
 }
 
 void Gui_SplashDlg::showNow() {
+    CRect place;
+    GetWindowRect(&place);
     ShowWindow(SW_SHOWNA);
+    if (GetSystemMetrics(SM_CMONITORS) == 1) {
+        // Dialogs are kept on a screen, which keeps this one from lying across two. On a single screen it stays in the
+        // middle of the saved window, wherever that was.
+        SetWindowPos(nullptr, place.left, place.top, 0, 0, SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
+    }
     InvalidateRect(nullptr);
     UpdateWindow();
-    // The desktop may take a while to bring up a window, and the application, which starts, is not going to ask for
-    // events soon. Messages stay where they are meanwhile.
+    // A desktop takes a while to bring up a window, and the application, which starts, is not going to ask for events
+    // soon. Asked for a message that is never posted, the queue stays as it is while the desktop is listened to.
     const DWORD begin = GetTickCount();
     MSG message{};
     while (m_hWnd && !m_record->painted && GetTickCount() - begin < longestWait) {
-        PeekMessage(&message, nullptr, 0, 0, PM_NOREMOVE);
+        PeekMessage(&message, m_hWnd, WM_NCDESTROY, WM_NCDESTROY, PM_NOREMOVE);
         std::this_thread::sleep_for(std::chrono::milliseconds(1));
     }
 }

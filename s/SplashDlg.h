@@ -14,7 +14,7 @@
 /// @code
 /// BOOL BoardApp::InitInstance() {
 ///     ...
-///     if (!info.IsNoSplash()) {
+///     if (info.m_bShowSplash) {
 ///         m_splash = std::make_unique<Gui_SplashDlg>(nullptr);
 ///         m_splash->Create(nullptr);
 ///     }

@@ -1,0 +1,3 @@
+#include "tests/ui/s/WindowTestApp.h"
+
+WindowTestApp windowTestApp;
