@@ -8,3 +8,4 @@
 #include "platform/afx/dialogs/ColorDialog.h"
 #include "platform/afx/dialogs/FileDialog.h"
 #include "platform/afx/dialogs/FontDialog.h"
+#include "platform/afx/dialogs/PropertySheet.h"

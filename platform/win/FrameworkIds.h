@@ -240,8 +240,12 @@
 #define TVX_IDS_FONT 0xF332
 #define TVX_IDS_IS_FOLDER 0xF333
 #define TVX_IDS_IS_PIPE 0xF334
+#define TVX_IDS_APPLY 0xF340
+#define TVX_IDS_HELP 0xF341
+#define TVX_IDS_CLOSE 0xF342
 
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721
 #define AFX_IDC_LISTBOX 100
+#define AFX_IDC_TAB_CONTROL 0x3020
 #define ID_APPLY_NOW 0x3021

@@ -25,7 +25,9 @@ bool matches(const AFX_MSGMAP_ENTRY& entry, UINT message, UINT code, UINT id) {
     if (entry.registered) {
         return *entry.registered == message;
     }
-    return entry.nMessage == message && static_cast<UINT>(entry.nCode) == code && id >= entry.nID &&
+    // Codes of WM_NOTIFY are negative numbers, of which the road of commands keeps 16 bits.
+    const UINT looked = message == WM_NOTIFY ? 0xFFFFU : ~0U;
+    return entry.nMessage == message && ((static_cast<UINT>(entry.nCode) ^ code) & looked) == 0 && id >= entry.nID &&
            id <= entry.nLastID;
 }
 

@@ -60,6 +60,9 @@
 #define EM_GETPASSWORDCHAR 0x00D2
 #define EM_GETLIMITTEXT 0x00D5
 
+// Tabs of property sheets
+#define TCN_SELCHANGE (static_cast<UINT>(-551))
+
 // List boxes
 #define LB_ADDSTRING 0x0180
 #define LB_INSERTSTRING 0x0181

@@ -141,8 +141,12 @@ BOOL CDialog::Create(LPCSTR templateName, CWnd* parent) {
         tellMissingDisplay();
         return FALSE;
     }
-    const auto description = loadTemplate(templateName);
+    const auto description = describe();
     return description && createFrom(*description, m_pParentWnd, false) ? TRUE : FALSE;
+}
+
+std::optional<tvx::DialogTemplate> CDialog::describe() const {
+    return loadTemplate(m_lpszTemplateName);
 }
 
 BOOL CDialog::createFrom(const tvx::DialogTemplate& description, CWnd* parent, bool modal) {
@@ -229,7 +233,9 @@ void CDialog::initialise(const tvx::DialogTemplate& description, CWnd*) {
 }
 
 LRESULT CDialog::HandleInitDialog(WPARAM, LPARAM) {
-    fillControls(static_cast<DialogWindow&>(*GetState()), m_lpszTemplateName);
+    if (m_lpszTemplateName) {
+        fillControls(static_cast<DialogWindow&>(*GetState()), m_lpszTemplateName);
+    }
     return OnInitDialog();
 }
 
@@ -249,7 +255,7 @@ int CDialog::DoModal() {
         tellMissingDisplay();
         return -1;
     }
-    const auto description = loadTemplate(m_lpszTemplateName);
+    const auto description = describe();
     if (!description) {
         return -1;
     }

@@ -5,6 +5,8 @@
 
 #include "platform/afx/core/Wnd.h"
 
+#include <optional>
+
 namespace tvx {
 struct DialogTemplate;
 }
@@ -94,6 +96,9 @@ protected:
     /// Called for a dialog whose template has DS_SETFONT before its controls are made; the font may be changed.
     virtual void OnSetFont(CFont* font) {}
 
+    /// The template that the window is made of; none, which standard error tells, when it is missing or damaged. For
+    /// the layer itself.
+    virtual std::optional<tvx::DialogTemplate> describe() const;
     afx_msg LRESULT OnCommandHelp(WPARAM wParam, LPARAM lParam);
     afx_msg LRESULT HandleInitDialog(WPARAM wParam, LPARAM lParam);
     DECLARE_MESSAGE_MAP()

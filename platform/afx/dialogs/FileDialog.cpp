@@ -123,7 +123,8 @@ void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
     if (chosen >= 0 && chosen < filters.size()) {
         dialog.selectNameFilter(filters[chosen]);
     }
-    if (record.lpstrDefExt) {
+    // Some hosts say "*.*" where they mean none.
+    if (record.lpstrDefExt && !std::strpbrk(record.lpstrDefExt, "*?")) {
         dialog.setDefaultSuffix(toQt(record.lpstrDefExt));
     }
     if (record.lpstrInitialDir && *record.lpstrInitialDir != '\0') {

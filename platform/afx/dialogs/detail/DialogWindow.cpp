@@ -94,7 +94,8 @@ void DialogWindow::widgetMade() {
 }
 
 int DialogWindow::accessibleRole() const {
-    return QAccessible::Dialog;
+    const bool isPage = isChild() && dynamic_cast<const DialogWindow*>(parent());
+    return isPage ? QAccessible::PropertyPage : QAccessible::Dialog;
 }
 
 void DialogWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
@@ -193,9 +194,8 @@ void followDesktop(LOGFONTA& font) {
     }
 }
 
-} // namespace
-
-void DialogWindow::useFont(const DialogTemplate& description) {
+/// The font of a template, as the desktop has it.
+LOGFONTA fontOf(const DialogTemplate& description) {
     const DialogFont wanted = description.font.value_or(DialogFont{.faceName = "MS Shell Dlg"});
     LOGFONTA font = pointFont(wanted.pointSize * 10, wanted.faceName);
     if (description.extended) {
@@ -207,6 +207,18 @@ void DialogWindow::useFont(const DialogTemplate& description) {
     } else {
         followDesktop(font);
     }
+    return font;
+}
+
+QRect mapped(const DialogRect& rect, QSize units) {
+    return {mulDiv(rect.x, units.width(), 4), mulDiv(rect.y, units.height(), 8), mulDiv(rect.width, units.width(), 4),
+            mulDiv(rect.height, units.height(), 8)};
+}
+
+} // namespace
+
+void DialogWindow::useFont(const DialogTemplate& description) {
+    const LOGFONTA font = fontOf(description);
     const HFONT old = std::exchange(m_ownFont, CreateFontIndirectA(&font));
     SendMessageA(handle(), WM_SETFONT, reinterpret_cast<WPARAM>(m_ownFont), FALSE);
     DeleteObject(reinterpret_cast<HGDIOBJ>(old));
@@ -215,10 +227,12 @@ void DialogWindow::useFont(const DialogTemplate& description) {
     m_baseUnits = dialogBaseUnits(shown);
 }
 
+QSize DialogWindow::insideOf(const DialogTemplate& description) {
+    return mapped(description.rect, dialogBaseUnits(controlFont(fontOf(description)))).size();
+}
+
 QRect DialogWindow::map(const DialogRect& rect) const {
-    const int left = mulDiv(rect.x, m_baseUnits.width(), 4);
-    const int top = mulDiv(rect.y, m_baseUnits.height(), 8);
-    return {left, top, mulDiv(rect.width, m_baseUnits.width(), 4), mulDiv(rect.height, m_baseUnits.height(), 8)};
+    return mapped(rect, m_baseUnits);
 }
 
 // --- the default button ---

@@ -33,6 +33,8 @@ public:
     QSize baseUnits() const {
         return m_baseUnits;
     }
+    /// The size in pixels that a template's dialog would have inside.
+    static QSize insideOf(const DialogTemplate& description);
     /// Pixels for dialog units.
     QRect map(const DialogRect& rect) const;
     void setDefaultId(int id);

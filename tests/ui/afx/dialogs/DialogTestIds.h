@@ -3,6 +3,8 @@
 #define IDD_SHAPE 100
 #define IDD_EMPTY 101
 #define IDD_STRANGE 102
+#define IDD_GRID_PAGE 103
+#define IDD_COLOR_PAGE 104
 
 #define IDC_NAME 1001
 #define IDC_SCALE 1002
@@ -15,3 +17,7 @@
 #define IDC_FONT 1041
 #define IDC_TREE 1050
 #define IDC_APPLY 1060
+#define IDC_WIDTH 1070
+#define IDC_DARK 1071
+
+#define IDS_OTHER_TITLE 200
