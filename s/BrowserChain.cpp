@@ -5,6 +5,7 @@
 #include "platform/port/Env.h"
 #include "platform/win/Associations.h"
 #include "res/resource.h"
+#include "s/BrowserPreference.h"
 #include "s/Msg.h"
 #include "s/Process.h"
 #include "s/Programs.h"
@@ -138,6 +139,10 @@ private:
 } // namespace
 
 int RunBrowserChain(const BrowserRequest& request) {
+    if (Port_Env::GetEnv(askVariable)) {
+        Gui_BrowserPreference preference;
+        preference.GetModalPreferenceDialog().DoModal();
+    }
     Launch launch(request);
     if (std::ranges::any_of(candidates, [&launch](const Candidate& candidate) { return launch.Try(candidate); }) ||
         launch.TryOnWeb()) {

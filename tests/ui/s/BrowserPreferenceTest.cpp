@@ -4,10 +4,12 @@
 #include "platform/base/SystemPath.h"
 #include "res/resource.h"
 #include "s/CommandText.h"
+#include "s/Process.h"
 #include "s/Profile.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 #include "tests/ui/afx/frames/SettingsFolder.h"
 #include "tests/ui/s/WindowTestApp.h"
+#include "tests/unit/SavedEnvironment.h"
 
 #include <gtest/gtest.h>
 
@@ -43,6 +45,7 @@ int work(CPropertySheet& sheet, const std::function<void()>& script) {
 
 class BrowserPreference : public testing::Test {
 protected:
+    SavedEnvironment environment;
     SettingsFolder settings;
 };
 
@@ -120,6 +123,40 @@ TEST_F(BrowserPreference, PutsAPickedProgramBeforeTheArguments) {
         click(sheet.GetDlgItem(IDOK));
     });
     EXPECT_NE(stored().find("other\" -new %1"), std::string::npos);
+    std::filesystem::remove_all(folder);
+}
+
+TEST_F(BrowserPreference, IsAskedForFirstWhereTheEnvironmentWantsThat) {
+    const auto folder = std::filesystem::temp_directory_path() / "browsers";
+    std::filesystem::create_directories(folder);
+    const auto record = folder / "record";
+    std::ofstream(folder / "browser") << "#!/bin/sh\necho \"$1\" >'" << record.string() << "'\n";
+    std::filesystem::permissions(folder / "browser", std::filesystem::perms::owner_all);
+    const std::string browser = (folder / "browser").string() + " opened:%1";
+    const auto browse = [&](Qt::Key answer) {
+        std::string shown;
+        QTimer::singleShot(0, [&] {
+            QWidget* const sheet = QApplication::activeModalWidget();
+            ASSERT_NE(sheet, nullptr);
+            auto* const field = sheet->findChild<QLineEdit*>();
+            shown = field->text().toStdString();
+            field->setText(QString::fromStdString(browser));
+            QTest::keyClick(field, answer);
+        });
+        EXPECT_EQ(Gui_Process().RunWebBrowser("http://a", nullptr, 1, 5000), answer == Qt::Key_Enter);
+        return shown;
+    };
+    Gui_Profile::WriteWebBrowserName("none %1");
+    setenv("XDG_DATA_DIRS", folder.c_str(), 1); // no desktop that knows one
+    setenv("TVX_GUI_HTML_BROWSER_PATH", "", 1);
+    BoxAnswer box;
+    EXPECT_EQ(browse(Qt::Key_Escape), "none %1");
+    EXPECT_NE(box.text.find("none http://a: failed."), std::string::npos) << box.text;
+    EXPECT_EQ(browse(Qt::Key_Enter), "none %1") << "what was cancelled is not kept";
+    EXPECT_TRUE(QTest::qWaitFor([&] { return std::filesystem::exists(record) && file_size(record) > 0; }));
+    std::string line;
+    std::getline(std::ifstream(record) >> std::ws, line);
+    EXPECT_EQ(line, "opened:http://a");
     std::filesystem::remove_all(folder);
 }
 
