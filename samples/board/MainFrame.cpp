@@ -3,6 +3,7 @@
 #include "OutputWindow.h"
 #include "Resource.h"
 #include "platform/win/Registry.h"
+#include "s/BrowserPreference.h"
 #include "s/Profile.h"
 #include "s/QueryDlg.h"
 
@@ -21,6 +22,7 @@ BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
     ON_WM_CREATE()
     ON_WM_CLOSE()
     ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
+    ON_COMMAND(ID_TOOLS_WEB_BROWSER, &CMainFrame::OnWebBrowser)
     ON_COMMAND(ID_HELP_FINDER, &CMDIFrameWnd::OnHelpFinder)
     ON_COMMAND(ID_HELP_SEARCH, &CMainFrame::OnHelpSearch)
 END_MESSAGE_MAP()
@@ -100,6 +102,11 @@ void CMainFrame::OnRunCommand() {
         m_lastCommand = command;
         COutputWindow::Run(command, this);
     }
+}
+
+void CMainFrame::OnWebBrowser() {
+    Gui_BrowserPreference preference;
+    preference.GetModalPreferenceDialog().DoModal();
 }
 
 void CMainFrame::OnHelpSearch() {
