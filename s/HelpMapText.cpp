@@ -142,6 +142,7 @@ public:
         }
         while (!m_chain.empty()) {
             if (readOn(m_chain.back()) == Stop::AtEnd) {
+                *m_chain.back().isBeingRead = false;
                 m_chain.pop_back();
             }
         }
@@ -152,7 +153,7 @@ private:
     /// A file that is being read: up to where, and the section that its lines belong to.
     struct Reading {
         const HelpMapFile* file;
-        std::string normalized;
+        bool* isBeingRead; ///< in the map's list of files
         const char* at;
         std::optional<std::size_t> section;
         const char* bodyStart = nullptr;
@@ -181,9 +182,9 @@ bool HelpMapText::Reader::open(const std::string& name) {
         text->erase(0, byteOrderMark.size());
     }
     const HelpMapFile& file = m_map.m_files.emplace_back(HelpMapFile{name, *std::move(text)});
-    std::string normalized = m_source.normalized(name);
-    m_map.m_read.insert(normalized);
-    m_chain.push_back({&file, std::move(normalized), file.text.data(), std::nullopt});
+    bool& isBeingRead = m_map.m_read[m_source.normalized(name)];
+    m_chain.push_back({&file, &isBeingRead, file.text.data(), std::nullopt});
+    isBeingRead = true;
     return true;
 }
 
@@ -250,15 +251,15 @@ bool HelpMapText::Reader::include(const HelpMapFile& file, std::string_view line
 }
 
 bool HelpMapText::Reader::includeFound(const HelpMapFile& file, std::string_view line, const std::string& found) {
-    const std::string normalized = m_source.normalized(found);
-    if (!m_map.m_read.contains(normalized)) {
+    const auto before = m_map.m_read.find(m_source.normalized(found));
+    if (before == m_map.m_read.end()) {
         const bool isOpen = open(found);
         if (!isOpen) {
             m_source.remark(HelpMapRemark::UnreadableFile, file, line, found);
         }
         return isOpen;
     }
-    if (std::ranges::find(m_chain, normalized, &Reading::normalized) != m_chain.end()) {
+    if (before->second) {
         m_source.remark(HelpMapRemark::IncludedWhileRead, file, line, found);
     }
     return false;

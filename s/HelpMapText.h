@@ -6,7 +6,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <unordered_set>
+#include <unordered_map>
 #include <vector>
 
 /// @file
@@ -137,6 +137,6 @@ private:
     std::deque<HelpMapFile> m_files;
     std::deque<std::string> m_keys; ///< those that their headers do not spell as they are
     std::vector<HelpMapSection> m_sections;
-    std::vector<Slot> m_slots;              ///< a hash table of the sections by their keys
-    std::unordered_set<std::string> m_read; ///< the normalised names of the files
+    std::vector<Slot> m_slots;                    ///< a hash table of the sections by their keys
+    std::unordered_map<std::string, bool> m_read; ///< by the normalised names of the files: whether one is being read
 };
