@@ -390,8 +390,9 @@ BENCHMARK(twoProcessesWriteWithTheDatabaseAlone)->Unit(benchmark::kMillisecond)-
 
 // --- the command of the desktop's default browser ---
 
-/// A desktop with one browser.
-void makeDesktop(const Folder& folder) {
+/// A desktop with one browser, the same for the whole run: its library reads the environment once.
+void useDesktop() {
+    static const Folder folder;
     const fs::path applications = fs::path(folder / "data") / "applications";
     fs::create_directories(applications);
     std::ofstream(applications / "x.desktop") << "[Desktop Entry]\nType=Application\nName=x\nExec=true %u\n"
@@ -418,8 +419,7 @@ bool readBrowser() {
 
 /// In a process that has asked the desktop nothing before: with the loading of its library and of all entries.
 void readBrowserFirst(benchmark::State& state) {
-    const Folder folder;
-    makeDesktop(folder);
+    useDesktop();
     for (auto _ : state) {
         std::array<int, 2> ends{};
         double seconds = -1;
@@ -445,8 +445,7 @@ void readBrowserFirst(benchmark::State& state) {
 BENCHMARK(readBrowserFirst)->Unit(benchmark::kMicrosecond)->UseManualTime();
 
 void readBrowserAgain(benchmark::State& state) {
-    const Folder folder;
-    makeDesktop(folder);
+    useDesktop();
     for (auto _ : state) {
         if (!readBrowser()) {
             state.SkipWithError("not read");
