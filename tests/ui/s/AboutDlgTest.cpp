@@ -3,7 +3,6 @@
 
 #include "res/resource.h"
 #include "s/ProductTexts.h"
-#include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 #include "tests/ui/s/WindowTestApp.h"
 #include "tests/unit/SavedEnvironment.h"
