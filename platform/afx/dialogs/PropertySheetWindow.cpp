@@ -6,6 +6,8 @@
 #include "platform/win/DialogTemplate.h"
 #include "platform/win/FrameworkIds.h"
 
+#include <QFontMetrics>
+
 #include <algorithm>
 #include <array>
 
@@ -109,7 +111,8 @@ void CPropertySheet::layOut() {
     int buttonsWidth = -gap;
     for (const int id : buttonIds) {
         if (Window* button = window.child(id)) {
-            buttons.emplace_back(button, std::max(units.width(), button->widget()->sizeHint().width()));
+            const QSize text = button->widget()->fontMetrics().size(Qt::TextShowMnemonic, button->text());
+            buttons.emplace_back(button, std::max(units.width(), text.width() + 2 * gap));
             buttonsWidth += buttons.back().second + gap;
         }
     }
