@@ -51,9 +51,10 @@ using LPSECURITY_ATTRIBUTES = struct SECURITY_ATTRIBUTES*;
 using PFILETIME = struct FILETIME*;
 
 /// The roots. They are always open and need not be closed.
-/// `HKEY_CLASSES_ROOT` is `Software\Classes` of the user, then of the machine, then what the desktop knows of the programs
-/// that open documents (docs/programs.md); `HKEY_LOCAL_MACHINE`, which can be read only, is the machine's settings, then
-/// what the desktop knows. Each value is that of the first source which has it; what is written goes into the first.
+/// `HKEY_CLASSES_ROOT` is `Software\Classes` of the user, then of the machine, then what the desktop knows of the
+/// programs that open documents (docs/programs.md); `HKEY_LOCAL_MACHINE`, which can be read only, is the machine's
+/// settings, then what the desktop knows. Each value is that of the first source which has it; what is written goes
+/// into the first.
 #define HKEY_CLASSES_ROOT (reinterpret_cast<HKEY>(std::uintptr_t{0x80000000}))
 #define HKEY_CURRENT_USER (reinterpret_cast<HKEY>(std::uintptr_t{0x80000001}))
 #define HKEY_LOCAL_MACHINE (reinterpret_cast<HKEY>(std::uintptr_t{0x80000002}))

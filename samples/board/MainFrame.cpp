@@ -121,7 +121,9 @@ void CMainFrame::OnHelpSearch() {
     query.SetAnswerFieldWidth(30);
     query.SetHelpId(HID_BASE_COMMAND + ID_HELP_SEARCH);
     if (query.DoModal() == IDOK) {
+        // Keywords begin with a capital letter in the board's help.
         m_lastKeyword = query.GetAnswer();
+        m_lastKeyword = m_lastKeyword.Left(1).MakeUpper() + m_lastKeyword.Mid(1);
         WinHelp(reinterpret_cast<DWORD_PTR>(m_lastKeyword.GetString()), HELP_KEY);
     }
 }

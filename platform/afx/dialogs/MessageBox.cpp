@@ -118,6 +118,9 @@ public:
         for (const BoxButton& button : buttonsOf(m_type)) {
             addButton(button);
         }
+        if ((m_type & MB_HELP) != 0) {
+            addHelpButton();
+        }
         layOut();
         setWindowModality(Qt::ApplicationModal);
         const QPointer<QWidget> before = QApplication::activeWindow();
@@ -223,6 +226,14 @@ private:
         if (answer == defaultOf(m_type).answer) {
             setDefaultButton(button);
         }
+    }
+
+    /// The one button that leaves the box open.
+    void addHelpButton() {
+        QPushButton* button = QMessageBox::addButton(ownText(TVX_IDS_HELP), QMessageBox::HelpRole);
+        QObject::disconnect(button, &QPushButton::clicked, nullptr, nullptr); // the toolkit would close the box
+        button->setAutoDefault(false);
+        connectStoring(button, &QPushButton::clicked, this, [this] { askForHelp(); });
     }
 
     void finish(int answer) {

@@ -20,6 +20,10 @@ protected:
             install(name);
         }
     }
+    void TearDown() override {
+        awaitReleased(); // they write into the folder that goes
+        NoProgramsTest::TearDown();
+    }
     /// A program that writes down its name, its arguments and where it runs.
     void install(const std::filesystem::path& name) const {
         std::filesystem::create_directories((m_folder / name).parent_path());

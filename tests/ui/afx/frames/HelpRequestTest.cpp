@@ -180,6 +180,17 @@ TEST_F(HelpRequest, AMessageBoxAsksForItsHelpIdElseForWhatItStandsOver) {
     helpInBox(texts);
     AfxMessageBox("No number");
     EXPECT_EQ(take(), context(HID_BASE_RESOURCE + IDR_TESTMAIN));
+    later([] {
+        auto* box = dynamic_cast<QMessageBox*>(QApplication::activeModalWidget());
+        ASSERT_NE(box, nullptr);
+        QAbstractButton* help = box->buttons().back();
+        EXPECT_EQ(help->text().remove('&'), "Help");
+        help->click();
+        EXPECT_TRUE(box->isVisible()) << "it stays open";
+        QTest::keyClick(box, Qt::Key_Escape);
+    });
+    EXPECT_EQ(AfxMessageBox("Really?", MB_OKCANCEL | MB_HELP, 42), IDCANCEL);
+    EXPECT_EQ(take(), context(HID_BASE_PROMPT + 42));
     KeysDialog dialog(AfxGetMainWnd());
     inDialog([&] {
         helpInBox(texts);
