@@ -218,6 +218,10 @@ TEST_F(Associations, FollowTheChoicesOfTheUser) {
         const std::string command = inChild([&] { return commandOf(row.extension); });
         EXPECT_EQ(command.substr(0, command.find(' ')), row.program) << row.what;
     }
+    setenv("XDG_CURRENT_DESKTOP", "Lathe:GNOME", 1);
+    choose("[Default Applications]\ntext/plain=other.desktop\n");
+    write("config/lathe-mimeapps.list", "[Default Applications]\ntext/plain=show.desktop\n");
+    EXPECT_EQ(inChild([] { return commandOf(".txt"); }), "show \"%1\"") << "the choice for this desktop";
 }
 
 TEST_F(Associations, ComeBehindWhatIsStored) {
