@@ -82,8 +82,16 @@ bool endsWithDocument(const Call& call) {
     return marks == 1 && call.words.back() == std::string(1, document);
 }
 
+/// Whether the document is but a part of a word: the name of a file has to be a word by itself to become one of the
+/// system's on its way to a child.
+bool isWithinWord(const Call& call) {
+    return std::ranges::any_of(call.words, [](const std::string& word) {
+        return word.size() > 1 && word.find(document) != std::string::npos;
+    });
+}
+
 bool needsHelper(const Call& call, Opens opens) {
-    if (anyHolds(call, '%') || opens == Opens::Papers) {
+    if (anyHolds(call, '%') || isWithinWord(call) || opens == Opens::Papers) {
         return true;
     }
     if (opens == Opens::Pages) {

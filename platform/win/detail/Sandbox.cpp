@@ -27,7 +27,9 @@ std::vector<fs::path> steps(const fs::path& file) {
     std::error_code error;
     for (int count = 0; count < mostLinks && fs::is_symlink(found.back(), error); ++count) {
         const fs::path target = fs::read_symlink(found.back(), error);
-        found.push_back((found.back().parent_path() / target).lexically_normal());
+        const fs::path folder =
+            fs::weakly_canonical(found.back().parent_path(), error); // "..", seen from a linked folder
+        found.push_back((folder / target).lexically_normal());
     }
     return found;
 }

@@ -2,6 +2,7 @@
 
 #include "platform/win/Pipe.h"
 #include "platform/win/Process.h"
+#include "platform/win/detail/ExecCommand.h"
 #include "tests/unit/SavedEnvironment.h"
 #include "tests/unit/win/RegistrySandbox.h"
 
@@ -166,7 +167,7 @@ TEST_F(Associations, AreTheCallsOfDesktopEntriesAsCommands) {
         {"show", ".htm", "@ --names show {} \"%1\"", "show\n[/x/a b]\n"},
         {"show %u", ".pdf", "@ show {} \"%1\"", "show\n[/x/a b]\n"},
         {"show", ".txt", "show \"%1\"", "show\n[a b]\n"},
-        {"show --x=%u", ".htm", "show \"--x=%1\"", "show\n[--x=a b]\n"},
+        {"show --x=%u", ".htm", "@ show --x={} \"%1\"", "show\n[--x=a b]\n"},
         {"show %i -n %c %k %v %u", ".htm", "show -n \"%1\"", "show\n[-n]\n[a b]\n"},
         {R"(show "a b" "" 'q"q' "\\$x\\\\" %u)", ".htm", R"(show "a b" "" "q\"q" $x\ "%1")",
          "show\n[a b]\n[]\n[q\"q]\n[$x\\]\n[a b]\n"},
@@ -185,6 +186,17 @@ TEST_F(Associations, AreTheCallsOfDesktopEntriesAsCommands) {
         const bool isHelped = row.arrived.find("/x/a") != std::string::npos;
         EXPECT_EQ(arrives(command, isHelped ? "/x/a b" : "a b"), row.arrived) << row.exec;
     }
+}
+
+TEST(AssociationCommands, AreThePlainOnesWithoutTheHelper) {
+    using tvx::win::commandFor;
+    using tvx::win::Opens;
+    EXPECT_EQ(commandFor({"show", "--x=%u\\"}, Opens::Pages, {}), R"(show "--x=%1\\")");
+    EXPECT_EQ(commandFor({"show"}, Opens::Pages, {}), "show \"%1\"");
+    EXPECT_EQ(commandFor({"show", "%F"}, Opens::Papers, {}), "show \"%1\"");
+    EXPECT_EQ(commandFor({"my show", "-a", "%f"}, Opens::TextsBehind, {}), "\"my show\" -a");
+    EXPECT_EQ(commandFor({"show", "%f", "-a"}, Opens::TextsBehind, {}), "") << "no place behind the name";
+    EXPECT_EQ(commandFor({"show", "100%%", "%f"}, Opens::Texts, {}), "") << "no marker but %1";
 }
 
 TEST_F(Associations, FollowTheChoicesOfTheUser) {
@@ -315,6 +327,7 @@ TEST_F(Associations, ReachTheirProgramsThroughTheHelper) {
     EXPECT_EQ(opened("evince", ".pdf", "C:" + docs + "\\a b.pdf#page=12"), page);
     EXPECT_EQ(opened("evince %f", ".pdf", "file:///C|" + docs + "/a%20b.pdf#page=12"), page);
     EXPECT_EQ(opened("show %f", ".htm", "file://" + docs + "/c.htm"), "show\n[" + docs + "/c.htm]\n");
+    EXPECT_EQ(opened("show --x=%u", ".htm", "file:///C|" + docs + "/c.htm"), "show\n[--x=file://" + docs + "/c.htm]\n");
     const std::string led = opened("show %f", ".htm", "file://" + docs + "/c.htm#s");
     EXPECT_TRUE(led.starts_with("show\n[" + (folder / "run/tvxopen/").string())) << led;
     EXPECT_EQ(opened("show %u", ".htm", "https://www.example.org/?a=1&b#s"),
