@@ -1,5 +1,6 @@
 #include "tools/open/Call.h"
 
+#include "platform/base/Address.h"
 #include "tools/open/Document.h"
 #include "tools/open/ForwardPage.h"
 #include "tools/open/Viewers.h"
@@ -52,7 +53,7 @@ Viewer viewerOf(const std::vector<std::string>& words) {
     return program.filename() == "flatpak" ? flatpakViewer(words, index) : Viewer{index, knownName(program)};
 }
 
-/// A flatpak takes the document in from behind this word only if it is an address, and only without a place.
+/// A flatpak takes the document in from behind this word only if it is an address.
 bool isForwarded(const std::vector<std::string>& words) {
     return std::ranges::find(words, "@@u") != words.end();
 }
@@ -93,11 +94,10 @@ PaperCall callFor(const Call& call, const Document& document) {
     if (!isPaper(document)) {
         return {document.isFile() ? pageFor(call, document) : document.text, {}, {}};
     }
-    if (!isForwarded(call.words)) {
-        return paperCall(document, viewerOf(call.words).name);
-    }
     PaperCall paper = paperCall(document, viewerOf(call.words).name);
-    paper.document = document.bareAddress();
+    if (isForwarded(call.words) && !tvx::isFileAddress(paper.document)) {
+        paper.document = document.bareAddress();
+    }
     return paper;
 }
 

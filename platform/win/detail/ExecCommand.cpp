@@ -7,6 +7,7 @@ namespace tvx::win {
 
 namespace {
 
+/// A word in quotes, as splitArguments() reads it.
 std::string inQuotes(const std::string& word) {
     std::string text = "\"";
     std::size_t backslashes = 0;
@@ -160,7 +161,8 @@ std::string commandFor(const std::vector<std::string>& words, Opens opens, const
     if (call.words.front().find_first_of(std::string_view("\"\0", 2)) != std::string::npos) {
         return {}; // no program has such a name
     }
-    if (needsHelper(call, opens) && !helper.empty()) {
+    const bool canHelp = !helper.empty() && helper.find('%') == std::string::npos;
+    if (needsHelper(call, opens) && canHelp) {
         return helpedCommand(call, opens, helper);
     }
     const bool isPlain = !anyHolds(call, '%') && (opens != Opens::TextsBehind || endsWithDocument(call));

@@ -87,6 +87,9 @@ TEST_F(Opening, TellsViewersThePlaceTheirWay) {
         {"viewer --in={}", "@/a.pdf#page=2", "viewer|--in=@/a.pdf"},
         {"flatpak run --branch=x org.gnome.Evince @@u {} @@", "@/a b.pdf#page=2",
          "flatpak|run|--branch=x|org.gnome.Evince|--page-index=2|@@u|file://@/a%20b.pdf|@@"},
+        {"flatpak run org.kde.okular @@u {} @@", "@/a.pdf#dest",
+         "flatpak|run|org.kde.okular|@@u|file://@/a.pdf#dest|@@"},
+        {"flatpak run org.x.qpdfview @@u {} @@", "@/a.pdf#page=2", "flatpak|run|org.x.qpdfview|@@u|file://@/a.pdf|@@"},
         {"flatpak run org.mozilla.firefox @@ {} @@", "@/a.pdf", "flatpak|run|org.mozilla.firefox|@@|@/a.pdf|@@"},
     };
     for (const auto& row : rows) {

@@ -9,6 +9,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdlib>
+#include <dlfcn.h>
 #include <filesystem>
 #include <fstream>
 #include <functional>
@@ -273,6 +274,21 @@ TEST_F(Associations, ComeBehindWhatIsStored) {
         return names;
     });
     EXPECT_EQ(listed, ".txt;") << "what the user has stored";
+}
+
+TEST_F(Associations, LoadTheDesktopsLibraryWhenTheyAreRead) {
+    const std::string loaded = inChild([] {
+        const auto isLoaded = [] { return dlopen("libgio-2.0.so.0", RTLD_NOW | RTLD_NOLOAD) ? "yes " : "no "; };
+        (void)valueOf(HKEY_CURRENT_USER, "Software");
+        (void)valueOf(HKEY_LOCAL_MACHINE, "Software");
+        (void)valueOf(HKEY_CLASSES_ROOT, ".brd");
+        std::string answers = isLoaded();
+        const TestKey key(".htm", TestKey::Way::Open, KEY_READ, HKEY_CLASSES_ROOT);
+        answers += isLoaded();
+        (void)key.read("");
+        return answers + isLoaded();
+    });
+    EXPECT_EQ(loaded, "no no yes ");
 }
 
 TEST_F(Associations, KnowTheGenericBrowsers) {
