@@ -50,6 +50,7 @@ bool readSwitches(std::vector<std::string>& words, opening::Call& call, int& cod
 /// Becomes the program. Comes back only when that fails.
 int become(std::vector<std::string> words) {
     std::vector<char*> arguments;
+    arguments.reserve(words.size() + 1);
     for (std::string& word : words) {
         arguments.push_back(word.data());
     }
