@@ -2,10 +2,12 @@
 //
 // The draining cases are pinned: writer and reader on one core ("same") or on two ("other"). Placement by the scheduler
 // moves the results by a factor of three.
+#include "afxwin.h"
 #include "bench/SystemCalls.h"
 #include "platform/win/Process.h"
 #include "platform/win/detail/ProcessObject.h"
 #include "platform/win/detail/RegistryStore.h"
+#include "s/BrowserHelp.h"
 #include "s/Process.h"
 #include "s/Profile.h"
 
@@ -16,6 +18,7 @@
 #include <cstring>
 #include <fcntl.h>
 #include <filesystem>
+#include <fstream>
 #include <functional>
 #include <memory>
 #include <poll.h>
@@ -114,15 +117,37 @@ void startToolkit(benchmark::State& state) {
 }
 BENCHMARK(startToolkit)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
-/// A browser opened on an address: the settings are looked into, the command line is put together, the program starts.
-void startWebBrowser(benchmark::State& state) {
+/// A settings store and an installation with help on one topic, in a folder of their own.
+class HelpInstallation {
+public:
+    HelpInstallation() {
+        std::string name = (std::filesystem::temp_directory_path() / "tvx-bench-help.XXXXXX").string();
+        m_folder = ::mkdtemp(name.data());
+        std::filesystem::create_directories(m_folder / "share/helpmap");
+        std::filesystem::create_directories(m_folder / "doc/usenglish");
+        std::ofstream(m_folder / "share/helpmap/bench.map") << "[topic 1001]\nfile = page.htm#part\n";
+        std::ofstream(m_folder / "doc/usenglish/page.htm") << "text";
+        ::setenv("TARVEX", m_folder.c_str(), 1);
+        ::setenv("TVX_REGISTRY", (m_folder / "registry.db").c_str(), 1);
+        Gui_Profile::WriteWebBrowserName("/bin/true --new \"%1\"");
+    }
+    ~HelpInstallation() {
+        tvx::registry::closeStores();
+        std::filesystem::remove_all(m_folder);
+    }
+    HelpInstallation(const HelpInstallation&) = delete;
+    HelpInstallation& operator=(const HelpInstallation&) = delete;
+
+private:
+    std::filesystem::path m_folder;
+};
+
+/// Measures a start until the browser runs; its end is awaited outside the measured time.
+void startBrowser(benchmark::State& state, const std::function<int()>& start) {
     growTo200Megabytes();
-    const std::filesystem::path store = std::filesystem::temp_directory_path() / "tvx-bench-browser.db";
-    ::setenv("TVX_REGISTRY", store.c_str(), 1);
-    Gui_Profile::WriteWebBrowserName("/bin/true --new \"%1\"");
     auto& released = tvx::win::ReleasedChildren::instance();
     for (auto _ : state) {
-        if (!Gui_Process().RunWebBrowser("file:///usr/share/doc/index.html", nullptr, 1, 5000)) {
+        if (!start()) {
             state.SkipWithError("the browser did not start");
         }
         state.PauseTiming();
@@ -132,10 +157,24 @@ void startWebBrowser(benchmark::State& state) {
         }
         state.ResumeTiming();
     }
-    tvx::registry::closeStores();
-    std::filesystem::remove(store);
+}
+
+/// A browser opened on an address: the settings are looked into, the command line is put together, the program starts.
+void startWebBrowser(benchmark::State& state) {
+    const HelpInstallation installation;
+    startBrowser(state,
+                 [] { return Gui_Process().RunWebBrowser("file:///usr/share/doc/index.html", nullptr, 1, 5000); });
 }
 BENCHMARK(startWebBrowser)->Unit(benchmark::kMicrosecond)->UseRealTime();
+
+/// A help request from the application's entry on: the record is looked up, the document located, the browser started.
+void startHelpRequest(benchmark::State& state) {
+    const HelpInstallation installation;
+    Gui_BrowserHelp help;
+    help.SetHelpMapFileName("bench.map");
+    startBrowser(state, [&help] { return help.BrowserHelp(1001, HELP_CONTEXT); });
+}
+BENCHMARK(startHelpRequest)->Unit(benchmark::kMicrosecond)->UseRealTime();
 
 // Draining 256 MiB. The range is 0 for small blocks ("head"), 1 for blocks of 1 MiB ("dd"), and 0 for one core, 1 for
 // two.

@@ -1,7 +1,7 @@
 #include "s/ProductTexts.h"
 
-#include "platform/port/Version.h"
 #include "res/resource.h"
+#include "s/InstalledValue.h"
 #include "s/Msg.h"
 #include "s/WinApp.h"
 
@@ -11,7 +11,7 @@ namespace {
 constexpr const char* copyrightNotice = "Copyright (c) 2026 Tarvex. All rights reserved.";
 
 CString releaseVersion() {
-    CString version = Port::Version::getValue("version").c_str();
+    CString version = InstalledValue("version").c_str();
     if (version.IsEmpty()) {
         version.LoadString(GUI_IDS_UNKNOWN_VERSION);
     }

@@ -105,9 +105,9 @@ drag() {
 }
 
 start "${drawings[@]}"
-await 'Board'
+await ' - Tarvex Board$' # not the splash window, which has the name alone
 main=$window
-picture start "The board with the drawings that were named on its command line."
+picture start "The board comes up behind its splash window, with the drawings that were named on its command line."
 
 xdotool key --clearmodifiers alt+w
 picture window-menu "The Window menu lists the open drawings."
@@ -135,7 +135,26 @@ await 'About'
 picture about "The About box."
 xdotool key Return
 
-timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
+again() {
+    timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
+}
+again
+xdotool key --clearmodifiers alt+h
+xdotool key s
+await '^Search Help$'
+xdotool type Drawing
+xdotool key Return
+await '^Topics Found$'
+picture topics "Help, Search found several pages about a keyword. The chosen one opens in the web browser."
+xdotool key Escape
+again
+xdotool key --clearmodifiers alt+t
+xdotool key w
+await '^Web Browser$'
+picture web-browser "Tools, Web Browser names another browser than the desktop's."
+xdotool key Escape
+
+again
 xdotool key --clearmodifiers alt+t
 xdotool key Return
 await '^Run Command$'
@@ -147,7 +166,7 @@ await '^seq '
 picture output "Its output appears in a window of its own, which tells how the program ended."
 xdotool key Escape
 
-timeout "$limit" xdotool windowactivate --sync "$main" || fail "the main window does not become active"
+again
 xdotool key --clearmodifiers alt+F4
 picture unsaved "Closing with changes asks first."
 xdotool key --clearmodifiers n

@@ -108,3 +108,16 @@ press F1
 opened "the browser that was named" other "file://$documents/board/drawing.html"
 press alt+F4
 await "the board ends" ended "$process"
+
+# Without an installation the board says so when help is asked for, and not before.
+unset TARVEX
+begin "plan.brd - Tarvex Board" "$program" "$drawing"
+active "$main" || fail "nothing stands before the board"
+press F1
+await "the missing package is told" titled '^Tarvex Board$'
+xdotool windowactivate --sync "$(window '^Tarvex Board$')"
+press Return
+await "once" untitled '^Tarvex Board$'
+xdotool windowactivate --sync "$main"
+press alt+F4
+await "the board without help ends" ended "$process"

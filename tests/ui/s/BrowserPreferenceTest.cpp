@@ -147,7 +147,8 @@ TEST_F(BrowserPreference, IsAskedForFirstWhereTheEnvironmentWantsThat) {
         return shown;
     };
     Gui_Profile::WriteWebBrowserName("none %1");
-    setenv("XDG_DATA_DIRS", folder.c_str(), 1); // no desktop that knows one
+    setenv("XDG_DATA_DIRS", folder.c_str(), 1); // no desktop that knows one,
+    setenv("PATH", folder.c_str(), 1);          // and no generic browser
     setenv("TVX_GUI_HTML_BROWSER_PATH", "", 1);
     BoxAnswer box;
     EXPECT_EQ(browse(Qt::Key_Escape), "none %1");
