@@ -1,25 +1,12 @@
 #include "s/HelpDocument.h"
 
+#include "platform/base/Address.h"
 #include "platform/port/File.h"
 #include "s/PDFProfile.h"
 
-#include <cstring>
+#include <string>
 
 namespace {
-
-/// @param special  printable characters that do not stand for themselves
-CString encoded(const CString& part, const char* special) {
-    CString text;
-    for (int i = 0; i < part.GetLength(); ++i) {
-        const auto byte = static_cast<unsigned char>(part[i]);
-        if (byte > ' ' && byte < 0x7F && !std::strchr(special, part[i])) {
-            text += part[i];
-        } else {
-            text.AppendFormat("%%%02X", byte);
-        }
-    }
-    return text;
-}
 
 /// Where the anchor of a document begins; its length when it has none. A "#" may also be part of a file's name.
 int anchorOf(const CString& document) {
@@ -31,9 +18,14 @@ int anchorOf(const CString& document) {
 
 CString FileAddressOf(const CString& document) {
     const int anchor = anchorOf(document);
-    const CString path = encoded(document.Left(anchor), "\"%#?<>\\^`{|}");
-    // Anchors are written in maps as in addresses: a percent sign is one.
-    return (path.Left(1) == "/" ? "file://" : "file:///") + path + encoded(document.Mid(anchor), "\"<>");
+    const std::string path = tvx::encodeAddress(document.Left(anchor).GetString());
+    const CString address = (path.starts_with('/') ? "file://" : "file:///") + CString(path.c_str());
+    if (anchor == document.GetLength()) {
+        return address;
+    }
+    // Maps write places as addresses do, where a percent sign begins a code.
+    const std::string place = tvx::decodeAddress(document.Mid(anchor + 1).GetString());
+    return address + "#" + tvx::encodeAddress(place).c_str();
 }
 
 CString ViewerArgumentOf(const CString& document) {
