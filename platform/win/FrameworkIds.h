@@ -244,6 +244,12 @@
 #define TVX_IDS_HELP 0xF341
 #define TVX_IDS_CLOSE 0xF342
 
+/* Dialogs of the system: there is help on them under these numbers, no template */
+#define AFX_IDD_FILEOPEN 28676
+#define AFX_IDD_FILESAVE 28677
+#define AFX_IDD_FONT 28678
+#define AFX_IDD_COLOR 28679
+
 /* The framework's own dialogs and controls */
 #define AFX_IDD_NEWTYPEDLG 30721
 #define AFX_IDC_LISTBOX 100

@@ -47,7 +47,7 @@ INT_PTR CColorDialog::DoModal() {
     if (!ensureGui()) {
         return IDCANCEL;
     }
-    ToolkitDialog<QColorDialog> dialog(m_cc.hwndOwner, TVX_IDS_COLOR);
+    ToolkitDialog<QColorDialog> dialog(m_cc.hwndOwner, TVX_IDS_COLOR, AFX_IDD_COLOR);
     for (int i = 0; i < customColors && m_cc.lpCustColors; ++i) {
         QColorDialog::setCustomColor(i, toColor(m_cc.lpCustColors[i]));
     }

@@ -67,7 +67,7 @@ QStringList filtersOf(LPCSTR text) {
 
 class Dialog : public ToolkitDialog<QFileDialog> {
 public:
-    Dialog(HWND owner, UINT title) : ToolkitDialog(owner, title) {
+    Dialog(HWND owner, UINT title, UINT help) : ToolkitDialog(owner, title, help) {
         showColumnsWhole();
     }
     std::function<bool()> isAccepted;
@@ -152,7 +152,8 @@ INT_PTR CFileDialog::DoModal() {
     if (!ensureGui()) {
         return IDCANCEL;
     }
-    Dialog dialog(m_ofn.hwndOwner, m_bOpenFileDialog ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE);
+    Dialog dialog(m_ofn.hwndOwner, m_bOpenFileDialog ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE,
+                  m_bOpenFileDialog ? AFX_IDD_FILEOPEN : AFX_IDD_FILESAVE);
     fillDialog(dialog, m_ofn, m_bOpenFileDialog != FALSE);
     dialog.isAccepted = [this, &dialog] {
         const auto filters = dialog.nameFilters();

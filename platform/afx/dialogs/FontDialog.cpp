@@ -69,7 +69,7 @@ INT_PTR CFontDialog::DoModal() {
     if (!ensureGui()) {
         return IDCANCEL;
     }
-    ToolkitDialog<QFontDialog> dialog(m_cf.hwndOwner, TVX_IDS_FONT);
+    ToolkitDialog<QFontDialog> dialog(m_cf.hwndOwner, TVX_IDS_FONT, AFX_IDD_FONT);
     dialog.setOption(QFontDialog::MonospacedFonts, (m_cf.Flags & CF_FIXEDPITCHONLY) != 0);
     const bool isGiven = (m_cf.Flags & CF_INITTOLOGFONTSTRUCT) != 0 && m_cf.lpLogFont;
     dialog.setCurrentFont(named(isGiven ? *m_cf.lpLogFont : pointFont(80, "")));

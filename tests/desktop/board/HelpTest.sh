@@ -44,6 +44,15 @@ id=$(sed -n 's/^DESKTOP_STARTUP_ID=//p' "$work/browser.env")
 [[ $id == *_TIME[1-9]* && $id != *_TIME1 ]] || fail "the browser got the start-up id \"$id\""
 ! grep -q '^XDG_ACTIVATION_TOKEN=' "$work/browser.env" || fail "the browser got the token of another start"
 
+press ctrl+o
+await "the file dialog appears" titled '^Open$'
+xdotool windowactivate --sync "$(window '^Open$')"
+press F1
+opened "a file dialog" browser "file://$documents/board/files.html#open"
+press Escape
+await "the file dialog is gone" untitled '^Open$'
+xdotool windowactivate --sync "$main"
+
 press alt+t
 press Return
 await "Run Command appears" titled '^Run Command$'

@@ -1,12 +1,14 @@
 #pragma once
 
 #include "platform/afx/core/App.h"
+#include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/dialogs/DialogWatch.h"
 
 #include <QDialog>
+#include <QKeyEvent>
 #include <QPushButton>
 
 namespace tvx::afx {
@@ -19,7 +21,8 @@ class ToolkitDialog : public Base {
 public:
     /// @param owner the window that it stands over; null: the main window
     /// @param title string resource of the caption
-    ToolkitDialog(HWND owner, UINT title) : Base(parentFor(owner)) {
+    /// @param help  number that help is asked for under, from FrameworkIds.h
+    ToolkitDialog(HWND owner, UINT title, UINT help) : Base(parentFor(owner)), m_owner(windowFor(owner)), m_help(help) {
         this->setOption(Base::DontUseNativeDialog);
         this->setWindowModality(Qt::ApplicationModal);
         this->setWindowTitle(ownText(title));
@@ -42,12 +45,31 @@ public:
         storing([&] { m_loop.end(result); });
     }
 
+protected:
+    /// Asked for before the key counts: the field for names takes all keys for itself.
+    bool event(QEvent* event) override {
+        if (event->type() == QEvent::ShortcutOverride) {
+            const auto& key = static_cast<const QKeyEvent&>(*event);
+            if (key.key() == Qt::Key_F1 && key.modifiers() == Qt::NoModifier && !key.isAutoRepeat()) {
+                event->accept();
+                requestHelp(m_owner, HID_BASE_RESOURCE + m_help);
+                return true;
+            }
+        }
+        return Base::event(event);
+    }
+
 private:
-    static QWidget* parentFor(HWND owner) {
+    static HWND windowFor(HWND owner) {
         const CWnd* main = AfxGetMainWnd();
-        Window* over = Window::from(owner || !main ? owner : main->m_hWnd);
+        return owner || !main ? owner : main->m_hWnd;
+    }
+    static QWidget* parentFor(HWND owner) {
+        Window* over = Window::from(windowFor(owner));
         return over ? over->topLevel()->widget() : nullptr;
     }
+    HWND m_owner;
+    UINT m_help;
     ModalLoop m_loop;
 };
 

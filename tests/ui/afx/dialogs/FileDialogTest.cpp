@@ -1,4 +1,5 @@
 #include "platform/afx/dialogs/FileDialog.h"
+#include "tests/ui/afx/TestApplication.h"
 #include "tests/ui/afx/frames/FrameTesting.h"
 
 #include <QComboBox>
@@ -54,6 +55,20 @@ TEST_F(FileDialogs, OpenAnswersTheParts) {
     POSITION at = dialog.GetStartPosition();
     EXPECT_EQ(dialog.GetNextPathName(at), dialog.GetPathName());
     EXPECT_EQ(at, nullptr);
+}
+
+TEST_F(FileDialogs, TheHelpKeyAsksForTheirPage) {
+    openNote();
+    for (const auto& [isOpen, number] : {std::pair(TRUE, AFX_IDD_FILEOPEN), std::pair(FALSE, AFX_IDD_FILESAVE)}) {
+        testApplication.help.clear();
+        later([] {
+            QTest::keyClick(shownDialog()->findChild<QLineEdit*>("fileNameEdit"), Qt::Key_F1);
+            QTest::keyClick(shownDialog(), Qt::Key_Escape);
+        });
+        CFileDialog(isOpen).DoModal();
+        const std::pair<DWORD_PTR, UINT> asked(HID_BASE_RESOURCE + number, HELP_CONTEXT);
+        EXPECT_EQ(testApplication.help, std::vector{asked});
+    }
 }
 
 TEST_F(FileDialogs, CancelChangesNothing) {
