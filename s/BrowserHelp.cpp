@@ -25,9 +25,10 @@ constexpr unsigned long startTimeout = 5000;
 
 // --- before a program comes up ---
 
-void cancelModesBelow(CWnd& window) {
-    window.SendMessage(WM_CANCELMODE);
-    window.SendMessageToDescendants(WM_CANCELMODE, 0, 0, TRUE, FALSE);
+void endModes(CFrameWnd& frame) {
+    frame.ExitHelpMode();
+    frame.SendMessage(WM_CANCELMODE);
+    frame.SendMessageToDescendants(WM_CANCELMODE, 0, 0, TRUE, FALSE);
 }
 
 /// Closes menus, ends help mode and capture, so that nothing holds mouse or keyboard while a browser comes up.
@@ -37,12 +38,10 @@ void prepare() {
     }
     CWnd* const main = AfxGetMainWnd();
     if (main && main->m_hWnd && main->IsFrameWnd()) {
-        auto& frame = static_cast<CFrameWnd&>(*main);
-        frame.ExitHelpMode();
-        cancelModesBelow(frame);
-        CFrameWnd* const top = frame.GetTopLevelFrame();
-        if (top && top != &frame) {
-            cancelModesBelow(*top);
+        endModes(static_cast<CFrameWnd&>(*main));
+        CFrameWnd* const top = main->GetTopLevelFrame();
+        if (top && top != main) {
+            endModes(*top);
         }
     }
     if (const HWND capture = ::GetCapture()) {

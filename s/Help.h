@@ -32,7 +32,8 @@ public:
     ///
     /// With a help map of that package, the application's help file becomes the map's name and requests are answered
     /// from it. Otherwise an installed help file of that name is taken.
-    /// @param name  the package, with or without the extension ".hlp" or ".map": "board"
+    /// @param name  the package with the extension ".map" or ".hlp", as in "board.map"; a name without one stays
+    ///              without, and Gui_WinApp then takes the help file for no map
     /// @return 1, or 0 when neither is installed; the name of the map is set all the same then
     static int SetHelpFileName(const char* name);
 };

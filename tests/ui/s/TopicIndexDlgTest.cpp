@@ -122,26 +122,29 @@ TEST_F(HelpForUser, SeveralTopicsAreOfferedAndTheChosenOneOpens) {
 TEST_F(HelpForUser, ARequestClosesMenusAndEndsHelpModeAndCapture) {
     auto* frame = new CFrameWnd;
     ASSERT_TRUE(frame->Create(nullptr, "Frame"));
-    CWnd child;
-    child.Create(nullptr, "", WS_CHILD | WS_VISIBLE, CRect(0, 0, 50, 50), frame, 1);
-    testApplication.m_pMainWnd = frame;
+    auto* inner = new CFrameWnd;
+    ASSERT_TRUE(inner->Create(nullptr, "", WS_CHILD | WS_VISIBLE, CRect(0, 0, 50, 50), frame));
     frame->ShowWindow(SW_SHOW);
-    frame->SendMessage(WM_COMMAND, ID_CONTEXT_HELP);
-    child.SetCapture();
     CMenu menu;
     menu.CreatePopupMenu();
     menu.AppendMenu(MF_STRING, 100, "Item");
-    BoxAnswer answer;
-    QTimer::singleShot(0, [&] {
-        ASSERT_NE(QApplication::activePopupWidget(), nullptr);
-        EXPECT_EQ(m_help.OnCommand(1), 1);
-        EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
-    });
-    menu.TrackPopupMenu(TPM_LEFTALIGN, 20, 20, frame);
-    EXPECT_EQ(answer.text, "Help not found for topic Help Context ID:  0x10001");
-    EXPECT_EQ(::GetCapture(), nullptr);
-    EXPECT_FALSE(frame->m_bHelpMode);
-    EXPECT_FALSE(testApplication.m_bHelpMode);
+    for (CFrameWnd* const main : {frame, inner}) {
+        testApplication.m_pMainWnd = main;
+        frame->SendMessage(WM_COMMAND, ID_CONTEXT_HELP);
+        EXPECT_TRUE(frame->m_bHelpMode);
+        inner->SetCapture();
+        BoxAnswer answer;
+        QTimer::singleShot(0, [&] {
+            ASSERT_NE(QApplication::activePopupWidget(), nullptr);
+            EXPECT_EQ(m_help.OnCommand(1), 1);
+            EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+        });
+        menu.TrackPopupMenu(TPM_LEFTALIGN, 20, 20, frame);
+        EXPECT_EQ(answer.text, "Help not found for topic Help Context ID:  0x10001");
+        EXPECT_EQ(::GetCapture(), nullptr);
+        EXPECT_FALSE(frame->m_bHelpMode) << "also when the main window stands in another frame";
+        EXPECT_FALSE(testApplication.m_bHelpMode);
+    }
     testApplication.m_pMainWnd = nullptr;
     frame->DestroyWindow();
 }
