@@ -45,8 +45,8 @@ int work(CPropertySheet& sheet, const std::function<void()>& script) {
 
 class BrowserPreference : public testing::Test {
 protected:
-    SavedEnvironment environment;
-    SettingsFolder settings;
+    SavedEnvironment m_environment;
+    SettingsFolder m_settings;
 };
 
 } // namespace

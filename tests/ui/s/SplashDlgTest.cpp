@@ -27,7 +27,7 @@ protected:
     void SetUp() override {
         windowTestApp.SetRegistryKey("Maker");
         windowTestApp.version = "1.2";
-        screen = CSize(GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN));
+        m_screen = CSize(GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN));
     }
     /// Remembers a main window that stood in a rectangle.
     static void save(const CRect& rect, UINT state = SW_SHOWNORMAL) {
@@ -38,7 +38,7 @@ protected:
         Gui_Profile::WriteWindowPlacement(placement, nullptr, nullptr);
     }
     CPoint centre() const {
-        return {(screen.cx - picture.cx) / 2, (screen.cy - picture.cy) / 2};
+        return {(m_screen.cx - picture.cx) / 2, (m_screen.cy - picture.cy) / 2};
     }
     /// Where the splash window comes up.
     static CRect shown() {
@@ -52,9 +52,9 @@ protected:
         return rect;
     }
 
-    SettingsFolder settings;
-    SavedEnvironment environment;
-    CSize screen;
+    SettingsFolder m_settings;
+    SavedEnvironment m_environment;
+    CSize m_screen;
 };
 
 /// The columns, first and last, that dark text takes in some rows of the picture, within its edges.
@@ -89,12 +89,14 @@ TEST_F(SplashDlg, StandsOverTheMiddleOfTheSavedWindow) {
         {window, SW_SHOWNORMAL, {60 + 441 / 2 - 166, 250 + 225 - 130}},
         {window, SW_SHOWMINIMIZED, centre()},
         {window, SW_SHOWMAXIMIZED, centre()},
-        {{-300, 250, 100, 700}, SW_SHOWNORMAL, centre()},                                  // left of the screen
-        {{60, -200, 501, 200}, SW_SHOWNORMAL, centre()},                                   // above it
-        {{screen.cx, 250, screen.cx + 332, 700}, SW_SHOWNORMAL, centre()},                 // at its right edge
-        {{60, screen.cy + 35, 501, screen.cy + 225}, SW_SHOWNORMAL, centre()},             // at its lower edge
-        {{screen.cx - 1, 250, screen.cx + 331, 510}, SW_SHOWNORMAL, {screen.cx - 1, 250}}, // before its right edge
-        {{60, screen.cy - 1, 392, screen.cy + 259}, SW_SHOWNORMAL, {60, screen.cy - 1}},   // before its lower edge
+        {{-300, 250, 100, 700}, SW_SHOWNORMAL, centre()},                          // left of the screen
+        {{60, -200, 501, 200}, SW_SHOWNORMAL, centre()},                           // above it
+        {{m_screen.cx, 250, m_screen.cx + 332, 700}, SW_SHOWNORMAL, centre()},     // at its right edge
+        {{60, m_screen.cy + 35, 501, m_screen.cy + 225}, SW_SHOWNORMAL, centre()}, // at its lower edge
+        {{m_screen.cx - 1, 250, m_screen.cx + 331, 510},
+         SW_SHOWNORMAL,
+         {m_screen.cx - 1, 250}},                                                              // before its right edge
+        {{60, m_screen.cy - 1, 392, m_screen.cy + 259}, SW_SHOWNORMAL, {60, m_screen.cy - 1}}, // before its lower edge
         {{-1, 0, 331, 260}, SW_SHOWNORMAL, centre()},
         {{0, 1, 332, 261}, SW_SHOWNORMAL, {0, 1}},
     };

@@ -2,8 +2,10 @@
 #include "s/TopicIndexDlg.h"
 
 #include "s/BrowserHelp.h"
+#include "s/Profile.h"
 #include "tests/ui/afx/TestApplication.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
+#include "tests/unit/SavedEnvironment.h"
 #include "tests/unit/s/StoreTest.h"
 
 #include <QAbstractScrollArea>
@@ -79,19 +81,8 @@ protected:
         std::ofstream(browser) << "#!/bin/sh\necho \"$1\" >" << record().string() << ".new\nmv " << record().string()
                                << ".new " << record().string() << "\n";
         fs::permissions(browser, fs::perms::owner_all);
-        HKEY key = nullptr;
-        RegCreateKeyExA(HKEY_CURRENT_USER, "Software\\Tarvex\\Common", 0, nullptr, 0, KEY_WRITE, nullptr, &key,
-                        nullptr);
-        const std::string command = browser.string();
-        RegSetValueExA(key, "Browser", 0, REG_SZ, reinterpret_cast<const BYTE*>(command.c_str()),
-                       static_cast<DWORD>(command.size() + 1));
-        RegCloseKey(key);
+        Gui_Profile::WriteWebBrowserName(browser.c_str());
         ASSERT_EQ(m_help.SetHelpMapFileName("test.map"), 1);
-    }
-    void TearDown() override {
-        unsetenv("TARVEX");
-        unsetenv("TVX_GUI_HELP_WEB_LOCATION");
-        StoreTest::TearDown();
     }
     [[nodiscard]] fs::path record() const {
         return m_folder / "record";
@@ -99,6 +90,7 @@ protected:
     int help(const char* keyword) {
         return m_help.BrowserHelp(reinterpret_cast<unsigned long>(keyword), HELP_KEY);
     }
+    const SavedEnvironment m_environment;
     Gui_BrowserHelp m_help;
 };
 

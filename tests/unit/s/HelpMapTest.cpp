@@ -301,12 +301,4 @@ TEST_F(HelpMap, AsksForTheWebLocationInOrder) {
     EXPECT_EQ(context(1), "https://package/a.htm url");
 }
 
-TEST_F(HelpMap, BelongsToAPackage) {
-    EXPECT_TRUE(GetMapFileForPackage("test").IsEmpty());
-    const std::string name = makeMap("test.map", "");
-    EXPECT_EQ(GetMapFileForPackage("test").str(), name);
-    EXPECT_TRUE(m_map.Read(GetMapFileForPackage("test")));
-    EXPECT_TRUE(m_map.IsLoaded(name));
-}
-
 } // namespace

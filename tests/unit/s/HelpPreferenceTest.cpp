@@ -1,40 +1,31 @@
 #include "s/HelpPreference.h"
 
+#include "NoProgramsTest.h"
+#include "TestApp.h"
 #include "s/Profile.h"
-#include "tests/unit/SavedEnvironment.h"
-#include "tests/unit/s/StoreTest.h"
-#include "tests/unit/s/TestApp.h"
 
 namespace {
 
 /// The application's registry key is "Maker" and its title "Drafts".
-class HelpPreference : public StoreTest {
+class HelpPreference : public NoProgramsTest {
 protected:
     void SetUp() override {
-        StoreTest::SetUp();
+        NoProgramsTest::SetUp();
         ::unsetenv("TVX_GUI_HELP_ALWAYS_TO_WEB");
         ::unsetenv("TVX_GUI_HELP_WEB_LOCATION");
         theApp.SetRegistryKey("Maker");
     }
-    static void store(const char* entry, const char* value) {
-        HKEY key = nullptr;
-        RegCreateKeyExA(HKEY_CURRENT_USER, "Software\\Maker\\Common\\Settings", 0, nullptr, 0, KEY_WRITE, nullptr, &key,
-                        nullptr);
-        RegSetValueExA(key, entry, 0, REG_SZ, reinterpret_cast<const BYTE*>(value),
-                       static_cast<DWORD>(std::string(value).size() + 1));
-        RegCloseKey(key);
-    }
 
-    const SavedEnvironment m_environment;
+    inline static const char* const settings = "Software\\Maker\\Common\\Settings";
     Gui_HelpPreference m_preference;
 };
 
 TEST_F(HelpPreference, GoesToTheWebWhenTheSettingIsOne) {
     EXPECT_FALSE(m_preference.IsAlwaysGoToWeb());
-    EXPECT_EQ(stored("Software\\Maker\\Common\\Settings", "AlwayOnWeb"), "<no key>") << "asking makes nothing";
+    EXPECT_EQ(stored(settings, "AlwayOnWeb"), "<no key>") << "asking makes nothing";
     for (const auto& [value, expected] : std::vector<std::pair<const char*, bool>>{
              {"1", true}, {"01", true}, {" 1", true}, {"2", false}, {"yes", false}, {"1 ", false}, {"", false}}) {
-        store("AlwayOnWeb", value);
+        store(settings, "AlwayOnWeb", value);
         EXPECT_EQ(m_preference.IsAlwaysGoToWeb(), expected) << '"' << value << '"';
     }
     Gui_Profile::WriteString("1", "AlwayOnWeb", nullptr);
@@ -45,7 +36,7 @@ TEST_F(HelpPreference, GoesToTheWebWhenTheSettingIsOne) {
 
 TEST_F(HelpPreference, TakesTheLocationFromEnvironmentAndSettings) {
     EXPECT_TRUE(m_preference.GetUrlPrefix().IsEmpty());
-    store("HelpUrlPrefix", "https://docs/a");
+    store(settings, "HelpUrlPrefix", "https://docs/a");
     EXPECT_EQ(m_preference.GetUrlPrefix().str(), "https://docs/a") << "as it is, without a slash of ours";
     ::setenv("TVX_GUI_HELP_WEB_LOCATION", "https://other/", 1);
     EXPECT_EQ(m_preference.GetUrlPrefix().str(), "https://other/");

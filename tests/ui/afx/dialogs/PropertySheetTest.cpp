@@ -1,6 +1,7 @@
 // Property sheets as a user meets them: tabs, keys, buttons, and what the pages are told.
 #include "platform/afx/dialogs/PropertySheet.h"
 
+#include "platform/afx/frames/Frame.h"
 #include "platform/win/FrameworkIds.h"
 #include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/TestApplication.h"
@@ -12,6 +13,7 @@
 
 #include <functional>
 #include <string>
+#include <utility>
 
 namespace {
 
