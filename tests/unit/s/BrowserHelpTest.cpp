@@ -99,6 +99,9 @@ TEST_F(BrowserHelpTest, OpensTheDocumentOfEachKindOfRequest) {
     EXPECT_EQ(opened(), "browser|file://@contents.htm");
     EXPECT_EQ(m_help.HelpForMapRecordKey("dialog  12"), 1);
     EXPECT_EQ(opened(), "browser|file://@c.htm");
+    setenv("TARVEX", ("C:" + root().string()).c_str(), 1);
+    EXPECT_EQ(m_help.BrowserHelp(1001, HELP_CONTEXT), 1);
+    EXPECT_EQ(opened(), "browser|file://@a.htm") << "the drive is left out on the way to the program";
     m_help.DisplayFailureOnHelp();
     EXPECT_EQ(boxes(), "");
 }
@@ -238,21 +241,23 @@ TEST_F(ApplicationHelp, TheHelpFileIsTheMapElseAnInstalledHelpFileElseTheMapsNam
 
 TEST_F(ApplicationHelp, RequestsReachTheMapByTheApplicationsEntry) {
     Gui_Help::SetHelpFileName("test.hlp");
-    const std::pair<void (*)(unsigned int), const char*> entries[] = {{&Gui_Help::OnCommand, "@b.htm#part"},
-                                                                      {&Gui_Help::OnDialog, "@two%20words.htm#x%20y"},
-                                                                      {&Gui_Help::OnPrompt, "@50%25%C3%A4%221.htm"},
-                                                                      {&Gui_Help::OnContents, "@contents.htm"}};
-    const unsigned int ids[] = {100, 20002, 40, 99};
-    for (std::size_t i = 0; i < std::size(entries); ++i) {
-        entries[i].first(ids[i]);
-        EXPECT_EQ(opened(), std::string("browser|file://") + entries[i].second);
+    const struct {
+        void (*ask)(unsigned int);
+        unsigned int id;
+        const char* opened;
+    } entries[] = {
+        {&Gui_Help::OnCommand, 100, "browser|file://@b.htm#part"},
+        {&Gui_Help::OnDialog, 20002, "browser|file://@two%20words.htm#x%20y"},
+        {&Gui_Help::OnPrompt, 40, "browser|file://@50%25%C3%A4%221.htm"},
+        {&Gui_Help::OnFrameControl, 1, "browser|https://web/missing.htm"},
+        {&Gui_Help::OnContents, 99, "browser|file://@contents.htm"},
+    };
+    for (const auto& [ask, id, expected] : entries) {
+        ask(id);
+        EXPECT_EQ(opened(), expected);
     }
-    Gui_Help::OnFrameControl(1);
-    EXPECT_EQ(opened(), "browser|https://web/missing.htm");
     theApp.WinHelpInternal(1001);
     EXPECT_EQ(opened(), "browser|file://@a.htm");
-    fs::rename(root() / "share/helpmap/test.map", root() / "share/helpmap/capital.map");
-    Gui_Help::SetHelpFileName("capital");
     free(const_cast<char*>(std::exchange(theApp.m_pszHelpFilePath, strdup("x/capital.MAP"))));
     theApp.WinHelp(1001);
     EXPECT_NE(boxes().find("x/capital.MAP : Help file for this package was not installed"), std::string::npos)
