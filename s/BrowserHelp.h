@@ -36,9 +36,8 @@ public:
     /// Answers one request of the framework.
     /// @param dwData  for HELP_CONTEXT the context, 0x20080 for the contents page; for HELP_KEY the address of the
     ///                keyword, 0 for none; else nothing
-    /// @param nCmd    HELP_CONTEXT (the first document of the record), HELP_CONTENTS or HELP_FINDER (the contents
-    /// page),
-    ///                HELP_KEY (a choice where there are several); anything else is not found
+    /// @param nCmd    HELP_CONTEXT: the first document of the record; HELP_CONTENTS or HELP_FINDER: the contents page;
+    ///                HELP_KEY: a choice where there are several; anything else is not found
     /// @return 0 when there is no map or no browser could be started, else 1: also when there is no help for it or the
     ///         user has chosen nothing
     int BrowserHelp(unsigned long dwData, unsigned int nCmd);

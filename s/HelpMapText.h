@@ -32,8 +32,8 @@ struct HelpMapEntry {
 /// A section whose lines count.
 struct HelpMapSection {
     std::string_view key;
-    std::string_view
-        body; ///< its lines, from behind its header up to the next one; includes among them are to be skipped
+    /// Its lines, from behind its header up to the next one. Includes among them are to be skipped.
+    std::string_view body;
 };
 
 /// A file that has been read.

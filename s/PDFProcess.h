@@ -17,9 +17,8 @@ public:
     ~Gui_PDFProcess() override;
 
     /// Opens a document in the PDF viewer. Sets the release policy to `LeaveRunning` with exit code 0.
-    /// @param fileName   put into the viewer's command line as it is, an anchor such as "#page=12" included: a name
-    /// with
-    ///                   blanks needs quotes, there or here
+    /// @param fileName   put into the viewer's command line as it is, with an anchor such as "#page=12"; where it has
+    ///                   blanks it needs quotes, there or here
     /// @param directory  where the viewer starts; null is the current directory
     /// @param wait       non-zero: as RunWaitForWindow, 0: as Run
     /// @param timeout    that of RunWaitForWindow

@@ -18,9 +18,8 @@ class GUI_API Gui_TopicIndexDlg : public CDialog {
 public:
     using Strings = std::vector<Port::StringBase<char>>;
 
-    /// @param files, titles  of the record; they must live as long as the dialog. The n-th title belongs to the n-th
-    /// file,
-    ///                       and a title without a file is not offered
+    /// The n-th title belongs to the n-th file; a title without a file is not offered.
+    /// @param files, titles  of the record; they must live as long as the dialog
     /// @param parent         the window to stand over; null for the application's main window
     Gui_TopicIndexDlg(const Strings& files, const Strings& titles, CWnd* parent);
 

@@ -12,11 +12,10 @@ namespace tvx {
 
 /// Why a program cannot open a document, empty when nothing speaks against it.
 ///
-/// | answer | the program |
-/// |---|---|
-/// | "snap" | runs in the sandbox of a snap, which sees the user's files outside of hidden folders, removable media and
-/// /usr/share/doc | | "flatpak" | runs in the sandbox of a flatpak, which sees the folders that its permissions name,
-/// never /usr | | "files only" | takes names of files only, and the document is a web address |
+/// - "snap": it runs in the sandbox of a snap, which sees the user's files outside of hidden folders, removable media
+///   and /usr/share/doc
+/// - "flatpak": it runs in the sandbox of a flatpak, which sees the folders that its permissions name, never /usr
+/// - "files only": it takes names of files only, and the document is a web address
 ///
 /// A program that is missing has no obstacle: starting it says what is wrong. Links, Debian's alternatives, `env`,
 /// `sensible-browser` and start scripts of sandboxed programs are looked through.
