@@ -19,13 +19,13 @@ int anchorOf(const CString& document) {
 CString FileAddressOf(const CString& document) {
     const int anchor = anchorOf(document);
     const std::string path = tvx::encodeAddress(document.Left(anchor).GetString());
-    const CString address = (path.starts_with('/') ? "file://" : "file:///") + CString(path.c_str());
-    if (anchor == document.GetLength()) {
-        return address;
+    CString address = (path.starts_with('/') ? "file://" : "file:///") + CString(path.c_str());
+    if (anchor < document.GetLength()) {
+        // Maps write places as addresses do, where a percent sign begins a code.
+        const std::string place = tvx::decodeAddress(document.Mid(anchor + 1).GetString());
+        address += "#" + CString(tvx::encodeAddress(place).c_str());
     }
-    // Maps write places as addresses do, where a percent sign begins a code.
-    const std::string place = tvx::decodeAddress(document.Mid(anchor + 1).GetString());
-    return address + "#" + tvx::encodeAddress(place).c_str();
+    return address;
 }
 
 CString ViewerArgumentOf(const CString& document) {
