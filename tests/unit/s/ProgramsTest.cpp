@@ -75,9 +75,9 @@ TEST_F(WebBrowser, RunsOnInTheFolderAskedForAndIsNotHeld) {
     Gui_Profile::WriteWebBrowserName("browser");
     Gui_Process busy;
     ASSERT_EQ(busy.Run("/bin/sleep 1000", nullptr, 0, 0), 1);
-    EXPECT_EQ(busy.RunWebBrowser("a", "/", 0, 0), 1) << "the object has no part in it";
+    EXPECT_EQ(busy.RunWebBrowser("a", "/usr", 0, 0), 1) << "the object has no part in it";
     EXPECT_EQ(busy.IsActive(), 1);
-    EXPECT_EQ(started(), "browser|a|/\n");
+    EXPECT_EQ(started(), "browser|a|/usr\n");
     busy.Release();
     awaitReleased();
     EXPECT_FALSE(hasChildren());
@@ -181,9 +181,9 @@ using TextEditor = ProgramsTest;
 TEST_F(TextEditor, GetsTheFileBehindItsCommandLineAndIsHeld) {
     Gui_Profile::WriteTextEditorName("browser \"%1\"");
     Gui_Process editor;
-    EXPECT_EQ(editor.RunTextEditor("\"a b.txt\"", "/", 1, 5000), 1);
+    EXPECT_EQ(editor.RunTextEditor("\"a b.txt\"", "/usr", 1, 5000), 1);
     EXPECT_EQ(editor.Wait(0xFFFFFFFF), 0u);
-    EXPECT_EQ(started(), "browser|%1|a b.txt|/\n");
+    EXPECT_EQ(started(), "browser|%1|a b.txt|/usr\n");
     EXPECT_EQ(editor.RunTextEditor("b.txt", nullptr, 0, 0), 0) << "it holds one already";
     EXPECT_EQ(editor.GetError(), 0u);
     editor.Release();
@@ -258,10 +258,10 @@ TEST_F(PDFViewer, GetsTheDocumentWithItsAnchorAndIsLeftRunning) {
     Gui_PDFProfile::WritePDFViewerName("\t browser -p \"%1\" ");
     for (const int wait : {0, 1}) {
         Gui_PDFProcess process;
-        EXPECT_EQ(process.RunPDFReader("/a b.pdf#page=2", "/", wait, 5000), 1);
+        EXPECT_EQ(process.RunPDFReader("/a b.pdf#page=2", "/usr", wait, 5000), 1);
         EXPECT_EQ(process.RunPDFReader("/c.pdf", nullptr, wait, 5000), 0) << "it holds one already";
         process.Release();
-        EXPECT_EQ(started(), "browser|-p|/a b.pdf#page=2|/\n");
+        EXPECT_EQ(started(), "browser|-p|/a b.pdf#page=2|/usr\n");
     }
     Gui_PDFProfile::WritePDFViewerName("browser");
     EXPECT_EQ(Gui_PDFProcess().RunPDFReader("/a b.pdf", nullptr, 0, 0), 1);
