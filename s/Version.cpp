@@ -6,6 +6,8 @@
 #include "platform/port/MsgManData.h"
 #include "platform/port/Str.h"
 #include "platform/port/Time.h"
+#include "platform/port/Version.h"
+#include "s/InstalledValue.h"
 #include "s/MessageOrigin.h"
 
 #include <algorithm>
@@ -200,7 +202,16 @@ private:
 
 Values s_values;
 
+bool hasFileBelow(const char* variable) {
+    const char* const root = rootIn(variable);
+    return root && Port::File::canread((std::string(root) + "/" + fileName).c_str());
+}
+
 } // namespace
+
+Port::StringBase<char> InstalledValue(const char* key) {
+    return hasFileBelow("MYTARVEX") || hasFileBelow("TARVEX") ? Port::Version::getValue(key) : Port::StringBase<char>();
+}
 
 const char* Gui_InstallInfo::GetValue(const char* key) {
     const char* value = nullptr;
