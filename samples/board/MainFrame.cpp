@@ -120,7 +120,7 @@ void CMainFrame::OnHelpSearch() {
     query.SetAnswer(m_lastKeyword);
     query.SetAnswerFieldWidth(30);
     query.SetHelpId(HID_BASE_COMMAND + ID_HELP_SEARCH);
-    if (query.DoModal() == IDOK) {
+    if (query.DoModal() == IDOK && !query.GetAnswer().IsEmpty()) {
         // Keywords begin with a capital letter in the board's help.
         m_lastKeyword = query.GetAnswer();
         m_lastKeyword = m_lastKeyword.Left(1).MakeUpper() + m_lastKeyword.Mid(1);

@@ -2,10 +2,12 @@
 
 #include "platform/base/Text.h"
 #include "platform/port/FileName.h"
+#include "platform/win/FrameworkIds.h"
 #include "s/HelpMapText.h"
 #include "tools/helpmapcheck/Documents.h"
 
 #include <algorithm>
+#include <cstdlib>
 #include <unordered_map>
 #include <utility>
 
@@ -67,6 +69,18 @@ bool isHexNumber(std::string_view text) {
 
 /// Why no help request asks for a key; empty when one may. An application can ask for any key by its text, so only keys
 /// count that are written as another kind of request, and those that no text can be.
+/// The number that the framework asks for in the place of a command's, 0 where it asks for the command's.
+unsigned long askedInstead(std::string_view number) {
+    constexpr unsigned long commands = 0x10000;
+    constexpr unsigned long systemFirst = 0xF000;
+    const unsigned long command =
+        isNumber(number) ? std::strtoul(std::string(number).c_str(), nullptr, 10) - commands : 0;
+    if (command >= systemFirst && command < 0xF1F0) {
+        return commands + AFX_IDS_SCFIRST + (command - systemFirst) / 16;
+    }
+    return command >= AFX_IDM_FIRST_MDICHILD && command <= 0xFFFF ? commands + AFX_IDS_MDICHILD : 0;
+}
+
 std::string whyUnreachable(std::string_view key) {
     constexpr std::string_view topic = "topic ";
     constexpr std::string_view highest = "4294967295";
@@ -88,6 +102,9 @@ std::string whyUnreachable(std::string_view key) {
     }
     if (isNumber(number) && (number.size() > highest.size() || (number.size() == highest.size() && number > highest))) {
         return shown(key) + ": the highest context number is " + std::string(highest);
+    }
+    if (const unsigned long instead = askedInstead(number); instead != 0) {
+        return shown(key) + ": menus of windows and their lists ask for " + std::to_string(instead);
     }
     return {};
 }

@@ -3,6 +3,7 @@
 #include "platform/afx/core/AskedFor.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/HelpRequest.h"
+#include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -153,7 +154,7 @@ protected:
             finish(escapeAnswer(m_type));
             return;
         }
-        if (event->key() == Qt::Key_F1 && event->modifiers() == Qt::NoModifier && !event->isAutoRepeat()) {
+        if (event->key() == Qt::Key_F1 && event->modifiers() == Qt::NoModifier && !isRepeated(*event)) {
             askForHelp();
             return;
         }

@@ -40,6 +40,10 @@ TEST_F(BoardHelp, HasAPageForEachCommandOfItsMenus) {
         expectTopics(menu);
     }
     EXPECT_GT(m_commands, 50);
+    for (const UINT prompt : {AFX_IDS_SCSIZE, AFX_IDS_SCMOVE, AFX_IDS_SCMINIMIZE, AFX_IDS_SCMAXIMIZE, AFX_IDS_SCCLOSE,
+                              AFX_IDS_SCRESTORE, AFX_IDS_MDICHILD}) {
+        expectTopic(HID_BASE_COMMAND + prompt);
+    }
 }
 
 TEST_F(BoardHelp, HasAPageForEachDialogAndTheDrawingsWindow) {

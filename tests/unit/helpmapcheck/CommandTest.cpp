@@ -75,12 +75,14 @@ TEST_F(HelpMapCheck, FindsWhatIsWrongInAMap) {
          "p.map:9: line: the type was \"x\" before\n",
          "lines"},
         {"[topic 007]\nfile=a.htm\n[topic 4294967296]\nfile=a.htm\n[topic 0x10064]\nfile=a.htm\n[topic 0]\nfile=a.htm\n"
-         "[]\nfile=a.htm\n",
+         "[]\nfile=a.htm\n[topic 126976]\nfile=a.htm\n[topic 130817]\nfile=a.htm\n",
          "p.map:1: unreachable: \"topic 007\": context numbers are written without zeros before them\n"
          "p.map:3: unreachable: \"topic 4294967296\": the highest context number is 4294967295\n"
          "p.map:5: unreachable: \"topic 0x10064\": context numbers are written in decimal digits\n"
          "p.map:7: unreachable: \"topic 0\": the context 0 is \"topic contents\"\n"
-         "p.map:9: unreachable: a header without words\n",
+         "p.map:9: unreachable: a header without words\n"
+         "p.map:11: unreachable: \"topic 126976\": menus of windows and their lists ask for 126720\n"
+         "p.map:13: unreachable: \"topic 130817\": menus of windows and their lists ask for 126751\n",
          "keys that no request asks for"},
         {"#include q\r[topic 1]\rfile=a.htm\r[topic  1]\rnonsense\r[topic 2]\rfile=x\r",
          "p.map:4: duplicate: \"topic 1\" is ignored, the first is at p.map:2\n"

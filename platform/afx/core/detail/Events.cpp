@@ -461,6 +461,7 @@ void watchKeys(const QEvent& event) {
             noteKey(modifier, false);
         }
     }
+    noteTime(key);
     if (down || !key.isAutoRepeat()) {
         noteKey(virtualKey(key), down);
     }

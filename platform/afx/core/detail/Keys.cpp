@@ -121,6 +121,14 @@ int keypadKey(int key) {
 /// The lock keys as they were when somebody asked last; empty since the keyboard was used again.
 std::optional<KeyLocks> knownLocks;
 
+struct KeyTime {
+    int key = 0;
+    quint64 time = 0;
+    bool operator==(const KeyTime&) const = default;
+};
+KeyTime lastRelease; ///< nothing when it came with its press, as programs send keys
+KeyTime lastPress;
+
 std::bitset<256>& keysDown() {
     static std::bitset<256> keys;
     return keys;
@@ -170,7 +178,7 @@ LPARAM keyParameter(const QKeyEvent& event, bool released) {
     if (event.modifiers().testFlag(Qt::AltModifier)) {
         value |= 1U << 29;
     }
-    if (released || event.isAutoRepeat()) {
+    if (released || isRepeated(event)) {
         value |= 1U << 30; // the key was down before
     }
     if (released) {
@@ -193,6 +201,22 @@ void noteKey(int virtualKey, bool down) {
     knownLocks.reset();
     if (virtualKey > 0 && virtualKey < 256) {
         keysDown().set(static_cast<std::size_t>(virtualKey), down);
+    }
+}
+
+// A held key comes as releases and presses of the same time. The toolkit calls a press repeated when it finds it in its
+// queue behind the release, which is chance in an application that waits for events.
+bool isRepeated(const QKeyEvent& event) {
+    const KeyTime now{event.key(), event.timestamp()};
+    return event.isAutoRepeat() || (now.time != 0 && now == lastRelease);
+}
+
+void noteTime(const QKeyEvent& event) {
+    const KeyTime now{event.key(), event.timestamp()};
+    if (event.type() == QEvent::KeyPress) {
+        lastPress = now;
+    } else {
+        lastRelease = now == lastPress ? KeyTime() : now;
     }
 }
 

@@ -21,6 +21,10 @@ LPARAM keyParameter(const QKeyEvent& event, bool released);
 TVX_PLATFORM_API WPARAM buttonFlags(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers);
 /// Keeps track of the keys that are down; called for every key event.
 void noteKey(int virtualKey, bool down);
+/// Whether a press repeats one that lasts.
+bool isRepeated(const QKeyEvent& event);
+/// Keeps in mind when a key went down or up; called for every key event before it is delivered.
+void noteTime(const QKeyEvent& event);
 /// Forgets all keys; called when the application loses the keyboard, since releases are not seen from then on.
 void forgetKeys();
 TVX_PLATFORM_API bool isKeyDown(int virtualKey);

@@ -5,6 +5,7 @@
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/HelpRequest.h"
+#include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -146,13 +147,14 @@ void PopupMenu::hovered(QAction* action) {
 }
 
 void PopupMenu::keyPressEvent(QKeyEvent* event) {
-    const QAction* action = activeAction();
-    if (event->key() != Qt::Key_F1 || event->modifiers() != Qt::NoModifier || event->isAutoRepeat() || !action) {
+    if (event->key() != Qt::Key_F1 || event->modifiers() != Qt::NoModifier || isRepeated(*event)) {
         QMenu::keyPressEvent(event);
         return;
     }
     armIdle();
-    const MenuPlace place = findItem(m_menu, static_cast<UINT>(indexOf(*action)), MF_BYPOSITION);
+    // Some styles do not highlight items that are disabled; why they are is what help is asked for.
+    const QAction* action = activeAction() ? activeAction() : actionAt(mapFromGlobal(QCursor::pos()));
+    const MenuPlace place = action ? findItem(m_menu, static_cast<UINT>(indexOf(*action)), MF_BYPOSITION) : MenuPlace();
     requestMenuHelp(m_host.owner, m_menu, place && !place.item().popup ? place.item().id : 0);
 }
 
