@@ -2,6 +2,7 @@
 
 #include "OutputWindow.h"
 #include "Resource.h"
+#include "platform/base/Text.h"
 #include "platform/win/Registry.h"
 #include "s/BrowserPreference.h"
 #include "s/Profile.h"
@@ -121,9 +122,10 @@ void CMainFrame::OnHelpSearch() {
     query.SetAnswerFieldWidth(30);
     query.SetHelpId(HID_BASE_COMMAND + ID_HELP_SEARCH);
     if (query.DoModal() == IDOK && !query.GetAnswer().IsEmpty()) {
-        // Keywords begin with a capital letter in the board's help.
         m_lastKeyword = query.GetAnswer();
-        m_lastKeyword = m_lastKeyword.Left(1).MakeUpper() + m_lastKeyword.Mid(1);
+        // Keywords begin with a capital letter in the board's help, and have no other.
+        const int first = static_cast<int>(tvx::text::characterLength(m_lastKeyword.GetString()));
+        m_lastKeyword = m_lastKeyword.Left(first).MakeUpper() + m_lastKeyword.Mid(first).MakeLower();
         WinHelp(reinterpret_cast<DWORD_PTR>(m_lastKeyword.GetString()), HELP_KEY);
     }
 }

@@ -73,7 +73,7 @@ opened "Help > Contents" browser "file://$documents/board/index.html"
 press alt+h s
 await "the search appears" titled '^Search Help$'
 xdotool windowactivate --sync "$(window '^Search Help$')"
-xdotool type drawing # the first letter does not matter
+xdotool type dRAWING # letter case does not matter
 press Return
 await "several topics are offered" titled '^Topics Found$'
 xdotool windowactivate --sync "$(window '^Topics Found$')"
