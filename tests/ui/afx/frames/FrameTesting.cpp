@@ -1,5 +1,6 @@
 #include "tests/ui/afx/frames/FrameTesting.h"
 
+#include <QElapsedTimer>
 #include <QWindow>
 
 #include <cstdlib>
@@ -218,6 +219,11 @@ void key(Qt::Key key, Qt::KeyboardModifiers modifiers) {
     QWidget* target = QApplication::activePopupWidget();
     target = target ? target : QApplication::focusWidget();
     ASSERT_NE(target, nullptr);
+    // A press in the same millisecond as the key's release would count as the repetition of one that is held.
+    QElapsedTimer clock;
+    clock.start();
+    while (clock.elapsed() == 0) {
+    }
     // To the window, as the display server sends keys: only so does the toolkit ask for shortcuts first.
     QTest::keyClick(target->window()->windowHandle(), key, modifiers);
     settle();
