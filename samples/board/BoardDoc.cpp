@@ -79,7 +79,7 @@ BOOL CBoardDoc::OnOpenDocument(LPCSTR path) {
             ReleaseFile(file, TRUE);
             CString message;
             message.Format(IDS_TOO_LARGE, tvx::shownName(path).c_str());
-            AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
+            AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION, AFX_IDP_FAILED_TO_OPEN_DOC);
             return FALSE;
         }
         text.resize(length);
@@ -99,7 +99,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     if (!result.ok()) {
         CString message;
         message.Format(IDS_DAMAGED, tvx::shownName(path).c_str(), result.line, sentence(result).GetString());
-        AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
+        AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION, AFX_IDP_FAILED_TO_OPEN_DOC);
         return FALSE;
     }
     DeleteContents();

@@ -118,6 +118,18 @@ opened "the browser that was named" other "file://$documents/board/drawing.html"
 press alt+F4
 await "the board ends" ended "$process"
 
+# A message about a drawing has a page of its own.
+echo junk >"$work/damaged.brd"
+"$program" -nosplash "$work/damaged.brd" &
+process=$!
+processes=("$process")
+await "the message about the drawing appears" titled '^Tarvex Board$'
+xdotool windowactivate --sync "$(window '^Tarvex Board$')"
+press F1
+opened "a damaged drawing" other "file://$documents/board/files.html#damaged"
+press Return
+await "the board without a drawing ends" ended "$process"
+
 # Without an installation the board says so when help is asked for, and not before.
 unset TARVEX
 begin "plan.brd - Tarvex Board" "$program" "$drawing"
