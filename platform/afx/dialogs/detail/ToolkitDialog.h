@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/App.h"
 #include "platform/afx/core/detail/HelpRequest.h"
+#include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
@@ -50,7 +51,7 @@ protected:
     bool event(QEvent* event) override {
         if (event->type() == QEvent::ShortcutOverride) {
             const auto& key = static_cast<const QKeyEvent&>(*event);
-            if (key.key() == Qt::Key_F1 && key.modifiers() == Qt::NoModifier && !key.isAutoRepeat()) {
+            if (key.key() == Qt::Key_F1 && key.modifiers() == Qt::NoModifier && !isRepeated(key)) {
                 event->accept();
                 requestHelp(m_owner, HID_BASE_RESOURCE + m_help);
                 return true;
