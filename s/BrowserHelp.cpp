@@ -10,7 +10,6 @@
 #include "s/HelpMap.h"
 #include "s/HelpTrace.h"
 #include "s/Msg.h"
-#include "s/PDFProcess.h"
 #include "s/Record.h"
 #include "s/TopicIndexDlg.h"
 
@@ -18,10 +17,6 @@
 #include <optional>
 
 namespace {
-
-/// The contents page under the number of the main frame's resources.
-constexpr unsigned long mainFrameContext = HID_BASE_RESOURCE + 128;
-constexpr unsigned long startTimeout = 5000;
 
 // --- before a program comes up ---
 
@@ -67,8 +62,8 @@ Found find(const Gui_HelpMap& map, unsigned long data, unsigned int command) {
         document = map.GetContents(found.type);
         break;
     case HELP_CONTEXT:
-        document = data == mainFrameContext ? map.GetContents(found.type)
-                                            : map.LookupContext(static_cast<unsigned int>(data), found.type);
+        document = data == mainFrameHelpContext ? map.GetContents(found.type)
+                                                : map.LookupContext(static_cast<unsigned int>(data), found.type);
         break;
     case HELP_KEY:
         map.LookupIndex(KeywordOf(data, "").GetString(), found.files, found.titles, found.type);
@@ -186,17 +181,14 @@ bool Gui_BrowserHelp::Record::LoadMap() {
 int Gui_BrowserHelp::Record::Open(const char* document, const char* type) const {
     const CString kind = type;
     if (kind.CompareNoCase("acrobat") == 0) {
-        Gui_PDFProcess viewer;
-        if (!viewer.RunPDFReader(ViewerArgumentOf(document), nullptr, 1, startTimeout)) {
-            AfxMessageBox(Gui_Msg(GUI_IDS_NO_PDF_VIEWER).GetValue());
-        }
+        ShowInPDFViewer(document);
         return 1;
     }
     const bool isAddress = kind.CompareNoCase("url") == 0;
     BrowserRequest request;
     request.url = isAddress ? CString(document) : FileAddressOf(document);
     request.wait = 1;
-    request.timeout = startTimeout;
+    request.timeout = documentTimeout;
     request.webUrl = isAddress ? CString() : webPlaceOf(map, document);
     return RunBrowserChain(request);
 }

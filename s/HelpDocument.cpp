@@ -2,6 +2,9 @@
 
 #include "platform/base/Address.h"
 #include "platform/port/File.h"
+#include "res/resource.h"
+#include "s/Msg.h"
+#include "s/PDFProcess.h"
 #include "s/PDFProfile.h"
 
 #include <string>
@@ -28,11 +31,22 @@ CString FileAddressOf(const CString& document) {
     return address;
 }
 
-CString ViewerArgumentOf(const CString& document) {
+namespace {
+
+CString viewerArgumentOf(const CString& document) {
     CString viewer;
     Gui_PDFProfile::ReadPDFViewerName(viewer);
     CString argument = document;
     argument.Replace("\"", "\\\"");
     const bool isQuoted = viewer.Find("\"%1\"") >= 0;
     return argument.FindOneOf(" \t") >= 0 && !isQuoted ? "\"" + argument + "\"" : argument;
+}
+
+} // namespace
+
+void ShowInPDFViewer(const CString& document) {
+    Gui_PDFProcess viewer;
+    if (!viewer.RunPDFReader(viewerArgumentOf(document), nullptr, 1, documentTimeout)) {
+        AfxMessageBox(Gui_Msg(GUI_IDS_NO_PDF_VIEWER).GetValue());
+    }
 }

@@ -6,6 +6,7 @@
 #include "s/ProductTexts.h"
 #include "s/Profile.h"
 #include "s/Record.h"
+#include "s/SplashTime.h"
 
 #include <algorithm>
 #include <array>
@@ -47,8 +48,7 @@ private:
 
 struct Gui_SplashDlg::Record {
     std::int64_t shownAt = std::time(nullptr); ///< seconds
-    std::int64_t timeOut = 3;
-    std::unique_ptr<Gui_Bitmap> picture; ///< while it is needed
+    std::unique_ptr<Gui_Bitmap> picture;       ///< while it is needed
     ProductTexts texts;
     bool painted = false;
     std::optional<tvx::DialogWatch> dialogs;
@@ -172,7 +172,7 @@ void Gui_SplashDlg::CheckMessage(MSG* message, CWnd* mainWindow) {
 }
 
 int Gui_SplashDlg::CheckTimeout(CWnd* mainWindow) {
-    if (m_hWnd && std::time(nullptr) - m_record->shownAt > m_record->timeOut) {
+    if (m_hWnd && IsSplashOver(m_record->shownAt, std::time(nullptr))) {
         dismiss(mainWindow);
     }
     return m_hWnd ? 1 : 0;

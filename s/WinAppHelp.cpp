@@ -7,7 +7,7 @@
 #include "s/FileName.h"
 #include "s/HelpDocument.h"
 #include "s/Msg.h"
-#include "s/PDFProcess.h"
+#include "s/Process.h"
 #include "s/WebHosts.h"
 #include "s/WinAppData.h"
 
@@ -22,9 +22,6 @@ END_MESSAGE_MAP()
 // clang-format on
 
 namespace {
-
-constexpr DWORD_PTR mainFrameContext = HID_BASE_RESOURCE + 128;
-constexpr unsigned long startTimeout = 5000;
 
 /// The language of the family's web pages for a user's.
 const char* webLanguage(LCID locale) {
@@ -55,7 +52,7 @@ void Gui_WinApp::WinHelpA(DWORD_PTR data, UINT command) {
     if (helpFile.Right(4).CompareNoCase(".map") == 0) {
         m_data->help.SetHelpMapFileName(helpFile);
         m_data->help.BrowserHelp(data, command);
-    } else if (data == mainFrameContext) {
+    } else if (data == mainFrameHelpContext) {
         CWinApp::WinHelpA(0, HELP_CONTENTS);
     } else {
         CWinApp::WinHelpA(data, command);
@@ -82,16 +79,12 @@ void Gui_WinApp::OnCommonHelpOnlineDocuments() {
         AfxMessageBox(missing);
         return;
     }
-    const CString manuals = Gui_FileName(installed).GetFullName();
-    Gui_PDFProcess viewer;
-    if (!viewer.RunPDFReader(ViewerArgumentOf(manuals), nullptr, 1, startTimeout)) {
-        AfxMessageBox(Gui_Msg(GUI_IDS_NO_PDF_VIEWER).GetValue());
-    }
+    ShowInPDFViewer(Gui_FileName(installed).GetFullName());
 }
 
 void Gui_WinApp::OnCommonHelpSupportServices() {
     Gui_Process browser;
-    browser.RunWebBrowser(GetRedirectUrl() + "&topic=support", nullptr, 1, startTimeout);
+    browser.RunWebBrowser(GetRedirectUrl() + "&topic=support", nullptr, 1, documentTimeout);
 }
 
 void Gui_WinApp::OnHelpAbout() {

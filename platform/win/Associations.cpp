@@ -37,7 +37,7 @@ std::vector<std::string> wordsOf(const std::string& commandLine) {
     return words;
 }
 
-/// Drops the first words that `isOver` holds for; the next one becomes the program.
+/// Drops the program and the words behind it that `isSkipped` holds for; the next one becomes the program.
 template <typename Predicate>
 void skipTo(std::vector<std::string>& words, Predicate isSkipped) {
     words.erase(words.begin(), std::find_if_not(words.begin() + 1, words.end(), isSkipped));

@@ -67,8 +67,6 @@ bool isHexNumber(std::string_view text) {
            text.find_first_not_of("0123456789abcdefABCDEF", 2) == std::string_view::npos;
 }
 
-/// Why no help request asks for a key; empty when one may. An application can ask for any key by its text, so only keys
-/// count that are written as another kind of request, and those that no text can be.
 /// The number that the framework asks for in the place of a command's, 0 where it asks for the command's.
 unsigned long askedInstead(std::string_view number) {
     constexpr unsigned long commands = 0x10000;
@@ -81,6 +79,8 @@ unsigned long askedInstead(std::string_view number) {
     return command >= AFX_IDM_FIRST_MDICHILD && command <= 0xFFFF ? commands + AFX_IDS_MDICHILD : 0;
 }
 
+/// Why no help request asks for a key; empty when one may. An application can ask for any key by its text, so only keys
+/// count that are written as another kind of request, and those that no text can be.
 std::string whyUnreachable(std::string_view key) {
     constexpr std::string_view topic = "topic ";
     constexpr std::string_view highest = "4294967295";

@@ -2,6 +2,7 @@
 #include "s/SplashDlg.h"
 
 #include "s/Profile.h"
+#include "s/SplashTime.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 #include "tests/ui/afx/frames/SettingsFolder.h"
 #include "tests/ui/s/WindowTestApp.h"
@@ -133,6 +134,8 @@ TEST_F(SplashDlg, GoesAtTheFirstPress) {
 }
 
 TEST_F(SplashDlg, GoesInTheFourthSecondWithoutAnyInput) {
+    EXPECT_FALSE(IsSplashOver(100, 103));
+    EXPECT_TRUE(IsSplashOver(100, 104));
     Gui_SplashDlg splash(nullptr);
     ASSERT_EQ(splash.Create(nullptr), 1);
     const std::time_t begin = std::time(nullptr);

@@ -3,6 +3,7 @@
 
 #include "s/BrowserHelp.h"
 #include "s/Profile.h"
+#include "tests/ui/afx/InDialog.h"
 #include "tests/ui/afx/TestApplication.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 #include "tests/unit/SavedEnvironment.h"
@@ -17,21 +18,6 @@ namespace {
 
 namespace fs = std::filesystem;
 using Strings = Gui_TopicIndexDlg::Strings;
-
-/// Acts in the next modal dialog of the application, once that has the keyboard.
-void inDialog(std::function<void()> act) {
-    auto* timer = new QTimer(qApp);
-    QObject::connect(timer, &QTimer::timeout, timer, [timer, act = std::move(act)] {
-        const QWidget* dialog = QApplication::activeModalWidget();
-        const QWidget* focus = QApplication::focusWidget();
-        if (dialog && focus && focus->window() == dialog) {
-            timer->stop();
-            timer->deleteLater();
-            act();
-        }
-    });
-    timer->start(0);
-}
 
 /// The place of what the user chose, nothing when the dialog was cancelled.
 std::optional<int> choose(const Strings& files, const Strings& titles, std::function<void()> act) {
@@ -138,6 +124,10 @@ TEST_F(HelpForUser, ARequestClosesMenusAndEndsHelpModeAndCapture) {
         EXPECT_FALSE(testApplication.m_bHelpMode);
     }
     testApplication.m_pMainWnd = nullptr;
+    frame->SetCapture();
+    const BoxAnswer answer;
+    EXPECT_EQ(m_help.OnCommand(1), 1);
+    EXPECT_EQ(::GetCapture(), nullptr) << "without a main window too";
     frame->DestroyWindow();
 }
 

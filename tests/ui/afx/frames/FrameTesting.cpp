@@ -296,18 +296,4 @@ void later(std::function<void()> act) {
     QTimer::singleShot(0, qApp, std::move(act));
 }
 
-void inDialog(std::function<void()> act) {
-    auto* timer = new QTimer(qApp);
-    QObject::connect(timer, &QTimer::timeout, timer, [timer, act = std::move(act)] {
-        const QWidget* dialog = QApplication::activeModalWidget();
-        const QWidget* focus = QApplication::focusWidget();
-        if (dialog && focus && focus->window() == dialog) {
-            timer->stop();
-            timer->deleteLater();
-            act();
-        }
-    });
-    timer->start(0);
-}
-
 } // namespace frametest

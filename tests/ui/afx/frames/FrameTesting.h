@@ -14,6 +14,7 @@
 #include "platform/afx/frames/View.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/base/SystemPath.h"
+#include "tests/ui/afx/InDialog.h"
 #include "tests/ui/afx/frames/FrameTestIds.h"
 
 #include <QAbstractButton>
@@ -183,7 +184,5 @@ private:
 
 /// Does something in the next nested loop.
 void later(std::function<void()> act);
-/// Does something in the next modal dialog, once that has the keyboard.
-void inDialog(std::function<void()> act);
 
 } // namespace frametest
