@@ -52,11 +52,10 @@ protected:
     /// The started program, with "@" for the folder of documents.
     [[nodiscard]] std::string opened() const {
         std::string text = started();
-        for (const char* name : {"in#1", "in%231"}) { // as it is, and in an address
-            const std::string documents = (m_folder / name / "doc/usenglish/").string();
-            const std::size_t at = text.find(documents);
-            text = at == std::string::npos ? text : text.replace(at, documents.size(), "@");
-        }
+        const bool isAddress = text.find("file://") != std::string::npos;
+        const std::string documents = (m_folder / (isAddress ? "in%231" : "in#1") / "doc/usenglish/").string();
+        const std::size_t at = text.find(documents);
+        text = at == std::string::npos ? text : text.replace(at, documents.size(), "@");
         return text;
     }
     Gui_BrowserHelp m_help;
