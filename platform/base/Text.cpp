@@ -143,6 +143,10 @@ std::string toUpper(std::string_view text) {
     return mapped(text, mapUpper);
 }
 
+bool isLetter(char32_t codePoint) noexcept {
+    return !isLowSurrogate(codePoint) && iswalpha_l(static_cast<wint_t>(codePoint), detail::neutralLocale()) != 0;
+}
+
 std::string toLower(std::string_view text) {
     return mapped(text, mapLower);
 }

@@ -44,6 +44,8 @@ struct LessNoCase {
 };
 /// The text in upper case, letter by letter ("ß" stays).
 [[nodiscard]] TVX_PLATFORM_API std::string toUpper(std::string_view text);
+/// Whether a code point is a letter of any script; a broken byte is none.
+[[nodiscard]] TVX_PLATFORM_API bool isLetter(char32_t codePoint) noexcept;
 /// The text in lower case, letter by letter.
 [[nodiscard]] TVX_PLATFORM_API std::string toLower(std::string_view text);
 

@@ -43,6 +43,12 @@ TEST(Text, FoldsLettersOneToOneWithoutTouchingAscii) {
     EXPECT_FALSE(text::equalNoCase("\u0131", "I"));
     EXPECT_FALSE(text::equalNoCase("\xC4", "\xE4"));
     EXPECT_EQ("ÉTÉ \xFF", text::toUpper("été \xFF"));
+    for (const char32_t letter : {U'a', U'Z', U'é', U'ß', U'語', U'п'}) {
+        EXPECT_TRUE(text::isLetter(letter)) << static_cast<unsigned>(letter);
+    }
+    for (const char32_t other : {U'\0', U'1', U'!', U'_', U' ', U'、', U'\u2014', char32_t{0xDCFF}}) {
+        EXPECT_FALSE(text::isLetter(other)) << static_cast<unsigned>(other);
+    }
 }
 
 TEST(Text, OrdersWithoutCaseAsTheLowerCaseLetters) {
