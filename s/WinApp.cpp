@@ -3,6 +3,7 @@
 #include "platform/afx/core/LastReport.h"
 #include "platform/port/Exception.h"
 #include "res/resource.h"
+#include "s/DocManager.h"
 #include "s/Msg.h"
 #include "s/Record.h"
 #include "s/WinAppData.h"
@@ -10,6 +11,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <exception>
+#include <utility>
 
 IMPLEMENT_DYNAMIC(Gui_WinApp, CWinApp)
 
@@ -19,6 +21,9 @@ void issueFatal(int line) {
     WinAppOrigin(line).issueFatal(
         1, "This application has discovered an exceptional condition from which it cannot recover.");
 }
+
+/// The document manager that the application had before InitApplication: none, unless the host was early.
+CDocManager* platformDocManager = nullptr;
 
 /// Replaces one of the application object's texts.
 void replace(LPCSTR& place, LPCSTR text) {
@@ -31,7 +36,14 @@ void replace(LPCSTR& place, LPCSTR text) {
 
 Gui_WinApp::Gui_WinApp(const char* appName) : CWinApp(appName), m_data(MakeRecord<Gui_WinAppData>()) {}
 
-Gui_WinApp::~Gui_WinApp() = default;
+Gui_WinApp::~Gui_WinApp() {
+    // The base class ends the one that is put back.
+    CDocManager* const installed = m_pDocManager;
+    m_pDocManager = std::exchange(platformDocManager, nullptr);
+    if (installed != m_pDocManager) {
+        delete installed;
+    }
+}
 
 void Gui_WinApp::SetRegistryKey(const char* key) {
     CWinApp::SetRegistryKey(key);
@@ -71,6 +83,7 @@ BOOL Gui_WinApp::PreTranslateMessage(MSG* message) {
 }
 
 BOOL Gui_WinApp::InitApplication() {
+    platformDocManager = std::exchange(m_pDocManager, new Gui_DocManager);
     return CWinApp::InitApplication();
 }
 

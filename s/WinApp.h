@@ -69,7 +69,8 @@ public:
 
     /// The framework's translation of key presses into commands.
     BOOL PreTranslateMessage(MSG* message) override;
-    /// Called once before InitInstance.
+    /// Called once before InitInstance. It makes a Gui_DocManager the application's document manager; the destructor
+    /// puts the one back that was there before.
     BOOL InitApplication() override;
 
     /// Shows the wait cursor (1), ends it (-1) or shows it again (0). At 0 and less the pointer is set to where it
@@ -97,8 +98,8 @@ public:
     virtual CString GetAppVersion() = 0;
 
     /// @name The file dialogs
-    /// What shapes the dialogs in which documents are opened and saved. An override usually changes what the base
-    /// version answers.
+    /// What shapes the dialogs in which documents are opened and saved: Gui_DocManager asks for all of it, in another
+    /// order, each time that it shows one. An override usually changes what the base version answers.
     /// @{
 
     /// The window that owns the dialog: the main window, null when there is none.

@@ -1,0 +1,38 @@
+#include "s/Document.h"
+
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+
+namespace {
+
+class Plan : public Gui_Document {};
+
+std::string contents(const char* name) {
+    std::ifstream file(name);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+} // namespace
+
+TEST(Document, OpensTheNamedFileItself) {
+    std::ofstream("plan.txt") << "old";
+    Plan plan;
+    CFileException error;
+    CFile* file = plan.GetFile("plan.txt", CFile::modeRead, &error);
+    ASSERT_NE(file, nullptr);
+    EXPECT_EQ(file->GetRuntimeClass(), RUNTIME_CLASS(CFile));
+    EXPECT_EQ(file->GetLength(), 3U);
+    plan.ReleaseFile(file, FALSE);
+
+    file = plan.GetFile("plan.txt", CFile::modeCreate | CFile::modeWrite, &error);
+    ASSERT_NE(file, nullptr);
+    file->Write("new text", 8);
+    EXPECT_EQ(contents("plan.txt"), "new text") << "at once, in the file itself";
+    plan.ReleaseFile(file, TRUE);
+    EXPECT_EQ(contents("plan.txt"), "new text");
+
+    EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, &error), nullptr);
+    EXPECT_EQ(error.m_cause, CFileException::fileNotFound);
+    EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, nullptr), nullptr);
+}
