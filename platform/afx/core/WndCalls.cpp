@@ -3,7 +3,8 @@
 #include "platform/afx/core/App.h"
 #include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/core/detail/PlainWindow.h"
+#include "platform/afx/core/detail/ScrollFrame.h"
+#include "platform/afx/core/detail/Window.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/base/Text.h"
@@ -419,13 +420,19 @@ BOOL CWnd::KillTimer(UINT_PTR id) {
 
 namespace {
 
+/// The frame of windows whose bars are their own business; null for others, and for none.
+ScrollFrame* scrollFrameOf(const CWnd& window) {
+    const Window* state = window.GetState();
+    return state ? dynamic_cast<ScrollFrame*>(state->widget()) : nullptr;
+}
+
 QScrollBar* barOf(const CWnd& window, int bar) {
     const Window* state = window.GetState();
     if (!state || !state->widget()) {
         return nullptr;
     }
-    if (const auto* plain = dynamic_cast<const PlainWindow*>(state)) {
-        return plain->scrollBar(bar);
+    if (const ScrollFrame* frame = scrollFrameOf(window)) {
+        return frame->bar(bar);
     }
     // Edit and list controls keep the ranges of their bars themselves.
     const auto* area = dynamic_cast<const QAbstractScrollArea*>(state->widget());
@@ -471,8 +478,8 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     if (!slider) {
         return FALSE;
     }
-    auto* plain = dynamic_cast<PlainWindow*>(GetState());
-    if (!plain) {
+    ScrollFrame* frame = scrollFrameOf(*this);
+    if (!frame) {
         // Controls keep range and page of their bars by what is in them.
         slider->setValue((info->fMask & SIF_POS) != 0 ? info->nPos : slider->value());
         return TRUE;
@@ -496,7 +503,7 @@ BOOL CWnd::SetScrollInfo(int bar, SCROLLINFO* info, BOOL) {
     // A bar that has nothing to scroll disappears, unless it is to stay disabled.
     const bool needed = last > now.nMin;
     slider->setEnabled(needed);
-    plain->showScrollBar(bar, needed || (info->fMask & SIF_DISABLENOSCROLL) != 0);
+    frame->showBar(bar, needed || (info->fMask & SIF_DISABLENOSCROLL) != 0);
     return TRUE;
 }
 
@@ -514,15 +521,15 @@ BOOL CWnd::GetScrollInfo(int bar, SCROLLINFO* info, UINT mask) {
 }
 
 void CWnd::ShowScrollBar(UINT bar, BOOL show) {
-    auto* plain = dynamic_cast<PlainWindow*>(GetState());
-    if (!plain) {
+    ScrollFrame* frame = scrollFrameOf(*this);
+    if (!frame) {
         return;
     }
     if (bar == SB_HORZ || bar == SB_BOTH) {
-        plain->showScrollBar(SB_HORZ, show != FALSE);
+        frame->showBar(SB_HORZ, show != FALSE);
     }
     if (bar == SB_VERT || bar == SB_BOTH) {
-        plain->showScrollBar(SB_VERT, show != FALSE);
+        frame->showBar(SB_VERT, show != FALSE);
     }
 }
 

@@ -31,24 +31,6 @@ END_MESSAGE_MAP()
 
 namespace {
 
-std::string nameOf(LPCSTR name) {
-    return IS_INTRESOURCE(name) ? std::to_string(reinterpret_cast<std::uintptr_t>(name)) : std::string(name);
-}
-
-std::optional<tvx::DialogTemplate> loadTemplate(LPCSTR name) {
-    const auto bytes = tvx::resourceBytes(AfxFindResourceHandle(name, RT_DIALOG), name, RT_DIALOG);
-    if (bytes.empty()) {
-        std::fprintf(stderr, "The dialog %s is not among the resources.\n", nameOf(name).c_str());
-        return std::nullopt;
-    }
-    auto description = tvx::parseDialogTemplate(bytes);
-    if (!description) {
-        std::fprintf(stderr, "The dialog %s was refused: %s.\n", nameOf(name).c_str(), description.reason().c_str());
-        return std::nullopt;
-    }
-    return std::move(*description);
-}
-
 /// Takes the input from the window a modal dialog stands over, and gives it back with the activation. Its look does not
 /// change: the toolkit keeps the user away, the style tells the program.
 class OwnerLock {
@@ -146,7 +128,7 @@ BOOL CDialog::Create(LPCSTR templateName, CWnd* parent) {
 }
 
 std::optional<tvx::DialogTemplate> CDialog::describe() const {
-    return loadTemplate(m_lpszTemplateName);
+    return loadDialogTemplate(m_lpszTemplateName);
 }
 
 BOOL CDialog::createFrom(const tvx::DialogTemplate& description, CWnd* parent, bool modal) {
@@ -210,7 +192,8 @@ void CDialog::initialise(const tvx::DialogTemplate& description, CWnd*) {
     const bool centred = place(dialog, description, *this);
     const QRect placed = dialog.windowRect();
     if (!makeControls(dialog, description)) {
-        std::fprintf(stderr, "A control of the dialog %s could not be made.\n", nameOf(m_lpszTemplateName).c_str());
+        std::fprintf(stderr, "A control of the dialog %s could not be made.\n",
+                     resourceNameOf(m_lpszTemplateName).c_str());
     }
     Window* first = nextTabItem(dialog, nullptr, Direction::Forward);
     const auto firstHandle = reinterpret_cast<WPARAM>(first ? first->handle() : nullptr);
@@ -241,7 +224,7 @@ LRESULT CDialog::HandleInitDialog(WPARAM, LPARAM) {
 
 BOOL CDialog::OnInitDialog() {
     if (!UpdateData(FALSE)) {
-        std::fprintf(stderr, "The dialog %s could not be filled.\n", nameOf(m_lpszTemplateName).c_str());
+        std::fprintf(stderr, "The dialog %s could not be filled.\n", resourceNameOf(m_lpszTemplateName).c_str());
         EndDialog(-1);
         return FALSE;
     }

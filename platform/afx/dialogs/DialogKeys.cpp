@@ -47,13 +47,10 @@ void collect(const Window& parent, std::vector<Window*>& controls) {
     }
 }
 
+/// The control with the keyboard; null when it is elsewhere, or at the dialog itself.
 Window* focusIn(const Window& dialog) {
-    for (Window* window = Window::from(GetFocus()); window; window = window->parent()) {
-        if (window == &dialog) {
-            return Window::from(GetFocus());
-        }
-    }
-    return nullptr;
+    Window* focus = Window::from(GetFocus());
+    return focus && IsChild(dialog.handle(), focus->handle()) ? focus : nullptr;
 }
 
 } // namespace

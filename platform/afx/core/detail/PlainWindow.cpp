@@ -1,52 +1,21 @@
 #include "platform/afx/core/detail/PlainWindow.h"
 
-#include "platform/afx/core/detail/Connect.h"
 #include "platform/win/FrameworkIds.h"
 
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
-#include "platform/afx/core/detail/ScrollCode.h"
+#include "platform/afx/core/detail/ScrollFrame.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/detail/GdiObjects.h"
 
-#include <QAbstractScrollArea>
-#include <QKeyEvent>
 #include <QMainWindow>
 #include <QMenuBar>
-#include <QScrollBar>
-#include <QWheelEvent>
 #include <QWindow>
 
 namespace tvx::afx {
 
 namespace {
-
-/// Everything the toolkit would do by itself in a scroll area is the window's business here.
-class Area : public QAbstractScrollArea {
-public:
-    explicit Area(QWidget* parent) : QAbstractScrollArea(parent) {
-        setFocusPolicy(Qt::NoFocus);
-        setAttribute(Qt::WA_InputMethodEnabled);
-        setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-        setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
-        // The window paints each pixel that it asks to be repainted; the toolkit must not paint before it.
-        viewport()->setAutoFillBackground(false);
-        viewport()->setAttribute(Qt::WA_OpaquePaintEvent);
-        viewport()->setAttribute(Qt::WA_NoSystemBackground);
-        // WM_MOUSEMOVE comes with no button pressed, too.
-        viewport()->setMouseTracking(true);
-    }
-
-protected:
-    void keyPressEvent(QKeyEvent* event) override {
-        event->ignore();
-    }
-    void wheelEvent(QWheelEvent* event) override {
-        event->ignore();
-    }
-    void scrollContentsBy(int, int) override {}
-};
 
 /// Plain children until the room of the frames, which comes with the same library, has told of its kind.
 constinit WindowFactory childFrameFactory = nullptr;
@@ -78,65 +47,17 @@ bool eraseBackground(Window& window, HDC dc) {
 // --- children ---
 
 QWidget* PlainWindow::makeWidget(QWidget* parent) {
-    m_area = new Area(parent);
-    applyStyle();
-    connectBar(SB_HORZ);
-    connectBar(SB_VERT);
-    return m_area;
+    m_frame = new ScrollFrame(*this, parent, ScrollFrame::Background::Windows);
+    return m_frame;
 }
 
 QWidget* PlainWindow::clientWidget() const {
-    return widget() ? m_area->viewport() : nullptr;
-}
-
-void PlainWindow::applyStyle() {
-    if ((exStyle() & WS_EX_CLIENTEDGE) != 0) {
-        m_area->setFrameStyle(QFrame::StyledPanel | QFrame::Sunken);
-    } else if ((style() & WS_BORDER) != 0) {
-        m_area->setFrameStyle(QFrame::Box | QFrame::Plain);
-    } else {
-        m_area->setFrameStyle(QFrame::NoFrame);
-    }
-    const auto policy = [this](DWORD bit) {
-        return (style() & bit) != 0 ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
-    };
-    m_area->setHorizontalScrollBarPolicy(policy(WS_HSCROLL));
-    m_area->setVerticalScrollBarPolicy(policy(WS_VSCROLL));
-    m_area->setAcceptDrops((exStyle() & WS_EX_ACCEPTFILES) != 0);
+    return widget() ? m_frame->viewport() : nullptr;
 }
 
 void PlainWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
-    guarded([this] { applyStyle(); });
+    guarded([this] { m_frame->followStyle(); });
     tellGeometry();
-}
-
-QScrollBar* PlainWindow::scrollBar(int bar) const {
-    return bar == SB_HORZ ? m_area->horizontalScrollBar() : m_area->verticalScrollBar();
-}
-
-void PlainWindow::showScrollBar(int bar, bool show) {
-    const DWORD bit = bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL;
-    setStyle(show ? (style() | bit) : (style() & ~bit), exStyle());
-}
-
-void PlainWindow::connectBar(int bar) {
-    QScrollBar* slider = scrollBar(bar);
-    const UINT message = bar == SB_HORZ ? WM_HSCROLL : WM_VSCROLL;
-    // The toolkit would move the slider by itself; here the window decides, by SetScrollPos. Its own idea is put back
-    // before it acts on it.
-    connectStoring(slider, &QScrollBar::actionTriggered, slider, [this, slider, message](int action) {
-        const int code = scrollCodeOf(action);
-        const int position = slider->sliderPosition();
-        if (code != SB_THUMBTRACK) {
-            slider->setSliderPosition(slider->value());
-        }
-        armIdle();
-        call(message, MAKEWPARAM(code, position));
-    });
-    connectStoring(slider, &QScrollBar::sliderReleased, slider, [this, slider, message] {
-        call(message, MAKEWPARAM(SB_THUMBPOSITION, slider->sliderPosition()));
-        call(message, MAKEWPARAM(SB_ENDSCROLL, 0));
-    });
 }
 
 LRESULT PlainWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {

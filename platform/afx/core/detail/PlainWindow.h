@@ -5,11 +5,11 @@
 
 #include "platform/afx/core/detail/Window.h"
 
-class QAbstractScrollArea;
 class QMainWindow;
-class QScrollBar;
 
 namespace tvx::afx {
+
+class ScrollFrame;
 
 /// A child window: an area to draw on, with a border and scroll bars where its style asks for them.
 class TVX_PLATFORM_API PlainWindow : public Window {
@@ -17,18 +17,13 @@ public:
     using Window::Window;
     QWidget* clientWidget() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
-    /// The scroll bar of the window's frame, SB_HORZ or SB_VERT.
-    QScrollBar* scrollBar(int bar) const;
-    void showScrollBar(int bar, bool show);
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
     void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
 
 private:
-    void applyStyle();
-    void connectBar(int bar);
-    QAbstractScrollArea* m_area = nullptr;
+    ScrollFrame* m_frame = nullptr;
 };
 
 /// A top-level window: a frame with caption, menu bar, tool bars and a central pane, or a bare popup.

@@ -8,7 +8,9 @@
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PlainWindow.h"
+#include "platform/afx/core/detail/ScrollFrame.h"
 #include "platform/afx/dialogs/DialogWatch.h"
+#include "platform/afx/dialogs/detail/DialogKeys.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
 #include "platform/afx/gdi/detail/DeviceContext.h"
@@ -79,10 +81,15 @@ Qt::WindowFlags flags(DWORD style, DWORD exStyle) {
 
 QWidget* DialogWindow::makeWidget(QWidget* parent) {
     if (isChild()) {
-        return new QWidget(parent);
+        m_frame = new ScrollFrame(*this, parent, ScrollFrame::Background::Toolkits);
+        return m_frame;
     }
     QWidget* over = owner() ? owner()->widget() : nullptr;
     return new QWidget(over, flags(style(), exStyle()));
+}
+
+QWidget* DialogWindow::clientWidget() const {
+    return widget() && m_frame ? m_frame->viewport() : widget();
 }
 
 void DialogWindow::widgetMade() {
@@ -94,11 +101,18 @@ void DialogWindow::widgetMade() {
 }
 
 int DialogWindow::accessibleRole() const {
-    const bool isPage = isChild() && dynamic_cast<const DialogWindow*>(parent());
-    return isPage ? QAccessible::PropertyPage : QAccessible::Dialog;
+    if (!isChild()) {
+        return QAccessible::Dialog;
+    }
+    return dynamic_cast<const DialogWindow*>(parent()) ? QAccessible::PropertyPage : QAccessible::Form;
 }
 
 void DialogWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
+    if (m_frame) {
+        guarded([this] { m_frame->followStyle(); });
+        tellGeometry();
+        return;
+    }
     if (!isChild() && flags(style(), exStyle()) != flags(oldStyle, oldExStyle)) {
         changeWindowFlags(*widget(), flags(style(), exStyle()));
     }
@@ -273,13 +287,14 @@ void DialogWindow::askColor() {
         return;
     }
     m_color = color;
-    QPalette palette = QApplication::palette(widget());
+    QWidget& inside = *clientWidget();
+    QPalette palette = QApplication::palette(&inside);
     if (color != 0) {
         palette.setColor(QPalette::Window, QColor(color));
     }
     guarded([&] {
-        widget()->setAutoFillBackground(color != 0);
-        widget()->setPalette(palette);
+        inside.setAutoFillBackground(color != 0);
+        inside.setPalette(palette);
     });
 }
 
@@ -293,6 +308,31 @@ void DialogWindow::pressCancel() {
     call(WM_COMMAND, MAKEWPARAM(IDCANCEL, BN_CLICKED), reinterpret_cast<LPARAM>(control));
 }
 
+LRESULT DialogWindow::erase(HDC dc) {
+    const HWND self = handle();
+    askColor();
+    if (from(self)) {
+        const QSize size = clientRect().size();
+        const RECT rect{0, 0, size.width(), size.height()};
+        const HBRUSH own =
+            m_color != 0 ? CreateSolidBrush(RGB(qRed(m_color), qGreen(m_color), qBlue(m_color))) : nullptr;
+        FillRect(dc, &rect, own ? own : GetSysColorBrush(COLOR_BTNFACE));
+        DeleteObject(reinterpret_cast<HGDIOBJ>(own));
+    }
+    return TRUE;
+}
+
+/// The keyboard belongs to a control; it comes here when the dialog becomes active again. A child dialog is given it
+/// before any of its controls had it, too.
+void DialogWindow::passFocusOn() {
+    const Window* last = from(lastFocus);
+    if (last && last != this && last->isEnabled() && last->isVisible()) {
+        SetFocus(lastFocus);
+    } else if (Window* first = isChild() ? nextTabItem(*this, nullptr, Direction::Forward) : nullptr) {
+        focusControl(*first);
+    }
+}
+
 LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
     case DM_GETDEFID:
@@ -303,12 +343,8 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_CLOSE:
         pressCancel();
         return 0;
-    case WM_ERASEBKGND: {
-        const QSize size = clientRect().size();
-        const RECT rect{0, 0, size.width(), size.height()};
-        FillRect(reinterpret_cast<HDC>(wParam), &rect, GetSysColorBrush(COLOR_BTNFACE));
-        return TRUE;
-    }
+    case WM_ERASEBKGND:
+        return erase(reinterpret_cast<HDC>(wParam));
     case WM_PAINT: {
         const HWND self = handle();
         askColor();
@@ -318,10 +354,7 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return 0;
     }
     case WM_SETFOCUS:
-        // The keyboard belongs to a control; it comes here when the dialog becomes active again.
-        if (from(lastFocus) && lastFocus != handle()) {
-            SetFocus(lastFocus);
-        }
+        passFocusOn();
         return 0;
     default:
         return Window::defaultProc(message, wParam, lParam);
@@ -329,6 +362,25 @@ LRESULT DialogWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 }
 
 // --- templates ---
+
+std::string resourceNameOf(LPCSTR name) {
+    return IS_INTRESOURCE(name) ? std::to_string(reinterpret_cast<std::uintptr_t>(name)) : std::string(name);
+}
+
+std::optional<DialogTemplate> loadDialogTemplate(LPCSTR name) {
+    const auto bytes = resourceBytes(AfxFindResourceHandle(name, RT_DIALOG), name, RT_DIALOG);
+    if (bytes.empty()) {
+        std::fprintf(stderr, "The dialog %s is not among the resources.\n", resourceNameOf(name).c_str());
+        return std::nullopt;
+    }
+    auto description = parseDialogTemplate(bytes);
+    if (!description) {
+        std::fprintf(stderr, "The dialog %s was refused: %s.\n", resourceNameOf(name).c_str(),
+                     description.reason().c_str());
+        return std::nullopt;
+    }
+    return std::move(*description);
+}
 
 namespace {
 

@@ -6,7 +6,12 @@
 #include "platform/afx/core/detail/Window.h"
 #include "platform/win/DialogTemplate.h"
 
+#include <optional>
+#include <string>
+
 namespace tvx::afx {
+
+class ScrollFrame;
 
 /// The class of dialogs.
 inline constexpr const char* dialogClass = "#32770";
@@ -17,6 +22,7 @@ class TVX_PLATFORM_API DialogWindow : public Window {
 public:
     using Window::Window;
     ~DialogWindow() override;
+    QWidget* clientWidget() const override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     void setWindowRect(const QRect& rect) override;
     int accessibleRole() const override;
@@ -57,12 +63,19 @@ private:
     void keepOnScreen();
     void fixSize();
     void pressCancel();
+    LRESULT erase(HDC dc);
+    void passFocusOn();
+    ScrollFrame* m_frame = nullptr; ///< Of a child dialog.
     HFONT m_ownFont = nullptr;
     QSize m_baseUnits{6, 13};
     int m_defaultId = 0;
     QRgb m_color = 0;
 };
 
+/// A name or number of a resource, as messages tell it.
+std::string resourceNameOf(LPCSTR name);
+/// The template of a name; none, which standard error tells, when it is missing or damaged.
+std::optional<DialogTemplate> loadDialogTemplate(LPCSTR name);
 /// Makes the controls of a template in a dialog that stands. False when one could not be made.
 TVX_PLATFORM_API bool makeControls(DialogWindow& dialog, const DialogTemplate& description);
 /// Fills list and combo boxes with the first contents that resources (type 240) give the dialog `name`.
