@@ -99,6 +99,7 @@ int CBoardApp::ExitInstance() {
 BOOL CBoardApp::ShowMainFrame(CBoardCommandLine& info) {
     AddDocTemplate(new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
                                          RUNTIME_CLASS(CBoardView)));
+    m_console.Init();
     auto* frame = new CMainFrame;
     m_pMainWnd = frame;
     if (!frame->LoadFrame(IDR_MAINFRAME)) {
@@ -114,7 +115,6 @@ BOOL CBoardApp::ShowMainFrame(CBoardCommandLine& info) {
     return TRUE;
 }
 
-// A drawing may be named without its extension.
 CString CBoardApp::DrawingName(const CString& word) {
     const Gui_FileName name(word);
     if (name.HasExtension() || name.Exists()) {
@@ -137,6 +137,15 @@ BOOL CBoardApp::OpenDrawings(CBoardCommandLine& info) {
         opened |= ProcessShellCommand(info);
     }
     return opened;
+}
+
+void CBoardApp::SetGrid(int distance) {
+    m_grid = distance;
+    POSITION first = GetFirstDocTemplatePosition();
+    CDocTemplate* const drawings = GetNextDocTemplate(first);
+    for (POSITION at = drawings->GetFirstDocPosition(); at;) {
+        drawings->GetNextDoc(at)->UpdateAllViews(nullptr);
+    }
 }
 
 HICON CBoardApp::GetAppIcon() {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "CommandConsole.h"
 #include "s/CommandLineInfo.h"
 #include "s/MessageManager.h"
 #include "s/SplashDlg.h"
@@ -40,7 +41,16 @@ public:
     BOOL OnIdle(LONG count) override;
 
     /// Distance of the grid points in pixels; 0 for none.
-    int m_grid = 10;
+    int GetGrid() const {
+        return m_grid;
+    }
+    /// Sets it, and draws all drawings anew.
+    void SetGrid(int distance);
+    CCommandConsole& GetConsole() {
+        return m_console;
+    }
+    /// A drawing's file: one may be named without its extension.
+    static CString DrawingName(const CString& word);
 
 private:
     /// Whether this is to be the only board.
@@ -48,8 +58,9 @@ private:
 
     BOOL ShowMainFrame(CBoardCommandLine& info);
     BOOL OpenDrawings(CBoardCommandLine& info);
-    static CString DrawingName(const CString& word);
 
+    int m_grid = 10;
+    CCommandConsole m_console;
     /// Shows errors in message boxes, those of handlers that have failed among them.
     Gui_MessageManager m_messages;
     /// Shown while the application starts, null afterwards.

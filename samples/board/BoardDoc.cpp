@@ -24,14 +24,7 @@ CString shown(std::string word) {
     return word.c_str();
 }
 
-/// What is wrong with a drawing, in the user's language.
-CString sentence(const board::ReadResult& result) {
-    Gui_Msg message(IDS_FAULT_FIRST + static_cast<UINT>(result.fault));
-    for (const std::string& detail : result.details) {
-        message << shown(detail);
-    }
-    return message.GetValue();
-}
+CBoardDoc* current = nullptr;
 
 } // namespace
 
@@ -45,6 +38,28 @@ BEGIN_MESSAGE_MAP(CBoardDoc, CDocument)
     ON_UPDATE_COMMAND_UI(ID_EDIT_REDO, &CBoardDoc::OnUpdateEditRedo)
 END_MESSAGE_MAP()
 // clang-format on
+
+CBoardDoc::~CBoardDoc() {
+    if (current == this) {
+        current = nullptr;
+    }
+}
+
+CBoardDoc* CBoardDoc::GetCurrent() {
+    return current;
+}
+
+void CBoardDoc::MakeCurrent() {
+    current = this;
+}
+
+CString CBoardDoc::Sentence(const board::ReadResult& result) {
+    Gui_Msg message(IDS_FAULT_FIRST + static_cast<UINT>(result.fault));
+    for (const std::string& detail : result.details) {
+        message << shown(detail);
+    }
+    return message.GetValue();
+}
 
 void CBoardDoc::Change(board::Change change) {
     if (!change.isNothing()) {
@@ -98,7 +113,7 @@ BOOL CBoardDoc::Take(const char* path, const std::string& text) {
     board::ReadResult result = board::readDrawing(text);
     if (!result.ok()) {
         CString message;
-        message.Format(IDS_DAMAGED, tvx::shownName(path).c_str(), result.line, sentence(result).GetString());
+        message.Format(IDS_DAMAGED, tvx::shownName(path).c_str(), result.line, Sentence(result).GetString());
         AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION, AFX_IDP_FAILED_TO_OPEN_DOC);
         return FALSE;
     }
@@ -136,12 +151,28 @@ BOOL CBoardDoc::OnSaveDocument(LPCSTR path) {
 
 // --- undo ---
 
+bool CBoardDoc::Undo() {
+    const bool can = m_history.canUndo();
+    if (can) {
+        Changed(m_history.undo(m_drawing));
+    }
+    return can;
+}
+
+bool CBoardDoc::Redo() {
+    const bool can = m_history.canRedo();
+    if (can) {
+        Changed(m_history.redo(m_drawing));
+    }
+    return can;
+}
+
 void CBoardDoc::OnEditUndo() {
-    Changed(m_history.undo(m_drawing));
+    Undo();
 }
 
 void CBoardDoc::OnEditRedo() {
-    Changed(m_history.redo(m_drawing));
+    Redo();
 }
 
 void CBoardDoc::OnUpdateEditUndo(CCmdUI* item) {

@@ -8,11 +8,25 @@ class CBoardDoc : public CDocument {
     DECLARE_DYNCREATE(CBoardDoc)
 
 public:
+    ~CBoardDoc() override;
+
+    /// The drawing that the user worked with last; null when there is none.
+    static CBoardDoc* GetCurrent();
+    /// Makes this one the current drawing.
+    void MakeCurrent();
+    /// What is wrong with a drawing, in the user's language.
+    static CString Sentence(const board::ReadResult& result);
+
     const board::Drawing& GetDrawing() const {
         return m_drawing;
     }
     /// Makes a change that can be undone. The views are told of it: their hint is a pointer to the board::Change.
     void Change(board::Change change);
+    /// Takes the last change back, or makes the one again that was taken back. Answers whether there was one.
+    /// @{
+    bool Undo();
+    bool Redo();
+    /// @}
 
     BOOL OnOpenDocument(LPCSTR path) override;
     BOOL OnSaveDocument(LPCSTR path) override;

@@ -80,6 +80,13 @@ BOOL CBoardView::PreCreateWindow(CREATESTRUCT& cs) {
 
 // --- showing ---
 
+void CBoardView::OnActivateView(BOOL activate, CView* activated, CView* deactivated) {
+    CScrollView::OnActivateView(activate, activated, deactivated);
+    if (activate) {
+        GetDocument()->MakeCurrent();
+    }
+}
+
 void CBoardView::OnInitialUpdate() {
     ShowScrollArea(); // before the base class, which draws
     CScrollView::OnInitialUpdate();
@@ -151,7 +158,7 @@ void CBoardView::OnDraw(CDC* dc) {
 }
 
 void CBoardView::DrawGrid(CDC& dc) const {
-    const int step = theApp.m_grid;
+    const int step = theApp.GetGrid();
     if (step < 4) { // closer points would be a grey area
         return;
     }
@@ -183,7 +190,7 @@ Point CBoardView::ToDrawing(CPoint point) const {
 }
 
 Point CBoardView::Snapped(Point point) const {
-    const int step = std::max(theApp.m_grid, 1);
+    const int step = std::max(theApp.GetGrid(), 1);
     const auto snap = [step](int value) { return (value + (value < 0 ? -step : step) / 2) / step * step; };
     return {snap(point.x), snap(point.y)};
 }

@@ -26,6 +26,7 @@ public:
     void OnInitialUpdate() override;
     void OnUpdate(CView* sender, LPARAM hint, CObject* object) override;
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
+    void OnActivateView(BOOL activate, CView* activated, CView* deactivated) override;
 
     afx_msg void OnLButtonDown(UINT flags, CPoint point);
     afx_msg void OnMouseMove(UINT flags, CPoint point);

@@ -95,6 +95,8 @@ struct ReadResult {
 /// understood.
 [[nodiscard]] ReadResult readDrawing(std::string_view text);
 
+/// The line of a shape in a file, without the comments before it.
+[[nodiscard]] std::string writeShape(const Shape& shape);
 /// The text of a drawing; reading it gives the same drawing.
 [[nodiscard]] std::string writeDrawing(const Drawing& drawing);
 

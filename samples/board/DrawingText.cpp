@@ -261,7 +261,7 @@ void appendQuoted(std::string& text, std::string_view plain) {
 }
 
 void appendShape(std::string& text, const Shape& shape) {
-    text.append(shape.linesBefore).append(nameOf(shape.kind));
+    text.append(nameOf(shape.kind));
     for (const int coordinate : {shape.from.x, shape.from.y, shape.to.x, shape.to.y}) {
         text.append(" ").append(std::to_string(coordinate));
     }
@@ -277,7 +277,6 @@ void appendShape(std::string& text, const Shape& shape) {
     } else {
         text.append(" width=").append(std::to_string(shape.width));
     }
-    text += '\n';
 }
 
 } // namespace
@@ -300,11 +299,19 @@ ReadResult readDrawing(std::string_view text) {
     return result;
 }
 
+std::string writeShape(const Shape& shape) {
+    std::string text;
+    appendShape(text, shape);
+    return text;
+}
+
 std::string writeDrawing(const Drawing& drawing) {
     std::string text(header);
     text += '\n';
     for (const Shape& shape : drawing.shapes) {
+        text += shape.linesBefore;
         appendShape(text, shape);
+        text += '\n';
     }
     return text + drawing.linesAfter;
 }

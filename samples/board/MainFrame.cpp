@@ -1,5 +1,6 @@
 #include "MainFrame.h"
 
+#include "Board.h"
 #include "OutputWindow.h"
 #include "Resource.h"
 #include "platform/base/Text.h"
@@ -23,6 +24,7 @@ BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
     ON_WM_CREATE()
     ON_WM_CLOSE()
     ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
+    ON_COMMAND(ID_TOOLS_CONSOLE, &CMainFrame::OnConsole)
     ON_COMMAND(ID_TOOLS_WEB_BROWSER, &CMainFrame::OnWebBrowser)
     ON_COMMAND(ID_HELP_FINDER, &CMDIFrameWnd::OnHelpFinder)
     ON_COMMAND(ID_HELP_SEARCH, &CMainFrame::OnHelpSearch)
@@ -103,6 +105,10 @@ void CMainFrame::OnRunCommand() {
         m_lastCommand = command;
         COutputWindow::Run(command, this);
     }
+}
+
+void CMainFrame::OnConsole() {
+    theApp.GetConsole().Open();
 }
 
 void CMainFrame::OnWebBrowser() {

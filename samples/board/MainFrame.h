@@ -15,6 +15,7 @@ public:
     afx_msg int OnCreate(CREATESTRUCT* cs);
     afx_msg void OnClose();
     afx_msg void OnRunCommand();
+    afx_msg void OnConsole();
     afx_msg void OnWebBrowser();
     afx_msg void OnHelpSearch();
 
