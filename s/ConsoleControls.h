@@ -32,7 +32,7 @@ public:
     void DrawItem(DRAWITEMSTRUCT* item) override;
     /// Nothing: all lines have the height of the font.
     void MeasureItem(MEASUREITEMSTRUCT* item) override {}
-    CString GetAccessibleText(int index) const;
+    CString GetAccessibleText(int index) const override;
 
 protected:
     afx_msg int OnCreate(CREATESTRUCT* cs);

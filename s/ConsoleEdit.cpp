@@ -13,7 +13,6 @@ namespace {
 constexpr UINT lineFeed = 10;
 constexpr UINT carriageReturn = 13;
 constexpr UINT backspace = 8;
-constexpr UINT searchCharacter = 0x12; // what Ctrl+R types
 
 CString TextOf(HWND window) {
     CString text;
@@ -179,11 +178,9 @@ bool Gui_ConsoleEdit::OnSearchKey(UINT key) {
 }
 
 bool Gui_ConsoleEdit::OnSearchChar(UINT character) {
-    if (character == searchCharacter) {
-        return true;
-    }
-    if (!m_search) {
-        return false;
+    const bool control = ::GetKeyState(VK_CONTROL) < 0 && ::GetKeyState(VK_MENU) >= 0;
+    if (!m_search || control) {
+        return m_search.has_value();
     }
     if (character == backspace) {
         const std::string_view pattern = m_search->pattern.GetString();

@@ -15,6 +15,7 @@ IMPLEMENT_DYNCREATE(Gui_ConsoleView, CFormView)
 BEGIN_MESSAGE_MAP(Gui_ConsoleView, CFormView)
     ON_WM_SIZE()
     ON_WM_DESTROY()
+    ON_WM_SETFOCUS()
     ON_BN_CLICKED(GUI_IDC_CONSOLE_SHOW_STATUS, &Gui_ConsoleView::OnShowStatus)
     ON_COMMAND(GUI_ID_CONSOLE_COPY, &Gui_ConsoleView::OnCopyCommands)
     ON_COMMAND(GUI_ID_CONSOLE_RUN, &Gui_ConsoleView::OnRunCommands)
@@ -71,7 +72,16 @@ void Gui_ConsoleView::OnInitialUpdate() {
     GetClientRect(&client);
     Layout(client.Width(), client.Height());
     FillList(Fill::First);
-    m_input->SetFocus();
+}
+
+// The keyboard begins in the field; later it goes back to where it was.
+void Gui_ConsoleView::OnSetFocus(CWnd* previous) {
+    if (!m_hadFocus && m_input->m_hWnd) {
+        m_input->SetFocus();
+        m_hadFocus = InputHasFocus();
+    } else {
+        CFormView::OnSetFocus(previous);
+    }
 }
 
 void Gui_ConsoleView::OnDestroy() {

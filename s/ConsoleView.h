@@ -43,6 +43,7 @@ protected:
 
     afx_msg void OnSize(UINT type, int width, int height);
     afx_msg void OnDestroy();
+    afx_msg void OnSetFocus(CWnd* previous);
     afx_msg void OnShowStatus();
     afx_msg void OnCopyCommands();
     afx_msg void OnRunCommands();
@@ -72,5 +73,6 @@ private:
     int m_showStatus;
     std::unique_ptr<Gui_ConsoleEdit> m_input;
     std::unique_ptr<Gui_ConsoleListBox> m_list;
+    bool m_hadFocus = false;
     CString m_search; ///< What the label shows instead of the prompt; empty: the prompt.
 };

@@ -3,6 +3,8 @@
 #include "s/WinApp.h"
 
 #include <functional>
+#include <utility>
+#include <vector>
 #include <string>
 #include <vector>
 
@@ -60,7 +62,11 @@ public:
     /// @}
 
     std::vector<std::string> asked; ///< what the file dialogs asked for, in order
+    void WinHelpA(DWORD_PTR data, UINT command) override {
+        help.emplace_back(data, command);
+    }
     CString version = "1.2";
+    std::vector<std::pair<DWORD_PTR, UINT>> help; ///< number and command of each request
     std::function<void()> idle; ///< called in the idle time
 };
 
