@@ -12,6 +12,7 @@
 #include "platform/afx/core/Clipboard.h"
 #include "platform/afx/core/CommandLineInfo.h"
 #include "platform/afx/core/DropFiles.h"
+#include "platform/afx/core/KeyNames.h"
 #include "platform/afx/core/Menu.h"
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/MessageMap.h"

@@ -243,6 +243,11 @@
 #define TVX_IDS_APPLY 0xF340
 #define TVX_IDS_HELP 0xF341
 #define TVX_IDS_CLOSE 0xF342
+#define TVX_IDS_KEYPAD 0xF350
+#define TVX_IDS_NO_KEY 0xF351
+
+/* The name of a virtual key is the string of this number plus its own */
+#define TVX_IDS_KEY 0xF400
 
 /* Dialogs of the system: there is help on them under these numbers, no template */
 #define AFX_IDD_FILEOPEN 28676

@@ -1,4 +1,5 @@
 #include "platform/afx/controls/Controls.h"
+#include "platform/afx/controls/HotKey.h"
 
 #include <cstring>
 #include <vector>
@@ -9,6 +10,7 @@ IMPLEMENT_DYNAMIC(CEdit, CWnd)
 IMPLEMENT_DYNAMIC(CListBox, CWnd)
 IMPLEMENT_DYNAMIC(CComboBox, CWnd)
 IMPLEMENT_DYNAMIC(CScrollBar, CWnd)
+IMPLEMENT_DYNAMIC(CHotKeyCtrl, CWnd)
 
 BOOL CStatic::Create(LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id) {
     return CWnd::Create("Static", text, style, rect, parent, id);
@@ -32,6 +34,10 @@ BOOL CComboBox::Create(DWORD style, const RECT& rect, CWnd* parent, UINT id) {
 
 BOOL CScrollBar::Create(DWORD style, const RECT& rect, CWnd* parent, UINT id) {
     return CWnd::Create("ScrollBar", nullptr, style, rect, parent, id);
+}
+
+BOOL CHotKeyCtrl::Create(DWORD style, const RECT& rect, CWnd* parent, UINT id) {
+    return CWnd::Create("msctls_hotkey32", nullptr, style, rect, parent, id);
 }
 
 // --- owner drawing ---

@@ -31,21 +31,19 @@ std::shared_ptr<Table> tableOf(HACCEL handle) {
     return accelerators().find(reinterpret_cast<std::uintptr_t>(handle));
 }
 
-BYTE modifiersNow() {
-    BYTE down = 0;
-    down |= isKeyDown(VK_SHIFT) ? FSHIFT : 0;
-    down |= isKeyDown(VK_CONTROL) ? FCONTROL : 0;
-    down |= isKeyDown(VK_MENU) ? FALT : 0;
-    return down;
+/// Whether the entry's modifiers are down beside its key, and no others.
+bool hasModifiers(const ACCEL& entry) {
+    const auto held = acceleratorModifiers(entry.key);
+    return held && held->shift == ((entry.fVirt & FSHIFT) != 0) && held->control == ((entry.fVirt & FCONTROL) != 0) &&
+           held->alt == ((entry.fVirt & FALT) != 0);
 }
 
 bool matches(const ACCEL& entry, const MSG& message) {
-    constexpr BYTE modifiers = FSHIFT | FCONTROL | FALT;
     const bool virtualKey = (entry.fVirt & FVIRTKEY) != 0;
     switch (message.message) {
     case WM_KEYDOWN:
     case WM_SYSKEYDOWN:
-        return virtualKey && entry.key == message.wParam && (entry.fVirt & modifiers) == modifiersNow();
+        return virtualKey && entry.key == message.wParam && hasModifiers(entry);
     case WM_CHAR:
         return !virtualKey && (entry.fVirt & FALT) == 0 && entry.key == message.wParam;
     case WM_SYSCHAR:

@@ -138,6 +138,11 @@
 #define SBM_SETSCROLLINFO 0x00E9
 #define SBM_GETSCROLLINFO 0x00EA
 
+// Hot-key controls
+#define HKM_SETHOTKEY (WM_USER + 1)
+#define HKM_GETHOTKEY (WM_USER + 2)
+#define HKM_SETRULES (WM_USER + 3)
+
 // Owner-drawn controls
 #define ODT_MENU 1
 #define ODT_LISTBOX 2

@@ -168,6 +168,19 @@ TEST(Translation, OfMessageBoxesWithItsMnemonics) {
         of({{"ENU", "&Yes &No Cancel"}, {"DEU", "&Ja &Nein Abbrechen"}, {"JPN", "はい(&Y) いいえ(&N) キャンセル"}}));
 }
 
+TEST(Translation, OfKeys) {
+    std::string names;
+    for (const UINT key : {VK_CONTROL, VK_SHIFT, VK_LEFT, VK_RETURN, VK_NUMPAD4}) {
+        char name[50] = "";
+        GetKeyNameText(static_cast<LONG>(MapVirtualKey(key, 0) << 16 | (key == VK_LEFT ? 1U << 24 : 0)), name,
+                       sizeof name);
+        names += name + std::string(", ");
+    }
+    EXPECT_EQ(names, of({{"ENU", "Ctrl, Shift, Left, Enter, Num 4, "},
+                         {"DEU", "Strg, Umschalt, Links, Eingabe, Num 4, "},
+                         {"JPN", "Ctrl, Shift, 左, Enter, テンキー 4, "}}));
+}
+
 TEST(Translation, OfSystemMenus) {
     const Frame frame;
     EXPECT_EQ(itemText(*frame->GetSystemMenu(FALSE), SC_CLOSE, MF_BYCOMMAND),

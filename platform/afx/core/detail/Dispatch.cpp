@@ -100,6 +100,11 @@ bool preTranslate(MSG& msg) {
     if (preTranslateDone) {
         return false;
     }
+    const bool key = msg.message >= WM_KEYFIRST && msg.message <= WM_KEYLAST;
+    const Window* target = key ? Window::from(msg.hwnd) : nullptr;
+    if (target && target->takesShortcuts()) {
+        return target->object() && target->object()->PreTranslateMessage(&msg);
+    }
     CWinThread* thread = AfxGetThread();
     // Handlers may run loops of their own, each with answers of its own.
     const bool outer = std::exchange(handedToWindow, false);

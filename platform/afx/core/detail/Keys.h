@@ -8,15 +8,15 @@
 
 #include <QKeyEvent>
 
+#include <optional>
+
 namespace tvx::afx {
 
 /// The virtual key (VK_...) of a key event, 0 for a key that has none. A letter key keeps its Latin letter under
 /// layouts that have none, so that accelerators work there.
 TVX_PLATFORM_API int virtualKey(const QKeyEvent& event);
-/// The toolkit's key for a virtual key; Qt::Key_unknown when there is none.
-TVX_PLATFORM_API Qt::Key keyOf(int virtualKey);
-/// The second parameter of a key message: repeat count 1, scan code, previous and transition state.
-LPARAM keyParameter(const QKeyEvent& event, bool released);
+/// The second parameter of a key message: repeat count 1, scan code and extended bit, previous and transition state.
+TVX_PLATFORM_API LPARAM keyParameter(const QKeyEvent& event, bool released);
 /// The mouse buttons and modifier keys as MK_... bits.
 TVX_PLATFORM_API WPARAM buttonFlags(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers);
 /// Keeps track of the keys that are down; called for every key event.
@@ -28,6 +28,17 @@ void noteTime(const QKeyEvent& event);
 /// Forgets all keys; called when the application loses the keyboard, since releases are not seen from then on.
 void forgetKeys();
 TVX_PLATFORM_API bool isKeyDown(int virtualKey);
+
+/// The modifiers of accelerators and hot keys.
+struct HeldModifiers {
+    bool shift = false;
+    bool control = false;
+    bool alt = false;
+};
+/// Those that are down. AltGr counts as Ctrl and Alt.
+HeldModifiers modifiersHeld();
+/// The same beside a key that is pressed; nothing where AltGr makes it type a character, which is no accelerator.
+std::optional<HeldModifiers> acceleratorModifiers(int virtualKey);
 /// Whether a lock key (VK_CAPITAL, VK_NUMLOCK, VK_SCROLL) is on. False for other keys, and where the desktop does not
 /// tell.
 bool isKeyLocked(int virtualKey);

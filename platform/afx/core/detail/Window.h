@@ -120,6 +120,10 @@ public:
     virtual bool passesMouse() const {
         return false;
     }
+    /// Whether keys are its own before short-cuts, menus and dialogs around it may act on them.
+    virtual bool takesShortcuts() const {
+        return false;
+    }
     /// Its own active child frame, for a window that holds such.
     virtual Window* heldChildFrame() const {
         return nullptr;

@@ -5,6 +5,7 @@
 #define IDD_STRANGE 102
 #define IDD_GRID_PAGE 103
 #define IDD_COLOR_PAGE 104
+#define IDD_HOT_KEY 105
 
 #define IDC_NAME 1001
 #define IDC_SCALE 1002
@@ -19,5 +20,6 @@
 #define IDC_APPLY 1060
 #define IDC_WIDTH 1070
 #define IDC_DARK 1071
+#define IDC_HOT_KEY 1080
 
 #define IDS_OTHER_TITLE 200
