@@ -1,8 +1,44 @@
 #include "platform/afx/core/KeyNames.h"
 
+#include "platform/afx/core/detail/KeyLayout.h"
 #include "platform/afx/core/detail/KeyTable.h"
+#include "platform/afx/core/detail/Keys.h"
+#include "platform/afx/core/detail/OwnText.h"
 #include "platform/base/Text.h"
+#include "platform/win/FrameworkIds.h"
 #include "platform/win/ResourceConstants.h"
+
+namespace tvx::afx {
+
+namespace {
+
+/// What is on a key, in the user's layout where that is known; letters and digits are their own signs.
+char32_t signOf(int virtualKey) {
+    const KeyLayout* layout = presentLayout();
+    const char32_t sign = layout && usualSign(virtualKey) != virtualKey ? layout->sign(virtualKey) : 0;
+    return sign != 0 ? QChar::toUpper(sign) : usualSign(virtualKey);
+}
+
+QString toText(char32_t sign) {
+    return QString::fromUcs4(&sign, 1);
+}
+
+} // namespace
+
+QString keyName(int virtualKey) {
+    if (virtualKey >= VK_F1 && virtualKey <= VK_F24) {
+        return QStringLiteral("F%1").arg(virtualKey - VK_F1 + 1);
+    }
+    if (isKeypadSign(virtualKey)) {
+        return ownText(TVX_IDS_KEYPAD).arg(toText(signOf(virtualKey)));
+    }
+    if (isCharacterKey(virtualKey) && virtualKey != VK_SPACE) {
+        return toText(signOf(virtualKey));
+    }
+    return scanCodeOf(virtualKey) != 0 ? ownText(static_cast<UINT>(TVX_IDS_KEY + virtualKey)) : QString();
+}
+
+} // namespace tvx::afx
 
 using namespace tvx::afx;
 
@@ -16,7 +52,7 @@ UINT characterOf(int virtualKey) {
     case VK_ESCAPE:
         return static_cast<UINT>(virtualKey); // their control characters
     default:
-        return usualSign(virtualKey);
+        return signOf(virtualKey);
     }
 }
 

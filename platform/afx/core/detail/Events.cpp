@@ -63,7 +63,7 @@ bool deliverInput(const MSG& msg, QObject* receiver, QEvent* event) {
 
 bool isSystemKey(const QKeyEvent& event) {
     const bool alt = event.modifiers().testFlag(Qt::AltModifier) && !event.modifiers().testFlag(Qt::ControlModifier);
-    return alt || event.key() == Qt::Key_F10 || event.key() == Qt::Key_Alt;
+    return alt || event.key() == Qt::Key_F10 || virtualKey(event) == VK_MENU;
 }
 
 MSG keyMessage(const Window& window, const QKeyEvent& event, bool released) {
@@ -146,7 +146,7 @@ bool onKeyRelease(Window& window, QObject* receiver, QKeyEvent& event) {
     if (keepForPeek(msg, receiver, &event)) {
         return true;
     }
-    if (event.key() == Qt::Key_Alt) {
+    if (virtualKey(event) == VK_MENU) {
         // Only a lone Alt opens the menu; the release of an Alt that was used with another key is an ordinary one.
         msg.message = altAlone ? WM_SYSKEYUP : WM_KEYUP;
         altAlone = false;
@@ -452,13 +452,13 @@ void watchKeys(const QEvent& event) {
     const auto& key = static_cast<const QKeyEvent&>(event);
     const bool down = event.type() == QEvent::KeyPress;
     // The toolkit drops the release of a key whose press opened a modal dialog when it comes before that has the
-    // keyboard; later keys tell that a modifier is up.
-    const bool isModifier = key.key() >= Qt::Key_Shift && key.key() <= Qt::Key_Alt;
+    // keyboard, and a press in another program's window is never seen; later keys tell of modifiers.
+    const bool isModifier = (key.key() >= Qt::Key_Shift && key.key() <= Qt::Key_Alt) || key.key() == Qt::Key_AltGr;
     for (const auto& [flag, modifier] :
          {std::pair(Qt::ShiftModifier, VK_SHIFT), std::pair(Qt::ControlModifier, VK_CONTROL),
-          std::pair(Qt::AltModifier, VK_MENU)}) {
-        if (!isModifier && !key.modifiers().testFlag(flag)) {
-            noteKey(modifier, false);
+          std::pair(Qt::AltModifier, VK_MENU), std::pair(Qt::GroupSwitchModifier, VK_RMENU)}) {
+        if (!isModifier) {
+            noteKey(modifier, key.modifiers().testFlag(flag));
         }
     }
     noteTime(key);

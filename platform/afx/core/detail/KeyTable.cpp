@@ -1,7 +1,5 @@
 #include "platform/afx/core/detail/KeyTable.h"
 
-#include "platform/afx/core/detail/OwnText.h"
-#include "platform/win/FrameworkIds.h"
 #include "platform/win/ResourceConstants.h"
 
 #include <algorithm>
@@ -220,6 +218,10 @@ int scanCodeOf(int virtualKey) {
     return row ? row->scanCode : 0;
 }
 
+bool isKeypadSign(int virtualKey) {
+    return rowWith(&KeyRow::virtualKey, virtualKey, keypadRows) != nullptr;
+}
+
 bool isCharacterKey(int virtualKey) {
     const KeyRow* row = rowWith(&KeyRow::virtualKey, virtualKey, mainKeys());
     return row && row->key < Qt::Key_Escape;
@@ -231,18 +233,6 @@ char16_t usualSign(int virtualKey) {
         return 0;
     }
     return row->sign != 0 ? row->sign : static_cast<char16_t>(row->key);
-}
-
-QString keyName(int virtualKey) {
-    if (virtualKey >= VK_F1 && virtualKey <= VK_F24) {
-        return QStringLiteral("F%1").arg(virtualKey - VK_F1 + 1);
-    }
-    if (rowWith(&KeyRow::virtualKey, virtualKey, keypadRows)) {
-        return ownText(TVX_IDS_KEYPAD).arg(QChar(usualSign(virtualKey)));
-    }
-    const bool known = scanCodeOf(virtualKey) != 0;
-    const QString own = known ? ownText(static_cast<UINT>(TVX_IDS_KEY + virtualKey)) : QString();
-    return known && own.isEmpty() ? QString(QChar(usualSign(virtualKey))) : own;
 }
 
 } // namespace tvx::afx

@@ -3,8 +3,6 @@
 /// @file
 /// The one table of keys: virtual keys, their scan codes and the toolkit's numbers for them.
 
-#include <QString>
-
 namespace tvx::afx {
 
 /// Bit of a scan code: the key stands outside of the keypad whose key has the same code.
@@ -20,11 +18,11 @@ inline constexpr int extendedKey = 0x100;
 [[nodiscard]] int virtualKeyAt(int scanCode);
 /// The scan code of a virtual key, with extendedKey; 0 for what is no key of a keyboard.
 [[nodiscard]] int scanCodeOf(int virtualKey);
-/// Whether a key types a character that depends on the layout.
+/// Whether a key of the keypad types something.
+[[nodiscard]] bool isKeypadSign(int virtualKey);
+/// Whether a key outside of the keypad types a character that depends on the layout.
 [[nodiscard]] bool isCharacterKey(int virtualKey);
 /// What the usual layout has on such a key, or on a key of the keypad; 0 for other keys.
 [[nodiscard]] char16_t usualSign(int virtualKey);
-/// The name of a key in the user's language; empty for what is no key of a keyboard.
-[[nodiscard]] QString keyName(int virtualKey);
 
 } // namespace tvx::afx

@@ -1,6 +1,7 @@
 #include "platform/afx/core/detail/Keys.h"
 
 #include "platform/afx/core/Message.h"
+#include "platform/afx/core/detail/KeyLayout.h"
 #include "platform/afx/core/detail/KeyTable.h"
 #include "platform/win/Display.h"
 
@@ -20,12 +21,51 @@ constexpr std::array<int, 10> shiftedDigits{
     Qt::Key_ParenRight, Qt::Key_Exclam,      Qt::Key_At,        Qt::Key_NumberSign, Qt::Key_Dollar,
     Qt::Key_Percent,    Qt::Key_AsciiCircum, Qt::Key_Ampersand, Qt::Key_Asterisk,   Qt::Key_ParenLeft};
 
-/// X key codes are the codes of the kernel plus this, and those of the main block are scan codes.
-constexpr quint32 firstKeyCode = 8;
+// What the display calls keys that the toolkit has no number for, or another one's.
+constexpr quint32 metaLeft = 0xFFE7;
+constexpr quint32 metaRight = 0xFFE8;
+constexpr quint32 breakKey = 0xFF6B;
+/// The key code of the keypad's second sign between digits, which few keyboards have.
+constexpr quint32 separatorKey = 129;
 
-int letterByPlace(quint32 keyCode) {
-    const int key = keyCode > firstKeyCode ? virtualKeyAt(static_cast<int>(keyCode - firstKeyCode)) : 0;
-    return key >= 'A' && key <= 'Z' ? key : 0;
+int keypadKey(const QKeyEvent& event) {
+    if (!event.modifiers().testFlag(Qt::KeypadModifier)) {
+        return 0;
+    }
+    const bool decimal = event.key() == Qt::Key_Comma && event.nativeScanCode() != separatorKey;
+    return decimal ? VK_DECIMAL : keypadKeyOf(event.key());
+}
+
+/// Keys that type no character, and the blank.
+int functionKey(const QKeyEvent& event) {
+    switch (event.nativeVirtualKey()) {
+    case metaLeft:
+    case metaRight:
+        return VK_MENU; // Alt that was pressed after Shift
+    case breakKey:
+        return VK_CANCEL;
+    default:
+        break;
+    }
+    const int known = virtualKeyOf(event.key());
+    return isCharacterKey(known) && known != VK_SPACE ? 0 : known;
+}
+
+/// By what the key types with the modifiers that are held, where the layout is not known.
+int characterKey(const QKeyEvent& event) {
+    const int key = event.key();
+    const int known = virtualKeyOf(key);
+    const int place = characterKeyAt(event.nativeScanCode());
+    // A key of the digits' row is its digit, whatever it types.
+    if (place >= '0' && place <= '9' && (known < '0' || known > '9')) {
+        return place;
+    }
+    const auto digit = std::find(shiftedDigits.begin(), shiftedDigits.end(), key);
+    if (digit != shiftedDigits.end() && event.modifiers().testFlag(Qt::ShiftModifier)) {
+        return '0' + static_cast<int>(digit - shiftedDigits.begin());
+    }
+    // On the layouts of other scripts letters are known by their place, so that Ctrl+C is where it was.
+    return known != 0 ? known : place;
 }
 
 /// The lock keys as they were when somebody asked last; empty since the keyboard was used again.
@@ -47,19 +87,16 @@ std::bitset<256>& keysDown() {
 } // namespace
 
 int virtualKey(const QKeyEvent& event) {
-    const int key = event.key();
-    if (event.modifiers().testFlag(Qt::KeypadModifier)) {
-        if (const int pad = keypadKeyOf(key); pad != 0) {
-            return pad;
-        }
+    if (const int pad = keypadKey(event)) {
+        return pad;
     }
-    const auto digit = std::find(shiftedDigits.begin(), shiftedDigits.end(), key);
-    if (digit != shiftedDigits.end() && event.modifiers().testFlag(Qt::ShiftModifier)) {
-        return '0' + static_cast<int>(digit - shiftedDigits.begin());
+    if (const int function = functionKey(event)) {
+        return function;
     }
-    const int known = virtualKeyOf(key);
-    // On the layouts of other scripts letters are known by their place, so that Ctrl+C is where it was.
-    return known != 0 ? known : letterByPlace(event.nativeScanCode());
+    // By place, since the display tells of the sign that the modifiers make, and of another one when they go first.
+    const KeyLayout* layout = event.nativeScanCode() != 0 ? layoutOf(event.nativeModifiers()) : nullptr;
+    const int placed = layout ? layout->virtualKey(event.nativeScanCode()) : 0;
+    return placed != 0 ? placed : characterKey(event);
 }
 
 LPARAM keyParameter(const QKeyEvent& event, bool released) {

@@ -19,6 +19,9 @@ TVX_PLATFORM_API int virtualKey(const QKeyEvent& event);
 TVX_PLATFORM_API LPARAM keyParameter(const QKeyEvent& event, bool released);
 /// The mouse buttons and modifier keys as MK_... bits.
 TVX_PLATFORM_API WPARAM buttonFlags(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers);
+/// The name of a key in the user's language, or the sign that it has on the user's layout; empty for what is no key of
+/// a keyboard.
+QString keyName(int virtualKey);
 /// Keeps track of the keys that are down; called for every key event.
 void noteKey(int virtualKey, bool down);
 /// Whether a press repeats one that lasts.

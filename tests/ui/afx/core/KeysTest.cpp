@@ -1,11 +1,13 @@
 #include "platform/afx/core/detail/Keys.h"
 #include "afxwin.h"
+#include "platform/afx/core/detail/KeyLayout.h"
 #include "platform/afx/core/detail/Window.h"
 
 #include <QMenu>
 #include <QTest>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstring>
 #include <map>
 #include <string>
@@ -128,6 +130,108 @@ TEST_F(Keys, AreMappedToScanCodesAndCharacters) {
     EXPECT_EQ(GetKeyNameText(0x390000, name, sizeof(name)), 3);
     EXPECT_STREQ(name, "Spa");
     EXPECT_EQ(GetKeyNameText(0x390000, name, 0), 0);
+}
+
+/// A layout from what its keys type, row by row from the digits to the bottom, then the key beside the left Shift key
+/// and the two that Japanese keyboards have. A blank stands for a key that there is not.
+tvx::afx::KeyLayout layoutOf(const std::u32string& plain, const std::u32string& shifted) {
+    std::vector<unsigned> codes;
+    for (const auto& [first, last] :
+         {std::pair(10U, 21U), std::pair(24U, 35U), std::pair(38U, 49U), std::pair(51U, 61U), std::pair(94U, 94U),
+          std::pair(97U, 97U), std::pair(132U, 132U)}) {
+        for (unsigned code = first; code <= last; ++code) {
+            codes.push_back(code);
+        }
+    }
+    std::vector<tvx::KeySigns> signs(256);
+    for (std::size_t key = 0; key < plain.size(); ++key) {
+        signs[codes.at(key)] = {plain[key] != U' ' ? plain[key] : 0, shifted.at(key)};
+    }
+    return tvx::afx::KeyLayout(signs);
+}
+
+TEST(KeyLayouts, GiveEachKeyAVirtualKeyOfItsOwn) {
+    struct Layout {
+        const char* name;
+        std::u32string plain;
+        std::u32string shifted;
+        std::vector<std::pair<unsigned, int>> keys; ///< key codes, and what they are to be
+    };
+    const Layout table[] = {
+        {"us",
+         U"1234567890-=qwertyuiop[]asdfghjkl;'`\\zxcvbnm,./<",
+         U"!@#$%^&*()_+QWERTYUIOP{}ASDFGHJKL:\"~|ZXCVBNM<>?>",
+         {{10, '1'},
+          {20, VK_OEM_MINUS},
+          {21, VK_OEM_PLUS},
+          {24, 'Q'},
+          {34, VK_OEM_4},
+          {47, VK_OEM_1},
+          {51, VK_OEM_5},
+          {59, VK_OEM_COMMA},
+          {61, VK_OEM_2},
+          {94, VK_OEM_102}}},
+        {"de",
+         U"1234567890ß´qwertzuiopü+asdfghjklöä^#yxcvbnm,.-<",
+         U"!\"§$%&/()=?`QWERTZUIOPÜ*ASDFGHJKLÖÄ°'YXCVBNM;:_>",
+         {{16, '7'},
+          {29, 'Z'},
+          {52, 'Y'},
+          {34, VK_OEM_4},
+          {35, VK_OEM_PLUS},
+          {47, VK_OEM_1},
+          {48, VK_OEM_7},
+          {51, VK_OEM_5},
+          {59, VK_OEM_COMMA},
+          {60, VK_OEM_PERIOD},
+          {61, VK_OEM_MINUS},
+          {94, VK_OEM_102}}},
+        {"fr",
+         U"&é\"'(-è_çà)=azertyuiop^$qsdfghjklmù²*wxcvbn,;:!<",
+         U"1234567890°+AZERTYUIOP¨£QSDFGHJKLM%~µWXCVBN?./§>",
+         {{10, '1'},
+          {15, '6'},
+          {19, '0'},
+          {21, VK_OEM_PLUS},
+          {24, 'A'},
+          {47, 'M'},
+          {58, VK_OEM_COMMA},
+          {59, VK_OEM_PERIOD},
+          {60, VK_OEM_1},
+          {61, VK_OEM_2}}},
+        {"ru",
+         U"1234567890-=йцукенгшщзхъфывапролджэё\\ячсмитьбю./",
+         U"!\"№;%:?*()_+ЙЦУКЕНГШЩЗХЪФЫВАПРОЛДЖЭЁ/ЯЧСМИТЬБЮ,|",
+         {{12, '3'}, {24, 'Q'}, {54, 'C'}, {34, VK_OEM_4}, {59, VK_OEM_COMMA}, {60, VK_OEM_PERIOD}, {61, VK_OEM_2}}},
+        {"gr",
+         U"1234567890-=;ςερτυθιοπ[]ασδφγηξκλ΄'`\\ζχψωβνμ,./«",
+         U"!@#$%^&*()_+:¦ΕΡΤΥΘΙΟΠ{}ΑΣΔΦΓΗΞΚΛ¨\"~|ΖΧΨΩΒΝΜ<>?»",
+         {{24, 'Q'}, {25, 'W'}, {47, VK_OEM_1}, {54, 'C'}}},
+        {"jp",
+         U"1234567890-^qwertyuiop@[asdfghjkl;: ]zxcvbnm,./ \\\\",
+         U"!\"#$%&'() =~QWERTYUIOP`{ASDFGHJKL+* }ZXCVBNM<>? _|",
+         {{20, VK_OEM_MINUS}, {35, VK_OEM_4}, {47, VK_OEM_PLUS}, {48, VK_OEM_1}, {51, VK_OEM_6}}},
+        {"tr",
+         U"1234567890*-qwertyuıopğüasdfghjklşi\",zxcvbnmöç.<",
+         U"!'^+%&/()=?_QWERTYUIOPĞÜASDFGHJKLŞİé;ZXCVBNMÖÇ:>",
+         {{13, '4'}, {21, VK_OEM_MINUS}, {48, 'I'}, {51, VK_OEM_COMMA}, {61, VK_OEM_PERIOD}}},
+    };
+    for (const Layout& layout : table) {
+        const tvx::afx::KeyLayout made = layoutOf(layout.plain, layout.shifted);
+        for (const auto& [code, key] : layout.keys) {
+            EXPECT_EQ(made.virtualKey(code), key) << layout.name << ", key " << code;
+        }
+        std::map<int, unsigned> places;
+        for (unsigned code = 0; code < 256; ++code) {
+            if (const int key = made.virtualKey(code)) {
+                EXPECT_TRUE(places.emplace(key, code).second) << layout.name << ": " << code << " and " << places[key];
+                EXPECT_NE(made.sign(key), 0U) << layout.name << ", key " << code;
+            }
+        }
+        EXPECT_EQ(places.size(), layout.plain.size() - std::ranges::count(layout.plain, U' ')) << layout.name;
+    }
+    EXPECT_EQ(layoutOf(table[1].plain, table[1].shifted).sign(VK_OEM_4), U'ü');
+    EXPECT_EQ(tvx::afx::KeyLayout({}).virtualKey(24), 0);
 }
 
 } // namespace
