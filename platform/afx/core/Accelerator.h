@@ -14,11 +14,12 @@
 #define FALT 0x10
 
 /// One key of a table.
-struct ACCEL {
+struct tagACCEL {
     BYTE fVirt; ///< FVIRTKEY and the modifiers that must be down; without FVIRTKEY `key` is a character
     WORD key;   ///< VK_..., or a character of at most 16 bits
     WORD cmd;   ///< the command it stands for
 };
+using ACCEL = tagACCEL;
 using LPACCEL = ACCEL*;
 
 /// A table made from a resource of one module (null: the application). Null when there is none

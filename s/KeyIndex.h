@@ -1,0 +1,20 @@
+#pragma once
+
+#include "s/AccelMap.h"
+
+#include <span>
+#include <vector>
+
+/// The accelerators of a map by their commands. The map is a table by keys: whoever asks for the keys of each command
+/// of a menu makes an index once.
+class KeyIndex {
+public:
+    /// Changes of the map do not show later.
+    explicit KeyIndex(const Gui_AccelMap& map);
+
+    /// The keys of a command, in the order of Gui_AccelMap::GetAccelAt.
+    [[nodiscard]] std::span<const Gui_Accel> keysOf(UINT command) const;
+
+private:
+    std::vector<Gui_Accel> m_accels;
+};
