@@ -117,7 +117,7 @@ TEST(Translation, OfTheLibrarysMenu) {
 
 TEST(Translation, OfEveryDialogFitsIntoItsControls) {
     for (const UINT id : {GUI_IDD_ABOUT, GUI_IDD_ACCELERATORS, GUI_IDD_QUERY, GUI_IDD_DIRECTORY, GUI_IDD_CONSOLE,
-                          GUI_IDD_TOPICS, GUI_IDD_BROWSER, GUI_IDD_PROPERTIES, AFX_IDD_NEWTYPEDLG}) {
+                          GUI_IDD_TOPICS, GUI_IDD_BROWSER, GUI_IDD_PROPERTIES, GUI_IDD_COMMANDS, AFX_IDD_NEWTYPEDLG}) {
         const Frame owner;
         CDialog dialog;
         if (!dialog.Create(id, owner.get())) {

@@ -17,6 +17,15 @@ const std::map<UINT, std::string> strings = {
     {20026, "Display program information and copyright\nAbout"},
     {20027, "Copy selected commands to the clipboard\nCopy"},
     {20028, "Run the selected commands\nRun"},
+    {20029, "&Done"},
+    {20030, "%1 was taken from %2"},
+    {20031, "Press the key to look for."},
+    {20032, "a command without a menu item"},
+    {20033, "No command matches."},
+    {20034, "Unavailable now."},
+    {20035, "unavailable"},
+    {20036, "checked"},
+    {20037, "Press the key a second time to be done."},
     {20060, "The tutorial program %1 could not be started."},
     {20061, "%1 is assigned to %2"},
     {20062, "%1 is assigned to the %2 menu"},
@@ -100,7 +109,7 @@ TEST(Resources, EveryStringIsThereAndNoOther) {
 
 TEST(Resources, EveryDialogAndTheMenuAreThere) {
     DWORD size = 0;
-    for (int id = GUI_IDD_SPLASH; id <= GUI_IDD_PROPERTIES; ++id) {
+    for (int id = GUI_IDD_SPLASH; id <= GUI_IDD_COMMANDS; ++id) {
         EXPECT_NE(find(MAKEINTRESOURCE(id), RT_DIALOG, size), nullptr) << id;
     }
     EXPECT_NE(find(MAKEINTRESOURCE(GUI_IDM_CONSOLE), RT_MENU, size), nullptr);
