@@ -2,6 +2,7 @@
 #include "s/WinApp.h"
 
 #include "afxdlgs.h"
+#include "platform/base/SystemPath.h"
 #include "s/FileName.h"
 #include "s/MainWindow.h"
 
@@ -11,7 +12,7 @@ HWND Gui_WinApp::GetOwnerForFileDialog() {
 
 CString Gui_WinApp::GetInitialDirForFileDialog(const CString& fileName) {
     const Gui_FileName name(fileName);
-    return name.HasAbsolutePath() ? name.GetMountAndPath() : Gui_FileName().GetMountAndPath();
+    return name.HasAbsolutePath() ? name.GetMountAndPath() : CString(tvx::currentFolderName().c_str());
 }
 
 CString Gui_WinApp::GetBaseNameForFileDialog(const CString& fileName) {

@@ -1,19 +1,14 @@
 #include "platform/afx/dialogs/FileDialog.h"
 
 #include "platform/afx/core/detail/Paths.h"
-#include "platform/afx/dialogs/detail/ToolkitDialog.h"
+#include "platform/afx/dialogs/detail/FileDialogWindow.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/SystemPath.h"
 #include "platform/base/Text.h"
-#include "platform/win/FrameworkIds.h"
-
-#include <QFileDialog>
-#include <QFileInfo>
-#include <QHeaderView>
-#include <QScreen>
-#include <QTreeView>
 
 #include <cstring>
+#include <filesystem>
+#include <string>
 
 using namespace tvx::afx;
 
@@ -45,138 +40,74 @@ BOOL CFileDialog::OnFileNameOK() {
     return 0;
 }
 
+INT_PTR CFileDialog::DoModal() {
+    if (!ensureGui()) {
+        return IDCANCEL;
+    }
+    FileIcons icons;
+    FileDialogWindow dialog(m_ofn, m_bOpenFileDialog != FALSE, icons);
+    dialog.isAccepted = [this, &dialog](const QStringList& files) {
+        m_paths.clear();
+        for (const QString& file : files) {
+            m_paths.emplace_back(tvx::driveName(fromQt(file)).c_str());
+        }
+        m_ofn.nFilterIndex = dialog.filterIndex();
+        fillRecord();
+        return OnFileNameOK() == 0;
+    };
+    if (!dialog.ask()) {
+        return IDCANCEL;
+    }
+    if ((m_ofn.Flags & OFN_NOCHANGEDIR) == 0) {
+        std::error_code ignored;
+        std::filesystem::current_path(tvx::systemPath(folderOf(m_paths.front()).View()).value_or(""), ignored);
+    }
+    return IDOK;
+}
+
 namespace {
 
-/// A filter as the toolkit writes it: "Boards (*.brd) (*.brd)"; the pattern "*.*" means all files.
-QStringList filtersOf(LPCSTR text) {
-    QStringList filters;
-    while (text && *text != '\0') {
-        const QString description = toQt(text);
-        text += std::strlen(text) + 1;
-        QString patterns = toQt(text);
-        text += std::strlen(text) + 1;
-        patterns.replace(QLatin1Char(';'), QLatin1Char(' '));
-        if (patterns == QLatin1String("*.*")) {
-            patterns = QStringLiteral("*");
-        }
-        QString name = description.section(QLatin1Char('('), 0, 0).trimmed();
-        filters.append(QStringLiteral("%1 (%2)").arg(name.isEmpty() ? description : name, patterns));
-    }
-    return filters;
-}
-
-class Dialog : public ToolkitDialog<QFileDialog> {
-public:
-    Dialog(HWND owner, UINT title, UINT help) : ToolkitDialog(owner, title, help) {
-        showColumnsWhole();
-    }
-    std::function<bool()> isAccepted;
-
-    /// The toolkit calls this from slots of its own. A host whose OnFileNameOK throws ends the loop with that.
-    void done(int result) override {
-        storing([&] {
-            if (result != QDialog::Accepted || isAccepted()) {
-                ToolkitDialog::done(result);
-            }
-        });
-    }
-
-private:
-    /// The columns behind the name are as wide as what they show, and the name takes the rest.
-    void showColumnsWhole() {
-        auto* list = findChild<QTreeView*>(QStringLiteral("treeView"));
-        if (!list) {
-            return;
-        }
-        QHeaderView* header = list->header();
-        header->setStretchLastSection(false);
-        header->setSectionResizeMode(QHeaderView::ResizeToContents);
-        header->setSectionResizeMode(0, QHeaderView::Stretch);
-        const QSize room = screen()->availableGeometry().size() * 9 / 10;
-        resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(130, 70)).boundedTo(room));
-    }
-};
-
-void labelDialog(Dialog& dialog, bool open) {
-    dialog.setLabelText(QFileDialog::LookIn, ownText(open ? TVX_IDS_FILE_LOOK_IN : TVX_IDS_FILE_SAVE_IN));
-    dialog.setLabelText(QFileDialog::FileName, ownText(TVX_IDS_FILE_NAME));
-    dialog.setLabelText(QFileDialog::FileType, ownText(TVX_IDS_FILE_TYPE));
-    dialog.setLabelText(QFileDialog::Accept, ownText(open ? TVX_IDS_FILE_OPEN : TVX_IDS_FILE_SAVE));
-    dialog.setLabelText(QFileDialog::Reject, ownText(TVX_IDS_FILE_CANCEL));
-}
-
-void fillDialog(Dialog& dialog, const OPENFILENAME& record, bool open) {
-    const bool several = (record.Flags & OFN_ALLOWMULTISELECT) != 0;
-    const bool mustExist = (record.Flags & OFN_FILEMUSTEXIST) != 0;
-    dialog.setAcceptMode(open ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);
-    dialog.setFileMode(!open || !mustExist ? QFileDialog::AnyFile
-                       : several           ? QFileDialog::ExistingFiles
-                                           : QFileDialog::ExistingFile);
-    labelDialog(dialog, open);
-    dialog.setOption(QFileDialog::DontConfirmOverwrite, (record.Flags & OFN_OVERWRITEPROMPT) == 0);
-    if (record.lpstrTitle) {
-        dialog.setWindowTitle(toQt(record.lpstrTitle));
-    }
-    const QStringList filters = filtersOf(record.lpstrFilter);
-    dialog.setNameFilters(filters);
-    const auto chosen = static_cast<qsizetype>(record.nFilterIndex) - 1;
-    if (chosen >= 0 && chosen < filters.size()) {
-        dialog.selectNameFilter(filters[chosen]);
-    }
-    // Some hosts say "*.*" where they mean none.
-    if (record.lpstrDefExt && !std::strpbrk(record.lpstrDefExt, "*?")) {
-        dialog.setDefaultSuffix(toQt(record.lpstrDefExt));
-    }
-    if (record.lpstrInitialDir && *record.lpstrInitialDir != '\0') {
-        dialog.setDirectory(QString::fromStdString(tvx::systemPath(record.lpstrInitialDir).value_or("")));
-    }
-    const CString name(record.lpstrFile ? record.lpstrFile : "");
-    if (!name.IsEmpty()) {
-        const auto path = tvx::systemPath(name.GetString(), tvx::PathUse::Creating).value_or(name.GetString());
-        const QFileInfo info(QString::fromStdString(path));
-        if (info.isAbsolute()) {
-            dialog.setDirectory(info.absolutePath());
-        }
-        dialog.selectFile(info.isAbsolute() ? info.fileName() : QString::fromStdString(path));
+/// Hands a text to a host's buffer. One that has no room is emptied: it must not go on naming another file.
+void give(std::string_view text, LPSTR buffer, DWORD room) {
+    if (buffer && room > 0) {
+        const bool fits = text.size() < room;
+        std::memcpy(buffer, text.data(), fits ? text.size() : 0);
+        buffer[fits ? text.size() : 0] = '\0';
     }
 }
 
 } // namespace
 
-struct CFileDialog::Answer {
-    QStringList files;
-    int filter = 0;
-};
-
-INT_PTR CFileDialog::DoModal() {
-    if (!ensureGui()) {
-        return IDCANCEL;
-    }
-    Dialog dialog(m_ofn.hwndOwner, m_bOpenFileDialog ? AFX_IDS_OPENFILE : AFX_IDS_SAVEFILE,
-                  m_bOpenFileDialog ? AFX_IDD_FILEOPEN : AFX_IDD_FILESAVE);
-    fillDialog(dialog, m_ofn, m_bOpenFileDialog != FALSE);
-    dialog.isAccepted = [this, &dialog] {
-        const auto filters = dialog.nameFilters();
-        takeAnswer({dialog.selectedFiles(), static_cast<int>(filters.indexOf(dialog.selectedNameFilter()))});
-        return OnFileNameOK() == 0;
-    };
-    return dialog.ask() ? IDOK : IDCANCEL;
+CString CFileDialog::folderOf(const CString& path) {
+    return path.Left(path.GetLength() - lastPart(path).GetLength());
 }
 
-void CFileDialog::takeAnswer(const Answer& answer) {
-    m_paths.clear();
-    for (const QString& file : answer.files) {
-        m_paths.emplace_back(tvx::driveName(fromQt(file)).c_str());
-    }
-    m_ofn.nFilterIndex = static_cast<DWORD>(answer.filter + 1);
+/// Several files are one text: their folder, zero, a name, zero, ..., and one more zero.
+void CFileDialog::fillRecord() {
     const CString path = GetPathName();
-    if (m_ofn.lpstrFile && m_ofn.nMaxFile > static_cast<DWORD>(path.GetLength())) {
-        std::memcpy(m_ofn.lpstrFile, path.GetString(), static_cast<std::size_t>(path.GetLength()) + 1);
+    const CString folder = folderOf(path);
+    std::string all = path.GetString();
+    if (m_paths.size() > 1) {
+        const bool isRoot = folder.GetLength() <= 3;
+        all = isRoot ? folder.View() : folder.View().substr(0, folder.View().size() - 1);
+        for (const CString& each : m_paths) {
+            all += '\0';
+            all += each.View().starts_with(folder.View()) ? each.Mid(folder.GetLength()).View() : each.View();
+        }
     }
+    if ((m_ofn.Flags & OFN_ALLOWMULTISELECT) != 0) {
+        all += '\0';
+    }
+    give(all, m_ofn.lpstrFile, m_ofn.nMaxFile);
     const CString name = lastPart(path);
-    m_ofn.nFileOffset = static_cast<WORD>(path.GetLength() - name.GetLength());
-    const int extension = extensionOf(path).GetLength();
-    m_ofn.nFileExtension = static_cast<WORD>(extension > 0 ? path.GetLength() - extension + 1 : 0);
+    give(name.View(), m_ofn.lpstrFileTitle, m_ofn.nMaxFileTitle);
+    m_ofn.nFileOffset = static_cast<WORD>(folder.GetLength());
+    const CString extension = extensionOf(path);
+    m_ofn.nFileExtension = static_cast<WORD>(extension.IsEmpty() ? 0 : path.GetLength() - extension.GetLength() + 1);
+    m_ofn.Flags &= ~static_cast<DWORD>(OFN_READONLY | OFN_EXTENSIONDIFFERENT);
+    if (m_ofn.lpstrDefExt && extension.Mid(1).CompareNoCase(m_ofn.lpstrDefExt) != 0) {
+        m_ofn.Flags |= OFN_EXTENSIONDIFFERENT;
+    }
 }
 
 CString CFileDialog::GetPathName() const {

@@ -35,21 +35,25 @@ struct OPENFILENAMEA {
     LPSTR lpstrCustomFilter;
     DWORD nMaxCustFilter;
     DWORD nFilterIndex; ///< The chosen filter, counted from 1.
-    LPSTR lpstrFile;    ///< In: the name shown first. Out: the full name.
-    DWORD nMaxFile;     ///< Size of lpstrFile in bytes.
-    LPSTR lpstrFileTitle;
+    /// In: the name shown first. Out: the full name; with OFN_ALLOWMULTISELECT, one zero more behind it, and of several
+    /// files their folder, zero, a name, zero, ..., and one more zero. Emptied where that has no room.
+    LPSTR lpstrFile;
+    DWORD nMaxFile;       ///< Size of lpstrFile in bytes.
+    LPSTR lpstrFileTitle; ///< Out: the name without its folder; may be null.
     DWORD nMaxFileTitle;
     LPCSTR lpstrInitialDir; ///< The folder to begin in; null: that of the name, else the current one.
     LPCSTR lpstrTitle;      ///< Null: "Open" or "Save As".
     DWORD Flags;            ///< OFN_...
     WORD nFileOffset;
     WORD nFileExtension;
-    LPCSTR lpstrDefExt; ///< Extension, without its dot, for names typed without one; null: none.
+    /// Extension, without its dot, for names typed without one under a filter for all files; other filters have their
+    /// own. Null: names stay as they are typed.
+    LPCSTR lpstrDefExt;
     LPARAM lCustData;
 };
 using OPENFILENAME = OPENFILENAMEA;
 
-/// The file dialog.
+/// The file dialog. docs/dialogs.md tells what it does with typed names, and what the flags do.
 ///
 /// @code
 /// CFileDialog dialog(TRUE, "brd", nullptr, OFN_HIDEREADONLY | OFN_FILEMUSTEXIST, "Boards (*.brd)|*.brd||", this);
@@ -100,8 +104,8 @@ protected:
     virtual BOOL OnFileNameOK();
 
 private:
-    struct Answer;
-    void takeAnswer(const Answer& answer);
+    static CString folderOf(const CString& path);
+    void fillRecord();
     OPENFILENAME* m_record = &m_ofn;
     CString m_filter;
     CString m_defaultExtension;

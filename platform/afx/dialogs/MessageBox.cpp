@@ -280,9 +280,13 @@ std::string shown(LPCSTR text) {
     return result;
 }
 
-/// The window that a box belongs to; none while it is hidden, as a main frame is at the start, so that the window
-/// manager finds the place.
+/// The window that a box belongs to: the innermost modal dialog, which it must not be behind, one of the toolkit's too.
+/// None while it is hidden, as a main frame is at the start, so that the window manager finds the place.
 QWidget* visibleOwner(HWND owner) {
+    QWidget* modal = QApplication::activeModalWidget();
+    if (modal && modal->isVisible()) {
+        return modal;
+    }
     Window* window = Window::from(owner);
     QWidget* widget = window ? window->topLevel()->widget() : nullptr;
     return widget && widget->isVisible() ? widget : nullptr;

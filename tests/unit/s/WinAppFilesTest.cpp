@@ -54,7 +54,8 @@ TEST(WinAppFiles, DialogsBeginWhereTheNameLies) {
     EXPECT_STREQ(theApp.GetInitialDirForFileDialog("C:\\plans\\a.brd"), "C:\\plans\\");
     EXPECT_STREQ(theApp.GetBaseNameForFileDialog("C:\\plans\\a.brd"), "a.brd");
     EXPECT_STREQ(theApp.GetInitialDirForFileDialog("/plans/a.brd").Right(7), "\\plans\\");
-    const CString current = Gui_FileName().GetMountAndPath();
+    char current[MAX_PATH];
+    ASSERT_GT(GetCurrentDirectoryA(sizeof(current), current), 0U);
     EXPECT_STREQ(theApp.GetInitialDirForFileDialog("plans\\a.brd"), current);
     EXPECT_STREQ(theApp.GetBaseNameForFileDialog("plans\\a.brd"), "plans\\a.brd");
     EXPECT_STREQ(theApp.GetInitialDirForFileDialog(""), current);
