@@ -251,6 +251,12 @@
 
 /* The name of a virtual key is the string of this number plus its own */
 #define TVX_IDS_KEY 0xF400
+#define TVX_IDS_EDIT_UNDO 0xF360
+#define TVX_IDS_EDIT_CUT 0xF361
+#define TVX_IDS_EDIT_COPY 0xF362
+#define TVX_IDS_EDIT_PASTE 0xF363
+#define TVX_IDS_EDIT_DELETE 0xF364
+#define TVX_IDS_EDIT_SELECT_ALL 0xF365
 
 /* Dialogs of the system: there is help on them under these numbers, no template */
 #define AFX_IDD_FILEOPEN 28676

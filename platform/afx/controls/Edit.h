@@ -88,7 +88,7 @@ public:
         return static_cast<int>(SendMessage(EM_GETFIRSTVISIBLELINE));
     }
 
-    // --- undo and clipboard ---
+    // --- undo and clipboard: what the user asks for by keys, menu, mouse and drops comes as the same messages ---
 
     /// Whether Undo would change anything.
     BOOL CanUndo() const {

@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/PastedText.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 
 #include <QApplication>
@@ -153,7 +154,7 @@ HANDLE GetClipboardData(UINT format) {
     if (!IsClipboardFormatAvailable(format)) {
         return nullptr;
     }
-    const QMimeData* data = QApplication::clipboard()->mimeData();
+    const QMimeData* data = pastedData();
     QByteArray bytes = format == CF_TEXT ? data->text().toUtf8() : data->data(mimeTypeOf(format));
     Block block(bytes.begin(), bytes.end());
     if (format == CF_TEXT) {
@@ -171,7 +172,7 @@ BOOL IsClipboardFormatAvailable(UINT format) {
     if (state.changed) {
         return state.own.contains(format) ? TRUE : FALSE;
     }
-    const QMimeData* data = QApplication::clipboard()->mimeData();
+    const QMimeData* data = pastedData();
     if (!data) {
         return FALSE;
     }

@@ -30,7 +30,9 @@ TVX_PLATFORM_API BOOL EmptyClipboard();
 /// Puts a block into the clipboard, which owns it from then on. Null on failure; the block stays the caller's then.
 /// @param format CF_TEXT (zero-terminated UTF-8) or a registered format
 TVX_PLATFORM_API HANDLE SetClipboardData(UINT format, HANDLE block);
-/// The contents in a format, null when it has none. The block belongs to the clipboard and is valid until it is closed.
+/// The contents in a format, null when it has none. While WM_PASTE is handled these are what the user pastes, which may
+/// be another program's selection (middle button) or a text that was dropped. The block belongs to the clipboard and is
+/// valid until it is closed.
 TVX_PLATFORM_API HANDLE GetClipboardData(UINT format);
 /// Whether the clipboard has contents in a format. It need not be open.
 TVX_PLATFORM_API BOOL IsClipboardFormatAvailable(UINT format);

@@ -3,6 +3,8 @@
 #include "platform/afx/core/detail/Connect.h"
 
 #include <QAbstractTextDocumentLayout>
+#include <QDropEvent>
+#include <QKeyEvent>
 #include <QMimeData>
 #include <QPlainTextEdit>
 #include <QScrollBar>
@@ -21,13 +23,45 @@ Qt::ScrollBarPolicy policy(bool bar) {
     return bar ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
 }
 
-/// The toolkit's field for many lines, with two habits of its own. Its frame shows the keyboard as that of one line
-/// does. Its text is offered to others as nothing but text, so that no word processor takes fonts and colours along.
+TextRange selectionOf(const QPlainTextEdit& edit) {
+    const QTextCursor cursor = edit.textCursor();
+    return {cursor.anchor(), cursor.position()};
+}
+
+/// The toolkit's field for many lines, with habits of its own. What concerns the clipboard is the control's. Its frame
+/// shows the keyboard as that of one line does. Its text is offered to others as nothing but text, so that no word
+/// processor takes fonts and colours along.
 class AreaEdit : public QPlainTextEdit {
 public:
-    using QPlainTextEdit::QPlainTextEdit;
+    AreaEdit(QWidget* parent, FieldEvents events) : QPlainTextEdit(parent), m_events(std::move(events)) {}
 
 protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        const auto command = fieldCommandOf(*event);
+        // In many lines the toolkit deletes the ends of lines without a look at the clipboard.
+        if (command && *command != FieldCommand::CutToEnd && *command != FieldCommand::CutAll) {
+            event->accept();
+            storing([&] { m_events.asked(*command); });
+        } else {
+            QPlainTextEdit::keyPressEvent(event);
+        }
+    }
+    void dropEvent(QDropEvent* event) override {
+        QDragLeaveEvent leave;
+        QPlainTextEdit::dragLeaveEvent(&leave);
+        if (isReadOnly() || !event->mimeData()->hasText()) {
+            event->ignore();
+            return;
+        }
+        const int position = cursorForPosition(event->position().toPoint()).position();
+        DroppedText dropped{event->mimeData()->text(), position, std::nullopt};
+        const bool own = event->source() == this || event->source() == viewport();
+        if (own && event->dropAction() == Qt::MoveAction) {
+            dropped.movedFrom = selectionOf(*this);
+        }
+        event->acceptProposedAction();
+        storing([&] { m_events.dropped(dropped); });
+    }
     bool event(QEvent* event) override {
         if (event->type() == QEvent::Paint && hasFocus() && frameWidth() > 0) {
             QStylePainter painter(this);
@@ -48,12 +82,15 @@ protected:
         data->setText(textCursor().selection().toPlainText());
         return data;
     }
+
+private:
+    FieldEvents m_events;
 };
 
 class AreaField : public TextField {
 public:
-    AreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed)
-        : m_edit(new AreaEdit(parent)), m_wraps(options.wraps) {
+    AreaField(QWidget* parent, const AreaOptions& options, FieldEvents events)
+        : m_edit(new AreaEdit(parent, events)), m_wraps(options.wraps) {
         count(0, 0);
         connectStoring(m_edit->document(), &QTextDocument::contentsChange, m_edit,
                        [this](int position, int, int added) { count(position, added); });
@@ -63,7 +100,7 @@ public:
         m_edit->setVerticalScrollBarPolicy(policy(options.verticalBar));
         m_edit->setHorizontalScrollBarPolicy(policy(options.horizontalBar));
         m_edit->document()->setDocumentMargin(2);
-        connectStoring(m_edit, &QPlainTextEdit::textChanged, m_edit, std::move(changed));
+        connectStoring(m_edit, &QPlainTextEdit::textChanged, m_edit, std::move(events.changed));
     }
     QWidget* widget() const override {
         return m_edit;
@@ -75,8 +112,7 @@ public:
         m_edit->setPlainText(text);
     }
     TextRange selection() const override {
-        const QTextCursor cursor = m_edit->textCursor();
-        return {cursor.anchor(), cursor.position()};
+        return selectionOf(*m_edit);
     }
     void select(const TextRange& range) override {
         QTextCursor cursor = m_edit->textCursor();
@@ -98,11 +134,16 @@ public:
         }
     }
     void undo() override {
-        // One step each way, as hosts know it: undone twice, the change is there again.
-        m_edit->document()->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
+        m_edit->undo();
     }
     bool canUndo() const override {
-        return m_edit->document()->isUndoAvailable() || m_edit->document()->isRedoAvailable();
+        return m_edit->document()->isUndoAvailable();
+    }
+    void redo() override {
+        m_edit->redo();
+    }
+    bool canRedo() const override {
+        return m_edit->document()->isRedoAvailable();
     }
     void forgetUndo() override {
         m_edit->document()->clearUndoRedoStacks();
@@ -174,8 +215,8 @@ public:
     void showCaret() override {
         m_edit->ensureCursorVisible();
     }
-    QMenu* makeMenu() override {
-        return m_edit->createStandardContextMenu();
+    int positionNear(QPoint point) const override {
+        return m_edit->cursorForPosition(point).position();
     }
 
 private:
@@ -211,8 +252,8 @@ private:
 
 } // namespace
 
-std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed) {
-    return std::make_unique<AreaField>(parent, options, std::move(changed));
+std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, FieldEvents events) {
+    return std::make_unique<AreaField>(parent, options, std::move(events));
 }
 
 } // namespace tvx::afx

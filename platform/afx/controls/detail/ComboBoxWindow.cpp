@@ -5,6 +5,7 @@
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/PastedText.h"
 #include "platform/base/Text.h"
 
 #include <QAbstractItemView>
@@ -187,17 +188,29 @@ QWidget* ComboBoxWindow::makeWidget(QWidget* parent) {
     face->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon); // measures no line
     connectStoring(face, &QComboBox::activated, face, [this](int index) { chosen(index); });
     if (isEditable()) {
-        // The toolkit would complete what is typed with the first line that begins so.
-        face->setCompleter(nullptr);
-        connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
-            const HWND self = handle();
-            notify(CBN_EDITUPDATE);
-            if (from(self)) {
-                notify(CBN_EDITCHANGE);
-            }
-        });
+        makeField(face);
     }
     return face;
+}
+
+void ComboBoxWindow::makeField(QWidget* widget) {
+    m_field = makeLineField(widget, {[] {}, [this](FieldCommand command) { carryOut(fieldControl(), command); },
+                                     [this](const DroppedText& dropped) { takeDropped(fieldControl(), dropped); }});
+    auto* face = static_cast<QComboBox*>(widget);
+    face->setLineEdit(static_cast<QLineEdit*>(m_field->widget()));
+    // The toolkit would complete what is typed with the first line that begins so.
+    face->setCompleter(nullptr);
+    connectStoring(face->lineEdit(), &QLineEdit::textEdited, face, [this] {
+        const HWND self = handle();
+        notify(CBN_EDITUPDATE);
+        if (from(self)) {
+            notify(CBN_EDITCHANGE);
+        }
+    });
+}
+
+FieldControl ComboBoxWindow::fieldControl() {
+    return {*this, *m_field, FieldControl::Kind::ComboBox};
 }
 
 QComboBox* ComboBoxWindow::box() const {
@@ -485,6 +498,40 @@ LRESULT ComboBoxWindow::fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bo
     return MAKELONG(first, last);
 }
 
+void ComboBoxWindow::paste() {
+    const QMimeData* data = pastedData();
+    const QString text = data ? firstLine(data->text()) : QString();
+    if (!text.isEmpty()) {
+        guarded([&] { m_field->insert(text, Undo::Keep); });
+    }
+}
+
+/// The field's share of the messages.
+std::optional<LRESULT> ComboBoxWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (const auto result = clipboardProc(fieldControl(), message)) {
+        return result;
+    }
+    const QPoint at(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam));
+    switch (message) {
+    case WM_SYSCHAR:
+        return wParam == VK_BACK ? std::optional<LRESULT>(passEvent(*this, message)) : std::nullopt;
+    case WM_PASTE:
+        paste();
+        return 0;
+    case WM_MBUTTONUP:
+        if (field()->geometry().contains(at)) {
+            pasteSelectionAt(fieldControl(), field()->mapFromParent(at));
+            return 0;
+        }
+        return std::nullopt;
+    case WM_CONTEXTMENU:
+        showFieldMenu(fieldControl(), wParam, lParam);
+        return 0;
+    default:
+        return std::nullopt;
+    }
+}
+
 LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     if (message >= CB_GETEDITSEL && message <= CB_SETDROPPEDWIDTH) {
         bool known = true;
@@ -499,6 +546,11 @@ LRESULT ComboBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
         // The owner frees its data while the control can still be asked about its lines.
         tellAllDeleted();
         return 0;
+    }
+    if (m_field) {
+        if (const auto result = editProc(message, wParam, lParam)) {
+            return *result;
+        }
     }
     return Control::defaultProc(message, wParam, lParam);
 }

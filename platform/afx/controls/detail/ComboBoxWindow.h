@@ -3,6 +3,7 @@
 /// @file
 /// Combo boxes.
 
+#include "platform/afx/controls/detail/FieldCommands.h"
 #include "platform/afx/controls/detail/ListControl.h"
 
 class QAbstractItemModel;
@@ -46,6 +47,10 @@ protected:
 private:
     QComboBox* box() const;
     QLineEdit* field() const;
+    void makeField(QWidget* face);
+    FieldControl fieldControl();
+    std::optional<LRESULT> editProc(UINT message, WPARAM wParam, LPARAM lParam);
+    void paste();
     void measure();
     int fieldHeight() const;
     void setItemHeight(int height);
@@ -59,6 +64,7 @@ private:
     LRESULT listProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     LRESULT fieldProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     std::unique_ptr<ComboModel> m_model;
+    std::unique_ptr<TextField> m_field;      ///< Null for a box that is not typed into.
     QAbstractItemModel* m_noLines = nullptr; ///< Of the widget, for the time after this window.
     int m_itemHeight = 15;
     int m_openHeight = 0;

@@ -4,11 +4,11 @@
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/PastedText.h"
 #include "platform/base/Text.h"
 
 #include <QAbstractScrollArea>
 #include <QApplication>
-#include <QClipboard>
 
 #include <algorithm>
 #include <cstring>
@@ -29,28 +29,30 @@ std::unique_ptr<Window> makeEdit(const CREATESTRUCT& cs) {
 
 const WindowClassEntry editEntry("Edit", &makeEdit);
 
-/// A field of one line ends at the first line end of a text put into it.
-QString firstLine(const QString& text) {
-    const int end = text.indexOf(QLatin1Char('\n'));
-    return end >= 0 ? text.left(end) : text;
-}
-
 } // namespace
 
 EditWindow::EditWindow(const CREATESTRUCT& cs) : Control(cs), m_limit(defaultLimit) {}
 
 QWidget* EditWindow::makeWidget(QWidget* parent) {
-    const auto changed = [this] { this->changed(); };
     if (!isMultiLine()) {
-        m_field = makeLineField(parent, changed);
+        m_field = makeLineField(parent, fieldEvents());
         return m_field->widget();
     }
     AreaOptions options;
     options.wraps = (style() & (ES_AUTOHSCROLL | WS_HSCROLL)) == 0;
     options.verticalBar = (style() & WS_VSCROLL) != 0;
     options.horizontalBar = (style() & WS_HSCROLL) != 0;
-    m_field = makeAreaField(parent, options, changed);
+    m_field = makeAreaField(parent, options, fieldEvents());
     return m_field->widget();
+}
+
+FieldEvents EditWindow::fieldEvents() {
+    return {[this] { changed(); }, [this](FieldCommand command) { carryOut(fieldControl(), command); },
+            [this](const DroppedText& dropped) { takeDropped(fieldControl(), dropped); }};
+}
+
+FieldControl EditWindow::fieldControl() {
+    return {*this, *m_field, FieldControl::Kind::Edit, isReadOnly(), !isMultiLine() && (style() & ES_PASSWORD) != 0};
 }
 
 void EditWindow::widgetMade() {
@@ -60,7 +62,7 @@ void EditWindow::widgetMade() {
     m_passwordChar = (style() & ES_PASSWORD) != 0 ? '*' : 0;
     // The parent is not told of the text that the control is created with.
     ++m_quiet;
-    m_field->setText(isMultiLine() ? plainLines(text) : firstLine(plainLines(text)));
+    m_field->setText(isMultiLine() ? plainLines(text) : firstLine(text));
     --m_quiet;
 }
 
@@ -108,7 +110,7 @@ void EditWindow::setText(const QString& text) {
     }
     // Many lines set by the program are no change that the program is told of.
     m_quiet += isMultiLine() ? 1 : 0;
-    guarded([&] { m_field->setText(isMultiLine() ? plainLines(text) : firstLine(plainLines(text))); });
+    guarded([&] { m_field->setText(isMultiLine() ? plainLines(text) : firstLine(text)); });
     m_quiet -= isMultiLine() ? 1 : 0;
     m_field->setModified(false);
 }
@@ -150,7 +152,7 @@ void EditWindow::applyColors(QPalette& palette, const QColor& text, const QColor
 // --- typing ---
 
 void EditWindow::insert(QString text, Source source, Undo undo) {
-    text = isMultiLine() ? plainLines(text) : firstLine(plainLines(text));
+    text = isMultiLine() ? plainLines(text) : firstLine(text);
     if ((style() & ES_UPPERCASE) != 0) {
         text = text.toUpper();
     } else if ((style() & ES_LOWERCASE) != 0) {
@@ -176,11 +178,12 @@ void EditWindow::insert(QString text, Source source, Undo undo) {
     m_field->setModified(true);
 }
 
-void EditWindow::paste(bool selection) {
-    if (isReadOnly()) {
+void EditWindow::paste() {
+    const QMimeData* data = pastedData();
+    if (isReadOnly() || !data) {
         return;
     }
-    QString text = QApplication::clipboard()->text(selection ? QClipboard::Selection : QClipboard::Clipboard);
+    QString text = data->text();
     if ((style() & ES_NUMBER) != 0) {
         text.removeIf([](QChar c) { return !c.isDigit(); });
     }
@@ -192,19 +195,7 @@ void EditWindow::paste(bool selection) {
 /// Characters are inserted here, so that limits and case apply; everything else is the toolkit's.
 bool EditWindow::typed(UINT message, WPARAM character) {
     const bool control = isKeyDown(VK_CONTROL) && !isKeyDown(VK_MENU);
-    if (control && character >= ' ') {
-        character = QChar(static_cast<char16_t>(character)).toUpper().unicode() - u'@';
-    }
     switch (character) {
-    case 'C' - '@':
-        m_field->copy();
-        return true;
-    case 'V' - '@':
-        paste(false);
-        return true;
-    case 'X' - '@':
-        SendMessageA(handle(), WM_CUT, 0, 0);
-        return true;
     case '\r':
     case '\n':
         if (isMultiLine() && !isReadOnly()) {
@@ -214,7 +205,7 @@ bool EditWindow::typed(UINT message, WPARAM character) {
     case '\t':
         break;
     default:
-        if (character < ' ' || character == 0x7F) {
+        if (control || character < ' ' || character == 0x7F) {
             return false;
         }
         break;
@@ -230,33 +221,6 @@ bool EditWindow::typed(UINT message, WPARAM character) {
     const auto codePoint = static_cast<char32_t>(character);
     insert(QString::fromUcs4(&codePoint, 1), Source::User);
     return true;
-}
-
-/// The clipboard's keys that make no character.
-bool EditWindow::editKey(WPARAM key) {
-    const bool shift = isKeyDown(VK_SHIFT);
-    const bool control = isKeyDown(VK_CONTROL);
-    if (key == VK_INSERT && shift) {
-        paste(false);
-    } else if (key == VK_INSERT && control) {
-        m_field->copy();
-    } else if (key == VK_DELETE && shift) {
-        SendMessageA(handle(), WM_CUT, 0, 0);
-    } else {
-        return false;
-    }
-    return true;
-}
-
-LRESULT EditWindow::showMenu(LPARAM place) {
-    QMenu* menu = m_field->makeMenu();
-    menu->setAttribute(Qt::WA_DeleteOnClose);
-    QPoint at(GET_X_LPARAM(place), GET_Y_LPARAM(place));
-    if (at == QPoint(-1, -1)) {
-        at = widget()->mapToGlobal(widget()->rect().center());
-    }
-    guarded([&] { menu->popup(at); });
-    return 0;
 }
 
 // --- selection and lines ---
@@ -354,11 +318,9 @@ LRESULT EditWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
     case EM_GETLIMITTEXT:
         return m_limit;
     case EM_CANUNDO:
-        return m_field->canUndo() ? TRUE : FALSE;
+        return m_field->canUndo() || m_field->canRedo() ? TRUE : FALSE;
     case EM_UNDO:
-    case WM_UNDO:
-        guarded([this] { m_field->undo(); });
-        return TRUE;
+        return call(WM_UNDO);
     case EM_EMPTYUNDOBUFFER:
         m_field->forgetUndo();
         return 0;
@@ -382,13 +344,15 @@ LRESULT EditWindow::editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
 }
 
 LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
-    bool known = message >= EM_GETSEL && message <= EM_GETLIMITTEXT;
-    if (known || message == WM_UNDO) {
-        known = true;
+    if (message >= EM_GETSEL && message <= EM_GETLIMITTEXT) {
+        bool known = true;
         const LRESULT result = editProc(message, wParam, lParam, known);
         if (known) {
             return result;
         }
+    }
+    if (const auto result = clipboardProc(fieldControl(), message)) {
+        return *result;
     }
     switch (message) {
     case WM_GETTEXTLENGTH:
@@ -399,31 +363,18 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
             passEvent(*this, message);
         }
         return 0;
-    case WM_KEYDOWN:
-        return editKey(wParam) ? 0 : Control::defaultProc(message, wParam, lParam);
-    case WM_CUT:
-        if (isReadOnly()) {
-            m_field->copy();
-        } else {
-            guarded([this] { m_field->cut(); });
-        }
-        return 0;
-    case WM_COPY:
-        m_field->copy();
-        return 0;
-    case WM_CLEAR:
-        if (!isReadOnly() && m_field->selection().anchor != m_field->selection().caret) {
-            insert(QString(), Source::Program);
-        }
-        return 0;
+    case WM_SYSCHAR:
+        // Alt and Backspace undo. Other characters with Alt are the menu's.
+        return wParam == VK_BACK ? passEvent(*this, message) : Control::defaultProc(message, wParam, lParam);
     case WM_PASTE:
-        paste(false);
+        paste();
         return 0;
-    case WM_MBUTTONUP: // the selection of another program is pasted here, within the limit
-        paste(true);
+    case WM_MBUTTONUP:
+        pasteSelectionAt(fieldControl(), QPoint(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam)));
         return 0;
     case WM_CONTEXTMENU:
-        return showMenu(lParam);
+        showFieldMenu(fieldControl(), wParam, lParam);
+        return 0;
     default:
         return Control::defaultProc(message, wParam, lParam);
     }

@@ -4,6 +4,7 @@
 /// Edit controls, of one line and of many.
 
 #include "platform/afx/controls/detail/Control.h"
+#include "platform/afx/controls/detail/FieldCommands.h"
 #include "platform/afx/controls/detail/HostText.h"
 #include "platform/afx/controls/detail/TextField.h"
 
@@ -40,13 +41,13 @@ private:
     LRESULT editProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     LRESULT lineProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
     bool typed(UINT message, WPARAM character);
-    bool editKey(WPARAM key);
     void insert(QString text, Source source, Undo undo = Undo::Keep);
-    void paste(bool selection);
+    void paste();
+    FieldControl fieldControl();
+    FieldEvents fieldEvents();
     void select(LONG_PTR start, LONG_PTR end);
     LRESULT selectedBytes(WPARAM start, LPARAM end) const;
     LRESULT copyLine(int number, char* buffer) const;
-    LRESULT showMenu(LPARAM place);
     bool hasLine(int number) const;
     std::unique_ptr<TextField> m_field;
     int m_limit;

@@ -64,6 +64,11 @@ QString plainLines(QString text) {
     return text;
 }
 
+QString firstLine(const QString& text) {
+    const QString plain = plainLines(text);
+    return plain.left(plain.indexOf(QLatin1Char('\n'))); // all of it where there is none
+}
+
 void ParagraphBytes::replace(int first, int removed, const std::vector<int>& sizes) {
     const auto at = m_sizes.begin() + first;
     m_total -= std::accumulate(at, at + removed, 0);

@@ -23,6 +23,9 @@ TVX_PLATFORM_API int toolkitUnits(const QString& text, int bytes);
 /// A text with "\n" between its lines, whatever stood there.
 TVX_PLATFORM_API QString plainLines(QString text);
 
+/// What a field of one line takes of a text: up to its first line end, however that is written.
+TVX_PLATFORM_API QString firstLine(const QString& text);
+
 /// The bytes of each paragraph of a long text, its line end included, so that positions are found without going through
 /// the text. The last paragraph has no line end but is counted with one.
 class TVX_PLATFORM_API ParagraphBytes {

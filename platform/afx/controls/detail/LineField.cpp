@@ -2,7 +2,10 @@
 #include "platform/afx/controls/detail/TextField.h"
 #include "platform/afx/core/detail/Connect.h"
 
+#include <QDropEvent>
+#include <QKeyEvent>
 #include <QLineEdit>
+#include <QMimeData>
 
 #include <limits>
 
@@ -10,11 +13,59 @@ namespace tvx::afx {
 
 namespace {
 
+TextRange selectionOf(const QLineEdit& edit) {
+    const int caret = edit.cursorPosition();
+    if (!edit.hasSelectedText()) {
+        return {caret, caret};
+    }
+    const int first = edit.selectionStart();
+    const int last = edit.selectionEnd();
+    return caret == first ? TextRange{last, first} : TextRange{first, last};
+}
+
+/// The toolkit's field for one line, but for what concerns the clipboard: that is the control's.
+class LineEdit : public QLineEdit {
+public:
+    LineEdit(QWidget* parent, FieldEvents events) : QLineEdit(parent), m_events(std::move(events)) {}
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        if (const auto command = fieldCommandOf(*event)) {
+            event->accept();
+            storing([&] { m_events.asked(*command); });
+        } else {
+            QLineEdit::keyPressEvent(event);
+        }
+    }
+    void dragEnterEvent(QDragEnterEvent* event) override {
+        m_selection = selectionOf(*this); // the toolkit shows by the caret where the text would go
+        QLineEdit::dragEnterEvent(event);
+    }
+    void dropEvent(QDropEvent* event) override {
+        QDragLeaveEvent leave;
+        QLineEdit::dragLeaveEvent(&leave);
+        if (isReadOnly() || !event->mimeData()->hasText()) {
+            event->ignore();
+            return;
+        }
+        DroppedText dropped{event->mimeData()->text(), cursorPositionAt(event->position().toPoint()), std::nullopt};
+        if (event->source() == this && event->dropAction() == Qt::MoveAction) {
+            dropped.movedFrom = m_selection;
+        }
+        event->acceptProposedAction();
+        storing([&] { m_events.dropped(dropped); });
+    }
+
+private:
+    FieldEvents m_events;
+    TextRange m_selection;
+};
+
 class LineField : public TextField {
 public:
-    LineField(QWidget* parent, std::function<void()> changed) : m_edit(new QLineEdit(parent)) {
+    LineField(QWidget* parent, FieldEvents events) : m_edit(new LineEdit(parent, events)) {
         m_edit->setMaxLength(std::numeric_limits<int>::max()); // the limit is counted in bytes, by the control
-        connectStoring(m_edit, &QLineEdit::textChanged, m_edit, std::move(changed));
+        connectStoring(m_edit, &QLineEdit::textChanged, m_edit, std::move(events.changed));
     }
     QWidget* widget() const override {
         return m_edit;
@@ -28,13 +79,7 @@ public:
         m_edit->setCursorPosition(0);
     }
     TextRange selection() const override {
-        const int caret = m_edit->cursorPosition();
-        if (!m_edit->hasSelectedText()) {
-            return {caret, caret};
-        }
-        const int first = m_edit->selectionStart();
-        const int last = m_edit->selectionEnd();
-        return caret == first ? TextRange{last, first} : TextRange{first, last};
+        return selectionOf(*m_edit);
     }
     void select(const TextRange& range) override {
         if (range.anchor == range.caret) {
@@ -54,11 +99,16 @@ public:
         }
     }
     void undo() override {
-        // One step each way, as hosts know it: undone twice, the change is there again.
-        m_edit->isUndoAvailable() ? m_edit->undo() : m_edit->redo();
+        m_edit->undo();
     }
     bool canUndo() const override {
-        return m_edit->isUndoAvailable() || m_edit->isRedoAvailable();
+        return m_edit->isUndoAvailable();
+    }
+    void redo() override {
+        m_edit->redo();
+    }
+    bool canRedo() const override {
+        return m_edit->isRedoAvailable();
     }
     void forgetUndo() override {
         // The toolkit forgets its history with a new text only, and caret and mark of change with it.
@@ -116,8 +166,8 @@ public:
     }
     void scrollLines(int) override {}
     void showCaret() override {} // it always is
-    QMenu* makeMenu() override {
-        return m_edit->createStandardContextMenu();
+    int positionNear(QPoint point) const override {
+        return m_edit->cursorPositionAt(point);
     }
 
 private:
@@ -126,8 +176,8 @@ private:
 
 } // namespace
 
-std::unique_ptr<TextField> makeLineField(QWidget* parent, std::function<void()> changed) {
-    return std::make_unique<LineField>(parent, std::move(changed));
+std::unique_ptr<TextField> makeLineField(QWidget* parent, FieldEvents events) {
+    return std::make_unique<LineField>(parent, std::move(events));
 }
 
 } // namespace tvx::afx

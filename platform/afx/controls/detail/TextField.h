@@ -4,12 +4,14 @@
 /// The toolkit's two text fields, one line and many lines, seen alike. Positions are the toolkit's: units of UTF-16, a
 /// line's end counting as one.
 
-#include <QMenu>
 #include <QString>
 
 #include <functional>
 #include <memory>
+#include <optional>
 
+class QKeyEvent;
+class QPoint;
 class QWidget;
 
 namespace tvx::afx {
@@ -35,6 +37,25 @@ struct Line {
     QString text;
 };
 
+/// What keys ask a field for that concerns others than the field: the control asks for it by its messages.
+enum class FieldCommand { Undo, Redo, Cut, CutToEnd, CutAll, Copy, Paste, PasteSelection, SelectAll };
+/// The command of a key press; none for all other keys.
+[[nodiscard]] std::optional<FieldCommand> fieldCommandOf(const QKeyEvent& event);
+
+/// A text that was dropped on a field.
+struct DroppedText {
+    QString text;
+    int position = 0;                   ///< Where it was dropped.
+    std::optional<TextRange> movedFrom; ///< Where it came from, when it was moved within the field.
+};
+
+/// What a field tells its control. None of it may stay empty.
+struct FieldEvents {
+    std::function<void()> changed; ///< After each change of the text.
+    std::function<void(FieldCommand)> asked;
+    std::function<void(const DroppedText&)> dropped;
+};
+
 /// What an edit control needs of a text field.
 class TextField {
 public:
@@ -48,6 +69,8 @@ public:
     virtual void insert(const QString& text, Undo undo) = 0;
     virtual void undo() = 0;
     virtual bool canUndo() const = 0;
+    virtual void redo() = 0;
+    virtual bool canRedo() const = 0;
     virtual void forgetUndo() = 0;
     virtual bool isModified() const = 0;
     virtual void setModified(bool modified) = 0;
@@ -72,11 +95,12 @@ public:
     virtual int firstVisibleLine() const = 0;
     virtual void scrollLines(int lines) = 0;
     virtual void showCaret() = 0;
-    virtual QMenu* makeMenu() = 0;
+    /// The position nearest to a point of the client area.
+    virtual int positionNear(QPoint point) const = 0;
 };
 
-/// A field of one line. `changed` is called after each change of the text.
-std::unique_ptr<TextField> makeLineField(QWidget* parent, std::function<void()> changed);
+/// A field of one line; its widget is a QLineEdit.
+std::unique_ptr<TextField> makeLineField(QWidget* parent, FieldEvents events);
 
 struct AreaOptions {
     bool wraps = true;
@@ -84,6 +108,6 @@ struct AreaOptions {
     bool horizontalBar = false;
 };
 /// A field of many lines.
-std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, std::function<void()> changed);
+std::unique_ptr<TextField> makeAreaField(QWidget* parent, const AreaOptions& options, FieldEvents events);
 
 } // namespace tvx::afx

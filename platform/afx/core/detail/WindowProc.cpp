@@ -4,6 +4,7 @@
 #include "platform/afx/core/detail/KeyMove.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/MenuRequest.h"
 #include "platform/afx/core/detail/Window.h"
 
 #include "platform/afx/core/Wnd.h"
@@ -130,6 +131,11 @@ LRESULT Window::parentProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_MOUSEWHEEL:
         // A wheel that turns over something that does not scroll is for what it stands in.
         return passEvent(*this, message) ? 0 : askParent(0);
+    case WM_CONTEXTMENU:
+        if (!m_parent) {
+            noteMenuUntaken(wParam);
+        }
+        return askParent(0);
     default:
         return askParent(0);
     }

@@ -3,7 +3,7 @@
 #include "platform/afx/controls/detail/EditWindow.h"
 #include "platform/afx/gdi/Dc.h"
 #include "platform/afx/gdi/Gdi.h"
-#include "tests/ui/afx/dialogs/DialogTesting.h"
+#include "tests/ui/afx/controls/ControlTesting.h"
 
 #include <QAbstractItemView>
 #include <QClipboard>
@@ -13,33 +13,6 @@
 #include <QPlainTextEdit>
 
 namespace {
-
-constexpr int controlId = 500;
-constexpr DWORD shown = WS_CHILD | WS_VISIBLE | WS_TABSTOP;
-
-/// A dialog that one control is put into and tried out in.
-template <class Control>
-class ControlTest : public testing::Test {
-protected:
-    /// Runs `use` with the control made and focused.
-    void with(DWORD style, const std::function<void()>& use) {
-        dialog.prepare = [&, style] { make(style); };
-        dialog.script = [&] {
-            control.SetFocus();
-            dialog.commands.clear();
-            use();
-        };
-        EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
-    }
-    virtual void make(DWORD style) = 0;
-    int told(int code) const {
-        return dialog.codes(controlId, code);
-    }
-
-    ScriptedDialog dialog{IDD_EMPTY};
-    Control control;
-    const CRect place{10, 10, 210, 110};
-};
 
 // --- edit ---
 
