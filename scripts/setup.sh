@@ -33,6 +33,7 @@ tour     imagemagick      takes the pictures of the guided tour
 test     libgtest-dev     the test programs' framework
 test     xdotool          keys and clicks in desktop tests
 test     wmctrl           asks the window manager in desktop tests
+test     x11-xkb-utils    setxkbmap gives the display other keyboard layouts in desktop tests
 test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
 bench    libbenchmark-dev the benchmark programs' framework

@@ -87,6 +87,7 @@ std::bitset<256>& keysDown() {
 } // namespace
 
 int virtualKey(const QKeyEvent& event) {
+    const KeyLayout* layout = event.nativeScanCode() != 0 ? layoutOf(event.nativeModifiers()) : nullptr;
     if (const int pad = keypadKey(event)) {
         return pad;
     }
@@ -94,7 +95,6 @@ int virtualKey(const QKeyEvent& event) {
         return function;
     }
     // By place, since the display tells of the sign that the modifiers make, and of another one when they go first.
-    const KeyLayout* layout = event.nativeScanCode() != 0 ? layoutOf(event.nativeModifiers()) : nullptr;
     const int placed = layout ? layout->virtualKey(event.nativeScanCode()) : 0;
     return placed != 0 ? placed : characterKey(event);
 }
