@@ -238,6 +238,27 @@ TEST_F(Frame, AcceleratorsRestWhileAMenuIsOpen) {
     key(Qt::Key_Escape);
 }
 
+TEST_F(Frame, ATableIsReplacedWhileItsFrameLives) {
+    NoteFrame& frame = openNote();
+    // A command that stands in two menus, and a key that two commands claim.
+    CMenu popup;
+    popup.CreatePopupMenu();
+    popup.AppendMenu(MF_STRING, ID_TEST_DRAW, "&Again");
+    frame.GetMenu()->AppendMenu(MF_POPUP, reinterpret_cast<UINT_PTR>(popup.Detach()), "&More");
+    const ACCEL entries[] = {{FVIRTKEY | FCONTROL, 'K', ID_TEST_DRAW}, {FVIRTKEY | FCONTROL, 'K', ID_TEST_GRID}};
+    EXPECT_TRUE(DestroyAcceleratorTable(frame.m_hAccelTable));
+    key(Qt::Key_D, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{});
+    frame.m_hAccelTable = CreateAcceleratorTable(entries, 2);
+    key(Qt::Key_D, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{});
+    key(Qt::Key_K, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{"draw"});
+    DestroyAcceleratorTable(std::exchange(frame.m_hAccelTable, nullptr));
+    key(Qt::Key_K, Qt::ControlModifier);
+    EXPECT_EQ(journal(), std::vector<std::string>{"draw"});
+}
+
 TEST_F(Frame, TablesByHandle) {
     openNote();
     const ACCEL entries[] = {{FVIRTKEY | FCONTROL, 'Q', 100}, {0, 'x', 101}};
