@@ -198,7 +198,10 @@ bool activate(const std::vector<Window*>& controls, Window* chosen, bool unique)
 bool onMnemonic(Window& dialog, Window* focus, WPARAM character) {
     std::vector<Window*> controls;
     collect(dialog, controls);
-    const auto found = withMnemonic(controls, QChar::toLower(static_cast<char32_t>(character)));
+    auto found = withMnemonic(controls, QChar::toLower(static_cast<char32_t>(character)));
+    if (found.empty() && pressedLetter() != 0) {
+        found = withMnemonic(controls, pressedLetter());
+    }
     if (found.empty()) {
         return false;
     }

@@ -78,6 +78,7 @@ struct KeyTime {
 };
 KeyTime lastRelease; ///< nothing when it came with its press, as programs send keys
 KeyTime lastPress;
+int pressedLast = 0; ///< its virtual key
 
 std::bitset<256>& keysDown() {
     static std::bitset<256> keys;
@@ -128,6 +129,7 @@ WPARAM buttonFlags(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers) {
 
 void noteKey(int virtualKey, bool down) {
     knownLocks.reset();
+    pressedLast = down ? virtualKey : pressedLast;
     if (virtualKey > 0 && virtualKey < 256) {
         keysDown().set(static_cast<std::size_t>(virtualKey), down);
     }
@@ -156,6 +158,15 @@ void forgetKeys() {
 
 bool isKeyDown(int virtualKey) {
     return virtualKey > 0 && virtualKey < 256 && keysDown().test(static_cast<std::size_t>(virtualKey));
+}
+
+char32_t pressedLetter() {
+    if (!isKeyDown(pressedLast)) {
+        return 0;
+    }
+    const bool letter = pressedLast >= 'A' && pressedLast <= 'Z';
+    const bool digit = pressedLast >= '0' && pressedLast <= '9';
+    return letter ? static_cast<char32_t>(pressedLast - 'A') + U'a' : digit ? static_cast<char32_t>(pressedLast) : 0;
 }
 
 HeldModifiers modifiersHeld() {

@@ -31,6 +31,9 @@ void noteTime(const QKeyEvent& event);
 /// Forgets all keys; called when the application loses the keyboard, since releases are not seen from then on.
 void forgetKeys();
 TVX_PLATFORM_API bool isKeyDown(int virtualKey);
+/// The Latin letter, in lower case, or the digit of the key that was pressed last and is down; 0 for others. Access
+/// keys are found by it where what the key types is none: on layouts of other scripts, and where digits want Shift.
+char32_t pressedLetter();
 
 /// The modifiers of accelerators and hot keys.
 struct HeldModifiers {

@@ -146,9 +146,20 @@ void PopupMenu::hovered(QAction* action) {
     }
 }
 
+bool PopupMenu::hasAccessKey(char32_t key) const {
+    const Menu* menu = menuFrom(m_menu);
+    return menu &&
+           std::ranges::any_of(menu->items, [key](const MenuItem& item) { return accessKey(item.text) == key; });
+}
+
 void PopupMenu::keyPressEvent(QKeyEvent* event) {
     if (event->key() != Qt::Key_F1 || event->modifiers() != Qt::NoModifier || isRepeated(*event)) {
-        QMenu::keyPressEvent(event);
+        const QString text = event->text();
+        const char32_t letter = pressedLetter();
+        const bool isMeant =
+            text.size() == 1 && letter != 0 && !hasAccessKey(QChar::toLower(char32_t{text[0].unicode()}));
+        QKeyEvent latin(QEvent::KeyPress, event->key(), event->modifiers(), QString::fromUcs4(&letter, 1));
+        QMenu::keyPressEvent(isMeant ? &latin : event);
         return;
     }
     armIdle();
@@ -404,8 +415,10 @@ void openMenuByKey(Window& window, char32_t key) {
     auto* frame = qobject_cast<QMainWindow*>(window.widget());
     auto* bar = frame ? dynamic_cast<FrameMenuBar*>(frame->menuWidget()) : nullptr;
     if (bar) {
-        bar->openByKey(key < 0x80 ? static_cast<char32_t>(QChar::toLower(static_cast<char16_t>(key)))
-                                  : QChar::toLower(key));
+        const bool opened = bar->openByKey(QChar::toLower(key));
+        if (!opened && pressedLetter() != 0) {
+            bar->openByKey(pressedLetter());
+        }
     }
 }
 

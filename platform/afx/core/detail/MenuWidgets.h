@@ -33,10 +33,11 @@ public:
     }
 
 protected:
-    /// The help key asks for help on the chosen item.
+    /// The help key asks for help on the chosen item; letters are access keys on layouts of other scripts, too.
     void keyPressEvent(QKeyEvent* event) override;
 
 private:
+    bool hasAccessKey(char32_t key) const;
     void fill();
     void addItem(const MenuItem& item, int index);
     void opened();

@@ -242,6 +242,11 @@ TEST(DialogKeys, MnemonicsActOnce) {
         EXPECT_TRUE(dialog.isChecked(IDC_VISIBLE));
         type("r");
         EXPECT_TRUE(dialog.isChecked(IDC_ARC));
+        // On a Russian layout, by the place of S.
+        QKeyEvent russian(QEvent::KeyPress, 0x42B, Qt::AltModifier, 39, 0, 0, QStringLiteral("ы"));
+        QSpontaneKeyEvent::setSpontaneous(&russian);
+        QApplication::instance()->notify(QApplication::focusWidget(), &russian);
+        EXPECT_EQ(dialog.focus(), IDC_SCALE);
         dialog.GetDlgItem(IDC_APPLY)->EnableWindow(FALSE);
         key(Qt::Key_A, Qt::AltModifier);
         EXPECT_EQ(dialog.codes(IDC_APPLY, BN_CLICKED), 0);

@@ -220,6 +220,26 @@ TEST_F(ContextMenu, TheBarShowsWhichEntryHasTheKeyboard) {
     EXPECT_EQ(look(edit), plainEdit);
 }
 
+// Russian letters, by the places of E and D: the entries keep their Latin access keys.
+TEST_F(FrameTest, AccessKeysAreFoundOnLayoutsOfOtherScripts) {
+    openNote();
+    const auto press = [](unsigned place, Qt::KeyboardModifiers modifiers, const char* typed) {
+        QWidget* target = openMenu() ? openMenu() : QApplication::focusWidget();
+        const QString text = QString::fromUtf8(typed);
+        for (const QEvent::Type type : {QEvent::KeyPress, QEvent::KeyRelease}) {
+            QKeyEvent event(type, text[0].toUpper().unicode(), modifiers, place, 0, 0, text);
+            QSpontaneKeyEvent::setSpontaneous(&event);
+            QApplication::instance()->notify(target, &event);
+        }
+    };
+    press(26, Qt::AltModifier, "у");
+    ASSERT_NE(openMenu(), nullptr);
+    EXPECT_EQ(openMenu()->actions()[0]->text(), "&Draw\tCtrl+D");
+    press(40, Qt::NoModifier, "в");
+    settle();
+    EXPECT_EQ(journal(), std::vector<std::string>{"draw"});
+}
+
 // --- assistive tools ---
 
 TEST_F(FrameTest, TellsAssistiveToolsPartsOfAFrameByName) {
