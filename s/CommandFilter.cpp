@@ -81,7 +81,7 @@ int rankIn(std::string_view text, std::string_view word) {
 int rankOf(const CommandText& command, std::string_view word) {
     const std::string_view label = command.label;
     const int name = rankIn(label.substr(command.nameStart), word);
-    const int whole = name == 0 ? rankIn(label, word) / 2 : 0;
+    const int whole = name < beginnings ? rankIn(label, word) / 2 : 0;
     int key = 0;
     if (!command.key.empty() && command.key.find(word) != std::string::npos) {
         key = command.key == word ? wholeWord : somewhere;

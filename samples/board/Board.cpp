@@ -6,6 +6,7 @@
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
+#include "s/CommandPalette.h"
 #include "s/Desktop.h"
 #include "s/FileName.h"
 #include "s/Help.h"
@@ -57,6 +58,8 @@ CBoardApp theApp;
 BEGIN_MESSAGE_MAP(CBoardApp, Gui_WinApp)
     ON_COMMAND(ID_FILE_NEW, &CWinApp::OnFileNew)
     ON_COMMAND(ID_FILE_OPEN, &CWinApp::OnFileOpen)
+    ON_COMMAND(ID_TOOLS_KEYBOARD, &CBoardApp::OnToolsKeyboard)
+    ON_COMMAND(ID_TOOLS_COMMANDS, &CBoardApp::OnToolsCommands)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -97,14 +100,16 @@ int CBoardApp::ExitInstance() {
 }
 
 BOOL CBoardApp::ShowMainFrame(CBoardCommandLine& info) {
-    AddDocTemplate(new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
-                                         RUNTIME_CLASS(CBoardView)));
+    auto* drawings = new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
+                                           RUNTIME_CLASS(CBoardView));
+    AddDocTemplate(drawings);
     m_console.Init();
     auto* frame = new CMainFrame;
     m_pMainWnd = frame;
     if (!frame->LoadFrame(IDR_MAINFRAME)) {
         return FALSE;
     }
+    m_keyboard = std::make_unique<CKeyboard>(*frame, *drawings);
     if (!OpenDrawings(info)) {
         return FALSE;
     }
@@ -156,6 +161,14 @@ CString CBoardApp::GetAppVersion() {
     CString version;
     version.LoadString(IDS_VERSION);
     return version;
+}
+
+void CBoardApp::OnToolsKeyboard() {
+    m_keyboard->Edit();
+}
+
+void CBoardApp::OnToolsCommands() {
+    Gui_CommandPalette::Open(static_cast<CFrameWnd*>(m_pMainWnd));
 }
 
 BOOL CBoardApp::PreTranslateMessage(MSG* message) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "CommandConsole.h"
+#include "Keyboard.h"
 #include "s/CommandLineInfo.h"
 #include "s/MessageManager.h"
 #include "s/SplashDlg.h"
@@ -52,6 +53,9 @@ public:
     /// A drawing's file: one may be named without its extension.
     static CString DrawingName(const CString& word);
 
+    afx_msg void OnToolsKeyboard();
+    afx_msg void OnToolsCommands();
+
 private:
     /// Whether this is to be the only board.
     bool m_single = false;
@@ -65,6 +69,8 @@ private:
     Gui_MessageManager m_messages;
     /// Shown while the application starts, null afterwards.
     std::unique_ptr<Gui_SplashDlg> m_splash;
+    /// Made with the main window.
+    std::unique_ptr<CKeyboard> m_keyboard;
 
     DECLARE_MESSAGE_MAP()
 };

@@ -1,0 +1,85 @@
+#include "Keyboard.h"
+
+#include "Resource.h"
+#include "res/resource.h"
+#include "s/AccelDlg.h"
+#include "s/AccelProfile.h"
+
+#include <memory>
+
+namespace {
+
+constexpr const char* entry = "Keys";
+
+/// The dialog, with a page of the help for its button.
+class CKeyboardDlg : public Gui_AccelDlg {
+public:
+    using Gui_AccelDlg::Gui_AccelDlg;
+
+protected:
+    DECLARE_MESSAGE_MAP()
+};
+
+// clang-format off
+BEGIN_MESSAGE_MAP(CKeyboardDlg, Gui_AccelDlg)
+    ON_BN_CLICKED(GUI_IDC_HELP_BUTTON, &CWnd::OnHelp)
+END_MESSAGE_MAP()
+// clang-format on
+
+/// The keys that the board comes with.
+Gui_AccelMap ownKeys() {
+    Gui_AccelMap map;
+    for (const UINT id : {IDR_MAINFRAME, IDR_BOARDTYPE}) {
+        const HACCEL table = LoadAccelerators(nullptr, MAKEINTRESOURCE(id));
+        map.AddAll(table);
+        DestroyAcceleratorTable(table);
+    }
+    return map;
+}
+
+void annotate(HMENU menu, const Gui_AccelMap& map) {
+    map.AnnotateMenu(CMenu::FromHandle(menu));
+}
+
+} // namespace
+
+CKeyboard::CKeyboard(CMDIFrameWnd& main, CMultiDocTemplate& drawings) : m_main(main), m_drawings(drawings) {
+    Gui_AccelMap map = ownKeys();
+    if (Gui_AccelProfile::Read(map, entry, nullptr)) {
+        apply(map);
+    }
+}
+
+void CKeyboard::Edit() {
+    const Gui_AccelMap own = ownKeys();
+    Gui_AccelMap now(m_main.m_hAccelTable);
+    now.AddAll(m_drawings.m_hAccelTable);
+    const HACCEL table = now.CreateTable();
+    // The menu of the drawings has all commands, the main window's own only some of them.
+    CKeyboardDlg dialog(CMenu::FromHandle(m_drawings.m_hMenuShared), table, &m_main);
+    DestroyAcceleratorTable(table);
+    dialog.SetResetAccels(own);
+    if (dialog.DoModal() == IDOK) {
+        const std::unique_ptr<Gui_AccelMap> map(dialog.GetAccelMap());
+        apply(*map);
+        Gui_AccelProfile::Write(*map, own, entry, nullptr);
+    }
+}
+
+void CKeyboard::apply(const Gui_AccelMap& map) {
+    DestroyAcceleratorTable(m_main.m_hAccelTable);
+    m_main.m_hAccelTable = map.CreateTable();
+    DestroyAcceleratorTable(m_drawings.m_hAccelTable);
+    m_drawings.m_hAccelTable = map.CreateTable();
+    // Open drawings have the handles that the template had; later ones take those that it has now.
+    for (POSITION at = m_drawings.GetFirstDocPosition(); at;) {
+        const CDocument* document = m_drawings.GetNextDoc(at);
+        for (POSITION view = document->GetFirstViewPosition(); view;) {
+            if (auto* frame = DYNAMIC_DOWNCAST(CMDIChildWnd, document->GetNextView(view)->GetParentFrame())) {
+                frame->SetHandles(m_drawings.m_hMenuShared, m_drawings.m_hAccelTable);
+            }
+        }
+    }
+    annotate(m_main.m_hMenuDefault, map);
+    annotate(m_drawings.m_hMenuShared, map);
+}

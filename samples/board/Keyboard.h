@@ -1,0 +1,21 @@
+#pragma once
+
+#include "afxwin.h"
+#include "s/AccelMap.h"
+
+/// The keys of the board, which its user may change. Main window and drawings have the same, each in a table of its
+/// own: that of the main window goes with the window, that of the drawings with their template.
+class CKeyboard {
+public:
+    /// Puts the user's keys in force, if he has any.
+    /// @param main, drawings  must live as long as the object is used
+    CKeyboard(CMDIFrameWnd& main, CMultiDocTemplate& drawings);
+    /// Lets the user change the keys.
+    void Edit();
+
+private:
+    void apply(const Gui_AccelMap& map);
+
+    CMDIFrameWnd& m_main;
+    CMultiDocTemplate& m_drawings;
+};
