@@ -3,6 +3,7 @@
 
 #include "res/resource.h"
 #include "s/AccelMap.h"
+#include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/TestApplication.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 
@@ -361,6 +362,39 @@ TEST(AccelDlg, WorksWithoutTheMouse) {
     });
     EXPECT_EQ(result, IDOK);
     EXPECT_EQ(commandOf(*dialog.map(), ctrl('K')), exitProgram);
+}
+
+TEST(AccelDlg, NamesItsControlsForAssistiveTools) {
+    Menu menu;
+    Dialog dialog(menu);
+    dialog.run([&] {
+        dialog.push(GUI_IDC_ACCEL_SPECIFY);
+        dialog.push(GUI_IDC_ACCEL_FIND_KEY);
+        EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(tvx::afx::peerOf(dialog.m_hWnd)->window())),
+                  "Dialog \"Keyboard Accelerators\"\n"
+                  " StaticText \"Commands\"\n"
+                  " List \"Commands\" < Commands\n"
+                  " StaticText \"Filter\"\n"
+                  " EditableText \"Find Key\" < Find Key\n"
+                  " Button \"Find Key\"\n"
+                  " StaticText \"Current Keys\"\n"
+                  " List \"Current Keys\" < Current Keys\n"
+                  " Button \"Remove\"\n"
+                  " Grouping \"Accelerator Key\"\n"
+                  " StaticText \"Type the accelerator key and press the Done button.\"\n"
+                  " EditableText \"Type the accelerator key and press the Done button.\" < Type the accelerator key "
+                  "and press the Done button.\n"
+                  " Button \"Done\"\n"
+                  " Button \"Assign\"\n"
+                  " StaticText \"Press the key to look for.\"\n"
+                  " Button \"Undo\" < Press the key to look for.\n"
+                  " Grouping \"Description\"\n"
+                  " StaticText \"\"\n"
+                  " Button \"OK\" < \n"
+                  " Button \"Cancel\"\n"
+                  " Button \"Help\"\n"
+                  " Button \"Reset\"\n");
+    });
 }
 
 TEST(AccelDlg, GivesTheResultToAFrameOrACopy) {

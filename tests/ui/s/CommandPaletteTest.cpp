@@ -2,6 +2,7 @@
 #include "s/CommandPalette.h"
 
 #include "res/resource.h"
+#include "tests/ui/afx/AccessibleTree.h"
 #include "tests/ui/afx/TestApplication.h"
 #include "tests/ui/afx/dialogs/DialogTesting.h"
 
@@ -203,6 +204,17 @@ TEST_F(CommandPalette, RunsWhatIsClickedAndClosesWhenTheUserTurnsAway) {
     m_frame->SetActiveWindow();
     EXPECT_TRUE(isClosed());
     EXPECT_TRUE(m_frame->commands.empty());
+}
+
+TEST_F(CommandPalette, NamesItsControlsForAssistiveTools) {
+    open();
+    EXPECT_EQ(accessibleTree(*QAccessible::queryAccessibleInterface(tvx::afx::peerOf(m_handle)->window())),
+              "Dialog \"Commands\"\n"
+              " StaticText \"Words or first letters of a command\"\n"
+              " EditableText \"Words or first letters of a command\" < Words or first letters of a command\n"
+              " StaticText \"Commands\"\n"
+              " List \"Commands\" < Commands\n"
+              " StaticText \"\"\n");
 }
 
 TEST_F(CommandPalette, EndsWithItsFrameAndNeedsAMenu) {
