@@ -4,6 +4,7 @@
 #include "s/AccelDlgRecord.h"
 #include "s/CommandFilter.h"
 #include "s/KeyIndex.h"
+#include "s/KeyTexts.h"
 
 #include <algorithm>
 #include <memory>
@@ -17,12 +18,13 @@ namespace {
 /// What the filter looks at, command by command.
 std::vector<std::string> textsOf(const std::vector<MenuCommand>& commands, const KeyIndex& keys) {
     std::vector<std::string> texts;
+    KeyTexts names;
     texts.reserve(commands.size());
     for (const MenuCommand& command : commands) {
         std::string text(command.label.View());
         for (const Gui_Accel& accel : keys.keysOf(command.id)) {
             text += '\n';
-            text += accel.GetKeyText().View();
+            text += names.textOf(accel).View();
         }
         texts.push_back(tvx::text::foldCase(text));
     }

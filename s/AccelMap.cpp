@@ -1,6 +1,7 @@
 #include "s/AccelMap.h"
 
 #include "s/KeyIndex.h"
+#include "s/KeyTexts.h"
 #include "s/MenuStr.h"
 #include "s/Record.h"
 
@@ -156,10 +157,10 @@ HACCEL Gui_AccelMap::CreateTable() const {
 namespace {
 
 /// The shortcut that an item is to show, which shows one now; nothing where its command has no key.
-std::optional<CString> shortCutOf(std::span<const Gui_Accel> keys, const CString& shown) {
+std::optional<CString> shortCutOf(std::span<const Gui_Accel> keys, const CString& shown, KeyTexts& texts) {
     std::optional<CString> first;
     for (const Gui_Accel& accel : keys) {
-        CString text = accel.GetKeyText();
+        CString text = texts.textOf(accel);
         if (text == shown) {
             return text;
         }
@@ -170,7 +171,7 @@ std::optional<CString> shortCutOf(std::span<const Gui_Accel> keys, const CString
     return first;
 }
 
-void annotate(CMenu& menu, const KeyIndex& keys) {
+void annotate(CMenu& menu, const KeyIndex& keys, KeyTexts& texts) {
     // A menu without items, or no menu at all, counts -1 or 0.
     for (int item = 0; item < static_cast<int>(menu.GetMenuItemCount()); ++item) {
         const UINT command = menu.GetMenuItemID(item);
@@ -178,11 +179,11 @@ void annotate(CMenu& menu, const KeyIndex& keys) {
             continue;
         }
         if (CMenu* popup = menu.GetSubMenu(item)) {
-            annotate(*popup, keys);
+            annotate(*popup, keys, texts);
             continue;
         }
         Gui_MenuStr text(&menu, item, MF_BYPOSITION);
-        if (const auto shortCut = shortCutOf(keys.keysOf(command), text.GetShortCutKeyText())) {
+        if (const auto shortCut = shortCutOf(keys.keysOf(command), text.GetShortCutKeyText(), texts)) {
             text.SetShortCutKeyText(*shortCut);
         } else {
             text.ClearShortCutKeyText();
@@ -195,6 +196,7 @@ void annotate(CMenu& menu, const KeyIndex& keys) {
 
 void Gui_AccelMap::AnnotateMenu(CMenu* menu) const {
     if (menu) {
-        annotate(*menu, KeyIndex(*this));
+        KeyTexts texts;
+        annotate(*menu, KeyIndex(*this), texts);
     }
 }

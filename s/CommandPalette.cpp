@@ -42,29 +42,6 @@ CString stringOf(UINT id) {
     return text;
 }
 
-bool isEnabled(const PaletteEntry& entry) {
-    return (entry.command.state & (MF_GRAYED | MF_DISABLED)) == 0;
-}
-
-bool isChecked(const PaletteEntry& entry) {
-    return (entry.command.state & MF_CHECKED) != 0;
-}
-
-/// A line as assistive tools read it: they do not see how it is drawn.
-CString spoken(const PaletteEntry& entry) {
-    CString text = entry.title;
-    if (!entry.key.IsEmpty()) {
-        text += ", " + entry.key;
-    }
-    if (isChecked(entry)) {
-        text += ", " + stringOf(GUI_IDS_PALETTE_CHECKED);
-    }
-    if (!isEnabled(entry)) {
-        text += ", " + stringOf(GUI_IDS_PALETTE_DISABLED);
-    }
-    return text;
-}
-
 } // namespace
 
 int Gui_CommandPalette::Open(CFrameWnd* frame) {
@@ -119,7 +96,7 @@ void Gui_CommandPalette::OnChangeText() {
     tvx::allocating([&] { m_record->shown = m_record->list.matches(typed.View()); });
     m_record->commands.ResetContent();
     for (const PaletteEntry* entry : m_record->shown) {
-        m_record->commands.InsertString(-1, spoken(*entry));
+        m_record->commands.InsertString(-1, entry->spoken);
     }
     select(m_record->shown.empty() ? -1 : 0);
 }
@@ -132,7 +109,7 @@ void Gui_CommandPalette::select(int line) {
 void Gui_CommandPalette::OnSelchangeCommands() {
     const PaletteEntry* entry = m_record->selected();
     CString prompt = entry ? PromptOf(entry->command.id) : stringOf(GUI_IDS_PALETTE_NOTHING);
-    if (entry && !isEnabled(*entry)) {
+    if (entry && !entry->isEnabled()) {
         prompt = stringOf(GUI_IDS_PALETTE_UNAVAILABLE) + " " + prompt;
     }
     SetDlgItemText(GUI_IDC_PALETTE_PROMPT, prompt);
@@ -149,7 +126,7 @@ void Gui_CommandPalette::OnDrawItem(int /*id*/, DRAWITEMSTRUCT* item) {
     const PaletteEntry& entry = *m_record->shown[item->itemID];
     CDC& dc = *CDC::FromHandle(item->hDC);
     const bool isSelected = (item->itemState & ODS_SELECTED) != 0;
-    const int ink = isSelected ? COLOR_HIGHLIGHTTEXT : isEnabled(entry) ? COLOR_WINDOWTEXT : COLOR_GRAYTEXT;
+    const int ink = isSelected ? COLOR_HIGHLIGHTTEXT : entry.isEnabled() ? COLOR_WINDOWTEXT : COLOR_GRAYTEXT;
     CRect rect(item->rcItem);
     dc.FillSolidRect(rect, GetSysColor(isSelected ? COLOR_HIGHLIGHT : COLOR_WINDOW));
     dc.SetTextColor(GetSysColor(ink));
@@ -157,7 +134,7 @@ void Gui_CommandPalette::OnDrawItem(int /*id*/, DRAWITEMSTRUCT* item) {
     constexpr UINT format = DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX;
     const int margin = rect.Height() / 4;
     rect.DeflateRect(margin, 0);
-    if (isChecked(entry)) {
+    if (entry.isChecked()) {
         dc.DrawText("✓", -1, rect, format);
     }
     rect.left += rect.Height();
@@ -228,7 +205,7 @@ void Gui_CommandPalette::OnActivate(UINT state, CWnd* other, BOOL minimized) {
 
 void Gui_CommandPalette::OnOK() {
     const PaletteEntry* entry = m_record->selected();
-    if (!entry || !isEnabled(*entry)) {
+    if (!entry || !entry->isEnabled()) {
         MessageBeep(MB_OK);
         return;
     }

@@ -1,7 +1,9 @@
 #include "s/PaletteList.h"
 
 #include "platform/base/Text.h"
+#include "res/resource.h"
 #include "s/KeyIndex.h"
+#include "s/KeyTexts.h"
 
 #include <algorithm>
 
@@ -33,7 +35,26 @@ KeyIndex keysInForce(CFrameWnd& frame) {
     return KeyIndex(map);
 }
 
-PaletteEntry entryOf(MenuCommand command, const KeyIndex& keys) {
+/// What the lines of all commands are made with, looked up once.
+struct Words {
+    KeyTexts keys;
+    CString checked;
+    CString disabled;
+};
+
+CString spokenText(const PaletteEntry& entry, const Words& words) {
+    CString text = entry.title;
+    for (const auto& [applies, addition] : {std::pair(!entry.key.IsEmpty(), &entry.key),
+                                            {entry.isChecked(), &words.checked},
+                                            {!entry.isEnabled(), &words.disabled}}) {
+        if (applies) {
+            text += ", " + *addition;
+        }
+    }
+    return text;
+}
+
+PaletteEntry entryOf(MenuCommand command, const KeyIndex& keys, Words& words) {
     PaletteEntry entry;
     const CString name = command.label.Mid(command.nameStart);
     const CString menus = command.label.Left(command.nameStart).Trim();
@@ -41,7 +62,7 @@ PaletteEntry entryOf(MenuCommand command, const KeyIndex& keys) {
     entry.key = command.shortCut;
     const auto all = keys.keysOf(command.id);
     if (entry.key.IsEmpty() && !all.empty()) {
-        entry.key = all.front().GetKeyText();
+        entry.key = words.keys.textOf(all.front());
     }
     entry.text.label = tvx::text::foldCase(menus.View());
     entry.text.label += ' ';
@@ -49,6 +70,7 @@ PaletteEntry entryOf(MenuCommand command, const KeyIndex& keys) {
     entry.text.label += tvx::text::foldCase(name.View());
     entry.text.key = tvx::text::foldCase(entry.key.View());
     entry.command = std::move(command);
+    entry.spoken = spokenText(entry, words);
     return entry;
 }
 
@@ -62,12 +84,15 @@ PaletteList::PaletteList(CFrameWnd& frame) {
     frame.SendMessage(WM_INITMENU, reinterpret_cast<WPARAM>(menu->m_hMenu));
     updateStates(frame, *menu);
     const KeyIndex keys = keysInForce(frame);
+    Words words;
+    words.checked.LoadString(GUI_IDS_PALETTE_CHECKED);
+    words.disabled.LoadString(GUI_IDS_PALETTE_DISABLED);
     tvx::allocating([&] {
         const std::vector<UINT>& recent = recentCommands();
         for (MenuCommand& command : CommandsOf(frame.GetMenu())) {
             const auto run = std::find(recent.begin(), recent.end(), command.id);
             m_recent.push_back(run != recent.end() ? static_cast<int>(run - recent.begin()) + 1 : 0);
-            m_entries.push_back(entryOf(std::move(command), keys));
+            m_entries.push_back(entryOf(std::move(command), keys, words));
         }
     });
 }

@@ -10,9 +10,17 @@
 /// One line of a command palette.
 struct PaletteEntry {
     MenuCommand command;
-    CString title; ///< "Edit: Bring to Front"
-    CString key;   ///< what the menu shows, else the first of its keys
+    CString title;  ///< "Edit: Bring to Front"
+    CString key;    ///< what the menu shows, else the first of its keys
+    CString spoken; ///< the line as assistive tools read it: they do not see how it is drawn
     CommandText text;
+
+    [[nodiscard]] bool isEnabled() const {
+        return (command.state & (MF_GRAYED | MF_DISABLED)) == 0;
+    }
+    [[nodiscard]] bool isChecked() const {
+        return (command.state & MF_CHECKED) != 0;
+    }
 };
 
 /// What a command palette offers: the commands of a frame, and which of them fit what was typed, in which order.
