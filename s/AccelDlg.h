@@ -22,8 +22,8 @@ class Gui_AccelMap;
 /// words of their names or keys, or by pressing a key.
 ///
 /// The dialog changes a copy of the accelerators. After OK the host applies them, while the dialog object lives; Cancel
-/// leaves everything as it was. What the Help button does is the host's: ON_BN_CLICKED(GUI_IDC_HELP_BUTTON, ...) in a
-/// derived class, or an ON_COMMAND of the frame or the application.
+/// leaves everything as it was. What the Help button does is the host's: a derived class has
+/// ON_BN_CLICKED(GUI_IDC_HELP_BUTTON, ...).
 ///
 /// docs/keyboard.md tells how keys are kept over restarts.
 class GUI_API Gui_AccelDlg : public CDialog {

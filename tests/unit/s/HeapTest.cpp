@@ -2,6 +2,7 @@
 #include "TestApp.h"
 #include "platform/port/MsgManData.h"
 #include "res/resource.h"
+#include "s/AccelMap.h"
 #include "s/CommandLineState.h"
 #include "s/FileName.h"
 #include "s/HelpMap.h"
@@ -160,4 +161,18 @@ TEST(Heap, AnExhaustedOneRaisesTheFrameworksExceptionFromHelpMaps) {
     ::unsetenv("TARVEX");
     fs::current_path("/");
     fs::remove_all(root);
+}
+
+TEST(Heap, AnExhaustedOneGivesNoTableOfAccelerators) {
+    const tagACCEL accels[] = {{FVIRTKEY, VK_F2, 1}, {FVIRTKEY, VK_F3, 2}};
+    Gui_AccelMap map;
+    EXPECT_GT(failuresOf([&] { map = Gui_AccelMap(accels, 2); }), 0);
+    int count = 7;
+    tagACCEL anything{};
+    tagACCEL* table = &anything;
+    allocationsLeft = 0;
+    map.GetAll(count, table);
+    allocationsLeft = -1;
+    EXPECT_EQ(count, 0);
+    EXPECT_EQ(table, nullptr);
 }
