@@ -4,14 +4,6 @@
 
 static_assert(sizeof(Gui_Accel) == sizeof(tagACCEL), "tables of accelerators are handed out as they are");
 
-Gui_Accel::Gui_Accel() : tagACCEL{} {}
-
-Gui_Accel::Gui_Accel(unsigned char flags, unsigned short key, unsigned short command) : tagACCEL{flags, key, command} {}
-
-Gui_Accel::Gui_Accel(const tagACCEL& accel) : tagACCEL(accel) {}
-
-Gui_Accel::Gui_Accel(const tagACCEL* accel) : tagACCEL(*accel) {}
-
 Gui_Accel& Gui_Accel::operator=(const tagACCEL& accel) {
     static_cast<tagACCEL&>(*this) = accel;
     return *this;
@@ -31,15 +23,6 @@ void Gui_Accel::Clear() {
 
 Gui_Accel::operator tagACCEL*() {
     return this;
-}
-
-unsigned long Gui_Accel::EncodeFlagsAndKey() const {
-    return static_cast<unsigned long>(key) << 16U | fVirt | FNOINVERT;
-}
-
-void Gui_Accel::DecodeFlagsAndKey(unsigned long packed) {
-    fVirt = static_cast<BYTE>(packed);
-    key = static_cast<WORD>(packed >> 16U);
 }
 
 CString Gui_Accel::GetKeyText() const {

@@ -14,14 +14,14 @@
 class GUI_API Gui_Accel : public tagACCEL {
 public:
     /// All fields 0.
-    Gui_Accel();
+    Gui_Accel() : tagACCEL{} {}
     /// @param flags    FVIRTKEY, FNOINVERT, FSHIFT, FCONTROL, FALT
     /// @param key      VK_... with FVIRTKEY, a character without
     /// @param command  the command's identifier
-    Gui_Accel(unsigned char flags, unsigned short key, unsigned short command);
-    Gui_Accel(const tagACCEL& accel);
+    Gui_Accel(unsigned char flags, unsigned short key, unsigned short command) : tagACCEL{flags, key, command} {}
+    Gui_Accel(const tagACCEL& accel) : tagACCEL(accel) {}
     /// @param accel  copied; not null
-    Gui_Accel(const tagACCEL* accel);
+    Gui_Accel(const tagACCEL* accel) : tagACCEL(*accel) {}
 
     Gui_Accel& operator=(const tagACCEL& accel);
     /// Compares all three fields.
@@ -43,9 +43,14 @@ public:
 
     /// Flags and key in one number: the flags in bits 0 to 7, FNOINVERT always among them, the key in bits 16 to 31.
     /// The command is not part of it, so accelerators of the same key have the same number.
-    unsigned long EncodeFlagsAndKey() const;
+    unsigned long EncodeFlagsAndKey() const {
+        return static_cast<unsigned long>(key) << 16U | fVirt | FNOINVERT;
+    }
     /// Takes flags and key from such a number; the command stays.
-    void DecodeFlagsAndKey(unsigned long packed);
+    void DecodeFlagsAndKey(unsigned long packed) {
+        fVirt = static_cast<BYTE>(packed);
+        key = static_cast<WORD>(packed >> 16U);
+    }
 
     /// The key's name for display, as the keyboard layout calls it: modifiers in the order Ctrl, Alt, Shift, "+"
     /// between the parts. Alt and Shift of characters are not named. Empty for an empty accelerator.

@@ -32,9 +32,10 @@ void forEach(const Gui_AccelMapImpl& map, Function function) {
     }
 }
 
-bool isBefore(const Gui_Accel& first, const Gui_Accel& second) {
+/// The order in which accelerators come out of a map.
+constexpr auto isBefore = [](const Gui_Accel& first, const Gui_Accel& second) {
     return first.EncodeFlagsAndKey() < second.EncodeFlagsAndKey();
-}
+};
 
 std::vector<Gui_Accel> keysOf(const Gui_AccelMapImpl& map, unsigned short command) {
     std::vector<Gui_Accel> keys;
@@ -172,13 +173,13 @@ std::optional<CString> shortCutOf(std::span<const Gui_Accel> keys, const CString
 }
 
 void annotate(CMenu& menu, const KeyIndex& keys, KeyTexts& texts) {
-    // A menu without items, or no menu at all, counts -1 or 0.
-    for (int item = 0; item < static_cast<int>(menu.GetMenuItemCount()); ++item) {
+    const auto count = static_cast<int>(menu.GetMenuItemCount()); // -1 for what is no menu
+    for (int item = 0; item < count; ++item) {
         const UINT command = menu.GetMenuItemID(item);
         if (command == 0) {
             continue;
         }
-        if (CMenu* popup = menu.GetSubMenu(item)) {
+        if (CMenu* popup = command == static_cast<UINT>(-1) ? menu.GetSubMenu(item) : nullptr) {
             annotate(*popup, keys, texts);
             continue;
         }

@@ -13,6 +13,7 @@ namespace {
 
 constexpr const char* separator = "+";
 constexpr int longestName = 49;
+constexpr int usualLength = 24;
 constexpr WORD arrowKeys[] = {VK_LEFT, VK_UP, VK_RIGHT, VK_DOWN};
 /// Keys that share their scan codes with the numeric keypad, which has other names for them.
 constexpr WORD extendedKeys[] = {VK_HOME,   VK_END,  VK_PRIOR, VK_NEXT,  VK_INSERT,
@@ -46,6 +47,7 @@ const CString& KeyTexts::nameOf(WORD key) {
 
 CString KeyTexts::virtualKeyText(const tagACCEL& accel) {
     CString text;
+    text.Preallocate(usualLength);
     for (const auto& [flag, modifier] : {std::pair(FCONTROL, VK_CONTROL), {FALT, VK_MENU}, {FSHIFT, VK_SHIFT}}) {
         if ((accel.fVirt & flag) != 0) {
             text += nameOf(static_cast<WORD>(modifier));

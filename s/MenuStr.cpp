@@ -9,25 +9,21 @@
 
 namespace {
 
-constexpr std::size_t longestText = 99; // characters
+constexpr std::size_t longestText = 99;     // characters
+constexpr std::size_t longestCharacter = 4; // bytes
 
 CString itemText(const CMenu* menu, int item, unsigned int flags) {
-    CString text;
-    if (!menu) {
-        return text;
+    char buffer[longestText * longestCharacter + 1] = "";
+    const int size = menu ? menu->GetMenuString(static_cast<UINT>(item), buffer, sizeof buffer, flags) : 0;
+    const std::string_view whole(buffer, static_cast<std::size_t>(size));
+    std::size_t end = whole.size();
+    if (end > longestText) {
+        end = 0;
+        for (std::size_t count = 0; count < longestText && end < whole.size(); ++count) {
+            end += tvx::text::characterLength(whole, end);
+        }
     }
-    menu->GetMenuString(static_cast<UINT>(item), text, flags);
-    const std::string_view whole = text.View();
-    std::size_t end = 0;
-    for (std::size_t count = 0; count < longestText && end < whole.size(); ++count) {
-        end += tvx::text::characterLength(whole, end);
-    }
-    return text.Left(static_cast<int>(end));
-}
-
-/// Everything before the first tab.
-std::string_view withoutShortCut(std::string_view text) {
-    return text.substr(0, text.find('\t'));
+    return CString(whole.substr(0, end));
 }
 
 } // namespace
@@ -105,10 +101,15 @@ void Gui_MenuStr::SetCommandText(const char* text) {
 }
 
 void Gui_MenuStr::SetShortCutKeyText(const char* text) {
-    const CString before(withoutShortCut(m_text->View()));
-    *m_text = before + "\t" + CString(text);
+    const CString shortCut(text); // which may be a part of this text
+    ClearShortCutKeyText();
+    m_text->AppendChar('\t');
+    m_text->Append(shortCut);
 }
 
 void Gui_MenuStr::ClearShortCutKeyText() {
-    *m_text = CString(withoutShortCut(m_text->View()));
+    const int tab = m_text->Find('\t');
+    if (tab >= 0) {
+        m_text->Truncate(tab);
+    }
 }
