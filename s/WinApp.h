@@ -92,6 +92,10 @@ public:
     /// user's is, else English.
     static CString GetRedirectUrl();
 
+    /// The name with "..." in place of its first folders, as Gui_FileName::GetAbbreviatedName makes it. The list of
+    /// recent files shows such names.
+    CString GetAbbreviatedFileName(const char* path, int maxLength, BOOL keepName) override;
+
     /// The icon for the About box; it stays the application's.
     virtual HICON GetAppIcon() = 0;
     /// The application's version as the user is to read it.

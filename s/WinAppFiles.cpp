@@ -6,6 +6,16 @@
 #include "s/FileName.h"
 #include "s/MainWindow.h"
 
+namespace {
+
+/// Whether a full name has the family's form. One that has no other than the system's, because it holds a backslash,
+/// must stay as it is.
+bool hasOwnForm(std::string_view path) {
+    return !path.starts_with('/');
+}
+
+} // namespace
+
 HWND Gui_WinApp::GetOwnerForFileDialog() {
     return MainWindowHandle();
 }
@@ -58,8 +68,11 @@ unsigned int Gui_WinApp::GetFlagsForFileDialog(unsigned int flags) {
 
 CString Gui_WinApp::GetPathNameFromFileDialog(CFileDialog& dialog) {
     const CString path = dialog.GetPathName();
-    // A name that has no other form than the system's, because it holds a backslash, must stay as it is.
-    return path.View().starts_with('/') ? path : Gui_FileName(path).GetFullName();
+    return hasOwnForm(path.View()) ? Gui_FileName(path).GetFullName() : path;
+}
+
+CString Gui_WinApp::GetAbbreviatedFileName(const char* path, int maxLength, BOOL keepName) {
+    return hasOwnForm(path) ? Gui_FileName(path).GetAbbreviatedName(maxLength, keepName) : CString(path);
 }
 
 void Gui_WinApp::AddFileFilter(CString& filter, const CString& description, const CString& pattern) {

@@ -69,6 +69,7 @@ BOOL CBoardApp::InitInstance() {
     Port_MsgDispatcher::addMsgMan(&m_messages);
     Gui_Locale::SetAppResourceHandle();
     SetRegistryKey("Tarvex");
+    LoadStdProfileSettings();
 
     CBoardCommandLine info;
     ParseCommandLine(info);

@@ -30,6 +30,8 @@ IMPLEMENT_DYNAMIC(CWinApp, CWinThread)
 // clang-format off
 BEGIN_MESSAGE_MAP(CWinApp, CWinThread)
     ON_COMMAND(ID_APP_EXIT, &CWinApp::OnAppExit)
+    ON_UPDATE_COMMAND_UI(ID_FILE_MRU_FILE1, &CWinApp::OnUpdateRecentFileMenu)
+    ON_COMMAND_EX_RANGE(ID_FILE_MRU_FILE1, ID_FILE_MRU_FILE16, &CWinApp::OnOpenRecentFile)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -84,6 +86,7 @@ CWinApp::CWinApp(LPCSTR appName) {
 
 CWinApp::~CWinApp() {
     DeleteDocManager();
+    DeleteRecentFileList();
     for (LPCSTR* text : {&m_pszAppName, &m_pszExeName, &m_pszHelpFilePath, &m_pszProfileName, &m_pszRegistryKey}) {
         replaceText(*text, nullptr);
     }
@@ -110,6 +113,7 @@ int CWinApp::Run() {
 }
 
 int CWinApp::ExitInstance() {
+    SaveStdProfileSettings();
     return 0;
 }
 

@@ -12,6 +12,7 @@
 class CDocManager;
 class CDocTemplate;
 class CDocument;
+class CRecentFileList;
 
 /// What the framework knows about the running module.
 struct AFX_MODULE_STATE {
@@ -65,6 +66,8 @@ public:
     LPCSTR m_pszRegistryKey = nullptr;
     /// Owned; null until the first AddDocTemplate.
     CDocManager* m_pDocManager = nullptr;
+    /// Owned; null until LoadStdProfileSettings. A host may put an object of a derived class here before that.
+    CRecentFileList* m_pRecentFileList = nullptr;
     /// Whether the pointer chooses what to explain: see CFrameWnd::OnContextHelp.
     BOOL m_bHelpMode = FALSE;
 
@@ -122,8 +125,6 @@ public:
     /// entries of applications, and draws controls in its own style.
     /// @{
 
-    /// There is no list of recent files yet, of which `count` would be the length.
-    void LoadStdProfileSettings(UINT count = 4) {}
     void EnableShellOpen() {}
     void RegisterShellFileTypes(BOOL withPrinting = FALSE) {}
     BOOL Enable3dControls() {
@@ -156,6 +157,16 @@ public:
     /// @param flags       OFN_...
     /// @param docTemplate whose kind of file is proposed; null: all kinds are offered
     BOOL DoPromptFileName(CString& fileName, UINT titleId, DWORD flags, BOOL openDialog, CDocTemplate* docTemplate);
+    /// Keeps a list of recent files, in InitInstance behind SetRegistryKey. The settings are read when the list is
+    /// first needed.
+    /// @param count files that are kept: 16 at most, 0 for no list
+    void LoadStdProfileSettings(UINT count = 4);
+    /// Puts a file first in the list of recent files, if there is one. Documents do so when they are opened or saved.
+    virtual void AddToRecentFileList(LPCSTR path);
+    /// A file's name for a place with little room, such as the menu. The base version answers the whole name.
+    /// @param maxLength characters that there is room for
+    /// @param keepName  whether the name itself is to be answered even where it has no room
+    virtual CString GetAbbreviatedFileName(LPCSTR path, int maxLength, BOOL keepName);
     /// @}
 
     /// Resources.
@@ -212,6 +223,13 @@ public:
     /// Lets the pointer choose what to explain, if the main window is a frame (WM_COMMAND with ID_CONTEXT_HELP).
     afx_msg void OnContextHelp();
 
+    /// Puts the recent files into the menu; opens one of them. Both are in this class's own map, for ID_FILE_MRU_FILE1
+    /// to 16. A file that is gone is taken out of the list when it cannot be opened.
+    afx_msg void OnUpdateRecentFileMenu(CCmdUI* item);
+    afx_msg BOOL OnOpenRecentFile(UINT id);
+
+    /// Stores the list of recent files where the host has changed it; ExitInstance does.
+    void SaveStdProfileSettings();
     /// Hides the main window: the first step of the end.
     void HideApplication();
 
@@ -221,6 +239,7 @@ private:
     friend int AfxWinMain(int argc, char** argv);
     void rememberCommandLine(int argc, char** argv);
     void DeleteDocManager();
+    void DeleteRecentFileList();
     CString profilePath() const;
     LSTATUS writeEntry(LPCSTR section, LPCSTR entry, DWORD type, std::string_view bytes);
     int m_waitDepth = 0;

@@ -42,9 +42,12 @@ void CDocument::SetTitle(LPCSTR title) {
     UpdateFrameCounts();
 }
 
-void CDocument::SetPathName(LPCSTR path, BOOL) {
+void CDocument::SetPathName(LPCSTR path, BOOL addToRecent) {
     m_strPathName = fullPath(path);
     SetTitle(lastPart(m_strPathName));
+    if (addToRecent && AfxGetApp()) {
+        AfxGetApp()->AddToRecentFileList(m_strPathName);
+    }
 }
 
 // --- views ---

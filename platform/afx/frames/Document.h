@@ -45,6 +45,7 @@ public:
         return m_strPathName;
     }
     /// Names the file; the title becomes its last part.
+    /// @param addToRecent whether it becomes the first of the recent files
     virtual void SetPathName(LPCSTR path, BOOL addToRecent = TRUE);
     /// The template that made the document and lists it, null for a document made without one.
     CDocTemplate* GetDocTemplate() const {

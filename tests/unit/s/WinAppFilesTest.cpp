@@ -68,6 +68,12 @@ TEST(WinAppFiles, ChosenNamesAreWhole) {
     EXPECT_STREQ(theApp.GetPathNameFromFileDialog(odd), "/tmp/odd\\name");
 }
 
+TEST(WinAppFiles, NamesForMenusLoseTheirFirstFolders) {
+    EXPECT_STREQ(theApp.GetAbbreviatedFileName("C:\\plans\\old\\gears\\a.brd", 20, TRUE), "C:\\...\\gears\\a.brd");
+    EXPECT_STREQ(theApp.GetAbbreviatedFileName("C:\\plans\\gear wheel.brd", 5, TRUE), "gear wheel.brd");
+    EXPECT_STREQ(theApp.GetAbbreviatedFileName("/tmp/odd\\name", 5, TRUE), "/tmp/odd\\name");
+}
+
 TEST(WinAppFiles, TheTitleIsAStringOfTheResources) {
     EXPECT_STREQ(theApp.GetTitleForFileDialog(20079), "Web Browser");
     EXPECT_STREQ(theApp.GetTitleForFileDialog(20050), "");

@@ -125,6 +125,9 @@ UINT promptOf(UINT command) {
     if (command >= SC_SIZE && command < 0xF1F0) {
         return (command - SC_SIZE) / 16 + AFX_IDS_SCFIRST;
     }
+    if (command >= ID_FILE_MRU_FIRST && command <= ID_FILE_MRU_LAST) {
+        return ID_FILE_MRU_FILE1;
+    }
     return command >= AFX_IDM_FIRST_MDICHILD ? AFX_IDS_MDICHILD : command;
 }
 

@@ -53,6 +53,16 @@ CString fullPath(LPCSTR path) {
     return make(fullName(path));
 }
 
+CString spelledPath(LPCSTR path) {
+    const std::string full = fullName(path);
+    const auto found = systemPath(full);
+    return found ? make(driveName(*found)) : make(full);
+}
+
+CString realPath(LPCSTR path) {
+    return make(driveName(canonical(path).string()));
+}
+
 bool sameFile(LPCSTR first, LPCSTR second) {
     return *first != '\0' && *second != '\0' && canonical(first) == canonical(second);
 }

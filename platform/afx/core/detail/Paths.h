@@ -12,6 +12,10 @@ namespace tvx::afx {
 [[nodiscard]] CString withoutExtension(const CString& name);
 /// A name from the root on; one that is relative begins in the current folder.
 [[nodiscard]] CString fullPath(LPCSTR path);
+/// The same in the spelling of what exists under it.
+[[nodiscard]] CString spelledPath(LPCSTR path);
+/// The file that a name from the root on leads to, links followed.
+[[nodiscard]] CString realPath(LPCSTR path);
 /// Whether two names mean the same file.
 [[nodiscard]] bool sameFile(LPCSTR first, LPCSTR second);
 

@@ -178,6 +178,7 @@ void FileDialogWindow::showColumnsWhole() {
     header->setStretchLastSection(false);
     header->setSectionResizeMode(QHeaderView::ResizeToContents);
     header->setSectionResizeMode(0, QHeaderView::Stretch);
+    header->setResizeContentsPrecision(0); // by the lines that are shown, not by a thousand
     const QSize room = screen()->availableGeometry().size() * 9 / 10;
     resize(sizeHint().expandedTo(fontMetrics().averageCharWidth() * QSize(130, 70)).boundedTo(room));
 }

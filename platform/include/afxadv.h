@@ -1,0 +1,7 @@
+#pragma once
+
+/// @file
+/// The list of recent files.
+
+#include "afxwin.h"
+#include "platform/afx/frames/RecentFileList.h"
