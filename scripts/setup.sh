@@ -38,6 +38,7 @@ test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
 bench    libbenchmark-dev the benchmark programs' framework
 bench    libglib2.0-dev   a peer of wildcards and help maps
+bench    libreadline-dev  a peer of the console's history
 check    git              lists the files to check
 check    python3          the include, documentation and wording checks
 check    clang-format-19  the format check; other versions format differently

@@ -227,7 +227,7 @@ TEST_F(Console, RecallsAndTellsWhatIsWrongWithARecall) {
         enter(test.input);
         EXPECT_TRUE(asked) << test.input;
         ASSERT_EQ(1U, windowTestApp.help.size());
-        EXPECT_EQ(test.help, windowTestApp.help[0].first);
+        EXPECT_EQ(HID_BASE_PROMPT + test.help, windowTestApp.help[0].first);
         EXPECT_EQ("", typed()) << "a recall that failed is done with";
     }
     EXPECT_EQ(3U, executed.size());

@@ -3,9 +3,8 @@
 #include "s/WinApp.h"
 
 #include <functional>
-#include <utility>
-#include <vector>
 #include <string>
+#include <utility>
 #include <vector>
 
 /// The application object of tests of the library's windows: a host with an icon and a version.
@@ -67,7 +66,7 @@ public:
     }
     CString version = "1.2";
     std::vector<std::pair<DWORD_PTR, UINT>> help; ///< number and command of each request
-    std::function<void()> idle; ///< called in the idle time
+    std::function<void()> idle;                   ///< called in the idle time
 };
 
 extern WindowTestApp windowTestApp;
