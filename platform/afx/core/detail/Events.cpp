@@ -74,6 +74,22 @@ MSG keyMessage(const Window& window, const QKeyEvent& event, bool released) {
                        keyParameter(event, released));
 }
 
+/// On layouts of other scripts Ctrl with a letter key is what it is on Latin ones, for fields of the toolkit as well.
+/// Null for keys that mean the same everywhere.
+std::unique_ptr<QKeyEvent> asLatin(const QKeyEvent& event) {
+    const int key = virtualKey(event);
+    const bool control =
+        event.modifiers().testFlag(Qt::ControlModifier) && !event.modifiers().testFlag(Qt::AltModifier);
+    if (!control || key < 'A' || key > 'Z' || event.key() < 0x80 || event.key() >= Qt::Key_Escape) {
+        return nullptr;
+    }
+    auto latin = std::make_unique<QKeyEvent>(event.type(), key, event.modifiers(), event.nativeScanCode(),
+                                             event.nativeVirtualKey(), event.nativeModifiers(),
+                                             QString(QChar(key - '@')), event.isAutoRepeat(), event.count());
+    latin->setTimestamp(event.timestamp());
+    return latin;
+}
+
 /// The toolkit asks with this event before its own shortcuts: the place where a key can be taken from everybody.
 bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
     MSG msg = keyMessage(window, event, false);
@@ -379,14 +395,23 @@ bool onAfterwards(Window& window, QObject* receiver, QEvent& event, bool& result
     return true;
 }
 
+bool translateKey(Window& window, QObject* receiver, QKeyEvent& event) {
+    if (const auto latin = event.type() != QEvent::KeyRelease ? asLatin(event) : nullptr) {
+        const bool done = translateKey(window, receiver, *latin);
+        event.setAccepted(latin->isAccepted());
+        return done;
+    }
+    return event.type() == QEvent::ShortcutOverride ? onShortcutOverride(window, receiver, event)
+           : event.type() == QEvent::KeyPress       ? onKeyPress(window, receiver, event)
+                                                    : onKeyRelease(window, receiver, event);
+}
+
 bool translateInput(Window& window, QObject* receiver, QEvent* event) {
     switch (event->type()) {
     case QEvent::ShortcutOverride:
-        return onShortcutOverride(window, receiver, static_cast<QKeyEvent&>(*event));
     case QEvent::KeyPress:
-        return onKeyPress(window, receiver, static_cast<QKeyEvent&>(*event));
     case QEvent::KeyRelease:
-        return onKeyRelease(window, receiver, static_cast<QKeyEvent&>(*event));
+        return translateKey(window, receiver, static_cast<QKeyEvent&>(*event));
     case QEvent::MouseButtonPress:
     case QEvent::MouseButtonRelease:
     case QEvent::MouseButtonDblClick:

@@ -72,10 +72,14 @@ int characterKey(const QKeyEvent& event) {
 std::optional<KeyLocks> knownLocks;
 
 struct KeyTime {
-    int key = 0;
+    int key = 0; ///< by place, since what it types changes with the modifiers
     quint64 time = 0;
     bool operator==(const KeyTime&) const = default;
 };
+KeyTime timeOf(const QKeyEvent& event) {
+    const auto place = static_cast<int>(event.nativeScanCode());
+    return {place != 0 ? place : event.key(), event.timestamp()};
+}
 KeyTime lastRelease; ///< nothing when it came with its press, as programs send keys
 KeyTime lastPress;
 int pressedLast = 0; ///< its virtual key
@@ -138,12 +142,12 @@ void noteKey(int virtualKey, bool down) {
 // A held key comes as releases and presses of the same time. The toolkit calls a press repeated when it finds it in its
 // queue behind the release, which is chance in an application that waits for events.
 bool isRepeated(const QKeyEvent& event) {
-    const KeyTime now{event.key(), event.timestamp()};
+    const KeyTime now = timeOf(event);
     return event.isAutoRepeat() || (now.time != 0 && now == lastRelease);
 }
 
 void noteTime(const QKeyEvent& event) {
-    const KeyTime now{event.key(), event.timestamp()};
+    const KeyTime now = timeOf(event);
     if (event.type() == QEvent::KeyPress) {
         lastPress = now;
     } else {

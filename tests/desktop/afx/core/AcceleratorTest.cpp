@@ -167,6 +167,27 @@ TEST(RealAccelerators, AreNamedByTheSignsOfTheLayout) {
     frame.DestroyWindow();
 }
 
+TEST(RealKeysInFields, CopyAndPasteOnEveryLayout) {
+    RealKeys keys;
+    ScriptedDialog dialog(IDD_SHAPE);
+    dialog.prepare = [&] { dialog.GetDlgItem(IDC_NAME)->SetFocus(); };
+    dialog.script = [&] {
+        for (const char* layout : {"ru", "gr", "fr", "de"}) {
+            ASSERT_TRUE(keys.layout(layout));
+            dialog.SetDlgItemText(IDC_NAME, layout);
+            const unsigned a = std::string(layout) == "fr" ? 24 : 38;
+            keys.chord({RealKeys::control, a});
+            keys.chord({RealKeys::control, 54}); // C
+            keys.chord({115});                   // End
+            keys.chord({RealKeys::control, 55}); // V
+            const std::string doubled = std::string(layout) + layout;
+            EXPECT_TRUE(QTest::qWaitFor([&] { return textOf(dialog.GetDlgItem(IDC_NAME)) == doubled; }))
+                << textOf(dialog.GetDlgItem(IDC_NAME)) << " on " << layout;
+        }
+    };
+    dialog.DoModal();
+}
+
 TEST(RealHotKey, HasTheKeysThatTheWindowManagerKeeps) {
     RealKeys keys;
     ScriptedDialog dialog(IDD_HOT_KEY);
