@@ -1,8 +1,12 @@
 #include "platform/afx/controls/Controls.h"
 #include "platform/afx/controls/HotKey.h"
 
+#include "platform/afx/controls/detail/ListBoxWindow.h"
+
 #include <cstring>
 #include <vector>
+
+using namespace tvx::afx;
 
 IMPLEMENT_DYNAMIC(CStatic, CWnd)
 IMPLEMENT_DYNAMIC(CButton, CWnd)
@@ -77,6 +81,15 @@ BOOL CButton::OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT*
 void CListBox::DrawItem(DRAWITEMSTRUCT*) {}
 void CListBox::MeasureItem(MEASUREITEMSTRUCT*) {}
 void CListBox::DeleteItem(DELETEITEMSTRUCT*) {}
+
+CString CListBox::GetAccessibleText(int index) const {
+    CString text;
+    const auto* list = dynamic_cast<const ListBoxWindow*>(GetState());
+    if (list && list->hasStrings()) {
+        GetText(index, text);
+    }
+    return text;
+}
 
 BOOL CListBox::OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) {
     return callOwner(*this, message, lParam) || CWnd::OnChildNotify(message, wParam, lParam, result);

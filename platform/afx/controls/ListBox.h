@@ -185,6 +185,11 @@ public:
     /// Frees what the data of a line that goes points to.
     virtual void DeleteItem(DELETEITEMSTRUCT* item);
 
+    /// What assistive tools say of a line. The base answers the line's text; a class whose lines have none (owner-drawn
+    /// without LBS_HASSTRINGS) answers what it draws. Called for the lines that such a tool asks for only.
+    /// @param index of an existing line
+    virtual CString GetAccessibleText(int index) const;
+
 protected:
     BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) override;
 };

@@ -1,5 +1,7 @@
 #include "platform/afx/controls/detail/ListBoxWindow.h"
 
+#include "platform/afx/controls/ListBox.h"
+#include "platform/afx/controls/detail/AccessibleList.h"
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
@@ -93,6 +95,7 @@ ListBoxWindow::ListBoxWindow(const CREATESTRUCT& cs)
 
 QWidget* ListBoxWindow::makeWidget(QWidget* parent) {
     m_area = new ListArea(parent, *this);
+    answerForLists();
     return m_area;
 }
 
@@ -105,6 +108,21 @@ void ListBoxWindow::widgetMade() {
 
 int ListBoxWindow::accessibleRole() const {
     return QAccessible::List;
+}
+
+QString ListBoxWindow::accessibleText(int index) const {
+    const auto* list = dynamic_cast<const CListBox*>(object());
+    return list           ? toQt(list->GetAccessibleText(index))
+           : hasStrings() ? toQt(m_items.at(index).text.c_str())
+                          : QString();
+}
+
+void ListBoxWindow::tellCaret() {
+    if (m_area->hasFocus() && m_items.isValid(m_caret)) {
+        QAccessibleEvent event(m_area, QAccessible::Focus);
+        event.setChild(m_caret);
+        QAccessible::updateAccessibility(&event);
+    }
 }
 
 void ListBoxWindow::applyBars() {
@@ -216,6 +234,11 @@ int ListBoxWindow::rowAt(int y) const {
     return std::clamp(row, -1, m_items.count() - 1);
 }
 
+int ListBoxWindow::rowUnder(QPoint point) const {
+    const int row = point.y() >= 0 ? top() + point.y() / m_rowHeight : -1;
+    return clientRect().contains(point) && m_items.isValid(row) ? row : -1;
+}
+
 QRect ListBoxWindow::rowRect(int index) const {
     const int scrolled = m_area->horizontalScrollBar()->value();
     const int width = std::max(m_extent, m_area->viewport()->width());
@@ -322,6 +345,7 @@ LRESULT ListBoxWindow::setCurrent(LONG_PTR index) {
     m_current = m_caret = m_anchor = static_cast<int>(index);
     showRow(m_current);
     refresh();
+    tellCaret();
     return index;
 }
 
@@ -349,6 +373,7 @@ LRESULT ListBoxWindow::setSelected(bool selected, LONG_PTR index) {
         m_caret = row;
         m_anchor = selected ? row : m_anchor;
         refresh();
+        tellCaret();
     }
     return LB_OKAY;
 }
@@ -376,7 +401,7 @@ LRESULT ListBoxWindow::selectionProc(UINT message, WPARAM wParam, LPARAM lParam,
         if (!m_items.isValid(row)) {
             return LB_ERR;
         }
-        return (isMultiple() ? m_items.at(row).selected : m_current == row) ? TRUE : FALSE;
+        return isSelected(row) ? TRUE : FALSE;
     case LB_GETSELCOUNT:
         return isMultiple() ? m_items.selectedCount() : LB_ERR;
     case LB_GETSELITEMS:
@@ -408,6 +433,7 @@ LRESULT ListBoxWindow::selectionProc(UINT message, WPARAM wParam, LPARAM lParam,
         m_caret = row;
         showRow(row);
         refresh();
+        tellCaret();
         return LB_OKAY;
     case LB_GETCARETINDEX:
         return m_caret;
@@ -438,8 +464,7 @@ LRESULT ListBoxWindow::layoutProc(UINT message, WPARAM wParam, LPARAM lParam, bo
         return LB_OKAY;
     case LB_ITEMFROMPOINT: {
         const QPoint point(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam));
-        const bool outside = !clientRect().contains(point) || top() + point.y() / m_rowHeight >= m_items.count();
-        return MAKELONG(std::max(rowAt(point.y()), 0), outside ? 1 : 0);
+        return MAKELONG(std::max(rowAt(point.y()), 0), rowUnder(point) < 0 ? 1 : 0);
     }
     case LB_GETHORIZONTALEXTENT:
         return m_extent;
@@ -480,116 +505,6 @@ LRESULT ListBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     return Control::defaultProc(message, wParam, lParam);
 }
 
-// --- the user ---
-
-void ListBoxWindow::tellSelection() {
-    if ((style() & LBS_NOTIFY) != 0) {
-        notify(LBN_SELCHANGE);
-    }
-}
-
-/// Goes to a line as the user does.
-/// @param extend keep the anchor and select up to here. @param toggle change this line only.
-void ListBoxWindow::moveCaret(int index, bool extend, bool toggle) {
-    if (!m_items.isValid(index) || (style() & LBS_NOSEL) != 0) {
-        return;
-    }
-    const int before = m_current;
-    m_caret = index;
-    if (!isMultiple()) {
-        m_current = m_anchor = index;
-    } else if (extend && isExtended()) {
-        m_anchor = m_anchor < 0 ? index : m_anchor;
-        selectOnly(m_anchor, index);
-    } else if (toggle) {
-        m_items.at(index).selected = !m_items.at(index).selected;
-        m_anchor = index;
-    } else if (isExtended()) {
-        m_anchor = index;
-        selectOnly(index, index);
-    }
-    showRow(index);
-    refresh();
-    // A multiple selection is told of at each step: the same line may have come in or gone out.
-    if (isMultiple() || before != m_current) {
-        tellSelection();
-    }
-}
-
-void ListBoxWindow::press(const QMouseEvent& event, bool twice) {
-    if (event.button() != Qt::LeftButton) {
-        return;
-    }
-    const int row = rowAt(event.position().toPoint().y());
-    // The first of two presses has selected the line already.
-    if (twice) {
-        if ((style() & LBS_NOTIFY) != 0) {
-            notify(LBN_DBLCLK);
-        }
-        return;
-    }
-    const bool control = event.modifiers().testFlag(Qt::ControlModifier);
-    const bool shift = event.modifiers().testFlag(Qt::ShiftModifier);
-    const bool toggle = (style() & LBS_MULTIPLESEL) != 0 ? !isExtended() || control : control;
-    moveCaret(row, shift, toggle);
-}
-
-void ListBoxWindow::drag(const QMouseEvent& event) {
-    const int row = rowAt(event.position().toPoint().y());
-    const bool selects = !isMultiple() || isExtended();
-    if (event.buttons().testFlag(Qt::LeftButton) && selects && row >= 0 && row != m_caret) {
-        moveCaret(row, isExtended(), false);
-    }
-}
-
-bool ListBoxWindow::search(const QString& text) {
-    // From behind the keyboard's line and around, so that the same letter pressed again goes on.
-    const int found = m_items.find(fromQt(text), m_caret, ListItems::Match::Prefix);
-    if (found >= 0) {
-        moveCaret(found, false, false);
-    }
-    return found >= 0;
-}
-
-bool ListBoxWindow::key(const QKeyEvent& event) {
-    // One line less than is seen: the last line stays in sight as the first.
-    const int page = std::max(visibleRows() - 1, 1);
-    const int last = m_items.count() - 1;
-    int target = m_caret;
-    switch (event.key()) {
-    case Qt::Key_Up:
-    case Qt::Key_Left:
-        target = std::max(m_caret - 1, 0);
-        break;
-    case Qt::Key_Down:
-    case Qt::Key_Right:
-        target = std::min(m_caret + 1, last);
-        break;
-    case Qt::Key_PageUp:
-        target = std::max(m_caret - page, 0);
-        break;
-    case Qt::Key_PageDown:
-        target = std::min(m_caret + page, last);
-        break;
-    case Qt::Key_Home:
-        target = 0;
-        break;
-    case Qt::Key_End:
-        target = last;
-        break;
-    case Qt::Key_Space:
-        if (isMultiple()) {
-            moveCaret(m_caret, false, !isExtended() || event.modifiers().testFlag(Qt::ControlModifier));
-            return true;
-        }
-        [[fallthrough]];
-    default:
-        return !event.text().isEmpty() && event.text().at(0).isPrint() && hasStrings() && search(event.text());
-    }
-    moveCaret(target, event.modifiers().testFlag(Qt::ShiftModifier), false);
-    return true;
-}
-
 // --- painting ---
 
 void ListBoxWindow::paintText(QPainter& painter, const QRect& rect, const QString& text) const {
@@ -612,7 +527,7 @@ void ListBoxWindow::paintText(QPainter& painter, const QRect& rect, const QStrin
 void ListBoxWindow::paintRow(QPainter& painter, int index) const {
     const QRect rect = rowRect(index);
     const auto& item = m_items.at(index);
-    const bool selected = isMultiple() ? item.selected : m_current == index;
+    const bool selected = isSelected(index);
     const auto group = isEnabled() ? QPalette::Active : QPalette::Disabled;
     const QPalette& palette = m_area->viewport()->palette();
     if (selected) {
@@ -639,7 +554,7 @@ void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
         item.itemID = static_cast<UINT>(row);
         item.itemData = static_cast<ULONG_PTR>(m_items.at(row).data);
         item.rcItem = fromQt(rowRect(row));
-        const bool selected = isMultiple() ? m_items.at(row).selected : m_current == row;
+        const bool selected = isSelected(row);
         item.itemState = (selected ? ODS_SELECTED : 0U) | (row == m_caret && m_area->hasFocus() ? ODS_FOCUS : 0U) |
                          (isEnabled() ? 0U : ODS_DISABLED);
         drawing.draw(item);

@@ -5,6 +5,8 @@
 
 #include "platform/afx/controls/detail/ListControl.h"
 
+#include <optional>
+
 class QAbstractScrollArea;
 class QKeyEvent;
 class QMouseEvent;
@@ -27,6 +29,28 @@ public:
         return WM_CTLCOLORLISTBOX;
     }
 
+    // --- what assistive tools ask for ---
+    bool isMultiple() const {
+        return (style() & (LBS_MULTIPLESEL | LBS_EXTENDEDSEL)) != 0;
+    }
+    /// @param index of an existing line, here and below
+    bool isSelected(int index) const {
+        return isMultiple() ? m_items.at(index).selected : m_current == index;
+    }
+    /// What the host's object says of a line, else the line's own text.
+    QString accessibleText(int index) const;
+    /// The line with the keyboard, -1 for none.
+    int caret() const {
+        return m_caret;
+    }
+    /// The line of a place of the client area; -1 when none is there.
+    int rowUnder(QPoint point) const;
+    QRect rowRect(int index) const;
+    /// Selects a line as the user does.
+    void choose(int index) {
+        moveCaret(index, false, false);
+    }
+
     // --- what the widget hands on ---
     void paint(QPainter& painter, const QRect& exposed);
     void press(const QMouseEvent& event, bool twice);
@@ -42,9 +66,6 @@ protected:
     void focusMoved(bool got) override;
 
 private:
-    bool isMultiple() const {
-        return (style() & (LBS_MULTIPLESEL | LBS_EXTENDEDSEL)) != 0;
-    }
     bool isExtended() const {
         return (style() & LBS_EXTENDEDSEL) != 0;
     }
@@ -56,7 +77,6 @@ private:
     void setTop(int index);
     int visibleRows() const;
     int rowAt(int y) const;
-    QRect rowRect(int index) const;
     void showRow(int index);
     LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
     LRESULT removeRow(LONG_PTR index);
@@ -68,6 +88,11 @@ private:
     LRESULT selectedItems(int capacity, int* indices) const;
     void moveCaret(int index, bool extend, bool toggle);
     void tellSelection();
+    void tellCaret();
+    void pressForMenu(QPoint at);
+    void selectAll();
+    bool scrollSideways(int key);
+    std::optional<int> targetOf(int key) const;
     bool search(const QString& text);
     void paintRow(QPainter& painter, int index) const;
     void paintText(QPainter& painter, const QRect& rect, const QString& text) const;
