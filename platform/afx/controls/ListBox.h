@@ -172,12 +172,6 @@ public:
 
     // --- owner drawing, when the parent did not answer ---
 
-    /// What assistive tools read for a line: its text; an owner-drawn list without texts overrides it.
-    virtual CString GetAccessibleText(int index) const {
-        CString text;
-        GetText(index, text);
-        return text;
-    }
     /// Paints a line into the context and rectangle of `item`.
     virtual void DrawItem(DRAWITEMSTRUCT* item);
     /// Sets the height of lines, asked once when the control is created.
