@@ -3,6 +3,7 @@
 #include "afxwin.h"
 #include "s/ConsoleHistory.h"
 
+#include <chrono>
 #include <functional>
 #include <optional>
 #include <vector>
@@ -45,6 +46,10 @@ private:
     [[nodiscard]] std::vector<int> Selected() const;
     void Measure(CDC& dc, const Gui_ConsoleHistoryLine& line);
     [[nodiscard]] CPoint MenuPoint() const;
+    void ScrollToEnd();
+    void PaintNowAndThen();
+
+    std::chrono::steady_clock::time_point m_painted;
 };
 
 /// The field in which commands are typed.

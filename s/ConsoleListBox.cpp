@@ -6,7 +6,6 @@
 #include "s/Msg.h"
 
 #include <algorithm>
-#include <chrono>
 
 namespace {
 
@@ -78,7 +77,23 @@ void Gui_ConsoleListBox::Measure(CDC& dc, const Gui_ConsoleHistoryLine& line) {
     }
 }
 
+// A command that takes long keeps the window from being painted: what it reports is shown while it runs, but not so
+// often that a flood of lines is held up by it.
+void Gui_ConsoleListBox::PaintNowAndThen() {
+    constexpr std::chrono::milliseconds often(50);
+    const auto now = std::chrono::steady_clock::now();
+    if (ConsoleState().m_isRunning && now - m_painted > often) {
+        UpdateWindow();
+        m_painted = now;
+    }
+}
+
 void Gui_ConsoleListBox::ShowEnd() {
+    ScrollToEnd();
+    PaintNowAndThen();
+}
+
+void Gui_ConsoleListBox::ScrollToEnd() {
     const int height = GetItemHeight(0);
     if (height <= 0) {
         return;

@@ -34,6 +34,7 @@ test     libgtest-dev     the test programs' framework
 test     xdotool          keys and clicks in desktop tests
 test     wmctrl           asks the window manager in desktop tests
 test     x11-xkb-utils    setxkbmap gives the display other keyboard layouts in desktop tests
+test     xclip            reads the clipboard as another program in desktop tests
 test     x11-utils        xprop reads window properties in desktop tests
 test     imagemagick      pictures of the display in desktop tests
 bench    libbenchmark-dev the benchmark programs' framework

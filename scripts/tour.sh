@@ -156,6 +156,34 @@ xdotool key Escape
 
 again
 xdotool key --clearmodifiers alt+t
+xdotool key k
+await '^Keyboard Accelerators$'
+xdotool key --clearmodifiers alt+f
+xdotool type undo
+xdotool key Return
+picture keyboard "Tools, Keyboard gives commands other keys."
+xdotool key Escape
+again
+xdotool key --clearmodifiers ctrl+alt+p
+await '^Commands$'
+xdotool type bf
+picture palette "The command palette finds commands by words and first letters."
+xdotool key Escape
+
+again
+xdotool key --clearmodifiers alt+t
+xdotool key c
+await '^Console - '
+xdotool type --delay 2 'draw text 20 20 200 60 "From the console" size=20'
+xdotool key Return
+xdotool type --delay 2 'draw circle 10 10'
+xdotool key Return
+xdotool key --clearmodifiers ctrl+a
+xdotool type '!dra'
+picture console "Tools, Console: what the menus do can be typed, and recalled. A command that fails says what it expects."
+
+again
+xdotool key --clearmodifiers alt+t
 xdotool key Return
 await '^Run Command$'
 xdotool key --clearmodifiers ctrl+a
