@@ -89,9 +89,10 @@ void KeyLayout::placeLetters() {
         int meant = 0;
         if (isLatin(key.signs.plain)) {
             meant = static_cast<int>(key.signs.plain - U'a') + 'A';
-        } else if (place >= '0' && place <= '9') {
-            const char32_t shifted = isDigit(key.signs.shifted) ? key.signs.shifted : static_cast<char32_t>(place);
-            meant = static_cast<int>(isDigit(key.signs.plain) ? key.signs.plain : shifted);
+        } else if (isDigit(key.signs.plain)) {
+            meant = static_cast<int>(key.signs.plain);
+        } else if (isDigit(static_cast<char32_t>(place))) {
+            meant = isDigit(key.signs.shifted) ? static_cast<int>(key.signs.shifted) : place;
         }
         key.virtualKey = isGiven(meant) ? 0 : meant;
     }

@@ -27,6 +27,9 @@ constexpr quint32 metaRight = 0xFFE8;
 constexpr quint32 breakKey = 0xFF6B;
 /// The key code of the keypad's second sign between digits, which few keyboards have.
 constexpr quint32 separatorKey = 129;
+/// Key codes of F13 to F18, which the display takes for keys that start programs.
+constexpr quint32 firstLaunchKey = 191;
+constexpr quint32 lastLaunchKey = 196;
 
 int keypadKey(const QKeyEvent& event) {
     if (!event.modifiers().testFlag(Qt::KeypadModifier)) {
@@ -48,6 +51,9 @@ int functionKey(const QKeyEvent& event) {
         break;
     }
     const int known = virtualKeyOf(event.key());
+    if (known == 0 && event.nativeScanCode() >= firstLaunchKey && event.nativeScanCode() <= lastLaunchKey) {
+        return VK_F13 + static_cast<int>(event.nativeScanCode() - firstLaunchKey);
+    }
     return isCharacterKey(known) && known != VK_SPACE ? 0 : known;
 }
 
