@@ -35,8 +35,10 @@ int keypadKey(const QKeyEvent& event) {
     if (!event.modifiers().testFlag(Qt::KeypadModifier)) {
         return 0;
     }
-    const bool decimal = event.key() == Qt::Key_Comma && event.nativeScanCode() != separatorKey;
-    return decimal ? VK_DECIMAL : keypadKeyOf(event.key());
+    if (event.nativeScanCode() == separatorKey) {
+        return VK_SEPARATOR;
+    }
+    return event.key() == Qt::Key_Comma ? VK_DECIMAL : keypadKeyOf(event.key());
 }
 
 /// Keys that type no character, and the blank.
