@@ -46,12 +46,18 @@ TEST_F(Keys, AreFollowedWhileAMenuHasTheKeyboard) {
 }
 
 // The Ctrl of a command is released before the command's dialog has the keyboard: the toolkit drops that release.
-TEST_F(Keys, TellThatAModifierIsUp) {
+TEST_F(Keys, TellOfModifiers) {
     QTest::keyPress(widget, Qt::Key_Control, Qt::ControlModifier);
     QTest::keyPress(widget, Qt::Key_P, Qt::ControlModifier);
     EXPECT_TRUE(tvx::afx::isKeyDown(VK_CONTROL));
     QTest::keyPress(widget, Qt::Key_F8);
     EXPECT_FALSE(tvx::afx::isKeyDown(VK_CONTROL));
+    // Pressed where another program had the keyboard.
+    QKeyEvent held(QEvent::KeyPress, Qt::Key_P, Qt::ControlModifier, QStringLiteral("\x10"));
+    QSpontaneKeyEvent::setSpontaneous(&held);
+    QApplication::instance()->notify(widget, &held);
+    EXPECT_TRUE(tvx::afx::isKeyDown(VK_CONTROL));
+    QTest::keyPress(widget, Qt::Key_F8);
 }
 
 std::string nameOf(LONG parameter) {
