@@ -9,12 +9,8 @@ Gui_Accel& Gui_Accel::operator=(const tagACCEL& accel) {
     return *this;
 }
 
-bool Gui_Accel::IsSame(const tagACCEL& other) const {
-    return fVirt == other.fVirt && key == other.key && cmd == other.cmd;
-}
-
 int Gui_Accel::IsEmpty() const {
-    return IsSame(tagACCEL{}) ? 1 : 0;
+    return *this == Gui_Accel() ? 1 : 0;
 }
 
 void Gui_Accel::Clear() {

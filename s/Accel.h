@@ -3,6 +3,14 @@
 #include "afxwin.h"
 #include "s/Export.h"
 
+/// Compares all three fields of two accelerators.
+inline bool operator==(const tagACCEL& first, const tagACCEL& second) {
+    return first.fVirt == second.fVirt && first.key == second.key && first.cmd == second.cmd;
+}
+inline bool operator!=(const tagACCEL& first, const tagACCEL& second) {
+    return !(first == second);
+}
+
 /// A keyboard accelerator: a key with its modifiers, and the command that it stands for.
 ///
 /// @code
@@ -24,16 +32,6 @@ public:
     Gui_Accel(const tagACCEL* accel) : tagACCEL(*accel) {}
 
     Gui_Accel& operator=(const tagACCEL& accel);
-    /// Compares all three fields.
-    /// @{
-    friend bool operator==(const Gui_Accel& accel, const tagACCEL& other) {
-        return accel.IsSame(other);
-    }
-    friend bool operator!=(const Gui_Accel& accel, const tagACCEL& other) {
-        return !accel.IsSame(other);
-    }
-    /// @}
-
     /// Whether all fields are 0: 1 or 0.
     int IsEmpty() const;
     /// Sets all fields to 0.
@@ -55,7 +53,4 @@ public:
     /// The key's name for display, as the keyboard layout calls it: modifiers in the order Ctrl, Alt, Shift, "+"
     /// between the parts. Alt and Shift of characters are not named. Empty for an empty accelerator.
     CString GetKeyText() const;
-
-private:
-    bool IsSame(const tagACCEL& other) const;
 };

@@ -252,20 +252,15 @@ void Gui_AccelDlg::OnAssignbutton() {
     if (accel.IsEmpty()) {
         return;
     }
-    const CString name = accel.GetKeyText();
     unsigned short owner = 0;
     CString note;
-    if (m_record->map.GetCmdAt(accel, owner)) {
-        const int line = m_record->keyList.FindStringExact(-1, name);
-        if (line >= 0) {
-            m_record->keyList.DeleteString(static_cast<UINT>(line));
-        }
-        if (owner != accel.cmd) {
-            note = KeyMessage(GUI_IDS_KEY_TAKEN, name, m_record->nameOf(owner));
-        }
+    if (m_record->map.GetCmdAt(accel, owner) && owner != accel.cmd) {
+        note = KeyMessage(GUI_IDS_KEY_TAKEN, accel.GetKeyText(), m_record->nameOf(owner));
     }
-    tvx::allocating([this] { m_record->before.push_back(m_record->map); });
-    m_record->map.Add(accel);
+    if (owner != accel.cmd) {
+        tvx::allocating([this] { m_record->before.push_back(m_record->map); });
+        m_record->map.Add(accel);
+    }
     changed(note);
     refreshKeyState();
     fillKeys();

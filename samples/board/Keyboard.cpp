@@ -37,8 +37,28 @@ Gui_AccelMap ownKeys() {
     return map;
 }
 
-void annotate(HMENU menu, const Gui_AccelMap& map) {
-    map.AnnotateMenu(CMenu::FromHandle(menu));
+/// The keys whose commands a menu has. The others must stay free for what is typed: the main window's table is in force
+/// in the console, too, where Delete is no command.
+Gui_AccelMap keysOf(HMENU menu, const Gui_AccelMap& map) {
+    Gui_AccelMap keys(map);
+    int count = 0;
+    tagACCEL* table = nullptr;
+    map.GetAll(count, table);
+    const std::unique_ptr<tagACCEL[]> owner(table);
+    for (int i = 0; i < count; ++i) {
+        if (GetMenuState(menu, table[i].cmd, MF_BYCOMMAND) == static_cast<UINT>(-1)) {
+            keys.Remove(Gui_Accel(table[i]));
+        }
+    }
+    return keys;
+}
+
+/// Puts keys in force: in a table, which takes the place of the former one, and in the menu that belongs to it.
+void replace(HACCEL& accelerators, HMENU menu, const Gui_AccelMap& map) {
+    const Gui_AccelMap keys = keysOf(menu, map);
+    DestroyAcceleratorTable(accelerators);
+    accelerators = keys.CreateTable();
+    keys.AnnotateMenu(CMenu::FromHandle(menu));
 }
 
 } // namespace
@@ -52,11 +72,10 @@ CKeyboard::CKeyboard(CMDIFrameWnd& main, CMultiDocTemplate& drawings) : m_main(m
 
 void CKeyboard::Edit() {
     const Gui_AccelMap own = ownKeys();
-    Gui_AccelMap now(m_main.m_hAccelTable);
-    now.AddAll(m_drawings.m_hAccelTable);
+    Gui_AccelMap now(own);
+    Gui_AccelProfile::Read(now, entry, nullptr);
     const HACCEL table = now.CreateTable();
-    // The menu of the drawings has all commands, the main window's own only some of them.
-    CKeyboardDlg dialog(CMenu::FromHandle(m_drawings.m_hMenuShared), table, &m_main);
+    CKeyboardDlg dialog(m_main.GetMenu(), table, &m_main);
     DestroyAcceleratorTable(table);
     dialog.SetResetAccels(own);
     if (dialog.DoModal() == IDOK) {
@@ -67,10 +86,8 @@ void CKeyboard::Edit() {
 }
 
 void CKeyboard::apply(const Gui_AccelMap& map) {
-    DestroyAcceleratorTable(m_main.m_hAccelTable);
-    m_main.m_hAccelTable = map.CreateTable();
-    DestroyAcceleratorTable(m_drawings.m_hAccelTable);
-    m_drawings.m_hAccelTable = map.CreateTable();
+    replace(m_main.m_hAccelTable, m_main.m_hMenuDefault, map);
+    replace(m_drawings.m_hAccelTable, m_drawings.m_hMenuShared, map);
     // Open drawings have the handles that the template had; later ones take those that it has now.
     for (POSITION at = m_drawings.GetFirstDocPosition(); at;) {
         const CDocument* document = m_drawings.GetNextDoc(at);
@@ -80,6 +97,4 @@ void CKeyboard::apply(const Gui_AccelMap& map) {
             }
         }
     }
-    annotate(m_main.m_hMenuDefault, map);
-    annotate(m_drawings.m_hMenuShared, map);
 }

@@ -3,8 +3,9 @@
 #include "afxwin.h"
 #include "s/AccelMap.h"
 
-/// The keys of the board, which its user may change. Main window and drawings have the same, each in a table of its
-/// own: that of the main window goes with the window, that of the drawings with their template.
+/// The keys of the board, which its user may change. A key means the same everywhere; main window and drawings have
+/// tables of their own, with the keys of the commands in their menus: that of the main window goes with the window,
+/// that of the drawings with their template.
 class CKeyboard {
 public:
     /// Puts the user's keys in force, if he has any.

@@ -57,6 +57,11 @@ press ctrl+n
 runs "the key works in a later drawing" F7
 press ctrl+F4 ctrl+F4
 runs "the key works without a drawing" F7
+press alt+t
+press c
+xdotool type --clearmodifiers "xnew"
+press Home Delete Return
+await "Delete is no command in the console" titled "Drawing3 - Tarvex Board"
 press alt+F4
 await "the application ends" ended "$process"
 

@@ -233,7 +233,6 @@ TEST(AccelDlg, TakesAnAssignedKeyFromItsOwnerAndGivesItBack) {
         EXPECT_EQ(dialog.keys(), Texts{"Ctrl+P"}) << "it loses that key only";
 
         dialog.push(GUI_IDC_ACCEL_UNDO);
-        dialog.push(GUI_IDC_ACCEL_UNDO);
         EXPECT_EQ(dialog.keys(), (Texts{"Ctrl+O", "Ctrl+P"}));
         EXPECT_EQ(dialog.keyText(), "Ctrl+O is assigned to  File Open...");
         EXPECT_FALSE(dialog.isEnabled(GUI_IDC_ACCEL_UNDO));
