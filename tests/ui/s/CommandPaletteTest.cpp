@@ -214,6 +214,12 @@ TEST_F(CommandPalette, NamesItsControlsForAssistiveTools) {
               " EditableText \"Words or first letters of a command\" < Words or first letters of a command\n"
               " StaticText \"Commands\"\n"
               " List \"Commands\" < Commands\n"
+              "  ListItem \"Edit: Bring to Front, Ctrl+F\"\n"
+              "  ListItem \"Edit: Send to Back, Delete\"\n"
+              "  ListItem \"Edit: Nobody's, unavailable\"\n"
+              "  ListItem \"Draw: Rectangle, F9\"\n"
+              "  ListItem \"Draw: Grid, checked\"\n"
+              "  ListItem \"Draw: About\"\n"
               " StaticText \"\"\n");
 }
 
