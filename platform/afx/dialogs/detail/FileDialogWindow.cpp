@@ -7,6 +7,7 @@
 
 #include <QAction>
 #include <QComboBox>
+#include <QCompleter>
 #include <QFileInfo>
 #include <QFileSystemModel>
 #include <QHeaderView>
@@ -104,6 +105,11 @@ FileDialogWindow::FileDialogWindow(const OPENFILENAME& record, bool opens, FileI
     fillFilters();
     fillName();
     showColumnsWhole();
+    // The toolkit has it in the list's context menu only.
+    if (auto* hidden = findChild<QAction*>(QStringLiteral("qt_show_hidden_action"))) {
+        hidden->setShortcut(Qt::CTRL | Qt::Key_H);
+        addAction(hidden);
+    }
 }
 
 // --- what is shown ---
@@ -263,6 +269,10 @@ QString FileDialogWindow::withExtension(const QString& file) const {
 
 void FileDialogWindow::accept() {
     storing([this] {
+        // The toolkit leaves its proposals open, for the dialog that goes away with them.
+        if (m_field->completer()) {
+            m_field->completer()->popup()->hide();
+        }
         const QStringList typed = typedNames();
         QStringList files;
         for (const QString& name : typed) {
@@ -330,7 +340,8 @@ bool FileDialogWindow::settle(QString& file) const {
 
 bool FileDialogWindow::settleToOpen(QString& file) const {
     if (!QFileInfo::exists(file)) {
-        file = withExtension(file);
+        const QString completed = withExtension(file);
+        file = QString::fromStdString(systemPath(fromQt(completed)).value_or(fromQt(completed)));
     }
     if (QFileInfo::exists(file) || has(OFN_NOVALIDATE)) {
         return true;

@@ -1,5 +1,8 @@
 #include "platform/afx/dialogs/detail/FileIcons.h"
 
+#include "platform/afx/core/detail/OwnText.h"
+#include "platform/win/FrameworkIds.h"
+
 #include <QFileInfo>
 #include <QMimeDatabase>
 #include <QMutexLocker>
@@ -13,7 +16,11 @@ constexpr int mostKinds = 200;
 
 } // namespace
 
-FileIcons::FileIcons() : m_folder(QFileIconProvider::icon(Folder)), m_file(QFileIconProvider::icon(File)) {}
+FileIcons::FileIcons()
+    : m_folder(QFileIconProvider::icon(Folder)),
+      m_file(QFileIconProvider::icon(File)),
+      m_plain(ownText(TVX_IDS_FILE_PLAIN)),
+      m_ofKind(ownText(TVX_IDS_FILE_OF_KIND)) {}
 
 QIcon FileIcons::icon(const QFileInfo& info) const {
     if (info.isRoot()) {
@@ -38,7 +45,9 @@ FileIcons::Kind FileIcons::kindOf(const QString& suffix) const {
     }
     const QMimeType kind = QMimeDatabase().mimeTypeForFile(QStringLiteral("a.") + key, QMimeDatabase::MatchExtension);
     const QIcon generic = QIcon::fromTheme(kind.genericIconName(), m_file);
-    return *m_kinds.insert(key, {QIcon::fromTheme(kind.iconName(), generic), kind.comment()});
+    const QString unknown = key.isEmpty() ? m_plain : m_ofKind.arg(key.toUpper());
+    return *m_kinds.insert(key,
+                           {QIcon::fromTheme(kind.iconName(), generic), kind.isDefault() ? unknown : kind.comment()});
 }
 
 } // namespace tvx::afx

@@ -23,6 +23,9 @@ private:
     Kind kindOf(const QString& suffix) const;
     QIcon m_folder;
     QIcon m_file;
+    // Kept, since resources are not for the reading thread.
+    QString m_plain;
+    QString m_ofKind; ///< of a suffix that the desktop knows nothing of: "%1 File"
     mutable QMutex m_lock;
     mutable QHash<QString, Kind> m_kinds; ///< by suffix in lower case
 };

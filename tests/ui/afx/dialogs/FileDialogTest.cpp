@@ -184,12 +184,13 @@ TEST_F(FileNames, ToSaveAreAskedAboutAsTheyWillBeWritten) {
 
 TEST_F(FileNames, ToOpenAreLookedFor) {
     std::filesystem::create_directories(file("sub"));
-    for (const char* name : {"there.brd", "bare", "sub/a.brd", "one.nts", "one.brd"}) {
+    for (const char* name : {"there.brd", "LARGE.BRD", "bare", "sub/a.brd", "one.nts", "one.brd"}) {
         write(file(name), "x");
     }
     for (const Typed& typed : {
              Typed{"there", 1, "there.brd", ""},
              {"THERE.BRD", 1, "there.brd", ""},
+             {"large", 1, "LARGE.BRD", ""},
              {"bare", 1, "bare", ""},
              {"one", 2, "one.nts", ""},
              {"one", 3, "one.brd", ""},
@@ -249,7 +250,11 @@ TEST_F(FileDialogs, SeveralFilesStandInTheRecordBehindTheirFolder) {
         dialog.m_ofn.nMaxFile = room;
         inDialog([] {
             auto* list = shownDialog()->findChild<QTreeView*>("treeView");
-            ASSERT_TRUE(QTest::qWaitFor([&] { return list->model()->rowCount(list->rootIndex()) == 3; }));
+            ASSERT_TRUE(QTest::qWaitFor([&] { // until they are sorted
+                const QAbstractItemModel& model = *list->model();
+                return model.index(1, 0, list->rootIndex()).data() == "b b.brd" &&
+                       model.index(2, 0, list->rootIndex()).data() == "c.brd";
+            }));
             list->setFocus();
             list->setCurrentIndex(list->model()->index(0, 0, list->rootIndex()));
             QTest::keyClick(list, Qt::Key_Down, Qt::ShiftModifier);
@@ -267,6 +272,49 @@ TEST_F(FileDialogs, SeveralFilesStandInTheRecordBehindTheirFolder) {
     using namespace std::string_literals;
     EXPECT_TRUE(choose(1000).starts_with(place + "\0a.brd\0b b.brd\0\0"s));
     EXPECT_TRUE(choose(static_cast<DWORD>(place.size()) + 8).starts_with('\0')) << "no room: no name at all";
+}
+
+TEST_F(FileDialogs, KindsGoByTheEndsOfNamesAndHiddenFilesByAKey) {
+    for (const char* name : {"a.brd", "b.png", "c", ".d"}) {
+        write(file(name), "x");
+    }
+    const std::string folder = file("").string();
+    CFileDialog dialog(TRUE);
+    dialog.m_ofn.lpstrInitialDir = folder.c_str();
+    inDialog([] {
+        auto* list = shownDialog()->findChild<QTreeView*>("treeView");
+        const auto column = [list](int number) {
+            QStringList texts;
+            for (int row = 0; row < list->model()->rowCount(list->rootIndex()); ++row) {
+                texts.append(list->model()->index(row, number, list->rootIndex()).data().toString());
+            }
+            return texts;
+        };
+        EXPECT_TRUE(QTest::qWaitFor([&] { return column(0) == QStringList({"a.brd", "b.png", "c"}); }));
+        EXPECT_EQ(column(2), QStringList({"BRD File", "PNG image", "File"}));
+        key(Qt::Key_H, Qt::ControlModifier);
+        EXPECT_TRUE(QTest::qWaitFor([&] { return column(0).contains(".d"); }));
+        QTest::keyClick(shownDialog(), Qt::Key_Escape);
+    });
+    dialog.DoModal();
+}
+
+TEST_F(FileDialogs, AFolderThatIsTypedIsGoneInto) {
+    std::filesystem::create_directory(file("sub"));
+    const std::string folder = file("").string();
+    CFileDialog dialog(FALSE);
+    dialog.m_ofn.lpstrInitialDir = folder.c_str();
+    inDialog([] {
+        auto* edit = shownDialog()->findChild<QLineEdit*>("fileNameEdit");
+        QTest::keyClicks(edit, "sub");
+        EXPECT_TRUE(QTest::qWaitFor([] { return QApplication::activePopupWidget() != nullptr; }));
+        QTest::keyClick(edit, Qt::Key_Return);
+        EXPECT_TRUE(shownDialog()->directory().path().endsWith("/sub"));
+        EXPECT_EQ(edit->text(), "");
+        EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+        QTest::keyClick(edit, Qt::Key_Escape);
+    });
+    dialog.DoModal();
 }
 
 TEST_F(FileDialogs, TheCurrentFolderFollowsUnlessThatIsUnwanted) {
