@@ -56,8 +56,9 @@ const BigFolder& bigFolder() {
 class Watch {
 public:
     Watch() {
+        // An interval of 0 would keep the toolkit's reading thread from the dialog's locks.
         QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this] { look(); });
-        m_timer.start(0);
+        m_timer.start(2);
         m_clock.start();
     }
     double longest = 0; ///< in milliseconds
