@@ -293,7 +293,7 @@ private:
     std::vector<QString> m_lines;
 };
 
-void listView(benchmark::State& state, Widths widths, Watched watched) {
+void listView(benchmark::State& state, Widths widths) {
     prepare();
     const auto& lines = toolkitLines();
     for (auto _ : state) {
@@ -311,12 +311,6 @@ void listView(benchmark::State& state, Widths widths, Watched watched) {
             if (widths == Widths::Measured) {
                 widest = std::max(widest, metrics.horizontalAdvance(lines[static_cast<std::size_t>(i)]));
             }
-            if (watched == Watched::Yes) {
-                view.scrollToBottom();
-                if (i % linesOfAFrame == 0) {
-                    QApplication::processEvents();
-                }
-            }
         }
         benchmark::DoNotOptimize(widest);
         QApplication::processEvents();
@@ -325,11 +319,10 @@ void listView(benchmark::State& state, Widths widths, Watched watched) {
 }
 
 BENCHMARK_CAPTURE(console, filled, Watched::No)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(listView, filled, Widths::Ignored, Watched::No)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(listView, filled_widths, Widths::Measured, Watched::No)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(listView, filled, Widths::Ignored)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(listView, filled_widths, Widths::Measured)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(console, watched, Watched::Yes)->Unit(benchmark::kMillisecond);
 BENCHMARK(repaints)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(listView, watched, Widths::Ignored, Watched::Yes)->Unit(benchmark::kMillisecond);
 
 BENCHMARK_CAPTURE(listWidget, uniform, Widths::Ignored)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(listWidget, uniform_widths, Widths::Measured)->Unit(benchmark::kMillisecond);

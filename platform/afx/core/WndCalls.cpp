@@ -10,6 +10,7 @@
 #include "platform/base/Text.h"
 
 #include <QAbstractScrollArea>
+#include <QCoreApplication>
 #include <QScreen>
 #include <QScrollBar>
 
@@ -436,6 +437,8 @@ QScrollBar* barOf(const CWnd& window, int bar) {
     }
     // Edit and list controls keep the ranges of their bars themselves.
     const auto* area = dynamic_cast<const QAbstractScrollArea*>(state->widget());
+    // Lists that grow put off telling their bars.
+    QCoreApplication::sendPostedEvents(state->widget(), QEvent::MetaCall);
     const bool exists = area && (state->style() & (bar == SB_HORZ ? WS_HSCROLL : WS_VSCROLL)) != 0;
     return !exists ? nullptr : bar == SB_HORZ ? area->horizontalScrollBar() : area->verticalScrollBar();
 }

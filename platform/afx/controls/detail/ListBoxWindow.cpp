@@ -30,7 +30,8 @@ class ListArea : public QAbstractScrollArea {
 public:
     ListArea(QWidget* parent, ListBoxWindow& window) : QAbstractScrollArea(parent), m_window(window) {
         viewport()->setBackgroundRole(QPalette::Base);
-        viewport()->setAutoFillBackground(true);
+        // The list paints every pixel itself; while it must not, what was painted before stays.
+        viewport()->setAttribute(Qt::WA_OpaquePaintEvent);
     }
 
 protected:
@@ -188,6 +189,7 @@ void ListBoxWindow::focusMoved(bool got) {
 // --- rows and scrolling ---
 
 void ListBoxWindow::applyRange() {
+    m_rangeIsSmall = false;
     if (!widget()) {
         return;
     }
@@ -206,8 +208,32 @@ void ListBoxWindow::applyRange() {
     });
 }
 
+/// Has all of it painted when the loop comes to it. Asked for again before that costs nothing.
 void ListBoxWindow::refresh() {
-    m_area->viewport()->update();
+    if (!m_frozen && !std::exchange(m_repaintDue, true)) {
+        m_area->viewport()->update();
+    }
+}
+
+void ListBoxWindow::setRedraw(bool redraw) {
+    m_frozen = !redraw;
+    refresh();
+}
+
+/// Adds a line to what the bar counts: later, and for all that come until then at once. At once when the bar comes up
+/// with it, and takes its room.
+void ListBoxWindow::lineAdded() {
+    refresh();
+    if (m_rangeIsSmall) {
+        return;
+    }
+    const bool isShown = m_area->verticalScrollBar()->maximum() > 0;
+    if (!isShown && m_items.count() > visibleRows()) {
+        applyRange();
+    } else if (isShown) {
+        m_rangeIsSmall = true;
+        QMetaObject::invokeMethod(m_area, [this] { storing([this] { applyRange(); }); }, Qt::QueuedConnection);
+    }
 }
 
 void ListBoxWindow::contentChanged() {
@@ -221,6 +247,9 @@ int ListBoxWindow::top() const {
 }
 
 void ListBoxWindow::setTop(int index) {
+    if (m_rangeIsSmall) {
+        applyRange();
+    }
     guarded([&] { m_area->verticalScrollBar()->setValue(index); });
 }
 
@@ -264,7 +293,7 @@ LRESULT ListBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     m_current += m_current >= place ? 1 : 0;
     m_caret += m_caret >= place ? 1 : 0;
     m_anchor += m_anchor >= place ? 1 : 0;
-    contentChanged();
+    lineAdded();
     return place;
 }
 
@@ -502,6 +531,10 @@ LRESULT ListBoxWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         reset();
         return 0;
     }
+    if (message == WM_SETREDRAW) {
+        setRedraw(wParam != 0);
+        return 0;
+    }
     return Control::defaultProc(message, wParam, lParam);
 }
 
@@ -565,6 +598,13 @@ void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
 }
 
 void ListBoxWindow::paint(QPainter& painter, const QRect& exposed) {
+    m_repaintDue = false;
+    if (m_frozen) {
+        return;
+    }
+    if (!isOwnerDrawn()) {
+        painter.fillRect(exposed, m_area->viewport()->palette().brush(QPalette::Base));
+    }
     const int first = std::max(top() + exposed.top() / m_rowHeight, 0);
     const int last = std::min(top() + exposed.bottom() / m_rowHeight, m_items.count() - 1);
     if (isOwnerDrawn()) {

@@ -71,6 +71,8 @@ private:
     }
     void applyBars();
     void measure();
+    void lineAdded();
+    void setRedraw(bool redraw);
     void contentChanged();
     void refresh();
     int top() const;
@@ -102,7 +104,10 @@ private:
     LRESULT layoutProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known);
 
     QAbstractScrollArea* m_area = nullptr;
-    int m_current = -1; ///< the selected line of a single selection
+    bool m_frozen = false;       ///< Nothing is painted until the program says so.
+    bool m_repaintDue = false;   ///< The toolkit has been told that all must be painted.
+    bool m_rangeIsSmall = false; ///< The bar does not count the last lines yet.
+    int m_current = -1;          ///< the selected line of a single selection
     int m_caret = -1;
     int m_anchor = -1;
     int m_rowHeight = 15;

@@ -15,6 +15,7 @@
 #include <QApplication>
 
 #include <algorithm>
+#include <atomic>
 #include <map>
 #include <unordered_map>
 
@@ -191,10 +192,25 @@ HWND createWindow(const CREATESTRUCT& cs, CWnd* object, bool* stood) {
 
 // --- tables ---
 
+namespace {
+
+/// The window looked for last: messages come in rows to one.
+constinit std::atomic<Window*> foundLast = nullptr;
+
+} // namespace
+
 Window* Window::from(HWND handle) {
+    Window* last = foundLast.load(std::memory_order_relaxed);
+    if (last && last->m_handle == handle) {
+        return last;
+    }
     const auto& table = tables().byHandle;
     const auto found = table.find(reinterpret_cast<std::uintptr_t>(handle));
-    return found != table.end() ? found->second : nullptr;
+    if (found == table.end()) {
+        return nullptr;
+    }
+    foundLast.store(found->second, std::memory_order_relaxed);
+    return found->second;
 }
 
 Window* Window::of(const QObject* object) {
@@ -545,6 +561,7 @@ void Window::unlink() {
     }
     dropTemporary();
     m_placement.reset();
+    foundLast.store(nullptr, std::memory_order_relaxed);
     tables().byHandle.erase(reinterpret_cast<std::uintptr_t>(m_handle));
     if (m_parent) {
         std::erase(m_parent->m_children, this);

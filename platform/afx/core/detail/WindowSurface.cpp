@@ -280,6 +280,7 @@ bool WindowTarget::open(Canvas& canvas, QRegion& visible) {
 }
 
 void WindowTarget::close(const QRect& touched) {
+    m_used = true;
     if (m_widget) {
         WindowSurface::of(*m_widget).close(touched.isEmpty() ? QRect() : touched.translated(m_origin), shownBy);
     }
@@ -294,7 +295,7 @@ double WindowTarget::ratio() const {
 }
 
 void WindowTarget::release() {
-    if (m_widget) {
+    if (m_widget && m_used) {
         WindowSurface::of(*m_widget).flush();
     }
 }

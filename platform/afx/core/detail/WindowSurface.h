@@ -91,7 +91,8 @@ private:
     QPointer<QWidget> m_widget;
     WindowPart m_part;
     std::function<QRect()> m_area;
-    QPoint m_origin; ///< of the area in the window, while open
+    QPoint m_origin;     ///< of the area in the window, while open
+    bool m_used = false; ///< A context that only measures has nothing to show.
     std::optional<QRegion> m_drawable;
 };
 

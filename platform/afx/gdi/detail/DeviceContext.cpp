@@ -57,9 +57,12 @@ double ScreenTarget::ratio() const {
 }
 
 DeviceContext::DeviceContext(DcKind kind, std::unique_ptr<DrawTarget> target) : kind(kind), target(std::move(target)) {
-    state.pen = stockTool<PenObject>(BLACK_PEN);
-    state.brush = stockTool<BrushObject>(WHITE_BRUSH);
-    state.font = stockTool<FontObject>(SYSTEM_FONT);
+    static const auto pen = stockTool<PenObject>(BLACK_PEN);
+    static const auto brush = stockTool<BrushObject>(WHITE_BRUSH);
+    static const auto font = stockTool<FontObject>(SYSTEM_FONT);
+    state.pen = pen;
+    state.brush = brush;
+    state.font = font;
 }
 
 DeviceContext::~DeviceContext() {

@@ -182,10 +182,19 @@ FontKey keyOf(const LOGFONTA& font) {
 std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
     // Fonts must not outlive the connection to the desktop; a host has few different ones.
     static std::map<FontKey, std::shared_ptr<const RealizedFont>> fonts;
+    static LOGFONTA lastAsked{}; // measuring line after line asks for one font again and again
+    static std::shared_ptr<const RealizedFont> last;
+    if (last && std::memcmp(&lastAsked, &description, sizeof(description)) == 0) {
+        return last;
+    }
     if (!ensureGui()) {
         return nullptr;
     }
-    [[maybe_unused]] static const bool cleared = (qAddPostRoutine([] { fonts.clear(); }), true);
+    [[maybe_unused]] static const bool cleared = (qAddPostRoutine([] {
+                                                      fonts.clear();
+                                                      last.reset();
+                                                  }),
+                                                  true);
     constexpr std::size_t mostFonts = 256;
     if (fonts.size() > mostFonts) {
         fonts.clear();
@@ -196,6 +205,8 @@ std::shared_ptr<const RealizedFont> realizeFont(const LOGFONTA& description) {
         font->angle = (description.lfEscapement % 3600) / 10.0;
         kept = std::move(font);
     }
+    lastAsked = description;
+    last = kept;
     return kept;
 }
 
