@@ -1,6 +1,11 @@
 #include "s/Document.h"
 
+#include "platform/base/SystemPath.h"
+
+#include <cerrno>
+#include <filesystem>
 #include <memory>
+#include <system_error>
 
 IMPLEMENT_DYNCREATE(Gui_Document, CDocument)
 
@@ -8,6 +13,15 @@ BEGIN_MESSAGE_MAP(Gui_Document, CDocument)
 END_MESSAGE_MAP()
 
 CFile* Gui_Document::GetFile(const char* fileName, unsigned int openFlags, CFileException* error) {
+    std::error_code unknown;
+    if (std::filesystem::is_fifo(tvx::systemPath(fileName).value_or(""), unknown)) {
+        if (error) {
+            error->m_cause = CFileException::genericException;
+            error->m_lOsError = ESPIPE;
+            error->m_strFileName = fileName;
+        }
+        return nullptr;
+    }
     auto file = std::make_unique<CFile>();
     return file->Open(fileName, openFlags, error) ? file.release() : nullptr;
 }

@@ -21,7 +21,7 @@ class GUI_API Gui_Document : public CDocument {
     DECLARE_DYNCREATE(Gui_Document)
 
 public:
-    /// Opens the named file itself.
+    /// Opens the named file itself. A named pipe is refused, as by CDocument: it would wait for its other end.
     /// @param openFlags  the modes of CFile
     /// @param error      receives the reason of a failure; may be null
     /// @return a file that ReleaseFile ends; null when it cannot be opened

@@ -1,8 +1,10 @@
 #include "s/Document.h"
 
+#include <cerrno>
 #include <filesystem>
 #include <fstream>
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 namespace {
 
@@ -35,4 +37,8 @@ TEST(Document, OpensTheNamedFileItself) {
     EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, &error), nullptr);
     EXPECT_EQ(error.m_cause, CFileException::fileNotFound);
     EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, nullptr), nullptr);
+
+    ASSERT_EQ(::mkfifo("pipe", 0600), 0);
+    EXPECT_EQ(plan.GetFile("pipe", CFile::modeRead, &error), nullptr) << "and does not wait";
+    EXPECT_EQ(error.m_lOsError, ESPIPE);
 }
