@@ -328,6 +328,24 @@ TEST_F(FileDialogs, TheCurrentFolderFollowsUnlessThatIsUnwanted) {
     std::filesystem::current_path(before);
 }
 
+TEST_F(FileDialogs, StandInFrontOfTheirOwnersAndQuestionsInFrontOfThem) {
+    NoteFrame& frame = openNote();
+    write(file("there.brd"), "x");
+    CFileDialog dialog(FALSE, "brd", file("there").c_str(), OFN_OVERWRITEPROMPT | OFN_NOCHANGEDIR);
+    inDialog([&] {
+        QFileDialog* asking = shownDialog();
+        EXPECT_EQ(asking->parentWidget(), widgetOf(frame));
+        later([asking] {
+            auto* box = dynamic_cast<QMessageBox*>(QApplication::activeModalWidget());
+            ASSERT_NE(box, nullptr);
+            EXPECT_EQ(box->parentWidget(), asking);
+            QTest::mouseClick(box->buttons().front(), Qt::LeftButton);
+        });
+        QTest::keyClick(asking->findChild<QLineEdit*>("fileNameEdit"), Qt::Key_Return);
+    });
+    EXPECT_EQ(dialog.DoModal(), IDOK);
+}
+
 TEST_F(FileDialogs, LetExceptionsOfTheHostsCheckOut) {
     class Failing : public CFileDialog {
     public:
