@@ -30,8 +30,11 @@ window() {
     # The search's exit code is 1 where there is none: an answer like another, not the end of a test under "set -e".
     { xdotool search --onlyvisible --name "$1" 2>/dev/null || true; } | tail -n 1
 }
+# titled PATTERN: whether there is such a window; leaves it in $found. A search fails where a window ends meanwhile, so a
+# second one for the same window may answer nothing.
 titled() {
-    [ -n "$(window "$1")" ]
+    found=$(window "$1")
+    [ -n "$found" ]
 }
 untitled() {
     [ -z "$(window "$1")" ]
@@ -44,7 +47,7 @@ begin() {
     process=$!
     processes=("$process")
     await "a window \"$title\" appears" titled "$title"
-    main=$(window "$title")
+    main=$found
     xdotool windowactivate --sync "$main"
 }
 # ended PROCESS

@@ -23,7 +23,7 @@ run() {
 board=$!
 processes=("$board")
 await "the board appears" titled "Tarvex Board"
-main=$(window "Tarvex Board")
+main=$found
 
 # The child tells its number and goes on when it is let to.
 cat >"$work/talk" <<TALK
@@ -38,7 +38,7 @@ chmod +x "$work/talk"
 mkfifo "$work/gate"
 run "$work/talk"
 await "the window of the program appears" titled "$work/talk"
-output=$(window "$work/talk")
+output=$found
 await "the program runs" test -s "$work/id"
 child=$(cat "$work/id")
 seq -f 'line-%g' 30000 >"$work/gate"

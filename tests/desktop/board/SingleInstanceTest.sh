@@ -19,7 +19,7 @@ start() {
     process=$!
     processes+=("$process")
     await "the window \"$title\" appears" titled "$title"
-    shown=$(window "$title")
+    shown=$found
     await "it becomes active" active "$shown"
 }
 # ends TEXT ARGUMENT...: a start that shows no window of its own.
