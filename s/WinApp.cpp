@@ -83,7 +83,12 @@ BOOL Gui_WinApp::PreTranslateMessage(MSG* message) {
 }
 
 BOOL Gui_WinApp::InitApplication() {
-    platformDocManager = std::exchange(m_pDocManager, new Gui_DocManager);
+    // An object that is started once more, as tests do, goes on with the one it has.
+    if (!m_data->docManager || m_pDocManager != m_data->docManager) {
+        platformDocManager = m_pDocManager;
+        m_data->docManager = new Gui_DocManager;
+        m_pDocManager = m_data->docManager;
+    }
     return CWinApp::InitApplication();
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "afx.h"
+#include "afxwin.h"
 #include "s/BrowserHelp.h"
 #include "s/MessageOrigin.h"
 
@@ -10,6 +10,7 @@ struct Gui_WinAppData {
     CString usageText;  ///< the host's text behind the usage summary
     CString pending;    ///< messages of the command-line check that are still to be shown
     Gui_BrowserHelp help;
+    CDocManager* docManager = nullptr; ///< what InitApplication has installed; only compared
 };
 
 /// The origin of the messages that the application object issues.

@@ -39,10 +39,16 @@ protected:
         windowTestApp.asked.clear();
         // File dialogs of other tests have left the program in folders that are gone.
         std::filesystem::current_path(testing::TempDir());
+        std::filesystem::current_path(std::filesystem::temp_directory_path());
         std::filesystem::create_directory("docs");
         for (const char* name : {"docs/a.brd", "docs/b.nts"}) {
             std::ofstream(name) << "x";
         }
+    }
+
+    void TearDown() override {
+        delete windowTestApp.m_pDocManager;
+        windowTestApp.m_pDocManager = nullptr;
     }
 
     /// Asks for a file; the dialog is looked at, then left by a typed name or, without one, by Esc.

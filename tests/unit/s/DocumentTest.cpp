@@ -18,6 +18,9 @@ std::string contents(const char* name) {
 } // namespace
 
 TEST(Document, OpensTheNamedFileItself) {
+    const auto folder = std::filesystem::temp_directory_path() / "documents";
+    std::filesystem::create_directories(folder);
+    std::filesystem::current_path(folder);
     std::ofstream("plan.txt") << "old";
     Plan plan;
     CFileException error;

@@ -11,6 +11,8 @@
 #include <QFrame>
 #include <QPainter>
 
+#include <algorithm>
+
 namespace tvx::afx {
 
 namespace {
@@ -166,12 +168,16 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 
 // --- owner drawing ---
 
-OwnerPainting::OwnerPainting(Control& control, QSize size, const QColor& background) : m_control(control) {
-    QImage image(size.expandedTo(QSize(1, 1)), QImage::Format_RGB32);
-    image.fill(background);
-    m_bitmap = addBitmap(image);
+// All pixels of a display with a scale are drawn.
+OwnerPainting::OwnerPainting(Control& control, QSize size, const QColor& background)
+    : m_control(control), m_ratio(control.widget()->devicePixelRatioF()) {
+    const RECT all{0, 0, std::max(size.width(), 1), std::max(size.height(), 1)};
+    m_bitmap = addBitmap(all.right, all.bottom, PixelFormat::Color, m_ratio);
     m_dc = CreateCompatibleDC(nullptr);
     m_oldBitmap = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(m_bitmap));
+    const HBRUSH brush = CreateSolidBrush(toColorRef(background));
+    FillRect(m_dc, &all, brush);
+    DeleteObject(reinterpret_cast<HGDIOBJ>(brush));
     if (control.font) {
         m_oldFont = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(control.font));
     }
@@ -199,7 +205,9 @@ void OwnerPainting::draw(DRAWITEMSTRUCT item) {
 }
 
 QImage OwnerPainting::image() const {
-    return bitmapImage(m_bitmap);
+    QImage picture = bitmapImage(m_bitmap);
+    picture.setDevicePixelRatio(m_ratio);
+    return picture;
 }
 
 void Control::paintByOwner(QPainter& painter, UINT type, UINT state) {

@@ -90,6 +90,7 @@ public:
 
 private:
     Control& m_control;
+    double m_ratio; ///< pixels of the picture in one of the control
     HDC m_dc = nullptr;
     HBITMAP m_bitmap = nullptr;
     HGDIOBJ m_oldBitmap = nullptr;
