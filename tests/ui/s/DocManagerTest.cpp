@@ -38,7 +38,6 @@ protected:
         windowTestApp.AddDocTemplate(new Kind("Notes", ".nts"));
         windowTestApp.asked.clear();
         // File dialogs of other tests have left the program in folders that are gone.
-        std::filesystem::current_path(testing::TempDir());
         std::filesystem::current_path(std::filesystem::temp_directory_path());
         std::filesystem::create_directory("docs");
         for (const char* name : {"docs/a.brd", "docs/b.nts"}) {
