@@ -200,6 +200,9 @@ void ListBoxWindow::applyRange() {
         const QSignalBlocker quiet((vertical->maximum() > 0) == (last > 0) ? vertical : nullptr);
         setPage(*vertical, visibleRows());
         vertical->setRange(0, last);
+        if (const int later = std::exchange(m_laterTop, -1); later >= 0) {
+            vertical->setValue(later);
+        }
         QScrollBar* horizontal = m_area->horizontalScrollBar();
         const int width = m_area->viewport()->width();
         setPage(*horizontal, width);
@@ -237,18 +240,19 @@ void ListBoxWindow::lineAdded() {
 }
 
 void ListBoxWindow::contentChanged() {
-    // While filling, the bar's range changes with every line: cheap enough, and nothing is painted before the loop.
     applyRange();
     refresh();
 }
 
 int ListBoxWindow::top() const {
-    return m_area->verticalScrollBar()->value();
+    return m_laterTop >= 0 ? m_laterTop : m_area->verticalScrollBar()->value();
 }
 
 void ListBoxWindow::setTop(int index) {
     if (m_rangeIsSmall) {
-        applyRange();
+        m_laterTop = std::clamp(index, 0, std::max(m_items.count() - visibleRows(), 0));
+        refresh();
+        return;
     }
     guarded([&] { m_area->verticalScrollBar()->setValue(index); });
 }
