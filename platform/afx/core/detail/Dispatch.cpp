@@ -147,20 +147,8 @@ void pump(MSG& msg, EventSource* source) {
     }
 }
 
-namespace {
-
-/// The ticks of GetTickCount as the system's clock last counted them, some milliseconds ago: asking for them exactly
-/// would be a tenth of the cost of a line that is added to a list.
-DWORD recentTicks() {
-    timespec now{};
-    clock_gettime(CLOCK_MONOTONIC_COARSE, &now);
-    return static_cast<DWORD>(now.tv_sec * 1000LL + now.tv_nsec / 1000000);
-}
-
-} // namespace
-
 MSG makeMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    return {window, message, wParam, lParam, recentTicks(), pointer};
+    return {window, message, wParam, lParam, GetTickCount(), pointer};
 }
 
 void notePointer(POINT position) {

@@ -16,7 +16,14 @@ namespace tvx::afx {
 
 LRESULT Window::call(UINT message, WPARAM wParam, LPARAM lParam) {
     Dispatch current;
-    current.msg = makeMessage(m_handle, message, wParam, lParam);
+    // Time and place are those of the message that is being handled: who sends one does not ask the clock.
+    const DWORD place = GetMessagePos();
+    current.msg = {m_handle,
+                   message,
+                   wParam,
+                   lParam,
+                   static_cast<DWORD>(GetMessageTime()),
+                   {GET_X_LPARAM(place), GET_Y_LPARAM(place)}};
     current.window = this;
     const DispatchScope scope(current);
     return deliver(message, wParam, lParam);
