@@ -75,7 +75,14 @@ protected:
         if (event->type() == QEvent::FocusIn || event->type() == QEvent::FocusOut) {
             update();
         }
+        if (event->type() == QEvent::FontChange) {
+            placeText();
+        }
         return QPlainTextEdit::event(event);
+    }
+    void resizeEvent(QResizeEvent* event) override {
+        placeText();
+        QPlainTextEdit::resizeEvent(event);
     }
     QMimeData* createMimeDataFromSelection() const override {
         auto* data = new QMimeData;
@@ -84,6 +91,19 @@ protected:
     }
 
 private:
+    /// In a field that has room for one line only, the line stands where that of a field of one line does.
+    void placeText() {
+        constexpr int usual = 2;
+        const int inside = height() - 2 * frameWidth();
+        const int line = fontMetrics().lineSpacing();
+        const bool bars = verticalScrollBarPolicy() != Qt::ScrollBarAlwaysOff ||
+                          horizontalScrollBarPolicy() != Qt::ScrollBarAlwaysOff;
+        const bool isOneLine = !bars && inside < 2 * line + 2 * usual;
+        const int margin = isOneLine ? std::max((inside - line) / 2, 0) : usual;
+        if (document()->documentMargin() != margin) {
+            document()->setDocumentMargin(margin);
+        }
+    }
     FieldEvents m_events;
 };
 
@@ -99,7 +119,6 @@ public:
         m_edit->setLineWrapMode(options.wraps ? QPlainTextEdit::WidgetWidth : QPlainTextEdit::NoWrap);
         m_edit->setVerticalScrollBarPolicy(policy(options.verticalBar));
         m_edit->setHorizontalScrollBarPolicy(policy(options.horizontalBar));
-        m_edit->document()->setDocumentMargin(2);
         connectStoring(m_edit, &QPlainTextEdit::textChanged, m_edit, std::move(events.changed));
     }
     QWidget* widget() const override {

@@ -115,7 +115,10 @@ void deliverCharacters(Window& window, const QKeyEvent& event, EventSource& sour
     const UINT message = isSystemKey(event) ? WM_SYSCHAR : WM_CHAR;
     const HWND handle = window.handle();
     const auto characters = event.text().toUcs4();
-    for (const auto character : characters) {
+    const bool control = event.modifiers().testFlag(Qt::ControlModifier);
+    for (auto character : characters) {
+        // Ctrl and Enter are the line feed to hosts, the carriage return to the desktop.
+        character = control && character == U'\r' ? U'\n' : character;
         MSG msg = makeMessage(handle, message, character, keyParameter(event, false));
         if (!preTranslate(msg)) {
             dispatch(msg, &source);

@@ -175,6 +175,79 @@ TEST_F(EditTest, WithoutWantReturnEnterIsTheDialogs) {
     EXPECT_EQ(dialog.codes(IDOK, BN_CLICKED), 1);
 }
 
+namespace {
+
+/// Takes what ends a line, as fields for commands do.
+class CommandField : public CEdit {
+public:
+    std::vector<WPARAM> ends;
+    std::vector<WPARAM> keys;
+
+protected:
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+        if (message == WM_KEYDOWN) {
+            keys.push_back(wParam);
+        }
+        if (message == WM_CHAR && (wParam == '\r' || wParam == '\n')) {
+            ends.push_back(wParam);
+            return 0;
+        }
+        return CEdit::WindowProc(message, wParam, lParam);
+    }
+};
+
+/// The first and the last row of a picture's middle that have something dark.
+std::pair<int, int> darkRows(const QImage& picture) {
+    std::pair rows(-1, -1);
+    for (int y = 3; y < picture.height() - 3; ++y) {
+        for (int x = 3; x < 40; ++x) {
+            if (qGray(picture.pixel(x, y)) < 100) {
+                rows = {rows.first < 0 ? y : rows.first, y};
+            }
+        }
+    }
+    return rows;
+}
+
+} // namespace
+
+TEST(CommandField, IsOneLineThatEnterDoesNotEnd) {
+    ScriptedDialog dialog(IDD_EMPTY);
+    CommandField command;
+    CEdit line;
+    dialog.prepare = [&] {
+        constexpr DWORD style = shown | WS_BORDER | ES_AUTOHSCROLL;
+        ASSERT_TRUE(command.Create(style | ES_MULTILINE | ES_WANTRETURN, CRect(10, 10, 210, 33), &dialog, controlId));
+        ASSERT_TRUE(line.Create(style, CRect(10, 40, 210, 63), &dialog, controlId + 1));
+    };
+    dialog.script = [&] {
+        line.SetWindowText("Hxg");
+        command.SetFocus();
+        type("Hxg");
+        key(Qt::Key_Return);
+        key(Qt::Key_Return, Qt::ControlModifier);
+        key(Qt::Key_Up);
+        key(Qt::Key_Down);
+        EXPECT_EQ(command.ends, (std::vector<WPARAM>{13, 10}));
+        EXPECT_EQ(textOf(&command), "Hxg");
+        command.SetSel(3, 3);
+        EXPECT_EQ(command.GetFirstVisibleLine(), 0);
+        for (const WPARAM arrow : {VK_UP, VK_DOWN}) {
+            EXPECT_EQ(std::count(command.keys.begin(), command.keys.end(), arrow), 1);
+        }
+        // Each without the caret.
+        const auto picture = [](const CWnd& field, CWnd& other) {
+            other.SetFocus();
+            return tvx::afx::Window::from(field.m_hWnd)->widget()->grab().toImage();
+        };
+        const auto ours = darkRows(picture(command, line));
+        const auto usual = darkRows(picture(line, command));
+        EXPECT_NEAR(ours.first, usual.first, 1);
+        EXPECT_NEAR(ours.second, usual.second, 1);
+    };
+    EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
+}
+
 // --- list box ---
 
 class ListBoxTest : public ControlTest<CListBox> {
