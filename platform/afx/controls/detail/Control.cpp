@@ -205,7 +205,9 @@ void OwnerPainting::draw(DRAWITEMSTRUCT item) {
 }
 
 QImage OwnerPainting::image() const {
-    QImage picture = bitmapImage(m_bitmap);
+    // All of its pixels, not those that the host knows of.
+    const auto bitmap = findTool<BitmapObject>(reinterpret_cast<HGDIOBJ>(m_bitmap));
+    QImage picture = bitmap ? bitmap->image.copy() : QImage();
     picture.setDevicePixelRatio(m_ratio);
     return picture;
 }
