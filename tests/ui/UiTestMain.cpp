@@ -1,5 +1,6 @@
 #include "platform/afx/toolkit/detail/Gui.h"
 
+#include <QAccessible>
 #include <QApplication>
 #include <QFont>
 
@@ -14,6 +15,7 @@ int main(int argc, char** argv) {
     if (!tvx::afx::ensureGui()) {
         return 1;
     }
+    QAccessible::setActive(true); // as an assistive tool does: what it is told lives beside the windows
     QApplication::setStyle(QStringLiteral("Fusion"));
     QFont font(QStringLiteral("DejaVu Sans Condensed"));
     font.setPixelSize(11);

@@ -169,7 +169,8 @@ ComboBoxWindow::ComboBoxWindow(const CREATESTRUCT& cs)
 
 ComboBoxWindow::~ComboBoxWindow() {
     if (box()) {
-        box()->disconnect();
+        // Not disconnected: the toolkit hears of its end by a signal, to forget what assistive tools know of it.
+        box()->blockSignals(true);
         box()->setModel(m_noLines); // the widget outlives the lines it showed
     }
 }

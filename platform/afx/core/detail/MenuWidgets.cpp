@@ -319,7 +319,7 @@ UINT track(HMENU menu, UINT flags, QPoint at, Tracking& tracking) {
         QPointer<PopupMenu>& popup;
         ~Closer() {
             if (popup) {
-                popup->disconnect();
+                QObject::disconnect(popup, &QMenu::aboutToHide, nullptr, nullptr);
                 popup->close();
                 popup->deleteLater();
             }
