@@ -147,7 +147,7 @@ bool Gui_ConsoleEdit::OnSearchKey(UINT key) {
             Search(shift ? 1 : -1);
             return true;
         }
-        m_search.emplace();
+        m_search = SearchState();
         GetWindowText(m_search->before);
         m_search->place = recall->GetNewest();
         ShowPattern(true);

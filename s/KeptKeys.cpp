@@ -16,12 +16,13 @@ struct Change {
 /// Reads a number that fills the text up to `end`, and takes it off the text.
 std::optional<unsigned long> takeNumber(std::string_view& text, int base, std::size_t end) {
     unsigned long number = 0;
-    const char* stop = text.data() + std::min(end, text.size());
-    const auto [read, error] = std::from_chars(text.data(), stop, number, base);
+    const char* const start = std::to_address(text.begin());
+    const char* const stop = start + std::min(end, text.size());
+    const auto [read, error] = std::from_chars(start, stop, number, base);
     if (error != std::errc() || read != stop) {
         return std::nullopt;
     }
-    text.remove_prefix(static_cast<std::size_t>(read - text.data()));
+    text.remove_prefix(static_cast<std::size_t>(read - start));
     return number;
 }
 

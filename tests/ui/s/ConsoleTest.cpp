@@ -458,13 +458,21 @@ TEST_F(Console, DrawsSelectedLinesInSwappedColors) {
         CClientDC dc(&list());
         return dc.GetPixel(row.left, row.top);
     };
-    const COLORREF plain = corner();
-    select({0});
-    const COLORREF selected = corner();
-    EXPECT_EQ(::GetSysColor(COLOR_WINDOW), plain);
-    EXPECT_EQ(::GetSysColor(COLOR_WINDOWTEXT), selected);
-    select({});
-    EXPECT_EQ(plain, corner());
+    const QPalette light = QApplication::palette();
+    QPalette dark = light;
+    dark.setColor(QPalette::Base, QColor(16, 16, 16));
+    dark.setColor(QPalette::Text, QColor(240, 240, 240));
+    for (const QPalette& palette : {light, dark}) {
+        QApplication::setPalette(palette);
+        const QColor base = palette.color(QPalette::Base);
+        const QColor text = palette.color(QPalette::Text);
+        EXPECT_EQ(RGB(base.red(), base.green(), base.blue()), corner());
+        select({0});
+        EXPECT_EQ(RGB(text.red(), text.green(), text.blue()), corner());
+        select({});
+        EXPECT_EQ(RGB(base.red(), base.green(), base.blue()), corner());
+    }
+    QApplication::setPalette(light);
 }
 
 // --- life ---

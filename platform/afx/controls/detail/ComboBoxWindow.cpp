@@ -325,7 +325,7 @@ void ComboBoxWindow::listShown(bool shown) {
 }
 
 QImage ComboBoxWindow::paintItem(int index, QSize size, UINT state) {
-    OwnerPainting drawing(*this, size, widget()->palette().color(QPalette::Base));
+    OwnerPainting drawing(*this, size, QPalette::Base);
     DRAWITEMSTRUCT item{};
     item.CtlType = ODT_COMBOBOX;
     item.itemID = static_cast<UINT>(index);

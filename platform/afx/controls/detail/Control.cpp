@@ -169,12 +169,18 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 // --- owner drawing ---
 
 // All pixels of a display with a scale are drawn.
-OwnerPainting::OwnerPainting(Control& control, QSize size, const QColor& background)
+OwnerPainting::OwnerPainting(Control& control, QSize size, QPalette::ColorRole back)
     : m_control(control), m_ratio(control.widget()->devicePixelRatioF()) {
+    const QPalette palette = control.widget()->palette();
+    const QColor background = palette.color(back);
+    const QColor text = palette.color(back == QPalette::Window ? QPalette::WindowText : QPalette::Text);
     const RECT all{0, 0, std::max(size.width(), 1), std::max(size.height(), 1)};
     m_bitmap = addBitmap(all.right, all.bottom, PixelFormat::Color, m_ratio);
     m_dc = CreateCompatibleDC(nullptr);
     m_oldBitmap = SelectObject(m_dc, reinterpret_cast<HGDIOBJ>(m_bitmap));
+    CDC* context = CDC::FromHandle(m_dc);
+    context->SetTextColor(toColorRef(text));
+    context->SetBkColor(toColorRef(background));
     const HBRUSH brush = CreateSolidBrush(toColorRef(background));
     FillRect(m_dc, &all, brush);
     DeleteObject(reinterpret_cast<HGDIOBJ>(brush));
@@ -214,7 +220,7 @@ QImage OwnerPainting::image() const {
 
 void Control::paintByOwner(QPainter& painter, UINT type, UINT state) {
     const HWND self = handle();
-    OwnerPainting drawing(*this, widget()->size(), widget()->palette().color(QPalette::Window));
+    OwnerPainting drawing(*this, widget()->size(), QPalette::Window);
     DRAWITEMSTRUCT item{};
     item.CtlType = type;
     item.rcItem = fromQt(widget()->rect());

@@ -9,6 +9,7 @@
 
 #include <QFont>
 #include <QImage>
+#include <QPalette>
 
 namespace tvx::afx {
 
@@ -79,8 +80,9 @@ private:
 /// something else.
 class TVX_PLATFORM_API OwnerPainting {
 public:
-    /// @param background what the picture is filled with first.
-    OwnerPainting(Control& control, QSize size, const QColor& background);
+    /// @param back which of the control's colours the picture is filled with first, Window or Base. The owner finds it
+    /// as the colour behind texts, and the one that belongs to it as the colour of texts.
+    OwnerPainting(Control& control, QSize size, QPalette::ColorRole back);
     ~OwnerPainting();
     OwnerPainting(const OwnerPainting&) = delete;
     OwnerPainting& operator=(const OwnerPainting&) = delete;

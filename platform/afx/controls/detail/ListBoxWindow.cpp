@@ -584,7 +584,7 @@ void ListBoxWindow::paintRow(QPainter& painter, int index) const {
 void ListBoxWindow::paintOwnerRows(QPainter& painter, int first, int last) {
     // The owner may end the list while it draws a line.
     const HWND self = handle();
-    OwnerPainting drawing(*this, m_area->viewport()->size(), m_area->viewport()->palette().color(QPalette::Base));
+    OwnerPainting drawing(*this, m_area->viewport()->size(), QPalette::Base);
     for (int row = first; row <= last && row < m_items.count() && from(self); ++row) {
         DRAWITEMSTRUCT item{};
         item.CtlType = ODT_LISTBOX;

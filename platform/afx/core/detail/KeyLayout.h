@@ -6,6 +6,8 @@
 #include "platform/base/Export.h"
 #include "platform/win/KeyboardSigns.h"
 
+#include <QtGlobal>
+
 #include <map>
 #include <vector>
 

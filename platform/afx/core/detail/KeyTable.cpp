@@ -2,6 +2,8 @@
 
 #include "platform/win/ResourceConstants.h"
 
+#include <Qt>
+
 #include <algorithm>
 #include <span>
 #include <string_view>

@@ -11,6 +11,8 @@
 
 #include <QMainWindow>
 #include <QMenuBar>
+#include <QScreen>
+#include <QStatusTipEvent>
 #include <QWindow>
 
 namespace tvx::afx {

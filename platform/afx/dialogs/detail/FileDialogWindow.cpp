@@ -212,7 +212,7 @@ QStringList FileDialogWindow::markedFiles() const {
 /// What stands in the field: one name, or several in quotation marks. A file that is called so comes first.
 QStringList FileDialogWindow::typedNames() const {
     const QString text = m_field->text();
-    const QStringList marked = markedFiles();
+    QStringList marked = markedFiles();
     if (!marked.isEmpty()) {
         return marked;
     }
