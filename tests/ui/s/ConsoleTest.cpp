@@ -450,7 +450,6 @@ TEST_F(Console, OffersTheCommandsInAMenu) {
 
 TEST_F(Console, DrawsSelectedLinesInSwappedColors) {
     console->AddCommand("open a");
-    open();
     const auto corner = [] {
         QApplication::processEvents();
         CRect row;
@@ -464,6 +463,7 @@ TEST_F(Console, DrawsSelectedLinesInSwappedColors) {
     dark.setColor(QPalette::Text, QColor(240, 240, 240));
     for (const QPalette& palette : {light, dark}) {
         QApplication::setPalette(palette);
+        open();
         const QColor base = palette.color(QPalette::Base);
         const QColor text = palette.color(QPalette::Text);
         EXPECT_EQ(RGB(base.red(), base.green(), base.blue()), corner());
@@ -471,6 +471,7 @@ TEST_F(Console, DrawsSelectedLinesInSwappedColors) {
         EXPECT_EQ(RGB(text.red(), text.green(), text.blue()), corner());
         select({});
         EXPECT_EQ(RGB(base.red(), base.green(), base.blue()), corner());
+        console->Close();
     }
     QApplication::setPalette(light);
 }
