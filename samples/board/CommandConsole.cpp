@@ -84,8 +84,14 @@ void CCommandConsole::Open() {
 // --- running ---
 
 int CCommandConsole::OnCommand(const char* text) {
-    theConsole->m_console.AddCommand(text);
-    return theConsole->Execute(text) ? 1 : 0;
+    Gui_Console& console = theConsole->m_console;
+    console.AddCommand(text);
+    const bool done = theConsole->Execute(text);
+    // A drawing that was opened has the keyboard now, but the user goes on typing commands.
+    if (console.IsOpen()) {
+        console.Open();
+    }
+    return done ? 1 : 0;
 }
 
 bool CCommandConsole::Execute(const CString& text) {

@@ -52,6 +52,10 @@ press Return
 enter "save $work/b.brd"
 await "the second drawing is saved" test -s "$work/b.brd"
 shapes "$work/b.brd" ellipse 1 || fail "a command of the last start was found"
+enter "new"
+enter "draw line 5 6 7 8"
+enter "save $work/c.brd"
+await "the keyboard stays in the console when a drawing is begun" test -s "$work/c.brd"
 enter "draw nothing"
 press Escape
 press alt+F4
