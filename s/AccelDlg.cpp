@@ -81,6 +81,9 @@ void Gui_AccelDlg::DoDataExchange(CDataExchange* dx) {
 
 BOOL Gui_AccelDlg::OnInitDialog() {
     CDialog::OnInitDialog();
+    // The last time it was shown may have ended while a key was typed.
+    m_record->idle = 1;
+    m_record->finding = false;
     m_record->specify.GetWindowText(m_record->specifyText);
     m_record->remove.EnableWindow(FALSE);
     m_record->commands = CommandsOf(CMenu::FromHandle(m_record->menu));

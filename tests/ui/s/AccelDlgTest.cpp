@@ -254,6 +254,26 @@ TEST(AccelDlg, TakesAnAssignedKeyFromItsOwnerAndGivesItBack) {
     });
 }
 
+TEST(AccelDlg, BeginsAnewWhenItIsShownOnceMore) {
+    Menu menu;
+    Dialog dialog(menu);
+    dialog.run([&] {
+        dialog.push(GUI_IDC_ACCEL_FIND_KEY);
+        dialog.push(GUI_IDC_ACCEL_SPECIFY); // neither is ended
+    });
+    dialog.run([&] {
+        dialog.push(GUI_IDC_ACCEL_FIND_KEY);
+        EXPECT_TRUE(dialog.isShown(GUI_IDC_ACCEL_FIND_FIELD));
+        dialog.push(GUI_IDC_ACCEL_FIND_KEY);
+        dialog.push(GUI_IDC_ACCEL_SPECIFY);
+        EXPECT_EQ(dialog.text(GUI_IDC_ACCEL_SPECIFY), "&Done");
+        menu.DestroyMenu(); // a host's mistake
+        key(Qt::Key_F, Qt::AltModifier);
+        dialog.push(GUI_IDC_ACCEL_SPECIFY);
+        EXPECT_EQ(dialog.keyText(), "Alt+F is unassigned");
+    });
+}
+
 TEST(AccelDlg, ResetGoesToTheKeysThatItWasTold) {
     Menu menu;
     Dialog dialog(menu);
