@@ -68,9 +68,17 @@ Gui_ConsoleHistory::~Gui_ConsoleHistory() {
 
 Gui_ConsoleHistoryLine* Gui_ConsoleHistory::AddCommand(const char* text) {
     auto line = MakeRecord<Gui_ConsoleHistoryLine>(CString(text), nextNumber);
-    tvx::allocating([&] { m_beginnings.push_back(beginningOf(line->m_text.GetString())); });
-    m_commands.Add(line.get());
-    m_lines.Add(line.get());
+    const INT_PTR count = m_commands.GetSize();
+    try {
+        tvx::allocating([&] { m_beginnings.push_back(beginningOf(line->m_text.GetString())); });
+        m_commands.Add(line.get());
+        m_lines.Add(line.get());
+    } catch (...) {
+        // In all of them or in none.
+        m_beginnings.resize(static_cast<std::size_t>(count));
+        m_commands.SetSize(count);
+        throw;
+    }
     ++nextNumber;
     return line.release();
 }

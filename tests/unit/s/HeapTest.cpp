@@ -4,6 +4,7 @@
 #include "res/resource.h"
 #include "s/AccelMap.h"
 #include "s/CommandLineState.h"
+#include "s/ConsoleHistory.h"
 #include "s/FileName.h"
 #include "s/HelpMap.h"
 #include "s/MessageManager.h"
@@ -175,4 +176,16 @@ TEST(Heap, AnExhaustedOneGivesNoTableOfAccelerators) {
     allocationsLeft = -1;
     EXPECT_EQ(count, 0);
     EXPECT_EQ(table, nullptr);
+}
+
+TEST(Heap, AnExhaustedOneLeavesNoHalfLinesInAConsolesHistory) {
+    Gui_ConsoleHistory history;
+    const unsigned long first = NextCommandNumber();
+    for (int i = 0; i < 40; ++i) {
+        EXPECT_GT(failuresOf([&] { history.AddCommand("run b"); }), 0);
+    }
+    EXPECT_EQ(40, history.GetCommands().GetSize());
+    EXPECT_EQ(40, history.GetLines().GetSize());
+    EXPECT_EQ(first + 40, NextCommandNumber());
+    EXPECT_TRUE(history.Resolve("!run").runs);
 }
