@@ -197,7 +197,8 @@ bool Gui_ConsoleEdit::OnSearchChar(UINT character) {
 
 /// Looks from the newest command on: the pattern has changed.
 void Gui_ConsoleEdit::SearchAgain() {
-    m_search->place = ConsoleState().m_recall->GetNewest();
+    const Gui_ConsoleRecall* const recall = ConsoleState().m_recall.get(); // null when the host has ended the console
+    m_search->place = recall ? recall->GetNewest() : -1;
     if (m_search->pattern.IsEmpty()) {
         Show(m_search->before);
         ShowPattern(true);

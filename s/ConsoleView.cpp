@@ -172,8 +172,9 @@ void Gui_ConsoleView::ForgetLines() {
     }
 }
 
+// The box alone is read: the label may show a search in place of the prompt.
 void Gui_ConsoleView::OnShowStatus() {
-    UpdateData(TRUE);
+    m_showStatus = m_statusBox.GetCheck();
     FillList(Fill::Again);
 }
 

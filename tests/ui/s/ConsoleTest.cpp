@@ -262,6 +262,12 @@ TEST_F(Console, WalksAndSearchesTheCommands) {
     key(Qt::Key_Escape);
     EXPECT_EQ("half", typed());
     EXPECT_EQ(prompt, text(GUI_IDC_CONSOLE_PROMPT));
+    key(Qt::Key_R, Qt::ControlModifier);
+    type("dra");
+    view().GetDlgItem(GUI_IDC_CONSOLE_SHOW_STATUS)->SendMessage(BM_CLICK);
+    view().GetDlgItem(GUI_IDC_CONSOLE_SHOW_STATUS)->SendMessage(BM_CLICK);
+    key(Qt::Key_Escape);
+    EXPECT_EQ(prompt, text(GUI_IDC_CONSOLE_PROMPT)) << "what is searched for is no prompt";
 
     key(Qt::Key_R, Qt::ControlModifier);
     type("lisx");
@@ -510,6 +516,13 @@ TEST_F(Console, SurvivesWhatACommandDoes) {
     view().SendMessage(WM_COMMAND, ID_FILE_CLOSE);
     EXPECT_FALSE(console->IsOpen());
     EXPECT_EQ(0, console->Close());
+
+    console->AddCommand("fail");
+    open();
+    select({0});
+    for (int i = 0; i < 2; ++i) {
+        EXPECT_THROW(view().SendMessage(WM_COMMAND, GUI_ID_CONSOLE_RUN), std::runtime_error) << "time " << i;
+    }
 }
 
 TEST_F(Console, RunsSelectedCommandsUntilOneClosesIt) {
@@ -528,8 +541,12 @@ TEST_F(Console, RunsSelectedCommandsUntilOneClosesIt) {
 TEST_F(Console, MayEndBeforeItsWindow) {
     console->AddCommand("open a");
     open();
+    key(Qt::Key_R, Qt::ControlModifier);
     console.reset();
     EXPECT_EQ(0, list().GetCount());
+    type("o");
+    key(Qt::Key_Backspace);
+    key(Qt::Key_Escape);
     enter("nobody");
     key(Qt::Key_Up);
     key(Qt::Key_R, Qt::ControlModifier);
@@ -538,6 +555,16 @@ TEST_F(Console, MayEndBeforeItsWindow) {
     EXPECT_TRUE(console->IsOpen());
     enter("run b");
     EXPECT_EQ(Texts{"run b"}, executed);
+
+    console.reset();
+    console.emplace(nullptr, 0);
+    enter("nobody");
+    EXPECT_EQ("", typed()) << "nothing to run is done";
+    console->SetShowCommandStatusFlag(1);
+    EXPECT_EQ(1, console->AddCommand(nullptr));
+    EXPECT_EQ(1, console->AddStatusLine(nullptr));
+    EXPECT_EQ(2, list().GetCount());
+    console->SetShowCommandStatusFlag(0);
 }
 
 TEST_F(Console, KeepsRecallTextsOverRestartsWhenTheHostSaysSo) {
