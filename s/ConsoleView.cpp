@@ -98,7 +98,9 @@ void Gui_ConsoleView::OnDestroy() {
 void Gui_ConsoleView::OnSize(UINT type, int width, int height) {
     CFormView::OnSize(type, width, height);
     if (m_list->m_hWnd && m_statusBox.m_hWnd && m_input->m_hWnd) {
-        Layout(width, height);
+        CRect client; // scroll bars that came or went have changed the size meanwhile
+        GetClientRect(&client);
+        Layout(client.Width(), client.Height());
         Invalidate();
     }
 }
@@ -112,7 +114,6 @@ void Gui_ConsoleView::Layout(int width, int height) {
     CRect field;
     CRect label;
     CRect box;
-    CRect list;
     const auto place = [this](const CWnd& control, CRect& rect) {
         control.GetWindowRect(&rect);
         ScreenToClient(&rect);
@@ -120,13 +121,12 @@ void Gui_ConsoleView::Layout(int width, int height) {
     place(*m_input, field);
     place(m_promptLabel, label);
     place(m_statusBox, box);
-    place(*m_list, list);
     const int top = height - field.Height() - 7 * v;
     const int boxTop = top - box.Height() - 5 * v;
     m_input->MoveWindow(field.left, top, width - field.left - 7 * h, field.Height());
     m_promptLabel.MoveWindow(label.left, top + v, label.Width(), label.Height());
     m_statusBox.MoveWindow(box.left, boxTop, box.Width(), box.Height());
-    m_list->MoveWindow(7 * h, 7 * v, width - 14 * h, boxTop - list.top - 5 * v);
+    m_list->MoveWindow(7 * h, 7 * v, width - 14 * h, boxTop - 7 * v - 5 * v);
 }
 
 // --- lines and prompt ---

@@ -333,6 +333,11 @@ TEST_F(Console, ShowsWhatWasAddedWhileItWasClosed) {
 
 TEST_F(Console, LaysItsControlsOut) {
     open();
+    view().GetParentFrame()->MoveWindow(0, 0, 120, 100);
+    QApplication::processEvents();
+    view().SendMessage(WM_VSCROLL, SB_BOTTOM); // what was scrolled away in a small window comes back in a large one
+    view().SendMessage(WM_HSCROLL, SB_RIGHT);
+    view().GetParentFrame()->MoveWindow(0, 0, 120, 110);
     view().GetParentFrame()->MoveWindow(0, 0, 500, 400);
     QApplication::processEvents();
     const int h = LOWORD(::GetDialogBaseUnits()) / 4;
@@ -536,6 +541,15 @@ TEST_F(Console, RunsSelectedCommandsUntilOneClosesIt) {
     select({0, 1});
     view().SendMessage(WM_COMMAND, GUI_ID_CONSOLE_RUN);
     EXPECT_EQ(Texts{"close"}, executed);
+    execute = [this](const std::string&) {
+        console.reset();
+        return 1;
+    };
+    open();
+    select({0, 1});
+    view().SendMessage(WM_COMMAND, GUI_ID_CONSOLE_RUN);
+    EXPECT_EQ((Texts{"close", "close"}), executed) << "who ends the console runs nothing more";
+    EXPECT_EQ(0, list().GetCount());
 }
 
 TEST_F(Console, MayEndBeforeItsWindow) {
