@@ -55,6 +55,10 @@ int failuresOf(const std::function<void()>& function) {
     return memory;
 }
 
+[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    return std::malloc(size ? size : 1);
+}
+
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
 }

@@ -235,7 +235,13 @@ void ListBoxWindow::lineAdded() {
         applyRange();
     } else if (isShown) {
         m_rangeIsSmall = true;
-        QMetaObject::invokeMethod(m_area, [this] { storing([this] { applyRange(); }); }, Qt::QueuedConnection);
+        // The widget lives a little longer than the list.
+        const auto apply = [self = handle()] {
+            if (auto* list = static_cast<ListBoxWindow*>(from(self))) {
+                storing([list] { list->applyRange(); });
+            }
+        };
+        QMetaObject::invokeMethod(m_area, apply, Qt::QueuedConnection);
     }
 }
 
