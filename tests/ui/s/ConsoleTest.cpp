@@ -69,6 +69,8 @@ protected:
         m_frame->DestroyWindow();
         console.reset();
         menu.Detach();
+        delete windowTestApp.m_pDocManager;
+        windowTestApp.m_pDocManager = nullptr;
     }
 
     void makeConsole() {

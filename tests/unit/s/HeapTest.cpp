@@ -46,17 +46,18 @@ int failuresOf(const std::function<void()>& function) {
 
 } // namespace
 
-[[gnu::noinline]] void* operator new(std::size_t size) {
+[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
     void* memory = allocationsLeft == 0 ? nullptr : std::malloc(size ? size : 1);
-    if (!memory) {
-        throw std::bad_alloc();
-    }
-    allocationsLeft -= allocationsLeft > 0;
+    allocationsLeft -= memory && allocationsLeft > 0;
     return memory;
 }
 
-[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    return std::malloc(size ? size : 1);
+[[gnu::noinline]] void* operator new(std::size_t size) {
+    void* memory = operator new(size, std::nothrow);
+    if (!memory) {
+        throw std::bad_alloc();
+    }
+    return memory;
 }
 
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
