@@ -61,7 +61,9 @@ press alt+t
 press c
 xdotool type --clearmodifiers "xnew"
 press Home Delete Return
-await "Delete is no command in the console" titled "Drawing3 - Tarvex Board"
+xdotool type --clearmodifiers "save $work/typed.brd"
+press Return
+await "Delete is no command in the console" test -s "$work/typed.brd"
 press alt+F4
 await "the application ends" ended "$process"
 

@@ -60,6 +60,23 @@ int failuresOf(const std::function<void()>& function) {
     return memory;
 }
 
+// The sanitizer's own arrays would not come here.
+[[gnu::noinline]] void* operator new[](std::size_t size, const std::nothrow_t&) noexcept {
+    return operator new(size, std::nothrow);
+}
+
+[[gnu::noinline]] void operator delete[](void* memory) noexcept {
+    std::free(memory);
+}
+
+[[gnu::noinline]] void operator delete[](void* memory, std::size_t /*size*/) noexcept {
+    std::free(memory);
+}
+
+[[gnu::noinline]] void* operator new[](std::size_t size) {
+    return operator new(size);
+}
+
 [[gnu::noinline]] void operator delete(void* memory) noexcept {
     std::free(memory);
 }
