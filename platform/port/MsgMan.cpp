@@ -6,7 +6,9 @@
 #include "platform/port/detail/MsgFormat.h"
 
 #include <algorithm>
+#include <iterator>
 #include <memory>
+#include <vector>
 
 namespace {
 
@@ -41,9 +43,9 @@ std::vector<std::wstring> formatLines(Port_MsgMan::MsgType type, bool clean, int
     return Port::detail::wrapText((clean ? L"" : prefixOf(type)) + std::wstring(text), width);
 }
 
-wchar_t* newLine(const std::wstring& text) {
-    auto* line = new wchar_t[text.size() + 2];
-    wchar_t* end = std::copy(text.begin(), text.end(), line);
+std::unique_ptr<wchar_t[]> newLine(const std::wstring& text) {
+    auto line = std::make_unique<wchar_t[]>(text.size() + 2);
+    wchar_t* end = std::copy(text.begin(), text.end(), line.get());
     end[0] = L'\n';
     end[1] = L'\0';
     return line;
@@ -126,8 +128,12 @@ wchar_t** Port_MsgManDefault::msgFormat(MsgType type, bool clean, int width, con
     if (lines.empty()) {
         return nullptr;
     }
+    // Owned until the heap has given all of them.
+    std::vector<std::unique_ptr<wchar_t[]>> made;
+    made.reserve(lines.size());
+    std::transform(lines.begin(), lines.end(), std::back_inserter(made), newLine);
     auto** array = new wchar_t*[lines.size()];
-    std::transform(lines.begin(), lines.end(), array, newLine);
+    std::transform(made.begin(), made.end(), array, [](auto& line) { return line.release(); });
     return array;
 }
 
