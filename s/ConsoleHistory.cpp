@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cstring>
 #include <string_view>
 
@@ -14,11 +15,12 @@ namespace {
 /// The counter outlives the histories of a process.
 unsigned long nextNumber = 1;
 
-constexpr std::size_t beginningLength = sizeof(std::uint64_t);
+using Beginning = std::array<std::uint64_t, 2>;
+constexpr std::size_t beginningLength = sizeof(Beginning);
 
 /// The beginning of a text, comparable with those of others. Upper and lower case are one; characters outside of ASCII
 /// are all alike here, since their case may change their bytes.
-std::uint64_t beginningOf(std::string_view text) {
+Beginning beginningOf(std::string_view text) {
     std::array<unsigned char, beginningLength> bytes{};
     const std::string_view first = text.substr(0, beginningLength);
     for (std::size_t i = 0; i < first.size(); ++i) {
@@ -29,13 +31,11 @@ std::uint64_t beginningOf(std::string_view text) {
         }
         bytes[i] = byte >= 'A' && byte <= 'Z' ? byte + ('a' - 'A') : byte;
     }
-    std::uint64_t beginning = 0;
-    std::memcpy(&beginning, bytes.data(), bytes.size());
-    return beginning;
+    return std::bit_cast<Beginning>(bytes);
 }
 
 /// The bits of a beginning that a pattern decides.
-std::uint64_t maskOf(std::string_view pattern) {
+Beginning maskOf(std::string_view pattern) {
     std::array<unsigned char, beginningLength> bytes{};
     for (std::size_t i = 0; i < pattern.size() && i < bytes.size(); ++i) {
         if (static_cast<unsigned char>(pattern[i]) >= 0x80) {
@@ -43,9 +43,7 @@ std::uint64_t maskOf(std::string_view pattern) {
         }
         bytes[i] = 0xFF;
     }
-    std::uint64_t mask = 0;
-    std::memcpy(&mask, bytes.data(), bytes.size());
-    return mask;
+    return std::bit_cast<Beginning>(bytes);
 }
 
 Gui_ConsoleHistory::Resolved refused(unsigned message) {
@@ -117,10 +115,13 @@ Gui_ConsoleHistory::Resolved Gui_ConsoleHistory::ByNumber(const char* input) con
 }
 
 Gui_ConsoleHistory::Resolved Gui_ConsoleHistory::ByPattern(const char* pattern) const {
-    const std::uint64_t beginning = beginningOf(pattern);
-    const std::uint64_t mask = maskOf(pattern);
+    const Beginning wanted = beginningOf(pattern);
+    const Beginning mask = maskOf(pattern);
+    const auto mayMatch = [&](const Beginning& beginning) {
+        return (((beginning[0] ^ wanted[0]) & mask[0]) | ((beginning[1] ^ wanted[1]) & mask[1])) == 0;
+    };
     for (auto at = static_cast<INT_PTR>(m_beginnings.size()) - 1; at >= 0; --at) {
-        if ((m_beginnings[static_cast<std::size_t>(at)] & mask) == (beginning & mask)) {
+        if (mayMatch(m_beginnings[static_cast<std::size_t>(at)])) {
             const CString& text = m_commands.LineAt(at)->m_text;
             if (tvx::text::startsWithNoCase(text.GetString(), pattern)) {
                 return {true, text, 0};

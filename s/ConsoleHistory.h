@@ -2,6 +2,7 @@
 
 #include "afxwin.h"
 
+#include <array>
 #include <cstdint>
 #include <memory>
 #include <vector>
@@ -74,7 +75,7 @@ private:
     Gui_ConsoleHistoryLineArray m_commands;
     Gui_ConsoleHistoryLineArray m_lines;
     /// The first bytes of each command without case, so that a search through many looks at few of them.
-    std::vector<std::uint64_t> m_beginnings;
+    std::vector<std::array<std::uint64_t, 2>> m_beginnings;
 };
 
 /// The number that the process's next command will have. It begins with 1 and is never set back.

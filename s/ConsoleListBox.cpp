@@ -6,17 +6,18 @@
 #include "s/Msg.h"
 
 #include <algorithm>
+#include <string>
 
 namespace {
 
 /// "21> run b " or "Done. ": the blank behind a line keeps the next character off when the list is scrolled.
-CString DisplayText(const Gui_ConsoleHistoryLine& line) {
-    CString text;
+std::string DisplayText(const Gui_ConsoleHistoryLine& line) {
+    std::string text;
+    text.reserve(static_cast<std::size_t>(line.m_text.GetLength()) + 24);
     if (line.IsCommand()) {
-        text.Format("%lu> %s ", line.m_number, line.m_text.GetString());
-    } else {
-        text = line.m_text + " ";
+        text.append(std::to_string(line.m_number)).append("> ");
     }
+    text.append(line.m_text.View()).append(" ");
     return text;
 }
 
@@ -70,7 +71,8 @@ void Gui_ConsoleListBox::AddLine(Gui_ConsoleHistoryLine* line) {
 
 void Gui_ConsoleListBox::Measure(CDC& dc, const Gui_ConsoleHistoryLine& line) {
     int& widest = ConsoleState().m_widestLine;
-    const int width = dc.GetTextExtent(DisplayText(line)).cx;
+    const std::string text = DisplayText(line);
+    const int width = dc.GetTextExtent(text.c_str(), static_cast<int>(text.size())).cx;
     if (width > widest) {
         widest = width;
         SetHorizontalExtent(widest);
@@ -104,6 +106,10 @@ void Gui_ConsoleListBox::ScrollToEnd() {
     const int wanted = std::max(GetCount() - client.Height() / height, 0);
     if (top < wanted) {
         SetTopIndex(wanted);
+    }
+    // All lines are of one height: from there on the last one is whole in sight.
+    if (GetTopIndex() >= wanted) {
+        return;
     }
     CRect last;
     CRect before;
@@ -187,7 +193,7 @@ void Gui_ConsoleListBox::DrawItem(DRAWITEMSTRUCT* item) {
         dc.SetTextColor(background);
         dc.SetBkColor(text);
     }
-    dc.TextOut(item->rcItem.left, item->rcItem.top, DisplayText(*line));
+    dc.TextOut(item->rcItem.left, item->rcItem.top, DisplayText(*line).c_str());
     dc.SetTextColor(text);
     dc.SetBkColor(background);
 }
@@ -197,7 +203,8 @@ CString Gui_ConsoleListBox::GetAccessibleText(int index) const {
     if (!line) {
         return {};
     }
-    return line->IsCommand() ? DisplayText(*line).Trim() : (Gui_Msg(GUI_IDS_CONSOLE_STATUS) << line->m_text).GetValue();
+    return line->IsCommand() ? CString(DisplayText(*line)).Trim()
+                             : (Gui_Msg(GUI_IDS_CONSOLE_STATUS) << line->m_text).GetValue();
 }
 
 // --- the menu, and keys for its commands ---
