@@ -26,12 +26,6 @@ END_MESSAGE_MAP()
 
 namespace {
 
-CString stringOf(UINT id) {
-    CString text;
-    text.LoadString(id);
-    return text;
-}
-
 /// A button that gets disabled must not keep the keyboard.
 void enable(CWnd& button, bool on, CWnd& heir) {
     if (!on && CWnd::GetFocus() == &button) {
@@ -134,7 +128,7 @@ std::optional<CString> Gui_AccelDlg::Record::labelOf(UINT command) const {
 
 CString Gui_AccelDlg::Record::nameOf(UINT command) const {
     const auto label = labelOf(command);
-    return label ? label->Mid(1) : stringOf(GUI_IDS_KEY_NO_ITEM);
+    return label ? label->Mid(1) : StringOf(GUI_IDS_KEY_NO_ITEM);
 }
 
 std::optional<CString> Gui_AccelDlg::Record::menuOpenedBy(const Gui_Accel& key) const {
@@ -169,7 +163,7 @@ CString Gui_AccelDlg::Record::ownerText(const Gui_Accel& key) const {
 void Gui_AccelDlg::describeKey() {
     const Gui_Accel key = AccelOf(m_record->hotKey);
     if (key.IsEmpty()) {
-        SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, stringOf(GUI_IDS_KEY_BEGIN));
+        SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, StringOf(GUI_IDS_KEY_BEGIN));
         enable(m_record->assign, false, m_record->specify);
     } else {
         SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, m_record->ownerText(key));
@@ -217,12 +211,12 @@ void Gui_AccelDlg::OnSelchangeCurrentkeylist() {
 
 void Gui_AccelDlg::OnSpecifybutton() {
     if (m_record->idle) {
-        m_record->specify.SetWindowText(stringOf(GUI_IDS_KEY_DONE));
+        m_record->specify.SetWindowText(StringOf(GUI_IDS_KEY_DONE));
         m_record->hotKey.SetHotKey(0, 0);
         m_record->hotKey.ShowWindow(SW_SHOW);
         m_record->hotKey.SetFocus();
-        SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, stringOf(GUI_IDS_KEY_TYPE));
-        setNote(stringOf(GUI_IDS_KEY_AGAIN));
+        SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, StringOf(GUI_IDS_KEY_TYPE));
+        setNote(StringOf(GUI_IDS_KEY_AGAIN));
         m_record->typed.Clear();
         m_record->idle = 0;
         return;

@@ -34,16 +34,6 @@ BEGIN_MESSAGE_MAP(Gui_CommandPalette, CDialog)
 END_MESSAGE_MAP()
 // clang-format on
 
-namespace {
-
-CString stringOf(UINT id) {
-    CString text;
-    text.LoadString(id);
-    return text;
-}
-
-} // namespace
-
 int Gui_CommandPalette::Open(CFrameWnd* frame) {
     if (!frame || !frame->m_hWnd || !frame->GetMenu()) {
         return 0;
@@ -108,9 +98,9 @@ void Gui_CommandPalette::select(int line) {
 
 void Gui_CommandPalette::OnSelchangeCommands() {
     const PaletteEntry* entry = m_record->selected();
-    CString prompt = entry ? PromptOf(entry->command.id) : stringOf(GUI_IDS_PALETTE_NOTHING);
+    CString prompt = entry ? PromptOf(entry->command.id) : StringOf(GUI_IDS_PALETTE_NOTHING);
     if (entry && !entry->isEnabled()) {
-        prompt = stringOf(GUI_IDS_PALETTE_UNAVAILABLE) + " " + prompt;
+        prompt = StringOf(GUI_IDS_PALETTE_UNAVAILABLE) + " " + prompt;
     }
     SetDlgItemText(GUI_IDC_PALETTE_PROMPT, prompt);
 }

@@ -210,6 +210,9 @@ void Gui_ConsoleEdit::SearchAgain() {
 /// Shows the command that is found, what was searched for selected.
 /// @param step  -1: an older one, 1: a newer one, 0: the first from where the search stands
 void Gui_ConsoleEdit::Search(int step) {
+    if (m_search->pattern.IsEmpty()) {
+        return; // nothing has been asked for yet
+    }
     const Gui_ConsoleRecall* const recall = ConsoleState().m_recall.get();
     CString now;
     GetWindowText(now);

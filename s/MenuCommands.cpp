@@ -35,11 +35,14 @@ std::vector<MenuCommand> CommandsOf(const CMenu* menu) {
     return commands;
 }
 
-CString PromptOf(UINT command) {
+CString StringOf(UINT id) {
     CString text;
+    text.LoadString(id);
+    return text;
+}
+
+CString PromptOf(UINT command) {
     CString prompt;
-    if (text.LoadString(command)) {
-        AfxExtractSubString(prompt, text, 0);
-    }
+    AfxExtractSubString(prompt, StringOf(command), 0);
     return prompt;
 }

@@ -272,6 +272,8 @@ TEST_F(Console, WalksAndSearchesTheCommands) {
     EXPECT_EQ(prompt, text(GUI_IDC_CONSOLE_PROMPT)) << "what is searched for is no prompt";
 
     key(Qt::Key_R, Qt::ControlModifier);
+    key(Qt::Key_R, Qt::ControlModifier);
+    EXPECT_EQ("Find: ", text(GUI_IDC_CONSOLE_PROMPT)) << "nothing has been looked for yet";
     type("lisx");
     EXPECT_EQ("Not found: lisx", text(GUI_IDC_CONSOLE_PROMPT));
     key(Qt::Key_Return);
