@@ -505,6 +505,8 @@ TEST_F(Console, SurvivesWhatACommandDoes) {
             // Keys that come while a command runs are typed, and run nothing.
             type("more");
             key(Qt::Key_Return);
+        } else if (text == "edit") {
+            field().SetWindowText("another text");
         } else if (text == "fail") {
             throw std::runtime_error("host");
         }
@@ -518,7 +520,9 @@ TEST_F(Console, SurvivesWhatACommandDoes) {
     EXPECT_EQ("", typed());
     enter("nested");
     EXPECT_EQ("more", typed());
-    EXPECT_EQ((Texts{"close", "reopen", "nested"}), executed);
+    enter("edit");
+    EXPECT_EQ("another text", typed()) << "not what was run";
+    EXPECT_EQ((Texts{"close", "reopen", "nested", "edit"}), executed);
     const CWnd* const frame = view().GetParentFrame();
     EXPECT_EQ(1, console->Open());
     EXPECT_EQ(frame, view().GetParentFrame()) << "an open console is activated";
