@@ -36,6 +36,11 @@ titled() {
     found=$(window "$1")
     [ -n "$found" ]
 }
+# focus PATTERN [key ...]: gives the keyboard to the window with such a title, and does there what xdotool is told to.
+focus() {
+    await "a window \"$1\" to give the keyboard to" titled "$1"
+    xdotool windowactivate --sync "$found" "${@:2}"
+}
 untitled() {
     [ -z "$(window "$1")" ]
 }
@@ -46,9 +51,8 @@ begin() {
     "$@" &
     process=$!
     processes=("$process")
-    await "a window \"$title\" appears" titled "$title"
+    focus "$title"
     main=$found
-    xdotool windowactivate --sync "$main"
 }
 # ended PROCESS
 ended() {

@@ -97,7 +97,7 @@ bool prepare(Start& start) {
 }
 
 /// Runs in the child, on a stack of its own.
-__attribute__((no_sanitize("address"))) int runChild(void* data) {
+int runChild(void* data) {
     Start& start = *static_cast<Start*>(data);
     if (prepare(start)) {
         start.step = SpawnStep::Program;
@@ -126,9 +126,10 @@ pid_t cloneWithoutHandlers([[maybe_unused]] Start& start, [[maybe_unused]] std::
     asm volatile("syscall\n\t"
                  "testq %%rax, %%rax\n\t"
                  "jnz 1f\n\t"
-                 "xorl %%ebp, %%ebp\n\t" // the outermost frame
                  "movq %[start], %%rdi\n\t"
-                 "callq *%[run]\n\t"
+                 "movq %[run], %%rax\n\t"
+                 "xorl %%ebp, %%ebp\n\t" // the outermost frame; either operand may have been there
+                 "callq *%%rax\n\t"
                  "movl %%eax, %%edi\n\t"
                  "movl %[exit], %%eax\n\t"
                  "syscall\n\t"

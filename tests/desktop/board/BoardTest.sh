@@ -40,12 +40,12 @@ start "$file"
 draw
 xdotool key --clearmodifiers alt+F4
 await "closing with changes asks" titled "^Tarvex Board$"
-xdotool windowactivate --sync "$(window '^Tarvex Board$')" key Escape
+focus '^Tarvex Board$' key Escape
 await "Esc takes the question away" untitled "^Tarvex Board$"
 ended "$process" && fail "Esc keeps the application"
 xdotool windowactivate --sync "$main" key --clearmodifiers alt+F4
 await "closing asks again" titled "^Tarvex Board$"
-xdotool windowactivate --sync "$(window '^Tarvex Board$')" key n
+focus '^Tarvex Board$' key n
 await "No ends the application" ended "$process"
 changed && fail "No leaves the file as it was"
 exit 0

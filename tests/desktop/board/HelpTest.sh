@@ -46,7 +46,7 @@ id=$(sed -n 's/^DESKTOP_STARTUP_ID=//p' "$work/browser.env")
 
 press ctrl+o
 await "the file dialog appears" titled '^Open$'
-xdotool windowactivate --sync "$(window '^Open$')"
+focus '^Open$'
 press F1
 opened "a file dialog" browser "file://$documents/board/files.html#open"
 press Escape
@@ -56,7 +56,7 @@ xdotool windowactivate --sync "$main"
 press alt+t
 press Return
 await "Run Command appears" titled '^Run Command$'
-xdotool windowactivate --sync "$(window '^Run Command$')"
+focus '^Run Command$'
 press F1
 opened "a dialog" browser "file://$documents/shared/query.html"
 press alt+h
@@ -72,11 +72,11 @@ opened "Help > Contents" browser "file://$documents/board/index.html"
 
 press alt+h s
 await "the search appears" titled '^Search Help$'
-xdotool windowactivate --sync "$(window '^Search Help$')"
+focus '^Search Help$'
 xdotool type dRAWING # letter case does not matter
 press Return
 await "several topics are offered" titled '^Topics Found$'
-xdotool windowactivate --sync "$(window '^Topics Found$')"
+focus '^Topics Found$'
 press Down Down Return
 opened "the third topic by its letters" browser "file://$documents/board/files.html"
 
@@ -86,7 +86,7 @@ xdotool mousemove --window "$main" 300 300 click 1
 opened "help mode" browser "file://$documents/board/drawing.html"
 press alt+h a
 await "the About box appears" titled '^About'
-xdotool windowactivate --sync "$(window '^About')"
+focus '^About'
 press F1
 opened "the About box" browser "file://$documents/shared/about.html"
 press Escape
@@ -98,7 +98,7 @@ opened "Help > Software Manuals" evince "$documents/manuals.pdf"
 rm "$work/browser"
 press F1
 await "the failure is told" titled '^Tarvex Board$'
-xdotool windowactivate --sync "$(window '^Tarvex Board$')"
+focus '^Tarvex Board$'
 press F1 Return
 await "one box has told it" untitled '^Tarvex Board$'
 
@@ -107,7 +107,7 @@ stand_in other %u text/html
 xdotool windowactivate --sync "$main"
 press alt+t w
 await "the choice of a browser appears" titled '^Web Browser$'
-xdotool windowactivate --sync "$(window '^Web Browser$')"
+focus '^Web Browser$'
 press ctrl+a
 xdotool type "$work/other --from-desktop %1"
 press Return
@@ -124,7 +124,7 @@ echo junk >"$work/damaged.brd"
 process=$!
 processes=("$process")
 await "the message about the drawing appears" titled '^Tarvex Board$'
-xdotool windowactivate --sync "$(window '^Tarvex Board$')"
+focus '^Tarvex Board$'
 press F1
 opened "a damaged drawing" other "file://$documents/board/files.html#damaged"
 press Return
@@ -136,7 +136,7 @@ begin "plan.brd - Tarvex Board" "$program" "$drawing"
 active "$main" || fail "nothing stands before the board"
 press F1
 await "the missing package is told" titled '^Tarvex Board$'
-xdotool windowactivate --sync "$(window '^Tarvex Board$')"
+focus '^Tarvex Board$'
 press Return
 await "once" untitled '^Tarvex Board$'
 xdotool windowactivate --sync "$main"

@@ -13,7 +13,7 @@ press() {
 # appears TITLE PURPOSE: waits for a window and gives it the keyboard.
 appears() {
     await "$2" titled "$1"
-    xdotool windowactivate --sync "$(window "$1")"
+    focus "$1"
 }
 # runs PURPOSE KEY...: whether the keys open the question for a command; it is closed again.
 runs() {

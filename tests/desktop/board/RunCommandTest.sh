@@ -12,7 +12,7 @@ run() {
     xdotool windowactivate --sync "$main" key --clearmodifiers alt+t
     xdotool key Return
     await "the question appears" titled "^Run Command$"
-    xdotool windowactivate --sync "$(window '^Run Command$')"
+    focus '^Run Command$'
     xdotool key --clearmodifiers ctrl+a
     xdotool type --clearmodifiers "$1"
     xdotool key --clearmodifiers "${@:2}" Return
@@ -47,7 +47,7 @@ await "the output is read" test -s "$work/read"
 xdotool windowactivate --sync "$output" mousemove --window "$output" 100 60 click 1 key --clearmodifiers ctrl+a ctrl+c
 run "touch $work/first-" ctrl+v
 await "old lines are dropped whole" compgen -G "$work/first-line-[1-9]*"
-xdotool windowactivate --sync "$(window '^touch')" key Escape
+focus '^touch' key Escape
 await "the window of the second program closes" untitled "^touch"
 xdotool windowactivate --sync "$output"
 xdotool key --clearmodifiers alt+s
@@ -61,7 +61,7 @@ run "$work/talk"
 await "the program runs again" test -s "$work/id"
 child=$(cat "$work/id")
 await "its window appears" titled "$work/talk"
-xdotool windowactivate --sync "$(window "$work/talk")" key Escape
+focus "$work/talk" key Escape
 await "closing the window ends the program" ended "$child"
 
 run "$work/missing"

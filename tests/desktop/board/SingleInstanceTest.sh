@@ -42,7 +42,7 @@ records() {
 minimized() {
     xprop -id "$1" WM_STATE | grep -q Iconic
 }
-close() {
+close() { # WINDOW PROCESS
     xdotool windowactivate --sync "$1" key --clearmodifiers alt+F4
     await "the board closes" ended "$2"
 }
@@ -62,7 +62,8 @@ await "the minimised board comes back" active "$main"
 TVX_GUI_INSTANCECHECKING=0 start "second.brd - Tarvex Board" -single "$work/second.brd"
 records "$first $main" || fail "a board that does not check takes the record"
 close "$shown" "$process"
-close "$(window "other.brd - Tarvex Board")" "$other"
+await "the other board is still there" titled "other.brd - Tarvex Board"
+close "$found" "$other"
 records "$first $main" || fail "closing another board clears the record"
 "$settings" set "$key" WindowID 0
 ends "a start while the first has no window yet" -single "$work/second.brd"

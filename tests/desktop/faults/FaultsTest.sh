@@ -23,7 +23,7 @@ expect() {
     processes=("$process")
     if [ -n "${4:-}" ]; then
         await "$2: the main window appears" titled '^Faulty$'
-        xdotool windowactivate --sync "$(window '^Faulty$')" key --clearmodifiers "$4"
+        focus '^Faulty$' key --clearmodifiers "$4"
     fi
     await "$2 $3: a box or the end" boxOrEnd
     while ! ended "$process"; do

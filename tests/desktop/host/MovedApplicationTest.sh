@@ -32,7 +32,7 @@ answered() {
     local title=$1
     shift
     await "$title appears" titled "$title"
-    xdotool windowactivate --sync "$(window "$title")" key --clearmodifiers "$@"
+    focus "$title" key --clearmodifiers "$@"
     await "$title goes" untitled "$title"
     xdotool windowactivate --sync "$main"
 }
@@ -46,7 +46,7 @@ xdotool key --clearmodifiers ctrl+p
 answered "^Ledger$" Return
 xdotool key --clearmodifiers F8
 await "the options appear" titled "^Ledger Options$"
-xdotool windowactivate --sync "$(window '^Ledger Options$')"
+focus '^Ledger Options$'
 xdotool type Penny
 answered "^Ledger Options$" Tab Down Return
 await "the dialog's answers arrive" holds "name Penny, currency 1"

@@ -50,13 +50,13 @@ xdotool key --clearmodifiers ctrl+s
 await "a click leaves a mark, Ctrl+S saves it" stored 14
 xdotool key --clearmodifiers F2
 await "F2 asks for the size" titled "^Size of the Marks$"
-xdotool windowactivate --sync "$(window '^Size of the Marks$')" key --clearmodifiers ctrl+a
+focus '^Size of the Marks$' key --clearmodifiers ctrl+a
 xdotool type 51
 xdotool key Return
 await "51 pixels are too many" titled "^Tarvex Marks$"
-xdotool windowactivate --sync "$(window '^Tarvex Marks$')" key Return
+focus '^Tarvex Marks$' key Return
 await "the reason goes" untitled "^Tarvex Marks$"
-xdotool windowactivate --sync "$(window '^Size of the Marks$')" key --clearmodifiers ctrl+a
+focus '^Size of the Marks$' key --clearmodifiers ctrl+a
 xdotool type 30
 xdotool key Return
 await "30 pixels are kept" kept 30
@@ -66,6 +66,6 @@ xdotool windowactivate --sync "$main"
 mark 180
 xdotool key --clearmodifiers alt+F4
 await "closing with changes asks" titled "^Tarvex Marks$"
-xdotool windowactivate --sync "$(window '^Tarvex Marks$')" key y
+focus '^Tarvex Marks$' key y
 await "Yes saves and ends" ended "$process"
 stored 26 || fail "both marks are in the file"
