@@ -472,13 +472,30 @@ bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& resu
     }
 }
 
+/// The time of the key that was watched last, in milliseconds of the display's clock.
+quint64 watchedLast = 0;
+
+/// Whether a press was watched when the toolkit asked for short-cuts. What that question led to, such as a command's
+/// dialog, may have heard of later keys since, and of this one's release.
+bool wasWatched(const QKeyEvent& press) {
+    return press.timestamp() != 0 && static_cast<qint32>(press.timestamp() - watchedLast) <= 0;
+}
+
 /// Keys are watched wherever they go: one released in a menu or a dialog of the toolkit's is not down any more.
 void watchKeys(const QEvent& event) {
-    if (!event.spontaneous() || (event.type() != QEvent::KeyPress && event.type() != QEvent::KeyRelease)) {
+    const bool asks = event.type() == QEvent::ShortcutOverride;
+    const bool release = event.type() == QEvent::KeyRelease;
+    if (!event.spontaneous() || (!asks && !release && event.type() != QEvent::KeyPress)) {
         return;
     }
     const auto& key = static_cast<const QKeyEvent&>(event);
-    const bool down = event.type() == QEvent::KeyPress;
+    if (!asks) {
+        noteTime(key);
+    }
+    if (event.type() == QEvent::KeyPress && wasWatched(key)) {
+        return;
+    }
+    watchedLast = key.timestamp();
     // The toolkit drops the release of a key whose press opened a modal dialog when it comes before that has the
     // keyboard, and a press in another program's window is never seen; later keys tell of modifiers.
     const bool isModifier = (key.key() >= Qt::Key_Shift && key.key() <= Qt::Key_Alt) || key.key() == Qt::Key_AltGr;
@@ -489,9 +506,8 @@ void watchKeys(const QEvent& event) {
             noteKey(modifier, key.modifiers().testFlag(flag));
         }
     }
-    noteTime(key);
-    if (down || !key.isAutoRepeat()) {
-        noteKey(virtualKey(key), down);
+    if (!release || !key.isAutoRepeat()) {
+        noteKey(virtualKey(key), !release);
     }
 }
 

@@ -60,6 +60,30 @@ TEST_F(Keys, TellOfModifiers) {
     QTest::keyPress(widget, Qt::Key_F8);
 }
 
+void sendKey(QWidget& receiver, QEvent::Type type, int key, Qt::KeyboardModifiers modifiers, quint64 time) {
+    QKeyEvent event(type, key, modifiers);
+    event.setTimestamp(time);
+    QSpontaneKeyEvent::setSpontaneous(&event);
+    QApplication::instance()->notify(&receiver, &event);
+}
+
+// The toolkit asks who takes a short-cut before it sends the press. A command's dialog is opened by that question, and
+// the press comes when the dialog is gone and the keys have been released long since.
+TEST_F(Keys, AreDownNoLongerWhenTheirPressComesLate) {
+    sendKey(*widget, QEvent::ShortcutOverride, Qt::Key_P, Qt::ControlModifier, 100);
+    EXPECT_TRUE(tvx::afx::isKeyDown(VK_CONTROL));
+    sendKey(*widget, QEvent::KeyRelease, Qt::Key_Control, Qt::ControlModifier, 200);
+    sendKey(*widget, QEvent::KeyRelease, Qt::Key_P, Qt::NoModifier, 210);
+    sendKey(*widget, QEvent::KeyPress, Qt::Key_P, Qt::ControlModifier, 100);
+    EXPECT_FALSE(tvx::afx::isKeyDown(VK_CONTROL));
+    EXPECT_FALSE(tvx::afx::isKeyDown('P'));
+    // Accelerators are looked for at the question already.
+    QTest::keyPress(widget, Qt::Key_P, Qt::ControlModifier);
+    sendKey(*widget, QEvent::ShortcutOverride, Qt::Key_F8, Qt::NoModifier, 300);
+    EXPECT_FALSE(tvx::afx::isKeyDown(VK_CONTROL));
+    sendKey(*widget, QEvent::KeyRelease, Qt::Key_F8, Qt::NoModifier, 301);
+}
+
 std::string nameOf(LONG parameter) {
     char name[50] = "";
     const int length = GetKeyNameText(parameter, name, sizeof(name));
