@@ -94,14 +94,22 @@ picture() {
     printf '<h2>%d. %s</h2>\n<p><img src="%s" alt="%s"></p>\n' "$number" "$2" "$file" "$2" >>"$work/index.html"
 }
 
-# drag X1 Y1 X2 Y2: in percent of the main window.
+# drag X1 Y1 X2 Y2: in percent of the main window. The release waits until the press has been seen to arrive: the display
+# loses one now and then that comes while the window manager still holds the press.
 drag() {
-    local X=0 Y=0 WIDTH=0 HEIGHT=0
+    local X=0 Y=0 WIDTH=0 HEIGHT=0 before end=$((SECONDS + limit))
     eval "$(xdotool getwindowgeometry --shell "$main" | grep -E '^(X|Y|WIDTH|HEIGHT)=')"
     at() { echo "$((X + WIDTH * $1 / 100)) $((Y + HEIGHT * $2 / 100))"; }
     # shellcheck disable=SC2046
-    xdotool mousemove $(at "$1" "$2") mousedown 1 mousemove $(at $((($1 + $3) / 2)) $((($2 + $4) / 2))) \
-        mousemove $(at "$3" "$4") mouseup 1
+    xdotool mousemove $(at "$1" "$2") mousedown 1
+    before=$(screen "$work/drag.png")
+    # shellcheck disable=SC2046
+    xdotool mousemove $(at $((($1 + $3) / 2)) $((($2 + $4) / 2)))
+    while [ "$(screen "$work/drag.png")" = "$before" ]; do
+        [ $SECONDS -lt $end ] || fail "nothing follows the mouse"
+    done
+    # shellcheck disable=SC2046
+    xdotool mousemove $(at "$3" "$4") mouseup 1
 }
 
 start "${drawings[@]}"
