@@ -237,10 +237,25 @@ void FrameMenuBar::initStyleOption(QStyleOptionMenuItem* option, const QAction* 
     }
 }
 
+/// The bar gives the keyboard back to the widget that it had it from. In an empty main frame no other one has it, or
+/// the view that went last: the bar would keep it, and all keys.
+void FrameMenuBar::lendKeyboard() {
+    const QWidget* holder = QApplication::focusWidget();
+    if (!holder || !holder->isVisible()) {
+        guarded([this] { window()->setFocus(); });
+    }
+}
+
+void FrameMenuBar::mousePressEvent(QMouseEvent* event) {
+    storing([this] { lendKeyboard(); });
+    QMenuBar::mousePressEvent(event);
+}
+
 bool FrameMenuBar::openByKey(char32_t key) {
     if (!isVisible()) {
         return false;
     }
+    lendKeyboard();
     if (key == 0) {
         // The toolkit gives the bar the keyboard when it sees Alt go down and up; both are taken from it by the
         // translation into messages.

@@ -61,9 +61,11 @@ public:
 
 protected:
     void initStyleOption(QStyleOptionMenuItem* option, const QAction* action) const override;
+    void mousePressEvent(QMouseEvent* event) override;
 
 private:
     void menuChanged(HMENU menu) override;
+    void lendKeyboard();
     void rebuild();
     void addEntry(const MenuItem& item, int index);
     HMENU m_menu = nullptr;

@@ -1,3 +1,4 @@
+#include "platform/afx/core/detail/MenuWidgets.h"
 #include "tests/ui/afx/frames/FrameTesting.h"
 
 #include <QMdiArea>
@@ -51,6 +52,23 @@ TEST_F(Mdi, NewChildrenBecomeActive) {
     EXPECT_NE(first->GetState()->widget()->pos(), second->GetState()->widget()->pos());
     EXPECT_EQ(second->GetParentFrame(), frame);
     EXPECT_EQ(second->GetTopLevelFrame(), frame);
+}
+
+// Without a child frame nothing else has the keyboard, which the menu bar borrows.
+TEST_F(Mdi, AnEmptyFramesMenuGivesTheKeyboardBack) {
+    open()->SendMessage(WM_CLOSE);
+    settle();
+    for (const bool byMouse : {false, true}) {
+        if (byMouse) {
+            ASSERT_NE(clickBar(*frame, "File"), nullptr);
+        } else {
+            key(Qt::Key_F, Qt::AltModifier);
+            ASSERT_NE(openMenu(), nullptr);
+        }
+        key(Qt::Key_Escape);
+        key(Qt::Key_Escape);
+        EXPECT_FALSE(tvx::afx::menuHasKeyboard()) << byMouse;
+    }
 }
 
 TEST_F(Mdi, ActivationBringsMenuFocusAndCommands) {
