@@ -32,6 +32,9 @@ Gui_Console::Gui_Console(int (*callback)(const char*), int) {
     }
     state.m_history = MakeRecord<Gui_ConsoleHistory>();
     state.m_recall = MakeRecord<Gui_ConsoleRecall>(*state.m_history);
+    if (state.m_keepsRecall) {
+        state.m_recall->SetEarlier(ReadRecallTexts());
+    }
     state.m_callback = callback;
     state.m_owner = this;
 }
@@ -128,6 +131,9 @@ int Gui_Console::AddStatusLine(const char* text) {
 
 void Gui_Console::SetKeepRecallFlag(int keep) {
     Gui_ConsoleState& state = ConsoleState();
+    if (state.m_keepsRecall == (keep ? 1 : 0)) {
+        return; // what is kept holds this process's commands, too, which are in the walk already
+    }
     state.m_keepsRecall = keep ? 1 : 0;
     if (!keep) {
         ForgetRecallTexts();

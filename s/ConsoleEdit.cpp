@@ -5,7 +5,6 @@
 #include "s/ConsoleState.h"
 #include "s/Msg.h"
 
-#include <algorithm>
 #include <string>
 
 namespace {

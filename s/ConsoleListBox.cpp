@@ -102,23 +102,10 @@ void Gui_ConsoleListBox::ScrollToEnd() {
     }
     CRect client;
     GetClientRect(&client);
-    const int top = GetTopIndex();
-    const int wanted = std::max(GetCount() - client.Height() / height, 0);
-    if (top < wanted) {
-        SetTopIndex(wanted);
-    }
     // All lines are of one height: from there on the last one is whole in sight.
-    if (GetTopIndex() >= wanted) {
-        return;
-    }
-    CRect last;
-    CRect before;
-    const int count = GetCount();
-    if (count < 2 || GetItemRect(count - 1, &last) == LB_ERR || GetItemRect(count - 2, &before) == LB_ERR) {
-        return;
-    }
-    if (last.bottom > client.bottom && before.top >= client.top && before.bottom <= client.bottom) {
-        SetTopIndex(top + 1);
+    const int wanted = std::max(GetCount() - client.Height() / height, 0);
+    if (GetTopIndex() < wanted) {
+        SetTopIndex(wanted);
     }
 }
 

@@ -91,6 +91,14 @@ protected:
     static CListBox& list() {
         return *static_cast<CListBox*>(view().GetDlgItem(GUI_IDC_CONSOLE_LINES));
     }
+    /// Whether the last line is whole in sight.
+    static bool showsEnd() {
+        CRect last;
+        CRect client;
+        list().GetItemRect(list().GetCount() - 1, &last);
+        list().GetClientRect(&client);
+        return last.top >= 0 && last.bottom <= client.bottom;
+    }
     static CEdit& field() {
         return *static_cast<CEdit*>(view().GetDlgItem(GUI_IDC_CONSOLE_INPUT));
     }
@@ -371,13 +379,6 @@ TEST_F(Console, KeepsTheEndInSight) {
         console->AddCommand("command");
     }
     open();
-    const auto showsEnd = [] {
-        CRect last;
-        CRect client;
-        list().GetItemRect(list().GetCount() - 1, &last);
-        list().GetClientRect(&client);
-        return last.top >= 0 && last.bottom <= client.bottom;
-    };
     EXPECT_TRUE(showsEnd());
     list().SetTopIndex(0);
     console->AddCommand("one more");
@@ -387,6 +388,21 @@ TEST_F(Console, KeepsTheEndInSight) {
     EXPECT_GT(list().GetHorizontalExtent(), 2 * width);
     console->AddCommand("short");
     EXPECT_GT(list().GetHorizontalExtent(), 2 * width) << "it only grows";
+}
+
+// The bar comes up with the long line.
+TEST_F(Console, KeepsTheEndAboveTheBarForLongLines) {
+    for (int i = 0; i < 60; ++i) {
+        console->AddCommand("command");
+    }
+    console->AddStatusLine(std::string(200, 'w').c_str());
+    open();
+    CWnd& box = *view().GetDlgItem(GUI_IDC_CONSOLE_SHOW_STATUS);
+    for (const int shown : {1, 0, 1}) {
+        box.SendMessage(BM_CLICK);
+        QTest::qWait(0);
+        EXPECT_TRUE(showsEnd()) << shown;
+    }
 }
 
 // --- what is selected ---
@@ -598,11 +614,16 @@ TEST_F(Console, KeepsRecallTextsOverRestartsWhenTheHostSaysSo) {
     enter(odd);
     enter("list");
     enter("list");
+    console->SetKeepRecallFlag(1); // which it is
+    for (const std::string& older : {std::string("list"), odd, std::string("before"), std::string("before")}) {
+        key(Qt::Key_Up);
+        EXPECT_EQ(older, typed()) << "each command once";
+    }
+    field().SetWindowText("");
     execute = [](const std::string&) { return 0; };
     enter("wrong");
     console->Close();
     makeConsole();
-    console->SetKeepRecallFlag(1);
     open();
     EXPECT_EQ(0, list().GetCount()) << "texts, not lines";
     key(Qt::Key_Up);

@@ -10,6 +10,7 @@
 
 #include <QAbstractScrollArea>
 #include <QAccessible>
+#include <QCoreApplication>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
@@ -209,6 +210,23 @@ void ListBoxWindow::applyRange() {
         horizontal->setSingleStep(10);
         horizontal->setRange(0, std::max(m_extent - width, 0));
     });
+    showBars();
+}
+
+/// The toolkit shows and hides bars when the loop comes to it. Who scrolls to a line before that must not be told of
+/// room that a bar takes.
+void ListBoxWindow::showBars() {
+    const auto isLate = [](const QScrollBar* bar, Qt::ScrollBarPolicy policy) {
+        return policy == Qt::ScrollBarAsNeeded && bar->parentWidget()->isHidden() == (bar->maximum() > 0);
+    };
+    if (m_showsBars || (!isLate(m_area->horizontalScrollBar(), m_area->horizontalScrollBarPolicy()) &&
+                        !isLate(m_area->verticalScrollBar(), m_area->verticalScrollBarPolicy()))) {
+        return;
+    }
+    m_showsBars = true;
+    QEvent request(QEvent::LayoutRequest);
+    guarded([&] { QCoreApplication::sendEvent(m_area, &request); });
+    m_showsBars = false;
 }
 
 /// Has all of it painted when the loop comes to it. Asked for again before that costs nothing.
@@ -237,7 +255,7 @@ void ListBoxWindow::lineAdded() {
         m_rangeIsSmall = true;
         // The widget lives a little longer than the list.
         const auto apply = [self = handle()] {
-            if (auto* list = static_cast<ListBoxWindow*>(from(self))) {
+            if (auto* list = dynamic_cast<ListBoxWindow*>(from(self))) {
                 storing([list] { list->applyRange(); });
             }
         };

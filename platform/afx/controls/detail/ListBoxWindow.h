@@ -71,6 +71,7 @@ private:
     }
     void applyBars();
     void measure();
+    void showBars();
     void lineAdded();
     void setRedraw(bool redraw);
     void contentChanged();
@@ -107,6 +108,7 @@ private:
     bool m_frozen = false;       ///< Nothing is painted until the program says so.
     bool m_repaintDue = false;   ///< The toolkit has been told that all must be painted.
     bool m_rangeIsSmall = false; ///< The bar does not count the last lines yet.
+    bool m_showsBars = false;    ///< The toolkit is at it.
     int m_laterTop = -1;         ///< What is to be the first line once it does; -1 for the one that is.
     int m_current = -1;          ///< the selected line of a single selection
     int m_caret = -1;

@@ -30,3 +30,21 @@ protected:
     Control control;
     const CRect place{10, 10, 210, 110};
 };
+
+/// The same for a list box.
+template <class List>
+class ListTest : public ControlTest<List> {
+protected:
+    /// A point in the middle of a line.
+    QPoint middle(int index) const {
+        CRect rect;
+        this->control.GetItemRect(index, &rect);
+        return {20, rect.CenterPoint().y};
+    }
+    /// The selected lines of a list with several.
+    std::vector<int> selected() const {
+        std::vector<int> indices(static_cast<std::size_t>(this->control.GetCount()));
+        indices.resize(static_cast<std::size_t>(this->control.GetSelItems(this->control.GetCount(), indices.data())));
+        return indices;
+    }
+};

@@ -250,23 +250,13 @@ TEST(CommandField, IsOneLineThatEnterDoesNotEnd) {
 
 // --- list box ---
 
-class ListBoxTest : public ControlTest<CListBox> {
+class ListBoxTest : public ListTest<CListBox> {
 protected:
     void make(DWORD style) override {
         ASSERT_TRUE(control.Create(shown | WS_BORDER | WS_VSCROLL | LBS_NOTIFY | style, place, &dialog, controlId));
         for (const char* line : lines) {
             control.AddString(line);
         }
-    }
-    QPoint middle(int index) const {
-        CRect rect;
-        control.GetItemRect(index, &rect);
-        return {20, rect.CenterPoint().y};
-    }
-    std::vector<int> selected() const {
-        std::vector<int> indices(static_cast<std::size_t>(control.GetCount()));
-        indices.resize(static_cast<std::size_t>(control.GetSelItems(control.GetCount(), indices.data())));
-        return indices;
     }
     std::vector<const char*> lines{"pear", "Apple", "fig", "apricot", "Zebra"};
 };

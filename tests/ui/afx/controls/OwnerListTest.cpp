@@ -37,23 +37,13 @@ protected:
     }
 };
 
-class OwnerList : public ControlTest<Log> {
+class OwnerList : public ListTest<Log> {
 protected:
     void make(DWORD style) override {
         ASSERT_TRUE(control.Create(shown | WS_BORDER | WS_VSCROLL | WS_HSCROLL | LBS_NOTIFY | LBS_OWNERDRAWFIXED |
                                        LBS_EXTENDEDSEL | style,
                                    place, &dialog, controlId));
         control.fill();
-    }
-    QPoint middle(int index) const {
-        CRect rect;
-        control.GetItemRect(index, &rect);
-        return {20, rect.CenterPoint().y};
-    }
-    std::vector<int> selected() const {
-        std::vector<int> indices(static_cast<std::size_t>(control.GetCount()));
-        indices.resize(static_cast<std::size_t>(control.GetSelItems(control.GetCount(), indices.data())));
-        return indices;
     }
     using Lines = std::vector<int>;
 };
