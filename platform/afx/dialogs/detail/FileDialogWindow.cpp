@@ -16,6 +16,7 @@
 #include <QScreen>
 #include <QTreeView>
 
+#include <algorithm>
 #include <cstring>
 
 namespace tvx::afx {
@@ -69,16 +70,20 @@ QString livingFolder(QString folder) {
 
 } // namespace
 
+/// The patterns of a text that separates them by ";" or blanks. What old patterns mean by all files is all files.
+QStringList patternsOf(QString text) {
+    QStringList patterns = text.replace(QLatin1Char(';'), QLatin1Char(' ')).split(QLatin1Char(' '), Qt::SkipEmptyParts);
+    std::ranges::replace(patterns, QStringLiteral("*.*"), QStringLiteral("*"));
+    return patterns;
+}
+
 std::vector<FileFilter> filtersOf(LPCSTR text) {
     std::vector<FileFilter> filters;
     while (text && *text != '\0') {
         const QString description = toQt(text);
         text += std::strlen(text) + 1;
-        QString patterns = toQt(text).replace(QLatin1Char(';'), QLatin1Char(' ')).simplified();
+        const QString patterns = patternsOf(toQt(text)).join(QLatin1Char(' '));
         text += std::strlen(text) + 1;
-        if (patterns == QLatin1String("*.*")) {
-            patterns = QStringLiteral("*");
-        }
         const QString name = withoutPatterns(description);
         filters.push_back(
             {QStringLiteral("%1 (%2)").arg(name.isEmpty() ? description : name, patterns), extensionOf(patterns)});
@@ -308,7 +313,7 @@ bool FileDialogWindow::goElsewhere(const QString& text, const QStringList& names
     }
     const bool isPattern = text.contains(QLatin1Char('*')) || text.contains(QLatin1Char('?'));
     if (names.size() == 1 && isPattern && !QFileInfo::exists(names.front())) {
-        findChild<QFileSystemModel*>()->setNameFilters(text.split(QLatin1Char(';')));
+        findChild<QFileSystemModel*>()->setNameFilters(patternsOf(text));
         m_field->selectAll();
         return true;
     }

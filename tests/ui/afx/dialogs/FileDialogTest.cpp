@@ -222,7 +222,7 @@ TEST_F(FileDialogs, EqualFiltersAreToldApartByTheirPlaces) {
 }
 
 TEST_F(FileDialogs, PatternsAreWithoutRegardToCase) {
-    for (const char* name : {"a.brd", "b.Brd", "c.nts"}) {
+    for (const char* name : {"a.brd", "b.Brd", "c.nts", "README"}) {
         write(file(name), "x");
     }
     const std::string folder = file("").string();
@@ -230,7 +230,16 @@ TEST_F(FileDialogs, PatternsAreWithoutRegardToCase) {
     dialog.m_ofn.lpstrInitialDir = folder.c_str();
     later([] {
         auto* list = shownDialog()->findChild<QTreeView*>("treeView");
-        EXPECT_TRUE(QTest::qWaitFor([&] { return list->model()->rowCount(list->rootIndex()) == 2; }));
+        const auto shows = [&](int rows) {
+            return QTest::qWaitFor([&] { return list->model()->rowCount(list->rootIndex()) == rows; });
+        };
+        EXPECT_TRUE(shows(2));
+        auto* field = shownDialog()->findChild<QLineEdit*>("fileNameEdit");
+        for (const auto& [typed, rows] : {std::pair("*.nts; *.brd", 3), {"*.*", 4}, {"?.nts", 1}}) {
+            field->setText(typed);
+            QTest::keyClick(field, Qt::Key_Return);
+            EXPECT_TRUE(shows(rows)) << typed;
+        }
         QTest::keyClick(shownDialog(), Qt::Key_Escape);
     });
     dialog.DoModal();
