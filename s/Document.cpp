@@ -3,9 +3,7 @@
 #include "platform/base/SystemPath.h"
 
 #include <cerrno>
-#include <filesystem>
 #include <memory>
-#include <system_error>
 
 IMPLEMENT_DYNCREATE(Gui_Document, CDocument)
 
@@ -13,8 +11,7 @@ BEGIN_MESSAGE_MAP(Gui_Document, CDocument)
 END_MESSAGE_MAP()
 
 CFile* Gui_Document::GetFile(const char* fileName, unsigned int openFlags, CFileException* error) {
-    std::error_code unknown;
-    if (std::filesystem::is_fifo(tvx::systemPath(fileName).value_or(""), unknown)) {
+    if (tvx::isNamedPipe(fileName ? fileName : "")) {
         if (error) {
             error->m_cause = CFileException::genericException;
             error->m_lOsError = ESPIPE;

@@ -216,6 +216,11 @@ std::optional<std::string> systemPath(std::string_view name, PathUse use) {
     return location ? std::optional(std::move(location->path)) : std::nullopt;
 }
 
+bool isNamedPipe(std::string_view name) {
+    std::error_code unknown;
+    return std::filesystem::is_fifo(systemPath(name).value_or(""), unknown);
+}
+
 std::string driveName(std::string_view path) {
     std::string name(path);
     if (path.find('\\') != std::string_view::npos) {

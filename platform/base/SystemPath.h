@@ -65,6 +65,9 @@ enum class PathUse {
 /// when it has been removed.
 [[nodiscard]] TVX_PLATFORM_API std::string currentFolderName();
 
+/// Whether a name is that of a named pipe. To open one is to wait for its other end.
+[[nodiscard]] TVX_PLATFORM_API bool isNamedPipe(std::string_view name);
+
 /// Whether a name begins with a drive, such as "C:".
 [[nodiscard]] TVX_PLATFORM_API bool hasDrive(std::string_view name) noexcept;
 

@@ -40,6 +40,7 @@ TEST(Document, OpensTheNamedFileItself) {
     EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, &error), nullptr);
     EXPECT_EQ(error.m_cause, CFileException::fileNotFound);
     EXPECT_EQ(plan.GetFile("missing.txt", CFile::modeRead, nullptr), nullptr);
+    EXPECT_EQ(plan.GetFile(nullptr, CFile::modeRead, nullptr), nullptr);
 
     ASSERT_EQ(::mkfifo("pipe", 0600), 0);
     EXPECT_EQ(plan.GetFile("pipe", CFile::modeRead, &error), nullptr) << "and does not wait";

@@ -81,12 +81,6 @@ bool fail(CFileException* error, int number, LPCTSTR fileName) {
     return false;
 }
 
-bool isPipe(LPCTSTR fileName) {
-    struct stat status{};
-    const auto path = systemPath(fileName ? fileName : "");
-    return path && ::stat(path->c_str(), &status) == 0 && S_ISFIFO(status.st_mode);
-}
-
 } // namespace
 
 MirrorFile::~MirrorFile() {
@@ -106,7 +100,7 @@ void MirrorFile::forget() {
 
 BOOL MirrorFile::Open(LPCTSTR fileName, UINT openFlags, CFileException* error) {
     forget();
-    if (isPipe(fileName)) {
+    if (isNamedPipe(fileName ? fileName : "")) {
         fail(error, ESPIPE, fileName);
         return FALSE;
     }
