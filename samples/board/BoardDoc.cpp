@@ -6,6 +6,7 @@
 
 #include <string>
 #include <utility>
+#include <vector>
 
 namespace {
 
@@ -24,7 +25,8 @@ CString shown(std::string word) {
     return word.c_str();
 }
 
-CBoardDoc* current = nullptr;
+/// The drawings that were worked with, the last one at the end.
+std::vector<CBoardDoc*> used;
 
 } // namespace
 
@@ -40,17 +42,16 @@ END_MESSAGE_MAP()
 // clang-format on
 
 CBoardDoc::~CBoardDoc() {
-    if (current == this) {
-        current = nullptr;
-    }
+    std::erase(used, this);
 }
 
 CBoardDoc* CBoardDoc::GetCurrent() {
-    return current;
+    return used.empty() ? nullptr : used.back();
 }
 
 void CBoardDoc::MakeCurrent() {
-    current = this;
+    std::erase(used, this);
+    used.push_back(this);
 }
 
 CString CBoardDoc::Sentence(const board::ReadResult& result) {

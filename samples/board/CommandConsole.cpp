@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <charconv>
 #include <iterator>
+#include <utility>
 
 using board::Change;
 using board::Drawing;
@@ -49,6 +50,22 @@ CString Reason(const CException& problem) {
     problem.GetErrorMessage(reason, sizeof(reason));
     return reason;
 }
+
+/// Gives a variable another value as long as this lives, also when the host throws.
+template <class Value>
+class Restored {
+public:
+    Restored(Value& place, Value now) : m_place(place), m_before(std::exchange(place, std::move(now))) {}
+    ~Restored() {
+        m_place = std::move(m_before);
+    }
+    Restored(const Restored&) = delete;
+    Restored& operator=(const Restored&) = delete;
+
+private:
+    Value& m_place;
+    Value m_before;
+};
 
 CString ShownName(const CString& path) {
     return tvx::shownName(path.GetString()).c_str();
@@ -107,10 +124,8 @@ bool CCommandConsole::Execute(const CString& text) {
         Report(IDS_COMMAND_NO_DRAWING);
         return false;
     }
-    const Command* const outer = std::exchange(m_running, command);
-    const bool done = (this->*command->run)(words);
-    m_running = outer;
-    return done;
+    const Restored<const Command*> running(m_running, command);
+    return (this->*command->run)(words);
 }
 
 // --- files ---
@@ -119,8 +134,14 @@ bool CCommandConsole::OnNew(const CString& words) {
     if (!words.IsEmpty()) {
         return Expected();
     }
+    const CBoardDoc* const before = CBoardDoc::GetCurrent();
     theApp.OnFileNew();
-    Report(IDS_COMMAND_NEW_DONE, CBoardDoc::GetCurrent()->GetTitle());
+    const CBoardDoc* const drawing = CBoardDoc::GetCurrent();
+    if (!drawing || drawing == before) {
+        Report(IDS_COMMAND_NO_DRAWING);
+        return false;
+    }
+    Report(IDS_COMMAND_NEW_DONE, drawing->GetTitle());
     return true;
 }
 
@@ -149,7 +170,7 @@ bool CCommandConsole::OnSave(const CString& words) {
             name.SetExtension("brd");
         }
         const CString chosen = name.GetFullName();
-        if (name.Exists() && chosen.CompareNoCase(path) != 0) {
+        if (name.Exists() && tvx::systemPath(chosen.View()) != tvx::systemPath(path.View())) {
             Report(IDS_COMMAND_FILE_EXISTS, ShownName(chosen));
             return false;
         }
@@ -229,38 +250,31 @@ int CCommandConsole::ShapeNumber(const CString& words) {
     return -1;
 }
 
-bool CCommandConsole::OnDelete(const CString& words) {
+bool CCommandConsole::ChangeShape(const CString& words, UINT doneId, Change (*change)(const Drawing&, int)) {
     const int number = ShapeNumber(words);
     if (number == -1) {
         return false;
     }
     CBoardDoc& document = *CBoardDoc::GetCurrent();
-    document.Change(Change::deletion(document.GetDrawing(), number));
-    Report(IDS_COMMAND_DELETE_DONE, words);
+    document.Change(change(document.GetDrawing(), number));
+    Report(doneId, words);
     return true;
+}
+
+bool CCommandConsole::OnDelete(const CString& words) {
+    return ChangeShape(words, IDS_COMMAND_DELETE_DONE,
+                       [](const Drawing& drawing, int number) { return Change::deletion(drawing, number); });
 }
 
 bool CCommandConsole::OnFront(const CString& words) {
-    const int number = ShapeNumber(words);
-    if (number == -1) {
-        return false;
-    }
-    CBoardDoc& document = *CBoardDoc::GetCurrent();
-    const auto last = static_cast<int>(document.GetDrawing().shapes.size()) - 1;
-    document.Change(Change::move(document.GetDrawing(), number, last));
-    Report(IDS_COMMAND_FRONT_DONE, words);
-    return true;
+    return ChangeShape(words, IDS_COMMAND_FRONT_DONE, [](const Drawing& drawing, int number) {
+        return Change::move(drawing, number, static_cast<int>(drawing.shapes.size()) - 1);
+    });
 }
 
 bool CCommandConsole::OnBack(const CString& words) {
-    const int number = ShapeNumber(words);
-    if (number == -1) {
-        return false;
-    }
-    CBoardDoc& document = *CBoardDoc::GetCurrent();
-    document.Change(Change::move(document.GetDrawing(), number, 0));
-    Report(IDS_COMMAND_BACK_DONE, words);
-    return true;
+    return ChangeShape(words, IDS_COMMAND_BACK_DONE,
+                       [](const Drawing& drawing, int number) { return Change::move(drawing, number, 0); });
 }
 
 bool CCommandConsole::OnUndo(const CString& words) {
@@ -352,10 +366,10 @@ bool CCommandConsole::OnRun(const CString& words) {
         Report(IDS_COMMAND_SCRIPT_RUNS, ShownName(path));
         return false;
     }
-    m_scripts.push_back(path);
-    const bool done = ExecuteFile(path);
-    m_scripts.pop_back();
-    return done;
+    std::vector<CString> scripts = m_scripts;
+    scripts.push_back(path);
+    const Restored<std::vector<CString>> running(m_scripts, std::move(scripts));
+    return ExecuteFile(path);
 }
 
 bool CCommandConsole::ExecuteFile(const CString& path) {

@@ -49,6 +49,8 @@ private:
 
     /// The number of a shape as `list` shows it, less 1; -1 after it was told that there is none.
     int ShapeNumber(const CString& words);
+    /// Changes the shape with the number that the words are, and reports it.
+    bool ChangeShape(const CString& words, UINT doneId, board::Change (*change)(const board::Drawing&, int));
     bool SetGrid(const CString& value);
     bool SetFlag(const CString& value, void (CCommandConsole::*set)(bool));
     void ShowStatus(bool show);

@@ -37,16 +37,20 @@ Gui_AccelMap ownKeys() {
     return map;
 }
 
-/// The keys whose commands a menu has. The others must stay free for what is typed: the main window's table is in force
-/// in the console, too, where Delete is no command.
-Gui_AccelMap keysOf(HMENU menu, const Gui_AccelMap& map) {
+/// The keys of a menu: all but those whose commands only the other menu has. These must stay free for what is typed:
+/// the main window's table is in force in the console, too, where Delete is no command. What neither has now, such as a
+/// file of a list that is filled when the menu opens, may come to either.
+Gui_AccelMap keysOf(HMENU menu, HMENU other, const Gui_AccelMap& map) {
+    const auto has = [](HMENU one, UINT command) {
+        return GetMenuState(one, command, MF_BYCOMMAND) != static_cast<UINT>(-1);
+    };
     Gui_AccelMap keys(map);
     int count = 0;
     tagACCEL* table = nullptr;
     map.GetAll(count, table);
     const std::unique_ptr<tagACCEL[]> owner(table);
     for (int i = 0; i < count; ++i) {
-        if (GetMenuState(menu, table[i].cmd, MF_BYCOMMAND) == static_cast<UINT>(-1)) {
+        if (!has(menu, table[i].cmd) && has(other, table[i].cmd)) {
             keys.Remove(Gui_Accel(table[i]));
         }
     }
@@ -54,8 +58,8 @@ Gui_AccelMap keysOf(HMENU menu, const Gui_AccelMap& map) {
 }
 
 /// Puts keys in force: in a table, which takes the place of the former one, and in the menu that belongs to it.
-void replace(HACCEL& accelerators, HMENU menu, const Gui_AccelMap& map) {
-    const Gui_AccelMap keys = keysOf(menu, map);
+void replace(HACCEL& accelerators, HMENU menu, HMENU other, const Gui_AccelMap& map) {
+    const Gui_AccelMap keys = keysOf(menu, other, map);
     DestroyAcceleratorTable(accelerators);
     accelerators = keys.CreateTable();
     keys.AnnotateMenu(CMenu::FromHandle(menu));
@@ -86,8 +90,8 @@ void CKeyboard::Edit() {
 }
 
 void CKeyboard::apply(const Gui_AccelMap& map) {
-    replace(m_main.m_hAccelTable, m_main.m_hMenuDefault, map);
-    replace(m_drawings.m_hAccelTable, m_drawings.m_hMenuShared, map);
+    replace(m_main.m_hAccelTable, m_main.m_hMenuDefault, m_drawings.m_hMenuShared, map);
+    replace(m_drawings.m_hAccelTable, m_drawings.m_hMenuShared, m_main.m_hMenuDefault, map);
     // Open drawings have the handles that the template had; later ones take those that it has now.
     for (POSITION at = m_drawings.GetFirstDocPosition(); at;) {
         const CDocument* document = m_drawings.GetNextDoc(at);

@@ -56,6 +56,11 @@ enter "new"
 enter "draw line 5 6 7 8"
 enter "save $work/c.brd"
 await "the keyboard stays in the console when a drawing is begun" test -s "$work/c.brd"
+enter "close"
+enter "draw ellipse 1 2 3 4"
+enter "save $work/d.brd"
+await "the drawing before is worked with again" test -s "$work/d.brd"
+shapes "$work/d.brd" ellipse 2 || fail "it is the second drawing"
 enter "draw nothing"
 press Escape
 press alt+F4

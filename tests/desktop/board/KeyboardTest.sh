@@ -56,7 +56,8 @@ titled "^Commands$" && fail "the palette has no key any more"
 press ctrl+n
 runs "the key works in a later drawing" F7
 press ctrl+F4 ctrl+F4
-runs "the key works without a drawing" F7
+press alt+f Escape Escape
+runs "the key works without a drawing, after a menu" F7
 press alt+t
 press c
 xdotool type --clearmodifiers "xnew"
@@ -64,10 +65,20 @@ press Home Delete Return
 xdotool type --clearmodifiers "save $work/typed.brd"
 press Return
 await "Delete is no command in the console" test -s "$work/typed.brd"
+xdotool type --clearmodifiers "save $work/other.brd"
+press Return
+await "there are two recent files" test -s "$work/other.brd"
+press alt+f Escape Escape
+keyboard
+filter "typed.brd"
+press alt+s F8 F8 space alt+c
+accept
 press alt+F4
 await "the application ends" ended "$process"
 
 start
+press F8
+await "a recent file has a key after a restart" titled "typed.brd - Tarvex Board"
 runs "the key works after a restart" F7
 runs "the removed key stays removed" ctrl+alt+p F7
 press alt+t
