@@ -176,26 +176,14 @@ void repaintsAlone(benchmark::State& state) {
     console.Close();
 }
 
-void recall(benchmark::State& state) {
+void recall(benchmark::State& state, const char* first, const std::string& request) {
     Gui_ConsoleHistory history;
-    history.AddCommand("open first");
+    history.AddCommand(first);
     for (const std::string& line : lines()) {
         history.AddCommand(line.c_str());
     }
     for (auto _ : state) {
-        benchmark::DoNotOptimize(history.Resolve("!open"));
-    }
-}
-
-/// The pattern shares its first eight characters with every command.
-void recallOfAlike(benchmark::State& state) {
-    Gui_ConsoleHistory history;
-    history.AddCommand("run parts");
-    for (const std::string& line : lines()) {
-        history.AddCommand(line.c_str());
-    }
-    for (auto _ : state) {
-        benchmark::DoNotOptimize(history.Resolve("!run parts"));
+        benchmark::DoNotOptimize(history.Resolve(request.c_str()));
     }
 }
 
@@ -216,9 +204,10 @@ BENCHMARK_CAPTURE(viewFilled, measured, Widths::Measured)->Unit(benchmark::kMill
 BENCHMARK_CAPTURE(viewFilled, plain, Widths::Ignored)->Unit(benchmark::kMillisecond)->MinTime(2);
 BENCHMARK(consoleFlooded)->Unit(benchmark::kMillisecond)->Iterations(2);
 BENCHMARK(repaintsAlone)->Unit(benchmark::kMillisecond)->Iterations(2);
-BENCHMARK(recall)->Unit(benchmark::kMicrosecond);
+BENCHMARK_CAPTURE(recall, different, "open first", "!open")->Unit(benchmark::kMicrosecond);
 BENCHMARK_CAPTURE(readlineRecall, different, "open first", "open")->Unit(benchmark::kMicrosecond);
-BENCHMARK(recallOfAlike)->Unit(benchmark::kMicrosecond);
+// The pattern shares its first eight characters with every command.
+BENCHMARK_CAPTURE(recall, alike, "run parts", "!run parts")->Unit(benchmark::kMicrosecond);
 BENCHMARK_CAPTURE(readlineRecall, alike, "run parts", "run parts")->Unit(benchmark::kMicrosecond);
 
 } // namespace

@@ -3,14 +3,6 @@
 #include "afxwin.h"
 #include "s/Export.h"
 
-/// Compares all three fields of two accelerators.
-inline bool operator==(const tagACCEL& first, const tagACCEL& second) {
-    return first.fVirt == second.fVirt && first.key == second.key && first.cmd == second.cmd;
-}
-inline bool operator!=(const tagACCEL& first, const tagACCEL& second) {
-    return !(first == second);
-}
-
 /// A keyboard accelerator: a key with its modifiers, and the command that it stands for.
 ///
 /// @code
@@ -32,6 +24,10 @@ public:
     Gui_Accel(const tagACCEL* accel) : tagACCEL(*accel) {}
 
     Gui_Accel& operator=(const tagACCEL& accel);
+    /// Compares all three fields; one side may be a tagACCEL.
+    friend bool operator==(const Gui_Accel& first, const Gui_Accel& second) {
+        return first.fVirt == second.fVirt && first.key == second.key && first.cmd == second.cmd;
+    }
     /// Whether all fields are 0: 1 or 0.
     int IsEmpty() const;
     /// Sets all fields to 0.

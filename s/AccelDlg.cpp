@@ -5,6 +5,7 @@
 #include "s/MenuStr.h"
 #include "s/Msg.h"
 #include "s/Record.h"
+#include "s/StringOf.h"
 
 #include <algorithm>
 
@@ -24,17 +25,12 @@ BEGIN_MESSAGE_MAP(Gui_AccelDlg, CDialog)
 END_MESSAGE_MAP()
 // clang-format on
 
-namespace {
-
-/// A button that gets disabled must not keep the keyboard.
-void enable(CWnd& button, bool on, CWnd& heir) {
+void EnableButton(CWnd& button, bool on, CWnd& heir) {
     if (!on && CWnd::GetFocus() == &button) {
         heir.SetFocus();
     }
     button.EnableWindow(on ? TRUE : FALSE);
 }
-
-} // namespace
 
 CString KeyMessage(UINT id, const CString& key, const CString& owner) {
     Gui_Msg text(id);
@@ -164,7 +160,7 @@ void Gui_AccelDlg::describeKey() {
     const Gui_Accel key = AccelOf(m_record->hotKey);
     if (key.IsEmpty()) {
         SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, StringOf(GUI_IDS_KEY_BEGIN));
-        enable(m_record->assign, false, m_record->specify);
+        EnableButton(m_record->assign, false, m_record->specify);
     } else {
         SetDlgItemText(GUI_IDC_ACCEL_KEY_TEXT, m_record->ownerText(key));
     }
@@ -172,7 +168,7 @@ void Gui_AccelDlg::describeKey() {
 
 void Gui_AccelDlg::refreshKeyState() {
     describeKey();
-    enable(m_record->assign, !m_record->typedAccel().IsEmpty(), m_record->specify);
+    EnableButton(m_record->assign, !m_record->typedAccel().IsEmpty(), m_record->specify);
 }
 
 void Gui_AccelDlg::fillKeys() {
@@ -206,7 +202,7 @@ void Gui_AccelDlg::OnSelchangeCommandlist() {
 }
 
 void Gui_AccelDlg::OnSelchangeCurrentkeylist() {
-    enable(m_record->remove, m_record->keyList.GetCurSel() >= 0, m_record->keyList);
+    EnableButton(m_record->remove, m_record->keyList.GetCurSel() >= 0, m_record->keyList);
 }
 
 void Gui_AccelDlg::OnSpecifybutton() {

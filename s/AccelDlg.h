@@ -72,7 +72,6 @@ private:
     void showCommand();
     void select(int command);
     void changed(const CString& note);
-    void enableButton(int id, bool on);
     void restore(const Gui_AccelMap& map);
     void showFindField(bool show);
     void findKey(const Gui_Accel& pressed);

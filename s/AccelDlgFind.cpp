@@ -5,9 +5,9 @@
 #include "s/CommandFilter.h"
 #include "s/KeyIndex.h"
 #include "s/KeyTexts.h"
+#include "s/StringOf.h"
 
 #include <algorithm>
-#include <memory>
 
 // Finding commands, and ways back.
 
@@ -69,8 +69,7 @@ void Gui_AccelDlg::OnChangeFilter() {
 void Gui_AccelDlg::select(int command) {
     Record& record = *m_record;
     if (std::find(record.shown.begin(), record.shown.end(), command) == record.shown.end()) {
-        record.filter.SetWindowText("");
-        fillCommands();
+        record.filter.SetWindowText(""); // which fills the list
     }
     const auto found = std::find(record.shown.begin(), record.shown.end(), command);
     record.commandList.SetCurSel(static_cast<int>(found - record.shown.begin()));
@@ -88,25 +87,18 @@ Gui_Accel ownerOf(const Gui_AccelMap& map, Gui_Accel pressed) {
     if (map.GetCmdAt(pressed, pressed.cmd)) {
         return pressed;
     }
-    int count = 0;
-    tagACCEL* table = nullptr;
-    map.GetAll(count, table);
-    const std::unique_ptr<tagACCEL[]> owner(table);
     const CString name = pressed.GetKeyText();
-    const auto* found = std::find_if(table, table + count, [&name](const tagACCEL& accel) {
-        return (accel.fVirt & FVIRTKEY) == 0 && Gui_Accel(accel).GetKeyText().CompareNoCase(name) == 0;
+    const std::vector<Gui_Accel> all = AccelsOf(map);
+    const auto found = std::find_if(all.begin(), all.end(), [&name](const Gui_Accel& accel) {
+        return (accel.fVirt & FVIRTKEY) == 0 && accel.GetKeyText().CompareNoCase(name) == 0;
     });
-    return found != table + count ? Gui_Accel(*found) : Gui_Accel();
+    return found != all.end() ? *found : Gui_Accel();
 }
 
 } // namespace
 
 void Gui_AccelDlg::OnFindKey() {
-    CString text;
-    if (!m_record->finding) {
-        text.LoadString(GUI_IDS_KEY_FIND);
-    }
-    setNote(text);
+    setNote(m_record->finding ? CString() : StringOf(GUI_IDS_KEY_FIND));
     showFindField(!m_record->finding);
 }
 
@@ -139,9 +131,9 @@ BOOL Gui_AccelDlg::PreTranslateMessage(MSG* message) {
         message->hwnd != button) {
         OnFindKey();
     }
-    const bool isPress = message->message == WM_KEYDOWN;
     // Enter goes on to what was found, where a dialog would end.
-    const bool goesDown = isPress && (message->wParam == VK_RETURN || message->wParam == VK_DOWN);
+    const bool goesDown =
+        message->message == WM_KEYDOWN && (message->wParam == VK_RETURN || message->wParam == VK_DOWN);
     if (goesDown && GetFocus() == &m_record->filter) {
         if (!m_record->shown.empty()) {
             select(m_record->selected().value_or(m_record->shown.front()));
@@ -154,12 +146,12 @@ BOOL Gui_AccelDlg::PreTranslateMessage(MSG* message) {
 void Gui_AccelDlg::findKey(const Gui_Accel& pressed) {
     Record& record = *m_record;
     const Gui_Accel owner = ownerOf(record.map, pressed);
-    const auto found = std::find_if(record.commands.begin(), record.commands.end(),
-                                    [&owner](const MenuCommand& command) { return command.id == owner.cmd; });
     if (owner.IsEmpty()) {
         setNote(record.ownerText(pressed));
         return;
     }
+    const auto found = std::find_if(record.commands.begin(), record.commands.end(),
+                                    [&owner](const MenuCommand& command) { return command.id == owner.cmd; });
     setNote(KeyMessage(GUI_IDS_KEY_ASSIGNED, owner.GetKeyText(), record.nameOf(owner.cmd)));
     if (found == record.commands.end()) {
         return;
@@ -178,17 +170,8 @@ void Gui_AccelDlg::setNote(const CString& text) {
 void Gui_AccelDlg::changed(const CString& note) {
     m_record->filterTexts.clear();
     setNote(note);
-    enableButton(GUI_IDC_ACCEL_UNDO, !m_record->before.empty());
-    enableButton(GUI_IDC_ACCEL_RESET, !m_record->map.IsSame(m_record->resetTo));
-}
-
-/// The keyboard does not stay on a button that gets disabled.
-void Gui_AccelDlg::enableButton(int id, bool on) {
-    CWnd* button = GetDlgItem(id);
-    if (!on && GetFocus() == button) {
-        m_record->commandList.SetFocus();
-    }
-    button->EnableWindow(on ? TRUE : FALSE);
+    EnableButton(*GetDlgItem(GUI_IDC_ACCEL_UNDO), !m_record->before.empty(), m_record->commandList);
+    EnableButton(*GetDlgItem(GUI_IDC_ACCEL_RESET), !m_record->map.IsSame(m_record->resetTo), m_record->commandList);
 }
 
 void Gui_AccelDlg::restore(const Gui_AccelMap& map) {

@@ -15,6 +15,9 @@
 /// A message about a key and its owner.
 [[nodiscard]] CString KeyMessage(UINT id, const CString& key, const CString& owner = CString());
 
+/// Enables or disables a button. One that is disabled hands the keyboard to an heir.
+void EnableButton(CWnd& button, bool on, CWnd& heir);
+
 /// What the dialog holds besides its controls' texts.
 struct Gui_AccelDlg::Record {
     Record(CMenu* tree, HACCEL table) : map(table), resetTo(map), menu(tree ? tree->m_hMenu : nullptr) {}

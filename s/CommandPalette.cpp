@@ -3,6 +3,7 @@
 #include "res/resource.h"
 #include "s/PaletteList.h"
 #include "s/Record.h"
+#include "s/StringOf.h"
 
 #include <algorithm>
 

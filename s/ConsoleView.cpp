@@ -5,8 +5,8 @@
 #include "s/ConsoleState.h"
 #include "s/MainWindow.h"
 #include "s/Msg.h"
+#include "s/StringOf.h"
 
-#include <algorithm>
 #include <cstring>
 
 IMPLEMENT_DYNCREATE(Gui_ConsoleView, CFormView)
@@ -60,9 +60,7 @@ void Gui_ConsoleView::DoDataExchange(CDataExchange* dx) {
 
 void Gui_ConsoleView::OnInitialUpdate() {
     CFormView::OnInitialUpdate();
-    CString title;
-    title.LoadString(GUI_IDR_CONSOLE);
-    GetDocument()->SetTitle(title.Trim());
+    GetDocument()->SetTitle(StringOf(GUI_IDR_CONSOLE).Trim());
     ShowPrompt();
     UpdateData(FALSE);
     m_list->SubclassDlgItem(GUI_IDC_CONSOLE_LINES, this);

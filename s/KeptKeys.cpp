@@ -1,8 +1,9 @@
 #include "s/KeptKeys.h"
 
+#include "s/KeyIndex.h"
+
 #include <algorithm>
 #include <charconv>
-#include <memory>
 #include <optional>
 
 namespace {
@@ -65,15 +66,11 @@ void apply(const Change& change, Gui_AccelMap& map) {
 /// Calls a function with each accelerator of one map whose key has another command in the other, or none.
 template <typename Function>
 void forEachMissing(const Gui_AccelMap& map, const Gui_AccelMap& other, Function function) {
-    int count = 0;
-    tagACCEL* table = nullptr;
-    map.GetAll(count, table);
-    const std::unique_ptr<tagACCEL[]> owner(table);
-    for (int i = 0; i < count; ++i) {
+    for (const Gui_Accel& accel : AccelsOf(map)) {
         unsigned short command = 0;
-        other.GetCmdAt(table[i], command);
-        if (command != table[i].cmd) {
-            function(Gui_Accel(table[i]), command);
+        other.GetCmdAt(accel, command);
+        if (command != accel.cmd) {
+            function(accel, command);
         }
     }
 }

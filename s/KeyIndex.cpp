@@ -3,12 +3,15 @@
 #include <algorithm>
 #include <memory>
 
-KeyIndex::KeyIndex(const Gui_AccelMap& map) {
+std::vector<Gui_Accel> AccelsOf(const Gui_AccelMap& map) {
     int count = 0;
     tagACCEL* table = nullptr;
     map.GetAll(count, table);
     const std::unique_ptr<tagACCEL[]> owner(table);
-    tvx::allocating([&] { m_accels.assign(table, table + count); });
+    return tvx::allocating([&] { return std::vector<Gui_Accel>(table, table + count); });
+}
+
+KeyIndex::KeyIndex(const Gui_AccelMap& map) : m_accels(AccelsOf(map)) {
     // They come by their keys, which remains the order within a command.
     std::stable_sort(m_accels.begin(), m_accels.end(),
                      [](const Gui_Accel& first, const Gui_Accel& second) { return first.cmd < second.cmd; });

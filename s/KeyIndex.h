@@ -5,6 +5,9 @@
 #include <span>
 #include <vector>
 
+/// All accelerators of a map, in the order of Gui_AccelMap::GetAll.
+[[nodiscard]] std::vector<Gui_Accel> AccelsOf(const Gui_AccelMap& map);
+
 /// The accelerators of a map by their commands. The map is a table by keys: whoever asks for the keys of each command
 /// of a menu makes an index once.
 class KeyIndex {

@@ -1,6 +1,7 @@
 #include "s/MenuCommands.h"
 
 #include "s/MenuStr.h"
+#include "s/StringOf.h"
 
 namespace {
 
@@ -33,12 +34,6 @@ std::vector<MenuCommand> CommandsOf(const CMenu* menu) {
         collect(*menu, CString(), commands);
     }
     return commands;
-}
-
-CString StringOf(UINT id) {
-    CString text;
-    text.LoadString(id);
-    return text;
 }
 
 CString PromptOf(UINT command) {

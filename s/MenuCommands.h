@@ -17,8 +17,5 @@ struct MenuCommand {
 /// @param menu  null has none
 [[nodiscard]] std::vector<MenuCommand> CommandsOf(const CMenu* menu);
 
-/// A string of the library; empty when there is no such string.
-[[nodiscard]] CString StringOf(UINT id);
-
 /// What a command does: its string up to the first line break. Empty when there is no such string.
 [[nodiscard]] CString PromptOf(UINT command);

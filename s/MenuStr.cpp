@@ -3,7 +3,6 @@
 #include "platform/base/Text.h"
 #include "s/Record.h"
 
-#include <algorithm>
 #include <string>
 #include <string_view>
 

@@ -4,6 +4,7 @@
 #include "res/resource.h"
 #include "s/KeyIndex.h"
 #include "s/KeyTexts.h"
+#include "s/StringOf.h"
 
 #include <algorithm>
 
@@ -85,8 +86,8 @@ PaletteList::PaletteList(CFrameWnd& frame) {
     updateStates(frame, *menu);
     const KeyIndex keys = keysInForce(frame);
     Words words;
-    words.checked.LoadString(GUI_IDS_PALETTE_CHECKED);
-    words.disabled.LoadString(GUI_IDS_PALETTE_DISABLED);
+    words.checked = StringOf(GUI_IDS_PALETTE_CHECKED);
+    words.disabled = StringOf(GUI_IDS_PALETTE_DISABLED);
     tvx::allocating([&] {
         const std::vector<UINT>& recent = recentCommands();
         for (MenuCommand& command : CommandsOf(frame.GetMenu())) {

@@ -83,7 +83,7 @@ BOOL Gui_WinApp::PreTranslateMessage(MSG* message) {
 }
 
 BOOL Gui_WinApp::InitApplication() {
-    // An object that is started once more, as tests do, goes on with the one it has.
+    // An object that is started once more goes on with the one it has.
     if (!m_data->docManager || m_pDocManager != m_data->docManager) {
         platformDocManager = m_pDocManager;
         m_data->docManager = new Gui_DocManager;

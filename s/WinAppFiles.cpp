@@ -5,6 +5,7 @@
 #include "platform/base/SystemPath.h"
 #include "s/FileName.h"
 #include "s/MainWindow.h"
+#include "s/StringOf.h"
 
 namespace {
 
@@ -57,9 +58,7 @@ CString Gui_WinApp::GetDefaultExtForFileDialog(CDocTemplate* docTemplate) {
 }
 
 CString Gui_WinApp::GetTitleForFileDialog(unsigned int titleId) {
-    CString title;
-    (void)title.LoadString(titleId);
-    return title;
+    return StringOf(titleId);
 }
 
 unsigned int Gui_WinApp::GetFlagsForFileDialog(unsigned int flags) {
@@ -87,9 +86,7 @@ void Gui_WinApp::AddFileFilter(CString& filter, const CString& description, cons
 }
 
 void Gui_WinApp::AddFileFilter(CString& filter, unsigned int descriptionId, const CString& pattern) {
-    CString description;
-    (void)description.LoadString(descriptionId);
-    AddFileFilter(filter, description, pattern);
+    AddFileFilter(filter, StringOf(descriptionId), pattern);
 }
 
 void Gui_WinApp::AddFileFilter(CString& filter, CDocTemplate* docTemplate) {

@@ -8,7 +8,6 @@
 
 #include <QtGlobal>
 
-#include <map>
 #include <vector>
 
 namespace tvx::afx {
