@@ -68,14 +68,14 @@ QString livingFolder(QString folder) {
     return folder;
 }
 
-} // namespace
-
 /// The patterns of a text that separates them by ";" or blanks. What old patterns mean by all files is all files.
 QStringList patternsOf(QString text) {
     QStringList patterns = text.replace(QLatin1Char(';'), QLatin1Char(' ')).split(QLatin1Char(' '), Qt::SkipEmptyParts);
     std::ranges::replace(patterns, QStringLiteral("*.*"), QStringLiteral("*"));
     return patterns;
 }
+
+} // namespace
 
 std::vector<FileFilter> filtersOf(LPCSTR text) {
     std::vector<FileFilter> filters;
