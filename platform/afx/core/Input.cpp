@@ -44,6 +44,7 @@ constexpr std::array<NamedCursor, 13> systemCursors{{
 
 HCURSOR shown = nullptr;
 HWND cursorWindow = nullptr;
+HWND edgeCursorWindow = nullptr;
 
 const NamedCursor* systemCursor(std::uintptr_t id) {
     const auto* found = std::ranges::find(systemCursors, id, &NamedCursor::id);
@@ -102,7 +103,16 @@ bool Window::showClassCursor(WPARAM under) {
 }
 
 void noteCursorWindow(HWND window) {
+    // What stands inside of the frame would have the edge's cursor too.
+    if (const Window* edge = Window::from(std::exchange(edgeCursorWindow, nullptr))) {
+        edge->widget()->unsetCursor();
+    }
     cursorWindow = window;
+}
+
+void showEdgeCursor(HWND window, Qt::CursorShape shape) {
+    edgeCursorWindow = window;
+    Window::from(window)->widget()->setCursor(shape);
 }
 
 } // namespace tvx::afx

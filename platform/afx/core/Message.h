@@ -153,6 +153,7 @@ using LPMSG = MSG*;
 #define WM_CLEAR 0x0303
 #define WM_UNDO 0x0304
 #define WM_PRINT 0x0317
+#define WM_THEMECHANGED 0x031A
 
 // The framework's own, in the range it keeps for itself
 #define WM_QUERYAFXWNDPROC 0x0360
@@ -238,6 +239,9 @@ using LPMSG = MSG*;
 #define HTBOTTOMRIGHT 17
 #define HTBORDER 18
 #define HTCLOSE 20
+/// An extended style of this layer's own, for top-level frames: the window draws its caption and border itself, in the
+/// desktop's style, so that its procedure is asked for their parts, told of the mouse there, and may draw on them.
+#define WS_EX_OWNCAPTION 0x00800000
 // Keys and buttons held down during a mouse message
 #define MK_LBUTTON 0x0001
 #define MK_RBUTTON 0x0002

@@ -393,6 +393,7 @@ protected:                                                                      
     TVX_ON_MESSAGE(WM_MEASUREITEM, (&::tvx::afx::onIdPointer<MEASUREITEMSTRUCT, &ThisClass::OnMeasureItem>))
 #define ON_WM_CONTEXTMENU() TVX_ON_MESSAGE(WM_CONTEXTMENU, (&::tvx::afx::onWindowPoint<&ThisClass::OnContextMenu>))
 #define ON_WM_HELPINFO() TVX_ON_MESSAGE(WM_HELP, (&::tvx::afx::onPointer<HELPINFO, &ThisClass::OnHelpInfo>))
+#define ON_WM_THEMECHANGED() TVX_ON_MESSAGE(WM_THEMECHANGED, (&::tvx::afx::onNothing<&ThisClass::OnThemeChanged>))
 #define ON_WM_NCHITTEST() TVX_ON_MESSAGE(WM_NCHITTEST, (&::tvx::afx::onHitTest<&ThisClass::OnNcHitTest>))
 #define ON_WM_NCPAINT() TVX_ON_MESSAGE(WM_NCPAINT, (&::tvx::afx::onNothing<&ThisClass::OnNcPaint>))
 #define ON_WM_NCACTIVATE() TVX_ON_MESSAGE(WM_NCACTIVATE, (&::tvx::afx::onFlag<&ThisClass::OnNcActivate>))

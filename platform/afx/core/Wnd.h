@@ -544,6 +544,7 @@ public:
     afx_msg void OnShowWindow(BOOL shown, UINT status);
     afx_msg void OnSize(UINT type, int cx, int cy);
     afx_msg void OnSysColorChange();
+    afx_msg LRESULT OnThemeChanged();
     afx_msg void OnTimer(UINT_PTR id);
     afx_msg void OnWindowPosChanged(WINDOWPOS* place);
     afx_msg void OnWindowPosChanging(WINDOWPOS* place);

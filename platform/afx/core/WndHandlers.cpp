@@ -259,6 +259,10 @@ void CWnd::OnSysColorChange() {
     Default();
 }
 
+LRESULT CWnd::OnThemeChanged() {
+    return Default();
+}
+
 void CWnd::OnTimer(UINT_PTR) {
     Default();
 }

@@ -62,14 +62,18 @@ QSize menuButtonSize() {
     return {three.width() / 3, three.height()};
 }
 
-/// Size of a button of a caption: the style's bar without its edges.
+/// What a button takes in a caption: from one to the next, and the whole height.
 QSize captionButtonSize() {
     QStyleOptionTitleBar option;
     option.rect = QRect(0, 0, 400, pixelMetric(QStyle::PM_TitleBarHeight));
     option.titleBarFlags = Qt::Window | Qt::WindowTitleHint | Qt::WindowSystemMenuHint | Qt::WindowMinMaxButtonsHint |
                            Qt::WindowCloseButtonHint;
     option.subControls = QStyle::SC_All;
-    return QApplication::style()->subControlRect(QStyle::CC_TitleBar, &option, QStyle::SC_TitleBarMinButton).size();
+    const auto place = [&option](QStyle::SubControl button) {
+        return QApplication::style()->subControlRect(QStyle::CC_TitleBar, &option, button);
+    };
+    return {place(QStyle::SC_TitleBarMaxButton).left() - place(QStyle::SC_TitleBarMinButton).left(),
+            option.rect.height()};
 }
 
 int frameMetric(int index) {

@@ -66,6 +66,10 @@ void notePointer(POINT position);
 /// then the answer of its delivery.
 bool translateEvent(QObject* receiver, QEvent* event, bool& result);
 
+/// Sends WM_NCPAINT for what the toolkit is painting of a window's frame.
+/// @param source the event behind it, null where the toolkit has painted its part already
+void paintFrame(Window& window, EventSource* source);
+
 /// Does idle work before the loop waits, if a message has been handled since the last time.
 void runIdle();
 /// Makes idle work due.

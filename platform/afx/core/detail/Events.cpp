@@ -8,6 +8,7 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MessageQueue.h"
 #include "platform/afx/core/detail/Window.h"
+#include "platform/afx/core/detail/WindowSurface.h"
 
 #include <QApplication>
 #include <QContextMenuEvent>
@@ -230,21 +231,44 @@ Window* mouseTarget(Window* under) {
     return under;
 }
 
+/// The part of a window (HT...) that the mouse is over. A mouse that is captured is the client area's wherever it is.
+int partUnder(const Window& window, QPoint screen) {
+    if (captureWindow()) {
+        return HTCLIENT;
+    }
+    if (EventCapture::instance().isCollecting()) {
+        return window.hitTest(screen);
+    }
+    return static_cast<int>(SendMessageA(window.handle(), WM_NCHITTEST, 0, MAKELPARAM(screen.x(), screen.y())));
+}
+
+/// The message of the mouse for a part of a window: those outside of the client area have numbers of their own.
+MSG mouseMessage(const Window& window, UINT message, int part, const QMouseEvent& event) {
+    const QPoint screen = event.globalPosition().toPoint();
+    if (part != HTCLIENT) {
+        return makeMessage(window.handle(), message - WM_MOUSEFIRST + WM_NCMOUSEMOVE, static_cast<WPARAM>(part),
+                           MAKELPARAM(screen.x(), screen.y()));
+    }
+    const QPoint point = window.screenToClient(screen);
+    return makeMessage(window.handle(), message, buttonFlags(event.buttons(), event.modifiers()),
+                       MAKELPARAM(point.x(), point.y()));
+}
+
 /// Lets windows choose the cursor, and views and child frames become active, before they see the press itself.
-void announceMouse(const Window& window, UINT message) {
+void announceMouse(const Window& window, UINT message, int part) {
     const HWND handle = window.handle();
     // Nobody is asked for a cursor while the mouse is captured: that is the rule hosts know.
     if (!captureWindow()) {
         noteCursorWindow(handle);
         SendMessageA(handle, WM_SETCURSOR, reinterpret_cast<WPARAM>(handle),
-                     MAKELPARAM(HTCLIENT, static_cast<int>(message)));
+                     MAKELPARAM(part, static_cast<int>(message)));
     }
     const bool press = message == WM_LBUTTONDOWN || message == WM_RBUTTONDOWN || message == WM_MBUTTONDOWN;
     if (press && !captureWindow()) {
         Window* current = Window::from(handle);
         const HWND top = current ? current->topLevel()->handle() : nullptr;
         SendMessageA(handle, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(top),
-                     MAKELPARAM(HTCLIENT, static_cast<int>(message)));
+                     MAKELPARAM(part, static_cast<int>(message)));
     }
 }
 
@@ -258,17 +282,17 @@ bool onMouse(Window& under, QObject* receiver, QMouseEvent& event) {
     }
     altAlone = false;
     const HWND handle = target->handle();
-    if (!EventCapture::instance().isCollecting()) {
-        announceMouse(*target, message);
-    }
+    const int part = partUnder(*target, screen);
     target = Window::from(handle);
+    if (target && !EventCapture::instance().isCollecting()) {
+        announceMouse(*target, message, part);
+        target = Window::from(handle);
+    }
     if (!target) {
         event.accept();
         return true;
     }
-    const QPoint point = target->screenToClient(screen);
-    MSG msg =
-        makeMessage(handle, message, buttonFlags(event.buttons(), event.modifiers()), MAKELPARAM(point.x(), point.y()));
+    MSG msg = mouseMessage(*target, message, part, event);
     if (keepForPeek(msg, receiver, &event)) {
         return true;
     }
@@ -313,6 +337,15 @@ bool onContextMenu(Window& window, QContextMenuEvent& event) {
 // --- painting, place, activation ---
 
 bool onPaint(Window& window, QObject* receiver, QPaintEvent& event) {
+    if (receiver == window.widget() && window.caption()) {
+        const HWND handle = window.handle();
+        EventSource source{receiver, &event};
+        const bool isBoth = receiver == window.clientWidget();
+        paintFrame(window, isBoth ? nullptr : &source);
+        if (!isBoth || !Window::from(handle)) {
+            return true;
+        }
+    }
     if (receiver != window.clientWidget()) {
         return false;
     }
@@ -373,6 +406,9 @@ bool onAfterwards(Window& window, QObject* receiver, QEvent& event, bool& result
     case QEvent::Move:
     case QEvent::Resize:
     case QEvent::WindowStateChange:
+        if (outermost && event.type() == QEvent::WindowStateChange) {
+            current->stateChanged();
+        }
         if (outermost || receiver == current->clientWidget()) {
             current->tellGeometry();
         }
@@ -446,12 +482,26 @@ bool isInput(QEvent::Type type) {
     }
 }
 
+/// A new style or new colours of the desktop. Posted, because the toolkit is going through its list of widgets.
+void onAppearance(const Window& window, const QEvent& event) {
+    if (event.type() != QEvent::StyleChange) {
+        PostMessageA(window.handle(), WM_SYSCOLORCHANGE, 0, 0);
+    }
+    PostMessageA(window.handle(), WM_THEMECHANGED, 0, 0);
+}
+
 bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& result) {
     switch (event->type()) {
     case QEvent::Paint:
         return onPaint(window, receiver, static_cast<QPaintEvent&>(*event));
     case QEvent::Close:
         return receiver == window.widget() && window.widget()->isWindow() && onCloseRequest(window, *event);
+    case QEvent::StyleChange:
+    case QEvent::ApplicationPaletteChange:
+        if (receiver == window.widget()) {
+            onAppearance(window, *event);
+        }
+        return false;
     case QEvent::DragEnter:
     case QEvent::DragMove:
     case QEvent::Drop:
@@ -512,6 +562,18 @@ void watchKeys(const QEvent& event) {
 }
 
 } // namespace
+
+void paintFrame(Window& window, EventSource* source) {
+    const HWND handle = window.handle();
+    WindowSurface& surface = WindowSurface::of(*window.widget());
+    const bool outer = std::exchange(window.inFramePaint, true);
+    surface.beginPaint();
+    dispatch(makeMessage(handle, WM_NCPAINT, 1, 0), source);
+    surface.endPaint();
+    if (Window* still = Window::from(handle)) {
+        still->inFramePaint = outer;
+    }
+}
 
 bool translateEvent(QObject* receiver, QEvent* event, bool& result) {
     if (takePassing(event) || ExceptionCarrier::isPending()) {

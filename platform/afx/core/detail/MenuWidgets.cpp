@@ -251,6 +251,13 @@ void FrameMenuBar::mousePressEvent(QMouseEvent* event) {
     QMenuBar::mousePressEvent(event);
 }
 
+void FrameMenuBar::paintEvent(QPaintEvent* event) {
+    QMenuBar::paintEvent(event);
+    if (Window* owner = Window::from(m_host.owner)) {
+        storing([owner] { paintFrame(*owner, nullptr); });
+    }
+}
+
 bool FrameMenuBar::openByKey(char32_t key) {
     if (!isVisible()) {
         return false;

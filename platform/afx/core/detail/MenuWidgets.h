@@ -62,6 +62,8 @@ public:
 protected:
     void initStyleOption(QStyleOptionMenuItem* option, const QAction* action) const override;
     void mousePressEvent(QMouseEvent* event) override;
+    /// The bar is a part of its frame: hosts draw on it when the frame around the client area is painted.
+    void paintEvent(QPaintEvent* event) override;
 
 private:
     void menuChanged(HMENU menu) override;

@@ -2,6 +2,7 @@
 
 #include "platform/win/FrameworkIds.h"
 
+#include "platform/afx/core/detail/CaptionedWindow.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
@@ -32,6 +33,9 @@ std::unique_ptr<Window> makePlainWindow(const CREATESTRUCT& cs) {
     if ((static_cast<DWORD>(cs.style) & WS_CHILD) != 0) {
         const bool childFrame = childFrameFactory && (cs.dwExStyle & WS_EX_MDICHILD) != 0;
         return childFrame ? childFrameFactory(cs) : std::make_unique<PlainWindow>(cs);
+    }
+    if ((cs.dwExStyle & WS_EX_OWNCAPTION) != 0) {
+        return std::make_unique<CaptionedWindow>(cs);
     }
     return std::make_unique<TopLevelWindow>(cs);
 }
@@ -86,6 +90,9 @@ Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle) {
     }
     if ((style & WS_CAPTION) != WS_CAPTION) {
         return flags | Qt::FramelessWindowHint;
+    }
+    if ((exStyle & WS_EX_OWNCAPTION) != 0) {
+        flags |= Qt::FramelessWindowHint; // the buttons that follow are those that the window draws
     }
     // Without the first of them the toolkit adds all buttons of a caption by itself.
     flags |= Qt::CustomizeWindowHint | Qt::WindowTitleHint;
@@ -193,6 +200,18 @@ void TopLevelWindow::setMenu(HMENU menu) {
 
 QMainWindow* TopLevelWindow::mainWindow() const {
     return static_cast<QMainWindow*>(widget());
+}
+
+int TopLevelWindow::hitTest(QPoint screen) const {
+    const QWidget* bar = mainWindow()->menuWidget();
+    const bool inBar = bar && bar->isVisible() && bar->rect().contains(bar->mapFromGlobal(screen));
+    return inBar ? HTMENU : HTCLIENT;
+}
+
+void TopLevelWindow::updateFrame() {
+    if (QWidget* bar = widget() ? mainWindow()->menuWidget() : nullptr) {
+        bar->update();
+    }
 }
 
 QRect frameClientRect(const QMainWindow& main) {

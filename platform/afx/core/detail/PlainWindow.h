@@ -43,6 +43,8 @@ public:
     }
     void setMenu(HMENU menu) override;
     QMainWindow* mainWindow() const;
+    int hitTest(QPoint screen) const override;
+    void updateFrame() override;
 
 protected:
     void beforeShow(bool visible) override;

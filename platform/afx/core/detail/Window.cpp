@@ -372,6 +372,10 @@ void Window::setEnabled(bool enabled) {
     call(WM_ENABLE, enabled ? TRUE : FALSE);
 }
 
+int Window::hitTest(QPoint) const {
+    return HTCLIENT;
+}
+
 // --- place and size ---
 
 QRect Window::windowRect() const {

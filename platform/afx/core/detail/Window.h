@@ -20,6 +20,8 @@ class CWnd;
 
 namespace tvx::afx {
 
+class Caption;
+
 /// One window. Each kind of window (plain child, top-level frame, dialog, each control) derives from it and brings the
 /// widget and the default procedure of its kind; the CWnd attached to it, if any, sees every message first.
 class TVX_PLATFORM_API Window {
@@ -128,6 +130,16 @@ public:
     virtual Window* heldChildFrame() const {
         return nullptr;
     }
+    /// The caption and border that it draws itself; null where the desktop draws them and where there are none.
+    virtual Caption* caption() const {
+        return nullptr;
+    }
+    /// The part of the window (HT...) at a point of the screen.
+    virtual int hitTest(QPoint screen) const;
+    /// Asks for the part around the client area to be painted: caption, border, menu bar.
+    virtual void updateFrame() {}
+    /// Told that its widget was maximised, minimised or brought back.
+    virtual void stateChanged() {}
     bool isDestroyed() const {
         return m_destroyed;
     }
@@ -144,6 +156,7 @@ public:
     /// What is to be repainted while WM_PAINT is handled, in client coordinates; empty outside of it.
     QRegion paintRegion;
     bool inPaint = false;
+    bool inFramePaint = false; ///< while WM_NCPAINT is handled for something that the toolkit paints
 
     // --- place and size; rectangles in the parent's client coordinates, top-level ones in screen coordinates ---
 

@@ -176,7 +176,15 @@ LRESULT Window::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return systemCommand(static_cast<UINT>(wParam), lParam);
     case WM_QUERYENDSESSION:
         return TRUE;
+    case WM_NCHITTEST:
+        return hitTest(QPoint(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam)));
+    case WM_NCPAINT:
+        if (!passEvent(*this, message) && !inFramePaint) {
+            updateFrame();
+        }
+        return 0;
     case WM_NCACTIVATE:
+        updateFrame();
         return TRUE;
     case WM_CTLCOLORMSGBOX:
     case WM_CTLCOLOREDIT:

@@ -16,8 +16,6 @@
 #include <QMainWindow>
 #include <QMdiArea>
 #include <QMdiSubWindow>
-#include <QProxyStyle>
-#include <QStyleOption>
 
 #include <algorithm>
 #include <cmath>
@@ -33,36 +31,8 @@ std::unique_ptr<Window> makeClient(const CREATESTRUCT& cs) {
 
 const WindowClassEntry clientEntry("MDICLIENT", &makeClient);
 
-/// Draws captions as the application's style does. On a dark desktop the style draws the buttons of inactive ones in
-/// black all the same; those of active ones are light, so the caption is drawn as an active one in quiet colours.
-class CaptionStyle : public QProxyStyle {
-public:
-    CaptionStyle() : QProxyStyle(QApplication::style()->name()) {}
-
-    void drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
-                            const QWidget* widget) const override {
-        const auto* caption = qstyleoption_cast<const QStyleOptionTitleBar*>(option);
-        if (!caption || (caption->titleBarState & State_Active) != 0 || !isDarkPalette()) {
-            QProxyStyle::drawComplexControl(control, option, painter, widget);
-            return;
-        }
-        QStyleOptionTitleBar quiet = *caption;
-        quiet.titleBarState |= State_Active;
-        quiet.palette.setColor(QPalette::Highlight, caption->palette.color(QPalette::Window));
-        quiet.palette.setColor(QPalette::HighlightedText, caption->palette.color(QPalette::WindowText));
-        QProxyStyle::drawComplexControl(control, &quiet, painter, widget);
-    }
-};
-
 /// Asks its frame before it closes.
 class SubWindow : public QMdiSubWindow {
-public:
-    SubWindow() {
-        auto* style = new CaptionStyle;
-        style->setParent(this);
-        setStyle(style);
-    }
-
 protected:
     void closeEvent(QCloseEvent* event) override {
         event->ignore();
@@ -356,10 +326,23 @@ LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
 
 // --- child frames ---
 
-MdiChildWindow::MdiChildWindow(const CREATESTRUCT& cs) : Window(cs), m_defaultPlace(cs.x == CW_USEDEFAULT) {}
+MdiChildWindow::MdiChildWindow(const CREATESTRUCT& cs)
+    : Window(cs), m_caption(*this), m_defaultPlace(cs.x == CW_USEDEFAULT) {}
 
 QMdiSubWindow* MdiChildWindow::subWindow() const {
     return static_cast<QMdiSubWindow*>(widget());
+}
+
+Caption* MdiChildWindow::caption() const {
+    return &m_caption;
+}
+
+int MdiChildWindow::hitTest(QPoint screen) const {
+    return m_caption.hitTest(widget()->mapFromGlobal(screen));
+}
+
+void MdiChildWindow::updateFrame() {
+    m_caption.update();
 }
 
 MdiClientWindow& MdiChildWindow::client() const {
@@ -379,6 +362,7 @@ QWidget* MdiChildWindow::makeWidget(QWidget*) {
     m_main = makeMainWidget(sub, Qt::Widget);
     // The toolkit's main window makes itself a top-level window whatever it is told at first.
     m_main->setWindowFlags(Qt::Widget);
+    sub->setStyle(&m_caption.style());
     sub->setWidget(m_main);
     guarded([&] { client().area()->addSubWindow(sub); });
     sub->hide();
@@ -448,6 +432,14 @@ void MdiChildWindow::showWidget(int command) {
 LRESULT MdiChildWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     if (message == WM_DESTROY) {
         client().forget(*this);
+    }
+    if (message == WM_THEMECHANGED) {
+        guarded([this] {
+            subWindow()->setStyle(nullptr); // the one there is now goes
+            m_caption.renewStyle();
+            subWindow()->setStyle(&m_caption.style());
+        });
+        return 0;
     }
     if (message == WM_SYSCOMMAND) {
         switch (wParam & 0xFFF0U) {

@@ -3,6 +3,7 @@
 /// @file
 /// Child frames in a main frame: the client window that holds them and the child frames' windows.
 
+#include "platform/afx/core/detail/Caption.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
 #include "platform/afx/core/detail/Window.h"
 
@@ -63,7 +64,7 @@ private:
     bool m_roomKnown = false;
 };
 
-/// A child frame: a caption of the toolkit's around a main window of its own, with bars and a pane.
+/// A child frame: a caption, which the toolkit draws and moves it by, around a main window of its own, with bars and a pane.
 class TVX_PLATFORM_API MdiChildWindow : public Window {
 public:
     explicit MdiChildWindow(const CREATESTRUCT& cs);
@@ -74,6 +75,9 @@ public:
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
     QMdiSubWindow* subWindow() const;
     MdiClientWindow& client() const;
+    Caption* caption() const override;
+    int hitTest(QPoint screen) const override;
+    void updateFrame() override;
 
 protected:
     void beforeShow(bool visible) override;
@@ -85,6 +89,7 @@ protected:
 private:
     QPointer<QMainWindow> m_main;
     MenuHost m_systemMenu;
+    mutable Caption m_caption;
     bool m_defaultPlace;
 };
 

@@ -1,0 +1,214 @@
+#include "platform/afx/core/detail/Caption.h"
+
+#include "platform/afx/core/Message.h"
+#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/gdi/detail/ButtonImages.h"
+
+#include <QApplication>
+#include <QPainter>
+
+#include <algorithm>
+#include <array>
+#include <utility>
+
+namespace tvx::afx {
+
+CaptionStyle::CaptionStyle() : QProxyStyle(QApplication::style()->name()) {}
+
+int CaptionStyle::styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                            QStyleHintReturn* data) const {
+    return hint == SH_TitleBar_NoBorder ? 0 : QProxyStyle::styleHint(hint, option, widget, data);
+}
+
+QRect CaptionStyle::subControlRect(ComplexControl control, const QStyleOptionComplex* option, SubControl part,
+                                   const QWidget* widget) const {
+    QRect place = QProxyStyle::subControlRect(control, option, part, widget);
+    if (control == CC_TitleBar && part == SC_TitleBarLabel && place.intersects(button)) {
+        place.setRight(button.left() - 1);
+    }
+    return place;
+}
+
+void CaptionStyle::drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
+                                      const QWidget* widget) const {
+    const auto* caption = qstyleoption_cast<const QStyleOptionTitleBar*>(option);
+    if (!caption || (caption->titleBarState & State_Active) != 0 || !isDarkPalette()) {
+        QProxyStyle::drawComplexControl(control, option, painter, widget);
+        return;
+    }
+    // The style draws the buttons of inactive captions in black all the same; those of active ones are light, so the
+    // caption is drawn as an active one in quiet colours.
+    QStyleOptionTitleBar quiet = *caption;
+    quiet.titleBarState |= State_Active;
+    quiet.palette.setColor(QPalette::Highlight, caption->palette.color(QPalette::Window));
+    quiet.palette.setColor(QPalette::HighlightedText, caption->palette.color(QPalette::WindowText));
+    QProxyStyle::drawComplexControl(control, &quiet, painter, widget);
+}
+
+Caption::Caption(Window& window) : m_window(window), m_style(std::make_unique<CaptionStyle>()) {}
+
+Caption::~Caption() = default;
+
+QStyle& Caption::style() const {
+    return *m_style;
+}
+
+void Caption::renewStyle() {
+    const QRect button = m_style->button;
+    m_style = std::make_unique<CaptionStyle>();
+    m_style->button = button;
+}
+
+int Caption::border() const {
+    const Qt::WindowStates state = m_window.widget()->windowState();
+    const bool fills = (state & (Qt::WindowMaximized | Qt::WindowFullScreen)) != 0;
+    return fills ? 0 : m_style->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth, nullptr, m_window.widget());
+}
+
+int Caption::height() const {
+    const QWidget& widget = *m_window.widget();
+    // The buttons of a child frame that fills its main frame stand in that one's menu bar.
+    const bool isElsewhere = widget.isMaximized() && !widget.isWindow();
+    return isElsewhere || widget.isFullScreen() ? 0 : m_style->pixelMetric(QStyle::PM_TitleBarHeight, nullptr, &widget);
+}
+
+QMargins Caption::margins() const {
+    const int edge = border();
+    return {edge, edge + height(), edge, edge};
+}
+
+QStyleOptionTitleBar Caption::bar() const {
+    const QWidget& widget = *m_window.widget();
+    QStyleOptionTitleBar option;
+    option.initFrom(&widget);
+    const int edge = border();
+    option.rect = QRect(edge, edge, widget.width() - 2 * edge, height());
+    option.subControls = QStyle::SC_All;
+    option.titleBarFlags = widget.windowFlags();
+    option.titleBarState = static_cast<int>(widget.windowState());
+    option.icon = widget.windowIcon();
+    option.state.setFlag(QStyle::State_Active, isActive);
+    option.palette.setCurrentColorGroup(isActive ? QPalette::Active : QPalette::Inactive);
+    if (isActive) {
+        option.titleBarState |= QStyle::State_Active;
+    }
+    return option;
+}
+
+namespace {
+
+struct Part {
+    int code;
+    QStyle::SubControl control;
+};
+
+/// The parts of a caption in front of its label. A maximised window has a restore button in the place of the other.
+constexpr std::array parts{Part{HTCLOSE, QStyle::SC_TitleBarCloseButton}, Part{HTMAXBUTTON, QStyle::SC_TitleBarMaxButton},
+                           Part{HTMAXBUTTON, QStyle::SC_TitleBarNormalButton},
+                           Part{HTMINBUTTON, QStyle::SC_TitleBarMinButton}, Part{HTSYSMENU, QStyle::SC_TitleBarSysMenu}};
+
+QStyle::SubControl controlOf(int code, bool maximized) {
+    if (code == HTMAXBUTTON) {
+        return maximized ? QStyle::SC_TitleBarNormalButton : QStyle::SC_TitleBarMaxButton;
+    }
+    const auto* found = std::ranges::find(parts, code, &Part::code);
+    return found != parts.end() ? found->control : QStyle::SC_None;
+}
+
+} // namespace
+
+QRect Caption::systemMenuRect() const {
+    const QStyleOptionTitleBar option = bar();
+    return m_style->subControlRect(QStyle::CC_TitleBar, &option, QStyle::SC_TitleBarSysMenu, m_window.widget());
+}
+
+/// The edge or corner at a point, HTNOWHERE away from the border. Corners reach along both edges, so that they can be
+/// hit.
+int Caption::edgeAt(QPoint point) const {
+    const int edge = border();
+    const QRect whole = m_window.widget()->rect();
+    const QRect inside = whole.adjusted(edge, edge, -edge, -edge);
+    if (!whole.contains(point) || inside.contains(point)) {
+        return HTNOWHERE;
+    }
+    if ((m_window.style() & WS_THICKFRAME) == 0) {
+        return HTBORDER;
+    }
+    constexpr int corner = 16;
+    const bool left = point.x() < corner;
+    const bool right = point.x() >= whole.width() - corner;
+    const bool top = point.y() < corner;
+    const bool bottom = point.y() >= whole.height() - corner;
+    if (top) {
+        return left ? HTTOPLEFT : right ? HTTOPRIGHT : point.y() < edge ? HTTOP : HTNOWHERE;
+    }
+    if (bottom) {
+        return left ? HTBOTTOMLEFT : right ? HTBOTTOMRIGHT : HTBOTTOM;
+    }
+    return left ? HTLEFT : HTRIGHT;
+}
+
+int Caption::hitTest(QPoint point) const {
+    const QWidget& widget = *m_window.widget();
+    if (!widget.rect().contains(point)) {
+        return HTNOWHERE;
+    }
+    if (const int edge = edgeAt(point)) {
+        return edge;
+    }
+    const QStyleOptionTitleBar option = bar();
+    if (!option.rect.contains(point)) {
+        return HTCLIENT;
+    }
+    // The corner of a maximised window is where the mouse ends up that is thrown there: its button reaches into it.
+    const bool maximized = widget.isMaximized();
+    const QPoint at = maximized ? QPoint(std::min(point.x(), option.rect.right() - option.rect.height() / 2),
+                                         std::max(point.y(), option.rect.center().y()))
+                                : point;
+    for (const Part& part : parts) {
+        if (part.control == controlOf(part.code, maximized) &&
+            m_style->subControlRect(QStyle::CC_TitleBar, &option, part.control, &widget).contains(at)) {
+            return part.code;
+        }
+    }
+    return HTCAPTION;
+}
+
+void Caption::paint(QPainter& painter) const {
+    const QWidget& widget = *m_window.widget();
+    if (border() > 0) {
+        QStyleOptionFrame frame;
+        frame.initFrom(&widget);
+        frame.lineWidth = border();
+        frame.state.setFlag(QStyle::State_Active, isActive);
+        m_style->drawPrimitive(QStyle::PE_FrameWindow, &frame, &painter, &widget);
+    }
+    QStyleOptionTitleBar option = bar();
+    if (option.rect.height() <= 0) {
+        return;
+    }
+    const QStyle::SubControl control = controlOf(pressed != 0 ? pressed : hovered, widget.isMaximized());
+    const bool isDown = pressed != 0 && pressed == hovered;
+    if (control != QStyle::SC_None && (isDown || pressed == 0)) {
+        option.activeSubControls = control;
+        option.state |= isDown ? QStyle::State_Sunken : QStyle::State_MouseOver;
+    } else {
+        option.state &= ~QStyle::State_MouseOver;
+    }
+    const QRect label = m_style->subControlRect(QStyle::CC_TitleBar, &option, QStyle::SC_TitleBarLabel, &widget);
+    option.text = option.fontMetrics.elidedText(widget.windowTitle(), Qt::ElideRight, label.width());
+    m_style->drawComplexControl(QStyle::CC_TitleBar, &option, &painter, &widget);
+}
+
+void Caption::update() const {
+    QWidget& widget = *m_window.widget();
+    widget.update(QRegion(widget.rect()) - QRegion(widget.rect() - margins()));
+}
+
+void Caption::setButton(const QRect& place) {
+    if (std::exchange(m_style->button, place) != place) {
+        update();
+    }
+}
+
+} // namespace tvx::afx

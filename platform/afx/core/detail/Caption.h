@@ -1,0 +1,76 @@
+#pragma once
+
+/// @file
+/// Captions and borders that windows draw themselves, with the desktop's style: those of child frames and of top-level
+/// frames that ask for one.
+
+#include "platform/base/Export.h"
+
+#include <QMargins>
+#include <QPoint>
+#include <QProxyStyle>
+#include <QRect>
+#include <QStyleOptionTitleBar>
+
+#include <memory>
+
+class QPainter;
+
+namespace tvx::afx {
+
+class Window;
+
+/// The desktop's style for captions. It draws a border around them, keeps the place of a button that the host has
+/// added, and draws captions on dark desktops so that they can be read.
+class CaptionStyle : public QProxyStyle {
+public:
+    CaptionStyle();
+    int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
+                  QStyleHintReturn* data) const override;
+    QRect subControlRect(ComplexControl control, const QStyleOptionComplex* option, SubControl part,
+                         const QWidget* widget) const override;
+    void drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
+                            const QWidget* widget) const override;
+    /// The place of a button that the host draws, in the window's coordinates; empty for none.
+    QRect button;
+};
+
+/// The caption and the border of one window: what they take, what lies where, and how they look.
+class TVX_PLATFORM_API Caption {
+public:
+    explicit Caption(Window& window);
+    ~Caption();
+    Caption(const Caption&) = delete;
+    Caption& operator=(const Caption&) = delete;
+
+    /// The style that measures and draws the caption; another one after the desktop's has changed.
+    QStyle& style() const;
+    /// Follows a change of the desktop's style.
+    void renewStyle();
+    /// What border and caption take from the window's widget: nothing of what is not drawn at the moment.
+    QMargins margins() const;
+    /// The part (HT...) at a point of the window's widget.
+    int hitTest(QPoint point) const;
+    /// Draws border and caption on the window's widget.
+    void paint(QPainter& painter) const;
+    /// Asks for all of it to be painted.
+    void update() const;
+    /// The place of the picture that opens the system menu, in the widget's coordinates.
+    QRect systemMenuRect() const;
+    /// Keeps a part of the caption free of the title, for a button that the host draws there. Widget's coordinates.
+    void setButton(const QRect& place);
+
+    bool isActive = false; ///< whether it is drawn as that of the active window
+    int pressed = 0;       ///< the button (HT...) that is drawn as held down
+    int hovered = 0;       ///< the button that the pointer is over
+
+private:
+    int border() const;
+    int height() const;
+    QStyleOptionTitleBar bar() const;
+    int edgeAt(QPoint point) const;
+    Window& m_window;
+    std::unique_ptr<CaptionStyle> m_style;
+};
+
+} // namespace tvx::afx

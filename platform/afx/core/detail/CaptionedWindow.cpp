@@ -1,0 +1,81 @@
+#include "platform/afx/core/detail/CaptionedWindow.h"
+
+#include "platform/afx/core/Message.h"
+#include "platform/afx/core/detail/Connect.h"
+#include "platform/afx/core/detail/Loop.h"
+
+#include <QMainWindow>
+#include <QPainter>
+
+namespace tvx::afx {
+
+CaptionedWindow::CaptionedWindow(const CREATESTRUCT& cs)
+    : TopLevelWindow(cs), m_caption(*this), m_mouse(*this, m_caption) {}
+
+Caption* CaptionedWindow::caption() const {
+    return &m_caption;
+}
+
+void CaptionedWindow::widgetMade() {
+    TopLevelWindow::widgetMade();
+    stateChanged();
+    connectStoring(widget(), &QWidget::windowTitleChanged, widget(), [this] { m_caption.update(); });
+    connectStoring(widget(), &QWidget::windowIconChanged, widget(), [this] { m_caption.update(); });
+}
+
+/// What stands in the window begins below the caption.
+void CaptionedWindow::stateChanged() {
+    guarded([this] { widget()->setContentsMargins(m_caption.margins()); });
+    m_caption.update();
+}
+
+int CaptionedWindow::hitTest(QPoint screen) const {
+    const int part = m_caption.hitTest(widget()->mapFromGlobal(screen));
+    return part == HTCLIENT ? TopLevelWindow::hitTest(screen) : part;
+}
+
+void CaptionedWindow::updateFrame() {
+    TopLevelWindow::updateFrame();
+    m_caption.update();
+}
+
+void CaptionedWindow::paintCaption() {
+    if (widget()->testAttribute(Qt::WA_WState_InPaintEvent)) {
+        QPainter painter(widget());
+        m_caption.paint(painter);
+    }
+}
+
+void CaptionedWindow::followStyle() {
+    m_caption.renewStyle();
+    stateChanged();
+}
+
+LRESULT CaptionedWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (const auto answer = m_mouse.proc(message, wParam, lParam)) {
+        return *answer;
+    }
+    switch (message) {
+    case WM_NCPAINT:
+        if (inFramePaint) {
+            paintCaption();
+            return 0;
+        }
+        return TopLevelWindow::defaultProc(message, wParam, lParam);
+    case WM_SETCURSOR:
+        if (reinterpret_cast<HWND>(wParam) == handle() && m_mouse.showCursor(LOWORD(lParam))) {
+            return TRUE;
+        }
+        return TopLevelWindow::defaultProc(message, wParam, lParam);
+    case WM_NCACTIVATE:
+        m_caption.isActive = wParam != 0;
+        return TopLevelWindow::defaultProc(message, wParam, lParam);
+    case WM_THEMECHANGED:
+        followStyle();
+        return 0;
+    default:
+        return TopLevelWindow::defaultProc(message, wParam, lParam);
+    }
+}
+
+} // namespace tvx::afx
