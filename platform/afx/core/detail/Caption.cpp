@@ -84,7 +84,7 @@ QStyleOptionTitleBar Caption::bar() const {
     const int edge = border();
     option.rect = QRect(edge, edge, widget.width() - 2 * edge, height());
     option.subControls = QStyle::SC_All;
-    option.titleBarFlags = widget.windowFlags();
+    option.titleBarFlags = widget.windowFlags() | Qt::WindowTitleHint;
     option.titleBarState = static_cast<int>(widget.windowState());
     option.icon = widget.windowIcon();
     option.state.setFlag(QStyle::State_Active, isActive);

@@ -91,11 +91,9 @@ Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle) {
     if ((style & WS_CAPTION) != WS_CAPTION) {
         return flags | Qt::FramelessWindowHint;
     }
-    if ((exStyle & WS_EX_OWNCAPTION) != 0) {
-        flags |= Qt::FramelessWindowHint; // the buttons that follow are those that the window draws
-    }
-    // Without the first of them the toolkit adds all buttons of a caption by itself.
-    flags |= Qt::CustomizeWindowHint | Qt::WindowTitleHint;
+    // Of a caption that the window draws itself the desktop must not hear. Else the toolkit adds all buttons of a caption
+    // by itself without the first of the hints.
+    flags |= (exStyle & WS_EX_OWNCAPTION) != 0 ? Qt::FramelessWindowHint : Qt::CustomizeWindowHint | Qt::WindowTitleHint;
     if ((style & WS_SYSMENU) != 0) {
         flags |= Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
     }
