@@ -27,14 +27,9 @@ QRect clientArea(HWND handle) {
     return window ? window->clientRect() : QRect();
 }
 
-/// The whole window in its widget's coordinates. A frame that the desktop draws reaches beyond the widget.
 QRect wholeArea(HWND handle) {
     const Window* window = Window::from(handle);
-    if (!window || !window->widget()) {
-        return {};
-    }
-    const QRect screen = window->screenRect();
-    return {window->widget()->mapFromGlobal(screen.topLeft()), screen.size()};
+    return window ? window->wholeRect() : QRect();
 }
 
 HDC addWindowContext(HWND window, DcKind kind, std::unique_ptr<DrawTarget> target) {

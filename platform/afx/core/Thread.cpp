@@ -9,6 +9,8 @@
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/Exception.h"
 
+#include <algorithm>
+#include <array>
 #include <cstdio>
 #include <thread>
 
@@ -25,6 +27,17 @@ const std::thread::id interfaceThread = std::this_thread::get_id();
 
 CWinThread* AfxGetThread() {
     return std::this_thread::get_id() == interfaceThread ? AfxGetApp() : nullptr;
+}
+
+bool AfxIsActivating() {
+    constexpr std::array messages{WM_ACTIVATE,      WM_NCACTIVATE, WM_MDIACTIVATE,
+                                  WM_MOUSEACTIVATE, WM_SETFOCUS,   WM_KILLFOCUS};
+    for (const Dispatch* each = DispatchScope::current(); each; each = each->outer) {
+        if (std::ranges::find(messages, each->msg.message) != messages.end()) {
+            return true;
+        }
+    }
+    return false;
 }
 
 MSG* AfxGetCurrentMessage() {

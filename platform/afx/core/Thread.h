@@ -54,5 +54,11 @@ private:
 TVX_PLATFORM_API CWinThread* AfxGetThread();
 /// The message now being handled, null outside of every handler. It is gone when its handler returns.
 TVX_PLATFORM_API MSG* AfxGetCurrentMessage();
+/// Whether a handler of an activation message (WM_ACTIVATE, WM_NCACTIVATE, WM_MDIACTIVATE, WM_MOUSEACTIVATE,
+/// WM_SETFOCUS, WM_KILLFOCUS) of this thread is running, anywhere below the caller. The toolkit is changing its list of
+/// child frames then, or going through it: a caller posts itself a message and destroys a frame when that arrives.
+/// A modal loop that such a handler has opened is no exception, since the handler goes on after it; a caller that would
+/// post again and again waits for the end of the loop instead.
+TVX_PLATFORM_API bool AfxIsActivating();
 /// Ends the application: PostQuitMessage, which tells more.
 TVX_PLATFORM_API void AfxPostQuitMessage(int exitCode);

@@ -260,6 +260,14 @@ public:
     CDC* GetWindowDC();
     /// Gives a context of GetDC or GetWindowDC back and shows what was drawn. 0 for any other.
     int ReleaseDC(CDC* dc);
+    /// Tells of a button that the host draws itself into the frame of this window, in its caption or its menu bar: the
+    /// caption's title is kept clear of it, and assistive tools find a push button there. Pressed by them, it has
+    /// WM_SYSCOMMAND sent; clicks of the mouse are the host's to handle, as messages of the non-client area. A window
+    /// has one such button.
+    /// @param name  what assistive tools call it
+    /// @param place in the coordinates of GetWindowDC, to be told anew when it changes; null: there is none any more
+    /// @param command what WM_SYSCOMMAND carries
+    void SetFrameButton(LPCSTR name, const RECT* place, UINT command);
     /// Moves the contents by an offset in pixels and requests the uncovered strip.
     /// @param scroll what is to be moved, null: the whole client area, and the children with it
     /// @param clip   counts where `scroll` is null

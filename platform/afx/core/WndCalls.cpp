@@ -270,6 +270,13 @@ int CWnd::ReleaseDC(CDC* dc) {
     return ::ReleaseDC(m_hWnd, dc->m_hDC);
 }
 
+void CWnd::SetFrameButton(LPCSTR name, const RECT* place, UINT command) {
+    if (Window* window = GetState()) {
+        const QRect wanted = place ? toQt(*place) : QRect();
+        window->setFrameButton(toQt(name), place ? &wanted : nullptr, command);
+    }
+}
+
 void CWnd::ScrollWindow(int dx, int dy, const RECT* scroll, const RECT* clip) {
     const Window* window = GetState();
     QWidget* client = peerOf(m_hWnd);

@@ -8,6 +8,7 @@
 #include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/Document.h"
 #include "platform/afx/frames/View.h"
+#include "platform/afx/frames/detail/RoutingFrame.h"
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Resource.h"
 
@@ -328,14 +329,18 @@ BOOL CFrameWnd::PreTranslateMessage(MSG* message) {
 }
 
 BOOL CFrameWnd::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {
-    CView* view = GetActiveView();
+    const bool routed = isRouted(*this);
+    if (routed && offerToRoutingFrame(id, code, extra, info)) {
+        return TRUE;
+    }
+    CView* view = routed ? nullptr : GetActiveView();
     if (view && view->OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
     if (CWnd::OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }
-    CWinApp* app = AfxGetApp();
+    CWinApp* app = isAskedForMainFrame(*this, id, code) ? nullptr : AfxGetApp();
     return app ? app->OnCmdMsg(id, code, extra, info) : FALSE;
 }
 

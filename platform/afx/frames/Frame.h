@@ -264,3 +264,24 @@ private:
     std::vector<CControlBar*> m_bars;
     bool m_ownAccelerators = false;
 };
+
+/// The frame that stands in for the active child frame of the application's main frame: one that floats beside it.
+///
+/// While there is one, commands that reach the main frame, such as those of its accelerators, and questions for the
+/// state of such commands go to the routing frame's OnCmdMsg first (its view, document, itself), then to the main frame
+/// itself and the application; not to the active child frame, whose accelerators and keys are not looked at either. The
+/// main frame's bars still show at idle time what the active child frame says, because a click on them makes the main
+/// frame the active one again. A frame sets itself when it becomes active and puts back the one before when it ceases
+/// to be (OnActivate):
+///
+/// @code
+/// m_before = AfxSetRoutingFrame(this);
+/// ...
+/// AfxSetRoutingFrame(m_before); // which must not have ended meanwhile
+/// @endcode
+///
+/// @return the routing frame of this thread; null at first, and when its window has ended
+TVX_PLATFORM_API CFrameWnd* AfxGetRoutingFrame();
+/// Makes a frame that has a window the routing frame, or none (null). The main frame itself counts as none.
+/// @return the one before
+TVX_PLATFORM_API CFrameWnd* AfxSetRoutingFrame(CFrameWnd* frame);

@@ -7,6 +7,7 @@
 #include "platform/afx/frames/DocTemplate.h"
 #include "platform/afx/frames/Document.h"
 #include "platform/afx/frames/View.h"
+#include "platform/afx/frames/detail/RoutingFrame.h"
 #include "platform/win/ExtensionModule.h"
 
 using namespace tvx::afx;
@@ -211,7 +212,9 @@ BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
     if (message->message < WM_KEYFIRST || message->message > WM_KEYLAST) {
         return CFrameWnd::PreTranslateMessage(message);
     }
-    CMDIChildWnd* child = MDIGetActive();
+    // Keys of the child frames are not meant while another frame has their place.
+    const bool routed = isRouted(*this);
+    CMDIChildWnd* child = routed ? nullptr : MDIGetActive();
     if (child && child->PreTranslateMessage(message)) {
         return TRUE;
     }
@@ -221,7 +224,7 @@ BOOL CMDIFrameWnd::PreTranslateMessage(MSG* message) {
     if (m_hAccelTable && ::TranslateAcceleratorA(m_hWnd, m_hAccelTable, message)) {
         return TRUE;
     }
-    return translateChildKeys(*this, *message) ? TRUE : FALSE;
+    return !routed && translateChildKeys(*this, *message) ? TRUE : FALSE;
 }
 
 BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
@@ -229,7 +232,7 @@ BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
         return TRUE;
     }
     // A child frame may handle the command in an OnCommand of its own; it also comes along by the routing.
-    CMDIChildWnd* child = MDIGetActive();
+    CMDIChildWnd* child = isRouted(*this) ? nullptr : MDIGetActive();
     if (child && child->SendMessage(WM_COMMAND, wParam, lParam) != 0) {
         return TRUE;
     }
@@ -253,7 +256,7 @@ BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
 }
 
 BOOL CMDIFrameWnd::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {
-    CMDIChildWnd* child = MDIGetActive();
+    CMDIChildWnd* child = isRouted(*this) ? nullptr : MDIGetActive();
     if (child && child->OnCmdMsg(id, code, extra, info)) {
         return TRUE;
     }

@@ -1,11 +1,13 @@
 #include "platform/afx/core/detail/Accessible.h"
 
+#include "platform/afx/core/detail/FrameButton.h"
 #include "platform/afx/core/detail/Window.h"
 
 #include <QAbstractButton>
 #include <QAccessibleObject>
 #include <QAccessibleWidget>
 #include <QMainWindow>
+#include <QMdiSubWindow>
 #include <QMenu>
 #include <QMenuBar>
 #include <QRegularExpression>
@@ -68,6 +70,93 @@ private:
             std::ranges::transform(window->children(), std::back_inserter(widgets), &Window::widget);
         }
         return widgets;
+    }
+};
+
+/// A top-level frame or a child frame: its widgets, and behind them the button that its host draws into it.
+class AccessibleFrame : public QAccessibleWidget {
+public:
+    explicit AccessibleFrame(QWidget* frame) : QAccessibleWidget(frame, QAccessible::Window) {}
+
+    /// The toolkit calls only top-level widgets by their captions.
+    QString text(QAccessible::Text kind) const override {
+        const QString own = QAccessibleWidget::text(kind);
+        return kind == QAccessible::Name && own.isEmpty() ? widget()->windowTitle() : own;
+    }
+
+    int childCount() const override {
+        return QAccessibleWidget::childCount() + (button() ? 1 : 0);
+    }
+    QAccessibleInterface* child(int index) const override {
+        const bool isWidget = index < QAccessibleWidget::childCount();
+        return isWidget ? QAccessibleWidget::child(index) : QAccessible::queryAccessibleInterface(button());
+    }
+    int indexOfChild(const QAccessibleInterface* child) const override {
+        const bool isButton = child && child->object() && child->object() == button();
+        return isButton ? QAccessibleWidget::childCount() : QAccessibleWidget::indexOfChild(child);
+    }
+    /// In a menu bar the button stands on the bar.
+    QAccessibleInterface* childAt(int x, int y) const override {
+        const bool isButton = button() && button()->screenPlace().contains(x, y);
+        return isButton ? QAccessible::queryAccessibleInterface(button()) : QAccessibleWidget::childAt(x, y);
+    }
+
+private:
+    FrameButton* button() const {
+        const Window* window = Window::of(widget());
+        return window ? window->frameButton() : nullptr;
+    }
+};
+
+class AccessibleFrameButton : public QAccessibleObject, public QAccessibleActionInterface {
+public:
+    explicit AccessibleFrameButton(FrameButton& button) : QAccessibleObject(&button) {}
+
+    QAccessibleInterface* parent() const override {
+        const Window* window = button().window();
+        return window ? QAccessible::queryAccessibleInterface(window->widget()) : nullptr;
+    }
+    int childCount() const override {
+        return 0;
+    }
+    QAccessibleInterface* child(int) const override {
+        return nullptr;
+    }
+    int indexOfChild(const QAccessibleInterface*) const override {
+        return -1;
+    }
+    QAccessible::Role role() const override {
+        return QAccessible::PushButton;
+    }
+    QRect rect() const override {
+        return button().screenPlace();
+    }
+    QString text(QAccessible::Text kind) const override {
+        return kind == QAccessible::Name ? button().name() : QString();
+    }
+    QAccessible::State state() const override {
+        QAccessible::State state;
+        state.invisible = button().screenPlace().isEmpty();
+        return state;
+    }
+    void* interface_cast(QAccessible::InterfaceType type) override {
+        return type == QAccessible::ActionInterface ? static_cast<QAccessibleActionInterface*>(this) : nullptr;
+    }
+    QStringList actionNames() const override {
+        return {pressAction()};
+    }
+    void doAction(const QString& name) override {
+        if (name == pressAction()) {
+            button().press();
+        }
+    }
+    QStringList keyBindingsForAction(const QString&) const override {
+        return {};
+    }
+
+private:
+    FrameButton& button() const {
+        return *static_cast<FrameButton*>(object());
     }
 };
 
@@ -187,9 +276,13 @@ QAccessibleInterface* answerForWidget(QWidget& widget) {
     if (window && window->widget() == &widget && window->accessibleRole() != 0) {
         return new AccessibleWindow(&widget, static_cast<QAccessible::Role>(window->accessibleRole()));
     }
-    if (window && window->widget() != &widget && qobject_cast<QMainWindow*>(&widget)) {
-        // The inside of a child frame, which is a window for its parts only.
-        return new QAccessibleWidget(&widget, QAccessible::Client);
+    if (window && qobject_cast<QMainWindow*>(&widget)) {
+        // The inside of a child frame is a window for its parts only.
+        const bool isFrame = window->widget() == &widget;
+        return isFrame ? new AccessibleFrame(&widget) : new QAccessibleWidget(&widget, QAccessible::Client);
+    }
+    if (window && qobject_cast<QMdiSubWindow*>(&widget)) {
+        return new AccessibleFrame(&widget);
     }
     return qobject_cast<QToolBar*>(&widget) ? new AccessibleBar(&widget) : nullptr;
 }
@@ -197,6 +290,9 @@ QAccessibleInterface* answerForWidget(QWidget& widget) {
 QAccessibleInterface* answer(const QString& className, QObject* object) {
     if (auto* action = qobject_cast<QAction*>(object)) {
         return answerForAction(*action);
+    }
+    if (auto* button = dynamic_cast<FrameButton*>(object)) {
+        return new AccessibleFrameButton(*button);
     }
     auto* widget = qobject_cast<QWidget*>(object);
     if (widget && className == QLatin1String("QToolBarSeparator")) {

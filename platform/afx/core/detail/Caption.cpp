@@ -103,9 +103,10 @@ struct Part {
 };
 
 /// The parts of a caption in front of its label. A maximised window has a restore button in the place of the other.
-constexpr std::array parts{Part{HTCLOSE, QStyle::SC_TitleBarCloseButton}, Part{HTMAXBUTTON, QStyle::SC_TitleBarMaxButton},
-                           Part{HTMAXBUTTON, QStyle::SC_TitleBarNormalButton},
-                           Part{HTMINBUTTON, QStyle::SC_TitleBarMinButton}, Part{HTSYSMENU, QStyle::SC_TitleBarSysMenu}};
+constexpr std::array parts{
+    Part{HTCLOSE, QStyle::SC_TitleBarCloseButton}, Part{HTMAXBUTTON, QStyle::SC_TitleBarMaxButton},
+    Part{HTMAXBUTTON, QStyle::SC_TitleBarNormalButton}, Part{HTMINBUTTON, QStyle::SC_TitleBarMinButton},
+    Part{HTSYSMENU, QStyle::SC_TitleBarSysMenu}};
 
 QStyle::SubControl controlOf(int code, bool maximized) {
     if (code == HTMAXBUTTON) {

@@ -1,8 +1,8 @@
 #include "platform/afx/core/detail/CaptionMouse.h"
 
 #include "platform/afx/core/WindowCalls.h"
-#include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Caption.h"
+#include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MenuWidgets.h"

@@ -38,10 +38,10 @@ private:
 
     Window& m_window;
     Caption& m_caption;
-    int m_part = 0;      ///< the part that is held, 0 for none
+    int m_part = 0;       ///< the part that is held, 0 for none
     bool m_began = false; ///< the window follows the mouse by hand
-    QPoint m_from;       ///< where the part was pressed, in screen coordinates
-    QRect m_place;       ///< the window's rectangle at that time
+    QPoint m_from;        ///< where the part was pressed, in screen coordinates
+    QRect m_place;        ///< the window's rectangle at that time
 };
 
 } // namespace tvx::afx

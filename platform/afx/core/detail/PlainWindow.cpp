@@ -91,9 +91,10 @@ Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle) {
     if ((style & WS_CAPTION) != WS_CAPTION) {
         return flags | Qt::FramelessWindowHint;
     }
-    // Of a caption that the window draws itself the desktop must not hear. Else the toolkit adds all buttons of a caption
-    // by itself without the first of the hints.
-    flags |= (exStyle & WS_EX_OWNCAPTION) != 0 ? Qt::FramelessWindowHint : Qt::CustomizeWindowHint | Qt::WindowTitleHint;
+    // Of a caption that the window draws itself the desktop must not hear. Else the toolkit adds all buttons of a
+    // caption by itself without the first of the hints.
+    flags |=
+        (exStyle & WS_EX_OWNCAPTION) != 0 ? Qt::FramelessWindowHint : Qt::CustomizeWindowHint | Qt::WindowTitleHint;
     if ((style & WS_SYSMENU) != 0) {
         flags |= Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint;
     }

@@ -1,8 +1,10 @@
 #include "platform/afx/core/detail/Window.h"
 
 #include "platform/afx/core/Wnd.h"
+#include "platform/afx/core/detail/Caption.h"
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Dispatch.h"
+#include "platform/afx/core/detail/FrameButton.h"
 #include "platform/afx/core/detail/HandleWatches.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/MessageQueue.h"
@@ -376,6 +378,21 @@ int Window::hitTest(QPoint) const {
     return HTCLIENT;
 }
 
+void Window::setFrameButton(const QString& name, const QRect* place, UINT command) {
+    const QRect within = place ? place->translated(wholeRect().topLeft()) : QRect();
+    if (!place) {
+        m_frameButton.reset();
+    } else if (!m_frameButton || m_frameButton->name() != name || m_frameButton->command() != command) {
+        m_frameButton = std::make_unique<FrameButton>(*this, name, command);
+    }
+    if (m_frameButton) {
+        m_frameButton->setPlace(within);
+    }
+    if (Caption* own = caption()) {
+        own->setButton(within);
+    }
+}
+
 // --- place and size ---
 
 QRect Window::windowRect() const {
@@ -400,6 +417,14 @@ void Window::setWindowRect(const QRect& rect) {
     }
     const QPoint origin = m_parent ? m_parent->clientRect().topLeft() : QPoint();
     m_widget->setGeometry(rect.translated(origin));
+}
+
+QRect Window::wholeRect() const {
+    if (!m_widget) {
+        return {};
+    }
+    const QRect screen = screenRect();
+    return {m_widget->mapFromGlobal(screen.topLeft()), screen.size()};
 }
 
 QRect Window::screenRect() const {
@@ -564,6 +589,7 @@ void Window::unlink() {
         m_object = nullptr;
     }
     dropTemporary();
+    m_frameButton.reset();
     m_placement.reset();
     foundLast.store(nullptr, std::memory_order_relaxed);
     tables().byHandle.erase(reinterpret_cast<std::uintptr_t>(m_handle));

@@ -21,6 +21,7 @@ class CWnd;
 namespace tvx::afx {
 
 class Caption;
+class FrameButton;
 
 /// One window. Each kind of window (plain child, top-level frame, dialog, each control) derives from it and brings the
 /// widget and the default procedure of its kind; the CWnd attached to it, if any, sees every message first.
@@ -136,6 +137,14 @@ public:
     }
     /// The part of the window (HT...) at a point of the screen.
     virtual int hitTest(QPoint screen) const;
+    /// The whole window in its widget's coordinates. A frame that the desktop draws reaches beyond the widget.
+    QRect wholeRect() const;
+    /// The button that its host draws into its frame, null for none; setFrameButton makes, moves or ends (null) it. The
+    /// place counts from the window's corner.
+    FrameButton* frameButton() const {
+        return m_frameButton.get();
+    }
+    void setFrameButton(const QString& name, const QRect* place, UINT command);
     /// Asks for the part around the client area to be painted: caption, border, menu bar.
     virtual void updateFrame() {}
     /// Told that its widget was maximised, minimised or brought back.
@@ -243,6 +252,7 @@ private:
     CWnd* m_object = nullptr;
     std::unique_ptr<CWnd> m_temporary;
     std::unique_ptr<Placement> m_placement;
+    std::unique_ptr<FrameButton> m_frameButton;
     DWORD m_style = 0;
     DWORD m_exStyle = 0;
     int m_id = 0;

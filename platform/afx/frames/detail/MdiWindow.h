@@ -64,7 +64,8 @@ private:
     bool m_roomKnown = false;
 };
 
-/// A child frame: a caption, which the toolkit draws and moves it by, around a main window of its own, with bars and a pane.
+/// A child frame: a caption, which the toolkit draws and moves it by, around a main window of its own, with bars and a
+/// pane.
 class TVX_PLATFORM_API MdiChildWindow : public Window {
 public:
     explicit MdiChildWindow(const CREATESTRUCT& cs);

@@ -365,6 +365,27 @@ TEST_F(Core, AHandlerMayCatchWhatACallThrows) {
     EXPECT_TRUE(caught);
 }
 
+TEST_F(Core, HandlersKnowThatTheyRunDuringAnActivation) {
+    bool isSeen = false;
+    const auto look = [&] { isSeen = AfxIsActivating(); };
+    view.on[WM_APP] = look;
+    frame.on[WM_COMMAND] = look;
+    frame.SendMessage(WM_COMMAND, 1);
+    EXPECT_FALSE(isSeen);
+    for (const UINT message :
+         {WM_ACTIVATE, WM_NCACTIVATE, WM_MDIACTIVATE, WM_MOUSEACTIVATE, WM_SETFOCUS, WM_KILLFOCUS}) {
+        isSeen = false;
+        frame.on = {{message, [this] {
+                         view.SendMessage(WM_APP);
+                         fail();
+                     }}};
+        EXPECT_THROW(frame.SendMessage(message), std::runtime_error);
+        EXPECT_TRUE(isSeen) << message << ": in a message sent from the handler";
+        EXPECT_FALSE(AfxIsActivating()) << message;
+    }
+    frame.on.clear();
+}
+
 TEST_F(Core, QuittingEndsEveryLoop) {
     tvx::afx::ModalLoop outer;
     view.on[WM_APP + 1] = [] {

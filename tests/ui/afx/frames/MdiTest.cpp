@@ -88,6 +88,69 @@ TEST_F(Mdi, ActivationBringsMenuFocusAndCommands) {
     EXPECT_TRUE(noted("draw")) << "the document type's accelerators";
 }
 
+namespace {
+
+/// A frame beside the main frame, which hands on to that one what it does not know.
+class BesideFrame : public NoteFrame {
+public:
+    NoteView* open() {
+        CCreateContext context;
+        context.m_pNewViewClass = RUNTIME_CLASS(NoteView);
+        EXPECT_TRUE(LoadFrame(IDR_TESTMAIN, WS_OVERLAPPEDWINDOW, nullptr, &context));
+        InitialUpdateFrame(nullptr, TRUE);
+        EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(*this)));
+        settle();
+        return static_cast<NoteView*>(GetActiveView());
+    }
+    BOOL OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) override {
+        return NoteFrame::OnCmdMsg(id, code, extra, info) || AfxGetMainWnd()->OnCmdMsg(id, code, extra, info);
+    }
+};
+
+} // namespace
+
+TEST_F(Mdi, ARoutingFrameHasThePlaceOfTheActiveChild) {
+    const auto* inside = static_cast<NoteView*>(open()->GetActiveView());
+    auto* beside = new BesideFrame;
+    const NoteView* outside = beside->open();
+    frame->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_TRUE(inside->grid) << "without a routing frame nothing is different";
+    EXPECT_EQ(AfxSetRoutingFrame(frame), nullptr);
+    frame->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_FALSE(inside->grid);
+    EXPECT_EQ(AfxSetRoutingFrame(beside), frame);
+    frame->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_TRUE(!inside->grid && outside->grid);
+    const std::pair<UINT, const CCmdTarget*> handlers[] = {{ID_TEST_GRID, outside},
+                                                           {ID_TEST_FRAME, beside},
+                                                           {ID_WINDOW_CASCADE, frame},
+                                                           {ID_HELP, beside},
+                                                           {ID_APP_EXIT, AfxGetApp()}};
+    for (const auto& [id, handler] : handlers) {
+        AFX_CMDHANDLERINFO info;
+        EXPECT_TRUE(frame->OnCmdMsg(id, CN_COMMAND, nullptr, &info)) << id;
+        EXPECT_EQ(info.pTarget, handler) << id;
+    }
+    // A key of the main frame's only, one that both know, and those of the active child's.
+    const ACCEL entries[] = {{FVIRTKEY, VK_F9, ID_TEST_DRAW}, {FVIRTKEY, VK_F5, ID_TEST_GRID}};
+    frame->m_hAccelTable = CreateAcceleratorTable(entries, 2);
+    journal().clear();
+    for (const Qt::Key pressed : {Qt::Key_F9, Qt::Key_F5, Qt::Key_F7}) {
+        key(pressed);
+    }
+    key(Qt::Key_F4, Qt::ControlModifier);
+    EXPECT_EQ(journal(), (std::vector<std::string>{"draw", "grid"}));
+    EXPECT_TRUE(!inside->grid && !outside->grid && frame->MDIGetActive());
+    beside->DestroyWindow();
+    EXPECT_EQ(AfxGetRoutingFrame(), nullptr);
+    frame->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_TRUE(inside->grid);
+    frame->SetActiveWindow();
+    EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(*frame)));
+    key(Qt::Key_F7);
+    EXPECT_EQ(journal(), (std::vector<std::string>{"draw", "grid", "grid", "draw"}));
+}
+
 TEST_F(Mdi, KeysWalkAndClose) {
     CMDIChildWnd* first = open();
     CMDIChildWnd* second = open();

@@ -307,3 +307,35 @@ TEST_F(FrameTest, TellsAssistiveToolsOfChildFramesOnce) {
   StaticText "Ready"
 )");
 }
+
+TEST_F(FrameTest, TellsAssistiveToolsOfAButtonInAFrame) {
+    BoardsFrame& frame = openBoards();
+    boards().OpenDocumentFile(nullptr);
+    settle();
+    for (CWnd* window : std::initializer_list<CWnd*>{frame.MDIGetActive(), &frame}) {
+        QWidget* widget = window->GetState()->widget();
+        QAccessibleInterface* whole = QAccessible::queryAccessibleInterface(widget);
+        const int parts = whole->childCount();
+        const CRect place(100, 4, 116, 18); // in the menu bar of one, the caption of the other
+        for (const char* name : {"Other", "Float"}) {
+            window->SetFrameButton(name, place, SC_MAXIMIZE);
+        }
+        CRect around;
+        window->GetWindowRect(around);
+        const QRect expected(around.left + 100, around.top + 4, 16, 14);
+        QAccessibleInterface* button = whole->childAt(expected.x() + 1, expected.y() + 1);
+        ASSERT_TRUE(button && whole->childCount() == parts + 1);
+        EXPECT_EQ(whole->child(parts), button);
+        EXPECT_EQ(whole->indexOfChild(button), parts);
+        EXPECT_EQ(button->parent(), whole);
+        EXPECT_EQ(accessibleTree(*button), "Button \"Float\"\n");
+        EXPECT_EQ(button->rect(), expected);
+        EXPECT_EQ(QApplication::widgetAt(expected.center()),
+                  widget == widgetOf(frame) ? widgetOf(frame)->menuWidget() : widget);
+        button->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+        settle();
+        EXPECT_TRUE(window->IsZoomed());
+        window->SetFrameButton("Float", nullptr, 0);
+        EXPECT_EQ(whole->childCount(), parts);
+    }
+}
