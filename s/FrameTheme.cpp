@@ -1,8 +1,9 @@
 #include "s/FrameTheme.h"
 
+#include "platform/win/Module.h"
 #include "platform/win/ResourceLibrary.h"
-#include "s/MainWindow.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <utility>
 
@@ -53,7 +54,7 @@ void ThemeLibrary::unload() {
 
 // --- the process's own ---
 
-FrameTheme::FrameTheme(ThemeLibrary library) : m_library(library) {}
+FrameTheme::FrameTheme(std::function<ThemeLibrary()> load) : m_load(std::move(load)) {}
 
 FrameTheme::~FrameTheme() {
     close();
@@ -106,7 +107,7 @@ bool FrameTheme::loadLibrary() {
     if (m_library.module) {
         return true;
     }
-    m_library = ThemeLibrary::load();
+    m_library = m_load();
     const bool used = m_library.module && m_library.isThemeActive && m_library.isThemeActive() &&
                       m_library.isAppThemed && m_library.isAppThemed();
     switchedOn = used;
@@ -141,8 +142,7 @@ COLORREF FrameTheme::color(int index) const {
 }
 
 int FrameTheme::size(int index) const {
-    return m_theme && m_library.getThemeSysSize ? m_library.getThemeSysSize(m_theme, index)
-                                                : ::GetSystemMetrics(index);
+    return m_theme && m_library.getThemeSysSize ? m_library.getThemeSysSize(m_theme, index) : ::GetSystemMetrics(index);
 }
 
 /// Asks the main window from its right edge leftwards for its minimise button, beside which the button goes.
@@ -231,8 +231,8 @@ CRect signPlace(const CDC& dc, CSize size, COLORREF sign) {
     for (int y = size.cy / 2 + 1; y < size.cy - 1; ++y) {
         for (int x = 1; x < size.cx - 1; ++x) {
             if (dc.GetPixel(x, y) == sign) {
-                place = CRect(std::min<int>(place.left, x), std::min<int>(place.top, y),
-                              std::max<int>(place.right, x), std::max<int>(place.bottom, y));
+                place = CRect(std::min<int>(place.left, x), std::min<int>(place.top, y), std::max<int>(place.right, x),
+                              std::max<int>(place.bottom, y));
             }
         }
     }
@@ -282,7 +282,7 @@ std::unique_ptr<Gui_Bitmap> FrameTheme::render(CWnd& window, const Picture& pict
 namespace {
 
 bool isActive(const CFrameWnd& frame) {
-    const CFrameWnd* top = frame.GetTopLevelFrame();
+    const CWnd* top = frame.GetTopLevelParent();
     return top && top == CWnd::GetActiveWindow();
 }
 
@@ -313,7 +313,7 @@ bool FrameTheme::signColor(const CFrameWnd& frame, COLORREF& color) const {
         return false;
     }
     const bool active = isActive(frame);
-    color = isInMenuBar(frame) ? m_colors[active ? MenuSign : MenuGreySign]
-                               : m_colors[active ? ActiveSign : InactiveSign];
+    color =
+        isInMenuBar(frame) ? m_colors[active ? MenuSign : MenuGreySign] : m_colors[active ? ActiveSign : InactiveSign];
     return true;
 }

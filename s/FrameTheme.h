@@ -5,7 +5,11 @@
 #include "s/Export.h"
 
 #include <array>
+#include <functional>
 #include <memory>
+
+/// @file
+/// Not for hosts: the desktop's visual style, for the floating frames.
 
 /// The visual-styles library: its entry points, each null where it is missing.
 struct ThemeLibrary {
@@ -18,24 +22,26 @@ struct ThemeLibrary {
     LONG (*closeThemeData)(Theme theme) = nullptr;
     COLORREF (*getThemeSysColor)(Theme theme, int index) = nullptr;
     int (*getThemeSysSize)(Theme theme, int index) = nullptr;
-    LONG (*drawThemeBackground)(Theme theme, HDC dc, int part, int state, const RECT* place, const RECT* clip) = nullptr;
+    LONG (*drawThemeBackground)(Theme theme, HDC dc, int part, int state, const RECT* place,
+                                const RECT* clip) = nullptr;
 
     /// Loads it; without one the module and all entry points are null.
-    static ThemeLibrary load();
+    GUI_API static ThemeLibrary load();
     void unload();
 };
 
 /// What floating frames need to draw their button in the desktop's style: its place in captions and menu bars, its
 /// colours and six pictures of it. One for the process, made for the first floating frame and gone with the last one.
 ///
-/// Pictures are the style's minimise button with its sign taken out. Everything that is missing (the library, one of its
-/// functions, the style, a minimise button) ends in no pictures: frames then draw a button of their own.
+/// Pictures are the style's minimise button with its sign taken out. Everything that is missing (the library, one of
+/// its functions, the style, a minimise button) ends in no pictures: frames then draw a button of their own.
 ///
 /// Used on the thread of the user interface only.
 class GUI_API FrameTheme {
 public:
-    /// One that uses `library`, for tests; frames share that of `acquire`.
-    explicit FrameTheme(ThemeLibrary library = {});
+    /// Frames share the one of `acquire`.
+    /// @param load gives the visual-styles library when it is needed first; tests have others
+    explicit FrameTheme(std::function<ThemeLibrary()> load = &ThemeLibrary::load);
     ~FrameTheme();
     FrameTheme(const FrameTheme&) = delete;
     FrameTheme& operator=(const FrameTheme&) = delete;
@@ -87,6 +93,7 @@ private:
     int size(int index) const;
     COLORREF color(int index) const;
 
+    std::function<ThemeLibrary()> m_load;
     ThemeLibrary m_library;
     ThemeLibrary::Theme m_theme = nullptr;
     int m_references = 0;

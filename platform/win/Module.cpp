@@ -110,7 +110,7 @@ void ModuleTable::remove(const void* data) {
         return;
     }
     module->remove(data);
-    if (module->isEmpty() && base != applicationBase()) {
+    if (module->isEmpty() && module->uses == 0 && base != applicationBase()) {
         std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
     }
 }
@@ -128,19 +128,61 @@ HMODULE ModuleTable::useFile(const std::string& path) {
 
 HMODULE ModuleTable::addFile(std::string path, std::vector<std::uint8_t> bytes) {
     const std::scoped_lock lock(m_mutex);
-    return m_modules.emplace_back(std::make_unique<Module>(std::move(path), std::move(bytes)))->handle();
+    Module& module = *m_modules.emplace_back(std::make_unique<Module>(std::move(path), std::move(bytes)));
+    module.uses = 1;
+    return module.handle();
 }
 
-bool ModuleTable::releaseFile(HMODULE handle) {
+HMODULE ModuleTable::useCode(void* code) {
+    link_map* base = nullptr;
+    dlinfo(code, RTLD_DI_LINKMAP, &base);
     const std::scoped_lock lock(m_mutex);
-    Module* module = byHandle(handle);
-    if (!module || !module->isResourceLibrary()) {
-        return false;
+    Module* module = byBase(base);
+    if (!module) {
+        module = m_modules.emplace_back(std::make_unique<Module>(base)).get();
     }
-    if (--module->uses == 0) {
-        std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+    module->code = code;
+    ++module->uses;
+    return module->handle();
+}
+
+bool ModuleTable::release(HMODULE handle) {
+    void* code = nullptr;
+    {
+        const std::scoped_lock lock(m_mutex);
+        Module* module = handle ? byHandle(handle) : nullptr;
+        if (!module || module->uses == 0) {
+            return false;
+        }
+        code = module->code;
+        // One with resources goes when it takes them back, which may be never: something else may hold its file.
+        if (--module->uses == 0 && (module->isResourceLibrary() || module->isEmpty())) {
+            std::erase_if(m_modules, [&](const auto& owned) { return owned.get() == module; });
+        }
+    }
+    if (code) {
+        dlclose(code); // outside of the lock: what is unloaded takes its resources back
     }
     return true;
+}
+
+void* ModuleTable::symbol(HMODULE handle, const char* name) {
+    const std::scoped_lock lock(m_mutex);
+    Module* module = byHandle(handle);
+    if (!module || module->isResourceLibrary()) {
+        return nullptr;
+    }
+    // By the name that the loader has for it: the file of that name may be another one by now.
+    const bool isApplication = module->base() == applicationBase();
+    void* code =
+        dlopen(isApplication ? nullptr : static_cast<const link_map*>(module->base())->l_name, RTLD_LAZY | RTLD_NOLOAD);
+    if (!code) {
+        return nullptr;
+    }
+    void* found = dlsym(code, name);
+    dlclose(code);
+    // The loader answers for the libraries below a module, too.
+    return loadBase(found) == module->base() ? found : nullptr;
 }
 
 HMODULE ModuleTable::application() {
@@ -256,6 +298,16 @@ HMODULE GetModuleHandleA(LPCSTR name) {
         SetLastError(ERROR_MOD_NOT_FOUND);
     }
     return module;
+}
+
+FARPROC GetProcAddress(HMODULE module, LPCSTR name) {
+    // Numbers in the place of names are below all addresses.
+    const bool isName = reinterpret_cast<std::uintptr_t>(name) > 0xFFFF;
+    void* const found = isName ? tvx::detail::ModuleTable::instance().symbol(module, name) : nullptr;
+    if (!found) {
+        SetLastError(ERROR_PROC_NOT_FOUND);
+    }
+    return reinterpret_cast<FARPROC>(found);
 }
 
 DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size) {

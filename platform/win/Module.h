@@ -1,9 +1,9 @@
 #pragma once
 
 /// @file
-/// Modules: the application, every shared library that brought resources, and the resource libraries that were loaded
-/// (ResourceLibrary.h). A module's handle is valid from the moment its file is loaded until it is unloaded; only
-/// handles of resource libraries are freed.
+/// Modules: the application, every shared library that brought resources, and what was loaded by name
+/// (ResourceLibrary.h): resource libraries and libraries of code. A module's handle is valid from the moment its file
+/// is loaded until it is unloaded; only what was loaded by name is freed.
 
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
@@ -24,6 +24,15 @@ TVX_PLATFORM_API HMODULE GetModuleHandleA(LPCSTR name);
 /// not fit is cut, the result is then `size` and the last error `ERROR_INSUFFICIENT_BUFFER`. 0 when the module is
 /// unknown.
 TVX_PLATFORM_API DWORD GetModuleFileNameA(HMODULE module, LPSTR buffer, DWORD size);
+
+/// A function that some module exports, to be converted to the type that it has. Compilers convert this one to any
+/// other without a warning.
+using FARPROC = void (*)();
+
+/// The function `name` of a module, which it must export itself; a null module is the application.
+/// Null with `ERROR_PROC_NOT_FOUND` when it has none, and for resource libraries, which have no code. Functions have no
+/// numbers here.
+TVX_PLATFORM_API FARPROC GetProcAddress(HMODULE module, LPCSTR name);
 
 /// @copydoc GetModuleHandleA
 inline HMODULE GetModuleHandle(LPCSTR name) {

@@ -6,6 +6,7 @@
 #include "platform/win/Locale.h"
 #include "platform/win/Module.h"
 #include "platform/win/ResourceConstants.h"
+#include "platform/win/detail/CodeModule.h"
 #include "platform/win/detail/ModuleTable.h"
 
 #include <array>
@@ -40,6 +41,10 @@ void addFolderOf(std::vector<std::string>& folders, HMODULE module) {
     }
 }
 
+bool hasFolder(std::string_view name) {
+    return name.find_first_of("/\\:") != std::string_view::npos;
+}
+
 std::vector<std::string> searchFolders(std::string_view name) {
     std::vector<std::string> folders;
     const std::string base(name.substr(0, name.rfind('.')));
@@ -63,7 +68,7 @@ std::vector<std::string> searchFolders(std::string_view name) {
 
 // The system's name of the file that is meant.
 std::optional<std::string> locate(std::string_view name) {
-    if (name.find_first_of("/\\:") != std::string_view::npos) {
+    if (hasFolder(name)) {
         return isAbsolute(name) ? tvx::systemPath(name) : std::nullopt;
     }
     for (const std::string& folder : searchFolders(name)) {
@@ -100,10 +105,14 @@ HMODULE LoadLibraryA(LPCSTR name) {
         SetLastError(ERROR_INVALID_PARAMETER);
         return nullptr;
     }
-    const auto path = locate(name);
+    const bool meansCode = tvx::detail::meansCode(name);
+    const auto path = meansCode ? tvx::detail::locateCode(name) : locate(name);
     if (!path || !isRegularFile(*path)) {
         SetLastError(ERROR_MOD_NOT_FOUND);
         return nullptr;
+    }
+    if (meansCode || (hasFolder(name) && tvx::detail::isCode(*path))) {
+        return tvx::detail::loadCode(*path);
     }
     std::error_code error;
     const fs::path resolved = fs::canonical(*path, error);
@@ -123,7 +132,7 @@ HMODULE LoadLibraryA(LPCSTR name) {
 }
 
 BOOL FreeLibrary(HMODULE library) {
-    if (library && ModuleTable::instance().releaseFile(library)) {
+    if (library && ModuleTable::instance().release(library)) {
         return TRUE;
     }
     SetLastError(ERROR_INVALID_HANDLE);

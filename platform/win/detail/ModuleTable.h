@@ -37,8 +37,10 @@ public:
     [[nodiscard]] bool isResourceLibrary() const {
         return m_base == nullptr;
     }
-    /// How often a resource library was asked for and not given back.
-    int uses = 1;
+    /// How often it was asked for by name and not given back.
+    int uses = 0;
+    /// What the loader gave for it when it was asked for first; null for what it loaded by itself.
+    void* code = nullptr;
     /// The file's full path with links resolved; worked out when first asked for.
     const std::string& path();
 
@@ -69,10 +71,14 @@ public:
 
     /// The resource library of that path, used once more; null when it is not loaded.
     [[nodiscard]] HMODULE useFile(const std::string& path);
-    /// Keeps a resource library.
+    /// Keeps a resource library, used once.
     HMODULE addFile(std::string path, std::vector<std::uint8_t> bytes);
-    /// Ends one use of a resource library. False when `handle` is none.
-    bool releaseFile(HMODULE handle);
+    /// Uses a module with code once more: what the loader gave for it, which counts the uses too.
+    HMODULE useCode(void* code);
+    /// Ends one use. False when `handle` is no module that is used.
+    bool release(HMODULE handle);
+    /// A function or variable that the module itself exports; null when it has none of that name.
+    [[nodiscard]] void* symbol(HMODULE handle, const char* name);
 
     [[nodiscard]] HMODULE application();
     [[nodiscard]] HMODULE fromAddress(const void* address);
