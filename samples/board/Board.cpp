@@ -2,6 +2,7 @@
 
 #include "BoardDoc.h"
 #include "BoardView.h"
+#include "DrawingFrame.h"
 #include "MainFrame.h"
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
@@ -101,7 +102,7 @@ int CBoardApp::ExitInstance() {
 }
 
 BOOL CBoardApp::ShowMainFrame(CBoardCommandLine& info) {
-    auto* drawings = new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CMDIChildWnd),
+    auto* drawings = new CMultiDocTemplate(IDR_BOARDTYPE, RUNTIME_CLASS(CBoardDoc), RUNTIME_CLASS(CDrawingFrame),
                                            RUNTIME_CLASS(CBoardView));
     AddDocTemplate(drawings);
     m_console.Init();

@@ -47,6 +47,9 @@ public:
     }
     /// Sets it, and draws all drawings anew.
     void SetGrid(int distance);
+    const CKeyboard& GetKeyboard() const {
+        return *m_keyboard;
+    }
     CCommandConsole& GetConsole() {
         return m_console;
     }

@@ -4,6 +4,7 @@
 #include "res/resource.h"
 #include "s/AccelDlg.h"
 #include "s/AccelProfile.h"
+#include "s/ExternFrame.h"
 
 #include <memory>
 
@@ -74,6 +75,12 @@ CKeyboard::CKeyboard(CMDIFrameWnd& main, CMultiDocTemplate& drawings) : m_main(m
     }
 }
 
+void CKeyboard::Apply(CFrameWnd& window) const {
+    if (m_keys) {
+        replace(window.m_hAccelTable, window.m_hMenuDefault, m_main.m_hMenuDefault, *m_keys);
+    }
+}
+
 void CKeyboard::Edit() {
     const Gui_AccelMap own = ownKeys();
     Gui_AccelMap now(own);
@@ -90,8 +97,12 @@ void CKeyboard::Edit() {
 }
 
 void CKeyboard::apply(const Gui_AccelMap& map) {
+    m_keys = map;
     replace(m_main.m_hAccelTable, m_main.m_hMenuDefault, m_drawings.m_hMenuShared, map);
     replace(m_drawings.m_hAccelTable, m_drawings.m_hMenuShared, m_main.m_hMenuDefault, map);
+    for (Gui_ExternFrame* window : Gui_ExternFrame::GetAll()) {
+        Apply(*window);
+    }
     // Open drawings have the handles that the template had; later ones take those that it has now.
     for (POSITION at = m_drawings.GetFirstDocPosition(); at;) {
         const CDocument* document = m_drawings.GetNextDoc(at);

@@ -17,10 +17,10 @@ constexpr UINT indicators[] = {ID_SEPARATOR, ID_INDICATOR_POSITION, ID_INDICATOR
 
 } // namespace
 
-IMPLEMENT_DYNCREATE(CMainFrame, CMDIFrameWnd)
+IMPLEMENT_DYNCREATE(CMainFrame, Gui_FloatMainFrame)
 
 // clang-format off
-BEGIN_MESSAGE_MAP(CMainFrame, CMDIFrameWnd)
+BEGIN_MESSAGE_MAP(CMainFrame, Gui_FloatMainFrame)
     ON_WM_CREATE()
     ON_WM_CLOSE()
     ON_COMMAND(ID_TOOLS_RUN_COMMAND, &CMainFrame::OnRunCommand)
@@ -34,11 +34,11 @@ END_MESSAGE_MAP()
 BOOL CMainFrame::PreCreateWindow(CREATESTRUCT& cs) {
     cs.cx = 1000;
     cs.cy = 700;
-    return CMDIFrameWnd::PreCreateWindow(cs);
+    return Gui_FloatMainFrame::PreCreateWindow(cs);
 }
 
 int CMainFrame::OnCreate(CREATESTRUCT* cs) {
-    if (CMDIFrameWnd::OnCreate(cs) == -1) {
+    if (Gui_FloatMainFrame::OnCreate(cs) == -1) {
         return -1;
     }
     constexpr DWORD style = WS_CHILD | WS_VISIBLE | CBRS_TOP | CBRS_TOOLTIPS | CBRS_FLYBY;
@@ -64,7 +64,7 @@ void CMainFrame::ActivateFrame(int command) {
         }
         Gui_Profile::ReadBarState(this, nullptr);
     }
-    CMDIFrameWnd::ActivateFrame(command);
+    Gui_FloatMainFrame::ActivateFrame(command);
 }
 
 void CMainFrame::saveWindows() {
@@ -83,7 +83,7 @@ void CMainFrame::saveWindows() {
 
 void CMainFrame::OnClose() {
     saveWindows();
-    CMDIFrameWnd::OnClose();
+    Gui_FloatMainFrame::OnClose();
 }
 
 void CMainFrame::OnRunCommand() {

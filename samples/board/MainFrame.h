@@ -2,10 +2,11 @@
 
 #include "afxext.h"
 #include "afxwin.h"
+#include "s/FloatMainFrame.h"
 
-/// The main window: tool bar, status bar, drawings in between. It comes up where it stood last, with its bars as they
-/// were.
-class CMainFrame : public CMDIFrameWnd {
+/// The main window: tool bar, status bar, drawings in between, which may be given windows of their own. It comes up
+/// where it stood last, with its bars as they were.
+class CMainFrame : public Gui_FloatMainFrame {
     DECLARE_DYNCREATE(CMainFrame)
 
 public:

@@ -2,6 +2,7 @@
 #define IDR_MAINFRAME 128
 #define IDR_BOARDTYPE 129
 #define IDR_CONTEXT 130
+#define IDR_BOARDFLOAT 131
 
 #define IDD_TEXT 101
 #define IDD_OUTPUT 102

@@ -294,7 +294,9 @@ void CFrameWnd::UpdateFrameTitleForDocument(LPCSTR documentName) {
     }
     const bool documentFirst = (GetStyle() & FWS_PREFIXTITLE) != 0;
     CString text = m_strTitle;
-    if (!name.IsEmpty()) {
+    if (m_strTitle.IsEmpty()) {
+        text = name;
+    } else if (!name.IsEmpty()) {
         text = documentFirst ? name + " - " + m_strTitle : m_strTitle + " - " + name;
     }
     // Called at idle times as well: hosts and the desktop are told of a caption only when it changes.

@@ -10,6 +10,8 @@
 #include "platform/afx/frames/detail/RoutingFrame.h"
 #include "platform/win/ExtensionModule.h"
 
+#include <algorithm>
+
 using namespace tvx::afx;
 
 IMPLEMENT_DYNCREATE(CMDIFrameWnd, CFrameWnd)
@@ -243,15 +245,7 @@ BOOL CMDIFrameWnd::OnCommand(WPARAM wParam, LPARAM lParam) {
     if (lParam != 0 || id < AFX_IDM_FIRST_MDICHILD) {
         return FALSE;
     }
-    const Window* client = Window::from(m_hWndMDIClient);
-    const std::size_t index = id - AFX_IDM_FIRST_MDICHILD;
-    if (client && index < client->children().size()) {
-        const HWND chosen = client->children()[index]->handle();
-        if (::IsIconic(chosen)) {
-            ::ShowWindow(chosen, SW_RESTORE);
-        }
-        ::SendMessageA(m_hWndMDIClient, WM_MDIACTIVATE, reinterpret_cast<WPARAM>(chosen), 0);
-    }
+    showListed(id - AFX_IDM_FIRST_MDICHILD);
     return TRUE;
 }
 
@@ -298,7 +292,7 @@ void CMDIFrameWnd::OnWindowNew() {
     }
 }
 
-// --- the list of child frames ---
+// --- the list of windows ---
 
 HMENU CMDIFrameWnd::GetWindowMenuPopup(HMENU menuBar) {
     const int count = ::GetMenuItemCount(menuBar);
@@ -315,39 +309,80 @@ HMENU CMDIFrameWnd::GetWindowMenuPopup(HMENU menuBar) {
     return nullptr;
 }
 
-void CMDIFrameWnd::listChildren(CMenu& popup) const {
+namespace {
+
+/// Takes the list out of a popup, and the line before it.
+void forgetListed(CMenu& popup) {
     for (int i = static_cast<int>(popup.GetMenuItemCount()) - 1; i >= 0; --i) {
         const UINT id = popup.GetMenuItemID(i);
         if (id >= AFX_IDM_FIRST_MDICHILD && id != static_cast<UINT>(-1)) {
             popup.DeleteMenu(static_cast<UINT>(i), MF_BYPOSITION);
             const bool first = i == 0 || popup.GetMenuItemID(i - 1) < AFX_IDM_FIRST_MDICHILD;
             if (first && i > 0 && popup.GetMenuItemID(i - 1) == 0) {
-                popup.DeleteMenu(static_cast<UINT>(i - 1), MF_BYPOSITION); // the line before the list
+                popup.DeleteMenu(static_cast<UINT>(i - 1), MF_BYPOSITION);
                 --i;
             }
         }
     }
-    const Window* client = Window::from(m_hWndMDIClient);
-    if (!client || client->children().empty()) {
+}
+
+} // namespace
+
+std::vector<HWND> CMDIFrameWnd::ListedWindows() const {
+    std::vector<HWND> windows;
+    if (const Window* client = Window::from(m_hWndMDIClient)) {
+        for (const Window* child : client->children()) {
+            windows.push_back(child->handle());
+        }
+    }
+    return windows;
+}
+
+void CMDIFrameWnd::ListWindows(CMenu& popup) const {
+    forgetListed(popup);
+    const std::vector<HWND> windows = ListedWindows();
+    if (windows.empty()) {
         return;
     }
+    // That of the frame that the user works in: a child frame stays its main frame's active one meanwhile.
+    HWND active = ::GetActiveWindow();
+    if (std::find(windows.begin(), windows.end(), active) == windows.end()) {
+        const CMDIChildWnd* child = MDIGetActive();
+        active = child ? child->m_hWnd : nullptr;
+    }
     popup.AppendMenu(MF_SEPARATOR);
-    const CMDIChildWnd* active = MDIGetActive();
     UINT number = 0;
-    for (const Window* child : client->children()) {
-        CString title(fromQt(child->text()).c_str());
+    for (const HWND window : windows) {
+        CString title(fromQt(Window::from(window)->text()).c_str());
         title.Replace("&", "&&");
         CString text;
         text.Format(number < 9 ? "&%u %s" : "%u %s", number + 1, title.GetString());
-        const bool isActive = active && active->m_hWnd == child->handle();
-        popup.AppendMenu(MF_STRING | (isActive ? MF_CHECKED : MF_UNCHECKED), AFX_IDM_FIRST_MDICHILD + number, text);
+        popup.AppendMenu(MF_STRING | (window == active ? MF_CHECKED : MF_UNCHECKED), AFX_IDM_FIRST_MDICHILD + number,
+                         text);
         ++number;
+    }
+}
+
+void CMDIFrameWnd::showListed(std::size_t index) {
+    const std::vector<HWND> windows = ListedWindows();
+    if (index >= windows.size()) {
+        return;
+    }
+    const HWND chosen = windows[index];
+    if (::IsIconic(chosen)) {
+        ::ShowWindow(chosen, SW_RESTORE);
+    }
+    if (::GetParent(chosen) == m_hWndMDIClient) {
+        ::SetForegroundWindow(m_hWnd);
+        ::SendMessageA(m_hWndMDIClient, WM_MDIACTIVATE, reinterpret_cast<WPARAM>(chosen), 0);
+    } else {
+        ::SetForegroundWindow(chosen);
     }
 }
 
 void CMDIFrameWnd::OnInitMenuPopup(CMenu* popup, UINT index, BOOL systemMenu) {
     if (!systemMenu && popup && popup->m_hMenu == GetWindowMenuPopup(::GetMenu(m_hWnd))) {
-        listChildren(*popup);
+        ListWindows(*popup);
     }
     CFrameWnd::OnInitMenuPopup(popup, index, systemMenu);
 }

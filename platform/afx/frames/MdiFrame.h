@@ -66,6 +66,9 @@ public:
                                  HACCEL accelerators = nullptr);
     /// The popup that lists the child frames, null when `menuBar` has none.
     virtual HMENU GetWindowMenuPopup(HMENU menuBar);
+    /// Lists the windows of the application at the end of a popup, in place of the list that is there. A choice from it
+    /// is a command from AFX_IDM_FIRST_MDICHILD up, for this frame.
+    void ListWindows(CMenu& popup) const;
 
     BOOL OnCreateClient(CREATESTRUCT* cs, CCreateContext* context) override;
     BOOL PreTranslateMessage(MSG* message) override;
@@ -90,11 +93,13 @@ public:
 protected:
     friend class CMDIChildWnd;
     BOOL OnCommand(WPARAM wParam, LPARAM lParam) override;
+    /// What that list has, in its order: the child frames. Derived frames may add windows of their own.
+    virtual std::vector<HWND> ListedWindows() const;
 
     DECLARE_MESSAGE_MAP()
 
 private:
-    void listChildren(CMenu& popup) const;
+    void showListed(std::size_t index);
 };
 
 /// A document's frame inside a CMDIFrameWnd. It has no menu of its own: that of its document template stands in the

@@ -82,13 +82,13 @@ await "it is restored" restored
 await "it goes back to where it was before" frame_is "$place"
 close
 
-# drag_bar X Y: takes the tool bar's grip, at its left end below the menu, to a point inside the frame.
+# drag_bar X Y: takes the tool bar's grip, at its left end below caption and menu, to a point inside the frame.
 drag_bar() {
     local X=0 Y=0 WIDTH=0 HEIGHT=0 i
     eval "$(inside)"
-    xdotool mousemove $((X + 6)) $((Y + 34)) mousedown 1
+    xdotool mousemove $((X + 10)) $((Y + 62)) mousedown 1
     for i in 1 2 3 4 5 6; do
-        xdotool mousemove $((X + 6 + ($1 - 6) * i / 6)) $((Y + 34 + ($2 - 34) * i / 6))
+        xdotool mousemove $((X + 10 + ($1 - 10) * i / 6)) $((Y + 62 + ($2 - 62) * i / 6))
     done
     xdotool mouseup 1
 }

@@ -26,6 +26,8 @@ const std::map<UINT, std::string> strings = {
     {20035, "unavailable"},
     {20036, "checked"},
     {20037, "Press the key a second time to be done."},
+    {20038, "Give this view a window of its own, or bring it back\nFloat"},
+    {20039, "Bring all views with windows of their own back\nDock All"},
     {20045, "Command %1>"},
     {20046, "Find: %1"},
     {20047, "Status: %1"},

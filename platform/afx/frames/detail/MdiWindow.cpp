@@ -72,12 +72,30 @@ Window* MdiClientWindow::heldChildFrame() const {
 
 namespace {
 
-/// Tells when it comes up.
+/// Tells when it comes up, and keeps a widget at its foot.
 class Area : public QMdiArea {
 public:
     Area(QWidget* parent, std::function<void()> shown) : QMdiArea(parent), m_shown(std::move(shown)) {}
 
+    void placeFoot() {
+        const int height = m_foot && !m_foot->isHidden() ? m_foot->sizeHint().height() : 0;
+        if (viewportMargins().bottom() != height) {
+            setViewportMargins(0, 0, 0, height);
+        }
+        if (height > 0) {
+            const QRect room = contentsRect();
+            m_foot->setGeometry(room.left(), viewport()->geometry().bottom() + 1, room.width(), height);
+        }
+    }
+
+    QPointer<QWidget> m_foot;
+
 protected:
+    void resizeEvent(QResizeEvent* event) override {
+        QMdiArea::resizeEvent(event);
+        placeFoot();
+    }
+
     void showEvent(QShowEvent* event) override {
         QMdiArea::showEvent(event);
         storing(m_shown);
@@ -102,6 +120,15 @@ QWidget* MdiClientWindow::makeWidget(QWidget* parent) {
 
 QMdiArea* MdiClientWindow::area() const {
     return static_cast<QMdiArea*>(widget());
+}
+
+void MdiClientWindow::setFoot(QWidget* foot) {
+    static_cast<Area*>(widget())->m_foot = foot;
+    placeFoot();
+}
+
+void MdiClientWindow::placeFoot() {
+    guarded([this] { static_cast<Area*>(widget())->placeFoot(); });
 }
 
 QWidget* MdiClientWindow::clientWidget() const {

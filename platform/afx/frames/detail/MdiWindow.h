@@ -35,6 +35,11 @@ public:
     void forget(const MdiChildWindow& child);
     /// Where a new child frame goes that asks for no place: each a little lower and further right than the last.
     QRect nextPlace(const MdiChildWindow& child);
+    /// Puts a widget of the area along its lower edge, below the room of the child frames, which gets smaller while the
+    /// widget is shown.
+    void setFoot(QWidget* foot);
+    /// Follows a change of its height, or that it was shown or hidden.
+    void placeFoot();
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;

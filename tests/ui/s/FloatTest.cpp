@@ -1,0 +1,359 @@
+// Views that get windows of their own and come back: by the mouse, by menus and keys, by program.
+#include "tests/ui/s/FloatTesting.h"
+
+#include "platform/win/Registry.h"
+#include "s/FloatPlaces.h"
+#include "tests/ui/afx/frames/SettingsFolder.h"
+
+#include <algorithm>
+
+using namespace frametest;
+
+namespace {
+
+using Lines = std::vector<std::string>;
+
+std::size_t floating() {
+    return Gui_ExternFrame::GetAll().size();
+}
+
+TEST_F(FloatTest, AViewMovesWithAllThatItHolds) {
+    PadFrame& frame = open();
+    PadView& view = viewOf(frame);
+    const HWND child = frame.m_hWnd;
+    const HWND moved = view.m_hWnd;
+    view.edit.SetWindowText("one\r\ntwo\r\nthree");
+    view.edit.SetFocus();
+    view.edit.SetSel(5, 8);
+    const HICON icon = ::LoadIcon(nullptr, MAKEINTRESOURCE(32515));
+    frame.SetIcon(icon, FALSE);
+    const std::string title = titleOf(frame);
+    journal().clear();
+
+    PadWindow& window = floated(frame);
+    EXPECT_EQ(journal(), (Lines{"load before", "load after", "set before", "set after"}));
+    EXPECT_FALSE(::IsWindow(child));
+    EXPECT_EQ(view.m_hWnd, moved);
+    EXPECT_EQ(window.GetActiveView(), &view);
+    EXPECT_EQ(titleOf(window).substr(0, title.size()), title);
+    EXPECT_EQ(window.GetIcon(FALSE), icon);
+    EXPECT_EQ(window.GetParent(), nullptr);
+    EXPECT_EQ(window.GetStyle() & 0xCF8000, 0xCF8000U);
+    EXPECT_EQ(CWnd::GetFocus(), &view.edit);
+    int from = 0;
+    int to = 0;
+    view.edit.GetSel(from, to);
+    EXPECT_EQ(from, 5);
+    EXPECT_EQ(to, 8);
+    EXPECT_EQ(window.tools().GetDockSide(), static_cast<UINT>(AFX_IDW_DOCKBAR_TOP));
+    EXPECT_EQ(window.status().GetCount(), 4);
+    window.SetStatusPaneText(1, "wide enough");
+    UINT id = 0;
+    UINT style = 0;
+    int width = 0;
+    window.status().GetPaneInfo(1, id, style, width);
+    EXPECT_EQ(window.status().GetPaneText(1), "wide enough");
+    EXPECT_GT(width, 30);
+
+    journal().clear();
+    const HWND outside = window.m_hWnd;
+    window.GetFloatHelp().UnripView();
+    settle();
+    PadFrame& docked = *active();
+    EXPECT_EQ(journal(), (Lines{"child before", "child after"}));
+    EXPECT_FALSE(::IsWindow(outside));
+    EXPECT_EQ(docked.GetActiveView(), &view);
+    EXPECT_EQ(docked.GetIcon(FALSE), icon);
+    EXPECT_EQ(docked.GetRipResourceId(), static_cast<unsigned>(IDR_TESTMAIN));
+    EXPECT_EQ(CWnd::GetFocus(), &view.edit);
+    view.edit.GetSel(from, to);
+    EXPECT_EQ(to, 8);
+    POSITION at = view.GetDocument()->GetFirstViewPosition();
+    EXPECT_EQ(view.GetDocument()->GetNextView(at), &view);
+    EXPECT_EQ(at, nullptr) << "the template's own view has gone";
+    EXPECT_EQ(floating(), 0U);
+}
+
+TEST_F(FloatTest, WhatCannotMoveStaysWhereItIs) {
+    PadFrame& frame = open();
+    Gui_FloatHelp& help = frame.GetFloatHelp();
+    const auto refuses = [&](const char* what) {
+        help.RipOutView();
+        settle();
+        EXPECT_EQ(floating(), 0U) << what;
+        EXPECT_EQ(active(), &frame) << what;
+        EXPECT_EQ(viewOf(frame).GetParentFrame(), &frame) << what;
+    };
+    frame.SetRipEnabled(false);
+    refuses("disabled");
+    main->GetFloatHelp().RipOutView();
+    EXPECT_EQ(floating(), 0U) << "disabled in the child frame, asked of the main one";
+    frame.SetRipEnabled(true);
+    frame.SetRipResourceId(0xFFFFFFFF);
+    EXPECT_FALSE(help.CanMove());
+    refuses("no resources");
+    frame.SetRipResourceId(IDR_TESTMAIN);
+    frame.SetRipOutFrame(RUNTIME_CLASS(NoteFrame));
+    refuses("a class of another kind");
+    frame.SetRipOutFrame(nullptr);
+    refuses("no class");
+    frame.SetRipOutFrame(RUNTIME_CLASS(PadWindow));
+    PadWindow::failsStatusBar = true;
+    refuses("a window that fails");
+    PadWindow::failsStatusBar = false;
+    frame.SetRipResourceId(999);
+    refuses("resources that are not there");
+    frame.SetRipResourceId(IDR_TESTMAIN);
+
+    // A splitter's view does not stand in the frame itself.
+    CWnd splitter;
+    splitter.Create(nullptr, nullptr, WS_CHILD | WS_VISIBLE, CRect(0, 0, 100, 100), &frame, 77);
+    viewOf(frame).SetParent(&splitter);
+    refuses("a splitter");
+    viewOf(frame).SetParent(&frame);
+    splitter.DestroyWindow();
+
+    PadWindow& window = floated(frame);
+    window.SetUnRipEnabled(false);
+    window.GetFloatHelp().UnripView();
+    EXPECT_EQ(floating(), 1U);
+    window.SetUnRipEnabled(true);
+}
+
+TEST_F(FloatTest, TheButtonTakesAPressAndMovesOnRelease) {
+    PadFrame& frame = open();
+    const CRect place = OpenHelp(frame.GetFloatHelp()).place(true);
+    CRect whole;
+    frame.GetWindowRect(&whole);
+    ASSERT_TRUE(whole.PtInRect(place.CenterPoint()));
+
+    press(frame, place.CenterPoint());
+    EXPECT_EQ(CWnd::GetCapture(), &frame);
+    release(frame, whole.CenterPoint());
+    EXPECT_EQ(CWnd::GetCapture(), nullptr);
+    EXPECT_EQ(floating(), 0U) << "released elsewhere";
+
+    // The rules themselves, with nothing pressed before.
+    EXPECT_EQ(frame.GetFloatHelp().OnNcLButtonUp(HTCAPTION, place.CenterPoint()), 0);
+    EXPECT_EQ(frame.GetFloatHelp().OnNcLButtonDown(HTCAPTION, place.TopLeft() - CPoint(1, 0)), 0);
+
+    press(frame, place.CenterPoint());
+    release(frame, place.CenterPoint());
+    ASSERT_EQ(floating(), 1U);
+    auto& window = static_cast<PadWindow&>(*Gui_ExternFrame::GetAll().front());
+    ASSERT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
+    settle();
+    const CRect back = OpenHelp(window.GetFloatHelp()).place(true);
+    press(window, back.CenterPoint());
+    EXPECT_EQ(CWnd::GetCapture(), &window);
+    release(window, back.CenterPoint());
+    EXPECT_EQ(floating(), 0U);
+    EXPECT_NE(active(), nullptr);
+}
+
+TEST_F(FloatTest, TheMainFrameHasTheButtonOfAMaximisedChildFrame) {
+    PadFrame& frame = open();
+    frame.MDIMaximize();
+    settle();
+    const CRect place = OpenHelp(main->GetFloatHelp()).place(true);
+    press(*main, place.CenterPoint());
+    EXPECT_EQ(CWnd::GetCapture(), main);
+    release(*main, place.CenterPoint());
+    EXPECT_EQ(floating(), 1U);
+    EXPECT_EQ(main->GetActiveView(), nullptr);
+    settle();
+
+    // With no child frame maximised there is no button, and nothing to press.
+    open().MDIRestore();
+    settle();
+    press(*main, place.CenterPoint());
+    release(*main, place.CenterPoint());
+    EXPECT_EQ(floating(), 1U);
+}
+
+TEST_F(FloatTest, SystemMenusHaveTheCommand) {
+    PadFrame& frame = open();
+    CMenu* menu = frame.GetSystemMenu(FALSE);
+    CString text;
+    menu->GetMenuString(GUI_ID_FLOAT_WINDOW, text, MF_BYCOMMAND);
+    EXPECT_EQ(text, "&Float Window");
+    menu->EnableMenuItem(GUI_ID_FLOAT_WINDOW, MF_GRAYED);
+    frame.SendMessage(WM_INITMENU, reinterpret_cast<WPARAM>(menu->m_hMenu));
+    EXPECT_EQ(menu->GetMenuState(GUI_ID_FLOAT_WINDOW, MF_BYCOMMAND) & MF_GRAYED, 0U);
+    frame.SendMessage(WM_SYSCOMMAND, GUI_ID_FLOAT_WINDOW);
+    settle();
+    ASSERT_EQ(floating(), 1U);
+    Gui_ExternFrame& window = *Gui_ExternFrame::GetAll().front();
+    window.GetSystemMenu(FALSE)->GetMenuString(GUI_ID_DOCK_WINDOW, text, MF_BYCOMMAND);
+    EXPECT_EQ(text, "&Dock Window");
+    window.SendMessage(WM_SYSCOMMAND, GUI_ID_DOCK_WINDOW);
+    settle();
+    EXPECT_EQ(floating(), 0U);
+}
+
+TEST_F(FloatTest, CommandsGoToTheFloatingViewWhileItIsActive) {
+    PadFrame& other = open();
+    PadWindow& window = floated(open());
+    EXPECT_EQ(AfxGetRoutingFrame(), &window);
+    journal().clear();
+    key(Qt::Key_D, Qt::ControlModifier); // an accelerator of both frames
+    EXPECT_EQ(journal(), Lines{"draw"});
+    main->SendMessage(WM_COMMAND, ID_TEST_GRID);
+    EXPECT_TRUE(viewOf(window).grid);
+    EXPECT_FALSE(viewOf(other).grid);
+    journal().clear();
+    window.SendMessage(WM_COMMAND, ID_TEST_ORPHAN);
+    EXPECT_EQ(journal(), Lines{"main"}) << "what only the main frame knows";
+
+    // A dialog of the frame's leaves it the one to ask.
+    CWnd dialog;
+    dialog.CreateEx(0, AfxRegisterWndClass(0), "Dialog", WS_POPUP | WS_CAPTION, 0, 0, 100, 100, window.m_hWnd, nullptr);
+    window.SendMessage(WM_ACTIVATE, WA_INACTIVE, reinterpret_cast<LPARAM>(dialog.m_hWnd));
+    EXPECT_EQ(AfxGetRoutingFrame(), &window);
+    dialog.DestroyWindow();
+    window.SendMessage(WM_ACTIVATE, WA_INACTIVE, reinterpret_cast<LPARAM>(main->m_hWnd));
+    EXPECT_EQ(AfxGetRoutingFrame(), nullptr);
+    window.SendMessage(WM_ACTIVATE, WA_ACTIVE);
+    main->SendMessage(WM_ACTIVATE, WA_ACTIVE);
+    EXPECT_EQ(AfxGetRoutingFrame(), nullptr) << "the dialog was followed by the main frame";
+
+    window.SetForegroundWindow();
+    settle();
+    HELPINFO help{};
+    help.cbSize = sizeof help;
+    help.iContextType = HELPINFO_WINDOW;
+    EXPECT_EQ(window.SendMessage(WM_HELP, 0, reinterpret_cast<LPARAM>(&help)), TRUE);
+}
+
+TEST_F(FloatTest, TheWindowMenuListsAllViews) {
+    open();
+    PadWindow& window = floated(open());
+    CMenu popup;
+    popup.CreatePopupMenu();
+    main->ListWindows(popup);
+    ASSERT_EQ(popup.GetMenuItemCount(), 3U) << "a line, the docked view, the floating one";
+    EXPECT_NE(popup.GetMenuState(2, MF_BYPOSITION) & MF_CHECKED, 0U) << "the one that is active";
+    main->SetForegroundWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(widgetOf(*main)));
+    window.SendMessage(WM_COMMAND, popup.GetMenuItemID(2));
+    EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
+    main->ListWindows(popup);
+    EXPECT_EQ(popup.GetMenuItemCount(), 3U) << "listed anew, not twice";
+
+    floated(*active());
+    EXPECT_EQ(floating(), 2U);
+    main->SendMessage(WM_COMMAND, GUI_ID_DOCK_ALL);
+    settle();
+    EXPECT_EQ(floating(), 0U);
+}
+
+TEST_F(FloatTest, ClosingAsksTheDocumentAndLeavesNothingBehind) {
+    PadWindow& window = floated(open());
+    viewOf(window).GetDocument()->SetModifiedFlag();
+    {
+        BoxAnswer cancel("Cancel");
+        window.SendMessage(WM_CLOSE);
+        main->SendMessage(WM_CLOSE);
+        EXPECT_EQ(cancel.texts.size(), 2U);
+        EXPECT_EQ(floating(), 1U);
+    }
+    Gui_ExternFrame::SetCloseAction(Gui_ExternFrame::CloseAction::DockBack);
+    window.SendMessage(WM_CLOSE);
+    settle();
+    EXPECT_EQ(floating(), 0U);
+    Gui_ExternFrame::SetCloseAction(Gui_ExternFrame::CloseAction::Close);
+
+    PadWindow& again = floated(*active());
+    viewOf(again).GetDocument()->SetModifiedFlag(FALSE);
+    const HWND self = again.m_hWnd;
+    main->SendMessage(WM_CLOSE);
+    settle();
+    EXPECT_FALSE(::IsWindow(self));
+    EXPECT_EQ(AfxGetMainWnd(), nullptr);
+}
+
+TEST_F(FloatTest, AMoveAskedForDuringActivationWaits) {
+    PadFrame& first = open();
+    open();
+    PadView::whenActivated = [&] {
+        first.GetFloatHelp().RipOutView();
+        EXPECT_EQ(floating(), 0U);
+    };
+    first.MDIActivate();
+    settle();
+    EXPECT_EQ(floating(), 1U);
+    PadView::whenActivated = [&] { Gui_ExternFrame::GetAll().front()->GetFloatHelp().UnripView(); };
+    main->SetForegroundWindow();
+    settle();
+    Gui_ExternFrame::GetAll().front()->SetForegroundWindow();
+    settle();
+    EXPECT_EQ(floating(), 0U);
+}
+
+TEST_F(FloatTest, WindowsComeUpWhereTheLastOneStood) {
+    PadWindow& first = floated(open());
+    first.MoveWindow(60, 70, 444, 333);
+    settle();
+    first.GetFloatHelp().UnripView();
+    PadWindow& second = floated(*active());
+    CRect place;
+    second.GetWindowRect(&place);
+    EXPECT_EQ(place, CRect(60, 70, 504, 403));
+    PadWindow& third = floated(open());
+    CRect beside;
+    third.GetWindowRect(&beside);
+    EXPECT_EQ(beside.Size(), place.Size());
+    EXPECT_NE(beside.TopLeft(), place.TopLeft());
+}
+
+// What a hasty user and a program in a loop do.
+TEST_F(FloatTest, NothingDanglesAfterManyMoves) {
+    const int count = 1000;
+    PadFrame* frame = &open();
+    frame->MDIMaximize();
+    PadView& view = viewOf(*frame);
+    for (int i = 0; i < count; ++i) {
+        if (i % 50 == 0) {
+            settle(); // as fast as keys come, for the others
+        }
+        frame->GetFloatHelp().RipOutView();
+        ASSERT_EQ(floating(), 1U);
+        Gui_ExternFrame::GetAll().front()->GetFloatHelp().UnripView();
+        frame = active();
+        ASSERT_NE(frame, nullptr);
+        ASSERT_EQ(frame->GetActiveView(), &view);
+    }
+    settle();
+    EXPECT_EQ(floating(), 0U);
+}
+
+TEST_F(FloatTest, FramesMayEndInAnyOrder) {
+    for (int order = 0; order < 6; ++order) {
+        std::vector<HWND> frames;
+        for (int i = 0; i < 3; ++i) {
+            frames.push_back(open().m_hWnd);
+        }
+        // One floats, one is maximised with the button in the menu bar, which is replaced meanwhile.
+        auto& floats = static_cast<PadFrame&>(*CWnd::FromHandle(frames[0]));
+        frames[0] = floated(floats).m_hWnd;
+        active()->MDIMaximize();
+        settle();
+        main->SetMenu(nullptr);
+        settle();
+        active()->OnUpdateFrameMenu(nullptr);
+        std::array<int, 3> turn{0, 1, 2};
+        for (int i = 0; i < order; ++i) {
+            std::next_permutation(turn.begin(), turn.end());
+        }
+        QApplication::setStyle(QStringLiteral("Fusion")); // a change of style while all of them stand
+        for (const int each : turn) {
+            ::SendMessageA(frames[static_cast<std::size_t>(each)], WM_CLOSE, 0, 0);
+            settle();
+            EXPECT_FALSE(::IsWindow(frames[static_cast<std::size_t>(each)]));
+        }
+        ASSERT_EQ(main->MDIGetActive(), nullptr);
+        ASSERT_EQ(floating(), 0U);
+    }
+}
+
+} // namespace
