@@ -24,7 +24,11 @@ QRect CaptionStyle::subControlRect(ComplexControl control, const QStyleOptionCom
                                    const QWidget* widget) const {
     QRect place = QProxyStyle::subControlRect(control, option, part, widget);
     if (control == CC_TitleBar && part == SC_TitleBarLabel && place.intersects(button)) {
-        place.setRight(button.left() - 1);
+        if (button.center().x() > place.center().x()) {
+            place.setRight(button.left() - 1);
+        } else {
+            place.setLeft(button.right() + 1);
+        }
     }
     return place;
 }
@@ -77,6 +81,17 @@ QMargins Caption::margins() const {
     return {edge, edge + height(), edge, edge};
 }
 
+QSize Caption::leastSize() const {
+    QStyleOptionTitleBar option = bar();
+    constexpr int wide = 1000;
+    option.rect.setWidth(wide);
+    const QRect label =
+        m_style->baseStyle()->subControlRect(QStyle::CC_TitleBar, &option, QStyle::SC_TitleBarLabel, m_window.widget());
+    const QMargins around = margins();
+    const int own = m_style->button.isEmpty() ? 0 : m_style->button.width();
+    return {wide - label.width() + own + around.left() + around.right(), around.top() + around.bottom()};
+}
+
 QStyleOptionTitleBar Caption::bar() const {
     const QWidget& widget = *m_window.widget();
     QStyleOptionTitleBar option;
@@ -102,15 +117,16 @@ struct Part {
     QStyle::SubControl control;
 };
 
-/// The parts of a caption in front of its label. A maximised window has a restore button in the place of the other.
+/// The parts of a caption in front of its label. A maximised window has a restore button in the place of one of them, a
+/// minimised child frame in that of another.
 constexpr std::array parts{
     Part{HTCLOSE, QStyle::SC_TitleBarCloseButton}, Part{HTMAXBUTTON, QStyle::SC_TitleBarMaxButton},
-    Part{HTMAXBUTTON, QStyle::SC_TitleBarNormalButton}, Part{HTMINBUTTON, QStyle::SC_TitleBarMinButton},
-    Part{HTSYSMENU, QStyle::SC_TitleBarSysMenu}};
+    Part{HTMINBUTTON, QStyle::SC_TitleBarMinButton}, Part{HTSYSMENU, QStyle::SC_TitleBarSysMenu}};
 
-QStyle::SubControl controlOf(int code, bool maximized) {
-    if (code == HTMAXBUTTON) {
-        return maximized ? QStyle::SC_TitleBarNormalButton : QStyle::SC_TitleBarMaxButton;
+QStyle::SubControl controlOf(int code, const QWidget& widget) {
+    const bool isMinimized = widget.isMinimized();
+    if ((code == HTMINBUTTON && isMinimized) || (code == HTMAXBUTTON && widget.isMaximized() && !isMinimized)) {
+        return QStyle::SC_TitleBarNormalButton;
     }
     const auto* found = std::ranges::find(parts, code, &Part::code);
     return found != parts.end() ? found->control : QStyle::SC_None;
@@ -161,14 +177,17 @@ int Caption::hitTest(QPoint point) const {
     if (!option.rect.contains(point)) {
         return HTCLIENT;
     }
-    // The corner of a maximised window is where the mouse ends up that is thrown there: its button reaches into it.
-    const bool maximized = widget.isMaximized();
-    const QPoint at = maximized ? QPoint(std::min(point.x(), option.rect.right() - option.rect.height() / 2),
-                                         std::max(point.y(), option.rect.center().y()))
-                                : point;
+    // The corners of a maximised window are where the mouse ends up that is thrown there: their buttons reach into
+    // them.
+    QPoint at = point;
+    if (widget.isMaximized()) {
+        const int half = option.rect.height() / 2;
+        at = QPoint(std::clamp(at.x(), option.rect.left() + half, std::max(half, option.rect.right() - half)),
+                    std::max(at.y(), option.rect.center().y()));
+    }
     for (const Part& part : parts) {
-        if (part.control == controlOf(part.code, maximized) &&
-            m_style->subControlRect(QStyle::CC_TitleBar, &option, part.control, &widget).contains(at)) {
+        const QStyle::SubControl control = controlOf(part.code, widget);
+        if (m_style->subControlRect(QStyle::CC_TitleBar, &option, control, &widget).contains(at)) {
             return part.code;
         }
     }
@@ -188,7 +207,7 @@ void Caption::paint(QPainter& painter) const {
     if (option.rect.height() <= 0) {
         return;
     }
-    const QStyle::SubControl control = controlOf(pressed != 0 ? pressed : hovered, widget.isMaximized());
+    const QStyle::SubControl control = controlOf(pressed != 0 ? pressed : hovered, widget);
     const bool isDown = pressed != 0 && pressed == hovered;
     if (control != QStyle::SC_None && (isDown || pressed == 0)) {
         option.activeSubControls = control;

@@ -49,6 +49,8 @@ public:
     void renewStyle();
     /// What border and caption take from the window's widget: nothing of what is not drawn at the moment.
     QMargins margins() const;
+    /// The smallest window in which no button lies on another.
+    QSize leastSize() const;
     /// The part (HT...) at a point of the window's widget.
     int hitTest(QPoint point) const;
     /// Draws border and caption on the window's widget.

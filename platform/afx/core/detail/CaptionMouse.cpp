@@ -96,7 +96,6 @@ std::optional<LRESULT> CaptionMouse::proc(UINT message, WPARAM wParam, LPARAM lP
     case WM_MOUSEMOVE:
     case WM_LBUTTONUP:
         if (m_part == 0) {
-            hover(HTNOWHERE);
             return std::nullopt;
         }
         if (message == WM_MOUSEMOVE) {
@@ -105,8 +104,13 @@ std::optional<LRESULT> CaptionMouse::proc(UINT message, WPARAM wParam, LPARAM lP
             release(m_window.clientToScreen(pointOf(lParam)));
         }
         return 0;
-    case WM_MOUSELEAVE:
+    case WM_NCMOUSELEAVE:
         hover(HTNOWHERE);
+        return std::nullopt;
+    case WM_CANCELMODE:
+        if (std::exchange(m_began, false)) {
+            m_window.setWindowRect(m_place);
+        }
         return std::nullopt;
     case WM_CAPTURECHANGED:
         if (std::exchange(m_part, 0) != 0 && std::exchange(m_caption.pressed, 0) != 0) {
@@ -183,29 +187,40 @@ void CaptionMouse::drag(QPoint at) {
     }
 }
 
+namespace {
+
+/// Moves one end of a stretch by as much as its length may change.
+int movedEnd(int by, int length, int least, int most, bool isFirst) {
+    const int wanted = isFirst ? length - by : length + by;
+    const int possible = std::clamp(wanted, std::min(least, most), most);
+    return isFirst ? length - possible : possible - length;
+}
+
+} // namespace
+
 void CaptionMouse::moveByHand(QPoint at) {
-    if (m_window.widget()->isMaximized()) {
+    const QWidget& widget = *m_window.widget();
+    if (widget.isMaximized()) {
         return;
     }
     const QPoint by = at - m_from;
-    const Qt::Edges edges = edgesOf(m_part);
-    QRect place = m_place;
     if (!changesSize()) {
-        place.translate(by);
-    } else {
-        const QSize least = m_window.widget()->minimumSizeHint().expandedTo(m_window.widget()->minimumSize());
-        if (edges.testFlag(Qt::LeftEdge)) {
-            place.setLeft(std::min(place.left() + by.x(), place.right() + 1 - least.width()));
-        }
-        if (edges.testFlag(Qt::RightEdge)) {
-            place.setRight(std::max(place.right() + by.x(), place.left() - 1 + least.width()));
-        }
-        if (edges.testFlag(Qt::TopEdge)) {
-            place.setTop(std::min(place.top() + by.y(), place.bottom() + 1 - least.height()));
-        }
-        if (edges.testFlag(Qt::BottomEdge)) {
-            place.setBottom(std::max(place.bottom() + by.y(), place.top() - 1 + least.height()));
-        }
+        m_window.setWindowRect(m_place.translated(by));
+        return;
+    }
+    const Qt::Edges edges = edgesOf(m_part);
+    const QSize least = widget.minimumSizeHint().expandedTo(widget.minimumSize());
+    const QSize most = widget.maximumSize();
+    QRect place = m_place;
+    if ((edges & (Qt::LeftEdge | Qt::RightEdge)) != Qt::Edges()) {
+        const bool isFirst = edges.testFlag(Qt::LeftEdge);
+        const int moved = movedEnd(by.x(), place.width(), least.width(), most.width(), isFirst);
+        place.adjust(isFirst ? moved : 0, 0, isFirst ? 0 : moved, 0);
+    }
+    if ((edges & (Qt::TopEdge | Qt::BottomEdge)) != Qt::Edges()) {
+        const bool isFirst = edges.testFlag(Qt::TopEdge);
+        const int moved = movedEnd(by.y(), place.height(), least.height(), most.height(), isFirst);
+        place.adjust(0, isFirst ? moved : 0, 0, isFirst ? 0 : moved);
     }
     m_window.setWindowRect(place);
 }

@@ -23,6 +23,10 @@ public:
 
     /// Does what a message of the mouse means for the caption; the answer to it, none when it is not the caption's.
     std::optional<LRESULT> proc(UINT message, WPARAM wParam, LPARAM lParam);
+    /// Whether a part is held down.
+    bool isHeld() const {
+        return m_part != 0;
+    }
     /// Shows that an edge can be taken hold of. False for a part that cannot.
     bool showCursor(int part);
 

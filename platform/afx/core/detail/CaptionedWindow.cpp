@@ -29,6 +29,14 @@ void CaptionedWindow::stateChanged() {
     m_caption.update();
 }
 
+QSize CaptionedWindow::leastSize() const {
+    return m_caption.leastSize();
+}
+
+bool CaptionedWindow::isHeldByCaption() const {
+    return m_mouse.isHeld();
+}
+
 int CaptionedWindow::hitTest(QPoint screen) const {
     const int part = m_caption.hitTest(widget()->mapFromGlobal(screen));
     return part == HTCLIENT ? TopLevelWindow::hitTest(screen) : part;

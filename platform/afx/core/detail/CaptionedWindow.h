@@ -20,8 +20,11 @@ public:
     void stateChanged() override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
 
+    bool isHeldByCaption() const override;
+
 protected:
     void widgetMade() override;
+    QSize leastSize() const override;
 
 private:
     void paintCaption();

@@ -91,6 +91,16 @@ std::unique_ptr<QKeyEvent> asLatin(const QKeyEvent& event) {
     return latin;
 }
 
+/// Esc gives back a window that the mouse holds by its caption.
+bool endsHold(const QKeyEvent& event) {
+    const Window* held = event.key() == Qt::Key_Escape ? Window::from(captureWindow()) : nullptr;
+    if (!held || !held->isHeldByCaption()) {
+        return false;
+    }
+    SendMessageA(held->handle(), WM_CANCELMODE, 0, 0);
+    return true;
+}
+
 /// The toolkit asks with this event before its own shortcuts: the place where a key can be taken from everybody.
 bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
     MSG msg = keyMessage(window, event, false);
@@ -99,7 +109,7 @@ bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
         return true;
     }
     armIdle();
-    const bool consumed = preTranslate(msg);
+    const bool consumed = endsHold(event) || preTranslate(msg);
     offeredKey = {event.key(), event.timestamp(), consumed, true};
     return true;
 }
@@ -108,7 +118,7 @@ bool onShortcutOverride(Window& window, QObject* receiver, QKeyEvent& event) {
 bool isConsumed(const QKeyEvent& event, MSG msg) {
     const bool offered = std::exchange(offeredKey.pending, false) && offeredKey.key == event.key() &&
                          (offeredKey.timestamp == event.timestamp() || event.timestamp() == 0);
-    return offered ? offeredKey.consumed : preTranslate(msg);
+    return offered ? offeredKey.consumed : endsHold(event) || preTranslate(msg);
 }
 
 /// Characters go one message each; the event itself goes to the widget with the first that nobody handled.
@@ -254,11 +264,23 @@ MSG mouseMessage(const Window& window, UINT message, int part, const QMouseEvent
                        MAKELPARAM(point.x(), point.y()));
 }
 
+/// The window that has the mouse over its frame.
+HWND frameUnder = nullptr;
+
+/// Tells a window when the mouse is over its frame no longer, wherever it went.
+void noteFrameUnder(HWND window) {
+    const HWND before = std::exchange(frameUnder, window);
+    if (before && before != window) {
+        SendMessageA(before, WM_NCMOUSELEAVE, 0, 0);
+    }
+}
+
 /// Lets windows choose the cursor, and views and child frames become active, before they see the press itself.
 void announceMouse(const Window& window, UINT message, int part) {
     const HWND handle = window.handle();
     // Nobody is asked for a cursor while the mouse is captured: that is the rule hosts know.
     if (!captureWindow()) {
+        noteFrameUnder(part == HTCLIENT ? nullptr : handle);
         noteCursorWindow(handle);
         SendMessageA(handle, WM_SETCURSOR, reinterpret_cast<WPARAM>(handle),
                      MAKELPARAM(part, static_cast<int>(message)));
@@ -424,7 +446,11 @@ bool onAfterwards(Window& window, QObject* receiver, QEvent& event, bool& result
         onFocus(*current, static_cast<QFocusEvent&>(event));
         break;
     case QEvent::Leave:
-        if (receiver == current->clientWidget()) {
+        if (outermost && frameUnder == handle) {
+            noteFrameUnder(nullptr);
+            current = Window::from(handle);
+        }
+        if (current && receiver == current->clientWidget()) {
             current->call(WM_MOUSELEAVE);
         }
         break;

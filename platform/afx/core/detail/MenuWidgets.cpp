@@ -79,6 +79,10 @@ void PopupMenu::prepare() {
     if (m_host.systemMenu) {
         updateSystemMenu(m_host.owner);
     }
+    const bool isWhole = m_host.systemMenu && !qobject_cast<QMenu*>(parentWidget());
+    if (m_host.notifies && isWhole) {
+        SendMessageA(m_host.owner, WM_INITMENU, reinterpret_cast<WPARAM>(m_menu), 0);
+    }
     if (m_host.notifies) {
         SendMessageA(m_host.owner, WM_INITMENUPOPUP, reinterpret_cast<WPARAM>(m_menu),
                      MAKELPARAM(m_index, m_host.systemMenu ? TRUE : FALSE));

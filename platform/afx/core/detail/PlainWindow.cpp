@@ -263,7 +263,7 @@ void TopLevelWindow::applySizeLimits() {
     widget()->setMinimumSize((toQt(limits.ptMinTrackSize).isNull()
                                   ? QSize(0, 0)
                                   : QSize(limits.ptMinTrackSize.x, limits.ptMinTrackSize.y) - frame)
-                                 .expandedTo(QSize(0, 0)));
+                                 .expandedTo(leastSize()));
     if (limits.ptMaxTrackSize.x < unlimited || limits.ptMaxTrackSize.y < unlimited) {
         widget()->setMaximumSize(QSize(limits.ptMaxTrackSize.x, limits.ptMaxTrackSize.y) - frame);
     }

@@ -47,6 +47,10 @@ public:
     void updateFrame() override;
 
 protected:
+    /// The smallest size that parts drawn by the window itself need.
+    virtual QSize leastSize() const {
+        return {0, 0};
+    }
     void beforeShow(bool visible) override;
     void showWidget(int command) override;
     QWidget* makeWidget(QWidget* parent) override;

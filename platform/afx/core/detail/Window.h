@@ -147,6 +147,10 @@ public:
     void setFrameButton(const QString& name, const QRect* place, UINT command);
     /// Asks for the part around the client area to be painted: caption, border, menu bar.
     virtual void updateFrame() {}
+    /// Whether the mouse holds it by a part of its caption or border.
+    virtual bool isHeldByCaption() const {
+        return false;
+    }
     /// Told that its widget was maximised, minimised or brought back.
     virtual void stateChanged() {}
     bool isDestroyed() const {
