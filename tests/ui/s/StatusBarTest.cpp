@@ -17,9 +17,12 @@ protected:
         frame = new CFrameWnd; // deletes itself
         frame->Create(nullptr, "Status", WS_OVERLAPPEDWINDOW, CRect(20, 20, 520, 220));
         make();
+        ASSERT_EQ(bar.SetToolTips(tips, 4), 1) << "one more than there are panes; they have no places yet";
+        frame->RecalcLayout();
+        ASSERT_GT(place(1).left, 300) << "known before the frame is shown";
         frame->ShowWindow(SW_SHOW);
         ASSERT_TRUE(waitForActive(*frame));
-        frame->RecalcLayout();
+        settle();
     }
     void TearDown() override {
         QToolTip::hideText();
@@ -29,6 +32,11 @@ protected:
         ASSERT_TRUE(bar.Create(frame));
         ASSERT_TRUE(bar.SetIndicators(panes, std::size(panes)));
         widget()->setStyle(&style);
+    }
+    /// Lets the frame lay itself out.
+    void settle() const {
+        frame->RecalcLayout();
+        QApplication::processEvents();
     }
     QWidget* widget() const {
         return tvx::afx::peerOf(bar.m_hWnd);
@@ -66,9 +74,6 @@ protected:
 } // namespace
 
 TEST_F(StatusBar, TellsOfPanesByTips) {
-    bar.ChangeTooltipText(1, "none yet");
-    EXPECT_TRUE(tells(1, "")) << "before they are set up";
-    ASSERT_EQ(bar.SetToolTips(tips, 4), 1) << "one more than there are panes";
     EXPECT_TRUE(tells(0, ""));
     EXPECT_TRUE(tells(1, "501"));
     EXPECT_TRUE(tells(2, "502"));
@@ -82,27 +87,27 @@ TEST_F(StatusBar, TellsOfPanesByTips) {
     bar.ReactivateTooltips();
     const CRect before = place(1);
     frame->SetWindowPos(nullptr, 0, 0, 700, 220, SWP_NOMOVE | SWP_NOZORDER);
-    frame->RecalcLayout();
+    settle();
     ASSERT_GT(place(1).left, before.right);
     EXPECT_TRUE(tells(1, ""));
     bar.EnableTooltips(1);
     EXPECT_TRUE(tells(1, "501")) << "where the pane is now";
     frame->SetWindowPos(nullptr, 0, 0, 500, 220, SWP_NOMOVE | SWP_NOZORDER);
-    frame->RecalcLayout();
+    settle();
     EXPECT_TRUE(tells(1, "501"));
 }
 
 TEST_F(StatusBar, IsSetUpAnewForAnotherWindow) {
     Gui_StatusBar without;
     EXPECT_EQ(without.SetToolTips(tips, 3), 0) << "no window";
-    ASSERT_EQ(bar.SetToolTips(tips, 3), 1);
     const unsigned int others[] = {600, 0};
     ASSERT_EQ(bar.SetToolTips(others, 2), 1);
     EXPECT_TRUE(tells(0, "a text of the resources"));
     EXPECT_TRUE(tells(1, ""));
     bar.DestroyWindow();
     make();
-    frame->RecalcLayout();
+    settle();
+    bar.ChangeTooltipText(0, "none yet");
     EXPECT_TRUE(tells(0, ""));
     bar.SetPaneTextEx(1, "wider than before", TRUE);
     ASSERT_EQ(bar.SetToolTips(tips, 3), 1);
@@ -110,11 +115,11 @@ TEST_F(StatusBar, IsSetUpAnewForAnotherWindow) {
 }
 
 TEST_F(StatusBar, PanesFitTheirTexts) {
-    ASSERT_EQ(bar.SetToolTips(tips, 3), 1);
     CFont large;
     large.CreatePointFont(160, "MS Shell Dlg");
     for (CFont* font : {bar.GetFont(), &large}) {
         bar.SetFont(font);
+        settle();
         EXPECT_TRUE(bar.SetPaneTextEx(1, "a longer text", TRUE));
         EXPECT_EQ(widthOf(1), measured("a longer text") + 2);
         EXPECT_EQ(bar.GetPaneText(1), "a longer text");

@@ -58,7 +58,6 @@ TipWindow::TipWindow(const CREATESTRUCT& cs) : Window(cs) {
 }
 
 TipWindow::~TipWindow() {
-    hide();
     std::erase(controls(), this);
 }
 
@@ -66,6 +65,13 @@ QWidget* TipWindow::makeWidget(QWidget* parent) {
     auto* carrier = new QWidget(parent);
     carrier->setAttribute(Qt::WA_TransparentForMouseEvents);
     return carrier;
+}
+
+LRESULT TipWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_DESTROY) {
+        activate(false);
+    }
+    return Window::defaultProc(message, wParam, lParam);
 }
 
 // --- tools ---

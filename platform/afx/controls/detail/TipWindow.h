@@ -29,6 +29,8 @@ public:
     explicit TipWindow(const CREATESTRUCT& cs);
     ~TipWindow() override;
 
+    LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;
+
     /// A tool's window and number.
     using Key = std::pair<HWND, UINT_PTR>;
     void add(const Key& key, const QRect& place, const QString& text);

@@ -194,6 +194,8 @@ LRESULT StatusBarWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
     case SB_GETRECT: {
         const StatusPane* pane = widget() ? bar()->pane(static_cast<int>(wParam)) : nullptr;
         if (pane) {
+            // The bar may have a size that the toolkit has not told it yet.
+            bar()->place();
             *reinterpret_cast<RECT*>(lParam) = fromQt(pane->geometry());
         }
         return pane ? TRUE : FALSE;

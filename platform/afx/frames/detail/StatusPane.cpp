@@ -8,6 +8,7 @@
 #include <QPainter>
 #include <QStyle>
 #include <QStyleOptionFrame>
+#include <qdrawutil.h>
 
 #include <utility>
 
@@ -124,12 +125,15 @@ void StatusPane::painted() {
 
 void StatusPane::paintEvent(QPaintEvent*) {
     QPainter painter(this);
-    if ((m_style & SBPS_NOBORDERS) == 0) {
+    if ((m_style & SBPS_POPOUT) != 0) {
+        // Styles draw raised and sunken borders alike.
+        qDrawShadePanel(&painter, rect(), palette());
+    } else if ((m_style & SBPS_NOBORDERS) == 0) {
         QStyleOptionFrame option;
         option.initFrom(this);
         option.frameShape = QFrame::StyledPanel;
         option.lineWidth = 1;
-        option.state |= (m_style & SBPS_POPOUT) != 0 ? QStyle::State_Raised : QStyle::State_Sunken;
+        option.state |= QStyle::State_Sunken;
         style()->drawControl(QStyle::CE_ShapedFrame, &option, &painter, this);
     }
     const QRect area = textArea();
