@@ -3,6 +3,7 @@
 #include "afxext.h"
 #include "afxwin.h"
 #include "s/FloatMainFrame.h"
+#include "s/StatusBar.h"
 
 /// The main window: tool bar, status bar, drawings in between, which may be given windows of their own. It comes up
 /// where it stood last, with its bars as they were.
@@ -25,7 +26,7 @@ private:
 
     bool m_placed = false;
     CToolBar m_toolBar;
-    CStatusBar m_statusBar;
+    Gui_StatusBar m_statusBar;
     CString m_lastCommand;
     CString m_lastKeyword;
 

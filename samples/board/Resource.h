@@ -25,6 +25,9 @@
 #define IDS_CRASHED 211
 #define IDS_SEARCH_TITLE 212
 #define IDS_SEARCH_PROMPT 213
+#define IDS_TIP_POSITION 214
+#define IDS_TIP_CAPS 215
+#define IDS_TIP_NUM 216
 
 /* What the console's commands expect, in their order, and what is reported about them. */
 #define IDS_COMMAND_FIRST 300

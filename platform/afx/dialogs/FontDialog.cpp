@@ -23,15 +23,7 @@ namespace {
 constexpr double pixelsOfPoint = 96.0 / 72; // there are 96 pixels to an inch
 
 LOGFONT describe(const QFont& font) {
-    LOGFONT description{};
-    description.lfHeight = static_cast<LONG>(-std::lround(QFontInfo(font).pointSizeF() * pixelsOfPoint));
-    description.lfWeight = font.weight();
-    description.lfItalic = font.italic() ? 1 : 0;
-    description.lfUnderline = font.underline() ? 1 : 0;
-    description.lfStrikeOut = font.strikeOut() ? 1 : 0;
-    description.lfCharSet = DEFAULT_CHARSET;
-    tvx::text::copyCut(fromQt(font.family()), description.lfFaceName, sizeof(description.lfFaceName));
-    return description;
+    return describeFont(font, static_cast<int>(std::lround(QFontInfo(font).pointSizeF() * pixelsOfPoint)));
 }
 
 /// The font as the dialog knows it: of an installed family, with the name of its style, in points. Without that name

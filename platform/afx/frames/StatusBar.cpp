@@ -1,14 +1,11 @@
 #include "platform/afx/frames/StatusBar.h"
 
 #include "platform/afx/core/detail/Loop.h"
-#include "platform/afx/core/detail/Window.h"
+#include "platform/afx/frames/detail/StatusBarWindow.h"
 #include "platform/base/Text.h"
 
-#include <QLabel>
-#include <QLayout>
-#include <QStatusBar>
-
-#include <cstring>
+#include <algorithm>
+#include <utility>
 
 using namespace tvx::afx;
 
@@ -25,45 +22,15 @@ END_MESSAGE_MAP()
 namespace {
 
 constexpr DWORD barStyles = 0x0040FFFF;
-/// Frame and space around a pane's text, both sides.
-constexpr int paneBorder = 10;
 
-QStatusBar* barOf(const CWnd& bar) {
-    const Window* state = bar.GetState();
-    return state ? qobject_cast<QStatusBar*>(state->widget()) : nullptr;
+StatusBarWidget* barOf(const CWnd& bar) {
+    const auto* state = dynamic_cast<const StatusBarWindow*>(bar.GetState());
+    return state && state->widget() ? state->bar() : nullptr;
 }
 
-/// A pane's label takes the space it is given, whatever its text.
-class PaneLabel : public QLabel {
-public:
-    explicit PaneLabel(QWidget* parent) : QLabel(parent) {
-        setObjectName(QStringLiteral("pane"));
-    }
-    bool stretches = false;
-    QSize minimumSizeHint() const override {
-        return {0, QLabel::minimumSizeHint().height()};
-    }
-};
-
-struct PaneShape {
-    bool border = true;
-    bool stretch = false;
-    int width = 0;
-};
-
-/// The labels in the order of their panes.
-QList<PaneLabel*> labelsOf(const QStatusBar& bar) {
-    QList<PaneLabel*> labels;
-    for (QLabel* label : bar.findChildren<QLabel*>(QStringLiteral("pane"), Qt::FindDirectChildrenOnly)) {
-        labels.append(static_cast<PaneLabel*>(label));
-    }
-    return labels;
-}
-
-QLabel* labelAt(const CWnd& bar, int index) {
-    const QStatusBar* widget = barOf(bar);
-    const auto labels = widget ? labelsOf(*widget) : QList<PaneLabel*>();
-    return index >= 0 && index < labels.size() ? labels[index] : nullptr;
+StatusPane* paneOf(const CWnd& bar, int index) {
+    const StatusBarWidget* widget = barOf(bar);
+    return widget ? widget->pane(index) : nullptr;
 }
 
 } // namespace
@@ -74,14 +41,19 @@ BOOL CStatusBar::Create(CWnd* parent, DWORD style, UINT id) {
 
 BOOL CStatusBar::CreateEx(CWnd* parent, DWORD, DWORD style, UINT id) {
     SetBarStyle(style & barStyles);
-    return CWnd::CreateEx(0, "msctls_statusbar32", nullptr, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent,
-                          id);
+    if (!CWnd::CreateEx(0, "msctls_statusbar32", nullptr, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent,
+                        id)) {
+        return FALSE;
+    }
+    showPanes();
+    return TRUE;
 }
 
 BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
-    const QStatusBar* widget = barOf(*this);
-    m_panes.assign(static_cast<std::size_t>(std::max(count, 0)), Pane());
-    for (int i = 0; ids && i < count; ++i) {
+    const StatusBarWidget* widget = barOf(*this);
+    m_nCount = std::max(count, 0);
+    m_panes.assign(static_cast<std::size_t>(m_nCount), Pane());
+    for (int i = 0; ids && i < m_nCount; ++i) {
         Pane& pane = m_panes[static_cast<std::size_t>(i)];
         pane.id = ids[i];
         if (pane.id != ID_SEPARATOR) {
@@ -92,68 +64,37 @@ BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
             pane.style = SBPS_NOBORDERS | (pane.id == ID_SEPARATOR ? SBPS_STRETCH : 0U);
         }
     }
-    m_nCount = count;
     showPanes();
     return TRUE;
 }
 
-namespace {
-
-/// Gives a label the look of its pane. The toolkit takes the share of free space with the place in the row only, so a
-/// label whose share changes is taken out and put back.
-void shapePane(QStatusBar& bar, PaneLabel& label, int index, const PaneShape& shape) {
-    label.setFrameStyle(shape.border ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
-    label.setMinimumWidth(shape.stretch ? 0 : shape.width);
-    label.setMaximumWidth(shape.stretch ? QWIDGETSIZE_MAX : shape.width);
-    if (std::exchange(label.stretches, shape.stretch) != shape.stretch) {
-        bar.removeWidget(&label);
-        bar.insertWidget(index, &label, shape.stretch ? 1 : 0);
-        label.show();
-    }
-}
-
-PaneLabel* addLabel(QStatusBar& bar) {
-    auto* label = new PaneLabel(&bar);
-    label->setTextFormat(Qt::PlainText);
-    label->setContentsMargins(2, 0, 2, 0);
-    bar.addWidget(label);
-    return label;
-}
-
-} // namespace
-
-/// Brings the labels into line with the panes. Panes change while the user looks at them and assistive programs hold
-/// them, so labels stay as long as their pane does.
+/// Gives the bar's window the panes that there are. Those that stay are changed in place: the user looks at them, and
+/// assistive programs hold them.
 void CStatusBar::showPanes() {
-    QStatusBar* widget = barOf(*this);
+    StatusBarWidget* widget = barOf(*this);
     if (!widget) {
         return;
     }
     guarded([&] {
-        auto labels = labelsOf(*widget);
-        while (labels.size() > static_cast<qsizetype>(m_panes.size())) {
-            delete labels.takeLast();
-        }
-        while (labels.size() < static_cast<qsizetype>(m_panes.size())) {
-            labels.append(addLabel(*widget));
-        }
+        widget->setCount(m_nCount);
         for (int i = 0; i < m_nCount; ++i) {
             const Pane& pane = m_panes[static_cast<std::size_t>(i)];
-            const bool border = (pane.style & (SBPS_NOBORDERS | SBPS_POPOUT)) == 0;
-            const bool stretch = (pane.style & SBPS_STRETCH) != 0;
-            shapePane(*widget, *labels[i], i, {border, stretch, pane.width + paneBorder});
+            widget->pane(i)->setShape(pane.style, pane.width);
+            widget->pane(i)->setText(pane.text);
         }
+        widget->place();
+        widget->update();
     });
-    for (int i = 0; i < m_nCount; ++i) {
-        showPane(i);
-    }
 }
 
-void CStatusBar::showPane(int index) {
-    QLabel* label = labelAt(*this, index);
+/// Gives one of them its shape.
+void CStatusBar::shapePane(int index) {
     const Pane& pane = m_panes[static_cast<std::size_t>(index)];
-    if (label) {
-        guarded([&] { label->setText((pane.style & SBPS_DISABLED) != 0 ? QString() : toQt(pane.text)); });
+    if (StatusBarWidget* widget = barOf(*this)) {
+        guarded([&] {
+            widget->pane(index)->setShape(pane.style, pane.width);
+            widget->place();
+        });
     }
 }
 
@@ -171,11 +112,9 @@ UINT CStatusBar::GetItemID(int index) const {
 }
 
 void CStatusBar::GetItemRect(int index, RECT* rect) const {
-    const QLabel* label = labelAt(*this, index);
-    if (label) {
-        barOf(*this)->layout()->activate();
+    if (!SendMessage(SB_GETRECT, static_cast<WPARAM>(index), reinterpret_cast<LPARAM>(rect))) {
+        *rect = CRect(0, 0, 0, 0);
     }
-    *rect = label ? fromQt(label->geometry()) : RECT(CRect(0, 0, 0, 0));
 }
 
 CString CStatusBar::GetPaneText(int index) const {
@@ -186,14 +125,21 @@ void CStatusBar::GetPaneText(int index, CString& text) const {
     text = GetPaneText(index);
 }
 
-BOOL CStatusBar::SetPaneText(int index, LPCSTR text, BOOL) {
+BOOL CStatusBar::SetPaneText(int index, LPCSTR text, BOOL update) {
     if (!has(index)) {
         return FALSE;
     }
+    StatusBarWidget* widget = barOf(*this);
+    StatusPane* pane = widget ? widget->pane(index) : nullptr;
     CString& place = m_panes[static_cast<std::size_t>(index)].text;
     if (place != text) {
         place = text;
-        showPane(index);
+        if (pane) {
+            pane->setText(place);
+        }
+    }
+    if (pane && update) {
+        guarded([&] { widget->showNow(*pane); });
     }
     return TRUE;
 }
@@ -203,14 +149,8 @@ UINT CStatusBar::GetPaneStyle(int index) const {
 }
 
 void CStatusBar::SetPaneStyle(int index, UINT style) {
-    if (!has(index)) {
-        return;
-    }
-    const UINT old = std::exchange(m_panes[static_cast<std::size_t>(index)].style, style);
-    if (((old ^ style) & ~UINT{SBPS_DISABLED}) != 0) {
-        showPanes();
-    } else if (old != style) {
-        showPane(index);
+    if (has(index) && std::exchange(m_panes[static_cast<std::size_t>(index)].style, style) != style) {
+        shapePane(index);
     }
 }
 
@@ -232,7 +172,7 @@ void CStatusBar::SetPaneInfo(int index, UINT id, UINT style, int width) {
     pane.id = id;
     pane.style = style;
     pane.width = width;
-    showPanes();
+    shapePane(index);
 }
 
 CSize CStatusBar::CalcFixedLayout(BOOL stretch, BOOL horizontal) {
@@ -273,8 +213,13 @@ public:
     void SetRadio(BOOL on) override {
         SetCheck(on ? 1 : 0);
     }
+    /// The panes are painted together, behind the round of updates.
     void SetText(LPCSTR text) override {
-        static_cast<CStatusBar&>(*m_pOther).SetPaneText(static_cast<int>(m_nIndex), text);
+        auto& bar = static_cast<CStatusBar&>(*m_pOther);
+        bar.SetPaneText(static_cast<int>(m_nIndex), text, FALSE);
+        if (StatusPane* pane = paneOf(bar, static_cast<int>(m_nIndex))) {
+            pane->showSoon();
+        }
     }
 
 private:

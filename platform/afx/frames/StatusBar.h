@@ -6,14 +6,21 @@
 #include "platform/afx/frames/ControlBar.h"
 
 // Styles of a pane
-#define SBPS_NORMAL 0x0000
-#define SBPS_NOBORDERS 0x0100
-#define SBPS_POPOUT 0x0200
-#define SBPS_DISABLED 0x04000000
-#define SBPS_STRETCH 0x08000000
+#define SBPS_NORMAL 0x0000       // with a border, sunken where the desktop draws borders so
+#define SBPS_NOBORDERS 0x0100    // without a border
+#define SBPS_POPOUT 0x0200       // with a raised border
+#define SBPS_DISABLED 0x04000000 // without its text, which stays
+#define SBPS_STRETCH 0x08000000  // takes the room that the others leave; several share it
+
+/// Asks for the place of pane wParam, which goes to the RECT behind lParam, in the bar's client area. Answers whether
+/// there is such a pane.
+#define SB_GETRECT 0x040A
 
 /// A status bar: a row of panes with texts. The first pane usually shows the prompts of commands, the others states,
 /// such as the lock keys.
+///
+/// A text without room for all of it ends in "…", and a tip shows the whole. No pane keeps the frame from being made
+/// narrow: those that stretch give way first, then the ones at the end are cut off.
 ///
 /// @code
 /// static const UINT indicators[] = {ID_SEPARATOR, ID_INDICATOR_CAPS, ID_INDICATOR_NUM, ID_INDICATOR_SCRL};
@@ -42,14 +49,19 @@ public:
     int CommandToIndex(UINT id) const;
     /// Number of a pane; 0 for an index outside the bar.
     UINT GetItemID(int index) const;
-    /// Place of a pane in the bar's client area; empty for an index outside.
+    /// Place of a pane in the bar's client area (SB_GETRECT), as far as it is inside; empty for an index outside.
     void GetItemRect(int index, RECT* rect) const;
     /// Text of a pane; empty for an index outside the bar.
     /// @{
     CString GetPaneText(int index) const;
     void GetPaneText(int index, CString& text) const;
     /// @}
-    /// Shows a text in a pane. FALSE for an index outside the bar.
+    /// Shows a text in a pane.
+    /// @param update TRUE shows it at once, also while the host works without looking for messages: nothing else of the
+    ///     window is painted then. Of texts that come faster than anybody could see them a part is shown so, the last
+    ///     one with the next message. FALSE keeps it until the pane is painted for another reason, or until it is set
+    ///     with TRUE
+    /// @return FALSE for an index outside the bar
     virtual BOOL SetPaneText(int index, LPCSTR text, BOOL update = TRUE);
     /// SBPS_... style of a pane; 0 for an index outside the bar.
     UINT GetPaneStyle(int index) const;
@@ -83,6 +95,6 @@ private:
         return index >= 0 && index < static_cast<int>(m_panes.size());
     }
     void showPanes();
-    void showPane(int index);
+    void shapePane(int index);
     std::vector<Pane> m_panes;
 };

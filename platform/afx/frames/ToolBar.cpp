@@ -84,11 +84,7 @@ BOOL CToolBar::Create(CWnd* parent, DWORD style, UINT id) {
 
 BOOL CToolBar::CreateEx(CWnd* parent, DWORD, DWORD style, CRect, UINT id) {
     SetBarStyle(style & barStyles);
-    // Bars have the number of the command that shows them, whose short name is theirs.
-    CString name = CommandText(id).tip;
-    if (name.IsEmpty()) {
-        name.LoadString(TVX_IDS_TOOL_BAR);
-    }
+    const CString name = nameOfBar(id, TVX_IDS_TOOL_BAR);
     return CWnd::CreateEx(0, "ToolbarWindow32", name, (style & ~barStyles) | WS_CHILD, CRect(0, 0, 0, 0), parent, id);
 }
 

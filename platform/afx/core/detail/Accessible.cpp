@@ -11,6 +11,7 @@
 #include <QMenu>
 #include <QMenuBar>
 #include <QRegularExpression>
+#include <QStatusBar>
 #include <QToolBar>
 
 #include <algorithm>
@@ -161,9 +162,10 @@ private:
 };
 
 /// A tool bar. Docked ones the toolkit leaves without a name.
+/// A tool bar or status bar. The toolkit leaves docked ones without a name.
 class AccessibleBar : public QAccessibleWidget {
 public:
-    explicit AccessibleBar(QWidget* bar) : QAccessibleWidget(bar, QAccessible::ToolBar) {}
+    AccessibleBar(QWidget* bar, QAccessible::Role role) : QAccessibleWidget(bar, role) {}
 
     QString text(QAccessible::Text kind) const override {
         const QString own = QAccessibleWidget::text(kind);
@@ -284,7 +286,10 @@ QAccessibleInterface* answerForWidget(QWidget& widget) {
     if (window && qobject_cast<QMdiSubWindow*>(&widget)) {
         return new AccessibleFrame(&widget);
     }
-    return qobject_cast<QToolBar*>(&widget) ? new AccessibleBar(&widget) : nullptr;
+    if (qobject_cast<QToolBar*>(&widget)) {
+        return new AccessibleBar(&widget, QAccessible::ToolBar);
+    }
+    return qobject_cast<QStatusBar*>(&widget) ? new AccessibleBar(&widget, QAccessible::StatusBar) : nullptr;
 }
 
 QAccessibleInterface* answer(const QString& className, QObject* object) {

@@ -25,12 +25,7 @@ std::unique_ptr<Window> makeBar(const CREATESTRUCT& cs) {
     return std::make_unique<BarWindow>(cs);
 }
 
-std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
-    return std::make_unique<StatusBarWindow>(cs);
-}
-
 const WindowClassEntry barEntry("ToolbarWindow32", &makeBar);
-const WindowClassEntry statusBarEntry("msctls_statusbar32", &makeStatusBar);
 
 } // namespace
 
@@ -39,12 +34,6 @@ QWidget* BarWindow::makeWidget(QWidget* parent) {
     // Layouts are remembered under this name.
     bar->setObjectName(QStringLiteral("bar%1").arg(id()));
     bar->setMovable(false);
-    return bar;
-}
-
-QWidget* StatusBarWindow::makeWidget(QWidget* parent) {
-    auto* bar = new QStatusBar(parent);
-    bar->setObjectName(QStringLiteral("bar%1").arg(id()));
     return bar;
 }
 
@@ -79,6 +68,18 @@ void BarWindow::show(int command) {
         return;
     }
     Window::show(command);
+}
+
+CString nameOfBar(UINT id, UINT otherwise) {
+    CString text;
+    CString name;
+    if (text.LoadString(id)) {
+        AfxExtractSubString(name, text, 1);
+    }
+    if (name.IsEmpty()) {
+        name.LoadString(otherwise);
+    }
+    return name;
 }
 
 void attachStatusBar(QMainWindow& main, QWidget* widget) {

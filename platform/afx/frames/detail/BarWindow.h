@@ -1,9 +1,10 @@
 #pragma once
 
 /// @file
-/// The windows of control bars: tool bars and status bars of the toolkit.
+/// The windows of control bars: tool bars of the toolkit, and what status bars share with them.
 
 #include "platform/afx/core/detail/Window.h"
+#include "platform/base/String.h"
 
 class CWnd;
 class QMainWindow;
@@ -26,14 +27,6 @@ protected:
     QWidget* makeWidget(QWidget* parent) override;
 };
 
-class TVX_PLATFORM_API StatusBarWindow : public BarWindow {
-public:
-    using BarWindow::BarWindow;
-
-protected:
-    QWidget* makeWidget(QWidget* parent) override;
-};
-
 /// The toolkit's tool bar behind a bar; null for a bar of another kind and for one without a window.
 [[nodiscard]] QToolBar* toolsOf(const CWnd& bar);
 
@@ -44,6 +37,9 @@ protected:
 [[nodiscard]] Qt::ToolBarArea areaOf(UINT dockBar);
 [[nodiscard]] DWORD sideOfDockBar(UINT dockBar);
 /// @}
+
+/// The name of a bar, which has the number of the command that shows it: that command's tip, else another string.
+[[nodiscard]] CString nameOfBar(UINT id, UINT otherwise);
 
 /// Gives a frame its status bar, if the widget is one.
 void attachStatusBar(QMainWindow& main, QWidget* widget);

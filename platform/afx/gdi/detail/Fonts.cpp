@@ -222,6 +222,18 @@ LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName) {
     return font;
 }
 
+LOGFONT describeFont(const QFont& font, int height) {
+    LOGFONT description{};
+    description.lfHeight = -height;
+    description.lfWeight = font.weight();
+    description.lfItalic = font.italic() ? 1 : 0;
+    description.lfUnderline = font.underline() ? 1 : 0;
+    description.lfStrikeOut = font.strikeOut() ? 1 : 0;
+    description.lfCharSet = DEFAULT_CHARSET;
+    text::copyCut(font.family().toStdString(), description.lfFaceName, LF_FACESIZE);
+    return description;
+}
+
 QSize dialogBaseUnits(const QFont& font) {
     static const QString letters = QStringLiteral("ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz");
     const QFontMetrics metrics(font);

@@ -41,6 +41,9 @@ struct RealizedFont {
 /// The description of a dialog's or the default font: 8 points are 11 pixels.
 [[nodiscard]] TVX_PLATFORM_API LOGFONTA pointFont(int tenthsOfPoint, std::string_view faceName);
 
+/// The description of a font of the toolkit's, for characters of this height in pixels.
+[[nodiscard]] TVX_PLATFORM_API LOGFONT describeFont(const QFont& font, int height);
+
 /// The size of 4 by 8 dialog units in pixels, for a font: half its average letter's width, and its height.
 [[nodiscard]] TVX_PLATFORM_API QSize dialogBaseUnits(const QFont& font);
 

@@ -1,7 +1,5 @@
 #include "tests/ui/afx/frames/FrameTesting.h"
 
-#include <QLabel>
-#include <QStatusBar>
 #include <QToolBar>
 #include <QToolButton>
 
@@ -172,44 +170,4 @@ TEST_F(Bars, DockAndFloat) {
         << "without room for a caption";
     EXPECT_EQ(frame->GetControlBar(AFX_IDW_TOOLBAR), &frame->tools);
     EXPECT_EQ(frame->GetControlBar(4711), nullptr);
-}
-
-TEST_F(Bars, StatusPanes) {
-    CStatusBar& status = frame->status;
-    EXPECT_EQ(status.GetCount(), 3);
-    EXPECT_EQ(status.GetPaneText(1), "000 shapes");
-    EXPECT_TRUE(status.SetPaneText(1, "7 shapes"));
-    EXPECT_FALSE(status.SetPaneText(3, "none"));
-    const auto labels = status.GetState()->widget()->findChildren<QLabel*>("pane");
-    ASSERT_EQ(labels.size(), 3);
-    EXPECT_EQ(labels[1]->text(), QString("7 shapes"));
-    EXPECT_EQ(labels[2]->text(), QString()) << "Caps Lock is off";
-    EXPECT_GT(labels[0]->width(), labels[1]->width()) << "the first pane stretches";
-    CRect second;
-    status.GetItemRect(1, &second);
-    EXPECT_EQ(second.Width(), labels[1]->width());
-    UINT id = 0;
-    UINT style = 0;
-    int width = 0;
-    status.GetPaneInfo(1, id, style, width);
-    status.SetPaneInfo(1, id, style, width + 40);
-    settle();
-    CRect wider;
-    status.GetItemRect(1, &wider);
-    EXPECT_EQ(wider.Width(), second.Width() + 40);
-    EXPECT_EQ(status.GetPaneText(1), "7 shapes");
-    status.SetPaneInfo(1, id, SBPS_STRETCH | SBPS_NOBORDERS, width);
-    status.SetPaneText(1, "8 shapes");
-    settle();
-    EXPECT_EQ(status.GetState()->widget()->findChildren<QLabel*>("pane"), labels) << "changed in place";
-    EXPECT_TRUE(labels[1]->isVisible());
-    EXPECT_EQ(labels[1]->text(), QString("8 shapes"));
-    EXPECT_EQ(labels[1]->frameShape(), QFrame::NoFrame);
-    EXPECT_GT(labels[1]->width(), wider.Width());
-    EXPECT_LT(labels[0]->x(), labels[1]->x());
-    EXPECT_LT(labels[1]->x(), labels[2]->x());
-    EXPECT_EQ(titleOf(status), "Ready");
-    const UINT fewer[] = {ID_SEPARATOR, ID_INDICATOR_CAPS};
-    status.SetIndicators(fewer, 2);
-    EXPECT_EQ(status.GetState()->widget()->findChildren<QLabel*>("pane"), labels.first(2));
 }

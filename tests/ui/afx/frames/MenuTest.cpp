@@ -259,7 +259,7 @@ TEST_F(FrameTest, TellsAssistiveToolsPartsOfAFrameByName) {
   Separator ""
   CheckBox "Grid"
   Button "Orphan"
- StatusBar ""
+ StatusBar "Status Bar"
   Grip ""
   StaticText "Ready"
   StaticText "000 shapes"
@@ -302,7 +302,7 @@ TEST_F(FrameTest, TellsAssistiveToolsOfChildFramesOnce) {
    Client ""
     Client ""
      Client ""
- StatusBar ""
+ StatusBar "Status Bar"
   Grip ""
   StaticText "Ready"
 )");
