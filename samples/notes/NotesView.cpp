@@ -6,7 +6,12 @@
 #include "s/Msg.h"
 #include "s/Profile.h"
 
-#include <algorithm>
+namespace {
+
+/// The size of the letters until the user chooses a font, in tenths of a point.
+constexpr int textSize = 110;
+
+} // namespace
 
 IMPLEMENT_DYNCREATE(CNotesView, CView)
 
@@ -41,10 +46,11 @@ int CNotesView::OnCreate(CREATESTRUCT* cs) {
         return -1;
     }
     m_edit.SetLimitText(0);
+    m_font.CreatePointFont(textSize, "Sans");
     LOGFONT font{};
-    if (Gui_Profile::ReadLogFont(font, nullptr, nullptr)) {
-        setFont(font);
-    }
+    m_font.GetLogFont(&font);
+    Gui_Profile::ReadLogFont(font, nullptr, nullptr); // leaves it where the user has chosen none
+    setFont(font);
     return 0;
 }
 
