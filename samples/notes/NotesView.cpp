@@ -46,6 +46,7 @@ int CNotesView::OnCreate(CREATESTRUCT* cs) {
         return -1;
     }
     m_edit.SetLimitText(0);
+    m_edit.DragAcceptFiles();
     m_font.CreatePointFont(textSize, "Sans");
     LOGFONT font{};
     m_font.GetLogFont(&font);

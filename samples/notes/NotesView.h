@@ -2,7 +2,7 @@
 
 #include "FindDialog.h"
 #include "NotesDoc.h"
-#include "s/Edit.h"
+#include "NotesEdit.h"
 
 /// Shows the text in an edit control that fills the view, and takes what the Edit menu does with it.
 class CNotesView : public CView {
@@ -43,7 +43,7 @@ private:
     bool findFrom(int start);
     void setFont(const LOGFONT& font);
 
-    Gui_Edit m_edit;
+    CNotesEdit m_edit;
     CFont m_font;
     FindOptions m_find;
 

@@ -151,7 +151,10 @@ public:
             m_edit->setUndoRedoEnabled(false);
         }
         m_edit->textCursor().insertText(text);
-        m_edit->setUndoRedoEnabled(true);
+        if (undo == Undo::Forget) {
+            // Not otherwise: with it the toolkit forgets at which change the text was unmodified.
+            m_edit->setUndoRedoEnabled(true);
+        }
         // A program that only deletes goes on with something else; the view need not go there and back.
         if (undo == Undo::Keep || !text.isEmpty()) {
             m_edit->ensureCursorVisible();

@@ -165,6 +165,21 @@ TEST_F(EditTest, ManyLinesEndInCarriageReturnAndLineFeed) {
     });
 }
 
+TEST_F(EditTest, UndoneBackToWhatWasSavedManyLinesAreUnmodified) {
+    with(ES_MULTILINE, [&] {
+        control.SetWindowText("text");
+        type("a");
+        control.SetModify(FALSE);
+        type("b");
+        EXPECT_TRUE(control.GetModify());
+        control.Undo();
+        EXPECT_EQ(textOf(&control), "atext");
+        EXPECT_FALSE(control.GetModify());
+        control.Undo();
+        EXPECT_TRUE(control.GetModify());
+    });
+}
+
 TEST_F(EditTest, ManyLinesKeepEveryCharacter) {
     with(ES_MULTILINE, [&] {
         const std::string text = "not\xC2\xA0"
