@@ -191,7 +191,7 @@ void CWinApp::WinHelpInternal(DWORD_PTR data, UINT command) {
 }
 
 void CWinApp::OnHelp() {
-    requestHelpAtKeyboard(m_pMainWnd ? m_pMainWnd->m_hWnd : nullptr);
+    explainAtKeyboard(m_pMainWnd ? m_pMainWnd->m_hWnd : nullptr);
 }
 
 void CWinApp::OnHelpIndex() {

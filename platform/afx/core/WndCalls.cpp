@@ -575,7 +575,7 @@ BOOL CWnd::SetWindowContextHelpId(DWORD context) {
 }
 
 void CWnd::OnHelp() {
-    requestHelpAtKeyboard(m_hWnd);
+    explainAtKeyboard(m_hWnd);
 }
 
 void CWnd::OnHelpIndex() {

@@ -169,8 +169,7 @@ private:
     void askForHelp() {
         // What help itself has to say would only be said again.
         if (m_hasHelp) {
-            const CWnd* main = AfxGetMainWnd();
-            requestHelp(m_owner || !main ? m_owner : main->m_hWnd, m_help);
+            explain(m_owner, m_help);
         }
     }
 

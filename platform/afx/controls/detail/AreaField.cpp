@@ -12,7 +12,6 @@
 #include <QStylePainter>
 #include <QTextBlock>
 #include <QTextCursor>
-#include <QTextDocumentFragment>
 #include <QTextLayout>
 
 namespace tvx::afx {
@@ -21,6 +20,12 @@ namespace {
 
 Qt::ScrollBarPolicy policy(bool bar) {
     return bar ? Qt::ScrollBarAlwaysOn : Qt::ScrollBarAlwaysOff;
+}
+
+/// A text as it was set. The toolkit's own plain text has blanks in the place of those that must not be broken, and
+/// line ends in the place of other separators.
+QString plainText(QString raw) {
+    return raw.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
 }
 
 TextRange selectionOf(const QPlainTextEdit& edit) {
@@ -86,7 +91,7 @@ protected:
     }
     QMimeData* createMimeDataFromSelection() const override {
         auto* data = new QMimeData;
-        data->setText(textCursor().selection().toPlainText());
+        data->setText(plainText(textCursor().selectedText()));
         return data;
     }
 
@@ -125,7 +130,7 @@ public:
         return m_edit;
     }
     QString text() const override {
-        return m_edit->toPlainText();
+        return plainText(m_edit->document()->toRawText());
     }
     void setText(const QString& text) override {
         m_edit->setPlainText(text);
@@ -146,7 +151,10 @@ public:
             m_edit->setUndoRedoEnabled(false);
         }
         m_edit->textCursor().insertText(text);
-        m_edit->setUndoRedoEnabled(true);
+        if (undo == Undo::Forget) {
+            // Not otherwise: with it the toolkit forgets at which change the text was unmodified.
+            m_edit->setUndoRedoEnabled(true);
+        }
         // A program that only deletes goes on with something else; the view need not go there and back.
         if (undo == Undo::Keep || !text.isEmpty()) {
             m_edit->ensureCursorVisible();

@@ -37,7 +37,7 @@ bool takePress(const Window& window, const QMouseEvent& event) {
     leaveHelpMode();
     if (event.button() == Qt::LeftButton) {
         const DWORD_PTR context = contextAt(handle, screen);
-        requestHelp(handle, context);
+        explain(handle, context);
     }
     return true;
 }

@@ -11,20 +11,11 @@ namespace tvx::afx {
 
 namespace {
 
-/// What the innermost request asks about when that is not the window.
-DWORD_PTR askedContext = 0;
 int answering = 0;
 
-LRESULT send(HWND target, HELPINFO info, DWORD_PTR context) {
+LRESULT send(HWND target, HELPINFO info) {
     info.cbSize = sizeof info;
     GetCursorPos(&info.MousePos);
-    struct Request {
-        explicit Request(DWORD_PTR context) : outer(std::exchange(askedContext, context)) {}
-        ~Request() {
-            askedContext = outer;
-        }
-        DWORD_PTR outer;
-    } const request(context);
     return SendMessageA(target, WM_HELP, 0, reinterpret_cast<LPARAM>(&info));
 }
 
@@ -41,23 +32,14 @@ HWND above(HWND handle) {
 
 } // namespace
 
-LRESULT requestHelp(HWND handle, DWORD_PTR context) {
+LRESULT requestHelp(HWND handle) {
     const Window* window = Window::from(handle);
     HELPINFO info{};
     info.iContextType = HELPINFO_WINDOW;
     info.iCtrlId = window ? window->id() : 0;
     info.hItemHandle = handle;
-    info.dwContextId = context != 0 || !window ? context : window->helpContext;
-    if (!window) {
-        answerHelpRequest(info, mainWindow());
-        return TRUE;
-    }
-    return send(handle, info, context);
-}
-
-void requestHelpAtKeyboard(HWND fallback) {
-    const HWND focus = GetFocus();
-    requestHelp(focus ? focus : fallback);
+    info.dwContextId = window ? window->helpContext : 0;
+    return send(handle, info);
 }
 
 void requestMenuHelp(HWND owner, HMENU menu, UINT item) {
@@ -65,21 +47,21 @@ void requestMenuHelp(HWND owner, HMENU menu, UINT item) {
     info.iContextType = HELPINFO_MENUITEM;
     info.iCtrlId = static_cast<int>(item);
     info.hItemHandle = menu;
-    send(owner ? owner : mainWindow(), info, 0);
+    send(owner ? owner : mainWindow(), info);
 }
 
 void answerHelpRequest(const HELPINFO& info, HWND last) {
-    const HelpAnswer answer;
-    // Taken here, so that what an answer shows may ask for help of its own.
-    DWORD_PTR context = std::exchange(askedContext, 0);
     const HWND asked = static_cast<HWND>(info.hItemHandle);
-    HWND at = last;
     if (info.iContextType == HELPINFO_MENUITEM && info.iCtrlId != 0) {
-        context = HID_BASE_COMMAND + promptOf(static_cast<UINT>(info.iCtrlId));
-    } else if (info.iContextType == HELPINFO_WINDOW && Window::from(asked)) {
-        at = asked;
+        explain(last, HID_BASE_COMMAND + promptOf(static_cast<UINT>(info.iCtrlId)));
+    } else {
+        explain(info.iContextType == HELPINFO_WINDOW && Window::from(asked) ? asked : last);
     }
-    while (at) {
+}
+
+void explain(HWND window, DWORD_PTR context) {
+    const HelpAnswer answer;
+    for (HWND at = Window::from(window) ? window : mainWindow(); at;) {
         const HWND next = above(at); // an answer may end the window
         if (SendMessageA(at, WM_COMMANDHELP, 0, static_cast<LPARAM>(context)) != 0) {
             return;
@@ -91,6 +73,11 @@ void answerHelpRequest(const HELPINFO& info, HWND last) {
     } else if (CWinApp* app = AfxGetApp()) {
         app->OnCmdMsg(ID_DEFAULT_HELP, CN_COMMAND, nullptr, nullptr);
     }
+}
+
+void explainAtKeyboard(HWND fallback) {
+    const HWND focus = GetFocus();
+    explain(focus ? focus : fallback);
 }
 
 HelpAnswer::HelpAnswer() {

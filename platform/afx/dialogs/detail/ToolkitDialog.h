@@ -53,7 +53,7 @@ protected:
             const auto& key = static_cast<const QKeyEvent&>(*event);
             if (key.key() == Qt::Key_F1 && key.modifiers() == Qt::NoModifier && !isRepeated(key)) {
                 event->accept();
-                requestHelp(m_owner, HID_BASE_RESOURCE + m_help);
+                explain(m_owner, HID_BASE_RESOURCE + m_help);
                 return true;
             }
         }

@@ -165,6 +165,34 @@ TEST_F(EditTest, ManyLinesEndInCarriageReturnAndLineFeed) {
     });
 }
 
+TEST_F(EditTest, UndoneBackToWhatWasSavedManyLinesAreUnmodified) {
+    with(ES_MULTILINE, [&] {
+        control.SetWindowText("text");
+        type("a");
+        control.SetModify(FALSE);
+        type("b");
+        EXPECT_TRUE(control.GetModify());
+        control.Undo();
+        EXPECT_EQ(textOf(&control), "atext");
+        EXPECT_FALSE(control.GetModify());
+        control.Undo();
+        EXPECT_TRUE(control.GetModify());
+    });
+}
+
+TEST_F(EditTest, ManyLinesKeepEveryCharacter) {
+    with(ES_MULTILINE, [&] {
+        const std::string text = "not\xC2\xA0"
+                                 "broken, a line\xE2\x80\xA8"
+                                 "separator, \xEF\xBF\xBC, caf\xE9, \x01\x0B\x0C\x7F";
+        control.SetWindowText(text.c_str());
+        EXPECT_EQ(textOf(&control), text);
+        control.SetSel(0, -1);
+        control.Copy();
+        EXPECT_EQ(QApplication::clipboard()->text().left(4), QString::fromUtf8("not\xC2\xA0"));
+    });
+}
+
 TEST_F(EditTest, WithoutWantReturnEnterIsTheDialogs) {
     dialog.prepare = [&] { make(ES_MULTILINE); };
     dialog.script = [&] {

@@ -1,0 +1,22 @@
+/* Identifiers of the resources of Notes. */
+#define IDR_MAINFRAME 128
+#define IDR_CONTEXT 129
+
+#define IDD_FIND 101
+#define IDC_TEXT 1001
+#define IDC_FIND_TEXT 1002
+#define IDC_FIND_WORD 1003
+#define IDC_FIND_CASE 1004
+
+#define IDS_CMD_OPCODES 200
+#define IDS_USAGE 201
+#define IDS_VERSION 202
+#define IDS_NO_TEXT 203
+#define IDS_TOO_LARGE 204
+#define IDS_NOT_FOUND 205
+#define IDS_POSITION 206
+
+#define ID_VIEW_FONT 32770
+#define ID_INDICATOR_POSITION 32771
+#define ID_TOOLS_KEYBOARD 32772
+#define ID_TOOLS_WEB_BROWSER 32773
