@@ -161,7 +161,6 @@ private:
     }
 };
 
-/// A tool bar. Docked ones the toolkit leaves without a name.
 /// A tool bar or status bar. The toolkit leaves docked ones without a name.
 class AccessibleBar : public QAccessibleWidget {
 public:
