@@ -314,7 +314,8 @@ TEST_F(FloatTest, NothingDanglesAfterManyMoves) {
     PadView& view = viewOf(*frame);
     for (int i = 0; i < count; ++i) {
         if (i % 50 == 0) {
-            settle(); // as fast as keys come, for the others
+            settle(); // the others come as fast as keys do
+            QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete); // as the loop does
         }
         frame->GetFloatHelp().RipOutView();
         ASSERT_EQ(floating(), 1U);
