@@ -30,6 +30,8 @@ said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1) || code=$?
 [[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
 
 ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
+module=$(find "$work/moved" -path '*/tarvex/uxtheme.so')
+ldd "$module" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: visual styles without the library"; exit 1; }
 for tool in tvxsettings tvxopen helpmapcheck; do
     "$work/moved/bin/$tool" --help >/dev/null
     [ -s "$work/moved/share/man/man1/$tool.1" ] || { echo "FAIL: no manual page of $tool"; exit 1; }

@@ -118,10 +118,14 @@ void Control::askColors() {
         return;
     }
     m_colors = colors;
-    QPalette palette;
-    if (colors.chosen) {
-        palette = QApplication::palette(colorWidget());
-        applyColors(palette, QColor(colors.text), QColor::fromRgba(colors.background));
+    applyPalette();
+}
+
+/// Names the chosen colours only: all others go on following the desktop's.
+void Control::applyPalette() {
+    QPalette palette = ownPalette();
+    if (m_colors.chosen) {
+        applyColors(palette, QColor(m_colors.text), QColor::fromRgba(m_colors.background));
     }
     guarded([&] { colorWidget()->setPalette(palette); });
 }
@@ -161,6 +165,9 @@ LRESULT Control::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         }
         return 0;
     }
+    case WM_SYSCOLORCHANGE:
+        applyPalette();
+        return 0;
     default:
         return Window::defaultProc(message, wParam, lParam);
     }

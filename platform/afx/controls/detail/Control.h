@@ -44,6 +44,10 @@ protected:
     virtual QWidget* colorWidget() const {
         return clientWidget();
     }
+    /// The colours of the kind that are not the desktop's for its widget.
+    virtual QPalette ownPalette() const {
+        return {};
+    }
     /// How the colours that the parent chose are put into a palette.
     virtual void applyColors(QPalette& palette, const QColor& text, const QColor& background) const;
     /// The same for what is typed into or chosen from: its text stands on the palette's base.
@@ -59,6 +63,7 @@ protected:
         return (style() & WS_BORDER) != 0 || (exStyle() & (WS_EX_CLIENTEDGE | WS_EX_STATICEDGE)) != 0;
     }
     void askColors();
+    void applyPalette();
     /// Has the parent draw the whole control.
     /// @param type ODT_... @param state ODS_..., without ODS_DISABLED
     void paintByOwner(QPainter& painter, UINT type, UINT state);

@@ -79,13 +79,17 @@ void EditWindow::applyStyle() {
         m_field->setAlignment((style() & ES_RIGHT) != 0    ? Qt::AlignRight
                               : (style() & ES_CENTER) != 0 ? Qt::AlignHCenter
                                                            : Qt::AlignLeft);
-        QPalette palette;
-        // A field that cannot be typed into looks like the window around it.
-        if (isReadOnly()) {
-            palette.setColor(QPalette::Base, QApplication::palette(widget()).color(QPalette::Window));
-        }
-        colorWidget()->setPalette(palette);
     });
+    applyPalette();
+}
+
+QPalette EditWindow::ownPalette() const {
+    QPalette palette;
+    // A field that cannot be typed into looks like the window around it.
+    if (isReadOnly()) {
+        palette.setColor(QPalette::Base, QApplication::palette(widget()).color(QPalette::Window));
+    }
+    return palette;
 }
 
 void EditWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {

@@ -26,6 +26,7 @@ protected:
     void widgetMade() override;
     void styleChanged(DWORD oldStyle, DWORD oldExStyle) override;
     void focusMoved(bool got) override;
+    QPalette ownPalette() const override;
     void applyColors(QPalette& palette, const QColor& text, const QColor& background) const override;
 
 private:

@@ -66,7 +66,16 @@ void Caption::renewStyle() {
 int Caption::border() const {
     const Qt::WindowStates state = m_window.widget()->windowState();
     const bool fills = (state & (Qt::WindowMaximized | Qt::WindowFullScreen)) != 0;
-    return fills ? 0 : m_style->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth, nullptr, m_window.widget());
+    return fills ? 0 : fullBorder();
+}
+
+int Caption::fullBorder() const {
+    return m_style->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth, nullptr, m_window.widget());
+}
+
+int Caption::hiddenBorder() const {
+    const QWidget& widget = *m_window.widget();
+    return widget.isMaximized() && !widget.isFullScreen() ? fullBorder() : 0;
 }
 
 int Caption::height() const {
@@ -185,9 +194,13 @@ int Caption::hitTest(QPoint point) const {
         at = QPoint(std::clamp(at.x(), option.rect.left() + half, std::max(half, option.rect.right() - half)),
                     std::max(at.y(), option.rect.center().y()));
     }
+    // Half of the gap at the left of a button belongs to it. So a button that the host puts beside it, by what it is
+    // told here, has its size and the same gap.
+    const int reach = widget.isWindow() ? 1 : 0;
     for (const Part& part : parts) {
         const QStyle::SubControl control = controlOf(part.code, widget);
-        if (m_style->subControlRect(QStyle::CC_TitleBar, &option, control, &widget).contains(at)) {
+        const QRect place = m_style->subControlRect(QStyle::CC_TitleBar, &option, control, &widget);
+        if (place.adjusted(-reach, 0, 0, 0).contains(at)) {
             return part.code;
         }
     }

@@ -22,7 +22,7 @@ class Window;
 
 /// The desktop's style for captions. It draws a border around them, keeps the place of a button that the host has
 /// added, and draws captions on dark desktops so that they can be read.
-class CaptionStyle : public QProxyStyle {
+class TVX_PLATFORM_API CaptionStyle : public QProxyStyle {
 public:
     CaptionStyle();
     int styleHint(StyleHint hint, const QStyleOption* option, const QWidget* widget,
@@ -51,6 +51,8 @@ public:
     QMargins margins() const;
     /// The smallest window in which no button lies on another.
     QSize leastSize() const;
+    /// How wide the border would be that a maximised window does not show; 0 for others.
+    int hiddenBorder() const;
     /// The part (HT...) at a point of the window's widget.
     int hitTest(QPoint point) const;
     /// Draws border and caption on the window's widget.
@@ -68,6 +70,7 @@ public:
 
 private:
     int border() const;
+    int fullBorder() const;
     int height() const;
     QStyleOptionTitleBar bar() const;
     int edgeAt(QPoint point) const;

@@ -42,6 +42,12 @@ int CaptionedWindow::hitTest(QPoint screen) const {
     return part == HTCLIENT ? TopLevelWindow::hitTest(screen) : part;
 }
 
+/// The border of a maximised window lies beyond the screen: what is measured from its corners is the same in any state.
+QRect CaptionedWindow::screenRect() const {
+    const int beyond = m_caption.hiddenBorder();
+    return TopLevelWindow::screenRect().adjusted(-beyond, -beyond, beyond, beyond);
+}
+
 void CaptionedWindow::updateFrame() {
     TopLevelWindow::updateFrame();
     m_caption.update();

@@ -16,6 +16,7 @@ public:
     explicit CaptionedWindow(const CREATESTRUCT& cs);
     Caption* caption() const override;
     int hitTest(QPoint screen) const override;
+    QRect screenRect() const override;
     void updateFrame() override;
     void stateChanged() override;
     LRESULT defaultProc(UINT message, WPARAM wParam, LPARAM lParam) override;

@@ -508,12 +508,41 @@ bool isInput(QEvent::Type type) {
     }
 }
 
-/// A new style or new colours of the desktop. Posted, because the toolkit is going through its list of widgets.
-void onAppearance(const Window& window, const QEvent& event) {
-    if (event.type() != QEvent::StyleChange) {
-        PostMessageA(window.handle(), WM_SYSCOLORCHANGE, 0, 0);
+void postToTree(const Window& window, UINT message) {
+    PostMessageA(window.handle(), message, 0, 0);
+    for (const Window* child : window.children()) {
+        postToTree(*child, message);
     }
-    PostMessageA(window.handle(), WM_THEMECHANGED, 0, 0);
+}
+
+/// Tells every window, once however many of them the toolkit tells. Posted, because it is going through its list of
+/// widgets.
+class Announcement {
+public:
+    explicit Announcement(UINT message) : m_message(message) {}
+    void make() {
+        if (std::exchange(m_isMade, true)) {
+            return;
+        }
+        for (const Window* window : Window::topLevels()) {
+            postToTree(*window, m_message);
+        }
+        QMetaObject::invokeMethod(qApp, [this] { m_isMade = false; }, Qt::QueuedConnection);
+    }
+
+private:
+    UINT m_message;
+    bool m_isMade = false;
+};
+
+/// A new style or new colours of the desktop.
+void onAppearance(const QEvent& event) {
+    static Announcement colors(WM_SYSCOLORCHANGE);
+    static Announcement style(WM_THEMECHANGED);
+    if (event.type() != QEvent::StyleChange) {
+        colors.make();
+    }
+    style.make();
 }
 
 bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& result) {
@@ -524,8 +553,8 @@ bool translateOther(Window& window, QObject* receiver, QEvent* event, bool& resu
         return receiver == window.widget() && window.widget()->isWindow() && onCloseRequest(window, *event);
     case QEvent::StyleChange:
     case QEvent::ApplicationPaletteChange:
-        if (receiver == window.widget()) {
-            onAppearance(window, *event);
+        if (receiver == window.widget() && window.widget()->isWindow()) {
+            onAppearance(*event);
         }
         return false;
     case QEvent::DragEnter:

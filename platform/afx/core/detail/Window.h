@@ -183,7 +183,7 @@ public:
     Placement* placement() const {
         return m_placement.get();
     }
-    QRect screenRect() const;
+    virtual QRect screenRect() const;
     QPoint clientToScreen(const QPoint& point) const;
     QPoint screenToClient(const QPoint& point) const;
     /// Does what a show command (SW_...) says, and tells the window of it.

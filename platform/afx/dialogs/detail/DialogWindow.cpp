@@ -288,7 +288,7 @@ void DialogWindow::askColor() {
     }
     m_color = color;
     QWidget& inside = *clientWidget();
-    QPalette palette = QApplication::palette(&inside);
+    QPalette palette; // names this colour only, so that others go on following the desktop's
     if (color != 0) {
         palette.setColor(QPalette::Window, QColor(color));
     }

@@ -117,7 +117,7 @@ TVX_PLATFORM_API bool removeContext(HDC dc);
 [[nodiscard]] TVX_PLATFORM_API std::size_t contextCount();
 
 /// One drawing operation: opens the target's pixels and closes them at the end of the scope.
-class Drawing {
+class TVX_PLATFORM_API Drawing {
 public:
     explicit Drawing(DeviceContext& context);
     ~Drawing();
