@@ -1,9 +1,13 @@
 #include "platform/afx/frames/detail/BarWindow.h"
 
+#include "platform/afx/core/Menu.h"
 #include "platform/afx/core/detail/Loop.h"
+#include "platform/afx/core/detail/MenuRequest.h"
+#include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/Frame.h"
 #include "platform/afx/frames/detail/ToolWidget.h"
+#include "platform/win/FrameworkIds.h"
 
 #include <QMainWindow>
 #include <QStatusBar>
@@ -51,12 +55,54 @@ void BarWindow::setWindowRect(const QRect& rect) {
     }
 }
 
+namespace {
+
+/// The menu of a floating bar, which does what a double click on the caption and the button in it do.
+void showFloatingMenu(CControlBar& bar, CFrameWnd& frame, QPoint at) {
+    const HWND handle = bar.m_hWnd;
+    // Help on the first item is that on the bar.
+    const auto dock = static_cast<UINT>(bar.GetDlgCtrlID());
+    const HMENU menu = CreatePopupMenu();
+    AppendMenuA(menu, MF_STRING | (bar.GetDockSides() != 0 ? MF_ENABLED : MF_GRAYED), dock,
+                fromQt(ownText(TVX_IDS_BAR_DOCK)).c_str());
+    AppendMenuA(menu, MF_STRING, SC_CLOSE, fromQt(ownText(TVX_IDS_SYS_CLOSE).section('\t', 0, 0)).c_str());
+    const auto chosen = static_cast<UINT>(
+        TrackPopupMenu(menu, TPM_RETURNCMD | TPM_NONOTIFY | TPM_RIGHTBUTTON, at.x(), at.y(), 0, frame.m_hWnd, nullptr));
+    DestroyMenu(menu);
+    if (!Window::from(handle)) {
+        return;
+    }
+    if (chosen == dock) {
+        frame.DockControlBar(&bar);
+    } else if (chosen == SC_CLOSE) {
+        bar.SendMessage(WM_CLOSE);
+    }
+}
+
+} // namespace
+
+void BarWindow::contextMenu(CControlBar& bar, WPARAM wParam, LPARAM lParam) {
+    const HWND self = handle();
+    if (parentsTakeMenu(*this, wParam, lParam) || !from(self)) {
+        return;
+    }
+    CFrameWnd* frame = bar.GetDockingFrame();
+    const QPoint place(GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam));
+    if (frame && bar.IsFloating()) {
+        showFloatingMenu(bar, *frame, place != QPoint(-1, -1) ? place : windowRect().topLeft());
+    }
+}
+
 LRESULT BarWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
-    auto* bar = message == WM_CLOSE ? dynamic_cast<CControlBar*>(object()) : nullptr;
+    auto* bar = dynamic_cast<CControlBar*>(object());
     CFrameWnd* frame = bar ? bar->GetDockingFrame() : nullptr;
-    if (frame) {
+    if (frame && message == WM_CLOSE) {
         // A floating bar that is closed must not end: the frame's menu brings it back.
         frame->ShowControlBar(bar, FALSE, FALSE);
+        return 0;
+    }
+    if (bar && message == WM_CONTEXTMENU) {
+        contextMenu(*bar, wParam, lParam);
         return 0;
     }
     return Window::defaultProc(message, wParam, lParam);

@@ -6,6 +6,7 @@
 #include "platform/afx/core/detail/Window.h"
 #include "platform/base/String.h"
 
+class CControlBar;
 class CWnd;
 class QMainWindow;
 class QToolBar;
@@ -25,6 +26,9 @@ public:
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
+
+private:
+    void contextMenu(CControlBar& bar, WPARAM wParam, LPARAM lParam);
 };
 
 /// The toolkit's tool bar behind a bar; null for a bar of another kind and for one without a window.

@@ -164,6 +164,17 @@ TEST_F(Bars, DockAndFloat) {
     settle();
     EXPECT_FALSE(frame->tools.IsFloating()) << "a double click on the caption";
     EXPECT_FALSE((*closer)->isVisible());
+    const auto choose = [&](const QString& item) {
+        later([item] { clickItem(*openMenu(), item); });
+        frame->tools.SendMessage(WM_CONTEXTMENU, reinterpret_cast<WPARAM>(frame->tools.m_hWnd), MAKELPARAM(-1, -1));
+        settle();
+    };
+    frame->FloatControlBar(&frame->tools, CPoint(200, 200));
+    choose("Close");
+    EXPECT_FALSE(frame->tools.IsVisible());
+    frame->ShowControlBar(&frame->tools, TRUE, FALSE);
+    choose("Dock");
+    EXPECT_FALSE(frame->tools.IsFloating());
     frame->DockControlBar(&frame->tools, AFX_IDW_DOCKBAR_BOTTOM);
     settle();
     EXPECT_EQ(button(ID_TEST_DRAW)->y(), tools->height() - 1 - button(ID_TEST_DRAW)->geometry().bottom())
