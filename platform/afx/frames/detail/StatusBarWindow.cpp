@@ -165,7 +165,7 @@ bool StatusBarWidget::isDue() {
 }
 
 void StatusBarWidget::showNow(StatusPane& pane) {
-    if (isVisible() && isDue()) {
+    if (!pane.isPainted() && isVisible() && isDue()) {
         pane.showNow();
     }
     pane.showSoon();
