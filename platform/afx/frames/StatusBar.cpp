@@ -59,7 +59,7 @@ BOOL CStatusBar::SetIndicators(const UINT* ids, int count) {
         if (pane.id != ID_SEPARATOR) {
             pane.text.LoadString(pane.id);
         }
-        pane.width = widget ? widget->fontMetrics().horizontalAdvance(toQt(pane.text)) : 0;
+        pane.width = widget ? QFontMetrics(widget->paneFont()).horizontalAdvance(toQt(pane.text)) : 0;
         if (i == 0) {
             pane.style = SBPS_NOBORDERS | (pane.id == ID_SEPARATOR ? SBPS_STRETCH : 0U);
         }

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# The sample application as a user meets it under a window manager: opening a file by its name, drawing, saving,
-# closing with unsaved changes.
+# The sample application as a user meets it under a window manager: opening a file by its name, resting on the status
+# bar, drawing, saving, closing with unsaved changes.
 #
 #   BoardTest.sh BOARD DRAWING
 set -euo pipefail
@@ -36,9 +36,26 @@ draw() {
     await "a rectangle follows the mouse" repainted
     xdotool mousemove $((X + 260)) $((Y + 280)) mouseup 1
 }
+tip() {
+    [ "$(xdotool search --onlyvisible --class '^board$' | wc -l)" -gt 1 ]
+}
+noTip() {
+    ! tip
+}
+# Leaves the pointer on the field of the pointer's position in the status bar.
+hover() {
+    local WIDTH=0 HEIGHT=0
+    eval "$(xdotool getwindowgeometry --shell "$main" | grep -E '^(WIDTH|HEIGHT)=')"
+    xdotool mousemove --window "$main" $((WIDTH - 130)) $((HEIGHT - 11))
+    xdotool mousemove --window "$main" $((WIDTH - 128)) $((HEIGHT - 11))
+}
 
 before=$(sum)
 start "$file"
+hover
+await "a field of the status bar has a tip" tip
+xdotool mousemove --window "$main" 200 200
+await "the tip goes when the pointer leaves" noTip
 draw
 xdotool key --clearmodifiers ctrl+s
 await "Ctrl+S saves" changed

@@ -7,7 +7,6 @@
 #include "platform/afx/gdi/detail/Fonts.h"
 #include "platform/win/FrameworkIds.h"
 
-#include <QApplication>
 #include <QFontInfo>
 #include <QHelpEvent>
 #include <QSizeGrip>
@@ -15,6 +14,7 @@
 #include <QToolTip>
 
 #include <algorithm>
+#include <cstring>
 
 namespace tvx::afx {
 
@@ -33,20 +33,13 @@ std::unique_ptr<Window> makeStatusBar(const CREATESTRUCT& cs) {
 
 const WindowClassEntry statusBarEntry("msctls_statusbar32", &makeStatusBar);
 
-/// The desktop's font for status bars, described as hosts measure with it.
-LOGFONT desktopFont() {
-    QFont font = QApplication::font("QStatusBar");
-    const QFontInfo real(font);
-    font.setFamily(real.family()); // the desktop may name a kind of font only
-    return describeFont(font, real.pixelSize());
-}
-
 } // namespace
 
 // --- the widget ---
 
 StatusBarWidget::StatusBarWidget(QWidget* parent) : QStatusBar(parent) {
     setMouseTracking(true);
+    applyFont();
 }
 
 void StatusBarWidget::setCount(int count) {
@@ -56,8 +49,31 @@ void StatusBarWidget::setCount(int count) {
     }
     while (static_cast<int>(m_panes.size()) < count) {
         m_panes.push_back(new StatusPane(this));
+        m_panes.back()->setFont(m_paneFont);
         m_panes.back()->show();
     }
+}
+
+void StatusBarWidget::useFont(HFONT font) {
+    m_hostFont = font;
+    applyFont();
+}
+
+LOGFONT StatusBarWidget::desktopFont() const {
+    QFont named = font();
+    const QFontInfo real(named);
+    named.setFamily(real.family()); // the desktop may name a kind of font only
+    return describeFont(named, real.pixelSize());
+}
+
+/// The bar keeps the desktop's font, and so hears of another one.
+void StatusBarWidget::applyFont() {
+    m_paneFont = m_hostFont ? toolkitFont(m_hostFont) : controlFont(desktopFont());
+    for (StatusPane* pane : m_panes) {
+        pane->setFont(m_paneFont);
+    }
+    updateGeometry();
+    place();
 }
 
 StatusPane* StatusBarWidget::pane(int index) const {
@@ -75,7 +91,7 @@ StatusPane* StatusBarWidget::paneAt(QPoint point) const {
 QRect StatusBarWidget::room() const {
     const auto* grip = findChild<QSizeGrip*>(QString(), Qt::FindDirectChildrenOnly);
     const int end = margin + (grip ? grip->sizeHint().width() : 0);
-    const int height = statusPaneHeight(fontMetrics());
+    const int height = statusPaneHeight(QFontMetrics(m_paneFont));
     return {margin, std::max((this->height() - height + 1) / 2, 0), std::max(width() - margin - end, 0), height};
 }
 
@@ -109,7 +125,8 @@ void StatusBarWidget::resizeEvent(QResizeEvent* event) {
 }
 
 QSize StatusBarWidget::minimumSizeHint() const {
-    return {0, std::max(statusPaneHeight(fontMetrics()) + 2 * margin, QStatusBar::minimumSizeHint().height())};
+    const int height = statusPaneHeight(QFontMetrics(m_paneFont)) + 2 * margin;
+    return {0, std::max(height, QStatusBar::minimumSizeHint().height())};
 }
 
 QSize StatusBarWidget::sizeHint() const {
@@ -131,7 +148,9 @@ bool StatusBarWidget::event(QEvent* event) {
         return true;
     }
     const bool result = QStatusBar::event(event);
-    if (event->type() == QEvent::FontChange || event->type() == QEvent::LayoutDirectionChange) {
+    if (event->type() == QEvent::FontChange) {
+        applyFont();
+    } else if (event->type() == QEvent::LayoutDirectionChange) {
         place();
     }
     return result;
@@ -146,7 +165,7 @@ bool StatusBarWidget::isDue() {
 }
 
 void StatusBarWidget::showNow(StatusPane& pane) {
-    if (isVisible() && isDue()) {
+    if (!pane.isPainted() && isVisible() && isDue()) {
         pane.showNow();
     }
     pane.showSoon();
@@ -155,8 +174,8 @@ void StatusBarWidget::showNow(StatusPane& pane) {
 // --- the window ---
 
 StatusBarWindow::~StatusBarWindow() {
-    if (m_ownFont) {
-        DeleteObject(m_ownFont);
+    if (m_desktopFont) {
+        DeleteObject(m_desktopFont);
     }
 }
 
@@ -166,12 +185,18 @@ QWidget* StatusBarWindow::makeWidget(QWidget* parent) {
     return bar;
 }
 
-void StatusBarWindow::widgetMade() {
-    fontChanged();
+void StatusBarWindow::fontChanged() {
+    guarded([this] { bar()->useFont(font); });
 }
 
-void StatusBarWindow::fontChanged() {
-    guarded([this] { widget()->setFont(font ? toolkitFont(font) : controlFont(desktopFont())); });
+HFONT StatusBarWindow::desktopFont() {
+    const LOGFONT now = bar()->desktopFont();
+    if (!m_desktopFont || std::memcmp(&now, &m_described, sizeof(now)) != 0) {
+        DeleteObject(m_desktopFont);
+        m_desktopFont = CreateFontIndirectA(&now);
+        m_described = now;
+    }
+    return m_desktopFont;
 }
 
 QString StatusBarWindow::text() const {
@@ -186,11 +211,7 @@ QString StatusBarWindow::cutTextAt(QPoint point) const {
 LRESULT StatusBarWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
     case WM_GETFONT:
-        if (!font && !m_ownFont) {
-            const LOGFONT description = desktopFont();
-            m_ownFont = CreateFontIndirectA(&description);
-        }
-        return reinterpret_cast<LRESULT>(font ? font : m_ownFont);
+        return reinterpret_cast<LRESULT>(font || !widget() ? font : desktopFont());
     case SB_GETRECT: {
         const StatusPane* pane = widget() ? bar()->pane(static_cast<int>(wParam)) : nullptr;
         if (pane) {

@@ -6,6 +6,7 @@
 #include "platform/afx/controls/detail/TipWindow.h"
 #include "platform/afx/frames/detail/BarWindow.h"
 #include "platform/afx/frames/detail/StatusPane.h"
+#include "platform/afx/gdi/GdiTypes.h"
 
 #include <QElapsedTimer>
 #include <QStatusBar>
@@ -27,6 +28,14 @@ public:
     [[nodiscard]] StatusPane* paneAt(QPoint point) const;
     /// Gives the panes their places.
     void place();
+    /// Draws the panes with a font of the host's; null for the desktop's, also when that becomes another one.
+    void useFont(HFONT font);
+    /// What the panes are drawn with.
+    [[nodiscard]] const QFont& paneFont() const {
+        return m_paneFont;
+    }
+    /// The desktop's font for status bars, described as hosts measure with it.
+    [[nodiscard]] LOGFONT desktopFont() const;
     /// Shows a pane's text at once, unless texts come faster than anybody sees them: then it is seen soon.
     void showNow(StatusPane& pane);
 
@@ -39,9 +48,12 @@ protected:
 
 private:
     [[nodiscard]] QRect room() const;
+    void applyFont();
     bool isDue();
 
     std::vector<StatusPane*> m_panes;
+    HFONT m_hostFont = nullptr;
+    QFont m_paneFont;
     QElapsedTimer m_frame; ///< since the first text of those that count together
     int m_inFrame = 0;     ///< how many of them have been shown
 };
@@ -60,11 +72,12 @@ public:
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
-    void widgetMade() override;
     void fontChanged() override;
 
 private:
-    HFONT m_ownFont = nullptr; ///< the desktop's, for hosts that ask for the bar's font
+    HFONT desktopFont();
+    HFONT m_desktopFont = nullptr; ///< for hosts that ask for the bar's font; null before
+    LOGFONT m_described{};         ///< what it was made from
 };
 
 } // namespace tvx::afx

@@ -26,7 +26,11 @@ public:
 
     /// Keeps a text. It is seen when the pane is next painted.
     void setText(const CString& text);
-    /// Asks for a paint if the text is not the one that was painted.
+    /// Whether the text is the one that was painted last.
+    [[nodiscard]] bool isPainted() const {
+        return m_isPainted;
+    }
+    /// Asks for a paint if it is not.
     void showSoon();
     /// Paints such a text at once, and nothing else of the window.
     void showNow();
@@ -47,8 +51,8 @@ private:
     mutable QString m_text;        ///< the same for the toolkit
     mutable bool m_isTaken = true; ///< whether m_text follows m_given
     QString m_told;                ///< what assistive tools were told of last
-    bool m_isPainted = true;       ///< whether the text is the one that was painted
-    bool m_isAskedFor = false;     ///< whether a paint is on its way
+    bool m_isPainted = true;
+    bool m_isAskedFor = false; ///< whether a paint is on its way
 };
 
 /// Height of a pane in a font.

@@ -78,9 +78,9 @@ TEST_F(StatusBars, PanesChangeInPlace) {
     EXPECT_EQ(std::tuple(told(0), told(1), told(2)), std::tuple("Ready", "7 shapes", "")) << "Caps Lock is off";
     EXPECT_GT(place(0).Width(), place(1).Width()) << "the first pane stretches";
     EXPECT_EQ(tvx::afx::toQt(place(1)), before[1]->geometry());
-    CRect asked(-1, -1, -1, -1);
-    EXPECT_FALSE(status.SendMessage(SB_GETRECT, 3, reinterpret_cast<LPARAM>(&asked)));
-    EXPECT_EQ(asked, CRect(-1, -1, -1, -1));
+    CRect none(-1, -1, -1, -1);
+    EXPECT_FALSE(status.SendMessage(SB_GETRECT, 3, reinterpret_cast<LPARAM>(&none)));
+    EXPECT_EQ(none, CRect(-1, -1, -1, -1));
     EXPECT_EQ(place(3), CRect(0, 0, 0, 0));
 
     const CRect narrow = place(1);
@@ -97,6 +97,18 @@ TEST_F(StatusBars, PanesChangeInPlace) {
     EXPECT_EQ(std::pair(told(1), status.GetPaneText(1)), std::pair(std::string(), CString("7 shapes")));
     EXPECT_EQ(panes(), before);
     EXPECT_EQ(titleOf(status), "Ready");
+    const int height = place(1).Height();
+    const QFont font = QApplication::font();
+    QFont large = font;
+    large.setPixelSize(2 * font.pixelSize());
+    QApplication::setFont(large);
+    settle();
+    EXPECT_GT(place(1).Height(), height);
+    LOGFONT asked{};
+    status.GetFont()->GetLogFont(&asked);
+    EXPECT_EQ(asked.lfHeight, -large.pixelSize());
+    QApplication::setFont(font);
+    settle();
 
     const UINT fewer[] = {ID_SEPARATOR, ID_INDICATOR_CAPS};
     status.SetIndicators(fewer, 2);
@@ -156,8 +168,11 @@ TEST_F(StatusBars, TextsAreSeenWhenTheyAreToBe) {
     settle();
     EXPECT_EQ(paints.count, before);
     EXPECT_EQ(told(1), "8 shapes");
-    frame->status.SetPaneText(1, "8 shapes", TRUE);
-    EXPECT_EQ(paints.count, before + 1);
+    frame->status.RedrawWindow();
+    EXPECT_EQ(paints.count, before + 1) << "painted because the bar is";
+    frame->status.SetPaneText(1, "9 shapes", FALSE);
+    frame->status.SetPaneText(1, "9 shapes", TRUE);
+    EXPECT_EQ(paints.count, before + 2);
     EXPECT_EQ(seen(1), wanted(1));
 }
 
