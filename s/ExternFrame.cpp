@@ -145,12 +145,12 @@ void Gui_ExternFrame::OnClose() {
         GetFloatHelp().UnripView();
         return;
     }
-    FloatPlaces::remember(*this, GetRipResourceId());
     SECFrameWnd::OnClose();
 }
 
 void Gui_ExternFrame::OnDestroy() {
     std::erase(livingFrames(), this);
+    FloatPlaces::remember(*this, GetRipResourceId());
     SECFrameWnd::OnDestroy();
 }
 

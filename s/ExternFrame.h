@@ -4,6 +4,7 @@
 #include "platform/sec/Frames.h"
 #include "s/Export.h"
 #include "s/FloatFrame.h"
+#include "s/StatusBar.h"
 
 /// The window of a view that floats on the desktop: with a menu, accelerators, a tool bar and a status bar of its own,
 /// and an entry in the task list. A button in its caption and "Dock Window" in its system menu dock the view back.
@@ -87,7 +88,7 @@ protected:
     BOOL OnCommand(WPARAM wParam, LPARAM lParam) override;
 
     CToolBar m_toolBar;
-    CStatusBar m_statusBar;
+    Gui_StatusBar m_statusBar;
 
     DECLARE_MESSAGE_MAP()
 

@@ -171,7 +171,6 @@ void Gui_FloatHelp::dockView(CView& view) const {
     if (child) {
         child->PostSetActiveView(&view);
     }
-    FloatPlaces::remember(*m_owner, m_resourceId);
     end(former);
     present(fresh);
     document->UpdateFrameCounts();

@@ -132,6 +132,13 @@ picture line "A line across it."
 xdotool key --clearmodifiers ctrl+z
 picture undo "Undo took the line back."
 
+xdotool key --clearmodifiers ctrl+shift+f
+picture floating "Window, Float, or the button in its caption, gives a drawing a window of its own."
+xdotool windowactivate --sync "$main" key --clearmodifiers alt+w
+picture window-list "The Window menu lists it beside those that are docked; Dock All brings it back."
+xdotool key d
+picture docked "It is docked again."
+
 xdotool key --clearmodifiers alt+d
 picture menu "The Draw menu: tools, colours and fills."
 xdotool key Escape Escape

@@ -19,4 +19,8 @@ class CDrawingWindow : public Gui_ExternFrame {
 public:
     int CreateStatusBar() override;
     void PostLoadFrame(CView* view) override;
+    afx_msg BOOL OnHelpInfo(HELPINFO* info);
+
+protected:
+    DECLARE_MESSAGE_MAP()
 };

@@ -1,6 +1,7 @@
 #include "MainFrame.h"
 
 #include "Board.h"
+#include "Indicators.h"
 #include "OutputWindow.h"
 #include "Resource.h"
 #include "platform/base/Text.h"
@@ -8,15 +9,6 @@
 #include "s/BrowserPreference.h"
 #include "s/Profile.h"
 #include "s/QueryDlg.h"
-
-#include <iterator>
-
-namespace {
-
-constexpr UINT indicators[] = {ID_SEPARATOR, ID_INDICATOR_POSITION, ID_INDICATOR_CAPS, ID_INDICATOR_NUM};
-constexpr UINT indicatorTips[] = {0, IDS_TIP_POSITION, IDS_TIP_CAPS, IDS_TIP_NUM};
-
-} // namespace
 
 IMPLEMENT_DYNCREATE(CMainFrame, Gui_FloatMainFrame)
 

@@ -306,6 +306,30 @@ TEST_F(FloatTest, WindowsComeUpWhereTheLastOneStood) {
     EXPECT_NE(beside.TopLeft(), place.TopLeft());
 }
 
+TEST_F(FloatTest, ViewsMoveAndDocumentsCloseUnderADialogAndFromTheirWindow) {
+    PadFrame& frame = open();
+    later([&] {
+        frame.GetFloatHelp().RipOutView();
+        settle();
+        EXPECT_EQ(floating(), 1U);
+        Gui_ExternFrame::GetAll().front()->GetFloatHelp().UnripView();
+        settle();
+        EXPECT_EQ(floating(), 0U);
+        active()->GetFloatHelp().RipOutView();
+        auto* box = QApplication::activeModalWidget();
+        ASSERT_NE(box, nullptr);
+        box->close();
+    });
+    AfxMessageBox("A question");
+    ASSERT_EQ(floating(), 1U);
+    Gui_ExternFrame& window = *Gui_ExternFrame::GetAll().front();
+    const HWND self = window.m_hWnd;
+    window.SendMessage(WM_COMMAND, ID_FILE_CLOSE);
+    settle();
+    EXPECT_FALSE(::IsWindow(self));
+    EXPECT_EQ(main->MDIGetActive(), nullptr);
+}
+
 // What a hasty user and a program in a loop do.
 TEST_F(FloatTest, NothingDanglesAfterManyMoves) {
     const int count = 1000;
@@ -314,7 +338,7 @@ TEST_F(FloatTest, NothingDanglesAfterManyMoves) {
     PadView& view = viewOf(*frame);
     for (int i = 0; i < count; ++i) {
         if (i % 50 == 0) {
-            settle(); // the others come as fast as keys do
+            settle();                                                            // the others come as fast as keys do
             QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete); // as the loop does
         }
         frame->GetFloatHelp().RipOutView();
