@@ -240,8 +240,10 @@ using LPMSG = MSG*;
 #define HTBOTTOMRIGHT 17
 #define HTBORDER 18
 #define HTCLOSE 20
-/// An extended style of this layer's own, for top-level frames: the window draws its caption and border itself, in the
-/// desktop's style, so that its procedure is asked for their parts, told of the mouse there, and may draw on them.
+/// An extended style of this layer's own, for top-level frames, as child frames are without it: the window draws its
+/// caption and border itself, in the desktop's style, so that its procedure is asked for their parts, told of the mouse
+/// there, and may draw on them (the handlers OnNc... of CWnd). The window manager still moves and sizes it. To be set
+/// when the window is created.
 #define WS_EX_OWNCAPTION 0x00800000
 // Keys and buttons held down during a mouse message
 #define MK_LBUTTON 0x0001

@@ -480,8 +480,17 @@ public:
     /// Points are pixels of the client area, except those of OnContextMenu and OnMouseWheel, which are the screen's
     /// ((-1, -1) when the keyboard asked for a menu). Windows that come as arguments may be temporary or null.
     ///
-    /// What differs: the desktop draws the frames of top-level windows, so there are no messages of the non-client area
-    /// but OnNcActivate and OnNcDestroy. OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange,
+    /// Messages of the part around the client area (OnNc...) come to child frames and to top-level windows with
+    /// WS_EX_OWNCAPTION, which draw their frames themselves; to other top-level windows for their menu bar alone, since
+    /// the desktop draws the rest. OnNcHitTest is asked before each message of the mouse that nobody has captured, and
+    /// its answer counts: HTCAPTION in the client area lets the window be moved by it. Points of these messages are the
+    /// screen's. OnNcPaint comes whenever something of the frame is painted; call the base first, then draw with
+    /// CWindowDC, which may be done at any other time, too. OnNcActivate's base draws the frame as it is told to, and a
+    /// handler that does not call it leaves the frame as it looks. A press that a handler takes (SetCapture, no call of
+    /// the base) ends with OnLButtonUp of this window, wherever the pointer is by then; one that the base takes ends in
+    /// the base. A caption that is held by the mouse is let go of by Esc.
+    ///
+    /// What differs: OnActivateApp, OnEnterIdle, OnSettingChange, OnSysColorChange,
     /// OnQueryDragIcon, OnWindowPosChanging, OnWindowPosChanged and those of the session's end are called for messages
     /// that hosts send: the layer sends none of these. OnMove and OnSize tell of a new place.
     /// @{

@@ -35,18 +35,23 @@ QRect CaptionStyle::subControlRect(ComplexControl control, const QStyleOptionCom
 
 void CaptionStyle::drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
                                       const QWidget* widget) const {
-    const auto* caption = qstyleoption_cast<const QStyleOptionTitleBar*>(option);
-    if (!caption || (caption->titleBarState & State_Active) != 0 || !isDarkPalette()) {
+    const auto* given = qstyleoption_cast<const QStyleOptionTitleBar*>(option);
+    if (control != CC_TitleBar || !given) {
         QProxyStyle::drawComplexControl(control, option, painter, widget);
         return;
     }
-    // The style draws the buttons of inactive captions in black all the same; those of active ones are light, so the
-    // caption is drawn as an active one in quiet colours.
-    QStyleOptionTitleBar quiet = *caption;
-    quiet.titleBarState |= State_Active;
-    quiet.palette.setColor(QPalette::Highlight, caption->palette.color(QPalette::Window));
-    quiet.palette.setColor(QPalette::HighlightedText, caption->palette.color(QPalette::WindowText));
-    QProxyStyle::drawComplexControl(control, &quiet, painter, widget);
+    QStyleOptionTitleBar caption = *given;
+    caption.state.setFlag(State_Active, isActive);
+    caption.palette.setCurrentColorGroup(isActive ? QPalette::Active : QPalette::Inactive);
+    if (!isActive && isDarkPalette()) {
+        // The style draws the buttons of inactive captions in black all the same; those of active ones are light, so
+        // the caption is drawn as an active one in quiet colours.
+        caption.palette.setColor(QPalette::Highlight, caption.palette.color(QPalette::Window));
+        caption.palette.setColor(QPalette::HighlightedText, caption.palette.color(QPalette::WindowText));
+    }
+    const bool drawsActive = isActive || isDarkPalette();
+    caption.titleBarState = drawsActive ? caption.titleBarState | State_Active : caption.titleBarState & ~State_Active;
+    QProxyStyle::drawComplexControl(control, &caption, painter, widget);
 }
 
 Caption::Caption(Window& window) : m_window(window), m_style(std::make_unique<CaptionStyle>()) {}
@@ -58,9 +63,10 @@ QStyle& Caption::style() const {
 }
 
 void Caption::renewStyle() {
-    const QRect button = m_style->button;
-    m_style = std::make_unique<CaptionStyle>();
-    m_style->button = button;
+    auto renewed = std::make_unique<CaptionStyle>();
+    renewed->button = m_style->button;
+    renewed->isActive = m_style->isActive;
+    m_style = std::move(renewed);
 }
 
 int Caption::border() const {
@@ -111,11 +117,6 @@ QStyleOptionTitleBar Caption::bar() const {
     option.titleBarFlags = widget.windowFlags() | Qt::WindowTitleHint;
     option.titleBarState = static_cast<int>(widget.windowState());
     option.icon = widget.windowIcon();
-    option.state.setFlag(QStyle::State_Active, isActive);
-    option.palette.setCurrentColorGroup(isActive ? QPalette::Active : QPalette::Inactive);
-    if (isActive) {
-        option.titleBarState |= QStyle::State_Active;
-    }
     return option;
 }
 
@@ -157,7 +158,7 @@ int Caption::edgeAt(QPoint point) const {
     if (!whole.contains(point) || inside.contains(point)) {
         return HTNOWHERE;
     }
-    if ((m_window.style() & WS_THICKFRAME) == 0) {
+    if ((m_window.style() & WS_THICKFRAME) == 0 || m_window.widget()->isMinimized()) {
         return HTBORDER;
     }
     constexpr int corner = 16;
@@ -213,7 +214,7 @@ void Caption::paint(QPainter& painter) const {
         QStyleOptionFrame frame;
         frame.initFrom(&widget);
         frame.lineWidth = border();
-        frame.state.setFlag(QStyle::State_Active, isActive);
+        frame.state.setFlag(QStyle::State_Active, m_style->isActive);
         m_style->drawPrimitive(QStyle::PE_FrameWindow, &frame, &painter, &widget);
     }
     QStyleOptionTitleBar option = bar();
@@ -233,9 +234,31 @@ void Caption::paint(QPainter& painter) const {
     m_style->drawComplexControl(QStyle::CC_TitleBar, &option, &painter, &widget);
 }
 
+bool Caption::proc(UINT message, WPARAM wParam) {
+    QWidget& widget = *m_window.widget();
+    if (message == WM_NCACTIVATE) {
+        setActive(wParam != 0);
+        return false;
+    }
+    if (message != WM_NCPAINT || !m_window.inFramePaint) {
+        return false;
+    }
+    // Not when it is the menu bar that is being painted.
+    if (widget.testAttribute(Qt::WA_WState_InPaintEvent)) {
+        QPainter painter(&widget);
+        paint(painter);
+    }
+    return true;
+}
+
 void Caption::update() const {
     QWidget& widget = *m_window.widget();
     widget.update(QRegion(widget.rect()) - QRegion(widget.rect() - margins()));
+}
+
+void Caption::setActive(bool active) {
+    m_style->isActive = active;
+    update();
 }
 
 void Caption::setButton(const QRect& place) {

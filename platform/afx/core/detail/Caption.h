@@ -4,7 +4,7 @@
 /// Captions and borders that windows draw themselves, with the desktop's style: those of child frames and of top-level
 /// frames that ask for one.
 
-#include "platform/base/Export.h"
+#include "platform/base/Types.h"
 
 #include <QMargins>
 #include <QPoint>
@@ -33,6 +33,8 @@ public:
                             const QWidget* widget) const override;
     /// The place of a button that the host draws, in the window's coordinates; empty for none.
     QRect button;
+    /// Whether captions are drawn as those of active windows, whatever the toolkit takes them for: the window was told.
+    bool isActive = false;
 };
 
 /// The caption and the border of one window: what they take, what lies where, and how they look.
@@ -57,16 +59,19 @@ public:
     int hitTest(QPoint point) const;
     /// Draws border and caption on the window's widget.
     void paint(QPainter& painter) const;
+    /// Does what a message means for how it looks; false for one that has more to do.
+    bool proc(UINT message, WPARAM wParam);
     /// Asks for all of it to be painted.
     void update() const;
     /// The place of the picture that opens the system menu, in the widget's coordinates.
     QRect systemMenuRect() const;
+    /// Draws it as that of the active window, or not.
+    void setActive(bool active);
     /// Keeps a part of the caption free of the title, for a button that the host draws there. Widget's coordinates.
     void setButton(const QRect& place);
 
-    bool isActive = false; ///< whether it is drawn as that of the active window
-    int pressed = 0;       ///< the button (HT...) that is drawn as held down
-    int hovered = 0;       ///< the button that the pointer is over
+    int pressed = 0; ///< the button (HT...) that is drawn as held down
+    int hovered = 0; ///< the button that the pointer is over
 
 private:
     int border() const;

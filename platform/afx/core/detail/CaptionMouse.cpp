@@ -88,6 +88,10 @@ std::optional<LRESULT> CaptionMouse::proc(UINT message, WPARAM wParam, LPARAM lP
     case WM_NCMOUSEMOVE:
         hover(part);
         return 0;
+    case WM_SETCURSOR:
+        return reinterpret_cast<HWND>(wParam) == m_window.handle() && showCursor(LOWORD(lParam))
+                   ? std::optional<LRESULT>(TRUE)
+                   : std::nullopt;
     case WM_NCRBUTTONUP:
         if (part == HTCAPTION || part == HTSYSMENU) {
             showSystemMenu(m_window, {GET_X_LPARAM(lParam), GET_Y_LPARAM(lParam)});
@@ -205,7 +209,11 @@ void CaptionMouse::moveByHand(QPoint at) {
     }
     const QPoint by = at - m_from;
     if (!changesSize()) {
-        m_window.setWindowRect(m_place.translated(by));
+        QRect place = m_place.translated(by);
+        if (m_window.isChild()) {
+            place.moveTop(std::max(place.top(), 0)); // the caption stays within reach
+        }
+        m_window.setWindowRect(place);
         return;
     }
     const Qt::Edges edges = edgesOf(m_part);
@@ -232,14 +240,20 @@ void CaptionMouse::release(QPoint at) {
     if (!isButton(part) || over != part) {
         return;
     }
-    const HWND handle = m_window.handle();
-    const bool maximized = m_window.widget()->isMaximized();
-    PostMessageA(handle, WM_SYSCOMMAND,
-                 part == HTCLOSE       ? SC_CLOSE
-                 : part == HTMINBUTTON ? SC_MINIMIZE
-                 : maximized           ? SC_RESTORE
-                                       : SC_MAXIMIZE,
-                 0);
+    PostMessageA(m_window.handle(), WM_SYSCOMMAND, commandOf(part), 0);
+}
+
+/// What a button stands for: one of those that change the size brings the window back from the state it is in.
+WPARAM CaptionMouse::commandOf(int part) const {
+    const QWidget& widget = *m_window.widget();
+    const bool isMinimized = widget.isMinimized();
+    if (part == HTCLOSE) {
+        return SC_CLOSE;
+    }
+    if (part == HTMINBUTTON) {
+        return isMinimized ? SC_RESTORE : SC_MINIMIZE;
+    }
+    return widget.isMaximized() && !isMinimized ? SC_RESTORE : SC_MAXIMIZE;
 }
 
 void CaptionMouse::doubleClick(int part, QPoint at) {
@@ -248,8 +262,10 @@ void CaptionMouse::doubleClick(int part, QPoint at) {
         PostMessageA(handle, WM_SYSCOMMAND, SC_CLOSE, 0);
     } else if (part != HTCAPTION) {
         press(part, at);
+    } else if (m_window.widget()->isMinimized()) {
+        PostMessageA(handle, WM_SYSCOMMAND, SC_RESTORE, 0);
     } else if ((m_window.style() & WS_MAXIMIZEBOX) != 0) {
-        PostMessageA(handle, WM_SYSCOMMAND, m_window.widget()->isMaximized() ? SC_RESTORE : SC_MAXIMIZE, 0);
+        PostMessageA(handle, WM_SYSCOMMAND, commandOf(HTMAXBUTTON), 0);
     }
 }
 

@@ -1,7 +1,7 @@
 #pragma once
 
 /// @file
-/// What the mouse does to a top-level window by the caption and the border that it draws itself.
+/// What the mouse does to a window by the caption and the border that it draws itself.
 
 #include "platform/afx/core/Message.h"
 
@@ -15,8 +15,8 @@ namespace tvx::afx {
 class Caption;
 class Window;
 
-/// Presses of caption buttons, moves and changes of size. The window manager does the latter where it offers to;
-/// elsewhere they are done by hand. A press captures the mouse until it is released.
+/// Presses of caption buttons, moves and changes of size. The window manager does the latter for top-level windows
+/// where it offers to; else they are done by hand. A press captures the mouse until it is released.
 class CaptionMouse {
 public:
     CaptionMouse(Window& window, Caption& caption);
@@ -27,10 +27,10 @@ public:
     bool isHeld() const {
         return m_part != 0;
     }
-    /// Shows that an edge can be taken hold of. False for a part that cannot.
-    bool showCursor(int part);
 
 private:
+    /// Shows that an edge can be taken hold of. False for a part that cannot.
+    bool showCursor(int part);
     bool press(int part, QPoint at);
     void drag(QPoint at);
     void release(QPoint at);
@@ -39,6 +39,7 @@ private:
     void begin();
     void moveByHand(QPoint at);
     bool changesSize() const;
+    WPARAM commandOf(int part) const;
 
     Window& m_window;
     Caption& m_caption;

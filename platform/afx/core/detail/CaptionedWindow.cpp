@@ -5,7 +5,6 @@
 #include "platform/afx/core/detail/Loop.h"
 
 #include <QMainWindow>
-#include <QPainter>
 
 namespace tvx::afx {
 
@@ -53,13 +52,6 @@ void CaptionedWindow::updateFrame() {
     m_caption.update();
 }
 
-void CaptionedWindow::paintCaption() {
-    if (widget()->testAttribute(Qt::WA_WState_InPaintEvent)) {
-        QPainter painter(widget());
-        m_caption.paint(painter);
-    }
-}
-
 void CaptionedWindow::followStyle() {
     m_caption.renewStyle();
     stateChanged();
@@ -69,27 +61,14 @@ LRESULT CaptionedWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
     if (const auto answer = m_mouse.proc(message, wParam, lParam)) {
         return *answer;
     }
-    switch (message) {
-    case WM_NCPAINT:
-        if (inFramePaint) {
-            paintCaption();
-            return 0;
-        }
-        return TopLevelWindow::defaultProc(message, wParam, lParam);
-    case WM_SETCURSOR:
-        if (reinterpret_cast<HWND>(wParam) == handle() && m_mouse.showCursor(LOWORD(lParam))) {
-            return TRUE;
-        }
-        return TopLevelWindow::defaultProc(message, wParam, lParam);
-    case WM_NCACTIVATE:
-        m_caption.isActive = wParam != 0;
-        return TopLevelWindow::defaultProc(message, wParam, lParam);
-    case WM_THEMECHANGED:
+    if (m_caption.proc(message, wParam)) {
+        return 0;
+    }
+    if (message == WM_THEMECHANGED) {
         followStyle();
         return 0;
-    default:
-        return TopLevelWindow::defaultProc(message, wParam, lParam);
     }
+    return TopLevelWindow::defaultProc(message, wParam, lParam);
 }
 
 } // namespace tvx::afx

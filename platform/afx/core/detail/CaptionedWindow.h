@@ -28,7 +28,6 @@ protected:
     QSize leastSize() const override;
 
 private:
-    void paintCaption();
     void followStyle();
     mutable Caption m_caption;
     CaptionMouse m_mouse;

@@ -370,8 +370,7 @@ std::unordered_map<std::uintptr_t, HMENU>& systemMenus() {
     return *menus;
 }
 
-HMENU makeSystemMenu(const Window& window) {
-    const HMENU menu = CreatePopupMenu();
+void fillSystemMenu(HMENU menu, const Window& window) {
     const auto state = [&window](DWORD bit) { return (window.style() & bit) != 0 ? MF_ENABLED : MF_GRAYED; };
     const auto append = [menu](UINT flags, UINT command, UINT text) {
         AppendMenuA(menu, MF_STRING | flags, command, fromQt(ownText(text)).c_str());
@@ -384,7 +383,6 @@ HMENU makeSystemMenu(const Window& window) {
     AppendMenuA(menu, MF_SEPARATOR, 0, nullptr);
     append(0, SC_CLOSE, window.isChild() ? TVX_IDS_SYS_CLOSE_CHILD : TVX_IDS_SYS_CLOSE);
     SetMenuDefaultItem(menu, SC_CLOSE, 0);
-    return menu;
 }
 
 /// Menus of windows that have ended go with the next one that is asked for.
@@ -496,17 +494,16 @@ HMENU GetSystemMenu(HWND handle, BOOL revert) {
         return nullptr;
     }
     forgetEnded();
-    const auto key = reinterpret_cast<std::uintptr_t>(handle);
-    if (revert) {
-        if (const auto found = systemMenus().find(key); found != systemMenus().end()) {
-            DestroyMenu(found->second);
-            systemMenus().erase(found);
-        }
-        return nullptr;
+    HMENU& menu = systemMenus()[reinterpret_cast<std::uintptr_t>(handle)];
+    const bool isNew = !menuFrom(menu);
+    if (isNew) {
+        menu = CreatePopupMenu();
     }
-    HMENU& menu = systemMenus()[key];
-    if (!menuFrom(menu)) {
-        menu = makeSystemMenu(*window);
+    // The handle stays: a child frame's caption shows the menu by it.
+    while (revert && DeleteMenu(menu, 0, MF_BYPOSITION)) {
     }
-    return menu;
+    if (isNew || revert) {
+        fillSystemMenu(menu, *window);
+    }
+    return revert ? nullptr : menu;
 }

@@ -253,19 +253,20 @@ void changeWindowFlags(QWidget& widget, Qt::WindowFlags flags) {
     });
 }
 
-void TopLevelWindow::applySizeLimits() {
+void applySizeLimits(Window& window, QSize least) {
     constexpr int unlimited = 32767;
     MINMAXINFO limits{};
     limits.ptMaxTrackSize = {unlimited, unlimited};
-    call(WM_GETMINMAXINFO, 0, reinterpret_cast<LPARAM>(&limits));
+    window.call(WM_GETMINMAXINFO, 0, reinterpret_cast<LPARAM>(&limits));
+    QWidget& widget = *window.widget();
     // The host's limits count the frame, the toolkit's do not.
-    const QSize frame = widget()->frameGeometry().size() - widget()->geometry().size();
-    widget()->setMinimumSize((toQt(limits.ptMinTrackSize).isNull()
-                                  ? QSize(0, 0)
-                                  : QSize(limits.ptMinTrackSize.x, limits.ptMinTrackSize.y) - frame)
-                                 .expandedTo(leastSize()));
+    const QSize frame = widget.isWindow() ? widget.frameGeometry().size() - widget.geometry().size() : QSize(0, 0);
+    const QSize wanted = toQt(limits.ptMinTrackSize).isNull()
+                             ? QSize(0, 0)
+                             : QSize(limits.ptMinTrackSize.x, limits.ptMinTrackSize.y) - frame;
+    widget.setMinimumSize(wanted.expandedTo(least));
     if (limits.ptMaxTrackSize.x < unlimited || limits.ptMaxTrackSize.y < unlimited) {
-        widget()->setMaximumSize(QSize(limits.ptMaxTrackSize.x, limits.ptMaxTrackSize.y) - frame);
+        widget.setMaximumSize(QSize(limits.ptMaxTrackSize.x, limits.ptMaxTrackSize.y) - frame);
     }
 }
 
@@ -310,7 +311,7 @@ void showTopLevel(Window& window, int command) {
 
 void TopLevelWindow::beforeShow(bool visible) {
     if (visible) {
-        applySizeLimits();
+        applySizeLimits(*this, leastSize());
         forgetToldSize();
     }
 }

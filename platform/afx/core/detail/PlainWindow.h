@@ -59,7 +59,6 @@ protected:
     void iconChanged() override;
 
 private:
-    void applySizeLimits();
     HMENU m_menu = nullptr;
 };
 
@@ -81,6 +80,9 @@ TVX_PLATFORM_API Qt::WindowFlags windowFlags(DWORD style, DWORD exStyle);
 /// Gives the widget of a top-level window other flags, whether it is shown or not.
 TVX_PLATFORM_API void changeWindowFlags(QWidget& widget, Qt::WindowFlags flags);
 
+/// Asks a window for its limits (WM_GETMINMAXINFO) and sets them.
+/// @param least what its parts need in any case
+TVX_PLATFORM_API void applySizeLimits(Window& window, QSize least);
 /// Does what a show command (SW_...) says with a top-level window's widget.
 TVX_PLATFORM_API void showTopLevel(Window& window, int command);
 

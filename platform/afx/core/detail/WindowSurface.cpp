@@ -213,10 +213,14 @@ QRegion coveredBy(const QWidget& child) {
 void subtractChildren(QRegion& region, const QWidget& widget, WindowPart part) {
     for (const QObject* object : widget.children()) {
         const auto* child = qobject_cast<const QWidget*>(object);
-        if (!child || !keepsItsPixels(*child, part)) {
-            continue;
+        if (child && keepsItsPixels(*child, part)) {
+            region -= coveredBy(*child);
+        } else if (const auto* bar = qobject_cast<const QMenuBar*>(child); bar && !bar->isHidden()) {
+            // The buttons of a maximised child frame stand in the bar.
+            QRegion within = bar->rect();
+            subtractChildren(within, *bar, part);
+            region -= QRegion(bar->geometry()) - within.translated(bar->pos());
         }
-        region -= coveredBy(*child);
     }
 }
 
@@ -242,7 +246,7 @@ QRegion drawableRegion(const QWidget& widget, WindowPart part) {
     QRegion region = widget.visibleRegion();
     if (part == WindowPart::Whole) {
         // The toolkit's visible region leaves opaque children out, the menu bar too.
-        region = QRegion(widget.rect());
+        region = widget.mask().isEmpty() ? QRegion(widget.rect()) : widget.mask();
         for (const QWidget* level = &widget; !level->isWindow(); level = level->parentWidget()) {
             region &= QRect(widget.mapFrom(level->parentWidget(), QPoint()), level->parentWidget()->size());
         }

@@ -162,7 +162,8 @@ void MdiClientWindow::activate(MdiChildWindow* child) {
     const HWND newHandle = child ? child->handle() : nullptr;
     for (const HWND told : {oldHandle, newHandle}) {
         if (from(told)) {
-            SendMessageA(told, WM_NCACTIVATE, told == newHandle ? TRUE : FALSE, 0);
+            const bool isActive = told == newHandle && topLevel()->widget()->isActiveWindow();
+            SendMessageA(told, WM_NCACTIVATE, isActive ? TRUE : FALSE, 0);
             SendMessageA(told, WM_MDIACTIVATE, reinterpret_cast<WPARAM>(oldHandle),
                          reinterpret_cast<LPARAM>(newHandle));
         }
@@ -354,7 +355,7 @@ LRESULT MdiClientWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam)
 // --- child frames ---
 
 MdiChildWindow::MdiChildWindow(const CREATESTRUCT& cs)
-    : Window(cs), m_caption(*this), m_defaultPlace(cs.x == CW_USEDEFAULT) {}
+    : Window(cs), m_caption(*this), m_mouse(*this, m_caption), m_defaultPlace(cs.x == CW_USEDEFAULT) {}
 
 QMdiSubWindow* MdiChildWindow::subWindow() const {
     return static_cast<QMdiSubWindow*>(widget());
@@ -370,6 +371,10 @@ int MdiChildWindow::hitTest(QPoint screen) const {
 
 void MdiChildWindow::updateFrame() {
     m_caption.update();
+}
+
+bool MdiChildWindow::isHeldByCaption() const {
+    return m_mouse.isHeld();
 }
 
 MdiClientWindow& MdiChildWindow::client() const {
@@ -429,7 +434,10 @@ void MdiChildWindow::setWindowRect(const QRect& rect) {
     Window::setWindowRect(rect);
 }
 
-void MdiChildWindow::beforeShow(bool) {
+void MdiChildWindow::beforeShow(bool visible) {
+    if (visible) {
+        applySizeLimits(*this, subWindow()->minimumSizeHint());
+    }
     forgetToldSize();
 }
 
@@ -456,7 +464,24 @@ void MdiChildWindow::showWidget(int command) {
     }
 }
 
+/// A click on its frame brings the keyboard back into it.
+void MdiChildWindow::takeKeyboard() const {
+    const HWND focus = GetFocus();
+    if (client().active() == this && focus != handle() && !IsChild(handle(), focus)) {
+        SetFocus(handle());
+    }
+}
+
 LRESULT MdiChildWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_NCLBUTTONDOWN) {
+        takeKeyboard();
+    }
+    if (const auto answer = m_mouse.proc(message, wParam, lParam)) {
+        return *answer;
+    }
+    if (m_caption.proc(message, wParam)) {
+        return 0;
+    }
     if (message == WM_DESTROY) {
         client().forget(*this);
     }

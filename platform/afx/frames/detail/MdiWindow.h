@@ -4,6 +4,7 @@
 /// Child frames in a main frame: the client window that holds them and the child frames' windows.
 
 #include "platform/afx/core/detail/Caption.h"
+#include "platform/afx/core/detail/CaptionMouse.h"
 #include "platform/afx/core/detail/MenuWidgets.h"
 #include "platform/afx/core/detail/Window.h"
 
@@ -69,8 +70,7 @@ private:
     bool m_roomKnown = false;
 };
 
-/// A child frame: a caption, which the toolkit draws and moves it by, around a main window of its own, with bars and a
-/// pane.
+/// A child frame: a caption around a main window of its own, with bars and a pane.
 class TVX_PLATFORM_API MdiChildWindow : public Window {
 public:
     explicit MdiChildWindow(const CREATESTRUCT& cs);
@@ -84,6 +84,7 @@ public:
     Caption* caption() const override;
     int hitTest(QPoint screen) const override;
     void updateFrame() override;
+    bool isHeldByCaption() const override;
 
 protected:
     void beforeShow(bool visible) override;
@@ -95,7 +96,9 @@ protected:
 private:
     QPointer<QMainWindow> m_main;
     MenuHost m_systemMenu;
+    void takeKeyboard() const;
     mutable Caption m_caption;
+    CaptionMouse m_mouse;
     bool m_defaultPlace;
 };
 
