@@ -7,6 +7,7 @@
 namespace {
 
 constexpr UINT indicators[] = {ID_SEPARATOR, ID_INDICATOR_POSITION, ID_INDICATOR_CAPS, ID_INDICATOR_NUM};
+constexpr UINT indicatorTips[] = {0, IDS_TIP_POSITION, IDS_TIP_CAPS, IDS_TIP_NUM};
 
 } // namespace
 
@@ -37,6 +38,7 @@ int CMainFrame::OnCreate(CREATESTRUCT* cs) {
     if (!m_statusBar.Create(this) || !m_statusBar.SetIndicators(indicators, std::size(indicators))) {
         return -1;
     }
+    m_statusBar.SetToolTips(indicatorTips, std::size(indicatorTips));
     m_toolBar.EnableDocking(CBRS_ALIGN_ANY);
     EnableDocking(CBRS_ALIGN_ANY);
     DockControlBar(&m_toolBar);

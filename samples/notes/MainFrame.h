@@ -2,6 +2,7 @@
 
 #include "afxext.h"
 #include "s/FrameWnd.h"
+#include "s/StatusBar.h"
 
 /// The main window: tool bar, text, status bar. That it comes up where it stood last, with its bars as they were, is
 /// its base's doing.
@@ -14,7 +15,7 @@ public:
 
 private:
     CToolBar m_toolBar;
-    CStatusBar m_statusBar;
+    Gui_StatusBar m_statusBar;
 
     DECLARE_MESSAGE_MAP()
 };
