@@ -50,6 +50,9 @@ void CaptionStyle::drawComplexControl(ComplexControl control, const QStyleOption
         caption.palette.setColor(QPalette::HighlightedText, caption.palette.color(QPalette::WindowText));
     }
     const bool drawsActive = isActive || isDarkPalette();
+    if (isDarkPalette()) {
+        caption.palette.setColor(QPalette::Text, Qt::black); // of a title's shadow, which would blur it
+    }
     caption.titleBarState = drawsActive ? caption.titleBarState | State_Active : caption.titleBarState & ~State_Active;
     QProxyStyle::drawComplexControl(control, &caption, painter, widget);
 }
@@ -254,6 +257,11 @@ bool Caption::proc(UINT message, WPARAM wParam) {
 void Caption::update() const {
     QWidget& widget = *m_window.widget();
     widget.update(QRegion(widget.rect()) - QRegion(widget.rect() - margins()));
+}
+
+void Caption::stateChanged() {
+    hovered = 0;
+    update();
 }
 
 void Caption::setActive(bool active) {

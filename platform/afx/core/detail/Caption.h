@@ -65,6 +65,8 @@ public:
     void update() const;
     /// The place of the picture that opens the system menu, in the widget's coordinates.
     QRect systemMenuRect() const;
+    /// Told that the window was maximised, minimised or brought back: the mouse is no longer where it was in it.
+    void stateChanged();
     /// Draws it as that of the active window, or not.
     void setActive(bool active);
     /// Keeps a part of the caption free of the title, for a button that the host draws there. Widget's coordinates.

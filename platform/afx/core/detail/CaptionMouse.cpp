@@ -71,6 +71,17 @@ QPoint pointOf(LPARAM parameter) {
 
 } // namespace
 
+namespace {
+
+HWND handedOver = nullptr;
+
+} // namespace
+
+bool isHeldByDesktop(HWND window) {
+    // The toolkit lets go of the button when the window manager does.
+    return handedOver == window && QGuiApplication::mouseButtons().testFlag(Qt::LeftButton);
+}
+
 CaptionMouse::CaptionMouse(Window& window, Caption& caption) : m_window(window), m_caption(caption) {}
 
 bool CaptionMouse::changesSize() const {
@@ -135,6 +146,7 @@ bool CaptionMouse::showCursor(int part) {
 }
 
 bool CaptionMouse::press(int part, QPoint at) {
+    handedOver = nullptr;
     if (part == HTSYSMENU) {
         QWidget& widget = *m_window.widget();
         const QPoint below = widget.mapToGlobal(m_caption.systemMenuRect().bottomLeft() + QPoint(0, 1));
@@ -168,6 +180,7 @@ void CaptionMouse::begin() {
     bool taken = false;
     guarded([&] { taken = native && (changesSize() ? native->startSystemResize(edges) : native->startSystemMove()); });
     if (taken) {
+        handedOver = m_window.handle();
         ReleaseCapture(); // the release of the button is the window manager's
     } else {
         m_began = true;

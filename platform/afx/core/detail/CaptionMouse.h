@@ -15,6 +15,10 @@ namespace tvx::afx {
 class Caption;
 class Window;
 
+/// Whether the window manager is moving or sizing a window that was pressed by its caption or border. It has the
+/// keyboard meanwhile; the window stays the active one all the same.
+bool isHeldByDesktop(HWND window);
+
 /// Presses of caption buttons, moves and changes of size. The window manager does the latter for top-level windows
 /// where it offers to; else they are done by hand. A press captures the mouse until it is released.
 class CaptionMouse {

@@ -25,7 +25,7 @@ void CaptionedWindow::widgetMade() {
 /// What stands in the window begins below the caption.
 void CaptionedWindow::stateChanged() {
     guarded([this] { widget()->setContentsMargins(m_caption.margins()); });
-    m_caption.update();
+    m_caption.stateChanged();
 }
 
 QSize CaptionedWindow::leastSize() const {

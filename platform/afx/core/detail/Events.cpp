@@ -1,4 +1,5 @@
 #include "platform/afx/core/detail/BrokenPixels.h"
+#include "platform/afx/core/detail/CaptionMouse.h"
 #include "platform/afx/core/detail/Capture.h"
 #include "platform/afx/core/detail/Cursors.h"
 #include "platform/afx/core/detail/Dispatch.h"
@@ -395,14 +396,32 @@ bool onCloseRequest(Window& window, QEvent& event) {
     return true;
 }
 
-void onActivation(Window& window, bool active) {
+void tellActivation(HWND handle, bool active) {
     Window* other = Window::of(QApplication::activeWindow());
-    const auto otherHandle = reinterpret_cast<LPARAM>(other && other != &window ? other->handle() : nullptr);
-    const HWND handle = window.handle();
+    const HWND otherHandle = other && other->handle() != handle ? other->handle() : nullptr;
     armIdle();
     // The caption first, as hosts know the order.
     SendMessageA(handle, WM_NCACTIVATE, active ? TRUE : FALSE, 0);
-    SendMessageA(handle, WM_ACTIVATE, active ? WA_ACTIVE : WA_INACTIVE, otherHandle);
+    SendMessageA(handle, WM_ACTIVATE, active ? WA_ACTIVE : WA_INACTIVE, reinterpret_cast<LPARAM>(otherHandle));
+}
+
+/// The window that the toolkit takes for an inactive one because the window manager moves it.
+HWND keptActive = nullptr;
+
+void onActivation(const Window& window, bool active) {
+    const HWND handle = window.handle();
+    if (!active && isHeldByDesktop(handle) && !QApplication::activeWindow()) {
+        keptActive = handle;
+        return;
+    }
+    const HWND kept = std::exchange(keptActive, nullptr);
+    if (kept == handle && active) {
+        return;
+    }
+    if (kept && kept != handle) {
+        tellActivation(kept, false);
+    }
+    tellActivation(handle, active);
 }
 
 void onFocus(Window& window, const QFocusEvent& event) {

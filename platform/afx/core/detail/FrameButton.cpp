@@ -32,7 +32,12 @@ const Window* FrameButton::window() const {
 QRect FrameButton::screenPlace() const {
     const Window* window = this->window();
     const QWidget* widget = window ? window->widget() : nullptr;
-    return widget && widget->isVisible() ? QRect(widget->mapToGlobal(m_place.topLeft()), m_place.size()) : QRect();
+    if (!widget || !widget->isVisible()) {
+        return {};
+    }
+    // A caption may not be there at the moment, that of a maximised child frame.
+    const QRect place(widget->mapToGlobal(m_place.topLeft()), m_place.size());
+    return window->hitTest(place.center()) != HTCLIENT ? place : QRect();
 }
 
 void FrameButton::press() const {

@@ -22,7 +22,7 @@ public:
 
     /// @param place in the coordinates of the window's widget
     void setPlace(const QRect& place);
-    /// Where it is on the screen; empty while its window is not seen.
+    /// Where it is on the screen; empty while the part of the window that it stands in is not seen.
     [[nodiscard]] QRect screenPlace() const;
     [[nodiscard]] const QString& name() const {
         return m_name;

@@ -373,6 +373,10 @@ void MdiChildWindow::updateFrame() {
     m_caption.update();
 }
 
+void MdiChildWindow::stateChanged() {
+    m_caption.stateChanged();
+}
+
 bool MdiChildWindow::isHeldByCaption() const {
     return m_mouse.isHeld();
 }
@@ -436,7 +440,7 @@ void MdiChildWindow::setWindowRect(const QRect& rect) {
 
 void MdiChildWindow::beforeShow(bool visible) {
     if (visible) {
-        applySizeLimits(*this, subWindow()->minimumSizeHint());
+        applySizeLimits(*this, QSize(0, 0)); // tiled frames may be smaller than users can make them
     }
     forgetToldSize();
 }
@@ -479,7 +483,8 @@ LRESULT MdiChildWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) 
     if (const auto answer = m_mouse.proc(message, wParam, lParam)) {
         return *answer;
     }
-    if (m_caption.proc(message, wParam)) {
+    // The toolkit, which knows captions too, does nothing with them.
+    if (m_caption.proc(message, wParam) || (message >= WM_NCMOUSEMOVE && message <= WM_NCMBUTTONDOWN)) {
         return 0;
     }
     if (message == WM_DESTROY) {

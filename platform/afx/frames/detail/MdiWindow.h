@@ -85,6 +85,7 @@ public:
     int hitTest(QPoint screen) const override;
     void updateFrame() override;
     bool isHeldByCaption() const override;
+    void stateChanged() override;
 
 protected:
     void beforeShow(bool visible) override;

@@ -41,12 +41,13 @@ protected:
         EXPECT_TRUE(QTest::qWaitFor([&] { return QCursor::pos() == screen; }));
     }
     /// Drags from a point of the window, in steps as a hand does.
-    void drag(QPoint from, QPoint by) const {
+    void drag(QPoint from, QPoint by, const std::function<void()>& meanwhile = [] {}) const {
         pointTo(from);
         run("mousedown 1");
         for (int i = 0; i < 4; ++i) {
             run(QString("mousemove_relative -- %1 %2").arg(by.x() / 4).arg(by.y() / 4));
         }
+        meanwhile();
         run("mouseup 1");
     }
     [[nodiscard]] QRect place() const {
@@ -63,7 +64,12 @@ protected:
 TEST_F(CaptionOnDesktop, IsMovedOnlyWhenTheMouseHasGoneAWay) {
     drag(QPoint(120, 12), QPoint(4, 4));
     EXPECT_EQ(place(), start);
-    drag(QPoint(200, 12), QPoint(120, 80));
+    window.on[WM_NCACTIVATE] = nullptr;
+    drag(QPoint(200, 12), QPoint(120, 80), [] {
+        EXPECT_TRUE(QTest::qWaitFor([] { return !QApplication::activeWindow(); })) << "as the toolkit sees it";
+    });
+    EXPECT_TRUE(QTest::qWaitForWindowActive(&widgetOf(window)));
+    EXPECT_EQ(window.of(WM_NCACTIVATE), std::vector<WPARAM>{}) << "the window stays the active one";
     EXPECT_TRUE(QTest::qWaitFor([&] { return place().x() >= start.x() + 90 && place().y() >= start.y() + 50; }));
     EXPECT_EQ(place().size(), start.size());
     EXPECT_EQ(CWnd::GetCapture(), nullptr);

@@ -335,6 +335,7 @@ TEST_F(FrameTest, TellsAssistiveToolsOfAButtonInAFrame) {
         button->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
         settle();
         EXPECT_TRUE(window->IsZoomed());
+        EXPECT_EQ(button->state().invisible, window != &frame) << "a maximised child frame has no caption";
         window->SetFrameButton("Float", nullptr, 0);
         EXPECT_EQ(whole->childCount(), parts);
     }

@@ -7,6 +7,7 @@
 
 #include <QApplication>
 #include <QBackingStore>
+#include <QMenuBar>
 #include <QPaintEvent>
 #include <QPainter>
 #include <QScreen>
@@ -88,6 +89,23 @@ TEST_P(ScaledSurface, DrawsAndReadsTheWholeBlocksOfUnits) {
     EXPECT_EQ(shown.pixelColor(pixel(41), pixel(41)), QColor(Qt::red));
     EXPECT_EQ(shown.pixelColor(pixel(42) - 1, pixel(42) - 1), QColor(Qt::red));
     EXPECT_EQ(shown.pixelColor(pixel(42), pixel(41)), QColor(Qt::green));
+}
+
+TEST_P(ScaledSurface, DrawsWholeBlocksOnTheMenuBarOfAWholeWindow) {
+    QMenuBar bar(&window);
+    bar.setGeometry(0, 0, 100, 25);
+    bar.show();
+    QApplication::processEvents();
+    CDC dc;
+    dc.Attach(addContext(std::make_shared<DeviceContext>(
+        DcKind::Window, std::make_unique<WindowTarget>(window, WindowPart::Whole, [this] { return window.rect(); }))));
+    dc.FillSolidRect(11, 11, 10, 20, plainRed);
+    dc.DeleteDC();
+    const QImage shown = screen();
+    EXPECT_EQ(shown.pixelColor(pixel(11), pixel(11)), QColor(Qt::red));
+    EXPECT_EQ(shown.pixelColor(pixel(21) - 1, pixel(31) - 1), QColor(Qt::red));
+    EXPECT_NE(shown.pixelColor(pixel(11) - 1, pixel(11)), QColor(Qt::red));
+    EXPECT_EQ(shown.pixelColor(pixel(21), pixel(31) - 1), QColor(Qt::green));
 }
 
 /// What a host can draw with a pen, each with a filling where there is one.
