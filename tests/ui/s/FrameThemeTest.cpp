@@ -12,6 +12,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <functional>
 #include <memory>
 #include <set>
@@ -34,6 +35,7 @@ public:
             const int x = GET_X_LPARAM(lParam);
             return x >= first && x <= last ? HTMINBUTTON : HTCAPTION;
         }
+        told.push_back(message);
         if (message == WM_NCPAINT) {
             borders.push_back(wParam);
         }
@@ -43,6 +45,16 @@ public:
     int last = -1;
     std::set<int> lines; ///< where it was asked
     std::vector<WPARAM> borders;
+    std::vector<UINT> told;
+};
+
+class ChildFrame : public CMDIChildWnd {
+public:
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+        told.push_back(message);
+        return CMDIChildWnd::WindowProc(message, wParam, lParam);
+    }
+    std::vector<UINT> told;
 };
 
 // --- a library of tests' own ---
@@ -104,7 +116,7 @@ protected:
                       WS_EX_OWNCAPTION);
         testApplication.m_pMainWnd = frame;
         frame->ShowWindow(SW_SHOW);
-        child = new CMDIChildWnd;
+        child = new ChildFrame;
         child->Create(nullptr, "Child", WS_CHILD | WS_VISIBLE | WS_OVERLAPPEDWINDOW, CRect(20, 20, 320, 200), frame);
         QCoreApplication::processEvents();
     }
@@ -130,7 +142,7 @@ protected:
         return drawn ? tvx::afx::bitmapImage(static_cast<HBITMAP>(bitmap.m_hObject)).copy() : QImage();
     }
     MainFrame* frame;
-    CMDIChildWnd* child;
+    ChildFrame* child;
 };
 
 /// What a process's switch is after something was done in it.
@@ -184,6 +196,24 @@ TEST_F(FrameThemes, PlaceTheButtonOfAFilledMainFrameInItsMenuBar) {
     EXPECT_EQ(theme.buttonPlace(*child, false).Size(), inCaption.Size());
     frame->MDIRestore(child);
     EXPECT_EQ(theme.buttonPlace(*frame, false), inCaption);
+}
+
+// Main frames are measured as they come up, and what was measured holds for frames in other states.
+TEST_F(FrameThemes, MeasureAMaximisedFrameAsAnyOther) {
+    const auto measured = [this] {
+        FrameTheme theme(&fake);
+        theme.initialise();
+        CRect window;
+        frame->GetWindowRect(&window);
+        const CRect place = theme.buttonPlace(*frame, false);
+        return std::tuple(window.Width() - place.left, place.top, place.Width());
+    };
+    const auto normal = measured();
+    EXPECT_GT(std::get<2>(normal), 0);
+    frame->ShowWindow(SW_SHOWMAXIMIZED);
+    QCoreApplication::processEvents();
+    EXPECT_TRUE(frame->IsZoomed());
+    EXPECT_EQ(measured(), normal);
 }
 
 TEST_F(FrameThemes, MakeSixPictures) {
@@ -286,6 +316,33 @@ TEST_F(FrameThemes, FollowAChangeOfTheStyle) {
     QCoreApplication::processEvents();
     ASSERT_FALSE(frame->borders.empty());
     EXPECT_EQ(frame->borders.front(), 1U);
+}
+
+TEST_F(FrameThemes, AreToldOfEachChangeOnce) {
+    const QPalette palette = QApplication::palette();
+    const auto counts = [&] {
+        frame->told.clear();
+        child->told.clear();
+        for (int i = 0; i < 5; ++i) {
+            QCoreApplication::processEvents(); // what a change leads to must come to an end
+        }
+        std::vector<std::ptrdiff_t> found;
+        for (const auto& told : {frame->told, child->told}) {
+            for (const UINT message : {WM_SYSCOLORCHANGE, WM_THEMECHANGED}) {
+                found.push_back(std::ranges::count(told, message));
+            }
+        }
+        return found;
+    };
+    QApplication::setPalette(QPalette(QColor(50, 50, 50)));
+    EXPECT_EQ(counts(), (std::vector<std::ptrdiff_t>{1, 1, 1, 1}));
+    QApplication::setPalette(palette);
+    EXPECT_EQ(counts(), (std::vector<std::ptrdiff_t>{1, 1, 1, 1}));
+    QApplication::setStyle("Windows");
+    const auto ofStyle = counts();
+    EXPECT_EQ(std::pair(ofStyle[1], ofStyle[3]), (std::pair<std::ptrdiff_t, std::ptrdiff_t>(1, 1)));
+    QApplication::setStyle("Fusion");
+    counts();
 }
 
 TEST_F(FrameThemes, AreTurnedOffForGood) {

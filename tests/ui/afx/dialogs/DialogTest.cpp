@@ -9,6 +9,8 @@
 #include <QScreen>
 #include <QWindow>
 
+#include <algorithm>
+#include <map>
 #include <stdexcept>
 
 namespace {
@@ -401,6 +403,68 @@ TEST(Dialogs, ChooseTheColoursOfTheirControls) {
         EXPECT_EQ(colorOf(IDC_SCALE), QColor(255, 255, 255));
     };
     dialog.DoModal();
+}
+
+/// A dialog with controls of every kind, in two of which it colours the texts.
+class PaintedDialog : public ScriptedDialog {
+public:
+    PaintedDialog() : ScriptedDialog(IDD_EMPTY) {
+        prepare = [this] {
+            SetWindowPos(nullptr, 0, 0, 600, 200, SWP_NOMOVE | SWP_NOZORDER);
+            constexpr std::pair<const char*, DWORD> kinds[] = {
+                {"EDIT", 0},    {"EDIT", ES_READONLY},          {"EDIT", ES_READONLY | ES_MULTILINE},
+                {"STATIC", 0},  {"BUTTON", BS_AUTOCHECKBOX},    {"BUTTON", BS_PUSHBUTTON},
+                {"LISTBOX", 0}, {"COMBOBOX", CBS_DROPDOWNLIST}, {"BUTTON", BS_GROUPBOX}};
+            for (int i = 0; i < count; ++i) {
+                const auto& [kind, style] = kinds[i / 2];
+                const CRect place(CPoint(10 + i / 2 * 50, 10 + i % 2 * 40), CSize(45, 30));
+                controls[i].CreateEx(0, kind, "x", WS_CHILD | WS_VISIBLE | style, place, this, 500 + i);
+            }
+        };
+    }
+    /// How light most of a control is, 0 to 255.
+    int lightness(const CWnd& window) const {
+        QWidget* whole = tvx::afx::peerOf(m_hWnd);
+        QWidget* widget = tvx::afx::peerOf(window.m_hWnd);
+        whole->grab(); // asks while painting
+        const QImage image = whole->grab(QRect(widget->mapTo(whole, QPoint()), widget->size())).toImage();
+        std::map<QRgb, int> colors;
+        for (int y = 0; y < image.height(); ++y) {
+            for (int x = 0; x < image.width(); ++x) {
+                ++colors[image.pixel(x, y)];
+            }
+        }
+        return qGray(std::ranges::max_element(colors, {}, [](const auto& color) { return color.second; })->first);
+    }
+    static constexpr int count = 18;
+    CWnd controls[count];
+
+protected:
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+        if (message >= WM_CTLCOLOREDIT && message <= WM_CTLCOLORSTATIC && message != WM_CTLCOLORDLG &&
+            message != WM_CTLCOLORLISTBOX && ::GetDlgCtrlID(reinterpret_cast<HWND>(lParam)) % 2 == 1) {
+            CDC::FromHandle(reinterpret_cast<HDC>(wParam))->SetTextColor(RGB(200, 100, 100));
+            return reinterpret_cast<LRESULT>(GetStockObject(NULL_BRUSH));
+        }
+        return ScriptedDialog::WindowProc(message, wParam, lParam);
+    }
+};
+
+TEST(Dialogs, FollowTheDesktopsColours) {
+    PaintedDialog dialog;
+    const QPalette before = QApplication::palette();
+    dialog.script = [&] {
+        for (const bool dark : {false, true, false}) {
+            QApplication::setPalette(dark ? QPalette(QColor(50, 50, 50)) : before);
+            const auto follows = [&](const CWnd& window) { return (dialog.lightness(window) < 128) == dark; };
+            EXPECT_TRUE(QTest::qWaitFor([&] { return follows(dialog); }));
+            for (const CWnd& control : dialog.controls) {
+                EXPECT_TRUE(QTest::qWaitFor([&] { return follows(control); })) << control.GetDlgCtrlID();
+            }
+            EXPECT_EQ(GetRValue(GetSysColor(COLOR_WINDOW)) < 128, dark);
+        }
+    };
+    EXPECT_EQ(dialog.DoModal(), ScriptedDialog::scriptDone);
 }
 
 } // namespace
