@@ -4,6 +4,7 @@
 /// Captions and borders that windows draw themselves, with the desktop's style: those of child frames and of top-level
 /// frames that ask for one.
 
+#include "platform/base/Export.h"
 #include "platform/base/Types.h"
 
 #include <QMargins>
