@@ -214,15 +214,16 @@ void FrameTheme::renderAll(CWnd& window) {
 
 namespace {
 
-/// The colour below the middle of a picture that differs from the middle: that of the sign.
-COLORREF sampledSign(const CDC& dc, CSize size) {
+/// The colour below the middle of a picture that differs from the middle: that of the sign. A picture of one colour has
+/// none to read: the sign keeps the colour that it has, or nobody would see it on that ground.
+COLORREF sampledSign(const CDC& dc, CSize size, COLORREF present) {
     const COLORREF middle = dc.GetPixel(size.cx / 2, size.cy / 2);
     for (int y = size.cy / 2 + 1; y < size.cy; ++y) {
         if (const COLORREF found = dc.GetPixel(size.cx / 2, y); found != middle) {
             return found;
         }
     }
-    return middle;
+    return present;
 }
 
 /// The place of what has the sign's colour in the lower half of a picture; both edges belong to it.
@@ -267,7 +268,7 @@ std::unique_ptr<Gui_Bitmap> FrameTheme::render(CWnd& window, const Picture& pict
     dc.FillSolidRect(whole, m_colors[picture.background]);
     m_library.drawThemeBackground(m_theme, dc.m_hDC, picture.part, picture.state, whole, nullptr);
     if (picture.samplesSign) {
-        m_colors[picture.sign] = sampledSign(dc, size);
+        m_colors[picture.sign] = sampledSign(dc, size, m_colors[picture.sign]);
     }
     if (picture.searchesSign) {
         sign = signPlace(dc, size, m_colors[picture.sign]);

@@ -228,6 +228,8 @@ TEST_F(FrameThemes, MakeSixPictures) {
     EXPECT_EQ(style.calls.size(), 6U);
     EXPECT_EQ(style.opened, 1);
     EXPECT_EQ(signOf(theme, *frame), ofTheme(9));
+    frame->MDIMaximize(child);
+    EXPECT_EQ(signOf(theme, *frame), ofTheme(18)) << "these pictures have no sign to read its colour from";
 }
 
 // Rows of their own colours with a sign: what is above it runs down over it, in the lower half and within the edges.
