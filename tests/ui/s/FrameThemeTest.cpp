@@ -35,26 +35,22 @@ public:
             const int x = GET_X_LPARAM(lParam);
             return x >= first && x <= last ? HTMINBUTTON : HTCAPTION;
         }
-        told.push_back(message);
-        if (message == WM_NCPAINT) {
-            borders.push_back(wParam);
-        }
+        told.emplace_back(message, wParam);
         return CMDIFrameWnd::WindowProc(message, wParam, lParam);
     }
     int first = -1; ///< on the screen
     int last = -1;
     std::set<int> lines; ///< where it was asked
-    std::vector<WPARAM> borders;
-    std::vector<UINT> told;
+    std::vector<std::pair<UINT, WPARAM>> told;
 };
 
 class ChildFrame : public CMDIChildWnd {
 public:
     LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
-        told.push_back(message);
+        told.emplace_back(message, wParam);
         return CMDIChildWnd::WindowProc(message, wParam, lParam);
     }
-    std::vector<UINT> told;
+    std::vector<std::pair<UINT, WPARAM>> told;
 };
 
 // --- a library of tests' own ---
@@ -216,7 +212,7 @@ TEST_F(FrameThemes, MeasureAMaximisedFrameAsAnyOther) {
     EXPECT_EQ(measured(), normal);
 }
 
-TEST_F(FrameThemes, MakeSixPictures) {
+TEST_F(FrameThemes, MakeSixPicturesAndAgainForANewStyle) {
     putMinimizeButton(400, 420);
     FrameTheme theme(&fake);
     theme.initialise();
@@ -225,11 +221,19 @@ TEST_F(FrameThemes, MakeSixPictures) {
                                      {16, 4, 54, 55, ofTheme(15)}, {16, 3, 54, 55, ofTheme(15)}};
     EXPECT_EQ(style.calls, expected);
     theme.initialise(); // which has nothing left to do
-    EXPECT_EQ(style.calls.size(), 6U);
-    EXPECT_EQ(style.opened, 1);
+    EXPECT_EQ(style.calls, expected);
     EXPECT_EQ(signOf(theme, *frame), ofTheme(9));
     frame->MDIMaximize(child);
     EXPECT_EQ(signOf(theme, *frame), ofTheme(18)) << "these pictures have no sign to read its colour from";
+    frame->MDIRestore(child);
+    QCoreApplication::processEvents();
+    frame->told.clear();
+    putMinimizeButton(300, 310);
+    theme.changed(*frame);
+    EXPECT_EQ(theme.buttonPlace(*frame, false).Width(), 10);
+    EXPECT_EQ(std::tuple(style.asked, style.opened, style.closed, style.calls.size()), std::tuple(1, 2, 1, 12U));
+    QCoreApplication::processEvents();
+    EXPECT_EQ(std::ranges::count(frame->told, std::pair<UINT, WPARAM>(WM_NCPAINT, 1)), 1);
 }
 
 // Rows of their own colours with a sign: what is above it runs down over it, in the lower half and within the edges.
@@ -275,7 +279,6 @@ TEST_F(FrameThemes, TakeTheSignOutOfPictures) {
 TEST_F(FrameThemes, DoWithoutWhatTheLibraryLacks) {
     putMinimizeButton(400, 420);
     const auto without = [&](const std::function<void(ThemeLibrary&)>& take) {
-        style = {};
         auto theme = std::make_unique<FrameTheme>([&] {
             ThemeLibrary library = fake();
             take(library);
@@ -285,57 +288,44 @@ TEST_F(FrameThemes, DoWithoutWhatTheLibraryLacks) {
         theme->changed(*frame);
         return theme;
     };
-    EXPECT_TRUE(picture(*without([](ThemeLibrary& library) { library.openThemeData = nullptr; }), *frame).isNull());
-    EXPECT_TRUE(picture(*without([](ThemeLibrary& library) {
-                    library.openThemeData = [](HWND, LPCSTR) { return ThemeLibrary::Theme(); };
-                }),
-                        *frame)
-                    .isNull());
-    const auto undrawn = without([](ThemeLibrary& library) { library.drawThemeBackground = nullptr; });
-    COLORREF color = 0;
-    EXPECT_TRUE(picture(*undrawn, *frame).isNull());
-    EXPECT_FALSE(undrawn->signColor(*frame, color));
-    EXPECT_FALSE(picture(*without([](ThemeLibrary& library) { library.closeThemeData = nullptr; }), *frame).isNull());
-    EXPECT_EQ(signOf(*without([](ThemeLibrary& library) { library.getThemeSysColor = nullptr; }), *frame),
-              GetSysColor(9));
-    const auto sizeless = without([](ThemeLibrary& library) { library.getThemeSysSize = nullptr; });
+    const std::pair<bool, std::function<void(ThemeLibrary&)>> rows[] = {
+        {false, [](ThemeLibrary& library) { library.openThemeData = nullptr; }},
+        {false,
+         [](ThemeLibrary& library) { library.openThemeData = [](HWND, LPCSTR) { return ThemeLibrary::Theme(); }; }},
+        {false, [](ThemeLibrary& library) { library.drawThemeBackground = nullptr; }},
+        {true, [](ThemeLibrary& library) { library.closeThemeData = nullptr; }},
+        {true, [](ThemeLibrary& library) { library.getThemeSysSize = nullptr; }},
+        {true, [](ThemeLibrary& library) { library.getThemeSysColor = nullptr; }}};
+    for (const auto& row : rows) {
+        const auto theme = without(row.second);
+        COLORREF color = 0;
+        EXPECT_EQ(!picture(*theme, *frame).isNull(), row.first) << &row - rows;
+        EXPECT_EQ(theme->signColor(*frame, color), row.first) << &row - rows;
+    }
+    EXPECT_EQ(signOf(*without(rows[5].second), *frame), GetSysColor(9));
+    const auto sizeless = without(rows[4].second);
     EXPECT_EQ(sizeless->buttonPlace(*frame, false).top, (GetSystemMetrics(31) - 20) / 2 + GetSystemMetrics(33));
     putMinimizeButton(600, 600);
     EXPECT_TRUE(picture(*without([](ThemeLibrary&) {}), *frame).isNull());
     EXPECT_TRUE(FrameTheme::isSwitchedOn());
 }
 
-TEST_F(FrameThemes, FollowAChangeOfTheStyle) {
-    putMinimizeButton(400, 420);
-    FrameTheme theme(&fake);
-    theme.initialise();
-    QCoreApplication::processEvents();
-    frame->borders.clear();
-    putMinimizeButton(300, 310);
-    theme.changed(*frame);
-    EXPECT_EQ(theme.buttonPlace(*frame, false).Width(), 10);
-    EXPECT_EQ(std::tuple(style.asked, style.opened, style.closed, style.calls.size()), std::tuple(1, 2, 1, 12U));
-    QCoreApplication::processEvents();
-    ASSERT_FALSE(frame->borders.empty());
-    EXPECT_EQ(frame->borders.front(), 1U);
-}
-
 TEST_F(FrameThemes, AreToldOfEachChangeOnce) {
     const QPalette palette = QApplication::palette();
     const auto counts = [&] {
-        frame->told.clear();
-        child->told.clear();
+        std::vector<std::ptrdiff_t> found;
         for (int i = 0; i < 5; ++i) {
             QCoreApplication::processEvents(); // what a change leads to must come to an end
         }
-        std::vector<std::ptrdiff_t> found;
-        for (const auto& told : {frame->told, child->told}) {
+        for (auto* told : {&frame->told, &child->told}) {
             for (const UINT message : {WM_SYSCOLORCHANGE, WM_THEMECHANGED}) {
-                found.push_back(std::ranges::count(told, message));
+                found.push_back(std::ranges::count(*told, message, &std::pair<UINT, WPARAM>::first));
             }
+            told->clear();
         }
         return found;
     };
+    counts();
     QApplication::setPalette(QPalette(QColor(50, 50, 50)));
     EXPECT_EQ(counts(), (std::vector<std::ptrdiff_t>{1, 1, 1, 1}));
     QApplication::setPalette(palette);
@@ -388,10 +378,10 @@ TEST_F(FrameThemes, AreTurnedOffForGood) {
 
 namespace {
 
-class StyledFrameThemes : public FrameThemes, public testing::WithParamInterface<std::tuple<const char*, QRgb>> {
+class StyledFrameThemes : public FrameThemes, public testing::WithParamInterface<std::tuple<std::string, QRgb>> {
 protected:
     StyledFrameThemes() : m_palette(QApplication::palette()), m_style(QApplication::style()->name()) {
-        QApplication::setStyle(std::get<0>(GetParam()));
+        QApplication::setStyle(QString::fromStdString(std::get<0>(GetParam())));
         QApplication::setPalette(QPalette(QColor(std::get<1>(GetParam()))));
         QCoreApplication::processEvents();
     }
@@ -448,5 +438,5 @@ TEST_P(StyledFrameThemes, LookLikeTheMinimizeButton) {
 }
 
 INSTANTIATE_TEST_SUITE_P(InLightAndDark, StyledFrameThemes,
-                         testing::Combine(testing::Values("Fusion", "Windows"),
+                         testing::Combine(testing::Values(std::string("Fusion"), std::string("Windows")),
                                           testing::Values(0xFFEFEFEF, 0xFF353535)));
