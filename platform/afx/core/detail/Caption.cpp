@@ -200,7 +200,7 @@ int Caption::hitTest(QPoint point) const {
     }
     // Half of the gap at the left of a button belongs to it. So a button that the host puts beside it, by what it is
     // told here, has its size and the same gap.
-    const int reach = widget.isWindow() ? 1 : 0;
+    constexpr int reach = 1;
     for (const Part& part : parts) {
         const QStyle::SubControl control = controlOf(part.code, widget);
         const QRect place = m_style->subControlRect(QStyle::CC_TitleBar, &option, control, &widget);

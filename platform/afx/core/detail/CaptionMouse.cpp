@@ -90,6 +90,10 @@ bool CaptionMouse::changesSize() const {
 
 std::optional<LRESULT> CaptionMouse::proc(UINT message, WPARAM wParam, LPARAM lParam) {
     const auto part = static_cast<int>(wParam);
+    if (part == HTMENU && message >= WM_NCMOUSEMOVE && message <= WM_NCMBUTTONDOWN) {
+        hover(HTNOWHERE);
+        return std::nullopt; // the menu bar's own
+    }
     switch (message) {
     case WM_NCLBUTTONDOWN:
         return press(part, pointOf(lParam)) ? std::optional<LRESULT>(0) : std::nullopt;

@@ -94,14 +94,16 @@ TEST_F(CaptionOnDesktop, EdgesKeepToTheLeastSize) {
 TEST_F(CaptionOnDesktop, ADoubleClickFillsTheScreenAndTakesItBack) {
     pointTo(QPoint(200, 12));
     run("click --repeat 2 --delay 20 1");
-    EXPECT_TRUE(QTest::qWaitFor(
-        [&] { return window.IsZoomed() && place() == widgetOf(window).screen()->availableGeometry(); }));
+    EXPECT_TRUE(QTest::qWaitFor([&] {
+        return window.IsZoomed() && widgetOf(window).geometry() == widgetOf(window).screen()->availableGeometry();
+    }));
     EXPECT_EQ(partAt(window, QPoint(0, 100)), HTCLIENT) << "no border";
     pointTo(QPoint(200, 12));
     run("click --repeat 2 --delay 20 1");
     expectPlace(start);
     window.ShowWindow(SW_SHOWMAXIMIZED);
-    EXPECT_TRUE(QTest::qWaitFor([&] { return place() == widgetOf(window).screen()->availableGeometry(); }));
+    EXPECT_TRUE(
+        QTest::qWaitFor([&] { return widgetOf(window).geometry() == widgetOf(window).screen()->availableGeometry(); }));
     window.seen.clear();
     window.on[WM_SYSCOMMAND] = [](LPARAM, LRESULT&) { return true; };
     run("mousemove 5000 0");

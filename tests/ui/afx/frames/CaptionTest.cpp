@@ -248,6 +248,11 @@ TEST_P(Caption, ButtonsActWhereTheyAreReleased) {
         moveTo(QPoint(150, 101));
         EXPECT_EQ(shown(*window), plain) << part;
     }
+    if (!isChild()) {
+        const auto* bar = qobject_cast<QMenuBar*>(frametest::widgetOf(*window)->menuWidget());
+        moveTo(bar->geometry().topLeft() + bar->actionGeometry(bar->actions().front()).center());
+        EXPECT_EQ(bar->activeAction(), bar->actions().front()) << "moves over it are the menu bar's";
+    }
     press(middleOf(*window, HTCLOSE));
     release(middleOf(*window, HTCLOSE));
     EXPECT_EQ(log->of(WM_SYSCOMMAND), std::vector<WPARAM>{SC_CLOSE});
