@@ -108,7 +108,7 @@ bool StyleParts::exist() {
 QImage StyleParts::captionShot(QStyle::SubControl which, int state, double ratio) const {
     QStyleOptionTitleBar option = caption(m_style, widget());
     setState(option, which, CaptionButton, state);
-    option.titleBarState = option.state.testFlag(QStyle::State_Active) ? static_cast<int>(QStyle::State_Active) : 0;
+    m_style.isActive = option.state.testFlag(QStyle::State_Active);
     const QRect place = m_style.subControlRect(QStyle::CC_TitleBar, &option, which, widget());
     return shot(place, ratio, option.palette, [&](QPainter& painter) {
         m_style.drawComplexControl(QStyle::CC_TitleBar, &option, &painter, widget());
