@@ -169,8 +169,10 @@ void CBoardApp::OnToolsKeyboard() {
     m_keyboard->Edit();
 }
 
+// Over the window that the user works in, whose commands they are: a drawing's own, or the main one.
 void CBoardApp::OnToolsCommands() {
-    Gui_CommandPalette::Open(static_cast<CFrameWnd*>(m_pMainWnd));
+    CFrameWnd* floating = AfxGetRoutingFrame();
+    Gui_CommandPalette::Open(floating ? floating : static_cast<CFrameWnd*>(m_pMainWnd));
 }
 
 BOOL CBoardApp::PreTranslateMessage(MSG* message) {

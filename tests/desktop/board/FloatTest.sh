@@ -92,6 +92,12 @@ await "it floats again" floating
 outside=$found
 await "where it was" geometry_is "$outside" "$before"
 
+# Commands that are found by typing are those of the window that the user works in.
+xdotool key --clearmodifiers ctrl+alt+p
+focus '^Commands$' type 'win flo'
+xdotool key Return
+await "Float in the palette docks the drawing" docked
+
 wmctrl -i -a "$main"
 await "the main window is active" active "$main"
 xdotool key --clearmodifiers alt+F4
