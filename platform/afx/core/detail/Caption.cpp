@@ -57,6 +57,12 @@ void CaptionStyle::drawComplexControl(ComplexControl control, const QStyleOption
     QProxyStyle::drawComplexControl(control, &caption, painter, widget);
 }
 
+QIcon CaptionStyle::standardIcon(StandardPixmap picture, const QStyleOption* option, const QWidget* widget) const {
+    const QIcon icon = QProxyStyle::standardIcon(picture, option, widget);
+    const bool isSign = picture >= SP_TitleBarMinButton && picture <= SP_TitleBarContextHelpButton;
+    return isSign && isDarkPalette() ? signIcon(icon) : icon;
+}
+
 Caption::Caption(Window& window) : m_window(window), m_style(std::make_unique<CaptionStyle>()) {}
 
 Caption::~Caption() = default;

@@ -7,6 +7,7 @@
 #include "platform/base/Export.h"
 #include "platform/base/Types.h"
 
+#include <QIcon>
 #include <QMargins>
 #include <QPoint>
 #include <QProxyStyle>
@@ -32,6 +33,7 @@ public:
                          const QWidget* widget) const override;
     void drawComplexControl(ComplexControl control, const QStyleOptionComplex* option, QPainter* painter,
                             const QWidget* widget) const override;
+    QIcon standardIcon(StandardPixmap picture, const QStyleOption* option, const QWidget* widget) const override;
     /// The place of a button that the host draws, in the window's coordinates; empty for none.
     QRect button;
     /// Whether captions are drawn as those of active windows, whatever the toolkit takes them for: the window was told.

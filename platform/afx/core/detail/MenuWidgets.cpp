@@ -2,6 +2,7 @@
 
 #include "platform/afx/core/Message.h"
 #include "platform/afx/core/WindowCalls.h"
+#include "platform/afx/core/detail/Caption.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/HelpRequest.h"
@@ -253,6 +254,32 @@ void FrameMenuBar::lendKeyboard() {
 void FrameMenuBar::mousePressEvent(QMouseEvent* event) {
     storing([this] { lendKeyboard(); });
     QMenuBar::mousePressEvent(event);
+}
+
+void FrameMenuBar::childEvent(QChildEvent* event) {
+    QMenuBar::childEvent(event);
+    if (event->added() && event->child() == cornerWidget()) {
+        styleCorner();
+    }
+}
+
+void FrameMenuBar::changeEvent(QEvent* event) {
+    QMenuBar::changeEvent(event);
+    if (event->type() == QEvent::StyleChange) {
+        styleCorner();
+    }
+}
+
+void FrameMenuBar::styleCorner() {
+    QWidget* corner = cornerWidget();
+    if (!corner) {
+        return;
+    }
+    const auto former = corner->findChildren<QProxyStyle*>(QString(), Qt::FindDirectChildrenOnly);
+    auto* style = new CaptionStyle;
+    style->setParent(corner); // which another bar may have next
+    corner->setStyle(style);
+    qDeleteAll(former);
 }
 
 void FrameMenuBar::paintEvent(QPaintEvent* event) {

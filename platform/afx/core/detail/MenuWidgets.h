@@ -62,12 +62,16 @@ public:
 protected:
     void initStyleOption(QStyleOptionMenuItem* option, const QAction* action) const override;
     void mousePressEvent(QMouseEvent* event) override;
+    /// The buttons of a child frame that fills the frame stand in the bar, and are drawn as captions are.
+    void childEvent(QChildEvent* event) override;
+    void changeEvent(QEvent* event) override;
     /// The bar is a part of its frame: hosts draw on it when the frame around the client area is painted.
     void paintEvent(QPaintEvent* event) override;
 
 private:
     void menuChanged(HMENU menu) override;
     void lendKeyboard();
+    void styleCorner();
     void rebuild();
     void addEntry(const MenuItem& item, int index);
     HMENU m_menu = nullptr;

@@ -8,6 +8,7 @@
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/frames/ControlBar.h"
 #include "platform/afx/frames/Frame.h"
+#include "platform/afx/gdi/detail/ButtonImages.h"
 #include "platform/win/FrameworkIds.h"
 
 #include <QAction>
@@ -51,7 +52,7 @@ ToolWidget::ToolWidget(const QString& title, QWidget* parent)
     setAttribute(Qt::WA_ShowWithoutActivating);
     m_close->setAutoRaise(true);
     m_close->setFocusPolicy(Qt::NoFocus);
-    m_close->setIcon(style()->standardIcon(QStyle::SP_TitleBarCloseButton, nullptr, this));
+    m_close->setIcon(signIcon(style()->standardIcon(QStyle::SP_TitleBarCloseButton, nullptr, this)));
     m_close->setToolTip(withoutMarks(ownText(TVX_IDS_SYS_CLOSE).section('\t', 0, 0)));
     m_close->setAccessibleName(m_close->toolTip());
     m_close->hide();

@@ -51,10 +51,29 @@ QImage forDarkGround(QImage image) {
     return image;
 }
 
+/// A dark sign in the colour of texts: the paler a pixel is, the less of it is seen.
+QImage inTextColor(QImage image) {
+    const QRgb text = QGuiApplication::palette().color(QPalette::ButtonText).rgb() & RGB_MASK;
+    const auto eachPixel = [&image](const auto& act) {
+        for (int y = 0; y < image.height(); ++y) {
+            auto* line = reinterpret_cast<QRgb*>(image.scanLine(y));
+            std::for_each(line, line + image.width(), act);
+        }
+    };
+    int most = 1;
+    eachPixel([&most](QRgb pixel) { most = std::max(most, qAlpha(pixel) != 0 ? 255 - qGray(pixel) : 0); });
+    eachPixel([&](QRgb& pixel) {
+        pixel = text | static_cast<QRgb>(qAlpha(pixel) * std::min(255 - qGray(pixel), most) / most) << 24U;
+    });
+    return image;
+}
+
 /// Chooses the picture for the desktop's colours each time that it is shown, since those may change.
 class ButtonIconEngine : public QIconEngine {
 public:
-    explicit ButtonIconEngine(QImage image) : m_image(std::move(image)) {}
+    using Change = QImage (*)(QImage);
+    /// @param forDark what makes of the picture one that is seen on a dark desktop
+    ButtonIconEngine(QImage image, Change forDark) : m_image(std::move(image)), m_forDark(forDark) {}
 
     void paint(QPainter* painter, const QRect& area, QIcon::Mode mode, QIcon::State state) override {
         const QPixmap shown = pixmap(area.size(), mode, state);
@@ -63,7 +82,7 @@ public:
         painter->drawPixmap(place.topLeft(), shown);
     }
     QPixmap pixmap(const QSize& size, QIcon::Mode mode, QIcon::State) override {
-        QPixmap shown = QPixmap::fromImage(isDarkPalette() ? forDarkGround(m_image) : m_image);
+        QPixmap shown = QPixmap::fromImage(isDarkPalette() ? m_forDark(m_image) : m_image);
         if (const QSize fitting = actualSize(size, mode, QIcon::Off); fitting != shown.size()) {
             shown = shown.scaled(fitting, Qt::IgnoreAspectRatio, Qt::SmoothTransformation);
         }
@@ -79,17 +98,27 @@ public:
         return {m_image.size()};
     }
     QIconEngine* clone() const override {
-        return new ButtonIconEngine(m_image);
+        return new ButtonIconEngine(m_image, m_forDark);
     }
 
 private:
     QImage m_image;
+    Change m_forDark;
 };
 
 } // namespace
 
 QIcon buttonIcon(const QImage& picture) {
-    return picture.isNull() ? QIcon() : QIcon(new ButtonIconEngine(picture));
+    return picture.isNull() ? QIcon() : QIcon(new ButtonIconEngine(picture, &forDarkGround));
+}
+
+QIcon signIcon(const QIcon& sign) {
+    const QList<QSize> sizes = sign.availableSizes();
+    if (sizes.isEmpty()) {
+        return sign;
+    }
+    const QImage picture = sign.pixmap(sizes.back(), 1.0).toImage().convertToFormat(QImage::Format_ARGB32);
+    return QIcon(new ButtonIconEngine(picture, &inTextColor));
 }
 
 QIcon buttonIcon(HBITMAP bitmap) {

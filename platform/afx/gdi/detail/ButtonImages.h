@@ -16,5 +16,8 @@ namespace tvx::afx {
 [[nodiscard]] QIcon buttonIcon(const QImage& picture);
 /// The whole bitmap as one picture; null icon for a handle that is none.
 [[nodiscard]] QIcon buttonIcon(HBITMAP bitmap);
+/// An icon of a style's sign for captions, which styles have in one dark colour. On a dark desktop it has that of
+/// texts.
+[[nodiscard]] QIcon signIcon(const QIcon& sign);
 
 } // namespace tvx::afx

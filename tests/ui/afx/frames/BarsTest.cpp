@@ -48,6 +48,12 @@ TEST_F(Bars, PicturesAreSeenOnADarkDesktop) {
     EXPECT_EQ(shown(), 32);
     QApplication::setPalette(QPalette(QColor(50, 50, 50), QColor(40, 40, 40)));
     EXPECT_EQ(shown(), 223);
+    for (const auto* close : tvx::afx::peerOf(frame->tools.m_hWnd)->findChildren<QToolButton*>()) {
+        if (close->accessibleName() == "Close") {
+            const QImage cross = close->icon().pixmap(16, 16).toImage();
+            EXPECT_GT(cross.pixelColor(cross.rect().center()).lightness(), 200) << "of a floating bar";
+        }
+    }
     QApplication::setPalette(before);
     EXPECT_EQ(shown(), 32);
     DeleteObject(dark);

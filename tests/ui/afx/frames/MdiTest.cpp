@@ -3,6 +3,7 @@
 
 #include <QMdiArea>
 #include <QMdiSubWindow>
+#include <QMenuBar>
 
 #include <malloc.h>
 #include <set>
@@ -412,8 +413,8 @@ TEST_F(Mdi, ChildrenKnowWhereTheyGoBackTo) {
     EXPECT_EQ(CRect(placement.rcNormalPosition), CRect(5, 6, 305, 206));
 }
 
-TEST_F(FrameTest, CaptionButtonsOfInactiveChildFramesAreSeenOnADarkDesktop) {
-    const BoardsFrame& frame = openBoards();
+TEST_F(FrameTest, ButtonsOfChildFramesAreSeenOnADarkDesktop) {
+    BoardsFrame& frame = openBoards();
     const QPalette before = QApplication::palette();
     QApplication::setPalette(QPalette(QColor(50, 50, 50), QColor(40, 40, 40)));
     boards().OpenDocumentFile(nullptr);
@@ -430,5 +431,22 @@ TEST_F(FrameTest, CaptionButtonsOfInactiveChildFramesAreSeenOnADarkDesktop) {
         }
         EXPECT_GT(brightest, 200) << child->windowTitle().toStdString();
     }
+    frame.MDIGetActive()->MDIMaximize();
+    settle();
+    QWidget* corner = dynamic_cast<QMainWindow*>(widgetOf(frame))->menuBar()->cornerWidget();
+    ASSERT_NE(corner, nullptr);
+    const auto seen = [corner] {
+        const QImage image = corner->grab().toImage();
+        const int ground = corner->palette().button().color().lightness();
+        int pixels = 0;
+        for (int i = 0; i < image.width() * image.height(); ++i) {
+            const int light = image.pixelColor(i % image.width(), i / image.width()).lightness();
+            pixels += std::abs(light - ground) > 70 ? 1 : 0;
+        }
+        return pixels;
+    };
+    const int onDark = seen();
     QApplication::setPalette(before);
+    settle();
+    EXPECT_GE(onDark, seen()) << "in the menu bar";
 }
