@@ -4,10 +4,10 @@
 #include "afxext.h"
 #include "afxwin.h"
 #include "platform/afx/toolkit/detail/Gui.h"
-#include "samples/board/Resource.h"
 #include "s/ExternFrame.h"
 #include "s/FloatChildFrame.h"
 #include "s/FloatMainFrame.h"
+#include "samples/board/Resource.h"
 
 #include <QApplication>
 #include <QLabel>

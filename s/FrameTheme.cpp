@@ -282,9 +282,12 @@ std::unique_ptr<Gui_Bitmap> FrameTheme::render(CWnd& window, const Picture& pict
 
 namespace {
 
+/// Of child frames only one is drawn active, whatever window they are in: the button is a part of that picture.
 bool isActive(const CFrameWnd& frame) {
     const CWnd* top = frame.GetTopLevelParent();
-    return top && top == CWnd::GetActiveWindow();
+    const auto* child = DYNAMIC_DOWNCAST(CMDIChildWnd, &frame);
+    const CMDIFrameWnd* main = child ? child->GetMDIFrame() : nullptr;
+    return top && top == CWnd::GetActiveWindow() && (!main || main->MDIGetActive() == child);
 }
 
 } // namespace

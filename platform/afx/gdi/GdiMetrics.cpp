@@ -7,6 +7,8 @@
 #include <QStyleHints>
 #include <QStyleOption>
 
+#include <algorithm>
+
 namespace {
 
 QRect primaryScreen() {
@@ -62,7 +64,7 @@ QSize menuButtonSize() {
     return {three.width() / 3, three.height()};
 }
 
-/// What a button takes in a caption: from one to the next, and the whole height.
+/// What a button takes in a caption.
 QSize captionButtonSize() {
     QStyleOptionTitleBar option;
     option.rect = QRect(0, 0, 400, pixelMetric(QStyle::PM_TitleBarHeight));
@@ -72,8 +74,9 @@ QSize captionButtonSize() {
     const auto place = [&option](QStyle::SubControl button) {
         return QApplication::style()->subControlRect(QStyle::CC_TitleBar, &option, button);
     };
+    // From one button to the next; and with the two pixels above and below that hosts leave free around theirs.
     return {place(QStyle::SC_TitleBarMaxButton).left() - place(QStyle::SC_TitleBarMinButton).left(),
-            option.rect.height()};
+            std::min(place(QStyle::SC_TitleBarMinButton).height() + 4, option.rect.height())};
 }
 
 int frameMetric(int index) {

@@ -77,9 +77,10 @@ TVX_ENTRY_POINT COLORREF GetThemeSysColor(HTHEME theme, int index) {
     return parts ? parts->color(index) : GetSysColor(index);
 }
 
-/// A system metric (SM_...), in pixels: the style's sizes are the system's.
+/// A system metric (SM_...), in pixels. The style's sizes are the system's, but for the height of caption buttons: the
+/// room that they are centred in is the whole caption.
 TVX_ENTRY_POINT int GetThemeSysSize(HTHEME, int index) {
-    return GetSystemMetrics(index);
+    return GetSystemMetrics(index == SM_CYSIZE ? SM_CYCAPTION : index);
 }
 
 /// Draws a part: 15 or 16, the buttons that minimise in captions and in menu bars.
