@@ -6,6 +6,8 @@
 #include "s/FrameTheme.h"
 #include "s/StringOf.h"
 
+#include <algorithm>
+
 // What a Gui_FloatHelp is set up with, its button's place and what the mouse does to it. The moves are in
 // FloatMove.cpp, the drawing is in FloatButton.cpp.
 
@@ -112,14 +114,16 @@ bool Gui_FloatHelp::isShown() const {
 
 namespace {
 
-/// A fourth button left of minimise, maximise and close, by the measures of captions alone.
+/// A fourth button left of minimise, maximise and close, by the measures of captions alone. Menu bars may be lower than
+/// captions: what is below them belongs to other windows.
 CRect classicPlace(const CRect& window, bool inMenuBar) {
     const int width = ::GetSystemMetrics(SM_CXSIZE);
     const int height = ::GetSystemMetrics(SM_CYSIZE);
     const int caption = ::GetSystemMetrics(SM_CYCAPTION);
     const int right = window.right - 3 * width - 2 * ::GetSystemMetrics(SM_CXBORDER) - ::GetSystemMetrics(SM_CXFRAME);
     const int top = window.top + ::GetSystemMetrics(SM_CYFRAME) + (caption - height) / 2 + (inMenuBar ? caption : 0);
-    return {right - width, top, right, top + height};
+    const int barEnd = window.top + ::GetSystemMetrics(SM_CYFRAME) + caption + ::GetSystemMetrics(SM_CYMENU);
+    return {right - width, top, right, inMenuBar ? std::min(top + height, barEnd) : top + height};
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 #include "s/FloatMainFrame.h"
 #include "s/FloatPlaces.h"
 
+#include <exception>
 #include <memory>
 
 // How a view gets a window of its own, and how it comes back.
@@ -27,16 +28,44 @@ void giveFocusBack(HWND focus, HWND view) {
 /// Ends a frame that got no view, whatever a hook of it threw.
 struct EndFrame {
     void operator()(CFrameWnd* frame) const {
-        frame->DestroyWindow();
+        if (frame->m_hWnd) {
+            frame->DestroyWindow();
+        } else {
+            delete frame;
+        }
     }
 };
 using NewFrame = std::unique_ptr<CFrameWnd, EndFrame>;
 
+/// What a host's code throws while a view is between two frames: it waits until the move is complete.
+class Thrown {
+public:
+    template <class Step>
+    void from(const Step& step) {
+        try {
+            step();
+        } catch (...) {
+            m_first = m_first ? m_first : std::current_exception();
+        }
+    }
+    void pass() const {
+        if (m_first) {
+            std::rethrow_exception(m_first);
+        }
+    }
+
+private:
+    std::exception_ptr m_first;
+};
+
 /// Puts a view into a frame directly from the one that has it: without a window in between that stands alone.
-void give(CView& view, CFrameWnd& from, CFrameWnd& to) {
-    from.SetActiveView(nullptr);
-    view.SetParent(&to);
-    to.SetActiveView(&view);
+/// @return the window of the new frame, which holds itself from now on
+HWND give(CView& view, CFrameWnd& from, NewFrame to, Thrown& thrown) {
+    thrown.from([&] { from.SetActiveView(nullptr); });
+    view.SetParent(to.get());
+    CFrameWnd* frame = to.release();
+    thrown.from([&] { frame->SetActiveView(&view); });
+    return frame->m_hWnd;
 }
 
 void copyIcons(const CFrameWnd& from, CFrameWnd& to) {
@@ -45,6 +74,21 @@ void copyIcons(const CFrameWnd& from, CFrameWnd& to) {
             to.SetIcon(icon, big);
         }
     }
+}
+
+/// Shows the window that has got the view in place of its former frame.
+void takePlace(CFrameWnd& frame, const CFrameWnd& former, unsigned int resourceId) {
+    CString title;
+    former.GetWindowText(title);
+    frame.SetWindowText(title);
+    copyIcons(former, frame);
+    if (auto* main = DYNAMIC_DOWNCAST(CFrameWnd, AfxGetMainWnd())) {
+        main->SetActiveView(nullptr);
+    }
+    CRect place;
+    former.GetWindowRect(&place);
+    FloatPlaces::show(frame, resourceId, place);
+    frame.RecalcLayout();
 }
 
 /// Ends a frame whose view has gone elsewhere.
@@ -100,34 +144,28 @@ void Gui_FloatHelp::floatView(CFrameWnd& from, CView& view) const {
         return;
     }
     frame->SetRipResourceId(m_resourceId);
+    NewFrame owner(frame);
     frame->PreLoadFrame(&view);
     constexpr DWORD style = WS_OVERLAPPEDWINDOW | FWS_ADDTOTITLE;
-    if (!frame->LoadFrame(m_resourceId, style)) {
+    if (!owner.release()->LoadFrame(m_resourceId, style)) {
         return; // it has deleted itself
     }
-    NewFrame owner(frame);
+    owner.reset(frame);
     frame->PostLoadFrame(&view);
     frame->PreSetActiveView(&view);
     const HWND focus = focusWithin(view);
     const HWND former = from.m_hWnd;
-    CRect place;
-    from.GetWindowRect(&place);
-    give(view, from, *frame);
-    const HWND fresh = owner.release()->m_hWnd;
+    Thrown thrown;
+    const HWND fresh = give(view, from, std::move(owner), thrown);
     const HWND moved = view.m_hWnd;
-    frame->PostSetActiveView(&view);
-    CString title;
-    from.GetWindowText(title);
-    frame->SetWindowText(title);
-    copyIcons(from, *frame);
-    if (auto* main = DYNAMIC_DOWNCAST(CFrameWnd, AfxGetMainWnd())) {
-        main->SetActiveView(nullptr);
+    thrown.from([&] { frame->PostSetActiveView(&view); });
+    if (::IsWindow(fresh) && ::IsWindow(former)) {
+        takePlace(*frame, from, m_resourceId);
     }
-    FloatPlaces::show(*frame, m_resourceId, place);
-    frame->RecalcLayout();
     end(former);
     giveFocusBack(focus, moved);
     ::PostMessage(fresh, WM_ACTIVATE, WA_ACTIVE, 0);
+    thrown.pass();
 }
 
 void Gui_FloatHelp::UnripView() {
@@ -165,14 +203,15 @@ void Gui_FloatHelp::dockView(CView& view) const {
     }
     const HWND focus = focusWithin(view);
     const HWND former = m_owner->m_hWnd;
-    give(view, *m_owner, *frame);
-    const HWND fresh = owner.release()->m_hWnd;
+    Thrown thrown;
+    const HWND fresh = give(view, *m_owner, std::move(owner), thrown);
     const HWND moved = view.m_hWnd;
     if (child) {
-        child->PostSetActiveView(&view);
+        thrown.from([&] { child->PostSetActiveView(&view); });
     }
     end(former);
     present(fresh);
     document->UpdateFrameCounts();
     giveFocusBack(focus, moved);
+    thrown.pass();
 }

@@ -120,6 +120,44 @@ TEST_F(FloatTest, WhatCannotMoveStaysWhereItIs) {
     window.SetUnRipEnabled(true);
 }
 
+// A move that a host's code breaks off leaves the view in the one frame or in the other, whole, and no frame without
+// one.
+TEST_F(FloatTest, WhatAHostThrowsLosesNoView) {
+    PadView& view = viewOf(open());
+    const auto isWhole = [&](const std::string& where, bool floats) {
+        settle();
+        CFrameWnd* frame = view.GetParentFrame();
+        EXPECT_TRUE(throwsIn.empty()) << where;
+        EXPECT_EQ(floating(), floats ? 1U : 0U) << where;
+        EXPECT_EQ(frame->IsKindOf(RUNTIME_CLASS(PadWindow)) != FALSE, floats) << where;
+        EXPECT_TRUE(frame->IsWindowVisible()) << where;
+        EXPECT_EQ(active() != nullptr, !floats) << where;
+        EXPECT_TRUE(frame->GetActiveView() == &view || frame->GetActiveView() == nullptr) << where;
+        frame->SetActiveView(&view);
+    };
+    const auto move = [&](const std::string& where, bool floats) {
+        throwsIn = where;
+        Gui_FloatHelp& help = floating() ? Gui_ExternFrame::GetAll().front()->GetFloatHelp() : active()->GetFloatHelp();
+        EXPECT_EQ(where.empty(), [&] {
+            try {
+                help.Move();
+                return true;
+            } catch (const std::runtime_error&) {
+                return false;
+            }
+        }()) << where;
+        isWhole(where, floats);
+    };
+    for (const char* before : {"load before", "load after", "set before"}) {
+        move(before, false);
+    }
+    for (const char* during : {"deactivated", "activated", "set after"}) {
+        move(during, true);
+        move("child before", true);
+        move("child after", false);
+    }
+}
+
 TEST_F(FloatTest, TheButtonTakesAPressAndMovesOnRelease) {
     PadFrame& frame = open();
     const CRect place = OpenHelp(frame.GetFloatHelp()).place(true);

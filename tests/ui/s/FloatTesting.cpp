@@ -4,6 +4,25 @@
 
 namespace frametest {
 
+std::string throwsIn;
+
+namespace {
+
+void mayThrow(const char* place) {
+    if (throwsIn == place) {
+        throwsIn.clear();
+        throw std::runtime_error(place);
+    }
+}
+
+/// Notes a hook that was called, and throws where it is told to.
+void reach(const char* hook, const char* journalled) {
+    note(journalled);
+    mayThrow(hook);
+}
+
+} // namespace
+
 // --- the view ---
 
 IMPLEMENT_DYNCREATE(PadView, NoteView)
@@ -17,6 +36,7 @@ void PadView::OnInitialUpdate() {
 
 void PadView::OnActivateView(BOOL activate, CView* activated, CView* deactivated) {
     NoteView::OnActivateView(activate, activated, deactivated);
+    mayThrow(activate ? "activated" : "deactivated");
     if (activate && whenActivated) {
         std::exchange(whenActivated, nullptr)();
     }
@@ -33,11 +53,11 @@ PadFrame::PadFrame() {
 }
 
 void PadFrame::PreSetActiveView(CView* view) {
-    note(GetActiveView() ? "child before: has a view" : "child before");
+    reach("child before", GetActiveView() ? "child before: has a view" : "child before");
 }
 
 void PadFrame::PostSetActiveView(CView* view) {
-    note(GetActiveView() == view ? "child after" : "child after: no view");
+    reach("child after", GetActiveView() == view ? "child after" : "child after: no view");
 }
 
 bool PadWindow::failsStatusBar = false;
@@ -47,19 +67,19 @@ int PadWindow::CreateStatusBar() {
 }
 
 void PadWindow::PreLoadFrame(CView*) {
-    note(m_hWnd ? "load before: has a window" : "load before");
+    reach("load before", m_hWnd ? "load before: has a window" : "load before");
 }
 
 void PadWindow::PostLoadFrame(CView*) {
-    note(m_hWnd ? "load after" : "load after: no window");
+    reach("load after", m_hWnd ? "load after" : "load after: no window");
 }
 
 void PadWindow::PreSetActiveView(CView* view) {
-    note(view->GetParentFrame() == this ? "set before: has the view" : "set before");
+    reach("set before", view->GetParentFrame() == this ? "set before: has the view" : "set before");
 }
 
 void PadWindow::PostSetActiveView(CView* view) {
-    note(view->GetParentFrame() == this && GetActiveView() == view ? "set after" : "set after: no view");
+    reach("set after", view->GetParentFrame() == this && GetActiveView() == view ? "set after" : "set after: no view");
 }
 
 // clang-format off
@@ -77,6 +97,7 @@ void PadMain::OnOrphan() {
 void FloatTest::SetUp() {
     FrameTest::SetUp();
     PadView::whenActivated = nullptr;
+    throwsIn.clear();
     PadWindow::failsStatusBar = false;
     Gui_ExternFrame::SetCloseAction(Gui_ExternFrame::CloseAction::Close);
     CWinApp& app = *AfxGetApp();

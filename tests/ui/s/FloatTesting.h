@@ -22,6 +22,9 @@ public:
     static std::function<void()> whenActivated; ///< what a host does in the handler
 };
 
+/// The name of the hook that throws, as hosts' code may; it throws once.
+extern std::string throwsIn;
+
 class PadFrame : public Gui_FloatChildFrame {
     DECLARE_DYNCREATE(PadFrame)
 
