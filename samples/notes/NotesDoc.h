@@ -19,6 +19,9 @@ public:
     void DeleteContents() override;
 
 private:
+    /// Whether somebody else has written the document's file since it was read or saved.
+    bool hasChangedFile(LPCSTR path) const;
+
     FileText m_text;
     /// What is being written.
     std::string m_bytes;

@@ -70,6 +70,15 @@ focus "^Tarvex Notes$" key Escape
 await "the question goes" untitled "^Tarvex Notes$"
 await "it stays" titled "^list.txt - Tarvex Notes$"
 press ctrl+z
+printf 'not mine' >list.txt
+press ctrl+s
+focus "^Tarvex Notes$"
+press Return
+await "the question goes" untitled "^Tarvex Notes$"
+holds list.txt 'not mine' || fail "what another program has written stays until the user wants it replaced"
+press ctrl+s
+focus "^Tarvex Notes$" key alt+y
+await "the text replaces it" holds list.txt '\xef\xbb\xbfXold\xe9\r\nfirst row\rthird'
 printf 'PNG\0\1' >picture.png
 press ctrl+o
 focus "^Open$"

@@ -14,6 +14,7 @@ TEST_F(NotesHelp, HasAPageForEachCommandDialogAndMessage) {
     EXPECT_EQ(expectTopicsOfDialogs(), 1);
     expectTopic(HID_BASE_RESOURCE + IDR_MAINFRAME);
     expectTopic(HID_BASE_PROMPT + IDS_NOT_FOUND);
+    expectTopic(HID_BASE_PROMPT + IDS_CHANGED);
 }
 
 } // namespace
