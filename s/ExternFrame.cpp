@@ -21,6 +21,7 @@ BEGIN_MESSAGE_MAP(Gui_ExternFrame, SECFrameWnd)
     ON_WM_NCLBUTTONUP()
     ON_WM_NCLBUTTONDBLCLK()
     ON_WM_LBUTTONUP()
+    ON_WM_CAPTURECHANGED()
     ON_WM_SYSCOMMAND()
     ON_WM_INITMENUPOPUP()
     ON_WM_THEMECHANGED()
@@ -86,6 +87,9 @@ int Gui_ExternFrame::OnCreate(CREATESTRUCT* cs) {
     }
     prepareTheme();
     const bool hasTools = GetFloatHelp().HasValidResourceId() && CreateToolBar() != 0;
+    if (!hasTools && m_toolBar.m_hWnd) {
+        m_toolBar.DestroyWindow(); // without its buttons
+    }
     if (!CreateStatusBar()) {
         return -1;
     }

@@ -59,6 +59,11 @@ public:
             Base::OnLButtonUp(flags, point);
         }
     }
+    /// The mouse went elsewhere, to a box that came up: the press is given up.
+    afx_msg void OnCaptureChanged(CWnd* taker) {
+        m_help.CancelPress();
+        Base::OnCaptureChanged(taker);
+    }
     afx_msg LRESULT OnThemeChanged() {
         const LRESULT answer = Base::OnThemeChanged();
         this->PostMessage(WM_NCPAINT, 1);

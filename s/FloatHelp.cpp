@@ -7,6 +7,7 @@
 #include "s/StringOf.h"
 
 #include <algorithm>
+#include <utility>
 
 // What a Gui_FloatHelp is set up with, its button's place and what the mouse does to it. The moves are in
 // FloatMove.cpp, the drawing is in FloatButton.cpp.
@@ -189,4 +190,10 @@ int Gui_FloatHelp::OnNcLButtonUp(unsigned int, CPoint point) {
     }
     Move();
     return 1;
+}
+
+void Gui_FloatHelp::CancelPress() {
+    if (std::exchange(m_isPushed, false)) {
+        drawButton(m_isRipOut);
+    }
 }

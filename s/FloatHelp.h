@@ -67,6 +67,9 @@ public:
     int OnNcLButtonUp(unsigned int hitTest, CPoint point);
     /// @}
 
+    /// Forgets a press whose release will not be heard of.
+    void CancelPress();
+
     /// Whether the move that this object is for, RipOutView or UnripView, would find a view that may be moved.
     bool CanMove();
     /// That move.
