@@ -86,7 +86,7 @@ void CKeyboard::Edit() {
     Gui_AccelMap now(own);
     Gui_AccelProfile::Read(now, entry, nullptr);
     const HACCEL table = now.CreateTable();
-    CKeyboardDlg dialog(m_main.GetMenu(), table, &m_main);
+    CKeyboardDlg dialog(m_main.GetMenu(), table, nullptr);
     DestroyAcceleratorTable(table);
     dialog.SetResetAccels(own);
     if (dialog.DoModal() == IDOK) {

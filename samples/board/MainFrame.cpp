@@ -85,7 +85,7 @@ void CMainFrame::OnRunCommand() {
     CString prompt;
     title.LoadString(IDS_RUN_TITLE);
     prompt.LoadString(IDS_RUN_PROMPT);
-    Gui_QueryDlg query(this);
+    Gui_QueryDlg query;
     query.SetTitle(title);
     query.SetPrompt(prompt);
     query.SetAnswer(m_lastCommand);
@@ -115,7 +115,7 @@ void CMainFrame::OnHelpSearch() {
     CString prompt;
     title.LoadString(IDS_SEARCH_TITLE);
     prompt.LoadString(IDS_SEARCH_PROMPT);
-    Gui_QueryDlg query(this);
+    Gui_QueryDlg query;
     query.SetTitle(title);
     query.SetPrompt(prompt);
     query.SetAnswer(m_lastKeyword);

@@ -66,27 +66,6 @@ Window* topLevelOf(CWnd* window) {
     return state ? state->topLevel() : nullptr;
 }
 
-/// The window a dialog stands over: the active one of the application when the host names none and another dialog is
-/// open already, so that dialogs stack.
-CWnd* ownerFor(CWnd* parent) {
-    if (parent && parent->m_hWnd) {
-        return parent;
-    }
-    const Window* active = Window::from(::GetActiveWindow());
-    if (dynamic_cast<const DialogWindow*>(active) && !active->isChild()) {
-        return CWnd::FromHandle(active->handle());
-    }
-    CWnd* main = AfxGetMainWnd();
-    return main && main->m_hWnd ? main : nullptr;
-}
-
-void activateAgain(HWND handle) {
-    Window* window = Window::from(handle);
-    if (window && window->isVisible() && !window->widget()->isMinimized()) {
-        guarded([window] { window->widget()->activateWindow(); });
-    }
-}
-
 } // namespace
 
 CDialog::CDialog(LPCSTR templateName, CWnd* parent) : m_lpszTemplateName(templateName), m_pParentWnd(parent) {
@@ -242,7 +221,7 @@ int CDialog::DoModal() {
     if (!description) {
         return -1;
     }
-    CWnd* parent = ownerFor(m_pParentWnd);
+    CWnd* parent = m_pParentWnd && m_pParentWnd->m_hWnd ? m_pParentWnd : CWnd::FromHandle(defaultOwner());
     Window* owner = topLevelOf(parent);
     const HWND ownerHandle = owner ? owner->handle() : nullptr;
     OwnerLock lock(owner);

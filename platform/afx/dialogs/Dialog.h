@@ -45,7 +45,7 @@ public:
     /// For modeless dialogs, which name their template in Create.
     CDialog() = default;
     /// @param templateName the template's name or number (MAKEINTRESOURCE)
-    /// @param parent the window to stand over; null for the application's main window
+    /// @param parent the window to stand over; null, for modal ones, for the dialog or frame that the user works in
     explicit CDialog(LPCSTR templateName, CWnd* parent = nullptr);
     explicit CDialog(UINT templateId, CWnd* parent = nullptr);
     ~CDialog() override;

@@ -150,9 +150,10 @@ void activate(const CDocument& document) {
         return;
     }
     frame->ActivateFrame();
-    auto* main = DYNAMIC_DOWNCAST(CFrameWnd, AfxGetMainWnd());
-    if (main && main != frame) {
-        main->ActivateFrame();
+    // The main window, or one beside it.
+    if (CFrameWnd* top = frame->GetTopLevelFrame()) {
+        top->ActivateFrame();
+        top->SetForegroundWindow();
     }
 }
 

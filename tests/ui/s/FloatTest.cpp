@@ -1,6 +1,8 @@
 // Views that get windows of their own and come back: by the mouse, by menus and keys, by program.
 #include "tests/ui/s/FloatTesting.h"
 
+#include "afxdlgs.h"
+
 #include "platform/win/Registry.h"
 #include "s/FloatPlaces.h"
 #include "tests/ui/afx/frames/SettingsFolder.h"
@@ -118,6 +120,10 @@ TEST_F(FloatTest, WhatCannotMoveStaysWhereItIs) {
     window.GetFloatHelp().UnripView();
     EXPECT_EQ(floating(), 1U);
     window.SetUnRipEnabled(true);
+
+    PadFrame& plain = open();
+    plain.SetRipResourceId(IDR_TESTBOARD);
+    EXPECT_EQ(floated(plain).tools().m_hWnd, nullptr) << "resources without a tool bar";
 }
 
 // A move that a host's code breaks off leaves the view in the one frame or in the other, whole, and no frame without
@@ -131,7 +137,7 @@ TEST_F(FloatTest, WhatAHostThrowsLosesNoView) {
         EXPECT_EQ(floating(), floats ? 1U : 0U) << where;
         EXPECT_EQ(frame->IsKindOf(RUNTIME_CLASS(PadWindow)) != FALSE, floats) << where;
         EXPECT_TRUE(frame->IsWindowVisible()) << where;
-        EXPECT_EQ(active() != nullptr, !floats) << where;
+        EXPECT_EQ(!active(), floats) << where;
         EXPECT_TRUE(frame->GetActiveView() == &view || frame->GetActiveView() == nullptr) << where;
         frame->SetActiveView(&view);
     };
@@ -170,6 +176,10 @@ TEST_F(FloatTest, TheButtonTakesAPressAndMovesOnRelease) {
     release(frame, whole.CenterPoint());
     EXPECT_EQ(CWnd::GetCapture(), nullptr);
     EXPECT_EQ(floating(), 0U) << "released elsewhere";
+
+    press(frame, place.CenterPoint());
+    ::SetCapture(main->m_hWnd); // as a box that comes up does
+    ::ReleaseCapture();
 
     // The rules themselves, with nothing pressed before.
     EXPECT_EQ(frame.GetFloatHelp().OnNcLButtonUp(HTCAPTION, place.CenterPoint()), 0);
@@ -261,6 +271,25 @@ TEST_F(FloatTest, CommandsGoToTheFloatingViewWhileItIsActive) {
     help.cbSize = sizeof help;
     help.iContextType = HELPINFO_WINDOW;
     EXPECT_EQ(window.SendMessage(WM_HELP, 0, reinterpret_cast<LPARAM>(&help)), TRUE);
+}
+
+TEST_F(FloatTest, DialogsAndOpenDocumentsComeUpWhereTheUserWorks) {
+    open();
+    PadWindow& window = floated(open());
+    later([&] {
+        QWidget* box = QApplication::activeModalWidget();
+        ASSERT_NE(box, nullptr);
+        EXPECT_EQ(box->parentWidget(), widgetOf(window));
+        box->close();
+    });
+    CColorDialog().DoModal();
+    EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
+
+    viewOf(window).GetDocument()->SetPathName("/tmp/floating.brd", FALSE);
+    main->SetForegroundWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(widgetOf(*main)));
+    AfxGetApp()->OpenDocumentFile("/tmp/floating.brd");
+    EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
 }
 
 TEST_F(FloatTest, TheWindowMenuListsAllViews) {

@@ -2,6 +2,7 @@
 
 #include "platform/afx/controls/detail/ButtonWindow.h"
 #include "platform/afx/controls/detail/Control.h"
+#include "platform/afx/core/App.h"
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/Wnd.h"
 #include "platform/afx/core/detail/DesktopAnswers.h"
@@ -465,6 +466,28 @@ bool fillControls(DialogWindow& dialog, LPCSTR name) {
                      reinterpret_cast<LPARAM>(entry.text.c_str()));
     }
     return true;
+}
+
+HWND defaultOwner() {
+    HWND active = ::GetActiveWindow();
+    while (active && !dynamic_cast<const DialogWindow*>(Window::from(active)) && ::GetWindow(active, GW_OWNER)) {
+        active = ::GetWindow(active, GW_OWNER); // a bar that floats belongs to a frame
+    }
+    const Window* window = Window::from(active);
+    const bool isDialog = dynamic_cast<const DialogWindow*>(window) && !window->isChild();
+    if (isDialog || (window && window->object() && window->object()->IsFrameWnd())) {
+        return active;
+    }
+    const CWnd* main = AfxGetMainWnd();
+    return main ? main->m_hWnd : nullptr;
+}
+
+void activateAgain(HWND owner) {
+    Window* given = Window::from(owner);
+    Window* window = given ? given->topLevel() : nullptr;
+    if (window && window->isVisible() && !window->widget()->isMinimized()) {
+        guarded([window] { window->widget()->activateWindow(); });
+    }
 }
 
 } // namespace tvx::afx

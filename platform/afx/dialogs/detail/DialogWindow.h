@@ -13,6 +13,12 @@ namespace tvx::afx {
 
 class ScrollFrame;
 
+/// The window that a dialog stands over whose host names none: another dialog that is active, so that they stack; the
+/// frame that the user works in, which may be one beside the main window; that itself.
+TVX_PLATFORM_API HWND defaultOwner();
+/// Gives the user the window back that a dialog stood over.
+TVX_PLATFORM_API void activateAgain(HWND owner);
+
 /// The class of dialogs.
 inline constexpr const char* dialogClass = "#32770";
 

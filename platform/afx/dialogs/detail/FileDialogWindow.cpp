@@ -1,5 +1,6 @@
 #include "platform/afx/dialogs/detail/FileDialogWindow.h"
 
+#include "platform/afx/core/App.h"
 #include "platform/afx/toolkit/detail/Gui.h"
 #include "platform/base/SystemPath.h"
 #include "platform/win/Files.h"

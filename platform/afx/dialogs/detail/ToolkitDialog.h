@@ -1,12 +1,12 @@
 #pragma once
 
-#include "platform/afx/core/App.h"
 #include "platform/afx/core/detail/HelpRequest.h"
 #include "platform/afx/core/detail/Keys.h"
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/OwnText.h"
 #include "platform/afx/core/detail/Window.h"
 #include "platform/afx/dialogs/DialogWatch.h"
+#include "platform/afx/dialogs/detail/DialogWindow.h"
 
 #include <QDialog>
 #include <QKeyEvent>
@@ -20,10 +20,11 @@ namespace tvx::afx {
 template <class Base>
 class ToolkitDialog : public Base {
 public:
-    /// @param owner the window that it stands over; null: the main window
+    /// @param owner the window that it stands over; null: defaultOwner
     /// @param title string resource of the caption
     /// @param help  number that help is asked for under, from FrameworkIds.h
-    ToolkitDialog(HWND owner, UINT title, UINT help) : Base(parentFor(owner)), m_owner(windowFor(owner)), m_help(help) {
+    ToolkitDialog(HWND owner, UINT title, UINT help)
+        : Base(parentFor(owner)), m_owner(owner ? owner : defaultOwner()), m_help(help) {
         this->setOption(Base::DontUseNativeDialog);
         this->setWindowModality(Qt::ApplicationModal);
         this->setWindowTitle(ownText(title));
@@ -40,6 +41,7 @@ public:
         });
         const int answer = m_loop.run();
         guarded([this] { this->hide(); });
+        activateAgain(m_owner);
         return answer == QDialog::Accepted;
     }
     void done(int result) override {
@@ -61,12 +63,8 @@ protected:
     }
 
 private:
-    static HWND windowFor(HWND owner) {
-        const CWnd* main = AfxGetMainWnd();
-        return owner || !main ? owner : main->m_hWnd;
-    }
     static QWidget* parentFor(HWND owner) {
-        Window* over = Window::from(windowFor(owner));
+        Window* over = Window::from(owner ? owner : defaultOwner());
         return over ? over->topLevel()->widget() : nullptr;
     }
     HWND m_owner;
