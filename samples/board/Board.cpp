@@ -165,14 +165,22 @@ CString CBoardApp::GetAppVersion() {
     return version;
 }
 
+CFrameWnd* CBoardApp::WorkFrame() const {
+    CFrameWnd* floating = AfxGetRoutingFrame();
+    return floating ? floating : static_cast<CFrameWnd*>(m_pMainWnd);
+}
+
+HWND CBoardApp::GetOwnerForFileDialog() {
+    const CFrameWnd* frame = WorkFrame();
+    return frame ? frame->m_hWnd : nullptr;
+}
+
 void CBoardApp::OnToolsKeyboard() {
     m_keyboard->Edit();
 }
 
-// Over the window that the user works in, whose commands they are: a drawing's own, or the main one.
 void CBoardApp::OnToolsCommands() {
-    CFrameWnd* floating = AfxGetRoutingFrame();
-    Gui_CommandPalette::Open(floating ? floating : static_cast<CFrameWnd*>(m_pMainWnd));
+    Gui_CommandPalette::Open(WorkFrame());
 }
 
 BOOL CBoardApp::PreTranslateMessage(MSG* message) {

@@ -37,6 +37,7 @@ public:
     int ExitInstance() override;
     HICON GetAppIcon() override;
     CString GetAppVersion() override;
+    HWND GetOwnerForFileDialog() override;
 
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL OnIdle(LONG count) override;
@@ -63,6 +64,8 @@ private:
     /// Whether this is to be the only board.
     bool m_single = false;
 
+    /// The window that the user works in: that of a floating drawing, or the main one.
+    CFrameWnd* WorkFrame() const;
     BOOL ShowMainFrame(CBoardCommandLine& info);
     BOOL OpenDrawings(CBoardCommandLine& info);
 

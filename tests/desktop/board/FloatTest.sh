@@ -82,6 +82,11 @@ await "Ctrl+N begins a drawing in the main window" titled '^Drawing1 - '
 wmctrl -i -a "$outside"
 await "the drawing's window is active again" active "$outside"
 
+# Dialogs stand over it and leave it active.
+xdotool key --clearmodifiers ctrl+o
+focus '^Open$' key Escape
+await "the drawing's window is active after the dialog" active "$outside"
+
 # The button in its caption: left of three others.
 eval "$(place "$outside")"
 xdotool mousemove $((X + WIDTH - 74)) $((Y + 16)) sleep 0.2 click 1

@@ -138,7 +138,7 @@ TEST_F(FloatTest, WhatAHostThrowsLosesNoView) {
         EXPECT_EQ(frame->IsKindOf(RUNTIME_CLASS(PadWindow)) != FALSE, floats) << where;
         EXPECT_TRUE(frame->IsWindowVisible()) << where;
         EXPECT_EQ(!active(), floats) << where;
-        EXPECT_TRUE(frame->GetActiveView() == &view || frame->GetActiveView() == nullptr) << where;
+        EXPECT_TRUE(frame->GetActiveView() == &view || !frame->GetActiveView()) << where;
         frame->SetActiveView(&view);
     };
     const auto move = [&](const std::string& where, bool floats) {
