@@ -179,6 +179,7 @@ void Gui_FloatHelp::UnripView() {
 }
 
 void Gui_FloatHelp::dockView(CView& view) const {
+    const HWND focus = focusWithin(view); // before the new frame comes up
     CDocument* document = view.GetDocument();
     CDocTemplate* kind = document ? document->GetDocTemplate() : nullptr;
     CFrameWnd* frame = kind ? kind->CreateNewFrame(document, nullptr) : nullptr;
@@ -201,7 +202,6 @@ void Gui_FloatHelp::dockView(CView& view) const {
     if (child) {
         child->PreSetActiveView(&view);
     }
-    const HWND focus = focusWithin(view);
     const HWND former = m_owner->m_hWnd;
     Thrown thrown;
     const HWND fresh = give(view, *m_owner, std::move(owner), thrown);

@@ -4,6 +4,7 @@
 #include "platform/afx/frames/Document.h"
 #include "platform/afx/frames/MdiFrame.h"
 #include "platform/afx/frames/View.h"
+#include "platform/afx/frames/detail/RoutingFrame.h"
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Resource.h"
 
@@ -132,6 +133,10 @@ void CMDIChildWnd::ActivateFrame(int command) {
     }
     ShowWindow(command != -1 ? command : SW_SHOW);
     MDIActivate();
+    // The user works in a frame beside the main window: what he has opened there must not stay behind it.
+    if (isRouted(*frame) && frame->IsWindowVisible()) {
+        frame->SetForegroundWindow();
+    }
 }
 
 void CMDIChildWnd::OnMDIActivate(BOOL activate, CWnd* activated, CWnd*) {

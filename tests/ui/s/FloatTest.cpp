@@ -286,7 +286,7 @@ TEST_F(FloatTest, DialogsAndOpenDocumentsComeUpWhereTheUserWorks) {
     EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
 
     viewOf(window).GetDocument()->SetPathName("/tmp/floating.brd", FALSE);
-    main->SetForegroundWindow();
+    AfxGetApp()->OnFileNew();
     ASSERT_TRUE(QTest::qWaitForWindowActive(widgetOf(*main)));
     AfxGetApp()->OpenDocumentFile("/tmp/floating.brd");
     EXPECT_TRUE(QTest::qWaitForWindowActive(widgetOf(window)));
