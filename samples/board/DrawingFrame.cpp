@@ -23,6 +23,7 @@ int CDrawingWindow::CreateStatusBar() {
 
 void CDrawingWindow::PostLoadFrame(CView*) {
     theApp.GetKeyboard().Apply(*this);
+    DragAcceptFiles();
 }
 
 // The family leaves the help key to its hosts; the board has a page for whatever it is pressed on.
