@@ -435,6 +435,33 @@ TEST_P(StyledFrameThemes, LookLikeTheMinimizeButton) {
     ASSERT_FALSE(normal.isNull());
     EXPECT_NE(normal, pushed);
     EXPECT_EQ(normal.size(), QSize(GetSystemMetrics(SM_CXMENUSIZE), GetSystemMetrics(SM_CYMENUSIZE)));
+    const COLORREF sign = signOf(theme, *frame);
+    for (int x = 3; x < normal.width() - 3; ++x) {
+        for (int y = 3; y < normal.height() - 3; ++y) {
+            ASSERT_NE(normal.pixel(x, y), qRgb(GetRValue(sign), GetGValue(sign), GetBValue(sign))) << x << ", " << y;
+        }
+    }
+}
+
+TEST_P(StyledFrameThemes, AreDrawnWithinAClip) {
+    ThemeLibrary library = ThemeLibrary::load();
+    const ThemeLibrary::Theme theme = library.openThemeData(frame->m_hWnd, "WINDOW");
+    CClientDC screen(frame);
+    CDC dc;
+    dc.CreateCompatibleDC(&screen);
+    CBitmap bitmap;
+    bitmap.CreateCompatibleBitmap(&screen, 20, 20);
+    CBitmap* before = dc.SelectObject(&bitmap);
+    const CRect whole(0, 0, 20, 20);
+    dc.FillSolidRect(whole, RGB(1, 2, 3));
+    const CRect left(0, 0, 10, 20);
+    EXPECT_EQ(library.drawThemeBackground(theme, dc.m_hDC, 15, 1, whole, left), 0);
+    EXPECT_NE(dc.GetPixel(9, 10), RGB(1, 2, 3));
+    EXPECT_EQ(dc.GetPixel(10, 10), RGB(1, 2, 3));
+    dc.SelectObject(before);
+    EXPECT_EQ(library.closeThemeData(theme), 0);
+    EXPECT_NE(library.closeThemeData(theme), 0) << "it is closed";
+    FreeLibrary(library.module);
 }
 
 INSTANTIATE_TEST_SUITE_P(InLightAndDark, StyledFrameThemes,

@@ -56,8 +56,30 @@ TEST(ToolTip, ComesOverItsToolAndGoes) {
     rest(*areas.widget(), Areas::nowhere);
     rest(*areas.widget(), Areas::inLeft);
     EXPECT_TRUE(isTip("left"));
+    QEvent leave(QEvent::Leave);
+    QCoreApplication::sendEvent(areas.widget(), &leave);
+    EXPECT_TRUE(isTip(""));
+    rest(*areas.widget(), Areas::inLeft + QPoint(5, 5));
+    EXPECT_TRUE(isTip("left")) << "it has left the window";
     areas.tips.DestroyWindow();
     EXPECT_TRUE(isTip(""));
+}
+
+TEST(ToolTip, IsQuietInAWindowThatIsNotActive) {
+    Areas areas;
+    CWnd other;
+    other.CreateEx(0, AfxRegisterWndClass(0), "Other", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 450, 20, 100, 100, nullptr,
+                   nullptr);
+    other.SetActiveWindow();
+    ASSERT_TRUE(waitForActive(other));
+    rest(*areas.widget(), Areas::inLeft);
+    EXPECT_TRUE(isTip(""));
+    areas.tips.DestroyWindow();
+    areas.tips.Create(&areas, TTS_ALWAYSTIP);
+    areas.tips.AddTool(&areas, "right", &areas.right, 2);
+    rest(*areas.widget(), Areas::inRight);
+    EXPECT_TRUE(isTip("right"));
+    other.DestroyWindow();
 }
 
 TEST(ToolTip, FollowsItsTool) {

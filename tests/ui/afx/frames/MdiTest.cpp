@@ -4,6 +4,7 @@
 #include <QMdiArea>
 #include <QMdiSubWindow>
 #include <QMenuBar>
+#include <QProxyStyle>
 
 #include <malloc.h>
 #include <set>
@@ -449,4 +450,8 @@ TEST_F(FrameTest, ButtonsOfChildFramesAreSeenOnADarkDesktop) {
     QApplication::setPalette(before);
     settle();
     EXPECT_GE(onDark, seen()) << "in the menu bar";
+    const QString style = QApplication::style()->name();
+    QApplication::setStyle("Windows");
+    EXPECT_EQ(dynamic_cast<QProxyStyle&>(*corner->style()).baseStyle()->name(), "windows") << "it follows the desktop";
+    QApplication::setStyle(style);
 }

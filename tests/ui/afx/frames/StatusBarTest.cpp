@@ -90,9 +90,11 @@ TEST_F(StatusBars, PanesChangeInPlace) {
     const QImage sunken = wanted(1);
     shape(1, 0, SBPS_STRETCH | SBPS_NOBORDERS, narrow.Width());
     EXPECT_NEAR(place(1).Width(), place(0).Width(), 1) << "they share the room";
-    EXPECT_NE(wanted(1).copy(0, 0, 2, 2), sunken.copy(0, 0, 2, 2));
+    const QImage bare = wanted(1);
+    EXPECT_NE(bare.copy(0, 0, 2, 2), sunken.copy(0, 0, 2, 2));
     shape(1, SBPS_NOBORDERS, SBPS_POPOUT, narrow.Width());
     EXPECT_NE(wanted(1).copy(0, 0, 2, 2), sunken.copy(0, 0, 2, 2));
+    EXPECT_NE(wanted(1).copy(0, 0, 2, 2), bare.copy(0, 0, 2, 2));
     status.SetPaneStyle(1, SBPS_DISABLED);
     EXPECT_EQ(std::pair(told(1), status.GetPaneText(1)), std::pair(std::string(), CString("7 shapes")));
     EXPECT_EQ(panes(), before);
@@ -118,6 +120,8 @@ TEST_F(StatusBars, PanesChangeInPlace) {
     ASSERT_TRUE(status.Create(frame));
     look();
     EXPECT_EQ(std::pair(panes().size(), told(0)), std::pair(qsizetype{2}, std::string("Drawing")));
+    status.SetIndicators(fewer + 1, 1);
+    EXPECT_EQ(status.GetPaneStyle(0), UINT{SBPS_NOBORDERS}) << "a first pane with a text keeps its width";
 }
 
 TEST_F(StatusBars, PanesGiveWayToANarrowFrame) {
