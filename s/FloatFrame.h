@@ -8,6 +8,10 @@
 template <class Base>
 class FloatFrame : public Base {
 public:
+    ~FloatFrame() override {
+        FrameTheme::release();
+    }
+
     /// What the button and the moves are set up with.
     /// @{
     const Gui_FloatHelp& GetFloatHelp() const {
@@ -78,10 +82,6 @@ protected:
         m_help.SetIsRipOut(floats);
         m_help.SetOwner(this);
     }
-    ~FloatFrame() override {
-        FrameTheme::release();
-    }
-
     void prepareTheme() {
         if (FrameTheme* theme = FrameTheme::current()) {
             theme->initialise();

@@ -32,7 +32,7 @@ struct Gui_MainFrameRecord;
 /// base: that is where all of it is kept.
 ///
 /// Frames delete themselves when their window has ended; samples/notes has a whole application around one.
-class GUI_API Gui_FrameWnd : public CFrameWnd {
+class GUI_API Gui_FrameWnd : public CFrameWnd { // NOLINT(cppcoreguidelines-virtual-class-destructor)
     DECLARE_DYNAMIC(Gui_FrameWnd)
 
 public:

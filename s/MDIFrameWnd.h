@@ -21,7 +21,7 @@ struct Gui_MainFrameRecord;
 ///     return 0;
 /// }
 /// @endcode
-class GUI_API Gui_MDIFrameWnd : public CMDIFrameWnd {
+class GUI_API Gui_MDIFrameWnd : public CMDIFrameWnd { // NOLINT(cppcoreguidelines-virtual-class-destructor)
     DECLARE_DYNAMIC(Gui_MDIFrameWnd)
 
 public:
