@@ -13,7 +13,7 @@ using namespace tvx::afx;
 
 namespace tvx::sec {
 
-SheetTabs::SheetTabs(MdiClientWindow& client) : QTabBar(client.area()), m_client(client) {
+SheetTabs::SheetTabs(MdiClientWindow& client) : QTabBar(client.area()), m_client(client.handle()) {
     setShape(QTabBar::RoundedSouth);
     setDocumentMode(true);
     setExpanding(false);
@@ -68,21 +68,27 @@ bool SheetTabs::eventFilter(QObject* watched, QEvent* event) {
     return QTabBar::eventFilter(watched, event);
 }
 
+MdiClientWindow* SheetTabs::client() const {
+    auto* window = dynamic_cast<MdiClientWindow*>(Window::from(m_client));
+    return window && !window->isDestroyed() ? window : nullptr;
+}
+
 void SheetTabs::follow() {
-    if (m_client.isDestroyed()) {
+    MdiClientWindow* window = client();
+    if (!window) {
         return;
     }
-    QList<QMdiSubWindow*> sheets = m_client.area()->subWindowList(QMdiArea::CreationOrder);
+    QList<QMdiSubWindow*> sheets = window->area()->subWindowList(QMdiArea::CreationOrder);
     sheets.removeIf([](const QMdiSubWindow* sheet) { return sheet->isHidden(); });
     const bool outer = std::exchange(m_following, true);
     fill(sheets);
-    const MdiChildWindow* active = m_client.active();
+    const MdiChildWindow* active = window->active();
     const auto current = active ? sheets.indexOf(active->subWindow()) : -1;
     setCurrentIndex(static_cast<int>(current));
     m_following = outer;
     if (isHidden() != sheets.isEmpty()) {
         setVisible(!sheets.isEmpty());
-        m_client.placeFoot();
+        window->placeFoot();
     }
 }
 
@@ -125,8 +131,9 @@ void SheetTabs::choose(int index) {
     if (child->widget()->isMinimized()) {
         child->show(SW_RESTORE);
     }
-    if (auto* still = dynamic_cast<MdiChildWindow*>(Window::from(handle))) {
-        m_client.activate(still);
+    auto* still = dynamic_cast<MdiChildWindow*>(Window::from(handle));
+    if (MdiClientWindow* window = client(); window && still) {
+        window->activate(still);
     }
 }
 

@@ -3,6 +3,8 @@
 /// @file
 /// The row of tabs that names the child frames of a workbook.
 
+#include "platform/win/Handle.h"
+
 #include <QHash>
 #include <QIcon>
 #include <QTabBar>
@@ -34,7 +36,9 @@ private:
     void show(int index, QMdiSubWindow& sheet);
     void choose(int index);
 
-    afx::MdiClientWindow& m_client;
+    afx::MdiClientWindow* client() const;
+
+    HWND m_client; ///< its widgets, this one too, go a little later than the window
     QHash<const QObject*, QIcon> m_icons;
     QTimer m_later; ///< Many changes in a row are followed once.
     bool m_following = false;
