@@ -349,10 +349,11 @@ TEST_F(FloatTest, AMoveAskedForDuringActivationWaits) {
     first.MDIActivate();
     settle();
     EXPECT_EQ(floating(), 1U);
-    PadView::whenActivated = [&] { Gui_ExternFrame::GetAll().front()->GetFloatHelp().UnripView(); };
+    PadView::whenActivated = [&] {
+        Gui_ExternFrame::GetAll().front()->GetFloatHelp().UnripView();
+        EXPECT_EQ(floating(), 1U);
+    };
     main->SetForegroundWindow();
-    settle();
-    Gui_ExternFrame::GetAll().front()->SetForegroundWindow();
     settle();
     EXPECT_EQ(floating(), 0U);
 }
