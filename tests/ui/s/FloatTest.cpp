@@ -2,10 +2,9 @@
 #include "tests/ui/s/FloatTesting.h"
 
 #include "afxdlgs.h"
+#include "s/Profile.h"
 
-#include "platform/win/Registry.h"
-#include "s/FloatPlaces.h"
-#include "tests/ui/afx/frames/SettingsFolder.h"
+#include <QTabBar>
 
 #include <algorithm>
 
@@ -59,6 +58,7 @@ TEST_F(FloatTest, AViewMovesWithAllThatItHolds) {
 
     journal().clear();
     const HWND outside = window.m_hWnd;
+    window.SetRipResourceId(IDR_TESTBOARD); // of the window's own, so that it is seen to travel
     window.GetFloatHelp().UnripView();
     settle();
     PadFrame& docked = *active();
@@ -66,7 +66,7 @@ TEST_F(FloatTest, AViewMovesWithAllThatItHolds) {
     EXPECT_FALSE(::IsWindow(outside));
     EXPECT_EQ(docked.GetActiveView(), &view);
     EXPECT_EQ(docked.GetIcon(FALSE), icon);
-    EXPECT_EQ(docked.GetRipResourceId(), static_cast<unsigned>(IDR_TESTMAIN));
+    EXPECT_EQ(docked.GetRipResourceId(), static_cast<unsigned>(IDR_TESTBOARD));
     EXPECT_EQ(CWnd::GetFocus(), &view.edit);
     view.edit.GetSel(from, to);
     EXPECT_EQ(to, 8);
@@ -314,6 +314,32 @@ TEST_F(FloatTest, TheWindowMenuListsAllViews) {
     EXPECT_EQ(floating(), 0U);
 }
 
+TEST_F(FloatTest, TabsNameTheChildFrames) {
+    auto* tabs = widgetOf(*main)->findChild<QTabBar*>();
+    ASSERT_NE(tabs, nullptr);
+    EXPECT_FALSE(tabs->isVisible());
+    PadFrame& first = open();
+    const std::string other = titleOf(open());
+    first.SetWindowText("R&D");
+    settle();
+    ASSERT_EQ(tabs->count(), 2);
+    EXPECT_EQ(tabs->tabText(0), "R&&D");
+    EXPECT_EQ(tabs->currentIndex(), 1);
+    EXPECT_TRUE(tabs->isVisible());
+    const auto icon = [&] { return tabs->tabIcon(0).pixmap(16).toImage(); };
+    const QImage own = icon();
+    main->SetSheetIcon(&first, ::LoadIcon(nullptr, MAKEINTRESOURCE(32515)));
+    EXPECT_NE(icon(), own);
+    main->SetSheetIcon(&first, nullptr);
+    EXPECT_EQ(icon(), own);
+    QTest::mouseClick(tabs, Qt::LeftButton, Qt::NoModifier, tabs->tabRect(0).center());
+    settle();
+    EXPECT_EQ(active(), &first);
+    floated(first);
+    ASSERT_EQ(tabs->count(), 1);
+    EXPECT_EQ(tabs->tabText(0).toStdString(), other);
+}
+
 TEST_F(FloatTest, ClosingAsksTheDocumentAndLeavesNothingBehind) {
     PadWindow& window = floated(open());
     viewOf(window).GetDocument()->SetModifiedFlag();
@@ -372,6 +398,12 @@ TEST_F(FloatTest, WindowsComeUpWhereTheLastOneStood) {
     third.GetWindowRect(&beside);
     EXPECT_EQ(beside.Size(), place.Size());
     EXPECT_NE(beside.TopLeft(), place.TopLeft());
+    main->DestroyWindow();
+    CString entry;
+    entry.Format("FloatPlacement%d", IDR_TESTMAIN);
+    WINDOWPLACEMENT kept{};
+    ASSERT_TRUE(Gui_Profile::ReadWindowPlacement(kept, entry, nullptr)) << "over restarts, too";
+    EXPECT_EQ(CRect(kept.rcNormalPosition).Size(), place.Size());
 }
 
 TEST_F(FloatTest, ViewsMoveAndDocumentsCloseUnderADialogAndFromTheirWindow) {
