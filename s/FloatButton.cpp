@@ -73,7 +73,7 @@ void Gui_FloatHelp::drawButton(bool floats) {
     CRect box(place);
     box.DeflateRect(2, 2);
     COLORREF color = ::GetSysColor(text);
-    const FrameTheme* theme = FrameTheme::isSwitchedOn() ? FrameTheme::current() : nullptr;
+    const Gui_FrameTheme* theme = Gui_FrameTheme::isSwitchedOn() ? Gui_FrameTheme::current() : nullptr;
     if (theme && theme->drawButton(*m_owner, dc, place.TopLeft(), m_isPushed)) {
         box.right += 2;
         box.bottom += 2;

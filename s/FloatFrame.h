@@ -9,7 +9,7 @@ template <class Base>
 class FloatFrame : public Base {
 public:
     ~FloatFrame() override {
-        FrameTheme::release();
+        Gui_FrameTheme::release();
     }
 
     /// What the button and the moves are set up with.
@@ -78,12 +78,12 @@ public:
 protected:
     /// @param floats true: the button floats the view; false: it docks it back
     explicit FloatFrame(bool floats) : m_floats(floats) {
-        FrameTheme::acquire();
+        Gui_FrameTheme::acquire();
         m_help.SetIsRipOut(floats);
         m_help.SetOwner(this);
     }
     void prepareTheme() {
-        if (FrameTheme* theme = FrameTheme::current()) {
+        if (Gui_FrameTheme* theme = Gui_FrameTheme::current()) {
             theme->initialise();
         }
     }

@@ -130,8 +130,8 @@ CRect classicPlace(const CRect& window, bool inMenuBar) {
 } // namespace
 
 void Gui_FloatHelp::GetButtonRect(CRect& rect, bool onScreen) {
-    const FrameTheme* theme = FrameTheme::current();
-    if (theme && FrameTheme::isSwitchedOn() && AfxGetMainWnd()) {
+    const Gui_FrameTheme* theme = Gui_FrameTheme::current();
+    if (theme && Gui_FrameTheme::isSwitchedOn() && AfxGetMainWnd()) {
         rect = theme->buttonPlace(*m_owner, onScreen);
         // Without a minimise button in the main window, the style has measured nothing.
         if (!rect.IsRectEmpty()) {

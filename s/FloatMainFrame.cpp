@@ -81,7 +81,7 @@ void Gui_FloatMainFrame::OnInitMenu(CMenu* menu) {
 
 LRESULT Gui_FloatMainFrame::OnThemeChanged() {
     const LRESULT answer = SECWorkbook::OnThemeChanged();
-    if (FrameTheme* theme = FrameTheme::current()) {
+    if (Gui_FrameTheme* theme = Gui_FrameTheme::current()) {
         theme->changed(*this);
     }
     return answer;

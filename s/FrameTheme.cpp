@@ -20,7 +20,7 @@ constexpr int inactive = 5;
 constexpr std::array colorIndexes{2, 9, 3, 19, 15, 18, 15, 18};
 
 bool switchedOn = true;
-FrameTheme* shared = nullptr;
+Gui_FrameTheme* shared = nullptr;
 
 template <class Function>
 void find(HMODULE module, LPCSTR name, Function& function) {
@@ -54,38 +54,38 @@ void ThemeLibrary::unload() {
 
 // --- the process's own ---
 
-FrameTheme::FrameTheme(std::function<ThemeLibrary()> load) : m_load(std::move(load)) {}
+Gui_FrameTheme::Gui_FrameTheme(std::function<ThemeLibrary()> load) : m_load(std::move(load)) {}
 
-FrameTheme::~FrameTheme() {
+Gui_FrameTheme::~Gui_FrameTheme() {
     close();
     m_library.unload();
 }
 
-void FrameTheme::acquire() {
+void Gui_FrameTheme::acquire() {
     if (!shared) {
-        shared = new FrameTheme;
+        shared = new Gui_FrameTheme;
     }
     ++shared->m_references;
 }
 
-void FrameTheme::release() {
+void Gui_FrameTheme::release() {
     if (shared && --shared->m_references == 0) {
         delete std::exchange(shared, nullptr);
         switchedOn = false;
     }
 }
 
-FrameTheme* FrameTheme::current() {
+Gui_FrameTheme* Gui_FrameTheme::current() {
     return shared;
 }
 
-bool FrameTheme::isSwitchedOn() {
+bool Gui_FrameTheme::isSwitchedOn() {
     return switchedOn;
 }
 
 // --- preparing ---
 
-void FrameTheme::initialise() {
+void Gui_FrameTheme::initialise() {
     const char* wish = std::getenv("TVX_GUI_USETHEMES");
     if (wish && *wish == '0') {
         switchedOn = false;
@@ -103,7 +103,7 @@ void FrameTheme::initialise() {
 }
 
 /// False when there is none, or none that is in use, which turns the visual style off.
-bool FrameTheme::loadLibrary() {
+bool Gui_FrameTheme::loadLibrary() {
     if (m_library.module) {
         return true;
     }
@@ -114,7 +114,7 @@ bool FrameTheme::loadLibrary() {
     return used;
 }
 
-void FrameTheme::open(CWnd& window) {
+void Gui_FrameTheme::open(CWnd& window) {
     m_theme = m_library.openThemeData ? m_library.openThemeData(window.m_hWnd, "WINDOW") : nullptr;
     for (std::size_t i = 0; i < m_colors.size(); ++i) {
         m_colors[i] = color(colorIndexes[i]);
@@ -123,7 +123,7 @@ void FrameTheme::open(CWnd& window) {
     measureMenuBar();
 }
 
-void FrameTheme::close() {
+void Gui_FrameTheme::close() {
     if (m_theme && m_library.closeThemeData) {
         m_library.closeThemeData(m_theme);
     }
@@ -131,22 +131,22 @@ void FrameTheme::close() {
     m_pictures = {};
 }
 
-void FrameTheme::changed(CFrameWnd& frame) {
+void Gui_FrameTheme::changed(CFrameWnd& frame) {
     close();
     initialise();
     frame.PostMessage(WM_NCPAINT, 1);
 }
 
-COLORREF FrameTheme::color(int index) const {
+COLORREF Gui_FrameTheme::color(int index) const {
     return m_theme && m_library.getThemeSysColor ? m_library.getThemeSysColor(m_theme, index) : ::GetSysColor(index);
 }
 
-int FrameTheme::size(int index) const {
+int Gui_FrameTheme::size(int index) const {
     return m_theme && m_library.getThemeSysSize ? m_library.getThemeSysSize(m_theme, index) : ::GetSystemMetrics(index);
 }
 
 /// Asks the main window from its right edge leftwards for its minimise button, beside which the button goes.
-void FrameTheme::measureCaption(const CWnd& window) {
+void Gui_FrameTheme::measureCaption(const CWnd& window) {
     m_caption = Place();
     CRect frame;
     window.GetWindowRect(&frame);
@@ -171,7 +171,7 @@ void FrameTheme::measureCaption(const CWnd& window) {
     m_caption = {left - width - frame.right - 1, (height - width) / 2 + edge, width, width};
 }
 
-void FrameTheme::measureMenuBar() {
+void Gui_FrameTheme::measureMenuBar() {
     const int width = size(SM_CXMENUSIZE);
     m_menuBar = {-4 * width - ::GetSystemMetrics(SM_CXFRAME),
                  ::GetSystemMetrics(SM_CYFRAME) + ::GetSystemMetrics(SM_CYCAPTION), width, size(SM_CYMENUSIZE)};
@@ -180,7 +180,7 @@ void FrameTheme::measureMenuBar() {
 // --- pictures ---
 
 /// How one of the six pictures is made.
-struct FrameTheme::Picture {
+struct Gui_FrameTheme::Picture {
     int part;
     int state;
     Color background;
@@ -189,11 +189,11 @@ struct FrameTheme::Picture {
     bool searchesSign; ///< whether its place is; else it is where it was in the picture before
 };
 
-bool FrameTheme::hasPictures() const {
+bool Gui_FrameTheme::hasPictures() const {
     return m_pictures[0] != nullptr;
 }
 
-void FrameTheme::renderAll(CWnd& window) {
+void Gui_FrameTheme::renderAll(CWnd& window) {
     static constexpr std::array pictures{Picture{minimizeButton, normal, ActiveCaption, ActiveSign, false, true},
                                          Picture{minimizeButton, inactive, InactiveCaption, InactiveSign, false, false},
                                          Picture{minimizeButton, pushed, ActiveCaption, ActiveSign, false, false},
@@ -251,7 +251,7 @@ void eraseSign(CDC& dc, const CRect& place) {
 
 } // namespace
 
-std::unique_ptr<Gui_Bitmap> FrameTheme::render(CWnd& window, const Picture& picture, CRect& sign) {
+std::unique_ptr<Gui_Bitmap> Gui_FrameTheme::render(CWnd& window, const Picture& picture, CRect& sign) {
     if (!m_theme || !m_library.drawThemeBackground) {
         return nullptr;
     }
@@ -292,13 +292,13 @@ bool isActive(const CFrameWnd& frame) {
 
 } // namespace
 
-bool FrameTheme::isInMenuBar(const CFrameWnd& frame) {
+bool Gui_FrameTheme::isInMenuBar(const CFrameWnd& frame) {
     const auto* main = DYNAMIC_DOWNCAST(CMDIFrameWnd, AfxGetMainWnd());
     BOOL maximized = FALSE;
     return main && main == &frame && main->MDIGetActive(&maximized) && maximized;
 }
 
-CRect FrameTheme::buttonPlace(const CFrameWnd& frame, bool onScreen) const {
+CRect Gui_FrameTheme::buttonPlace(const CFrameWnd& frame, bool onScreen) const {
     const Place& place = isInMenuBar(frame) ? m_menuBar : m_caption;
     CRect window;
     frame.GetWindowRect(&window);
@@ -306,13 +306,13 @@ CRect FrameTheme::buttonPlace(const CFrameWnd& frame, bool onScreen) const {
     return {onScreen ? at + window.TopLeft() : at, CSize(place.width, place.height)};
 }
 
-bool FrameTheme::drawButton(const CFrameWnd& frame, CDC& dc, CPoint at, bool pushed) const {
+bool Gui_FrameTheme::drawButton(const CFrameWnd& frame, CDC& dc, CPoint at, bool pushed) const {
     const std::size_t first = isInMenuBar(frame) ? 3 : 0;
     const auto& picture = m_pictures[first + (!isActive(frame) ? 1 : pushed ? 2 : 0)];
     return picture && picture->Draw(&dc, at, SRCCOPY) != 0;
 }
 
-bool FrameTheme::signColor(const CFrameWnd& frame, COLORREF& color) const {
+bool Gui_FrameTheme::signColor(const CFrameWnd& frame, COLORREF& color) const {
     if (!switchedOn || !hasPictures()) {
         return false;
     }

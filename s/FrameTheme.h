@@ -37,21 +37,21 @@ struct ThemeLibrary {
 /// its functions, the style, a minimise button) ends in no pictures: frames then draw a button of their own.
 ///
 /// Used on the thread of the user interface only.
-class GUI_API FrameTheme {
+class GUI_API Gui_FrameTheme {
 public:
     /// Frames share the one of `acquire`.
     /// @param load gives the visual-styles library when it is needed first; tests have others
-    explicit FrameTheme(std::function<ThemeLibrary()> load = &ThemeLibrary::load);
-    ~FrameTheme();
-    FrameTheme(const FrameTheme&) = delete;
-    FrameTheme& operator=(const FrameTheme&) = delete;
+    explicit Gui_FrameTheme(std::function<ThemeLibrary()> load = &ThemeLibrary::load);
+    ~Gui_FrameTheme();
+    Gui_FrameTheme(const Gui_FrameTheme&) = delete;
+    Gui_FrameTheme& operator=(const Gui_FrameTheme&) = delete;
 
     /// Adds a user of the process's own and makes it for the first one.
     static void acquire();
     /// Takes one away. The last one turns the visual style off for the rest of the process.
     static void release();
     /// The process's own; null when nobody uses it.
-    static FrameTheme* current();
+    static Gui_FrameTheme* current();
     /// Whether the visual style is used: on at first, and once it is off, off for good.
     static bool isSwitchedOn();
 

@@ -126,7 +126,7 @@ protected:
         frame->last = right;
     }
     /// The button as it is drawn; null where it is not.
-    static QImage picture(const FrameTheme& theme, const CFrameWnd& frame, bool pushed = false) {
+    static QImage picture(const Gui_FrameTheme& theme, const CFrameWnd& frame, bool pushed = false) {
         const CSize size = theme.buttonPlace(frame, false).Size();
         CClientDC screen(testApplication.m_pMainWnd);
         CDC dc;
@@ -146,7 +146,7 @@ bool staysOn(const std::function<void()>& act) {
     const pid_t process = fork();
     if (process == 0) {
         act();
-        _exit(FrameTheme::isSwitchedOn() ? 1 : 0);
+        _exit(Gui_FrameTheme::isSwitchedOn() ? 1 : 0);
     }
     int status = 0;
     waitpid(process, &status, 0);
@@ -154,7 +154,7 @@ bool staysOn(const std::function<void()>& act) {
     return WEXITSTATUS(status) == 1;
 }
 
-COLORREF signOf(const FrameTheme& theme, const CFrameWnd& frame) {
+COLORREF signOf(const Gui_FrameTheme& theme, const CFrameWnd& frame) {
     COLORREF color = 0;
     EXPECT_TRUE(theme.signColor(frame, color));
     return color;
@@ -170,7 +170,7 @@ TEST_F(FrameThemes, PlaceTheButtonBesideTheMinimizeButton) {
           std::tuple(509, 509, CRect(498, 15 + border, 498, 15 + border)),
           std::tuple(10, 12, CRect(-3, 14 + border, -1, 16 + border)), std::tuple(600, 620, CRect(500, 0, 500, 0))}) {
         putMinimizeButton(left, right);
-        FrameTheme theme(&fake);
+        Gui_FrameTheme theme(&fake);
         theme.initialise();
         EXPECT_EQ(theme.buttonPlace(*frame, false), place) << left;
         EXPECT_EQ(theme.buttonPlace(*frame, true), place + CPoint(10, 20)) << left;
@@ -182,7 +182,7 @@ TEST_F(FrameThemes, PlaceTheButtonBesideTheMinimizeButton) {
 
 TEST_F(FrameThemes, PlaceTheButtonOfAFilledMainFrameInItsMenuBar) {
     putMinimizeButton(400, 420);
-    FrameTheme theme(&fake);
+    Gui_FrameTheme theme(&fake);
     theme.initialise();
     const CRect inCaption = theme.buttonPlace(*frame, false);
     frame->MDIMaximize(child);
@@ -197,7 +197,7 @@ TEST_F(FrameThemes, PlaceTheButtonOfAFilledMainFrameInItsMenuBar) {
 // Main frames are measured as they come up, and what was measured holds for frames in other states.
 TEST_F(FrameThemes, MeasureAMaximisedFrameAsAnyOther) {
     const auto measured = [this] {
-        FrameTheme theme(&fake);
+        Gui_FrameTheme theme(&fake);
         theme.initialise();
         CRect window;
         frame->GetWindowRect(&window);
@@ -214,7 +214,7 @@ TEST_F(FrameThemes, MeasureAMaximisedFrameAsAnyOther) {
 
 TEST_F(FrameThemes, MakeSixPicturesAndAgainForANewStyle) {
     putMinimizeButton(400, 420);
-    FrameTheme theme(&fake);
+    Gui_FrameTheme theme(&fake);
     theme.initialise();
     const std::vector<Call> expected{{15, 1, 20, 20, ofTheme(2)},  {15, 5, 20, 20, ofTheme(3)},
                                      {15, 3, 20, 20, ofTheme(2)},  {16, 1, 54, 55, ofTheme(15)},
@@ -253,7 +253,7 @@ TEST_F(FrameThemes, TakeTheSignOutOfPictures) {
             dc.SetPixel(at, sign);
         }
     };
-    FrameTheme theme(&fake);
+    Gui_FrameTheme theme(&fake);
     theme.initialise();
     const QImage picture = FrameThemes::picture(theme, *frame);
     const auto at = [&](int x, int y) {
@@ -279,7 +279,7 @@ TEST_F(FrameThemes, TakeTheSignOutOfPictures) {
 TEST_F(FrameThemes, DoWithoutWhatTheLibraryLacks) {
     putMinimizeButton(400, 420);
     const auto without = [&](const std::function<void(ThemeLibrary&)>& take) {
-        auto theme = std::make_unique<FrameTheme>([&] {
+        auto theme = std::make_unique<Gui_FrameTheme>([&] {
             ThemeLibrary library = fake();
             take(library);
             return library;
@@ -307,7 +307,7 @@ TEST_F(FrameThemes, DoWithoutWhatTheLibraryLacks) {
     EXPECT_EQ(sizeless->buttonPlace(*frame, false).top, (GetSystemMetrics(31) - 20) / 2 + GetSystemMetrics(33));
     putMinimizeButton(600, 600);
     EXPECT_TRUE(picture(*without([](ThemeLibrary&) {}), *frame).isNull());
-    EXPECT_TRUE(FrameTheme::isSwitchedOn());
+    EXPECT_TRUE(Gui_FrameTheme::isSwitchedOn());
 }
 
 TEST_F(FrameThemes, AreToldOfEachChangeOnce) {
@@ -341,11 +341,11 @@ TEST_F(FrameThemes, AreTurnedOffForGood) {
     SavedEnvironment environment;
     for (const char* wish : {"0", "0x", "01"}) {
         setenv("TVX_GUI_USETHEMES", wish, 1);
-        EXPECT_FALSE(staysOn([] { FrameTheme(&fake).initialise(); })) << wish;
+        EXPECT_FALSE(staysOn([] { Gui_FrameTheme(&fake).initialise(); })) << wish;
     }
     for (const char* wish : {"", "1", "no", " 0"}) {
         setenv("TVX_GUI_USETHEMES", wish, 1);
-        EXPECT_TRUE(staysOn([] { FrameTheme(&fake).initialise(); })) << wish;
+        EXPECT_TRUE(staysOn([] { Gui_FrameTheme(&fake).initialise(); })) << wish;
     }
     const std::function<void(ThemeLibrary&)> faults[] = {
         [](ThemeLibrary& library) { library = {}; }, [](ThemeLibrary& library) { library.isThemeActive = nullptr; },
@@ -354,23 +354,23 @@ TEST_F(FrameThemes, AreTurnedOffForGood) {
         [](ThemeLibrary& library) { library.isAppThemed = [] { return FALSE; }; }};
     for (const auto& fault : faults) {
         EXPECT_FALSE(staysOn([&] {
-            FrameTheme theme([&] {
+            Gui_FrameTheme theme([&] {
                 ThemeLibrary library = fake();
                 fault(library);
                 return library;
             });
             theme.initialise();
-            FrameTheme(&fake).initialise();
+            Gui_FrameTheme(&fake).initialise();
         }));
     }
     EXPECT_FALSE(staysOn([] {
-        FrameTheme::acquire();
-        FrameTheme::acquire();
-        FrameTheme::release();
-        if (FrameTheme::current() && FrameTheme::isSwitchedOn()) {
-            FrameTheme::release();
+        Gui_FrameTheme::acquire();
+        Gui_FrameTheme::acquire();
+        Gui_FrameTheme::release();
+        if (Gui_FrameTheme::current() && Gui_FrameTheme::isSwitchedOn()) {
+            Gui_FrameTheme::release();
         }
-        FrameTheme::acquire();
+        Gui_FrameTheme::acquire();
     }));
 }
 
@@ -399,9 +399,9 @@ private:
 
 // It is the minimise button, less the sign: as large, in the same row, with the same gap beside it.
 TEST_P(StyledFrameThemes, LookLikeTheMinimizeButton) {
-    FrameTheme theme;
+    Gui_FrameTheme theme;
     theme.initialise();
-    EXPECT_TRUE(FrameTheme::isSwitchedOn());
+    EXPECT_TRUE(Gui_FrameTheme::isSwitchedOn());
     const CRect place = theme.buttonPlace(*frame, false);
     QWidget& widget = *frame->GetState()->widget();
     const auto test = [&](int x) {
