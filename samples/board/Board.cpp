@@ -1,6 +1,9 @@
 #include "Board.h"
 
+#include "../family/FamilyOptions.h"
+#include "../family/FamilyResource.h"
 #include "BoardDoc.h"
+#include "BoardPages.h"
 #include "BoardView.h"
 #include "DrawingFrame.h"
 #include "MainFrame.h"
@@ -16,6 +19,7 @@
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
+#include <utility>
 
 // --- the command line ---
 
@@ -61,6 +65,7 @@ BEGIN_MESSAGE_MAP(CBoardApp, Gui_WinApp)
     ON_COMMAND(ID_FILE_OPEN, &CWinApp::OnFileOpen)
     ON_COMMAND(ID_TOOLS_KEYBOARD, &CBoardApp::OnToolsKeyboard)
     ON_COMMAND(ID_TOOLS_COMMANDS, &CBoardApp::OnToolsCommands)
+    ON_COMMAND(ID_TOOLS_PREFERENCES, &CBoardApp::OnToolsPreferences)
 END_MESSAGE_MAP()
 // clang-format on
 
@@ -77,7 +82,8 @@ BOOL CBoardApp::InitInstance() {
     if (!ProcessCommandLine(info)) {
         return FALSE;
     }
-    m_grid = info.m_grid;
+    m_options = Options::Read();
+    m_options.gridDistance = info.m_grid.value_or(m_options.gridDistance);
     if (info.m_single) {
         if (!IsFirstInstance()) {
             ShowFirstInstanceWindow();
@@ -146,12 +152,16 @@ BOOL CBoardApp::OpenDrawings(CBoardCommandLine& info) {
     return opened;
 }
 
-void CBoardApp::SetGrid(int distance) {
-    m_grid = distance;
+void CBoardApp::SetOptions(const Options& options) {
+    const Options before = std::exchange(m_options, options);
+    m_console.SetOptions(options);
     POSITION first = GetFirstDocTemplatePosition();
     CDocTemplate* const drawings = GetNextDocTemplate(first);
     for (POSITION at = drawings->GetFirstDocPosition(); at;) {
-        drawings->GetNextDoc(at)->UpdateAllViews(nullptr);
+        CDocument* const drawing = drawings->GetNextDoc(at);
+        for (POSITION view = drawing->GetFirstViewPosition(); view;) {
+            static_cast<CBoardView*>(drawing->GetNextView(view))->OptionsChanged(before);
+        }
     }
 }
 
@@ -173,6 +183,17 @@ CFrameWnd* CBoardApp::WorkFrame() const {
 HWND CBoardApp::GetOwnerForFileDialog() {
     const CFrameWnd* frame = WorkFrame();
     return frame ? frame->m_hWnd : nullptr;
+}
+
+// A document with a folder of its own goes before the folder that the user has chosen.
+CString CBoardApp::GetInitialDirForFileDialog(const CString& fileName) {
+    const CString folder = FamilyOptions::Read().documentFolder;
+    const bool counts = !folder.IsEmpty() && !Gui_FileName(fileName).HasAbsolutePath();
+    return counts ? folder : Gui_WinApp::GetInitialDirForFileDialog(fileName);
+}
+
+void CBoardApp::OnToolsPreferences() {
+    CBoardPreferences(WorkFrame()).DoModal();
 }
 
 void CBoardApp::OnToolsKeyboard() {

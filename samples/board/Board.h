@@ -2,12 +2,14 @@
 
 #include "CommandConsole.h"
 #include "Keyboard.h"
+#include "Options.h"
 #include "s/CommandLineInfo.h"
 #include "s/MessageManager.h"
 #include "s/SplashDlg.h"
 #include "s/WinApp.h"
 
 #include <memory>
+#include <optional>
 #include <vector>
 
 /// The command line of the board: the switches of the family, the grid, one instance only, and any number of drawings.
@@ -17,8 +19,8 @@ public:
     CString GetCmdOpcodes() const override;
     CString GetUsageText() const override;
 
-    /// Distance of the grid points in pixels; 0 for none.
-    int m_grid = 10;
+    /// Distance of the grid points in pixels, for this run; 0 for none.
+    std::optional<int> m_grid;
     /// Whether a board that runs already is to be shown instead of this one.
     bool m_single = false;
     /// The drawings to open, as they were named.
@@ -38,17 +40,17 @@ public:
     HICON GetAppIcon() override;
     CString GetAppVersion() override;
     HWND GetOwnerForFileDialog() override;
+    CString GetInitialDirForFileDialog(const CString& fileName) override;
 
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL OnIdle(LONG count) override;
 
-    /// Distance of the grid points in pixels; 0 for none.
-    int GetGrid() const {
-        return m_grid;
+    const Options& GetOptions() const {
+        return m_options;
     }
-    /// Sets it, and draws all drawings anew.
-    void SetGrid(int distance);
-    const CKeyboard& GetKeyboard() const {
+    /// Puts options in force in all drawings and the console, for this run.
+    void SetOptions(const Options& options);
+    CKeyboard& GetKeyboard() {
         return *m_keyboard;
     }
     CCommandConsole& GetConsole() {
@@ -59,6 +61,7 @@ public:
 
     afx_msg void OnToolsKeyboard();
     afx_msg void OnToolsCommands();
+    afx_msg void OnToolsPreferences();
 
 private:
     /// Whether this is to be the only board.
@@ -69,7 +72,7 @@ private:
     BOOL ShowMainFrame(CBoardCommandLine& info);
     BOOL OpenDrawings(CBoardCommandLine& info);
 
-    int m_grid = 10;
+    Options m_options;
     CCommandConsole m_console;
     /// Shows errors in message boxes, those of handlers that have failed among them.
     Gui_MessageManager m_messages;

@@ -43,6 +43,7 @@ IMPLEMENT_DYNCREATE(CBoardView, CScrollView)
 
 // clang-format off
 BEGIN_MESSAGE_MAP(CBoardView, CScrollView)
+    ON_WM_ERASEBKGND()
     ON_WM_LBUTTONDOWN()
     ON_WM_MOUSEMOVE()
     ON_WM_LBUTTONUP()
@@ -88,6 +89,7 @@ void CBoardView::OnActivateView(BOOL activate, CView* activated, CView* deactiva
 }
 
 void CBoardView::OnInitialUpdate() {
+    TakeColors();
     ShowScrollArea(); // before the base class, which draws
     CScrollView::OnInitialUpdate();
 }
@@ -108,6 +110,28 @@ void CBoardView::OnUpdate(CView*, LPARAM hint, CObject*) {
         }
     }
     InvalidateMarked();
+}
+
+// What was chosen for a new shape stays, unless another choice for all drawings was made.
+void CBoardView::OptionsChanged(const Options& before) {
+    const Options& now = theApp.GetOptions();
+    if (now.outline != before.outline || now.filled != before.filled || now.fill != before.fill) {
+        TakeColors();
+    }
+    Invalidate();
+}
+
+void CBoardView::TakeColors() {
+    const Options& options = theApp.GetOptions();
+    m_color = FromColorRef(options.outline);
+    m_fill = options.filled ? FromColorRef(options.fill) : noColor;
+}
+
+BOOL CBoardView::OnEraseBkgnd(CDC* dc) {
+    CRect area;
+    GetClientRect(area);
+    dc->FillSolidRect(area, theApp.GetOptions().paper);
+    return TRUE;
 }
 
 /// The shape that has handles: the draft, else the selected one.
@@ -144,11 +168,11 @@ void CBoardView::OnDraw(CDC* dc) {
         const bool drafted = m_draft && !m_draftIsNew && i == m_selected;
         const Shape& shape = drafted ? *m_draft : shapes[i];
         if (CRect().IntersectRect(clip, ReachOf(shape))) {
-            DrawShape(*dc, shape);
+            DrawShape(*dc, shape, theApp.GetOptions().textFont);
         }
     }
     if (m_draft && m_draftIsNew) {
-        DrawShape(*dc, *m_draft);
+        DrawShape(*dc, *m_draft, theApp.GetOptions().textFont);
     }
     const Shape* marked = Marked();
     m_markedArea = marked ? ReachOf(*marked) : CRect();
@@ -158,15 +182,16 @@ void CBoardView::OnDraw(CDC* dc) {
 }
 
 void CBoardView::DrawGrid(CDC& dc) const {
-    const int step = theApp.GetGrid();
-    if (step < 4) { // closer points would be a grey area
+    const Options& options = theApp.GetOptions();
+    const int step = options.gridDistance;
+    if (!options.gridShown || step < 4) { // closer points would be a grey area
         return;
     }
     CRect area;
     dc.GetClipBox(area);
     for (int y = area.top - area.top % step; y < area.bottom; y += step) {
         for (int x = area.left - area.left % step; x < area.right; x += step) {
-            dc.SetPixelV(x, y, RGB(200, 205, 210));
+            dc.SetPixelV(x, y, options.gridColor);
         }
     }
 }
@@ -177,9 +202,9 @@ void CBoardView::DrawHandles(CDC& dc, const Shape& shape) const {
         if (hasHandle(shape, i)) {
             CRect handle(CPoint(corners[i].x, corners[i].y), CSize(1, 1));
             handle.InflateRect(handleReach, handleReach);
-            dc.FillSolidRect(handle, RGB(32, 64, 128));
+            dc.FillSolidRect(handle, theApp.GetOptions().handles);
             handle.DeflateRect(1, 1);
-            dc.FillSolidRect(handle, RGB(255, 255, 255));
+            dc.FillSolidRect(handle, theApp.GetOptions().paper);
         }
     }
 }
@@ -190,7 +215,8 @@ Point CBoardView::ToDrawing(CPoint point) const {
 }
 
 Point CBoardView::Snapped(Point point) const {
-    const int step = std::max(theApp.GetGrid(), 1);
+    const Options& options = theApp.GetOptions();
+    const int step = options.snap ? std::max(options.gridDistance, 1) : 1;
     const auto snap = [step](int value) { return (value + (value < 0 ? -step : step) / 2) / step * step; };
     return {snap(point.x), snap(point.y)};
 }
@@ -253,7 +279,8 @@ void CBoardView::StartDrawing(Point point) {
     shape.from = shape.to = point;
     shape.color = m_color;
     shape.fill = shape.kind == ShapeKind::Line ? noColor : m_fill;
-    shape.width = shape.kind == ShapeKind::Text ? 1 : 2;
+    shape.width = shape.kind == ShapeKind::Text ? 1 : theApp.GetOptions().lineWidth;
+    shape.size = theApp.GetOptions().textSize;
     StartDrag(Drag::Resize, 2, point);
     m_draft = std::move(shape);
     m_draftIsNew = true;

@@ -2,6 +2,7 @@
 
 #include "BoardDoc.h"
 #include "Drawing.h"
+#include "Options.h"
 #include "afxwin.h"
 
 #include <optional>
@@ -26,8 +27,11 @@ public:
     void OnInitialUpdate() override;
     void OnUpdate(CView* sender, LPARAM hint, CObject* object) override;
     BOOL PreCreateWindow(CREATESTRUCT& cs) override;
+    /// Follows options that have come into force.
+    void OptionsChanged(const Options& before);
     void OnActivateView(BOOL activate, CView* activated, CView* deactivated) override;
 
+    afx_msg BOOL OnEraseBkgnd(CDC* dc);
     afx_msg void OnLButtonDown(UINT flags, CPoint point);
     afx_msg void OnMouseMove(UINT flags, CPoint point);
     afx_msg void OnLButtonUp(UINT flags, CPoint point);
@@ -62,6 +66,7 @@ private:
     int HandleAt(board::Point point) const;
     board::Point ToDrawing(CPoint point) const;
     board::Point Snapped(board::Point point) const;
+    void TakeColors();
 
     void StartDrawing(board::Point point);
     void StartSelecting(board::Point point);

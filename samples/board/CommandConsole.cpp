@@ -90,8 +90,12 @@ CCommandConsole::CCommandConsole() : m_console(OnCommand, 0) {
 
 void CCommandConsole::Init() {
     m_console.Init();
-    m_console.SetShowCommandStatusFlag(1);
-    m_console.SetKeepRecallFlag(theApp.GetProfileInt("Settings", "KeepCommands", 1));
+    SetOptions(theApp.GetOptions());
+}
+
+void CCommandConsole::SetOptions(const Options& options) {
+    m_console.SetShowCommandStatusFlag(options.showStatus);
+    m_console.SetKeepRecallFlag(options.keepCommands);
 }
 
 void CCommandConsole::Open() {
@@ -321,7 +325,9 @@ bool CCommandConsole::SetGrid(const CString& value) {
     if (!IsNumber(value, distance) || distance < 0 || distance > 1000) {
         return Expected();
     }
-    theApp.SetGrid(distance);
+    Options options = theApp.GetOptions();
+    options.gridDistance = distance;
+    theApp.SetOptions(options);
     Report("grid " + value);
     return true;
 }
@@ -337,17 +343,21 @@ bool CCommandConsole::SetFlag(const CString& value, void (CCommandConsole::*set)
 }
 
 void CCommandConsole::ShowStatus(bool show) {
-    m_console.SetShowCommandStatusFlag(show);
+    Options options = theApp.GetOptions();
+    options.showStatus = show;
+    theApp.SetOptions(options);
 }
 
 void CCommandConsole::KeepCommands(bool keep) {
-    m_console.SetKeepRecallFlag(keep);
+    Options options = theApp.GetOptions();
+    options.keepCommands = keep;
+    theApp.SetOptions(options);
     theApp.WriteProfileInt("Settings", "KeepCommands", keep ? 1 : 0);
 }
 
 void CCommandConsole::ListSettings() {
     CString grid;
-    grid.Format("grid %d", theApp.GetGrid());
+    grid.Format("grid %d", theApp.GetOptions().gridDistance);
     Report(grid);
     Report(m_console.GetShowCommandStatusFlag() ? "status on" : "status off");
     Report(m_console.GetKeepRecallFlag() ? "keep on" : "keep off");

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "BoardDoc.h"
+#include "Options.h"
 #include "afxwin.h"
 #include "s/Console.h"
 
@@ -17,6 +18,8 @@ public:
     /// Registers the console; call it in InitInstance.
     void Init();
     void Open();
+    /// Puts what concerns the console in force.
+    void SetOptions(const Options& options);
 
 private:
     /// A command. It gets the words behind its name.

@@ -1,5 +1,6 @@
 #include "Keyboard.h"
 
+#include "../family/KeyDifferences.h"
 #include "Resource.h"
 #include "res/resource.h"
 #include "s/AccelDlg.h"
@@ -94,6 +95,15 @@ void CKeyboard::Edit() {
         apply(*map);
         Gui_AccelProfile::Write(*map, own, entry, nullptr);
     }
+}
+
+int CKeyboard::CountOwn() const {
+    return CountDifferences(m_keys ? *m_keys : ownKeys(), ownKeys());
+}
+
+void CKeyboard::Reset() {
+    apply(ownKeys());
+    Gui_AccelProfile::Forget(entry, nullptr);
 }
 
 void CKeyboard::apply(const Gui_AccelMap& map) {

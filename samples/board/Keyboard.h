@@ -15,6 +15,10 @@ public:
     CKeyboard(CMDIFrameWnd& main, CMultiDocTemplate& drawings);
     /// Lets the user change the keys.
     void Edit();
+    /// How many keys the user has given or taken away.
+    int CountOwn() const;
+    /// Puts the keys that the board comes with in force, and forgets the user's.
+    void Reset();
     /// Puts the user's keys in force in the window of a floating drawing, if he has any. Its table goes with it.
     void Apply(CFrameWnd& window) const;
 

@@ -16,14 +16,14 @@ CRect boxOf(const Shape& shape) {
     return box;
 }
 
-void drawText(CDC& dc, const Shape& shape) {
+void drawText(CDC& dc, const Shape& shape, const CString& typeface) {
     CRect box = boxOf(shape);
     if (shape.fill != noColor) {
         dc.FillSolidRect(box, toColorRef(shape.fill));
     }
     CFont font;
     font.CreateFont(-shape.size, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_DEFAULT_PRECIS,
-                    CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, "Arial");
+                    CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, typeface);
     CFont* before = dc.SelectObject(&font);
     dc.SetBkMode(TRANSPARENT);
     dc.SetTextColor(toColorRef(shape.color));
@@ -44,9 +44,13 @@ void drawOutline(CDC& dc, const Shape& shape) {
 
 } // namespace
 
-void DrawShape(CDC& dc, const Shape& shape) {
+Color FromColorRef(COLORREF color) {
+    return static_cast<Color>(GetRValue(color) << 16 | GetGValue(color) << 8 | GetBValue(color));
+}
+
+void DrawShape(CDC& dc, const Shape& shape, const CString& textFont) {
     if (shape.kind == ShapeKind::Text) {
-        drawText(dc, shape);
+        drawText(dc, shape, textFont);
         return;
     }
     CPen pen(PS_SOLID, shape.width, toColorRef(shape.color));

@@ -1,5 +1,6 @@
 #include "Keyboard.h"
 
+#include "../family/KeyDifferences.h"
 #include "Resource.h"
 #include "res/resource.h"
 #include "s/AccelDlg.h"
@@ -52,6 +53,15 @@ void CKeyboard::Edit() {
         apply(*map);
         Gui_AccelProfile::Write(*map, own, entry, nullptr);
     }
+}
+
+int CKeyboard::CountOwn() const {
+    return CountDifferences(Gui_AccelMap(m_main.m_hAccelTable), ownKeys());
+}
+
+void CKeyboard::Reset() {
+    apply(ownKeys());
+    Gui_AccelProfile::Forget(entry, nullptr);
 }
 
 // The frame destroys the table that it has at its end.

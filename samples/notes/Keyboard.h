@@ -12,6 +12,10 @@ public:
     explicit CKeyboard(CFrameWnd& main);
     /// Lets the user change the keys.
     void Edit();
+    /// How many keys the user has given or taken away.
+    int CountOwn() const;
+    /// Puts the keys that Notes comes with in force, and forgets the user's.
+    void Reset();
 
 private:
     void apply(const Gui_AccelMap& map);

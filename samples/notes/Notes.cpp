@@ -1,12 +1,16 @@
 #include "Notes.h"
 
+#include "../family/FamilyOptions.h"
+#include "../family/FamilyResource.h"
 #include "MainFrame.h"
 #include "NotesDoc.h"
+#include "NotesPreferences.h"
 #include "NotesView.h"
 #include "Resource.h"
 #include "platform/port/CmdOpcodes.h"
 #include "platform/port/MsgDispatcher.h"
 #include "s/BrowserPreference.h"
+#include "s/FileName.h"
 #include "s/Help.h"
 #include "s/Locale.h"
 
@@ -44,6 +48,7 @@ BEGIN_MESSAGE_MAP(CNotesApp, Gui_WinApp)
     ON_COMMAND(ID_FILE_NEW, &CWinApp::OnFileNew)
     ON_COMMAND(ID_FILE_OPEN, &CWinApp::OnFileOpen)
     ON_COMMAND(ID_TOOLS_KEYBOARD, &CNotesApp::OnToolsKeyboard)
+    ON_COMMAND(ID_TOOLS_PREFERENCES, &CNotesApp::OnToolsPreferences)
     ON_COMMAND(ID_TOOLS_WEB_BROWSER, &CNotesApp::OnToolsWebBrowser)
 END_MESSAGE_MAP()
 // clang-format on
@@ -107,6 +112,17 @@ CString CNotesApp::GetAppVersion() {
     CString version;
     version.LoadString(IDS_VERSION);
     return version;
+}
+
+// A text with a folder of its own goes before the folder that the user has chosen.
+CString CNotesApp::GetInitialDirForFileDialog(const CString& fileName) {
+    const CString folder = FamilyOptions::Read().documentFolder;
+    const bool counts = !folder.IsEmpty() && !Gui_FileName(fileName).HasAbsolutePath();
+    return counts ? folder : Gui_WinApp::GetInitialDirForFileDialog(fileName);
+}
+
+void CNotesApp::OnToolsPreferences() {
+    CNotesPreferences(m_pMainWnd).DoModal();
 }
 
 void CNotesApp::OnToolsKeyboard() {

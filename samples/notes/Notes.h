@@ -27,11 +27,17 @@ public:
     int ExitInstance() override;
     HICON GetAppIcon() override;
     CString GetAppVersion() override;
+    CString GetInitialDirForFileDialog(const CString& fileName) override;
 
     BOOL PreTranslateMessage(MSG* message) override;
     BOOL OnIdle(LONG count) override;
 
+    CKeyboard& GetKeyboard() {
+        return *m_keyboard;
+    }
+
     afx_msg void OnToolsKeyboard();
+    afx_msg void OnToolsPreferences();
     afx_msg void OnToolsWebBrowser();
 
 private:
@@ -48,3 +54,5 @@ private:
 
     DECLARE_MESSAGE_MAP()
 };
+
+extern CNotesApp theApp;

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "afxwin.h"
+
+/// A button that shows a colour and lets the user choose another one. A choice reaches the parent as a click does.
+class CColorButton : public CButton {
+public:
+    COLORREF GetColor() const {
+        return m_color;
+    }
+    void SetColor(COLORREF color);
+    void DrawItem(DRAWITEMSTRUCT* item) override;
+
+protected:
+    /// Asks for a colour; the parent hears of the click only when one was chosen.
+    afx_msg BOOL OnClicked();
+    DECLARE_MESSAGE_MAP()
+
+private:
+    COLORREF m_color = 0;
+};
+
+/// Exchanges the colour of such a button, which is made of a control the first time.
+void DDX_Color(CDataExchange* dx, int id, CColorButton& button, COLORREF& color);
