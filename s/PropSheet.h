@@ -119,6 +119,7 @@ protected:
     afx_msg void OnApply();
     afx_msg void OnHelp();
     afx_msg LRESULT OnCommandHelp(WPARAM wParam, LPARAM lParam);
+    afx_msg BOOL OnHelpInfo(HELPINFO* info);
     afx_msg void OnSize(UINT type, int cx, int cy);
     afx_msg void OnSelchangedTree(NMHDR* header, LRESULT* result);
     afx_msg void OnGetMinMaxInfo(MINMAXINFO* info);
