@@ -2,6 +2,7 @@
 #include "platform/afx/controls/HotKey.h"
 
 #include "platform/afx/controls/detail/ListBoxWindow.h"
+#include "platform/afx/controls/detail/StaticWindow.h"
 
 #include <cstring>
 #include <vector>
@@ -18,6 +19,12 @@ IMPLEMENT_DYNAMIC(CHotKeyCtrl, CWnd)
 
 BOOL CStatic::Create(LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id) {
     return CWnd::Create("Static", text, style, rect, parent, id);
+}
+
+void CStatic::SetLabelled(const CWnd* window) {
+    if (auto* label = dynamic_cast<StaticWindow*>(GetState())) {
+        label->setLabelled(window ? window->GetState() : nullptr);
+    }
 }
 
 BOOL CButton::Create(LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id) {

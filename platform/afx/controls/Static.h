@@ -13,6 +13,10 @@ public:
     BOOL Create(LPCSTR text, DWORD style, const RECT& rect, CWnd* parent, UINT id = 0xFFFF);
     using CWnd::Create;
 
+    /// Tells assistive tools that the text stands for another window of the same parent, as it does without being told
+    /// for the control that is made next; they hear of the window's new name. Null: for none.
+    void SetLabelled(const CWnd* window);
+
     /// Shows an icon or bitmap, which stays the caller's; the control takes its size unless it has SS_CENTERIMAGE.
     /// Answers the previous one.
     HICON SetIcon(HICON icon) {

@@ -274,16 +274,27 @@ void CDialog::OnCancel() {
 
 // --- messages ---
 
+namespace {
+
+/// Whether a dialog is a child of another one, or of a window that hands its controls on to another one.
+bool isInDialog(const Window& window) {
+    const Window* around = window.isChild() ? window.parent() : nullptr;
+    while (around && around->isChild() && (around->exStyle() & WS_EX_CONTROLPARENT) != 0 &&
+           !dynamic_cast<const DialogWindow*>(around)) {
+        around = around->parent();
+    }
+    return dynamic_cast<const DialogWindow*>(around) != nullptr;
+}
+
+} // namespace
+
 BOOL CDialog::PreTranslateMessage(MSG* message) {
     if (CWnd::PreTranslateMessage(message)) {
         return TRUE;
     }
     // The keys of a child dialog belong to the dialog around it.
     const Window* window = GetState();
-    if (window && window->isChild() && dynamic_cast<DialogWindow*>(window->parent())) {
-        return FALSE;
-    }
-    return PreTranslateInput(message);
+    return window && isInDialog(*window) ? FALSE : PreTranslateInput(message);
 }
 
 BOOL CDialog::OnCmdMsg(UINT id, int code, void* extra, AFX_CMDHANDLERINFO* info) {

@@ -22,6 +22,10 @@ public:
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
+    /// A click takes the keyboard to a bar that Tab reaches only.
+    bool takesFocus() const override {
+        return (style() & WS_TABSTOP) != 0;
+    }
 
 private:
     QScrollBar* bar() const;

@@ -8,6 +8,7 @@
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Resource.h"
 
+#include <QAccessible>
 #include <QLabel>
 #include <QPainter>
 #include <QStyle>
@@ -73,15 +74,42 @@ bool StaticWindow::isText() const {
     return type() <= SS_RIGHT || type() == SS_SIMPLE || type() == SS_LEFTNOWORDWRAP;
 }
 
+namespace {
+
+void tellNamed(QWidget& widget) {
+    if (QAccessible::isActive() && widget.isVisible()) {
+        QAccessibleEvent event(&widget, QAccessible::NameChanged);
+        QAccessible::updateAccessibility(&event);
+    }
+}
+
+} // namespace
+
 /// Tells the label its text without marks of access keys: those are the dialog's affair.
 void StaticWindow::tellText() {
-    const QString shown = isText() ? text() : QString();
-    static_cast<QLabel*>(widget())->setText((style() & SS_NOPREFIX) == 0 ? withoutMarks(shown) : shown);
+    QString shown = isText() ? text() : QString();
+    if ((style() & SS_NOPREFIX) == 0) {
+        shown = withoutMarks(shown);
+    }
+    auto& label = static_cast<QLabel&>(*widget());
+    if (label.buddy()) {
+        shown.replace(QLatin1Char('&'), QLatin1String("&&")); // in a label of something the toolkit reads access keys
+    }
+    label.setText(shown);
+    tellNamed(label);
+    if (label.buddy()) {
+        tellNamed(*label.buddy());
+    }
 }
 
 void StaticWindow::labelFor(Control& next) {
+    setLabelled(&next);
+}
+
+void StaticWindow::setLabelled(const Window* window) {
     if (isText()) {
-        static_cast<QLabel*>(widget())->setBuddy(next.widget());
+        static_cast<QLabel*>(widget())->setBuddy(window ? window->widget() : nullptr);
+        tellText();
     }
 }
 

@@ -19,6 +19,8 @@ public:
     QString mnemonicText() const override;
     /// Called when the next control is made: tells assistive tools that the text, if there is one, stands for it.
     void labelFor(Control& next);
+    /// Tells assistive tools that the text stands for a window, null: for none.
+    void setLabelled(const Window* window);
     /// Draws the control into its widget.
     void paint(QPainter& painter);
 

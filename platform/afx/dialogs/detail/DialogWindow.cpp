@@ -124,9 +124,12 @@ void DialogWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 
 /// A dialog without a sizing border has the size it was given.
 void DialogWindow::fixSize() {
-    const bool sizable = (style() & WS_THICKFRAME) != 0;
-    widget()->setMinimumSize(sizable ? QSize(0, 0) : widget()->size());
-    widget()->setMaximumSize(sizable ? QSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX) : widget()->size());
+    if ((style() & WS_THICKFRAME) == 0) {
+        widget()->setFixedSize(widget()->size());
+    } else {
+        widget()->setMinimumSize(0, 0);
+        widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
+    }
 }
 
 void DialogWindow::setWindowRect(const QRect& rect) {
@@ -181,6 +184,9 @@ void DialogWindow::showWidget(int command) {
     if (command != SW_HIDE && widget()->isHidden()) {
         tellDialogOpens();
         keepOnScreen();
+        if ((style() & WS_THICKFRAME) != 0) {
+            applySizeLimits(*this, QSize(0, 0)); // asked once its controls stand
+        }
     }
     showTopLevel(*this, command);
 }
