@@ -11,10 +11,10 @@ install(TARGETS ${exported_targets} EXPORT TarvexTargets
   LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}"
   ARCHIVE DESTINATION "${CMAKE_INSTALL_LIBDIR}")
 # Loaded by name from there: nobody links it.
-install(TARGETS TarvexTheme LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}/tarvex")
+install(TARGETS TarvexTheme TarvexCommonControls LIBRARY DESTINATION "${CMAKE_INSTALL_LIBDIR}/tarvex")
 install(TARGETS tvxsettings tvxopen helpmapcheck RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}")
 # Builds all of that, for builds that make less than everything.
-add_custom_target(installed DEPENDS ${exported_targets} TarvexTheme tvxsettings tvxopen helpmapcheck)
+add_custom_target(installed DEPENDS ${exported_targets} TarvexTheme TarvexCommonControls tvxsettings tvxopen helpmapcheck)
 install(FILES tools/settings/tvxsettings.1 tools/open/tvxopen.1 tools/helpmapcheck/helpmapcheck.1
   DESTINATION "${CMAKE_INSTALL_MANDIR}/man1")
 

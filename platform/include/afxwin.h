@@ -35,6 +35,7 @@
 #include "platform/win/Error.h"
 #include "platform/win/ExtensionModule.h"
 #include "platform/win/Files.h"
+#include "platform/win/FindFile.h"
 #include "platform/win/FrameworkIds.h"
 #include "platform/win/Locale.h"
 #include "platform/win/Module.h"

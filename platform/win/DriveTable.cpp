@@ -1,90 +1,15 @@
 #include "platform/win/detail/DriveTable.h"
 
 #include "platform/base/Text.h"
+#include "platform/win/detail/Mounts.h"
 
 #include <algorithm>
 #include <array>
-#include <charconv>
 #include <map>
 #include <optional>
 
 namespace tvx::win {
 namespace {
-
-/// What a line of mountinfo tells (proc(5)).
-struct Mount {
-    std::string point;
-    std::string fileSystem;
-    std::string source;
-};
-
-/// Takes the first of the fields that single characters separate.
-std::string_view takeField(std::string_view& text, char separator) {
-    const std::string_view field = text.substr(0, text.find(separator));
-    text.remove_prefix(std::min(field.size() + 1, text.size()));
-    return field;
-}
-
-/// Blanks, tabs, line ends and backslashes are written as three octal digits behind a backslash.
-std::string unescaped(std::string_view text) {
-    std::string result;
-    for (std::size_t at = 0; at < text.size(); ++at) {
-        unsigned value = 0;
-        const char* const digits = text.data() + at + 1;
-        const bool isEscape = text[at] == '\\' && text.size() - at > 3 &&
-                              std::from_chars(digits, digits + 3, value, 8).ptr == digits + 3 && value < 256;
-        result += isEscape ? static_cast<char>(value) : text[at];
-        at += isEscape ? 3 : 0;
-    }
-    return result;
-}
-
-/// Of "/" nothing is taken.
-std::string_view withoutEndSlashes(std::string_view folder) {
-    while (folder.size() > 1 && folder.ends_with('/')) {
-        folder.remove_suffix(1);
-    }
-    return folder;
-}
-
-std::optional<Mount> parseLine(std::string_view line) {
-    constexpr int fieldsBeforePoint = 4;
-    constexpr std::string_view endOfOptions = " - ";
-    const std::size_t end = line.find(endOfOptions);
-    if (end == std::string_view::npos) {
-        return std::nullopt;
-    }
-    std::string_view left = line.substr(0, end);
-    std::string_view right = line.substr(end + endOfOptions.size());
-    for (int field = 0; field < fieldsBeforePoint; ++field) {
-        takeField(left, ' ');
-    }
-    Mount mount{
-        std::string(withoutEndSlashes(unescaped(takeField(left, ' ')))), std::string(takeField(right, ' ')), {}};
-    mount.source = unescaped(takeField(right, ' '));
-    return mount.point.starts_with('/') && mount.point.find('\0') == std::string::npos ? std::optional(mount)
-                                                                                       : std::nullopt;
-}
-
-/// The mounts that can be reached, by mount point: of several on one point the last one lies on top.
-std::map<std::string, Mount> parseMounts(std::string_view text) {
-    std::map<std::string, Mount> mounts;
-    while (!text.empty()) {
-        if (auto mount = parseLine(takeField(text, '\n'))) {
-            mounts.insert_or_assign(mount->point, *mount);
-        }
-    }
-    return mounts;
-}
-
-/// File systems whose source names a server and a folder of it: "server:/folder", "user@server:folder",
-/// "//server/share" or "https://server/folder".
-bool isNetwork(std::string_view fileSystem) {
-    static constexpr std::array<std::string_view, 12> names{
-        "nfs",        "nfs4",       "cifs",           "smb3",           "smbfs",     "ceph",
-        "fuse.sshfs", "fuse.davfs", "fuse.glusterfs", "fuse.curlftpfs", "fuse.ceph", "davfs"};
-    return std::ranges::find(names, fileSystem) != names.end();
-}
 
 std::string_view trimSlashes(std::string_view text) {
     while (text.starts_with('/')) {
@@ -226,10 +151,6 @@ std::optional<Drive> parseEntry(std::string_view entry) {
     drive.letter = upper(letter.front());
     drive.folder = folder;
     return drive;
-}
-
-bool isBelow(std::string_view path, std::string_view folder) {
-    return folder == "/" || (path.starts_with(folder) && (path.size() == folder.size() || path[folder.size()] == '/'));
 }
 
 } // namespace

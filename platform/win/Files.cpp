@@ -23,6 +23,7 @@ using tvx::PathUse;
 
 constexpr std::string_view separators = "\\/";
 constexpr mode_t newFileMode = 0666;
+constexpr mode_t newFolderMode = 0777;
 
 /// Hands a text to a caller's buffer; see GetCurrentDirectoryA.
 DWORD copyOut(const std::string& text, DWORD size, LPSTR buffer) {
@@ -184,6 +185,20 @@ BOOL DeleteFileA(LPCSTR name) {
         return TRUE;
     }
     tvx::setLastErrorFromErrno();
+    return FALSE;
+}
+
+BOOL CreateDirectoryA(LPCSTR name, const SECURITY_ATTRIBUTES* /*security*/) {
+    const auto path = pathOf(name, PathUse::Creating);
+    if (!path) {
+        return FALSE;
+    }
+    if (::mkdir(path->c_str(), newFolderMode) == 0) {
+        return TRUE;
+    }
+    SetLastError(errno == EEXIST   ? ERROR_ALREADY_EXISTS
+                 : errno == ENOENT ? ERROR_PATH_NOT_FOUND
+                                   : tvx::errorFromErrno(errno));
     return FALSE;
 }
 

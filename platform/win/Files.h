@@ -65,6 +65,13 @@ TVX_PLATFORM_API HANDLE CreateFileA(LPCSTR name, DWORD access, DWORD share, cons
 /// Removes a file; a folder is refused with `ERROR_ACCESS_DENIED`.
 TVX_PLATFORM_API BOOL DeleteFileA(LPCSTR name);
 
+/// Makes a folder in one that exists.
+/// @param security  not used: it gets what the process's mask allows
+/// @return FALSE with `ERROR_ALREADY_EXISTS`, `ERROR_PATH_NOT_FOUND` without the folder around it,
+/// `ERROR_ACCESS_DENIED`,
+///     ...
+TVX_PLATFORM_API BOOL CreateDirectoryA(LPCSTR name, const SECURITY_ATTRIBUTES* security);
+
 /// The current folder, such as "C:\work", without a separator at the end unless it is a root.
 /// @param size    bytes of `buffer`
 /// @param buffer  receives the text; may be null when `size` is 0
@@ -89,6 +96,9 @@ inline HANDLE CreateFile(LPCSTR name, DWORD access, DWORD share, const SECURITY_
 }
 inline BOOL DeleteFile(LPCSTR name) {
     return DeleteFileA(name);
+}
+inline BOOL CreateDirectory(LPCSTR name, const SECURITY_ATTRIBUTES* security) {
+    return CreateDirectoryA(name, security);
 }
 inline DWORD GetCurrentDirectory(DWORD size, LPSTR buffer) {
     return GetCurrentDirectoryA(size, buffer);

@@ -26,6 +26,13 @@ public:
         return static_cast<int>(
             SendMessage(CB_INSERTSTRING, static_cast<WPARAM>(index), reinterpret_cast<LPARAM>(text)));
     }
+    /// Adds a line for each drive: "[-c-]".
+    /// @param attributes DDL_DRIVES | DDL_EXCLUSIVE; files cannot be listed, which is CB_ERR
+    /// @param pattern    not looked at: drives have no other names
+    /// @return the place of the last one
+    int Dir(UINT attributes, LPCSTR pattern) {
+        return static_cast<int>(SendMessage(CB_DIR, attributes, reinterpret_cast<LPARAM>(pattern)));
+    }
     /// Removes a line and answers how many are left.
     int DeleteString(UINT index) {
         return static_cast<int>(SendMessage(CB_DELETESTRING, index));

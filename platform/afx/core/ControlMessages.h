@@ -112,6 +112,7 @@
 #define CB_SETEDITSEL 0x0142
 #define CB_ADDSTRING 0x0143
 #define CB_DELETESTRING 0x0144
+#define CB_DIR 0x0145
 #define CB_GETCOUNT 0x0146
 #define CB_GETCURSEL 0x0147
 #define CB_GETLBTEXT 0x0148
@@ -131,6 +132,8 @@
 #define CB_FINDSTRINGEXACT 0x0158
 #define CB_SETDROPPEDWIDTH 0x0160
 #define CB_OKAY 0
+#define DDL_DRIVES 0x4000    ///< CB_DIR: the drives, as "[-c-]".
+#define DDL_EXCLUSIVE 0x8000 ///< And nothing else.
 #define CB_ERR (-1)
 #define CB_ERRSPACE (-2)
 

@@ -7,6 +7,7 @@
 #include "platform/afx/core/detail/Loop.h"
 #include "platform/afx/core/detail/PastedText.h"
 #include "platform/base/Text.h"
+#include "platform/win/Drives.h"
 
 #include <QAbstractItemView>
 #include <QComboBox>
@@ -363,6 +364,20 @@ LRESULT ComboBoxWindow::add(LONG_PTR index, LPARAM text, bool sorted) {
     return place;
 }
 
+LRESULT ComboBoxWindow::addDrives(WPARAM attributes) {
+    if (attributes != (DDL_DRIVES | DDL_EXCLUSIVE)) {
+        return CB_ERR;
+    }
+    LRESULT last = CB_ERR;
+    for (char letter = 'a'; letter <= 'z'; ++letter) {
+        if ((GetLogicalDrives() >> (letter - 'a') & 1) != 0) {
+            const std::string line = std::string("[-") + letter + "-]";
+            last = add(-1, reinterpret_cast<LPARAM>(line.c_str()), (style() & CBS_SORT) != 0 && hasStrings());
+        }
+    }
+    return last;
+}
+
 LRESULT ComboBoxWindow::removeItem(LONG_PTR index) {
     if (!m_items.isValid(index)) {
         return CB_ERR;
@@ -407,6 +422,8 @@ LRESULT ComboBoxWindow::itemProc(UINT message, WPARAM wParam, LPARAM lParam, boo
         return add(-1, lParam, (style() & CBS_SORT) != 0 && hasStrings());
     case CB_INSERTSTRING:
         return add(row, lParam, false);
+    case CB_DIR:
+        return addDrives(wParam);
     case CB_DELETESTRING:
         return removeItem(row);
     case CB_RESETCONTENT:

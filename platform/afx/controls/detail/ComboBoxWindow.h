@@ -57,6 +57,7 @@ private:
     void applyHeights();
     void chosen(int index);
     LRESULT add(LONG_PTR index, LPARAM text, bool sorted);
+    LRESULT addDrives(WPARAM attributes);
     LRESULT removeItem(LONG_PTR index);
     void reset();
     LRESULT setCurrent(LONG_PTR index);

@@ -1,5 +1,6 @@
 #include "platform/afx/controls/detail/EditWindow.h"
 
+#include "platform/afx/controls/AutoComplete.h"
 #include "platform/afx/core/WindowCalls.h"
 #include "platform/afx/core/detail/Dispatch.h"
 #include "platform/afx/core/detail/Keys.h"
@@ -9,6 +10,7 @@
 
 #include <QAbstractScrollArea>
 #include <QApplication>
+#include <QLineEdit>
 
 #include <algorithm>
 #include <cstring>
@@ -69,6 +71,14 @@ void EditWindow::widgetMade() {
 QWidget* EditWindow::clientWidget() const {
     auto* area = dynamic_cast<QAbstractScrollArea*>(widget());
     return area ? area->viewport() : widget();
+}
+
+bool EditWindow::completeFolders() {
+    auto* field = qobject_cast<QLineEdit*>(m_field ? m_field->widget() : nullptr);
+    if (field && !m_completion) {
+        m_completion = std::make_unique<FolderCompletion>(*field);
+    }
+    return field != nullptr;
 }
 
 void EditWindow::applyStyle() {
@@ -136,6 +146,9 @@ void EditWindow::focusMoved(bool got) {
 
 UINT EditWindow::dialogCode(const MSG* msg) const {
     UINT code = DLGC_HASSETSEL | DLGC_WANTCHARS | DLGC_WANTARROWS;
+    if (msg && msg->message == WM_KEYDOWN && m_completion && m_completion->wantsKey(msg->wParam)) {
+        return code | DLGC_WANTALLKEYS;
+    }
     if (!isMultiLine() || !msg) {
         return code;
     }
@@ -207,6 +220,9 @@ bool EditWindow::typed(UINT message, WPARAM character) {
         }
         return true;
     case '\t':
+        if (m_completion) {
+            return true; // the key has completed
+        }
         break;
     default:
         if (control || character < ' ' || character == 0x7F) {
@@ -359,6 +375,8 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
         return *result;
     }
     switch (message) {
+    case WM_KEYDOWN:
+        return m_completion && m_completion->takeKey(wParam) ? 0 : Control::defaultProc(message, wParam, lParam);
     case WM_GETTEXTLENGTH:
         // The field counts along, so that a long text is not converted for its length alone.
         return m_field->bytes();
@@ -385,3 +403,9 @@ LRESULT EditWindow::defaultProc(UINT message, WPARAM wParam, LPARAM lParam) {
 }
 
 } // namespace tvx::afx
+
+LONG SHAutoComplete(HWND edit, DWORD flags) {
+    constexpr auto invalidArgument = static_cast<LONG>(0x80070057);
+    auto* window = dynamic_cast<tvx::afx::EditWindow*>(tvx::afx::Window::from(edit));
+    return window && flags == SHACF_FILESYS_DIRS && window->completeFolders() ? 0 : invalidArgument;
+}

@@ -5,6 +5,7 @@
 
 #include "platform/afx/controls/detail/Control.h"
 #include "platform/afx/controls/detail/FieldCommands.h"
+#include "platform/afx/controls/detail/FolderCompletion.h"
 #include "platform/afx/controls/detail/HostText.h"
 #include "platform/afx/controls/detail/TextField.h"
 
@@ -20,6 +21,8 @@ public:
     QWidget* clientWidget() const override;
     UINT dialogCode(const MSG* msg) const override;
     UINT colorMessage() const override;
+    /// Has the names of folders completed; see SHAutoComplete. False for a control of many lines.
+    bool completeFolders();
 
 protected:
     QWidget* makeWidget(QWidget* parent) override;
@@ -51,6 +54,7 @@ private:
     LRESULT copyLine(int number, char* buffer) const;
     bool hasLine(int number) const;
     std::unique_ptr<TextField> m_field;
+    std::unique_ptr<FolderCompletion> m_completion; ///< null where nothing is completed
     int m_limit;
     WPARAM m_passwordChar = 0;
     int m_quiet = 0;
