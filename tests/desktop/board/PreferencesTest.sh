@@ -1,0 +1,82 @@
+#!/usr/bin/env bash
+# Tools > Preferences of the sample applications as a user without a mouse meets them: a page is found by a word, a wrong
+# number is explained, Apply shows in the drawing at once, Cancel asks, and what was applied is there after a restart and
+# is the other application's too where the family shares it.
+#
+#   PreferencesTest.sh BOARD NOTES
+set -euo pipefail
+. "$(dirname "$0")/../Desktop.sh"
+board=$1 notes=$2
+
+press() {
+    xdotool key --clearmodifiers "$@"
+}
+preferences() {
+    xdotool windowactivate --sync "$main" key --clearmodifiers ctrl+comma
+    focus "^Preferences$"
+    sheet=$found
+}
+gone() {
+    await "the preferences are gone" untitled "^Preferences$"
+}
+# page WORDS: finds a page by words, and goes to its first field.
+page() {
+    press ctrl+f ctrl+a
+    xdotool type --clearmodifiers "$1"
+    press Return Tab
+}
+copied() {
+    [ "$(xclip -o -selection clipboard | tr -d '\r')" = "$1" ]
+}
+differs() {
+    ! cmp -s "$1" <(import -window "$main" png:-)
+}
+
+begin "Tarvex Board" "$board" -nosplash
+preferences
+page "grid points"
+press alt+d ctrl+a
+xdotool type 5000
+press alt+a
+focus "^Board$" key Return # the message about the bounds
+xdotool windowactivate --sync "$sheet"
+press ctrl+a
+xdotool type 60
+import -window "$main" png:- >"$work/before.png"
+press alt+a
+await "the drawing shows the new grid" differs "$work/before.png"
+xdotool windowactivate --sync "$sheet" key --clearmodifiers alt+s # hides the grid
+press Escape
+await "Cancel asks about changes" titled "^Board$"
+focus "^Board$" key n
+xdotool windowactivate --sync "$sheet" key Escape
+focus "^Board$" key y
+gone
+preferences
+page "online"
+press alt+l
+xdotool type "http://example.invalid/"
+press Return
+gone
+xdotool windowactivate --sync "$main" key alt+F4
+await "the application ends" ended "$process"
+
+begin "Tarvex Board" "$board" -nosplash
+preferences
+page "grid points"
+press alt+d ctrl+a ctrl+c
+await "the distance was kept" copied 60
+press Escape
+gone
+xdotool windowactivate --sync "$main" key alt+F4
+await "the application ends" ended "$process"
+
+begin "Tarvex Notes" "$notes" -nosplash
+preferences
+page "online"
+press alt+l ctrl+a ctrl+c
+await "the family shares where help is" copied "http://example.invalid/"
+press Escape
+gone
+xdotool windowactivate --sync "$main" key alt+F4
+await "Notes ends" ended "$process"
