@@ -29,10 +29,7 @@ END_MESSAGE_MAP()
 // clang-format on
 
 Gui_PropSheet::Gui_PropSheet(const Port::StringBase<char>& title, CWnd* parent, bool multipleSelection)
-    : CDialog(GUI_IDD_PROPERTIES, parent), m_record(MakeRecord<Record>(this)) {
-    m_record->windowTitle = title;
-    m_record->multipleSelection = multipleSelection;
-}
+    : CDialog(GUI_IDD_PROPERTIES, parent), m_record(MakeRecord<Record>(this, title, multipleSelection)) {}
 
 Gui_PropSheet::~Gui_PropSheet() {
     // Pages and the tree tell a window that still stands of their end; there must be somebody to be told.
@@ -285,7 +282,7 @@ BOOL Gui_PropSheet::PreTranslateMessage(MSG* message) {
         }
     }
     if (message->message == WM_MOUSEWHEEL && m_record->isGuarded(*message)) {
-        ::SendMessage(m_record->currentItem->GetPage()->m_hWnd, WM_MOUSEWHEEL, message->wParam, message->lParam);
+        m_record->place.onWheel(GET_WHEEL_DELTA_WPARAM(message->wParam));
         return TRUE;
     }
     const HWND self = m_hWnd;

@@ -53,6 +53,9 @@ private:
 };
 
 struct Gui_PropSheet::Record {
+    Record(Gui_PropSheet* owner, const Port::StringBase<char>& title, bool multiple)
+        : sheet(owner), windowTitle(title), multipleSelection(multiple) {}
+
     Gui_PropSheet* sheet;
     Gui_PropItem* currentItem = nullptr;
     HWND treeWindow = nullptr;
@@ -62,7 +65,7 @@ struct Gui_PropSheet::Record {
     PropTree tree;
     std::vector<Gui_PropItem*> items;
     std::vector<Gui_PropItem*> initiallySelected;
-    bool multipleSelection = false;
+    bool multipleSelection;
     bool wantsToClose = false;
     bool dontClose = false;
 
