@@ -329,5 +329,10 @@ void Gui_PropSheet::OnHScroll(UINT code, UINT position, CScrollBar* bar) {
 }
 
 BOOL Gui_PropSheet::OnMouseWheel(UINT flags, short delta, CPoint point) {
-    return m_record->place.onWheel(delta) ? TRUE : CDialog::OnMouseWheel(flags, delta, point);
+    CRect frame;
+    if (const CWnd* control = GetDlgItem(GUI_IDC_PROP_PAGE_FRAME)) {
+        control->GetWindowRect(&frame);
+    }
+    const bool isTaken = frame.PtInRect(point) && m_record->place.onWheel(delta);
+    return isTaken ? TRUE : CDialog::OnMouseWheel(flags, delta, point);
 }

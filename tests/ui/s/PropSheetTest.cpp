@@ -155,6 +155,18 @@ protected:
     Gui_PropItem* files = new Gui_PropItem("Files", nullptr, nullptr, Gui_PropItem::StateDefault);
 };
 
+/// A control of a host's, whose value the wheel changes.
+class Slider : public CWnd {
+public:
+    int turns = 0;
+
+protected:
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override {
+        turns += message == WM_MOUSEWHEEL ? 1 : 0;
+        return message == WM_MOUSEWHEEL ? 0 : CWnd::WindowProc(message, wParam, lParam);
+    }
+};
+
 void turnWheel(const CWnd* over) {
     QWidget* widget = tvx::afx::peerOf(over->m_hWnd);
     const QPointF point = widget->rect().center();
@@ -458,9 +470,19 @@ TEST(PropSheetPage, ScrollsWhereItIsLargerThanItsPlace) {
         turnWheel(page->GetDlgItem(202));
         EXPECT_EQ(page->GetDlgItem(202)->SendMessage(CB_GETCURSEL), 0);
         EXPECT_LT(placeOf(202).top, before);
-        const int between = placeOf(201).top;
-        turnWheel(page->GetDlgItem(203));
-        EXPECT_LT(placeOf(201).top, between);
+        key(Qt::Key_Tab);
+        key(Qt::Key_Tab, Qt::ShiftModifier);
+        EXPECT_GE(placeOf(201).top, 0);
+        turnWheel(page->GetDlgItem(201)); // it has the keyboard, but nothing to scroll
+        EXPECT_LT(placeOf(201).top, 0);
+        Slider slider;
+        slider.Create("Button", "", WS_CHILD | WS_VISIBLE | WS_TABSTOP, CRect(90, 90, 130, 120), tall->GetCachedPage(),
+                      7);
+        turnWheel(&slider);
+        EXPECT_EQ(slider.turns, 0);
+        slider.SetFocus();
+        turnWheel(&slider);
+        EXPECT_EQ(slider.turns, 1);
         page->GetDlgItem(202)->SetFocus();
         turnWheel(page->GetDlgItem(202));
         EXPECT_EQ(page->GetDlgItem(202)->SendMessage(CB_GETCURSEL), 1) << "it has the keyboard";
