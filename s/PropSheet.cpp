@@ -204,6 +204,7 @@ void Gui_PropSheet::OnDestroy() {
     m_record->tree.forget();
     m_record->place.forget();
     m_record->treeWindow = m_record->okWindow = nullptr;
+    m_record->isLaidOut = false;
 }
 
 // --- buttons ---
