@@ -29,10 +29,7 @@ END_MESSAGE_MAP()
 // clang-format on
 
 Gui_PropSheet::Gui_PropSheet(const Port::StringBase<char>& title, CWnd* parent, bool multipleSelection)
-    : CDialog(GUI_IDD_PROPERTIES, parent), m_record(MakeRecord<Record>(this)) {
-    m_record->windowTitle = title;
-    m_record->multipleSelection = multipleSelection;
-}
+    : CDialog(GUI_IDD_PROPERTIES, parent), m_record(MakeRecord<Record>(this, title, multipleSelection)) {}
 
 Gui_PropSheet::~Gui_PropSheet() {
     // Pages and the tree tell a window that still stands of their end; there must be somebody to be told.
@@ -207,6 +204,7 @@ void Gui_PropSheet::OnDestroy() {
     m_record->tree.forget();
     m_record->place.forget();
     m_record->treeWindow = m_record->okWindow = nullptr;
+    m_record->isLaidOut = false;
 }
 
 // --- buttons ---
@@ -285,7 +283,7 @@ BOOL Gui_PropSheet::PreTranslateMessage(MSG* message) {
         }
     }
     if (message->message == WM_MOUSEWHEEL && m_record->isGuarded(*message)) {
-        ::SendMessage(m_record->currentItem->GetPage()->m_hWnd, WM_MOUSEWHEEL, message->wParam, message->lParam);
+        m_record->place.onWheel(GET_WHEEL_DELTA_WPARAM(message->wParam));
         return TRUE;
     }
     const HWND self = m_hWnd;
@@ -332,5 +330,10 @@ void Gui_PropSheet::OnHScroll(UINT code, UINT position, CScrollBar* bar) {
 }
 
 BOOL Gui_PropSheet::OnMouseWheel(UINT flags, short delta, CPoint point) {
-    return m_record->place.onWheel(delta) ? TRUE : CDialog::OnMouseWheel(flags, delta, point);
+    CRect frame;
+    if (const CWnd* control = GetDlgItem(GUI_IDC_PROP_PAGE_FRAME)) {
+        control->GetWindowRect(&frame);
+    }
+    const bool isTaken = frame.PtInRect(point) && m_record->place.onWheel(delta);
+    return isTaken ? TRUE : CDialog::OnMouseWheel(flags, delta, point);
 }

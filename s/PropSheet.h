@@ -104,7 +104,8 @@ public:
     /// sight. A dialog that is larger than the screen opens as large as that. Pages are never made smaller than they
     /// were made.
     void SetPageScrolling(bool scrolling);
-    /// The wheel changes no combo box that does not have the keyboard: it scrolls the page, if that scrolls.
+    /// The wheel changes no value in a control that does not have the keyboard: it scrolls the page, if that scrolls.
+    /// Lists, trees and fields scroll all the same. Combo boxes need no guard: they never change unseen.
     void SetWheelGuard(bool guard);
     /// White on the title band has a contrast of at least 4.5 to 1, in light palettes, too (Gui_TitleStatic).
     void SetReadableBand(bool readable);

@@ -60,18 +60,20 @@ int Gui_PropSheet::Record::buttonHeight() const {
 // --- layout ---
 
 void Gui_PropSheet::Record::layOut(CSize client) {
+    isLaidOut = treeWindow != nullptr; // until the dialog is open its controls stand as the template has them
     const CSize gap = margin();
     const int height = buttonHeight();
-    if (CWnd* control = sheet->GetDlgItem(GUI_IDC_PROP_TREE)) {
-        const CRect rect = rectOf(*control);
-        resize(*control, rect.Width(), client.cy - 2 * gap.cy - rect.top - height);
-    }
     if (CWnd* band = sheet->GetDlgItem(GUI_IDC_PROP_TITLE)) {
         const CRect rect = rectOf(*band);
         resize(*band, client.cx - rect.left - gap.cx, rect.Height());
         band->Invalidate(FALSE);
     }
-    layOutButtons(client, gap, height);
+    const int left = layOutButtons(client, gap, height);
+    if (CWnd* control = sheet->GetDlgItem(GUI_IDC_PROP_TREE)) {
+        const CRect rect = rectOf(*control);
+        const int defaults = layOutDefaults(client, left);
+        resize(*control, rect.Width(), client.cy - 2 * gap.cy - rect.top - height - defaults);
+    }
     if (CWnd* frame = sheet->GetDlgItem(GUI_IDC_PROP_PAGE_FRAME)) {
         const CRect rect = rectOf(*frame);
         resize(*frame, client.cx - rect.left - gap.cx, client.cy - 2 * gap.cy - rect.top - height);
@@ -82,7 +84,8 @@ void Gui_PropSheet::Record::layOut(CSize client) {
     }
 }
 
-void Gui_PropSheet::Record::layOutButtons(CSize client, CSize gap, int height) {
+/// Answers where the first of the buttons begins.
+int Gui_PropSheet::Record::layOutButtons(CSize client, CSize gap, int height) {
     const int top = client.cy - gap.cy - height;
     int right = client.cx;
     for (auto id = buttonIds.rbegin(); id != buttonIds.rend(); ++id) {
@@ -92,9 +95,22 @@ void Gui_PropSheet::Record::layOutButtons(CSize client, CSize gap, int height) {
             button->Invalidate(FALSE);
         }
     }
-    if (defaultsButton.m_hWnd) {
-        defaultsButton.SetWindowPos(nullptr, gap.cx, top, 0, 0, SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
+    return right;
+}
+
+/// Puts the Defaults button beside the others, or above them where it has no room there. Answers the height that this
+/// takes from the tree.
+int Gui_PropSheet::Record::layOutDefaults(CSize client, int left) {
+    if (!defaultsButton.m_hWnd || !currentItem || !currentItem->GetDefaultsFunction()) {
+        return 0;
     }
+    const CSize gap = margin();
+    const CSize size = defaultsSize();
+    const int row = size.cy + gap.cy;
+    const bool isAbove = gap.cx + size.cx + gap.cx > left;
+    defaultsButton.SetWindowPos(nullptr, gap.cx, client.cy - row - (isAbove ? row : 0), 0, 0,
+                                SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE);
+    return isAbove ? row : 0;
 }
 
 /// The client area in which all buttons stand beside each other, and tree and page still show something.
@@ -110,11 +126,13 @@ CSize Gui_PropSheet::Record::leastClient() const {
         const CWnd* button = sheet->GetDlgItem(id);
         buttons += button ? rectOf(*button).Width() + gap.cx : 0;
     }
-    if (std::ranges::any_of(items, [](const Gui_PropItem* item) { return item->GetDefaultsFunction() != nullptr; })) {
-        buttons += defaultsSize().cx + gap.cx;
-    }
     const CRect rect = rectOf(*frame);
-    return {std::max<int>(buttons, rect.left + page.cx + gap.cx), rect.top + page.cy + 2 * gap.cy + buttonHeight()};
+    const CSize borders = bordersOf(*sheet);
+    // A small screen, or large fonts, may have room for less.
+    return {
+        std::min(std::max<int>(buttons, rect.left + page.cx + gap.cx), GetSystemMetrics(SM_CXFULLSCREEN) - borders.cx),
+        std::min<int>(rect.top + page.cy + 2 * gap.cy + buttonHeight(),
+                      GetSystemMetrics(SM_CYFULLSCREEN) - borders.cy)};
 }
 
 // --- controls that only some sheets have ---
@@ -165,8 +183,14 @@ void Gui_PropSheet::Record::showDefaultsButton() {
                               CRect(corner, defaultsSize()), sheet, GUI_IDC_PROP_DEFAULTS);
         defaultsButton.SetFont(sheet->GetFont());
     }
-    if (defaultsButton.m_hWnd) {
-        defaultsButton.ShowWindow(isWanted ? SW_SHOWNA : SW_HIDE);
+    if (!defaultsButton.m_hWnd) {
+        return;
+    }
+    defaultsButton.ShowWindow(isWanted ? SW_SHOWNA : SW_HIDE);
+    if (isLaidOut) {
+        CRect client;
+        sheet->GetClientRect(&client);
+        layOut(client.Size());
     }
 }
 

@@ -4,6 +4,7 @@
 #include "s/StringOf.h"
 
 #include <algorithm>
+#include <array>
 #include <cstring>
 
 // --- switching ---
@@ -213,19 +214,22 @@ bool Gui_PropSheet::Record::onSearchKey(UINT key) {
 
 // --- wheel ---
 
-/// Whether the wheel turns over a combo box of the page that does not have the keyboard.
+namespace {
+
+bool scrollsItself(HWND control) {
+    char name[24] = {};
+    GetClassNameA(control, name, sizeof name);
+    constexpr std::array<const char*, 4> scrolling = {"ListBox", "Edit", "SysTreeView32", "ScrollBar"};
+    return std::ranges::any_of(scrolling, [&name](const char* known) { return std::strcmp(known, name) == 0; });
+}
+
+} // namespace
+
+/// Whether the wheel turns over a control of the page in which it could change a value unseen: one that does not have
+/// the keyboard and shows no more when it is scrolled.
 bool Gui_PropSheet::Record::isGuarded(const MSG& message) const {
     const CWnd* const page = guardsWheel ? sheet->GetCurrentPage() : nullptr;
-    if (!page || !::IsChild(page->m_hWnd, message.hwnd)) {
-        return false;
-    }
-    for (HWND window = message.hwnd; window && window != page->m_hWnd; window = ::GetParent(window)) {
-        char name[16] = {};
-        GetClassNameA(window, name, sizeof name);
-        if (std::strcmp(name, "ComboBox") == 0) {
-            const HWND focus = ::GetFocus();
-            return focus != window && !::IsChild(window, focus);
-        }
-    }
-    return false;
+    const HWND focus = ::GetFocus();
+    return page && ::IsChild(page->m_hWnd, message.hwnd) && message.hwnd != focus && !::IsChild(message.hwnd, focus) &&
+           !scrollsItself(message.hwnd);
 }

@@ -53,6 +53,9 @@ private:
 };
 
 struct Gui_PropSheet::Record {
+    Record(Gui_PropSheet* owner, const Port::StringBase<char>& title, bool multiple)
+        : sheet(owner), windowTitle(title), multipleSelection(multiple) {}
+
     Gui_PropSheet* sheet;
     Gui_PropItem* currentItem = nullptr;
     HWND treeWindow = nullptr;
@@ -62,7 +65,7 @@ struct Gui_PropSheet::Record {
     PropTree tree;
     std::vector<Gui_PropItem*> items;
     std::vector<Gui_PropItem*> initiallySelected;
-    bool multipleSelection = false;
+    bool multipleSelection;
     bool wantsToClose = false;
     bool dontClose = false;
 
@@ -78,6 +81,8 @@ struct Gui_PropSheet::Record {
     PropPagePlace place;
     /// What the user has selected, also while the search hides it.
     std::vector<Gui_PropItem*> selection;
+    /// Whether the controls stand as a size of the dialog has put them, no longer as the template has them.
+    bool isLaidOut = false;
     /// Whether this is not the first opening: page objects may be left whose windows have gone.
     bool wasOpen = false;
     /// Page objects that others have replaced.
@@ -112,7 +117,8 @@ struct Gui_PropSheet::Record {
     void addSearchField();
     void fitScreen();
     void layOut(CSize client);
-    void layOutButtons(CSize client, CSize gap, int height);
+    int layOutButtons(CSize client, CSize gap, int height);
+    int layOutDefaults(CSize client, int left);
     CSize leastClient() const;
     CSize defaultsSize() const;
     CSize margin() const;

@@ -96,6 +96,10 @@ bool passEvent(const Window& window, UINT message) {
     return true;
 }
 
+bool isEventTaken() {
+    return innermost && innermost->source && innermost->source->event->isAccepted();
+}
+
 bool preTranslate(MSG& msg) {
     if (preTranslateDone) {
         return false;

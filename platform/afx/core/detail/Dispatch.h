@@ -42,6 +42,8 @@ public:
 /// Hands the toolkit's event behind the message now being handled on to its widget. False when there is no such event
 /// or when it was handed on already.
 TVX_PLATFORM_API bool passEvent(const Window& window, UINT message);
+/// Whether the widget took the event that was handed on, so that nobody around it is to act on it.
+bool isEventTaken();
 /// Hands an event on to its receiver, past the translation into messages.
 void passToToolkit(EventSource& source);
 /// Whether this event is on its way to the toolkit already; it is so once.

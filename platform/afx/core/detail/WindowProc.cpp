@@ -136,8 +136,8 @@ LRESULT Window::parentProc(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_MOUSEACTIVATE:
         return askParent(MA_ACTIVATE);
     case WM_MOUSEWHEEL:
-        // A wheel that turns over something that does not scroll is for what it stands in.
-        return passEvent(*this, message) ? 0 : askParent(0);
+        // A wheel that turns over something that does not scroll, or not further, is for what it stands in.
+        return passEvent(*this, message) && isEventTaken() ? 0 : askParent(0);
     case WM_CONTEXTMENU:
         if (!m_parent) {
             noteMenuUntaken(wParam);

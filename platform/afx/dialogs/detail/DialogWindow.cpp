@@ -126,9 +126,12 @@ void DialogWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
 void DialogWindow::fixSize() {
     if ((style() & WS_THICKFRAME) == 0) {
         widget()->setFixedSize(widget()->size());
-    } else {
-        widget()->setMinimumSize(0, 0);
-        widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
+        return;
+    }
+    widget()->setMinimumSize(0, 0);
+    widget()->setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
+    if (widget()->isVisible()) {
+        applySizeLimits(*this, QSize(0, 0));
     }
 }
 
