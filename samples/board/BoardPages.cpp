@@ -4,6 +4,8 @@
 #include "Drawing.h"
 #include "Resource.h"
 
+#include <cstdio>
+
 // --- the sheet ---
 
 CBoardPreferences::CBoardPreferences(CWnd* parent) : CPreferences(parent), m_options(theApp.GetOptions()) {
@@ -152,7 +154,7 @@ void CFontsPage::ShowFont(const CString& face) {
 
 void CFontsPage::OnChooseFont() {
     LOGFONT font{};
-    lstrcpyn(font.lfFaceName, m_face, LF_FACESIZE);
+    std::snprintf(font.lfFaceName, sizeof font.lfFaceName, "%s", m_face.GetString());
     font.lfHeight = -static_cast<LONG>(GetDlgItemInt(IDC_PREF_TEXT_SIZE));
     CFontDialog dialog(&font, CF_SCREENFONTS, nullptr, this);
     if (dialog.DoModal() == IDOK) {

@@ -2,12 +2,6 @@
 
 #include "afxdlgs.h"
 
-// clang-format off
-BEGIN_MESSAGE_MAP(CColorButton, CButton)
-    ON_CONTROL_REFLECT_EX(BN_CLICKED, &CColorButton::OnClicked)
-END_MESSAGE_MAP()
-// clang-format on
-
 void CColorButton::SetColor(COLORREF color) {
     m_color = color;
     CString text;
@@ -20,7 +14,8 @@ void CColorButton::DrawItem(DRAWITEMSTRUCT* item) {
     CDC* const dc = CDC::FromHandle(item->hDC);
     CRect area = item->rcItem;
     const bool isPressed = (item->itemState & ODS_SELECTED) != 0;
-    dc->DrawFrameControl(area, DFC_BUTTON, DFCS_BUTTONPUSH | (isPressed ? DFCS_PUSHED : 0U));
+    dc->FillSolidRect(area, GetSysColor(COLOR_BTNFACE));
+    dc->DrawEdge(area, isPressed ? EDGE_SUNKEN : EDGE_RAISED, BF_RECT);
     area.DeflateRect(5, 5);
     dc->FillSolidRect(area, GetSysColor(COLOR_WINDOWTEXT));
     area.DeflateRect(1, 1);
@@ -32,13 +27,18 @@ void CColorButton::DrawItem(DRAWITEMSTRUCT* item) {
     }
 }
 
-BOOL CColorButton::OnClicked() {
-    CColorDialog dialog(m_color, CC_FULLOPEN, GetParent());
+bool CColorButton::Choose() {
+    CColorDialog dialog(m_color, CC_FULLOPEN | CC_RGBINIT, GetParent());
     if (dialog.DoModal() != IDOK || dialog.GetColor() == m_color) {
-        return TRUE;
+        return false;
     }
     SetColor(dialog.GetColor());
-    return FALSE;
+    return true;
+}
+
+BOOL CColorButton::OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) {
+    const bool isClick = message == WM_COMMAND && HIWORD(wParam) == BN_CLICKED;
+    return (isClick && !Choose()) || CButton::OnChildNotify(message, wParam, lParam, result) ? TRUE : FALSE;
 }
 
 void DDX_Color(CDataExchange* dx, int id, CColorButton& button, COLORREF& color) {

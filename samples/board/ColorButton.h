@@ -12,11 +12,12 @@ public:
     void DrawItem(DRAWITEMSTRUCT* item) override;
 
 protected:
-    /// Asks for a colour; the parent hears of the click only when one was chosen.
-    afx_msg BOOL OnClicked();
-    DECLARE_MESSAGE_MAP()
+    /// The parent hears of a click only when a colour was chosen.
+    BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) override;
 
 private:
+    bool Choose();
+
     COLORREF m_color = 0;
 };
 

@@ -9,6 +9,7 @@
 #include "s/Help.h"
 #include "s/Msg.h"
 #include "s/WinApp.h"
+#include "shlwapi.h"
 
 // --- files and folders ---
 

@@ -42,6 +42,7 @@ CPreferences::CPreferences(CWnd* parent)
     SetMemory("Preferences");
     SetPageScrolling(true);
     SetWheelGuard(true);
+    SetReadableBand(true);
 }
 
 CPreferences::~CPreferences() {
