@@ -7,21 +7,27 @@
 
 /// The image-list functions of the common controls' library, each null where it is missing.
 struct ImageListFunctions {
+    /// Loads the library, which lives as long as the object.
     ImageListFunctions();
     ~ImageListFunctions();
     ImageListFunctions(const ImageListFunctions&) = delete;
     ImageListFunctions& operator=(const ImageListFunctions&) = delete;
 
+    /// As the functions of those names.
     HMODULE module = nullptr;
     COLORREF (*setBkColor)(HIMAGELIST list, COLORREF color) = nullptr;
     BOOL (*getImageInfo)(HIMAGELIST list, int index, IMAGEINFO* info) = nullptr;
     BOOL (*draw)(HIMAGELIST list, int index, HDC dc, int x, int y, UINT style) = nullptr;
 };
 
+/// What the dialog knows.
 struct Gui_DirDlg::Record {
+    /// What OK is told of the directory.
     enum class Verdict { Fine, Missing, ReadOnly };
+    /// Places in the image list of folders.
     enum FolderImage { PathImage, CurrentImage, SubdirectoryImage };
 
+    /// The dialog, its pictures and what it was made with.
     Gui_DirDlg* dialog = nullptr;
     CImageList driveImages;
     CImageList folderImages;
@@ -32,6 +38,7 @@ struct Gui_DirDlg::Record {
     int mustExist = 1;
     int mustBeWritable = 1;
 
+    /// Its controls.
     CTreeCtrl tree;
     CComboBox drives;
     CString shownName;           ///< what the field was given: what differs from it was typed
@@ -40,7 +47,7 @@ struct Gui_DirDlg::Record {
     CString newFolder;           ///< the name of the folder that is being made
     ImageListFunctions imageLists;
 
-    // What was asked and is not answered yet. A question that is dropped is answered to nobody.
+    /// What was asked and is not answered yet. A question that is dropped is answered to nobody.
     tvx::Question<tvx::FolderNames> listing;
     tvx::Question<Verdict> verdict;
     tvx::Question<DWORD> creation; ///< the error, 0 for none
@@ -48,6 +55,8 @@ struct Gui_DirDlg::Record {
     /// Milliseconds for which an answer is waited for: a disk of this machine answers sooner, and what takes longer
     /// must not keep the window from being used.
     static constexpr DWORD patience = 50;
+
+    /// The messages that tell of answers.
     static constexpr UINT listed = WM_APP + 1;
     static constexpr UINT checked = WM_APP + 2;
     static constexpr UINT created = WM_APP + 3;

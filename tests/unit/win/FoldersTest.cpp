@@ -30,13 +30,13 @@ protected:
     static Found found(const std::string& pattern) {
         Found all;
         WIN32_FIND_DATAA entry;
-        const HANDLE find = FindFirstFileA(pattern.c_str(), &entry);
+        const HANDLE find = FindFirstFile(pattern.c_str(), &entry);
         if (find == INVALID_HANDLE_VALUE) {
             return all;
         }
         do {
             all.emplace(entry.cFileName, entry.dwFileAttributes);
-        } while (FindNextFileA(find, &entry));
+        } while (FindNextFile(find, &entry));
         EXPECT_EQ(GetLastError(), ERROR_NO_MORE_FILES);
         EXPECT_TRUE(FindClose(find));
         EXPECT_FALSE(FindNextFileA(find, &entry) || FindClose(find));
@@ -79,7 +79,7 @@ TEST_F(Folders, EntriesAreFoundByPatternWithTheirKind) {
 }
 
 TEST_F(Folders, FoldersAreMadeWhereThereIsNone) {
-    EXPECT_TRUE(CreateDirectoryA(drive("new").c_str(), nullptr));
+    EXPECT_TRUE(CreateDirectory(drive("new").c_str(), nullptr));
     EXPECT_TRUE(fs::is_directory("new"));
     EXPECT_FALSE(CreateDirectoryA(drive("new").c_str(), nullptr));
     EXPECT_EQ(GetLastError(), ERROR_ALREADY_EXISTS);

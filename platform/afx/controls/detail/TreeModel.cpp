@@ -95,7 +95,7 @@ void TreeModel::clear() {
 void TreeModel::sort(TreeNode& parent) {
     tellAll(parent);
     const QList<QPersistentModelIndex> parents{QPersistentModelIndex(indexOf(parent))};
-    emit layoutAboutToBeChanged(parents, VerticalSortHint);
+    Q_EMIT layoutAboutToBeChanged(parents, VerticalSortHint);
     const QModelIndexList before = persistentIndexList();
     TreeNodes::sort(parent);
     QModelIndexList after;
@@ -104,13 +104,13 @@ void TreeModel::sort(TreeNode& parent) {
         after.append(createIndex(TreeNodes::rowOf(node), 0, &node));
     }
     changePersistentIndexList(before, after);
-    emit layoutChanged(parents, VerticalSortHint);
+    Q_EMIT layoutChanged(parents, VerticalSortHint);
 }
 
 void TreeModel::changed(TreeNode& node) {
     if (isTold(node)) {
         const QModelIndex index = indexOf(node);
-        emit dataChanged(index, index);
+        Q_EMIT dataChanged(index, index);
     }
 }
 

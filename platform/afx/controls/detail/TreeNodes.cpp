@@ -94,10 +94,9 @@ std::size_t TreeNodes::sortedPlace(const TreeNode& parent, std::string_view text
     if (children.empty() || !isLess(text, children.back()->text)) {
         return children.size();
     }
-    const auto place = std::upper_bound(children.begin(), children.end(), text,
-                                        [](std::string_view wanted, const TreeNode* node) {
-                                            return isLess(wanted, node->text);
-                                        });
+    const auto place =
+        std::upper_bound(children.begin(), children.end(), text,
+                         [](std::string_view wanted, const TreeNode* node) { return isLess(wanted, node->text); });
     return static_cast<std::size_t>(place - children.begin());
 }
 

@@ -22,9 +22,9 @@ struct TreeNode {
     LPARAM data = 0;
     int image = 0;
     int selectedImage = 0;
-    int childrenHint = 0;      ///< As TVITEM::cChildren: 0 goes by the children that there are.
-    int told = 0;              ///< How many of the children the view knows.
-    bool asksText = false;     ///< The host is asked for the text.
+    int childrenHint = 0;  ///< As TVITEM::cChildren: 0 goes by the children that there are.
+    int told = 0;          ///< How many of the children the view knows.
+    bool asksText = false; ///< The host is asked for the text.
     bool isBold = false;
     bool wasExpanded = false;
     bool isUsed = false;

@@ -251,7 +251,7 @@ void TreeWindow::writeState(TreeNode& node, const TVITEM& item) {
     guarded([&] {
         const QModelIndex index = indexOf(node);
         auto* selection = m_area->selectionModel();
-        selection->select(index, !select                    ? QItemSelectionModel::Deselect
+        selection->select(index, !select                ? QItemSelectionModel::Deselect
                                  : m_area->isMultiple() ? QItemSelectionModel::Select
                                                         : QItemSelectionModel::ClearAndSelect);
         if (select && (!m_area->isMultiple() || !m_area->currentIndex().isValid())) {

@@ -7,6 +7,8 @@
 
 #include <QAbstractItemDelegate>
 
+#include <cstring>
+
 namespace tvx::afx {
 
 // --- making ---
@@ -78,7 +80,7 @@ bool TreeWindow::isEditable() const {
 void TreeWindow::setImages(HIMAGELIST images) {
     m_images = images;
     m_area->setIconSize(imageSizeOf(images));
-    m_area->scheduleDelayedItemsLayout();
+    m_area->doItemsLayout();
 }
 
 QIcon TreeWindow::iconOf(const TreeNode& node) {
@@ -115,9 +117,7 @@ void TreeWindow::selectionSettled(TreeCause cause) {
     m_selectionMoved = false;
     NMTREEVIEW told = about(nodes().find(now));
     told.itemOld = about(nodes().find(std::exchange(m_toldCaret, now))).itemNew;
-    told.action = cause == TreeCause::Mouse      ? TVC_BYMOUSE
-                  : cause == TreeCause::Keyboard ? TVC_BYKEYBOARD
-                                                 : TVC_UNKNOWN;
+    told.action = cause == TreeCause::Mouse ? TVC_BYMOUSE : cause == TreeCause::Keyboard ? TVC_BYKEYBOARD : TVC_UNKNOWN;
     tell(told.hdr, TVN_SELCHANGED);
 }
 
@@ -308,7 +308,8 @@ LRESULT TreeWindow::viewProc(UINT message, WPARAM wParam, LPARAM lParam, bool& k
     case TVM_ENSUREVISIBLE:
         return ensureVisible(item) ? TRUE : FALSE;
     case TVM_EDITLABEL:
-        return editLabel(item) ? TRUE : FALSE;
+        editLabel(item);
+        return 0;
     case TVM_GETITEMRECT:
         return itemRect(reinterpret_cast<RECT*>(lParam), wParam != 0);
     case TVM_HITTEST:
