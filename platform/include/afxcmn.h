@@ -8,4 +8,5 @@
 #include "platform/afx/controls/HotKey.h"
 #include "platform/afx/controls/ImageList.h"
 #include "platform/afx/controls/ToolTip.h"
+#include "platform/afx/controls/TreeCtrl.h"
 #include "platform/include/afxwin.h"

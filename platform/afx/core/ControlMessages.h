@@ -61,6 +61,10 @@
 #define EM_GETLIMITTEXT 0x00D5
 
 // Tabs of property sheets
+#define NM_CLICK (static_cast<UINT>(-2))
+#define NM_DBLCLK (static_cast<UINT>(-3))
+#define NM_RETURN (static_cast<UINT>(-4))
+#define NM_RCLICK (static_cast<UINT>(-5))
 #define TCN_SELCHANGE (static_cast<UINT>(-551))
 
 // List boxes
