@@ -20,9 +20,9 @@ ON_BN_CLICKED(GUI_IDC_HELP, &Gui_DirDlg::OnHelp)
 ON_WM_DRAWITEM()
 ON_WM_HELPINFO()
 ON_WM_SETCURSOR()
-ON_MESSAGE(Record::listed, &Gui_DirDlg::OnListed)
-ON_MESSAGE(Record::checked, &Gui_DirDlg::OnChecked)
-ON_MESSAGE(Record::created, &Gui_DirDlg::OnCreated)
+ON_REGISTERED_MESSAGE(Record::listed, &Gui_DirDlg::OnListed)
+ON_REGISTERED_MESSAGE(Record::checked, &Gui_DirDlg::OnChecked)
+ON_REGISTERED_MESSAGE(Record::created, &Gui_DirDlg::OnCreated)
 END_MESSAGE_MAP()
 
 namespace {

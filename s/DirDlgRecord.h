@@ -57,9 +57,9 @@ struct Gui_DirDlg::Record {
     static constexpr DWORD patience = 50;
 
     /// The messages that tell of answers.
-    static constexpr UINT listed = WM_APP + 1;
-    static constexpr UINT checked = WM_APP + 2;
-    static constexpr UINT created = WM_APP + 3;
+    inline static const UINT listed = RegisterWindowMessageA("Gui_DirDlg.listed");
+    inline static const UINT checked = RegisterWindowMessageA("Gui_DirDlg.checked");
+    inline static const UINT created = RegisterWindowMessageA("Gui_DirDlg.created");
 
     /// Whether an answer has come. Otherwise the dialog is told of it by a message.
     template <class Answer>

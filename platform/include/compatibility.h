@@ -7,6 +7,7 @@
 
 #include "platform/base/Text.h"
 #include "platform/base/Types.h"
+#include "platform/win/FindFile.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -45,12 +46,6 @@ using PVOID = void*;
 using PBYTE = BYTE*;
 using errno_t = int;
 
-/// A moment in units of 100 nanoseconds since 1601. Nothing here tells or takes one.
-struct FILETIME {
-    /// The halves of the number.
-    DWORD dwLowDateTime;
-    DWORD dwHighDateTime;
-};
 /// A moment in parts. Nothing here tells or takes one.
 struct SYSTEMTIME {
     /// Months begin with 1, days of the week with 0 for Sunday.

@@ -16,8 +16,9 @@
 #include "platform/base/Types.h"
 #include "platform/win/Files.h"
 
-/// A moment, in units of 100 nanoseconds since 1601.
+/// A moment in units of 100 nanoseconds since 1601. Nothing here tells or takes one.
 struct FILETIME {
+    /// The halves of the number.
     DWORD dwLowDateTime;
     DWORD dwHighDateTime;
 };
