@@ -3,6 +3,7 @@
 #include "platform/base/Text.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace tvx::afx {
 
@@ -13,14 +14,6 @@ constexpr std::uint32_t generations = 0x7FFFFFFF;
 
 bool isLess(std::string_view left, std::string_view right) {
     return text::compareNoCase(left, right) < 0;
-}
-
-int depthOf(const TreeNode& node) {
-    int depth = 0;
-    for (const TreeNode* above = node.parent; above; above = above->parent) {
-        ++depth;
-    }
-    return depth;
 }
 
 } // namespace
@@ -58,6 +51,7 @@ TreeNode& TreeNodes::take() {
     }
     TreeNode& node = at(slot);
     node.slot = static_cast<std::uint32_t>(slot);
+    node.generation = std::max(node.generation, 1U); // so that no small number is a handle
     node.isUsed = true;
     ++m_count;
     return node;
@@ -67,6 +61,7 @@ void TreeNodes::release(TreeNode& node) {
     for (TreeNode* child : node.children) {
         release(*child);
     }
+    select(node, false);
     const std::uint32_t slot = node.slot;
     const std::uint32_t generation = (node.generation + 1) % generations;
     node = TreeNode();
@@ -120,25 +115,16 @@ void TreeNodes::remove(TreeNode& node) {
     release(node);
 }
 
-void TreeNodes::clear() {
-    for (TreeNode* child : m_root.children) {
-        release(*child);
-    }
-    m_root.children.clear();
-    m_root.counted = 0;
-    m_root.told = 0;
-}
-
-void TreeNodes::sort(TreeNode& parent) {
-    std::stable_sort(parent.children.begin(), parent.children.end(),
-                     [](const TreeNode* left, const TreeNode* right) { return isLess(left->text, right->text); });
+void TreeNodes::order(TreeNode& parent, std::vector<TreeNode*> children) {
+    parent.children = std::move(children);
     parent.counted = 0;
 }
 
 TreeNode* TreeNodes::next(TreeNode& node) {
-    if (!node.children.empty()) {
-        return node.children.front();
-    }
+    return node.children.empty() ? nextBehind(node) : node.children.front();
+}
+
+TreeNode* TreeNodes::nextBehind(TreeNode& node) {
     for (TreeNode* at = &node; at->parent; at = at->parent) {
         const auto row = static_cast<std::size_t>(rowOf(*at));
         if (row + 1 < at->parent->children.size()) {
@@ -148,26 +134,27 @@ TreeNode* TreeNodes::next(TreeNode& node) {
     return nullptr;
 }
 
-bool TreeNodes::isBefore(TreeNode& left, TreeNode& right) {
-    TreeNode* first = &left;
-    TreeNode* second = &right;
-    int firstDepth = depthOf(left);
-    int secondDepth = depthOf(right);
-    const bool isShallower = firstDepth < secondDepth;
-    for (; firstDepth > secondDepth; --firstDepth) {
-        first = first->parent;
+bool TreeNodes::isBelow(const TreeNode& node, const TreeNode& above) {
+    for (const TreeNode* at = node.parent; at; at = at->parent) {
+        if (at == &above) {
+            return true;
+        }
     }
-    for (; secondDepth > firstDepth; --secondDepth) {
-        second = second->parent;
+    return false;
+}
+
+// --- selection ---
+
+void TreeNodes::select(TreeNode& node, bool selected) {
+    if (std::exchange(node.isSelected, selected) != selected) {
+        m_selectedCount += selected ? 1 : -1;
     }
-    if (first == second) {
-        return isShallower; // one lies below the other
+}
+
+void TreeNodes::selectNone() {
+    for (std::size_t slot = 0; slot < m_taken && m_selectedCount > 0; ++slot) {
+        select(at(slot), false);
     }
-    while (first->parent != second->parent) {
-        first = first->parent;
-        second = second->parent;
-    }
-    return rowOf(*first) < rowOf(*second);
 }
 
 } // namespace tvx::afx

@@ -23,10 +23,11 @@ struct TreeNode {
     int image = 0;
     int selectedImage = 0;
     int childrenHint = 0;  ///< As TVITEM::cChildren: 0 goes by the children that there are.
-    int told = 0;          ///< How many of the children the view knows.
     bool asksText = false; ///< The host is asked for the text.
     bool isBold = false;
+    bool isExpanded = false;
     bool wasExpanded = false;
+    bool isSelected = false; ///< TreeNodes::select sets it.
     bool isUsed = false;
 
     /// For TreeNodes: the place in its tables, how often that was used before, and the row as it was last counted.
@@ -34,6 +35,7 @@ struct TreeNode {
     std::uint32_t generation = 0;
     std::uint32_t row = 0;
     std::uint32_t counted = 0; ///< How many children, from the first, have the right row.
+    std::uint32_t shown = 0;   ///< For TreeRows: the line that shows it.
 };
 
 /// The nodes of a tree below one root, which is no item. Rows count from 0.
@@ -69,14 +71,21 @@ public:
     TreeNode& insert(TreeNode& parent, std::size_t row);
     /// Ends a node with all below it.
     void remove(TreeNode& node);
-    void clear();
-    /// Puts the children in order, as sortedPlace would have.
-    static void sort(TreeNode& parent);
+    /// Puts the children in another order.
+    static void order(TreeNode& parent, std::vector<TreeNode*> children);
 
-    /// The next node in the order shown, with what is below collapsed ones; null behind the last.
+    /// The next node in the order of the tree, in which what is below a node follows it; null behind the last.
     static TreeNode* next(TreeNode& node);
-    /// Whether one comes before the other in that order.
-    static bool isBefore(TreeNode& left, TreeNode& right);
+    /// The next one that is not below it.
+    static TreeNode* nextBehind(TreeNode& node);
+    /// Whether a node is below another one, however deep.
+    static bool isBelow(const TreeNode& node, const TreeNode& above);
+
+    void select(TreeNode& node, bool selected);
+    void selectNone();
+    std::size_t selectedCount() const {
+        return m_selectedCount;
+    }
 
 private:
     static constexpr std::size_t chunkSize = 256;
@@ -92,6 +101,7 @@ private:
     std::vector<std::uint32_t> m_free;
     std::size_t m_taken = 0;
     std::size_t m_count = 0;
+    std::size_t m_selectedCount = 0;
 };
 
 } // namespace tvx::afx

@@ -1,63 +1,59 @@
-// How a tree looks, what is selected and expanded in it, and what the user does with it.
-
+#include "platform/afx/controls/detail/AccessibleTree.h"
 #include "platform/afx/controls/detail/ImageListData.h"
+#include "platform/afx/controls/detail/TreeArea.h"
 #include "platform/afx/controls/detail/TreeWindow.h"
 #include "platform/afx/core/detail/Connect.h"
 #include "platform/afx/core/detail/Loop.h"
 
-#include <QAbstractItemDelegate>
+#include <QAccessible>
+#include <QCoreApplication>
+#include <QScrollBar>
+#include <QStyle>
+#include <QTimer>
 
 #include <cstring>
+
+// The lines of a tree, and where they stand.
 
 namespace tvx::afx {
 
 // --- making ---
 
 QWidget* TreeWindow::makeWidget(QWidget* parent) {
-    m_model = new TreeModel(*this, nullptr);
-    m_area = new TreeArea(parent, *m_model, *this);
-    m_model->setParent(m_area);
-    connectStoring(m_area, &QTreeView::expanded, m_area,
-                   [this](const QModelIndex& index) { m_model->nodeOf(index).wasExpanded = true; });
-    connectStoring(m_area->selectionModel(), &QItemSelectionModel::selectionChanged, m_area, [this] {
-        m_selected.clear();
-        m_selectionMoved = true;
-        // Assistive tools select without keys and buttons.
-        if (!m_area->isInAction() && !m_area->isQuiet()) {
-            selectionSettled(TreeCause::Unknown);
-        }
-    });
-    connectStoring(m_area->itemDelegate(), &QAbstractItemDelegate::closeEditor, m_area, [this] {
-        const HTREEITEM item = std::exchange(m_edited, nullptr);
-        if (item && !m_labelTaken) {
-            NMTVDISPINFO given{};
-            given.item.mask = TVIF_HANDLE;
-            given.item.hItem = item;
-            tell(given.hdr, TVN_ENDLABELEDIT);
-        }
-    });
+    m_area = new TreeArea(parent, *this);
+    m_editLater = new QTimer(m_area);
+    m_editLater->setSingleShot(true);
+    connectStoring(m_editLater, &QTimer::timeout, m_area, [this] { editLabel(m_caret); });
+    answerForTrees();
     return m_area;
 }
 
 void TreeWindow::widgetMade() {
-    applyStyle();
+    applyBars();
     Control::widgetMade();
 }
 
-void TreeWindow::applyStyle() {
+int TreeWindow::accessibleRole() const {
+    return QAccessible::Tree;
+}
+
+void TreeWindow::applyBars() {
     m_area->setFrameStyle(hasBorder() ? QFrame::StyledPanel | QFrame::Sunken : QFrame::NoFrame);
-    m_area->setButtons((style() & TVS_HASBUTTONS) != 0, (style() & TVS_LINESATROOT) != 0);
-    m_area->setShowsSelectionAlways((style() & TVS_SHOWSELALWAYS) != 0);
-    m_area->setMultiple((m_treeStyle & TVS_EX_MULTISELECT) != 0);
+    refresh();
 }
 
 void TreeWindow::styleChanged(DWORD oldStyle, DWORD oldExStyle) {
     Control::styleChanged(oldStyle, oldExStyle);
-    applyStyle();
+    guarded([this] { applyBars(); });
 }
 
-void TreeWindow::focusMoved(bool) {
-    m_area->viewport()->update(); // what is selected looks different with the keyboard
+void TreeWindow::fontChanged() {
+    Control::fontChanged();
+    setImages(m_images);
+}
+
+void TreeWindow::applyColors(QPalette& palette, const QColor& text, const QColor& background) const {
+    applyFieldColors(palette, text, background);
 }
 
 QWidget* TreeWindow::clientWidget() const {
@@ -69,271 +65,355 @@ QRect TreeWindow::clientRect() const {
 }
 
 UINT TreeWindow::dialogCode(const MSG*) const {
-    // While a label is edited, Enter and Escape end that and not the dialog.
-    return m_edited ? DLGC_WANTALLKEYS : DLGC_WANTARROWS | DLGC_WANTCHARS;
+    return DLGC_WANTARROWS | DLGC_WANTCHARS;
 }
 
-bool TreeWindow::isEditable() const {
-    return (style() & TVS_EDITLABELS) != 0;
+void TreeWindow::focusMoved(bool) {
+    refresh();
+    tellCaret();
 }
 
-void TreeWindow::setImages(HIMAGELIST images) {
-    m_images = images;
-    m_area->setIconSize(imageSizeOf(images));
-    m_area->doItemsLayout();
+/// Lines are as high as their text, or as their pictures where those are higher.
+HIMAGELIST TreeWindow::setImages(HIMAGELIST images) {
+    constexpr int textMargin = 4;
+    constexpr int imageMargin = 2;
+    const HIMAGELIST before = std::exchange(m_images, images);
+    m_rowHeight = std::max(m_area->fontMetrics().height() + textMargin, imageSizeOf(m_images).height() + imageMargin);
+    m_extent = 0;
+    contentChanged();
+    return before;
 }
 
-QIcon TreeWindow::iconOf(const TreeNode& node) {
-    if (!m_images) {
-        return {};
+DWORD TreeWindow::setTreeStyle(DWORD mask, DWORD style) {
+    const DWORD before = m_treeStyle;
+    mask = mask != 0 ? mask : ~DWORD{0};
+    m_treeStyle = (before & ~mask) | (style & mask & TVS_EX_MULTISELECT);
+    TreeNode* caret = m_nodes.find(m_caret);
+    if (!isMultiple() && m_nodes.selectedCount() > 0) {
+        m_nodes.selectNone();
+        pick(caret, Pick::Only);
     }
-    const bool isSelected = TreeNodes::handleOf(&node) == caret();
-    QIcon icon(imageOf(m_images, isSelected ? node.selectedImage : node.image));
-    return icon;
+    refresh();
+    return before;
 }
 
-// --- selection ---
+// --- lines and scrolling ---
 
-HTREEITEM TreeWindow::caret() const {
-    const QModelIndex index = m_area->currentIndex();
-    const bool counts = m_area->isMultiple() || m_area->selectionModel()->isSelected(index);
-    return counts ? TreeNodes::handleOf(&m_model->nodeOf(index)) : nullptr;
-}
-
-bool TreeWindow::maySelect(TreeNode& node) {
-    NMTREEVIEW told = about(&node);
-    told.itemOld = about(nodes().find(m_toldCaret)).itemNew;
-    told.action = TVC_UNKNOWN;
-    const HWND self = handle();
-    const bool refused = tell(told.hdr, TVN_SELCHANGING) != 0;
-    return !refused && from(self);
-}
-
-void TreeWindow::selectionSettled(TreeCause cause) {
-    const HTREEITEM now = caret();
-    if (now == m_toldCaret && !(m_selectionMoved && m_area->isMultiple())) {
+/// Has lines counted and all painted when the loop comes to it, or when a question depends on it.
+void TreeWindow::contentChanged() {
+    refresh();
+    if (std::exchange(m_layoutDue, true)) {
         return;
     }
-    m_selectionMoved = false;
-    NMTREEVIEW told = about(nodes().find(now));
-    told.itemOld = about(nodes().find(std::exchange(m_toldCaret, now))).itemNew;
-    told.action = cause == TreeCause::Mouse ? TVC_BYMOUSE : cause == TreeCause::Keyboard ? TVC_BYKEYBOARD : TVC_UNKNOWN;
-    tell(told.hdr, TVN_SELCHANGED);
+    // The widget lives a little longer than the tree.
+    const auto later = [self = handle()] {
+        if (auto* tree = dynamic_cast<TreeWindow*>(from(self))) {
+            storing([tree] { tree->layOut(); });
+        }
+    };
+    QMetaObject::invokeMethod(m_area, later, Qt::QueuedConnection);
 }
 
-LRESULT TreeWindow::selectItem(HTREEITEM item) {
-    TreeNode* node = nodes().find(item);
-    if (item && !node) {
-        return FALSE;
+void TreeWindow::refresh() {
+    if (!m_frozen && widget()) {
+        m_area->viewport()->update();
     }
-    if (item != caret() && !maySelect(node ? *node : nodes().root())) {
-        return FALSE;
+}
+
+void TreeWindow::setRedraw(bool redraw) {
+    m_frozen = !redraw;
+    refresh();
+}
+
+void TreeWindow::layOut() {
+    if (m_layoutDue && !isDestroyed()) {
+        m_layoutDue = false;
+        applyRange();
     }
-    node = nodes().find(item); // the parent may have changed what there is
-    const QModelIndex index = node ? indexOf(*node) : QModelIndex();
-    const HWND self = handle();
-    guarded([&] {
-        const TreeArea::Quiet quiet(*m_area);
-        m_area->selectionModel()->setCurrentIndex(index, index.isValid() ? QItemSelectionModel::ClearAndSelect
-                                                                         : QItemSelectionModel::Clear);
+}
+
+void TreeWindow::applyRange() {
+    if (!widget()) {
+        return;
+    }
+    guarded([this] {
+        QScrollBar* vertical = m_area->verticalScrollBar();
+        const int last = std::max(m_rows.size() - pageRows(), 0);
+        const int before = top();
+        {
+            // Lines that came or went above the first one must not move it.
+            const QSignalBlocker quiet(vertical->isVisible() == (last > 0) ? vertical : nullptr);
+            vertical->setPageStep(pageRows());
+            vertical->setRange(0, last);
+            vertical->setValue(before > 0 ? rowOfTop(before) : 0);
+        }
+        measure();
     });
-    if (from(self)) {
-        selectionSettled(TreeCause::Unknown);
+    if (!isDestroyed()) {
+        keepTop();
+        showBars();
+        placeField();
     }
-    return TRUE;
+}
+
+/// Where the item that was in the first line is now, or what it is in.
+int TreeWindow::rowOfTop(int before) const {
+    for (const TreeNode* node = m_nodes.find(m_top); node && node->parent; node = node->parent) {
+        if (const int row = m_rows.rowOf(*node); row >= 0) {
+            return row;
+        }
+    }
+    return before;
+}
+
+void TreeWindow::keepTop() {
+    m_top = TreeNodes::handleOf(m_rows.at(top()));
+}
+
+/// Has the bar below go as far as the widest of the lines that were seen. The others are not measured.
+void TreeWindow::measure() {
+    const int first = top();
+    for (int row = first; row < first + visibleRows() + 1 && !isDestroyed(); ++row) {
+        const TreeNode* node = m_rows.at(row);
+        if (!node) {
+            break;
+        }
+        const HTREEITEM item = TreeNodes::handleOf(node);
+        const TreeLook look = lookOf(item);
+        if ((node = m_nodes.find(item))) {
+            const QRect label = labelRect(*node, look.text);
+            m_extent = std::max(m_extent, label.right() + 1 + m_area->horizontalScrollBar()->value());
+        }
+    }
+    if (isDestroyed()) {
+        return;
+    }
+    QScrollBar* horizontal = m_area->horizontalScrollBar();
+    horizontal->setPageStep(m_area->viewport()->width());
+    horizontal->setSingleStep(m_area->fontMetrics().averageCharWidth() * 2);
+    horizontal->setRange(0, std::max(m_extent - m_area->viewport()->width(), 0));
+}
+
+/// The toolkit shows and hides bars when the loop comes to it. Who scrolls to an item before that must not be told of
+/// room that a bar takes.
+void TreeWindow::showBars() {
+    const auto isLate = [](const QScrollBar* bar) { return bar->parentWidget()->isHidden() == (bar->maximum() > 0); };
+    if (m_showsBars || (!isLate(m_area->horizontalScrollBar()) && !isLate(m_area->verticalScrollBar()))) {
+        return;
+    }
+    m_showsBars = true;
+    QEvent request(QEvent::LayoutRequest);
+    guarded([&] { QCoreApplication::sendEvent(m_area, &request); });
+    m_showsBars = false;
+}
+
+void TreeWindow::scrolled() {
+    if (!isDestroyed() && !m_layoutDue) {
+        keepTop();
+        measure();
+        placeField();
+    }
+    refresh();
+}
+
+void TreeWindow::resized() {
+    applyRange();
+}
+
+int TreeWindow::top() const {
+    return m_area->verticalScrollBar()->value();
+}
+
+void TreeWindow::setTop(int row) {
+    guarded([&] { m_area->verticalScrollBar()->setValue(row); });
+}
+
+/// Lines that are wholly seen.
+int TreeWindow::pageRows() const {
+    return std::max(m_area->viewport()->height() / m_rowHeight, 1);
+}
+
+/// Those that are seen in part as well.
+int TreeWindow::visibleRows() const {
+    return (m_area->viewport()->height() + m_rowHeight - 1) / m_rowHeight;
+}
+
+void TreeWindow::showRow(int row) {
+    if (row < top()) {
+        setTop(row);
+    } else if (row >= top() + pageRows()) {
+        setTop(row - pageRows() + 1);
+    }
+}
+
+/// Scrolls sideways as far as it takes to see a label, its beginning before its end.
+void TreeWindow::showSideways(HTREEITEM item) {
+    const TreeLook look = lookOf(item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
+    if (!node) {
+        return;
+    }
+    const QRect label = labelRect(*node, look.text);
+    const int start = left(*node);
+    QScrollBar* bar = m_area->horizontalScrollBar();
+    const int beyond = label.right() + 1 - m_area->viewport()->width();
+    guarded([&] {
+        if (start < 0) {
+            bar->setValue(bar->value() + start);
+        } else if (beyond > 0) {
+            bar->setValue(bar->value() + std::min(beyond, start));
+        }
+    });
 }
 
 bool TreeWindow::ensureVisible(HTREEITEM item) {
-    TreeNode* node = nodes().find(item);
-    if (!node) {
+    const bool opened = openAround(item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
+    const int row = node ? m_rows.rowOf(*node) : -1;
+    if (row < 0) {
         return false;
     }
-    for (TreeNode* above = node->parent; above && above->parent; above = above->parent) {
-        setExpanded(*above, true);
+    layOut();
+    const int before = top();
+    showRow(row);
+    showSideways(item);
+    return opened || (!isDestroyed() && before != top());
+}
+
+bool TreeWindow::showFirst(HTREEITEM item) {
+    openAround(item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
+    const int row = node ? m_rows.rowOf(*node) : -1;
+    if (row < 0) {
+        return false;
     }
-    guarded([&] { m_area->scrollTo(indexOf(*node)); });
+    layOut();
+    setTop(row);
     return true;
-}
-
-// --- expansion ---
-
-bool TreeWindow::tellExpansion(UINT code, TreeNode& node, bool expand) {
-    NMTREEVIEW told = about(&node);
-    told.action = expand ? TVE_EXPAND : TVE_COLLAPSE;
-    return tell(told.hdr, code) == 0;
-}
-
-void TreeWindow::setExpanded(TreeNode& node, bool expand) {
-    guarded([&] {
-        const QModelIndex index = indexOf(node);
-        if (expand) {
-            m_model->tellAll(node); // before it is laid out, not while it is
-        }
-        m_area->setExpanded(index, expand);
-    });
-}
-
-LRESULT TreeWindow::expandItem(HTREEITEM item, UINT how, bool byUser) {
-    TreeNode* node = nodes().find(item);
-    if (!node || !hasChildren(*node)) {
-        return FALSE;
-    }
-    const bool isOpen = m_area->isExpanded(indexOf(*node));
-    const bool expand = how == TVE_TOGGLE ? !isOpen : how == TVE_EXPAND;
-    const bool tells = byUser || !node->wasExpanded; // hosts that expand again know what is there
-    if (expand == isOpen || (tells && !tellExpansion(TVN_ITEMEXPANDING, *node, expand))) {
-        return FALSE;
-    }
-    node = nodes().find(item);
-    if (!node || node->children.empty()) {
-        return FALSE;
-    }
-    TreeNode* below = nodes().find(caret());
-    while (below && below != node) {
-        below = below->parent;
-    }
-    if (!expand && below && caret() != item) {
-        selectItem(item); // the keyboard does not stay on what is not seen
-    }
-    setExpanded(*node, expand);
-    if (tells) {
-        tellExpansion(TVN_ITEMEXPANDED, *node, expand);
-    }
-    return TRUE;
-}
-
-void TreeWindow::toggle(TreeNode& node, bool expand) {
-    expandItem(TreeNodes::handleOf(&node), expand ? TVE_EXPAND : TVE_COLLAPSE, true);
-}
-
-// --- labels ---
-
-bool TreeWindow::editLabel(HTREEITEM item) {
-    TreeNode* node = nodes().find(item);
-    if (!node || !isEditable()) {
-        return false;
-    }
-    std::string text = fromQt(textOf(*node));
-    NMTVDISPINFO asked{};
-    asked.item.mask = TVIF_HANDLE | TVIF_TEXT | TVIF_PARAM;
-    asked.item.hItem = item;
-    asked.item.lParam = node->data;
-    asked.item.pszText = text.data();
-    if (tell(asked.hdr, TVN_BEGINLABELEDIT) != 0 || !nodes().find(item)) {
-        return false;
-    }
-    ensureVisible(item);
-    m_edited = item;
-    m_labelTaken = false;
-    guarded([&] { m_area->edit(indexOf(*nodes().find(item))); });
-    return true;
-}
-
-void TreeWindow::labelEdited(HTREEITEM item, const QString& text) {
-    m_labelTaken = true;
-    std::string given = fromQt(text);
-    NMTVDISPINFO told{};
-    told.item.mask = TVIF_HANDLE | TVIF_TEXT;
-    told.item.hItem = item;
-    told.item.pszText = given.data();
-    told.item.cchTextMax = static_cast<int>(given.size()) + 1;
-    const HWND self = handle();
-    const bool isTaken = tell(told.hdr, TVN_ENDLABELEDIT) != 0;
-    TreeNode* node = isTaken && from(self) ? nodes().find(item) : nullptr;
-    if (node) {
-        node->text = told.item.pszText ? told.item.pszText : std::string();
-        node->asksText = false;
-        m_model->changed(*node);
-    }
-}
-
-void TreeWindow::startEditing(TreeNode& node) {
-    editLabel(TreeNodes::handleOf(&node));
-}
-
-bool TreeWindow::tellMouse(UINT code) {
-    NMHDR header{};
-    return tell(header, code) != 0;
 }
 
 // --- places ---
 
-/// @param rect holds the item's handle, and receives its place
-LRESULT TreeWindow::itemRect(RECT* rect, bool labelOnly) {
-    HTREEITEM item = nullptr;
-    std::memcpy(static_cast<void*>(&item), rect, sizeof item);
-    TreeNode* node = nodes().find(item);
-    const QModelIndex index = node ? indexOf(*node) : QModelIndex();
-    QRect place = m_area->visualRect(index);
-    if (!place.isValid()) {
-        return FALSE;
+/// Whether the topmost items have room for a button before them.
+bool TreeWindow::hasRootColumn() const {
+    return (style() & TVS_LINESATROOT) != 0 && (style() & (TVS_HASBUTTONS | TVS_HASLINES)) != 0;
+}
+
+int TreeWindow::indent() const {
+    return m_area->style()->pixelMetric(QStyle::PM_TreeViewIndentation, nullptr, m_area);
+}
+
+int TreeWindow::depthOf(const TreeNode& node) const {
+    int depth = hasRootColumn() ? 1 : 0;
+    for (const TreeNode* above = node.parent; above && above->parent; above = above->parent) {
+        ++depth;
     }
-    if (labelOnly) {
-        place = m_area->labelRect(index);
-    } else {
-        place.setLeft(0);
-        place.setRight(m_area->viewport()->width() - 1);
+    return depth;
+}
+
+/// Where an item's picture or label begins, in client coordinates.
+int TreeWindow::left(const TreeNode& node) const {
+    return depthOf(node) * indent() - m_area->horizontalScrollBar()->value();
+}
+
+/// The toolkit's margin on both sides of a picture or text.
+int TreeWindow::margin() const {
+    return m_area->style()->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, m_area) + 1;
+}
+
+int TreeWindow::imageWidth() const {
+    const int width = imageSizeOf(m_images).width();
+    return width > 0 ? width + 2 * margin() : 0;
+}
+
+QRect TreeWindow::rowRect(const TreeNode& node) const {
+    const int row = m_rows.rowOf(node);
+    if (row < 0) {
+        return {};
     }
-    *rect = fromQt(place);
-    return TRUE;
+    const int start = left(node);
+    const int width = m_area->viewport()->width();
+    const int end = std::max(width, m_extent - m_area->horizontalScrollBar()->value());
+    return {start, (row - top()) * m_rowHeight, end - start, m_rowHeight};
+}
+
+QRect TreeWindow::labelRect(const TreeNode& node, const QString& text) const {
+    QFont font = m_area->font();
+    font.setBold(font.bold() || node.isBold);
+    const QRect line = rowRect(node);
+    const int width = QFontMetrics(font).horizontalAdvance(text) + 2 * margin();
+    return {line.left() + imageWidth(), line.top(), width, line.height()};
+}
+
+/// The place of an item's button, whether it has one or not; empty where none could be.
+QRect TreeWindow::buttonRect(const TreeNode& node) const {
+    const bool hasColumn = node.parent && (node.parent->parent || hasRootColumn());
+    if ((style() & TVS_HASBUTTONS) == 0 || !hasColumn) {
+        return {};
+    }
+    const QRect line = rowRect(node);
+    return {line.left() - indent(), line.top(), indent(), line.height()};
+}
+
+HTREEITEM TreeWindow::itemAt(int y) const {
+    return y >= 0 ? TreeNodes::handleOf(m_rows.at(top() + y / m_rowHeight)) : nullptr;
+}
+
+TreeWindow::Hit TreeWindow::hit(QPoint point) {
+    const QRect area = clientRect();
+    if (!area.contains(point)) {
+        const UINT aside = point.x() < 0 ? TVHT_TOLEFT : point.x() >= area.width() ? TVHT_TORIGHT : 0U;
+        const UINT over = point.y() < 0 ? TVHT_ABOVE : point.y() >= area.height() ? TVHT_BELOW : 0U;
+        return {nullptr, aside | over};
+    }
+    layOut();
+    const HTREEITEM item = itemAt(point.y());
+    const TreeLook look = lookOf(item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
+    if (!node) {
+        return {};
+    }
+    const QRect label = labelRect(*node, look.text);
+    const bool onButton = look.hasButton && buttonRect(*node).contains(point);
+    return {item, onButton                     ? UINT{TVHT_ONITEMBUTTON}
+                  : point.x() < left(*node)    ? UINT{TVHT_ONITEMINDENT}
+                  : point.x() < label.left()   ? UINT{TVHT_ONITEMICON}
+                  : point.x() <= label.right() ? UINT{TVHT_ONITEMLABEL}
+                                               : UINT{TVHT_ONITEMRIGHT}};
 }
 
 LRESULT TreeWindow::hitTest(TVHITTESTINFO& info) {
-    m_area->layOut();
-    const QPoint point(info.pt.x, info.pt.y);
-    const QModelIndex index = m_area->indexAt(point);
-    info.hItem = nullptr;
-    info.flags = TVHT_NOWHERE;
-    if (!index.isValid()) {
-        return 0;
-    }
-    const QRect label = m_area->labelRect(index);
-    const int iconEnd = label.left() + (m_images ? m_area->iconSize().width() : 0);
-    info.hItem = TreeNodes::handleOf(&m_model->nodeOf(index));
-    info.flags = m_area->buttonRect(index).contains(point) ? TVHT_ONITEMBUTTON
-                 : point.x() < label.left()                ? TVHT_ONITEMINDENT
-                 : point.x() < iconEnd                     ? TVHT_ONITEMICON
-                 : point.x() <= label.right()              ? TVHT_ONITEMLABEL
-                                                           : TVHT_ONITEMRIGHT;
-    return reinterpret_cast<LRESULT>(info.hItem);
+    const Hit found = hit(toQt(info.pt));
+    info.hItem = found.item;
+    info.flags = found.part;
+    return reinterpret_cast<LRESULT>(found.item);
 }
 
-LRESULT TreeWindow::viewProc(UINT message, WPARAM wParam, LPARAM lParam, bool& known) {
-    const auto item = reinterpret_cast<HTREEITEM>(lParam);
-    switch (message) {
-    case TVM_SELECTITEM:
-        return wParam == TVGN_CARET ? selectItem(item) : FALSE;
-    case TVM_EXPAND:
-        return expandItem(item, static_cast<UINT>(wParam), false);
-    case TVM_ENSUREVISIBLE:
-        return ensureVisible(item) ? TRUE : FALSE;
-    case TVM_EDITLABEL:
-        editLabel(item);
-        return 0;
-    case TVM_GETITEMRECT:
-        return itemRect(reinterpret_cast<RECT*>(lParam), wParam != 0);
-    case TVM_HITTEST:
-        return hitTest(*reinterpret_cast<TVHITTESTINFO*>(lParam));
-    case TVM_GETIMAGELIST:
-        return reinterpret_cast<LRESULT>(m_images);
-    case TVM_SETIMAGELIST: {
-        const HIMAGELIST before = m_images;
-        setImages(reinterpret_cast<HIMAGELIST>(lParam));
-        return reinterpret_cast<LRESULT>(before);
+/// @param rect holds the item, and receives its place
+LRESULT TreeWindow::itemRect(RECT* rect, bool textOnly) {
+    HTREEITEM item = nullptr;
+    std::memcpy(static_cast<void*>(&item), rect, sizeof item);
+    layOut();
+    const TreeLook look = lookOf(item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
+    const QRect line = node ? rowRect(*node) : QRect();
+    if (line.isEmpty()) {
+        return FALSE;
     }
-    case TVM_SETEXTENDEDSTYLE: {
-        const auto mask = wParam != 0 ? static_cast<DWORD>(wParam) : ~0U;
-        const DWORD before = m_treeStyle;
-        m_treeStyle = (before & ~mask) | (static_cast<DWORD>(lParam) & mask);
-        applyStyle();
-        return static_cast<LRESULT>(before);
+    const QRect whole(0, line.top(), m_area->viewport()->width(), line.height());
+    *rect = fromQt(textOnly ? labelRect(*node, look.text) : whole);
+    return TRUE;
+}
+
+QString TreeWindow::tipAt(QPoint point) {
+    const Hit found = hit(point);
+    const TreeLook look = lookOf(found.item);
+    const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(found.item);
+    if (!node || m_field) {
+        return {};
     }
-    case TVM_GETEXTENDEDSTYLE:
-        return static_cast<LRESULT>(m_treeStyle);
-    default:
-        known = false;
-        return 0;
-    }
+    const QRect label = labelRect(*node, look.text);
+    return clientRect().left() <= label.left() && label.right() <= clientRect().right() ? QString() : look.text;
 }
 
 } // namespace tvx::afx
