@@ -114,8 +114,12 @@ void Gui_DirDlg::selectDrive() {
 }
 
 void Gui_DirDlg::OnSelchangeDrivecombo() {
+    const int place = drives().GetCurSel();
+    if (place < 0) {
+        return;
+    }
     CString drive;
-    drives().GetLBText(drives().GetCurSel(), drive);
+    drives().GetLBText(place, drive);
     if (drive.GetLength() > 2 && drive[1] == ':') {
         drive = drive.Left(2); // the share behind it is found by it
     }
