@@ -83,6 +83,8 @@ BOOL Gui_DirDlg::OnInitDialog() {
     drives().SubclassDlgItem(GUI_IDC_DIR_DRIVES, this);
     tree().SetImageList(&m_record->folderImages, TVSIL_NORMAL);
     SHAutoComplete(*GetDlgItem(GUI_IDC_DIR_NAME), SHACF_FILESYS_DIRS);
+    m_record->creation = {}; // of the last time
+    m_record->toSelect.Empty();
     completeDirectory();
     showDirectory();
     fillDrives();
@@ -219,11 +221,12 @@ void Gui_DirDlg::showState() {
                     : m_record->listing ? GUI_IDS_DIRECTORY_READING
                                         : 0U;
     SetDlgItemText(GUI_IDC_DIR_STATE, id ? StringOf(id) : CString());
+    GetDlgItem(GUI_IDC_DIR_NEW)->EnableWindow(!m_record->creation);
 }
 
 BOOL Gui_DirDlg::OnSetCursor(CWnd* window, UINT part, UINT message) {
     if (part == HTCLIENT && (m_record->creation || m_record->verdict || m_record->listing)) {
-        SetCursor(AfxGetApp()->LoadStandardCursor(IDC_APPSTARTING));
+        SetCursor(::LoadCursor(nullptr, IDC_APPSTARTING));
         return TRUE;
     }
     return CDialog::OnSetCursor(window, part, message);

@@ -7,6 +7,7 @@
 namespace {
 
 constexpr UINT imageBits = 0xF; ///< of an entry's data
+constexpr int roomAbove = 2;    ///< pixels
 
 /// The image of a kind of drives.
 int imageOf(UINT type) {
@@ -28,6 +29,15 @@ int imageOf(UINT type) {
 UINT typeOf(const Gui_FileName& name) {
     const CString root = name.GetMountAndPath(0);
     return root.Left(2) == "\\\\" ? DRIVE_REMOTE : GetDriveTypeA(root);
+}
+
+/// The height of entries: text or image, and the room above that they are drawn with, below too.
+int entryHeight(CWnd& list, int imageHeight) {
+    CClientDC dc(&list);
+    CFont* before = dc.SelectObject(list.GetFont());
+    const int textHeight = dc.GetTextExtent("X").cy;
+    dc.SelectObject(before);
+    return std::max(textHeight, imageHeight) + 2 * roomAbove;
 }
 
 template <class Function>
@@ -52,6 +62,9 @@ ImageListFunctions::~ImageListFunctions() {
 }
 
 void Gui_DirDlg::fillDrives() {
+    IMAGEINFO info{};
+    m_record->driveImages.GetImageInfo(0, &info);
+    drives().SetItemHeight(0, static_cast<UINT>(entryHeight(drives(), CRect(info.rcImage).Height())));
     bool exists[26]{};
     CString entry;
     drives().ResetContent();
@@ -101,8 +114,12 @@ void Gui_DirDlg::selectDrive() {
 }
 
 void Gui_DirDlg::OnSelchangeDrivecombo() {
+    const int place = drives().GetCurSel();
+    if (place < 0) {
+        return;
+    }
     CString drive;
-    drives().GetLBText(drives().GetCurSel(), drive);
+    drives().GetLBText(place, drive);
     if (drive.GetLength() > 2 && drive[1] == ':') {
         drive = drive.Left(2); // the share behind it is found by it
     }
@@ -141,7 +158,7 @@ void Gui_DirDlg::OnDrawItem(int id, DRAWITEMSTRUCT* item) {
     }
     const CRect size(info.rcImage);
     const int textLeft = place.left + 3 * size.Width() / 2;
-    const int textTop = place.top + 2;
+    const int textTop = place.top + roomAbove;
     dc.SetBkMode(TRANSPARENT);
     dc.SetTextColor(foreground);
     dc.TextOut(textLeft, textTop, text);

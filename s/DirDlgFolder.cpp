@@ -31,6 +31,9 @@ void Gui_DirDlg::OnNewFolder() {
 }
 
 void Gui_DirDlg::askForFolder(const CString& name) {
+    // An answer to OK must not end the dialog under the query.
+    m_record->verdict = {};
+    showState();
     Gui_QueryDlg query(this);
     query.SetTitle(StringOf(GUI_IDS_FOLDER_NEW));
     query.SetPrompt(StringOf(GUI_IDS_FOLDER_PROMPT));
@@ -60,6 +63,7 @@ void Gui_DirDlg::createFolder(const CString& name) {
 void Gui_DirDlg::finishCreation() {
     const DWORD error = m_record->creation.answer();
     m_record->creation = {};
+    m_record->verdict = {};
     showState();
     const CString name = m_record->newFolder;
     if (error == ERROR_SUCCESS) {

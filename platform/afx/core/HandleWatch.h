@@ -20,8 +20,8 @@ namespace tvx {
 /// Messages with one number for one window are at least a frame apart (16 ms), so that a window which shows what it
 /// reads repaints at most once a frame; the first comes at once.
 ///
-/// @param handles  processes and reading ends of pipes. They stay open underneath until the message is posted or
-///                 cancelPosts() is called, even when they are closed meanwhile.
+/// @param handles  processes, reading ends of pipes, questions (Background.h). They stay open underneath until the
+///                 message is posted or cancelPosts() is called, even when they are closed meanwhile.
 /// @param window   one of this thread. When it ends, the request ends.
 /// @param message  its number; both parameters are 0. A later call with the same window and number replaces this one.
 /// @param timeout  milliseconds until it is posted at the latest; `INFINITE`: only when a handle is signalled

@@ -49,7 +49,7 @@ private:
     std::unique_ptr<DIR, Close> m_folder;
     int m_error = 0;
     std::optional<Mounts> m_mounts; ///< read when the first link is met
-    std::string m_path;                ///< of the folder, links resolved; from then on
+    std::string m_path;             ///< of the folder, links resolved; from then on
 };
 
 } // namespace tvx::win

@@ -94,8 +94,6 @@ public:
         GetDlgItem(GUI_IDC_DIR_NAME)->SetFocus();
         key(Qt::Key_A, Qt::ControlModifier);
         type(text.c_str());
-        key(Qt::Key_Escape); // the completion's list, if there is one
-        ASSERT_TRUE(m_hWnd && IsWindowVisible());
         key(Qt::Key_Enter);
     }
     void doubleClick(HTREEITEM item) const {
@@ -125,6 +123,32 @@ protected:
 
 private:
     std::function<void()> m_script;
+};
+
+/// Types a name when the query for a folder comes up and presses Enter; if it comes up again, it is cancelled.
+class QueryAnswer {
+public:
+    explicit QueryAnswer(const char* name) {
+        QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this, name] {
+            const QWidget* window = QApplication::activeModalWidget();
+            auto* field = window && window->isActiveWindow() && window->windowTitle() == "New Folder"
+                              ? qobject_cast<QLineEdit*>(QApplication::focusWidget())
+                              : nullptr;
+            if (field && std::exchange(m_isTyped, true)) {
+                again = field->text().toStdString();
+                key(Qt::Key_Escape);
+            } else if (field) {
+                type(name);
+                key(Qt::Key_Enter);
+            }
+        });
+        m_timer.start(0);
+    }
+    std::string again;
+
+private:
+    QTimer m_timer;
+    bool m_isTyped = false;
 };
 
 /// C: is the system's root, D: a folder with "work" in it, E: a removable medium, F: a disc, X: a share.
@@ -157,7 +181,7 @@ TEST_F(DirDlg, ShowsTheWayToTheDirectoryAndWhatIsInIt) {
         EXPECT_EQ(dialog.subdirectories(), (Texts{"Base", "gui"}));
         EXPECT_EQ(dialog.drive(), "D:");
         EXPECT_EQ(dialog.state(), "");
-        dialog.push(GUI_IDC_DIR_HIDDEN);
+        click(dialog.GetDlgItem(GUI_IDC_DIR_HIDDEN), {8, 8});
         EXPECT_EQ(dialog.subdirectories(), (Texts{".git", "Base", "gui"}));
     });
     fs::current_path("d/work");
@@ -280,19 +304,23 @@ TEST_F(DirDlg, HelpIsThereWithANumberOnly) {
 }
 
 TEST_F(DirDlg, NewFoldersAreMadeAndSelected) {
-    const auto answer = [](const char* typed) {
-        QTimer::singleShot(0, [typed] {
-            type(typed);
-            key(Qt::Key_Enter);
-        });
-    };
     Dialog dialog("D:\\work\\src");
     dialog.run([&] {
-        answer("");
-        dialog.push(GUI_IDC_DIR_NEW);
-        EXPECT_EQ(dialog.selected(), "New Folder");
-        answer("");
-        dialog.push(GUI_IDC_DIR_NEW);
+        for (const char* name : {"New Folder", "New Folder (2)"}) {
+            const QueryAnswer query("");
+            dialog.push(GUI_IDC_DIR_NEW);
+            EXPECT_EQ(dialog.selected(), name);
+        }
+        {
+            // One that cannot be made is asked for again, as it was typed.
+            const QueryAnswer query("gui");
+            const BoxAnswer box;
+            dialog.push(GUI_IDC_DIR_NEW);
+            EXPECT_EQ(box.text.substr(0, 36), "The folder gui could not be created.");
+            EXPECT_EQ(query.again, "gui");
+        }
+        EXPECT_TRUE(waitForActive(dialog));
+        dialog.tree().SetFocus();
         EXPECT_EQ(dialog.subdirectories(), (Texts{"Base", "gui", "New Folder", "New Folder (2)"}));
         key(Qt::Key_Enter); // the keyboard is in the tree
         EXPECT_EQ(dialog.name(), "D:\\work\\src\\New Folder (2)\\");

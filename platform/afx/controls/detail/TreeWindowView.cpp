@@ -256,11 +256,14 @@ void TreeWindow::showSideways(HTREEITEM item) {
     const QRect label = labelRect(*node, look.text);
     const int start = left(*node);
     QScrollBar* bar = m_area->horizontalScrollBar();
-    const int beyond = label.right() + 1 - m_area->viewport()->width();
+    const int width = m_area->viewport()->width();
+    const int beyond = label.right() + 1 - width;
+    // Of a label that is too long anyway the beginning will do: what is above it is of more use than some more of it.
+    const bool isSeen = label.width() > width && start >= 0 && start < width / 2;
     guarded([&] {
         if (start < 0) {
             bar->setValue(bar->value() + start);
-        } else if (beyond > 0) {
+        } else if (beyond > 0 && !isSeen) {
             bar->setValue(bar->value() + std::min(beyond, start));
         }
     });
