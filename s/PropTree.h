@@ -16,7 +16,7 @@
 /// user's.
 class PropTree {
 public:
-    SECTreeCtrl control;
+    SECTreeCtrl control; ///< control 1001 of the sheet
     /// Whether items that hold changes are marked.
     bool showsChanges = false;
 
@@ -37,6 +37,7 @@ public:
     std::vector<Gui_PropItem*> selectedItems() const;
     /// Selects the nodes of these items that there are, and brings the first into sight.
     void select(const std::vector<Gui_PropItem*>& items);
+    /// Whether a change of the selection is not the user's.
     bool isQuiet() const {
         return m_quiet > 0 || m_nodes.empty();
     }
