@@ -190,23 +190,30 @@ bool Gui_PropSheet::Record::onSearchKey(UINT key) {
     if (::GetFocus() != searchField.m_hWnd) {
         return false;
     }
-    if (key == VK_DOWN) {
+    const bool isEmpty = searchField.GetWindowTextLength() == 0;
+    switch (key) {
+    case VK_DOWN:
+        if (sheet->GetSelectedItems().empty()) {
+            selectNextFound();
+        }
         sheet->SetFocusPrev();
         return true;
-    }
-    const bool isEmpty = searchField.GetWindowTextLength() == 0;
-    if (key == VK_ESCAPE && !isEmpty) {
+    case VK_ESCAPE:
         searchField.SetWindowText("");
-        return true;
+        return !isEmpty;
+    case VK_RETURN:
+        selectNextFound();
+        return !isEmpty;
+    default:
+        return false;
     }
-    if (key == VK_RETURN && !isEmpty) {
-        const std::vector<Gui_PropItem*> selected = sheet->GetSelectedItems();
-        if (const Gui_PropItem* next = tree.nextFound(selected.empty() ? nullptr : selected.front())) {
-            tree.control.SelectItem(tree.nodeOf(next));
-        }
-        return true;
+}
+
+void Gui_PropSheet::Record::selectNextFound() {
+    const std::vector<Gui_PropItem*> selected = sheet->GetSelectedItems();
+    if (const Gui_PropItem* next = tree.nextFound(selected.empty() ? nullptr : selected.front())) {
+        tree.control.SelectItem(tree.nodeOf(next));
     }
-    return false;
 }
 
 // --- wheel ---

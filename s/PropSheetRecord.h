@@ -117,6 +117,8 @@ struct Gui_PropSheet::Record {
     bool onTab();
     /// Keys of the search field, and Ctrl+F. False when the key is the dialog's.
     bool onSearchKey(UINT key);
+    /// Selects the item found behind the one selected.
+    void selectNextFound();
     /// Whether the wheel turns over a control of the page in which it could change a value unseen: one that does not
     /// have the keyboard and shows no more when it is scrolled.
     bool isGuarded(const MSG& message) const;

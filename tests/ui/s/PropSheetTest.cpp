@@ -372,8 +372,10 @@ TEST_F(PropSheet, FindsItemsAndLeavesTheirPagesAlone) {
         type("x");
         EXPECT_EQ(sheet.labels().size(), 0u);
         key(Qt::Key_Escape);
+        type("grid");
         key(Qt::Key_Down);
         EXPECT_EQ(sheet.focus(), GUI_IDC_PROP_TREE);
+        EXPECT_EQ(sheet.GetSelectedItems(), Items{grid});
         key(Qt::Key_Escape);
     }),
               IDCANCEL);
