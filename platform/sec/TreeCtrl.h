@@ -18,13 +18,15 @@ public:
     /// Switches the selection of several items on or off. What is selected stays, but for one item when it is switched
     /// off.
     void SetMultiSelect(BOOL on);
+    /// Whether several items may be selected.
     BOOL IsMultiSelect() const {
         return (GetExtendedStyle() & TVS_EX_MULTISELECT) != 0;
     }
-    /// The selected items in the order of the tree; null behind the last.
+    /// The first selected item in the order of the tree, null for none.
     HTREEITEM GetFirstSelectedItem() const {
         return CTreeCtrl::GetNextItem(nullptr, TVGN_NEXTSELECTED);
     }
+    /// The next selected one behind an item; null behind the last.
     HTREEITEM GetNextSelectedItem(HTREEITEM item) const {
         return CTreeCtrl::GetNextItem(item, TVGN_NEXTSELECTED);
     }

@@ -79,7 +79,10 @@ void TreeWindow::paintRow(QPainter& painter, const TreeNode& node, const TreeLoo
         option.features |= QStyleOptionViewItem::HasDecoration;
         option.decorationSize = size;
         option.decorationAlignment = Qt::AlignCenter;
-        option.icon = QIcon(imageOf(m_images, look.image));
+        const QPixmap picture = imageOf(m_images, look.image);
+        option.icon.addPixmap(picture);
+        // Hosts have pictures of their own for selected items, which the style must not tint.
+        option.icon.addPixmap(picture, QIcon::Selected);
     }
     const bool hasKeyboard = m_area->hasFocus() || m_field;
     if (node.isSelected && showsSelection()) {

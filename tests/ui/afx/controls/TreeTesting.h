@@ -89,10 +89,31 @@ protected:
 
 private:
     void note(const NMHDR& header) {
-        const auto& change = reinterpret_cast<const NMTREEVIEW&>(header);
+        switch (header.code) {
+        case NM_CLICK:
+            m_told.emplace_back("click");
+            return;
+        case NM_DBLCLK:
+            m_told.emplace_back("dblclk");
+            return;
+        case NM_RCLICK:
+            m_told.emplace_back("rclick");
+            return;
+        case TVN_SELCHANGING:
+        case TVN_SELCHANGED:
+        case TVN_ITEMEXPANDING:
+        case TVN_ITEMEXPANDED:
+        case TVN_DELETEITEM:
+            noteItem(reinterpret_cast<const NMTREEVIEW&>(header));
+            return;
+        default:
+            return;
+        }
+    }
+    void noteItem(const NMTREEVIEW& change) {
         const std::string item = name(change.itemNew.hItem);
         const std::string action = " " + std::to_string(change.action);
-        switch (header.code) {
+        switch (change.hdr.code) {
         case TVN_SELCHANGING:
             m_told.push_back("selchanging " + name(change.itemOld.hItem) + ">" + item + action);
             break;
@@ -107,15 +128,6 @@ private:
             break;
         case TVN_DELETEITEM:
             m_told.push_back("delete " + std::to_string(change.itemOld.lParam));
-            break;
-        case NM_CLICK:
-            m_told.emplace_back("click");
-            break;
-        case NM_DBLCLK:
-            m_told.emplace_back("dblclk");
-            break;
-        case NM_RCLICK:
-            m_told.emplace_back("rclick");
             break;
         default:
             break;
