@@ -18,6 +18,7 @@
 
 #include <benchmark/benchmark.h>
 #include <cstdlib>
+#include <memory>
 #include <string>
 
 namespace {
@@ -74,11 +75,11 @@ void open(Gui_PropSheet& sheet) {
 void openSheet(benchmark::State& state) {
     prepare();
     for (auto _ : state) {
-        Gui_PropSheet sheet("Preferences", nullptr, false);
-        fill(sheet, static_cast<int>(state.range(0)));
-        open(sheet);
+        auto sheet = std::make_unique<Gui_PropSheet>("Preferences", nullptr, false);
+        fill(*sheet, static_cast<int>(state.range(0)));
+        open(*sheet);
         state.PauseTiming();
-        sheet.DestroyWindow();
+        sheet.reset();
         state.ResumeTiming();
     }
 }
