@@ -72,8 +72,11 @@ public:
     Gui_PropItem(const Gui_PropItem&) = delete;
     Gui_PropItem& operator=(const Gui_PropItem&) = delete;
 
+    /// The node's label, and how it is shown first.
+    /// @{
     virtual Port::StringBase<char> GetName() const;
     virtual InitialState GetInitialState() const;
+    /// @}
     /// The item above this one, null for one at the top.
     virtual Gui_PropItem* GetParentItem() const;
     /// The sheet that the item was added to, null before that.
@@ -118,10 +121,13 @@ public:
     virtual void SetFocusLast();
     /// @}
 
+    /// The functions of the constructor, which can be replaced, by null, too.
+    /// @{
     CreatePageFunction GetCreatePageFunction() const;
     NotifyPageFunction GetNotifyPageFunction() const;
     void SetCreatePageFunction(CreatePageFunction createPage);
     void SetNotifyPageFunction(NotifyPageFunction notifyPage);
+    /// @}
 
     /// Words that users may look for and that stand neither in the name nor in the lines above the page, such as the
     /// labels of its controls: the sheet's search finds the item by them and makes no page for it. Copied; at first

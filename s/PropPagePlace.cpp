@@ -18,19 +18,19 @@ void PropPagePlace::leave() {
 }
 
 /// What is known of a page; the first time it has the size that it was made with.
-PropPagePlace::PageSize& PropPagePlace::sizeOf(CWnd& page) {
-    PageSize& known = m_sizes[&page];
-    if (known.window != page.m_hWnd) {
+PropPagePlace::PageSize& PropPagePlace::sizeOf(HWND page) {
+    const auto [known, isNew] = m_sizes.try_emplace(page);
+    if (isNew) {
         CRect rect;
-        page.GetWindowRect(&rect);
-        known = {page.m_hWnd, rect.Size(), CPoint(0, 0)};
+        ::GetWindowRect(page, &rect);
+        known->second.size = rect.Size();
     }
-    return known;
+    return known->second;
 }
 
 CSize PropPagePlace::visible() const {
     CRect client;
-    m_page->GetClientRect(&client);
+    ::GetClientRect(m_page, &client);
     return client.Size();
 }
 
@@ -79,8 +79,8 @@ void setRange(CScrollBar& bar, int whole, int seen, int position) {
 } // namespace
 
 void PropPagePlace::place(CDialog& sheet, CWnd& page, const CRect& frame, CPoint corner) {
-    PageSize& known = sizeOf(page);
-    m_page = &page;
+    m_page = page.m_hWnd;
+    PageSize& known = sizeOf(m_page);
     const CSize room = scrolls ? roomFor(known.size, frame.Size()) : frame.Size();
     // While the page lays itself out in its new size, its controls stand where it takes them to be.
     const CPoint before = known.position;
@@ -97,7 +97,7 @@ void PropPagePlace::place(CDialog& sheet, CWnd& page, const CRect& frame, CPoint
 }
 
 void PropPagePlace::showBars(CWnd& sheet, const CRect& inside, const CRect& frame) {
-    const CSize whole = sizeOf(*m_page).size;
+    const CSize whole = sizeOf(m_page).size;
     showBar(m_vertical, sheet, SBS_VERT, GUI_IDC_PROP_SCROLL_DOWN,
             CRect(inside.right, frame.top, frame.right, inside.bottom));
     showBar(m_horizontal, sheet, SBS_HORZ, GUI_IDC_PROP_SCROLL_ACROSS,
@@ -109,7 +109,7 @@ void PropPagePlace::showBars(CWnd& sheet, const CRect& inside, const CRect& fram
 // --- scrolling ---
 
 bool PropPagePlace::scrollTo(CPoint position) {
-    PageSize& known = sizeOf(*m_page);
+    PageSize& known = sizeOf(m_page);
     const CSize seen = visible();
     const CPoint target(std::clamp<LONG>(position.x, 0, std::max<LONG>(0, known.size.cx - seen.cx)),
                         std::clamp<LONG>(position.y, 0, std::max<LONG>(0, known.size.cy - seen.cy)));
@@ -118,22 +118,22 @@ bool PropPagePlace::scrollTo(CPoint position) {
         return false;
     }
     known.position = target;
-    m_page->ScrollWindow(from.x - target.x, from.y - target.y);
+    CWnd::FromHandle(m_page)->ScrollWindow(from.x - target.x, from.y - target.y);
     setRange(m_vertical, known.size.cy, seen.cy, target.y);
     setRange(m_horizontal, known.size.cx, seen.cx, target.x);
     return true;
 }
 
 bool PropPagePlace::scrollBy(CSize distance) {
-    return scrolls && m_page && m_page->m_hWnd && scrollTo(sizeOf(*m_page).position + distance);
+    return scrolls && ::IsWindow(m_page) && scrollTo(sizeOf(m_page).position + distance);
 }
 
 bool PropPagePlace::onScroll(int bar, UINT code, const CScrollBar* from) {
     CScrollBar& own = bar == SB_VERT ? m_vertical : m_horizontal;
-    if (!m_page || !from || from != &own) {
+    if (!::IsWindow(m_page) || from != &own) {
         return false;
     }
-    const CPoint now = sizeOf(*m_page).position;
+    const CPoint now = sizeOf(m_page).position;
     const LONG at = bar == SB_VERT ? now.y : now.x;
     const LONG page = bar == SB_VERT ? visible().cy : visible().cx;
     LONG to = at;
@@ -142,7 +142,7 @@ bool PropPagePlace::onScroll(int bar, UINT code, const CScrollBar* from) {
         to = 0;
         break;
     case SB_BOTTOM:
-        to = bar == SB_VERT ? sizeOf(*m_page).size.cy : sizeOf(*m_page).size.cx;
+        to = bar == SB_VERT ? sizeOf(m_page).size.cy : sizeOf(m_page).size.cx;
         break;
     case SB_LINEUP:
     case SB_LINEDOWN:
@@ -173,12 +173,12 @@ bool PropPagePlace::onWheel(int delta) {
 }
 
 void PropPagePlace::show(HWND control) {
-    if (!scrolls || !m_page || !m_page->m_hWnd || !::IsChild(m_page->m_hWnd, control)) {
+    if (!scrolls || !::IsChild(m_page, control)) {
         return;
     }
     CRect rect;
     ::GetWindowRect(control, &rect);
-    m_page->ScreenToClient(&rect);
+    CWnd::FromHandle(m_page)->ScreenToClient(&rect);
     const CSize seen = visible();
     // Its end first: of a control that is larger than the place the beginning is seen.
     const auto distance = [](LONG from, LONG to, LONG extent) {

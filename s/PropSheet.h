@@ -36,9 +36,9 @@
 /// page objects live until the sheet is destroyed, so that a host can read them after DoModal. When the dialog is
 /// opened again, a page that is needed is made anew by its item, and the object before it is kept with the others.
 ///
-/// Tab goes from the tree into the page, through its controls and on to OK, Shift+Tab back. A page takes part in that
-/// when its template has DS_CONTROL or not; a page of another kind handles NotifyFocusFirst and NotifyFocusLast and
-/// calls SetFocusPrev and SetFocusNext. docs/property-sheets.md tells more.
+/// Tab goes from the tree into the page, through its controls and on to OK, Shift+Tab back. A page may choose its first
+/// and last control (NotifyFocusFirst, NotifyFocusLast); what it leaves undone the sheet does. Pages that treat Tab in
+/// a way of their own call SetFocusPrev and SetFocusNext at their ends. docs/property-sheets.md tells more.
 class GUI_API Gui_PropSheet : public CDialog {
     DECLARE_DYNAMIC(Gui_PropSheet)
 
@@ -50,6 +50,7 @@ public:
     /// Deletes the items and with them their pages.
     ~Gui_PropSheet() override;
 
+    /// The title of the constructor or of SetWindowTitle.
     virtual Port::StringBase<char> GetWindowTitle() const;
     /// The page of the current item; null without one.
     virtual CWnd* GetCurrentPage();
@@ -100,9 +101,8 @@ public:
     /// go before the node. A node is known by its names; a size counts for the font that it was made with.
     /// @param section null: nothing is remembered
     void SetMemory(const char* section);
-    /// A page that was made larger than its place gets scroll bars, and the control with the keyboard is scrolled into
-    /// sight. A dialog that is larger than the screen opens as large as that. Pages are never made smaller than they
-    /// were made.
+    /// A page that was made larger than its place gets scroll bars, which move its controls, and the control with the
+    /// keyboard is scrolled into sight. A dialog that is larger than the screen opens as large as that.
     void SetPageScrolling(bool scrolling);
     /// The wheel changes no value in a control that does not have the keyboard: it scrolls the page, if that scrolls.
     /// Lists, trees and fields scroll all the same. Combo boxes need no guard: they never change unseen.

@@ -84,7 +84,6 @@ void Gui_PropSheet::Record::layOut(CSize client) {
     }
 }
 
-/// Answers where the first of the buttons begins.
 int Gui_PropSheet::Record::layOutButtons(CSize client, CSize gap, int height) {
     const int top = client.cy - gap.cy - height;
     int right = client.cx;
@@ -98,8 +97,6 @@ int Gui_PropSheet::Record::layOutButtons(CSize client, CSize gap, int height) {
     return right;
 }
 
-/// Puts the Defaults button beside the others, or above them where it has no room there. Answers the height that this
-/// takes from the tree.
 int Gui_PropSheet::Record::layOutDefaults(CSize client, int left) {
     if (!defaultsButton.m_hWnd || !currentItem || !currentItem->GetDefaultsFunction()) {
         return 0;
@@ -113,7 +110,6 @@ int Gui_PropSheet::Record::layOutDefaults(CSize client, int left) {
     return isAbove ? row : 0;
 }
 
-/// The client area in which all buttons stand beside each other, and tree and page still show something.
 CSize Gui_PropSheet::Record::leastClient() const {
     const CWnd* const frame = sheet->GetDlgItem(GUI_IDC_PROP_PAGE_FRAME);
     if (!frame) {
@@ -196,7 +192,6 @@ void Gui_PropSheet::Record::showDefaultsButton() {
 
 // --- size and memory ---
 
-/// A dialog whose pages scroll fits the screen, however large its fonts are.
 void Gui_PropSheet::Record::fitScreen() {
     CRect window;
     sheet->GetWindowRect(&window);
@@ -223,7 +218,7 @@ void Gui_PropSheet::Record::restoreSize() {
 }
 
 void Gui_PropSheet::Record::remember() const {
-    if (!remembers) {
+    if (!remembers || sheet->IsZoomed() || sheet->IsIconic()) {
         return;
     }
     CRect client;

@@ -9,8 +9,6 @@
 
 // --- switching ---
 
-/// Windows of pages end with that of the sheet. In a sheet that is opened again a page whose window has gone is made
-/// anew; the object before it stays, as hosts may look into it, unless the item gave the same one a new window.
 void Gui_PropSheet::Record::revivePages(Gui_PropItem* item) {
     CWnd* const old = wasOpen ? item->GetCachedPage() : nullptr;
     if (!old || old->m_hWnd) {
@@ -106,7 +104,6 @@ void Gui_PropSheet::Record::apply() {
     }
 }
 
-/// Asks whether changes may be lost, where hosts have them marked and there are any.
 bool Gui_PropSheet::Record::mayDiscard() {
     const auto isChanged = [](const Gui_PropItem* item) { return item->IsChanged(); };
     if (!tree.showsChanges || std::ranges::none_of(items, isChanged)) {
@@ -193,23 +190,30 @@ bool Gui_PropSheet::Record::onSearchKey(UINT key) {
     if (::GetFocus() != searchField.m_hWnd) {
         return false;
     }
-    if (key == VK_DOWN) {
+    const bool isEmpty = searchField.GetWindowTextLength() == 0;
+    switch (key) {
+    case VK_DOWN:
+        if (sheet->GetSelectedItems().empty()) {
+            selectNextFound();
+        }
         sheet->SetFocusPrev();
         return true;
-    }
-    const bool isEmpty = searchField.GetWindowTextLength() == 0;
-    if (key == VK_ESCAPE && !isEmpty) {
+    case VK_ESCAPE:
         searchField.SetWindowText("");
-        return true;
+        return !isEmpty;
+    case VK_RETURN:
+        selectNextFound();
+        return !isEmpty;
+    default:
+        return false;
     }
-    if (key == VK_RETURN && !isEmpty) {
-        const std::vector<Gui_PropItem*> selected = sheet->GetSelectedItems();
-        if (const Gui_PropItem* next = tree.nextFound(selected.empty() ? nullptr : selected.front())) {
-            tree.control.SelectItem(tree.nodeOf(next));
-        }
-        return true;
+}
+
+void Gui_PropSheet::Record::selectNextFound() {
+    const std::vector<Gui_PropItem*> selected = sheet->GetSelectedItems();
+    if (const Gui_PropItem* next = tree.nextFound(selected.empty() ? nullptr : selected.front())) {
+        tree.control.SelectItem(tree.nodeOf(next));
     }
-    return false;
 }
 
 // --- wheel ---
@@ -225,8 +229,6 @@ bool scrollsItself(HWND control) {
 
 } // namespace
 
-/// Whether the wheel turns over a control of the page in which it could change a value unseen: one that does not have
-/// the keyboard and shows no more when it is scrolled.
 bool Gui_PropSheet::Record::isGuarded(const MSG& message) const {
     const CWnd* const page = guardsWheel ? sheet->GetCurrentPage() : nullptr;
     const HWND focus = ::GetFocus();

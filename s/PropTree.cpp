@@ -32,7 +32,6 @@ void PropTree::attach(CWnd& sheet, UINT id, bool multipleSelection) {
 void PropTree::forget() {
     m_entries.clear();
     m_places.clear();
-    m_nodes.clear();
     m_isFiltered = false;
 }
 
@@ -41,7 +40,7 @@ void PropTree::build(const std::vector<Gui_PropItem*>& items) {
     for (Gui_PropItem* item : items) {
         add(item);
     }
-    for (const Entry& entry : m_entries) {
+    for (Entry& entry : m_entries) {
         insert(entry);
     }
     showInitialStates();
@@ -63,11 +62,9 @@ int PropTree::add(Gui_PropItem* item) {
     return place->second;
 }
 
-void PropTree::insert(const Entry& entry) {
+void PropTree::insert(Entry& entry) {
     const CString label = labelOf(entry.item);
-    const Gui_PropItem* const parent =
-        entry.parent >= 0 ? m_entries[static_cast<std::size_t>(entry.parent)].item : nullptr;
-    const HTREEITEM above = parent ? nodeOf(parent) : nullptr;
+    const HTREEITEM above = entry.parent >= 0 ? m_entries[static_cast<std::size_t>(entry.parent)].node : nullptr;
     const UINT bold = showsChanges && entry.item->IsChanged() ? TVIS_BOLD : 0;
     TVINSERTSTRUCT description{};
     description.hParent = above ? above : TVI_ROOT;
@@ -77,14 +74,14 @@ void PropTree::insert(const Entry& entry) {
     description.item.lParam = reinterpret_cast<LPARAM>(entry.item);
     description.item.state = bold;
     description.item.stateMask = TVIS_BOLD;
-    m_nodes[entry.item] = control.InsertItem(&description);
+    entry.node = control.InsertItem(&description);
 }
 
 void PropTree::showInitialStates() {
-    for (HTREEITEM node = control.GetRootItem(); node; node = control.GetNextItem(node)) {
-        const Gui_PropItem::InitialState state = itemOf(node)->GetInitialState();
+    for (const Entry& entry : m_entries) {
+        const Gui_PropItem::InitialState state = entry.item->GetInitialState();
         if (state != Gui_PropItem::StateDefault) {
-            control.Expand(node, state == Gui_PropItem::StateExpanded ? TVE_EXPAND : TVE_COLLAPSE);
+            control.Expand(entry.node, state == Gui_PropItem::StateExpanded ? TVE_EXPAND : TVE_COLLAPSE);
         }
     }
 }
@@ -92,8 +89,8 @@ void PropTree::showInitialStates() {
 // --- nodes and items ---
 
 HTREEITEM PropTree::nodeOf(const Gui_PropItem* item) const {
-    const auto found = m_nodes.find(item);
-    return found != m_nodes.end() ? found->second : nullptr;
+    const auto place = m_places.find(item);
+    return place != m_places.end() ? m_entries[static_cast<std::size_t>(place->second)].node : nullptr;
 }
 
 Gui_PropItem* PropTree::itemOf(HTREEITEM node) const {
@@ -141,8 +138,10 @@ CString PropTree::labelOf(const Gui_PropItem* item) const {
 }
 
 void PropTree::relabel() {
-    for (const auto& [item, node] : m_nodes) {
-        control.SetItemText(node, labelOf(item));
+    for (const Entry& entry : m_entries) {
+        if (entry.node) {
+            control.SetItemText(entry.node, labelOf(entry.item));
+        }
     }
 }
 
@@ -159,8 +158,7 @@ void PropTree::relabel(const Gui_PropItem* item) {
 
 void PropTree::rememberExpanded() {
     for (Entry& entry : m_entries) {
-        const HTREEITEM node = nodeOf(entry.item);
-        entry.expanded = node && (control.GetItemState(node, TVIS_EXPANDED) & TVIS_EXPANDED) != 0;
+        entry.expanded = (control.GetItemState(entry.node, TVIS_EXPANDED) & TVIS_EXPANDED) != 0;
         const Port::StringBase<char> text = entry.item->GetName() + "\n" + entry.item->GetPageTitle() + "\n" +
                                             entry.item->GetPageSubTitle() + "\n" + entry.item->GetKeywords();
         entry.searched = tvx::text::foldCase(text.str());
@@ -197,15 +195,15 @@ void PropTree::filter(const CString& words, const std::vector<Gui_PropItem*>& ch
     findEntries(words);
     control.SetRedraw(FALSE);
     control.DeleteAllItems();
-    m_nodes.clear();
-    for (const Entry& entry : m_entries) {
+    for (Entry& entry : m_entries) {
+        entry.node = nullptr;
         if (entry.shown) {
             insert(entry);
         }
     }
     for (const Entry& entry : m_entries) {
         if (isFiltered ? entry.above : entry.expanded) {
-            control.Expand(nodeOf(entry.item), TVE_EXPAND);
+            control.Expand(entry.node, TVE_EXPAND);
         }
     }
     select(chosen);

@@ -16,7 +16,7 @@
 /// user's.
 class PropTree {
 public:
-    SECTreeCtrl control;
+    SECTreeCtrl control; ///< control 1001 of the sheet
     /// Whether items that hold changes are marked.
     bool showsChanges = false;
 
@@ -37,8 +37,9 @@ public:
     std::vector<Gui_PropItem*> selectedItems() const;
     /// Selects the nodes of these items that there are, and brings the first into sight.
     void select(const std::vector<Gui_PropItem*>& items);
+    /// Whether a change of the selection is not the user's.
     bool isQuiet() const {
-        return m_quiet > 0 || m_nodes.empty();
+        return m_quiet > 0 || m_entries.empty();
     }
 
     /// Shows names and marks anew: of all items, of one.
@@ -66,16 +67,17 @@ private:
     /// What is known of one item, in the order of the first nodes: parents stand before their children.
     struct Entry {
         Gui_PropItem* item = nullptr;
-        int parent = -1;       ///< its place; -1 at the top
-        std::string searched;  ///< what the search looks at, without case
-        bool found = false;    ///< by the words
-        bool above = false;    ///< something below was found
-        bool shown = true;     ///< has a node
-        bool expanded = false; ///< before the search
+        HTREEITEM node = nullptr; ///< null while the search hides it
+        int parent = -1;          ///< its place; -1 at the top
+        std::string searched;     ///< what the search looks at, without case
+        bool found = false;       ///< by the words
+        bool above = false;       ///< something below was found
+        bool shown = true;        ///< is to have a node
+        bool expanded = false;    ///< before the search
     };
 
     int add(Gui_PropItem* item);
-    void insert(const Entry& entry);
+    void insert(Entry& entry);
     void showInitialStates();
     void rememberExpanded();
     void findEntries(const CString& words);
@@ -83,7 +85,6 @@ private:
 
     std::vector<Entry> m_entries;
     std::map<const Gui_PropItem*, int> m_places;
-    std::map<const Gui_PropItem*, HTREEITEM> m_nodes;
     bool m_isFiltered = false;
     int m_quiet = 0;
 };

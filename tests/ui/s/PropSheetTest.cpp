@@ -13,6 +13,7 @@
 
 #include <QWheelEvent>
 
+#include <cmath>
 #include <functional>
 #include <string>
 #include <vector>
@@ -371,8 +372,10 @@ TEST_F(PropSheet, FindsItemsAndLeavesTheirPagesAlone) {
         type("x");
         EXPECT_EQ(sheet.labels().size(), 0u);
         key(Qt::Key_Escape);
+        type("grid");
         key(Qt::Key_Down);
         EXPECT_EQ(sheet.focus(), GUI_IDC_PROP_TREE);
+        EXPECT_EQ(sheet.GetSelectedItems(), Items{grid});
         key(Qt::Key_Escape);
     }),
               IDCANCEL);
@@ -452,6 +455,11 @@ TEST(PropSheetPage, ScrollsWhereItIsLargerThanItsPlace) {
             return rect;
         };
         const CRect start = placeOf(201);
+        const int focus = sheet.focus();
+        click(sheet.GetDlgItem(GUI_IDC_PROP_SCROLL_DOWN),
+              QPoint(5, sheet.rectOf(GUI_IDC_PROP_SCROLL_DOWN).Height() - 5));
+        EXPECT_LT(placeOf(201).top, start.top);
+        EXPECT_EQ(sheet.focus(), focus) << "a bar takes no keyboard";
         EXPECT_TRUE(sheet.GetDlgItem(GUI_IDC_PROP_SCROLL_DOWN)->IsWindowVisible());
         EXPECT_EQ(sheet.rectOf(GUI_IDC_PROP_SCROLL_DOWN).right, sheet.rectOf(GUI_IDC_PROP_PAGE_FRAME).right);
         key(Qt::Key_Tab);
@@ -493,11 +501,28 @@ TEST(PropSheetPage, ScrollsWhereItIsLargerThanItsPlace) {
 
 TEST_F(PropSheet, IsReadAloudWithThePageUnderItsTitle) {
     sheet.work([&] {
+        sheet.clickNode("Grid");
+        sheet.clickNode("Drawing");
         const QAccessibleInterface* const page =
             QAccessible::queryAccessibleInterface(drawing->GetCachedPage()->GetState()->widget());
         EXPECT_EQ(accessibleTree(*page).substr(0, 80),
                   "PropertyPage \"Drawing & more. what it is for\" < Drawing & more. what it is for\n ");
     });
+}
+
+TEST_F(PropSheet, HasABandInTheColourOfShadowsOrAReadableOne) {
+    const auto fill = [&] {
+        COLORREF color = 0;
+        sheet.work([&] {
+            CClientDC dc(sheet.GetDlgItem(GUI_IDC_PROP_TITLE));
+            color = dc.GetPixel(1, 1);
+        });
+        return color;
+    };
+    EXPECT_EQ(fill(), GetSysColor(COLOR_BTNSHADOW));
+    sheet.SetReadableBand(true);
+    const double value = GetGValue(fill()) / 255.0; // of a grey
+    EXPECT_GE(1.05 / (std::pow((value + 0.055) / 1.055, 2.4) + 0.05), 4.5);
 }
 
 TEST(PropSheetPage, MayBeAPropertyPageInAPageOfItsOwn) {

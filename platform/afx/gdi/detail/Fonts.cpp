@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <array>
 #include <cstring>
+#include <functional>
 #include <map>
 #include <string>
 #include <tuple>
@@ -56,9 +57,24 @@ const Substitute substitutes[] = {
     {"Courier New", typewriter},
 };
 
+/// Whether there is a family of a name. The toolkit asks the desktop's list of fonts each time, which takes longer than
+/// to make the control that the font is for; so its answers are kept, as the fonts themselves are.
+bool isInstalled(std::string_view faceName) {
+    static std::map<std::string, bool, std::less<>> known;
+    const auto answer = known.find(faceName);
+    if (answer != known.end()) {
+        return answer->second;
+    }
+    const bool isThere =
+        !faceName.empty() &&
+        QFontDatabase::hasFamily(QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size())));
+    known.emplace(faceName, isThere);
+    return isThere;
+}
+
 QString firstInstalled(const Choices& choices) {
     for (const char* family : choices) {
-        if (QFontDatabase::hasFamily(QString::fromLatin1(family))) {
+        if (isInstalled(family)) {
             return QString::fromLatin1(family);
         }
     }
@@ -79,11 +95,6 @@ std::string_view faceName(const LOGFONTA& description) {
 } // namespace
 
 namespace {
-
-bool isInstalled(std::string_view faceName) {
-    return !faceName.empty() &&
-           QFontDatabase::hasFamily(QString::fromUtf8(faceName.data(), static_cast<qsizetype>(faceName.size())));
-}
 
 const Choices* substitutesFor(std::string_view faceName) {
     const auto* found = std::ranges::find_if(
