@@ -1,7 +1,5 @@
 #include "Board.h"
 
-#include "../family/FamilyOptions.h"
-#include "../family/FamilyResource.h"
 #include "BoardDoc.h"
 #include "BoardPages.h"
 #include "BoardView.h"
@@ -15,6 +13,8 @@
 #include "s/FileName.h"
 #include "s/Help.h"
 #include "s/Locale.h"
+#include "samples/family/FamilyOptions.h"
+#include "samples/family/FamilyResource.h"
 
 #include <algorithm>
 #include <cstdlib>

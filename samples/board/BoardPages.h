@@ -1,8 +1,8 @@
 #pragma once
 
-#include "../family/Preferences.h"
 #include "ColorButton.h"
 #include "Options.h"
+#include "samples/family/Preferences.h"
 
 /// The preferences of the board: its own pages, and those of the family.
 class CBoardPreferences : public CPreferences {

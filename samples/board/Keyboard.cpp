@@ -1,11 +1,11 @@
 #include "Keyboard.h"
 
-#include "../family/KeyDifferences.h"
 #include "Resource.h"
 #include "res/resource.h"
 #include "s/AccelDlg.h"
 #include "s/AccelProfile.h"
 #include "s/ExternFrame.h"
+#include "samples/family/KeyDifferences.h"
 
 #include <memory>
 

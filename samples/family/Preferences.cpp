@@ -4,10 +4,14 @@
 #include "FamilyResource.h"
 
 #include "res/resource.h"
+#include "s/Profile.h"
 
 #include <algorithm>
 
 namespace {
+
+/// Where the sheet is remembered among the settings.
+constexpr const char* section = "Preferences";
 
 Port::StringBase<char> portText(const CString& text) {
     return Port::StringBase<char>(text.GetString());
@@ -39,7 +43,7 @@ CPreferences::CPreferences(CWnd* parent)
     : Gui_PropSheet(portText(textOf(IDS_PREFERENCES)), parent, false), m_family(FamilyOptions::Read()) {
     SetSearch(true);
     SetChangeMarks(true);
-    SetMemory("Preferences");
+    SetMemory(section);
     SetPageScrolling(true);
     SetWheelGuard(true);
     SetReadableBand(true);
@@ -75,6 +79,29 @@ void CPreferences::AddFamilyPages() {
     m_browserItem = AddPage(IDS_PREF_BROWSER, &MakeBrowserPage, help, false);
     m_browserItem->SetNotifyPageFunction(&OnTabPage);
     AddPage(IDS_PREF_INSTALLATION, &MakePage<CInstallationPage, CPreferences>, nullptr, false);
+}
+
+BOOL CPreferences::OnInitDialog() {
+    const BOOL result = Gui_PropSheet::OnInitDialog();
+    CString size;
+    if (!Gui_Profile::ReadString(size, "PropertySize", section)) {
+        MakeRoom(); // the user has not chosen a size yet
+    }
+    return result;
+}
+
+// The page of the web browser is made for sheets of its own, and wider than others.
+void CPreferences::MakeRoom() {
+    constexpr int widest = 252; // dialog units
+    CRect wanted(0, 0, widest, 0);
+    CRect frame;
+    CRect window;
+    MapDialogRect(&wanted);
+    GetDlgItem(GUI_IDC_PROP_PAGE_FRAME)->GetClientRect(&frame);
+    GetWindowRect(&window);
+    const int more = std::max(wanted.Width() - frame.Width(), 0);
+    SetWindowPos(nullptr, 0, 0, window.Width() + more, window.Height(), SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE);
+    CenterWindow();
 }
 
 void CPreferences::Store() {

@@ -39,10 +39,13 @@ protected:
                           bool hasDefaults);
     /// Adds the pages that all applications have.
     void AddFamilyPages();
+    BOOL OnInitDialog() override;
     /// Stores what is the application's own, and puts it in force.
     virtual void StoreOwn() = 0;
 
 private:
+    void MakeRoom();
+
     FamilyOptions m_family;
     std::vector<Gui_PropItem*> m_pages; ///< The base class owns them.
     /// Its page is shown in this sheet.

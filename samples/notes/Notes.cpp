@@ -1,7 +1,5 @@
 #include "Notes.h"
 
-#include "../family/FamilyOptions.h"
-#include "../family/FamilyResource.h"
 #include "MainFrame.h"
 #include "NotesDoc.h"
 #include "NotesPreferences.h"
@@ -13,6 +11,8 @@
 #include "s/FileName.h"
 #include "s/Help.h"
 #include "s/Locale.h"
+#include "samples/family/FamilyOptions.h"
+#include "samples/family/FamilyResource.h"
 
 #include <cstring>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "../family/Preferences.h"
+#include "samples/family/Preferences.h"
 
 /// The preferences of Notes: those of the family.
 class CNotesPreferences : public CPreferences {

@@ -35,7 +35,7 @@ differs() {
 begin "Tarvex Board" "$board" -nosplash
 preferences
 page "grid points"
-press alt+d ctrl+a
+press alt+i ctrl+a
 xdotool type 5000
 press alt+a
 focus "^Board$" key Return # the message about the bounds
@@ -45,7 +45,7 @@ xdotool type 60
 import -window "$main" png:- >"$work/before.png"
 press alt+a
 await "the drawing shows the new grid" differs "$work/before.png"
-xdotool windowactivate --sync "$sheet" key --clearmodifiers alt+s # hides the grid
+xdotool windowactivate --sync "$sheet" key --clearmodifiers alt+w # hides the grid
 press Escape
 await "Cancel asks about changes" titled "^Board$"
 focus "^Board$" key n
@@ -64,7 +64,7 @@ await "the application ends" ended "$process"
 begin "Tarvex Board" "$board" -nosplash
 preferences
 page "grid points"
-press alt+d ctrl+a ctrl+c
+press alt+i ctrl+a ctrl+c
 await "the distance was kept" copied 60
 press Escape
 gone
