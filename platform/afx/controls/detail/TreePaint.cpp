@@ -98,6 +98,7 @@ void TreeWindow::paintRow(QPainter& painter, const TreeNode& node, const TreeLoo
 }
 
 void TreeWindow::paint(QPainter& painter, const QRect& exposed) {
+    m_repaintDue = false;
     if (m_frozen || isDestroyed()) {
         return;
     }

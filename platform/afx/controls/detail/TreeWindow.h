@@ -112,6 +112,8 @@ private:
     std::string textOf(HTREEITEM item);
 
     // --- items ---
+    /// Sets what a message brings, but for the states.
+    static void setContent(TreeNode& node, const TVITEM& item);
     HTREEITEM insertItem(const TVINSERTSTRUCT& what);
     bool removeItem(HTREEITEM item);
     void removeAll();
@@ -214,6 +216,7 @@ private:
     int m_rowHeight = 15;
     int m_extent = 0;               ///< The widest line seen, in pixels.
     bool m_frozen = false;          ///< Nothing is painted until the program says so.
+    bool m_repaintDue = false;      ///< The toolkit has been told that all must be painted.
     bool m_layoutDue = false;       ///< The bars do not know of all lines.
     bool m_showsBars = false;       ///< The toolkit is at it.
     bool m_mayEdit = false;         ///< The press hit what was selected before.

@@ -114,8 +114,9 @@ void TreeWindow::contentChanged() {
     QMetaObject::invokeMethod(m_area, later, Qt::QueuedConnection);
 }
 
+/// Has all of it painted when the loop comes to it. Asked for again before that costs nothing.
 void TreeWindow::refresh() {
-    if (!m_frozen && widget()) {
+    if (!m_frozen && widget() && !std::exchange(m_repaintDue, true)) {
         m_area->viewport()->update();
     }
 }
