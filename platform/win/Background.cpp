@@ -23,11 +23,12 @@ struct win::BackgroundState {
     void run() {
         try {
             work();
+            work = nullptr;
         } catch (abi::__forced_unwind&) {
             throw;
-        } catch (...) { // nobody to tell
+        } catch (...) {
+            work = nullptr; // there is nobody to tell
         }
-        work = nullptr;
         isDone.store(true, std::memory_order_release);
         if (signal) {
             ::eventfd_write(signal->descriptor(), 1);
