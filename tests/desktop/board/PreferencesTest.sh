@@ -19,6 +19,12 @@ preferences() {
 gone() {
     await "the preferences are gone" untitled "^Preferences$"
 }
+# asked: whether the question about changes, which has the sheet's title, has the keyboard.
+asked() {
+    local now
+    now=$(xdotool getactivewindow)
+    [ "$now" != "$sheet" ] && [ "$(xdotool getwindowname "$now")" = Preferences ]
+}
 # page WORDS: finds a page by words, and goes to its first field.
 page() {
     press ctrl+f ctrl+a
@@ -38,7 +44,7 @@ page "grid points"
 press alt+i ctrl+a
 xdotool type 5000
 press alt+a
-focus "^Board$" key Return # the message about the bounds
+focus "^Tarvex Board$" key Return # the message about the bounds
 xdotool windowactivate --sync "$sheet"
 press ctrl+a
 xdotool type 60
@@ -47,10 +53,12 @@ press alt+a
 await "the drawing shows the new grid" differs "$work/before.png"
 xdotool windowactivate --sync "$sheet" key --clearmodifiers alt+w # hides the grid
 press Escape
-await "Cancel asks about changes" titled "^Board$"
-focus "^Board$" key n
-xdotool windowactivate --sync "$sheet" key Escape
-focus "^Board$" key y
+await "Cancel asks about changes" asked
+press n
+await "the question is gone" active "$sheet"
+press Escape
+await "Cancel asks again" asked
+press y
 gone
 preferences
 page "online"

@@ -18,7 +18,7 @@ TEST_F(BoardHelp, HasAPageForEachCommandOfItsMenus) {
 }
 
 TEST_F(BoardHelp, HasAPageForEachDialogAndTheDrawingsWindow) {
-    EXPECT_EQ(expectTopicsOfDialogs(), 2);
+    EXPECT_EQ(expectTopicsOfDialogs(), 11);
     expectTopic(HID_BASE_RESOURCE + IDR_BOARDTYPE);
 }
 

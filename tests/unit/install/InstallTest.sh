@@ -11,25 +11,27 @@ trap 'rm -rf "$work"' EXIT
 "$cmake" --install "$build" --prefix "$work/first" >"$work/log" || { cat "$work/log"; exit 1; }
 mv "$work/first" "$work/moved"
 
-cp -r "$samples/board" "$work/host"
-cat - "$samples/board/CMakeLists.txt" >"$work/host/CMakeLists.txt" <<'TXT'
+mkdir -p "$work/host/samples"
+cp -r "$samples/board" "$samples/family" "$work/host/samples"
+cat >"$work/host/CMakeLists.txt" <<'TXT'
 cmake_minimum_required(VERSION 3.25)
 project(Host CXX)
 find_package(Tarvex 1.0 REQUIRED)
+add_subdirectory(samples/board)
 TXT
 "$cmake" -S "$work/host" -B "$work/out" -G Ninja -DCMAKE_CXX_COMPILER="$compiler" -DCMAKE_PREFIX_PATH="$work/moved" \
     -DCMAKE_BUILD_TYPE=Debug >"$work/log" 2>&1 && "$cmake" --build "$work/out" >>"$work/log" 2>&1 || {
     cat "$work/log"
     exit 1
 }
-"$work/out/board" -smoketest
+"$work/out/samples/board/board" -smoketest
 # The texts come from the host, the library and the layer, in the user's language.
 code=0
-said=$(LC_ALL=de_DE.UTF-8 "$work/out/board" -grid many 2>&1) || code=$?
+said=$(LC_ALL=de_DE.UTF-8 "$work/out/samples/board/board" -grid many 2>&1) || code=$?
 [ "$code" -eq 2 ] || { echo "FAIL: exit code $code of a wrong command line"; exit 1; }
 [[ "$said" == *"Abstand der Rasterpunkte"* ]] || { echo "FAIL: not in German: $said"; exit 1; }
 
-ldd "$work/out/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
+ldd "$work/out/samples/board/board" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: not the installed library"; exit 1; }
 module=$(find "$work/moved" -path '*/tarvex/uxtheme.so')
 ldd "$module" | grep -F "$work/moved/lib" >/dev/null || { echo "FAIL: visual styles without the library"; exit 1; }
 for tool in tvxsettings tvxopen helpmapcheck; do

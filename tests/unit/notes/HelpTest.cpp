@@ -11,7 +11,7 @@ protected:
 
 TEST_F(NotesHelp, HasAPageForEachCommandDialogAndMessage) {
     EXPECT_GT(expectTopics({IDR_MAINFRAME, IDR_CONTEXT}), 25);
-    EXPECT_EQ(expectTopicsOfDialogs(), 1);
+    EXPECT_EQ(expectTopicsOfDialogs(), 5);
     expectTopic(HID_BASE_RESOURCE + IDR_MAINFRAME);
     expectTopic(HID_BASE_PROMPT + IDS_NOT_FOUND);
     expectTopic(HID_BASE_PROMPT + IDS_CHANGED);
