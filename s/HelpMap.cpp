@@ -12,6 +12,7 @@
 #include "s/Record.h"
 #include "s/WebHosts.h"
 
+#include <algorithm>
 #include <initializer_list>
 #include <memory>
 #include <optional>
@@ -81,12 +82,22 @@ public:
             Port::File::open(name.c_str(), Port::File::AccessRead, Port::File::FlagText));
         return stream ? std::optional(stream->readall()) : std::nullopt;
     }
-    void remark(HelpMapRemark remark, const HelpMapFile&, std::string_view line, std::string_view) override {
-        if (remark == HelpMapRemark::IncludeWithoutSpace) {
+    void remark(HelpMapRemark remark, const HelpMapFile& file, std::string_view line, std::string_view) override {
+        if (remark == HelpMapRemark::IncludeWithoutSpace && isNews(file, line)) {
             const std::string shown(line.substr(0, tvx::text::characterStart(line, longestShown)));
             origin(__LINE__).issueInternal("include statement %s does not have space\n", shown.c_str());
         }
     }
+
+private:
+    /// In a file that is no text any line may begin with "#". The user, who gets a box for each message, needs to know
+    /// of one.
+    bool isNews(const HelpMapFile& file, std::string_view line) {
+        const auto isControl = [](unsigned char character) { return character < ' ' && character != '\t'; };
+        return std::ranges::none_of(line, isControl) || std::exchange(m_damaged, &file) != &file;
+    }
+
+    const HelpMapFile* m_damaged = nullptr; ///< that such a line was last told of
 };
 
 String firstWord(const String& text) {

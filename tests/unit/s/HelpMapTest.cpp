@@ -234,6 +234,17 @@ TEST_F(HelpMap, SaysWhatIsWrongWithFilesAndIncludes) {
     EXPECT_EQ(m_messages.messages[1].type, Port_MsgMan::MsgTypeInternal);
 }
 
+TEST_F(HelpMap, TellsOnceOfAFileThatIsNoText) {
+    std::string map = "#first\x01\n#text\n[k]\ntype=url\nfile=a\n";
+    for (int i = 0; i < 100; ++i) {
+        map += "#junk\x02\n";
+    }
+    ASSERT_TRUE(read(map));
+    EXPECT_EQ(key("k").files, Texts{"a"});
+    EXPECT_EQ(m_messages.texts(), (Texts{"include statement #first\x01 does not have space\n",
+                                         "include statement #text does not have space\n"}));
+}
+
 TEST_F(HelpMap, PassesOverNamesThatNoFileCanHave) {
     std::string name;
     for (int i = 0; i < 1000000; ++i) {
