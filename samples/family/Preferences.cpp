@@ -92,7 +92,7 @@ BOOL CPreferences::OnInitDialog() {
 
 // The page of the web browser is made for sheets of its own, and wider than others.
 void CPreferences::MakeRoom() {
-    constexpr int widest = 252; // dialog units
+    constexpr int widest = 258; // dialog units, with what surrounds it
     CRect wanted(0, 0, widest, 0);
     CRect frame;
     CRect window;
