@@ -178,6 +178,12 @@ xdotool type undo
 xdotool key Return
 picture keyboard "Tools, Keyboard gives commands other keys."
 xdotool key Escape
+
+again
+xdotool key --clearmodifiers ctrl+comma
+await '^Preferences$'
+picture preferences "Tools, Preferences shows what can be chosen, in pages that can be searched."
+xdotool key Escape
 again
 xdotool key --clearmodifiers ctrl+alt+p
 await '^Commands$'

@@ -3,10 +3,10 @@
 # number is explained, Apply shows in the drawing at once, Cancel asks, and what was applied is there after a restart and
 # is the other application's too where the family shares it.
 #
-#   PreferencesTest.sh BOARD NOTES
+#   PreferencesTest.sh BOARD NOTES TVXSETTINGS
 set -euo pipefail
 . "$(dirname "$0")/../Desktop.sh"
-board=$1 notes=$2
+board=$1 notes=$2 settings=$3
 
 press() {
     xdotool key --clearmodifiers "$@"
@@ -69,15 +69,21 @@ gone
 xdotool windowactivate --sync "$main" key alt+F4
 await "the application ends" ended "$process"
 
-begin "Tarvex Board" "$board" -nosplash
-preferences
-page "grid points"
-press alt+i ctrl+a ctrl+c
-await "the distance was kept" copied 60
-press Escape
-gone
-xdotool windowactivate --sync "$main" key alt+F4
-await "the application ends" ended "$process"
+# comesUpWith DISTANCE REASON: whether the board has that distance of the grid after a start.
+comesUpWith() {
+    begin "Tarvex Board" "$board" -nosplash
+    preferences
+    page "grid points"
+    press alt+i ctrl+a ctrl+c
+    await "$2" copied "$1"
+    press Escape
+    gone
+    xdotool windowactivate --sync "$main" key alt+F4
+    await "the application ends" ended "$process"
+}
+comesUpWith 60 "the distance was kept"
+"$settings" set -t number 'Software\Tarvex\Board\Preferences' GridDistance 99999
+comesUpWith 10 "a distance that cannot be is the one that the board comes with"
 
 begin "Tarvex Notes" "$notes" -nosplash
 preferences
