@@ -109,8 +109,13 @@ std::string narrowUnits(const Text& text) {
 } // namespace
 
 int compareNoCase(std::string_view left, std::string_view right) noexcept {
+    // Names that are sorted often begin alike.
     std::size_t leftAt = 0;
-    std::size_t rightAt = 0;
+    const std::size_t common = std::min(left.size(), right.size());
+    while (leftAt < common && left[leftAt] == right[leftAt] && isAscii(static_cast<unsigned char>(left[leftAt]))) {
+        ++leftAt;
+    }
+    std::size_t rightAt = leftAt;
     while (leftAt < left.size() && rightAt < right.size()) {
         const char32_t a = nextFolded(left, leftAt);
         const char32_t b = nextFolded(right, rightAt);
