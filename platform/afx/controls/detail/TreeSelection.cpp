@@ -145,7 +145,8 @@ bool TreeWindow::close(HTREEITEM item, By by, bool forget) {
     if (tells && (tellItem(TVN_ITEMEXPANDING, TVE_COLLAPSE, nullptr, item) != 0 || isDestroyed())) {
         return false;
     }
-    if ((node = m_nodes.find(item)) && deselectBelow(*node)) {
+    node = m_nodes.find(item);
+    if (node && deselectBelow(*node)) {
         select(item, Pick::Only, by);
     }
     node = isDestroyed() ? nullptr : m_nodes.find(item);
@@ -162,7 +163,8 @@ bool TreeWindow::close(HTREEITEM item, By by, bool forget) {
     }
     if (forget && !isDestroyed()) {
         removeBelow(item);
-        if ((node = m_nodes.find(item))) {
+        node = m_nodes.find(item);
+        if (node) {
             node->wasExpanded = false;
         }
     }

@@ -68,6 +68,7 @@ bool TreeWindow::sort(HTREEITEM item) {
     }
     // Texts that the parent keeps are asked for first; it may change the tree meanwhile.
     std::vector<std::pair<HTREEITEM, std::string>> texts;
+    texts.reserve(parent->children.size());
     for (const TreeNode* child : std::vector<TreeNode*>(parent->children)) {
         texts.emplace_back(TreeNodes::handleOf(child), std::string());
     }
@@ -77,6 +78,7 @@ bool TreeWindow::sort(HTREEITEM item) {
     std::ranges::stable_sort(
         texts, [](const auto& left, const auto& right) { return text::compareNoCase(left.second, right.second) < 0; });
     std::vector<HTREEITEM> order;
+    order.reserve(texts.size());
     for (const auto& [child, text] : texts) {
         order.push_back(child);
     }
@@ -89,6 +91,7 @@ bool TreeWindow::sortBy(const TVSORTCB& how) {
         return false;
     }
     std::vector<std::pair<HTREEITEM, LPARAM>> data;
+    data.reserve(parent->children.size());
     for (const TreeNode* child : parent->children) {
         data.emplace_back(TreeNodes::handleOf(child), child->data);
     }
@@ -97,6 +100,7 @@ bool TreeWindow::sortBy(const TVSORTCB& how) {
         return how.lpfnCompare(left.second, right.second, how.lParam) < 0;
     });
     std::vector<HTREEITEM> order;
+    order.reserve(data.size());
     for (const auto& [child, value] : data) {
         order.push_back(child);
     }

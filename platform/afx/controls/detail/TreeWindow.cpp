@@ -93,7 +93,8 @@ bool TreeWindow::removeItem(HTREEITEM item) {
     heir = heir ? heir : sibling(item, -1);
     heir = heir ? heir : TreeNodes::handleOf(node->parent);
     removeBelow(item);
-    if ((node = m_nodes.find(item))) {
+    node = m_nodes.find(item);
+    if (node) {
         removeTold(*node);
     }
     if (takesCaret && !isDestroyed() && !m_nodes.find(m_caret)) {

@@ -181,7 +181,8 @@ void TreeWindow::measure() {
         }
         const HTREEITEM item = TreeNodes::handleOf(node);
         const TreeLook look = lookOf(item);
-        if ((node = m_nodes.find(item))) {
+        node = m_nodes.find(item);
+        if (node) {
             const QRect label = labelRect(*node, look.text);
             m_extent = std::max(m_extent, label.right() + 1 + m_area->horizontalScrollBar()->value());
         }
@@ -396,7 +397,7 @@ LRESULT TreeWindow::hitTest(TVHITTESTINFO& info) {
 /// @param rect holds the item, and receives its place
 LRESULT TreeWindow::itemRect(RECT* rect, bool textOnly) {
     HTREEITEM item = nullptr;
-    std::memcpy(static_cast<void*>(&item), rect, sizeof item);
+    std::memcpy(static_cast<void*>(&item), rect, sizeof(HTREEITEM)); // NOLINT(bugprone-sizeof-expression): the handle
     layOut();
     const TreeLook look = lookOf(item);
     const TreeNode* node = isDestroyed() ? nullptr : m_nodes.find(item);
