@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -69,9 +70,10 @@ TEST_F(PropItem, MakesItsPageOnceWithTheFirstNotificationAndDeletesIt) {
         EXPECT_EQ(item.GetPage(), &other);
         EXPECT_EQ(pagesDeleted, 0) << "the page before is the caller's";
         item.SetCachedPage(page);
-        EXPECT_NE(item.CreatePage(), page) << "which keeps nothing";
+        const std::unique_ptr<CWnd> another(item.CreatePage());
+        EXPECT_NE(another.get(), page) << "which keeps nothing";
     }
-    EXPECT_EQ(pagesDeleted, 2) << "the test's own and the item's";
+    EXPECT_EQ(pagesDeleted, 3) << "the test's own two and the item's";
 }
 
 TEST_F(PropItem, TellsOfNoPageWithoutAFunctionThatMakesOne) {
