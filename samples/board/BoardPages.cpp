@@ -18,7 +18,7 @@ CBoardPreferences::CBoardPreferences(CWnd* parent) : CPreferences(parent), m_opt
 }
 
 void CBoardPreferences::StoreOwn() {
-    m_options.Write();
+    m_options.Write(theApp.GetOptions());
     theApp.SetOptions(m_options);
 }
 
@@ -46,12 +46,13 @@ CShapesPage::CShapesPage(CBoardPreferences& sheet) : CBoardPage(IDD_PREF_SHAPES,
 
 void CShapesPage::DoDataExchange(CDataExchange* dx) {
     CBoardPage::DoDataExchange(dx);
-    Options& options = GetOptions();
+    Options options = GetOptions();
     DDX_Color(dx, IDC_PREF_OUTLINE, m_outline, options.outline);
     DDX_Check(dx, IDC_PREF_FILLED, options.filled);
     DDX_Color(dx, IDC_PREF_FILL, m_fill, options.fill);
     DDX_Text(dx, IDC_PREF_LINE_WIDTH, options.lineWidth);
     DDV_MinMaxInt(dx, options.lineWidth, 1, Options::maxLineWidth);
+    GetOptions() = options; // not reached with a wrong number
     ShowState();
 }
 
@@ -78,11 +79,12 @@ CGridPage::CGridPage(CBoardPreferences& sheet) : CBoardPage(IDD_PREF_GRID, sheet
 
 void CGridPage::DoDataExchange(CDataExchange* dx) {
     CBoardPage::DoDataExchange(dx);
-    Options& options = GetOptions();
+    Options options = GetOptions();
     DDX_Check(dx, IDC_PREF_GRID_SHOWN, options.gridShown);
     DDX_Text(dx, IDC_PREF_GRID_DISTANCE, options.gridDistance);
     DDV_MinMaxInt(dx, options.gridDistance, 0, Options::maxGrid);
     DDX_Check(dx, IDC_PREF_SNAP, options.snap);
+    GetOptions() = options; // not reached with a wrong number
 }
 
 void CGridPage::SetDefaults() {
@@ -125,13 +127,14 @@ CFontsPage::CFontsPage(CBoardPreferences& sheet) : CBoardPage(IDD_PREF_FONTS, sh
 
 void CFontsPage::DoDataExchange(CDataExchange* dx) {
     CBoardPage::DoDataExchange(dx);
-    Options& options = GetOptions();
-    DDX_Text(dx, IDC_PREF_TEXT_SIZE, options.textSize);
-    DDV_MinMaxInt(dx, options.textSize, board::minTextSize, board::maxTextSize);
-    if (dx->m_bSaveAndValidate) {
-        options.textFont = m_face;
+    int size = GetOptions().textSize;
+    DDX_Text(dx, IDC_PREF_TEXT_SIZE, size);
+    DDV_MinMaxInt(dx, size, board::minTextSize, board::maxTextSize);
+    if (dx->m_bSaveAndValidate) { // not reached with a wrong number
+        GetOptions().textSize = size;
+        GetOptions().textFont = m_face;
     } else {
-        ShowFont(options.textFont);
+        ShowFont(GetOptions().textFont);
     }
 }
 

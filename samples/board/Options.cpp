@@ -11,30 +11,30 @@ int readNumber(const char* entry, int own, int least, int most) {
     return value < least || value > most ? own : value;
 }
 
-/// Calls `use` with the name and the bounds of each number: one list for reading and writing.
-template <class Record, class Use>
-void eachNumber(Record& options, Use&& use) {
+/// Calls `use` with the name, the field and the bounds of each number: one list for reading and writing.
+template <class Use>
+void eachNumber(Use&& use) {
     constexpr int white = 0xFFFFFF;
-    use("GridShown", options.gridShown, 0, 1);
-    use("GridDistance", options.gridDistance, 0, Options::maxGrid);
-    use("Snap", options.snap, 0, 1);
-    use("Paper", options.paper, 0, white);
-    use("GridColor", options.gridColor, 0, white);
-    use("Handles", options.handles, 0, white);
-    use("Outline", options.outline, 0, white);
-    use("Filled", options.filled, 0, 1);
-    use("Fill", options.fill, 0, white);
-    use("LineWidth", options.lineWidth, 1, Options::maxLineWidth);
-    use("TextSize", options.textSize, board::minTextSize, board::maxTextSize);
-    use("ShowStatus", options.showStatus, 0, 1);
+    use("GridShown", &Options::gridShown, 0, 1);
+    use("GridDistance", &Options::gridDistance, 0, Options::maxGrid);
+    use("Snap", &Options::snap, 0, 1);
+    use("Paper", &Options::paper, 0, white);
+    use("GridColor", &Options::gridColor, 0, white);
+    use("Handles", &Options::handles, 0, white);
+    use("Outline", &Options::outline, 0, white);
+    use("Filled", &Options::filled, 0, 1);
+    use("Fill", &Options::fill, 0, white);
+    use("LineWidth", &Options::lineWidth, 1, Options::maxLineWidth);
+    use("TextSize", &Options::textSize, board::minTextSize, board::maxTextSize);
+    use("ShowStatus", &Options::showStatus, 0, 1);
 }
 
 } // namespace
 
 Options Options::Read() {
     Options options;
-    eachNumber(options, [](const char* entry, auto& value, int least, int most) {
-        value = readNumber(entry, static_cast<int>(value), least, most);
+    eachNumber([&options](const char* entry, auto field, int least, int most) {
+        options.*field = readNumber(entry, static_cast<int>(options.*field), least, most);
     });
     CWinApp* const app = AfxGetApp();
     const CString font = app->GetProfileString(section, "TextFont", options.textFont);
@@ -43,11 +43,17 @@ Options Options::Read() {
     return options;
 }
 
-void Options::Write() const {
+void Options::Write(const Options& before) const {
     CWinApp* const app = AfxGetApp();
-    eachNumber(*this, [app](const char* entry, const auto& value, int, int) {
-        app->WriteProfileInt(section, entry, static_cast<int>(value));
+    eachNumber([&](const char* entry, auto field, int, int) {
+        if (this->*field != before.*field) {
+            app->WriteProfileInt(section, entry, static_cast<int>(this->*field));
+        }
     });
-    app->WriteProfileString(section, "TextFont", textFont);
-    app->WriteProfileInt("Settings", "KeepCommands", keepCommands ? 1 : 0);
+    if (textFont != before.textFont) {
+        app->WriteProfileString(section, "TextFont", textFont);
+    }
+    if (keepCommands != before.keepCommands) {
+        app->WriteProfileInt("Settings", "KeepCommands", keepCommands ? 1 : 0);
+    }
 }

@@ -29,5 +29,7 @@ struct Options {
 
     /// What is stored; a value that is missing or out of its bounds is the one that the board comes with.
     static Options Read();
-    void Write() const;
+    /// Stores what differs from `before`. The rest stays as it is stored: another board may have changed it meanwhile,
+    /// or it holds for this run only.
+    void Write(const Options& before) const;
 };

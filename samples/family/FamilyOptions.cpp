@@ -1,9 +1,7 @@
 #include "FamilyOptions.h"
 
+#include "s/HelpPreference.h"
 #include "s/Profile.h"
-
-#include <array>
-#include <cstring>
 
 namespace {
 
@@ -14,19 +12,6 @@ constexpr const char* locationEntry = "HelpUrlPrefix";
 /// The settings that all applications of the family share.
 CString commonKey() {
     return CString("Software\\") + AfxGetApp()->m_pszRegistryKey + "\\Common\\Settings";
-}
-
-CString readCommon(const char* entry) {
-    HKEY key = nullptr;
-    if (RegOpenKeyExA(HKEY_CURRENT_USER, commonKey(), 0, KEY_READ, &key) != ERROR_SUCCESS) {
-        return {};
-    }
-    std::array<char, 2048> text{};
-    DWORD size = text.size() - 1;
-    DWORD type = 0;
-    const LONG result = RegQueryValueExA(key, entry, nullptr, &type, reinterpret_cast<BYTE*>(text.data()), &size);
-    RegCloseKey(key);
-    return result == ERROR_SUCCESS && type == REG_SZ ? CString(text.data()) : CString();
 }
 
 void writeCommon(const char* entry, const CString& text) {
@@ -49,13 +34,20 @@ void writeCommon(const char* entry, const CString& text) {
 FamilyOptions FamilyOptions::Read() {
     FamilyOptions options;
     Gui_Profile::ReadString(options.documentFolder, folderEntry, nullptr);
-    options.alwaysOnWeb = readCommon(alwaysEntry) == "1";
-    options.webLocation = readCommon(locationEntry);
+    Gui_HelpPreference help;
+    options.alwaysOnWeb = help.IsAlwaysGoToWeb() ? TRUE : FALSE;
+    options.webLocation = help.GetUrlPrefix().c_str();
     return options;
 }
 
-void FamilyOptions::Write() const {
-    Gui_Profile::WriteString(documentFolder.IsEmpty() ? nullptr : documentFolder.GetString(), folderEntry, nullptr);
-    writeCommon(alwaysEntry, alwaysOnWeb ? "1" : "");
-    writeCommon(locationEntry, webLocation);
+void FamilyOptions::Write(const FamilyOptions& before) const {
+    if (documentFolder != before.documentFolder) {
+        Gui_Profile::WriteString(documentFolder.IsEmpty() ? nullptr : documentFolder.GetString(), folderEntry, nullptr);
+    }
+    if (alwaysOnWeb != before.alwaysOnWeb) {
+        writeCommon(alwaysEntry, alwaysOnWeb ? "1" : "");
+    }
+    if (webLocation != before.webLocation) {
+        writeCommon(locationEntry, webLocation);
+    }
 }

@@ -13,7 +13,9 @@ struct FamilyOptions {
     /// Where it is on the web; empty: where the installation says.
     CString webLocation;
 
-    /// What is stored, and what applications come with for the rest.
+    /// What holds: the environment goes before what is stored, and that before what applications come with.
     static FamilyOptions Read();
-    void Write() const;
+    /// Stores what differs from `before`. The rest stays as it is stored: another application may have changed it
+    /// meanwhile, or the environment holds instead.
+    void Write(const FamilyOptions& before) const;
 };

@@ -6,6 +6,7 @@
 #include "platform/port/Version.h"
 #include "res/resource.h"
 #include "s/DirDlg.h"
+#include "s/FileName.h"
 #include "s/Help.h"
 #include "s/Msg.h"
 #include "s/WinApp.h"
@@ -29,7 +30,22 @@ BOOL CFilesPage::OnInitDialog() {
 
 void CFilesPage::DoDataExchange(CDataExchange* dx) {
     CPreferencePage::DoDataExchange(dx);
-    DDX_Text(dx, IDC_PREF_FOLDER, GetPreferences().GetFamilyOptions().documentFolder);
+    CString& kept = GetPreferences().GetFamilyOptions().documentFolder;
+    CString folder = kept;
+    DDX_Text(dx, IDC_PREF_FOLDER, folder);
+    if (dx->m_bSaveAndValidate) {
+        folder.Trim();
+        const Gui_FileName name(folder);
+        // One that has gone since it was chosen keeps nobody from choosing other things.
+        if (!folder.IsEmpty() && folder != kept && !(name.HasAbsolutePath() && name.IsDirectory())) {
+            Gui_Msg message(IDS_PREF_NO_FOLDER);
+            message << folder;
+            AfxMessageBox(message, MB_OK | MB_ICONEXCLAMATION);
+            dx->PrepareEditCtrl(IDC_PREF_FOLDER);
+            dx->Fail();
+        }
+    }
+    kept = folder;
 }
 
 void CFilesPage::SetDefaults() {
@@ -86,6 +102,17 @@ void CKeyboardPage::OnResetKeys() {
 
 // --- help ---
 
+namespace {
+
+/// Names of pages are appended to the location as they are.
+CString asFolder(CString location) {
+    location.Trim();
+    const bool isOpen = !location.IsEmpty() && location[location.GetLength() - 1] != '/';
+    return isOpen ? location + "/" : location;
+}
+
+} // namespace
+
 CHelpPage::CHelpPage(CPreferences& sheet) : CPreferencePage(IDD_PREF_HELP, sheet) {}
 
 /// What the environment decides cannot be chosen; the page says why.
@@ -114,13 +141,21 @@ void CHelpPage::DoDataExchange(CDataExchange* dx) {
     CPreferencePage::DoDataExchange(dx);
     FamilyOptions& options = GetPreferences().GetFamilyOptions();
     DDX_Check(dx, IDC_PREF_ALWAYS_WEB, options.alwaysOnWeb);
-    DDX_Text(dx, IDC_PREF_WEB_LOCATION, options.webLocation);
+    CString location = options.webLocation;
+    DDX_Text(dx, IDC_PREF_WEB_LOCATION, location);
+    if (GetDlgItem(IDC_PREF_WEB_LOCATION)->IsWindowEnabled()) {
+        options.webLocation = asFolder(location);
+    }
 }
 
 void CHelpPage::SetDefaults() {
     FamilyOptions& options = GetPreferences().GetFamilyOptions();
-    options.alwaysOnWeb = FamilyOptions().alwaysOnWeb;
-    options.webLocation = FamilyOptions().webLocation;
+    if (GetDlgItem(IDC_PREF_ALWAYS_WEB)->IsWindowEnabled()) {
+        options.alwaysOnWeb = FamilyOptions().alwaysOnWeb;
+    }
+    if (GetDlgItem(IDC_PREF_WEB_LOCATION)->IsWindowEnabled()) {
+        options.webLocation = FamilyOptions().webLocation;
+    }
 }
 
 // --- the installation ---
@@ -171,9 +206,10 @@ void OnTabPage(Gui_PropItem* item, CWnd* page, Gui_PropItem::Notification what) 
         break;
     case Gui_PropItem::NotifyDeactivate:
         tab->OnKillActive();
+        sheet->MarkBrowser();
         break;
     case Gui_PropItem::NotifyApply:
-        if (!tab->OnKillActive() || !tab->OnApply()) {
+        if (!tab->OnKillActive()) {
             sheet->DontClose();
         } else {
             sheet->Store();

@@ -3,6 +3,15 @@
 #include "Preferences.h"
 #include "s/Help.h"
 
+#include <algorithm>
+#include <cstring>
+
+// clang-format off
+BEGIN_MESSAGE_MAP(CPreferencePage, CDialog)
+    ON_WM_SIZE()
+END_MESSAGE_MAP()
+// clang-format on
+
 CPreferencePage::CPreferencePage(UINT templateId, CPreferences& sheet)
     : CDialog(templateId), m_template(templateId), m_sheet(sheet) {}
 
@@ -10,6 +19,7 @@ BOOL CPreferencePage::Create(CWnd* parent) {
     m_isFilling = true;
     const BOOL made = CDialog::Create(m_template, parent);
     m_isFilling = false;
+    FindPlaces(); // only now the page has its size
     return made;
 }
 
@@ -19,19 +29,84 @@ BOOL CPreferencePage::OnInitDialog() {
 }
 
 void CPreferencePage::Show() {
+    if (m_wrong != 0) {
+        return;
+    }
     m_isFilling = true;
     UpdateData(FALSE);
     m_isFilling = false;
 }
 
 bool CPreferencePage::Take() {
-    return UpdateData(TRUE) != FALSE;
+    CDataExchange exchange(this, TRUE);
+    m_wrong = 0;
+    try {
+        DoDataExchange(&exchange);
+    } catch (CUserException* told) {
+        told->Delete();
+        m_wrong = exchange.m_idLastControl;
+    }
+    return m_wrong == 0;
+}
+
+void CPreferencePage::ShowWrong() {
+    if (CWnd* field = GetDlgItem(m_wrong)) {
+        GotoDlgCtrl(field);
+    }
+}
+
+void CPreferencePage::ForgetWrong() {
+    m_wrong = 0;
 }
 
 void CPreferencePage::ShowDefaults() {
+    m_wrong = 0;
     SetDefaults();
     Show();
     SetChanged();
+}
+
+// --- layout ---
+
+void CPreferencePage::FindPlaces() {
+    CRect page;
+    GetWindowRect(&page); // what is inside is known when the page is shown; it has no border
+    m_made = page.Size();
+    m_places.clear();
+    const CWnd* tall = nullptr;
+    for (CWnd* control = GetTopWindow(); control; control = control->GetNextWindow()) {
+        Place place;
+        place.control = control->m_hWnd;
+        control->GetWindowRect(&place.rect);
+        ScreenToClient(&place.rect);
+        char kind[16] = {};
+        GetClassNameA(place.control, kind, sizeof kind);
+        const DWORD style = control->GetStyle();
+        const bool isText = std::strcmp(kind, "Edit") == 0 && (style & ES_NUMBER) == 0;
+        const bool isPush = std::strcmp(kind, "Button") == 0 && (style & 0x0F) <= BS_DEFPUSHBUTTON;
+        const bool atEdge = place.rect.right >= m_made.cx - 1;
+        place.isTall = isText && (style & ES_MULTILINE) != 0;
+        place.isBeneath = tall != nullptr;
+        place.moves = isPush && atEdge;
+        place.grows = isText || (atEdge && !isPush);
+        tall = place.isTall ? control : tall;
+        m_places.push_back(place);
+    }
+}
+
+void CPreferencePage::OnSize(UINT type, int cx, int cy) {
+    CDialog::OnSize(type, cx, cy);
+    LayOut(CSize(std::max(cx - m_made.cx, 0), std::max(cy - m_made.cy, 0)));
+}
+
+void CPreferencePage::LayOut(CSize more) {
+    for (const Place& place : m_places) {
+        CRect rect = place.rect;
+        rect.right += place.grows ? more.cx : 0;
+        rect.bottom += place.isTall ? more.cy : 0;
+        rect.OffsetRect(place.moves ? more.cx : 0, place.isBeneath ? more.cy : 0);
+        ::MoveWindow(place.control, rect.left, rect.top, rect.Width(), rect.Height(), TRUE);
+    }
 }
 
 void CPreferencePage::SetChanged() {
@@ -71,7 +146,9 @@ void OnPreferencePage(Gui_PropItem* item, CWnd* page, Gui_PropItem::Notification
         fields->Show();
         break;
     case Gui_PropItem::NotifyDeactivate:
-        fields->Take();
+        if (!fields->Take()) {
+            sheet->ComeBack(*item);
+        }
         break;
     case Gui_PropItem::NotifyApply:
         if (!fields->Take()) {

@@ -22,6 +22,8 @@ public:
     void Store();
     /// Marks the item of a page.
     void SetPageChanged(const CPreferencePage& page);
+    /// Selects an item again, whose page is being left with a wrong field.
+    void ComeBack(Gui_PropItem& item);
     /// Gives the keyboard to the first or the last control of a page.
     void FocusPage(CWnd& page, bool last);
 
@@ -40,16 +42,24 @@ protected:
     /// Adds the pages that all applications have.
     void AddFamilyPages();
     BOOL OnInitDialog() override;
+    void OnCancel() override;
+    afx_msg LRESULT OnComeBack(WPARAM wParam, LPARAM lParam);
+    DECLARE_MESSAGE_MAP()
     /// Stores what is the application's own, and puts it in force.
     virtual void StoreOwn() = 0;
 
 private:
+    void WidenTree();
     void MakeRoom();
+    /// Marks the browser's page, which knows nothing of marks, when its field shows another program than holds.
+    void MarkBrowser();
 
     FamilyOptions m_family;
+    FamilyOptions m_familyBefore;       ///< as it was when it was read or stored
     std::vector<Gui_PropItem*> m_pages; ///< The base class owns them.
     /// Its page is shown in this sheet.
     Gui_BrowserPreference m_browser;
     Gui_PropItem* m_browserItem = nullptr;
     friend CWnd* MakeBrowserPage(Gui_PropItem* item, Gui_PropSheet* sheet);
+    friend void OnTabPage(Gui_PropItem* item, CWnd* page, Gui_PropItem::Notification what);
 };
