@@ -4,7 +4,7 @@
 #include "Drawing.h"
 #include "Resource.h"
 
-#include <cstdio>
+#include <cstdlib>
 
 // --- the sheet ---
 
@@ -127,41 +127,51 @@ CFontsPage::CFontsPage(CBoardPreferences& sheet) : CBoardPage(IDD_PREF_FONTS, sh
 
 void CFontsPage::DoDataExchange(CDataExchange* dx) {
     CBoardPage::DoDataExchange(dx);
-    int size = GetOptions().textSize;
-    DDX_Text(dx, IDC_PREF_TEXT_SIZE, size);
-    DDV_MinMaxInt(dx, size, board::minTextSize, board::maxTextSize);
+    Options options = dx->m_bSaveAndValidate ? m_shown : GetOptions();
+    DDX_Text(dx, IDC_PREF_TEXT_SIZE, options.textSize);
+    DDV_MinMaxInt(dx, options.textSize, board::minTextSize, board::maxTextSize);
     if (dx->m_bSaveAndValidate) { // not reached with a wrong number
-        GetOptions().textSize = size;
-        GetOptions().textFont = m_face;
+        GetOptions().textSize = options.textSize;
+        TakeFont(GetOptions(), options);
     } else {
-        ShowFont(GetOptions().textFont);
+        m_shown = options;
+        ShowFont();
     }
 }
 
 void CFontsPage::SetDefaults() {
-    const Options own;
-    GetOptions().textFont = own.textFont;
-    GetOptions().textSize = own.textSize;
+    GetOptions().textSize = Options().textSize;
+    TakeFont(GetOptions(), Options());
+}
+
+void CFontsPage::TakeFont(Options& to, const Options& from) {
+    to.textFont = from.textFont;
+    to.textBold = from.textBold;
+    to.textItalic = from.textItalic;
 }
 
 /// Names the typeface, and shows its letters.
-void CFontsPage::ShowFont(const CString& face) {
-    m_face = face;
-    SetDlgItemText(IDC_PREF_FONT, face);
+void CFontsPage::ShowFont() {
+    constexpr int height = 19;
+    SetDlgItemText(IDC_PREF_FONT, m_shown.textFont);
+    const LOGFONT wanted = m_shown.GetTextFont(height);
     CFont font;
-    font.CreatePointFont(140, face);
+    font.CreateFontIndirect(&wanted);
     GetDlgItem(IDC_PREF_SAMPLE)->SetFont(&font);
     m_sample.DeleteObject();
     m_sample.Attach(font.Detach());
 }
 
 void CFontsPage::OnChooseFont() {
-    LOGFONT font{};
-    std::snprintf(font.lfFaceName, sizeof font.lfFaceName, "%s", m_face.GetString());
-    font.lfHeight = -static_cast<LONG>(GetDlgItemInt(IDC_PREF_TEXT_SIZE));
-    CFontDialog dialog(&font, CF_SCREENFONTS, nullptr, this);
+    LOGFONT font = m_shown.GetTextFont(static_cast<int>(GetDlgItemInt(IDC_PREF_TEXT_SIZE)));
+    CFontDialog dialog(&font, CF_SCREENFONTS | CF_INITTOLOGFONTSTRUCT, nullptr, this);
     if (dialog.DoModal() == IDOK) {
-        ShowFont(dialog.GetFaceName());
+        dialog.GetCurrentFont(&font);
+        m_shown.textFont = font.lfFaceName;
+        m_shown.textBold = dialog.IsBold();
+        m_shown.textItalic = dialog.IsItalic();
+        SetDlgItemInt(IDC_PREF_TEXT_SIZE, static_cast<UINT>(std::abs(font.lfHeight)));
+        ShowFont();
         SetChanged();
     }
 }

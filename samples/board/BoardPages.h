@@ -74,7 +74,7 @@ private:
     CColorButton m_handles;
 };
 
-/// The typeface of texts, with a sample of it.
+/// The font of texts, with a sample of it.
 class CFontsPage : public CBoardPage {
 public:
     explicit CFontsPage(CBoardPreferences& sheet);
@@ -86,9 +86,10 @@ protected:
     DECLARE_MESSAGE_MAP()
 
 private:
-    void ShowFont(const CString& face);
+    static void TakeFont(Options& to, const Options& from);
+    void ShowFont();
 
-    CString m_face;
+    Options m_shown; ///< What the sample shows; only the font counts.
     CFont m_sample;
 };
 

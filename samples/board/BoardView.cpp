@@ -168,11 +168,11 @@ void CBoardView::OnDraw(CDC* dc) {
         const bool drafted = m_draft && !m_draftIsNew && i == m_selected;
         const Shape& shape = drafted ? *m_draft : shapes[i];
         if (CRect().IntersectRect(clip, ReachOf(shape))) {
-            DrawShape(*dc, shape, theApp.GetOptions().textFont);
+            DrawShape(*dc, shape, theApp.GetOptions());
         }
     }
     if (m_draft && m_draftIsNew) {
-        DrawShape(*dc, *m_draft, theApp.GetOptions().textFont);
+        DrawShape(*dc, *m_draft, theApp.GetOptions());
     }
     const Shape* marked = Marked();
     m_markedArea = marked ? ReachOf(*marked) : CRect();

@@ -38,7 +38,13 @@ bool CColorButton::Choose() {
 
 BOOL CColorButton::OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) {
     const bool isClick = message == WM_COMMAND && HIWORD(wParam) == BN_CLICKED;
-    return (isClick && !Choose()) || CButton::OnChildNotify(message, wParam, lParam, result) ? TRUE : FALSE;
+    if (!isClick) {
+        return CButton::OnChildNotify(message, wParam, lParam, result);
+    }
+    if (Choose()) {
+        GetParent()->SendMessage(WM_COMMAND, MAKEWPARAM(GetDlgCtrlID(), EN_CHANGE), reinterpret_cast<LPARAM>(m_hWnd));
+    }
+    return TRUE;
 }
 
 void DDX_Color(CDataExchange* dx, int id, CColorButton& button, COLORREF& color) {

@@ -2,7 +2,8 @@
 
 #include "afxwin.h"
 
-/// A button that shows a colour and lets the user choose another one. A choice reaches the parent as a click does.
+/// A button that shows a colour and lets the user choose another one. A choice reaches the parent as a change of a
+/// field does, by EN_CHANGE.
 class CColorButton : public CButton {
 public:
     COLORREF GetColor() const {
@@ -12,7 +13,7 @@ public:
     void DrawItem(DRAWITEMSTRUCT* item) override;
 
 protected:
-    /// The parent hears of a click only when a colour was chosen.
+    /// The parent hears of a choice, not of clicks.
     BOOL OnChildNotify(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* result) override;
 
 private:

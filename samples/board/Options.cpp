@@ -2,6 +2,8 @@
 
 #include "Drawing.h"
 
+#include <cstdio>
+
 namespace {
 
 constexpr const char* section = "Preferences";
@@ -25,11 +27,22 @@ void eachNumber(Use&& use) {
     use("Filled", &Options::filled, 0, 1);
     use("Fill", &Options::fill, 0, white);
     use("LineWidth", &Options::lineWidth, 1, Options::maxLineWidth);
+    use("TextBold", &Options::textBold, 0, 1);
+    use("TextItalic", &Options::textItalic, 0, 1);
     use("TextSize", &Options::textSize, board::minTextSize, board::maxTextSize);
     use("ShowStatus", &Options::showStatus, 0, 1);
 }
 
 } // namespace
+
+LOGFONT Options::GetTextFont(int height) const {
+    LOGFONT font{};
+    font.lfHeight = -height;
+    font.lfWeight = textBold ? FW_BOLD : FW_NORMAL;
+    font.lfItalic = textItalic ? 1 : 0;
+    std::snprintf(font.lfFaceName, sizeof font.lfFaceName, "%s", textFont.GetString());
+    return font;
+}
 
 Options Options::Read() {
     Options options;

@@ -19,13 +19,18 @@ struct Options {
     int lineWidth = 2; ///< 1 to 20
     // texts
     CString textFont = "Arial"; ///< The typeface of all texts.
-    int textSize = 16;          ///< Height of new texts, 4 to 400.
+    BOOL textBold = FALSE;
+    BOOL textItalic = FALSE;
+    int textSize = 16; ///< Height of new texts, 4 to 400.
     // the console
     BOOL keepCommands = TRUE;
     BOOL showStatus = TRUE;
 
     static constexpr int maxGrid = 1000;
     static constexpr int maxLineWidth = 20;
+
+    /// The font of all texts, in a height in pixels.
+    LOGFONT GetTextFont(int height) const;
 
     /// What is stored; a value that is missing or out of its bounds is the one that the board comes with.
     static Options Read();

@@ -16,14 +16,13 @@ CRect boxOf(const Shape& shape) {
     return box;
 }
 
-void drawText(CDC& dc, const Shape& shape, const CString& typeface) {
+void drawText(CDC& dc, const Shape& shape, const LOGFONT& textFont) {
     CRect box = boxOf(shape);
     if (shape.fill != noColor) {
         dc.FillSolidRect(box, toColorRef(shape.fill));
     }
     CFont font;
-    font.CreateFont(-shape.size, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_DEFAULT_PRECIS,
-                    CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, DEFAULT_PITCH, typeface);
+    font.CreateFontIndirect(&textFont);
     CFont* before = dc.SelectObject(&font);
     dc.SetBkMode(TRANSPARENT);
     dc.SetTextColor(toColorRef(shape.color));
@@ -48,9 +47,9 @@ Color FromColorRef(COLORREF color) {
     return static_cast<Color>(GetRValue(color) << 16 | GetGValue(color) << 8 | GetBValue(color));
 }
 
-void DrawShape(CDC& dc, const Shape& shape, const CString& textFont) {
+void DrawShape(CDC& dc, const Shape& shape, const Options& options) {
     if (shape.kind == ShapeKind::Text) {
-        drawText(dc, shape, textFont);
+        drawText(dc, shape, options.GetTextFont(shape.size));
         return;
     }
     CPen pen(PS_SOLID, shape.width, toColorRef(shape.color));

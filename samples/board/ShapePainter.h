@@ -1,11 +1,11 @@
 #pragma once
 
 #include "Drawing.h"
-#include "afxwin.h"
+#include "Options.h"
 
 /// Draws one shape.
-/// @param textFont the typeface of texts
-void DrawShape(CDC& dc, const board::Shape& shape, const CString& textFont);
+/// @param options the font of texts
+void DrawShape(CDC& dc, const board::Shape& shape, const Options& options);
 
 /// A colour as drawings hold it.
 board::Color FromColorRef(COLORREF color);

@@ -85,6 +85,10 @@ void CPreferencePage::FindPlaces() {
         const bool isText = std::strcmp(kind, "Edit") == 0 && (style & ES_NUMBER) == 0;
         const bool isPush = std::strcmp(kind, "Button") == 0 && (style & 0x0F) <= BS_DEFPUSHBUTTON;
         const bool atEdge = place.rect.right >= m_made.cx - 1;
+        // Rounded to pixels, a place and a width may end behind the page.
+        const LONG over = std::max<LONG>(place.rect.right - m_made.cx, 0);
+        place.rect.OffsetRect(isPush ? -over : 0, 0);
+        place.rect.right -= isPush ? 0 : over;
         place.isTall = isText && (style & ES_MULTILINE) != 0;
         place.isBeneath = tall != nullptr;
         place.moves = isPush && atEdge;
@@ -126,8 +130,9 @@ BOOL CPreferencePage::OnCommand(WPARAM wParam, LPARAM lParam) {
     const UINT code = HIWORD(wParam);
     const auto* control = CWnd::FromHandle(reinterpret_cast<HWND>(lParam));
     const bool isButton = control && (control->SendMessage(WM_GETDLGCODE) & DLGC_BUTTON) != 0;
-    const bool isPush = isButton && (control->GetStyle() & 0x0F) <= BS_DEFPUSHBUTTON; // opens something else
-    const bool changes = isButton ? code == BN_CLICKED && !isPush : code == EN_CHANGE || code == CBN_SELCHANGE;
+    const DWORD kind = isButton ? control->GetStyle() & 0x0F : 0;
+    const bool isCheck = kind >= BS_CHECKBOX && kind <= BS_AUTORADIOBUTTON; // others open something
+    const bool changes = code == EN_CHANGE || (isCheck ? code == BN_CLICKED : !isButton && code == CBN_SELCHANGE);
     if (lParam != 0 && changes && !m_isFilling) {
         SetChanged();
     }

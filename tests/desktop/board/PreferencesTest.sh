@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Tools > Preferences of the sample applications as a user without a mouse meets them: a page is found by a word, a wrong
-# number is explained, Apply shows in the drawing at once, Cancel asks, and what was applied is there after a restart and
-# is the other application's too where the family shares it.
+# number is explained and not left, Apply shows in the drawing at once, OK stores what was chosen on all pages, Cancel
+# asks, and what was applied is there after a restart and is the other application's too where the family shares it.
 #
 #   PreferencesTest.sh BOARD NOTES TVXSETTINGS
 set -euo pipefail
@@ -25,7 +25,7 @@ asked() {
     now=$(xdotool getactivewindow)
     [ "$now" != "$sheet" ] && [ "$(xdotool getwindowname "$now")" = Preferences ]
 }
-# page WORDS: finds a page by words, and goes to its first field.
+# page WORDS: finds a page by words, and goes on to the tree.
 page() {
     press ctrl+f ctrl+a
     xdotool type --clearmodifiers "$1"
@@ -33,6 +33,11 @@ page() {
 }
 copied() {
     [ "$(xclip -o -selection clipboard | tr -d '\r')" = "$1" ]
+}
+# copies TEXT: whether that is what is selected.
+copies() {
+    press ctrl+c
+    copied "$1"
 }
 differs() {
     ! cmp -s "$1" <(import -window "$main" png:-)
@@ -45,8 +50,10 @@ press alt+i ctrl+a
 xdotool type 5000
 press alt+a
 focus "^Tarvex Board$" key Return # the message about the bounds
+xdotool windowactivate --sync "$sheet" key --clearmodifiers ctrl+f Escape alt+c Down # all pages; to the next one
+focus "^Tarvex Board$" key Return                                                    # the same message
 xdotool windowactivate --sync "$sheet"
-press ctrl+a
+await "the wrong number is still there, with the keyboard" copies 5000
 xdotool type 60
 import -window "$main" png:- >"$work/before.png"
 press alt+a
@@ -61,29 +68,34 @@ await "Cancel asks again" asked
 press y
 gone
 preferences
+page "web browser"
+press alt+w ctrl+a
+xdotool type "browse %1"
 page "online"
 press alt+l
-xdotool type "http://example.invalid/"
+xdotool type "http://example.invalid"
 press Return
 gone
 xdotool windowactivate --sync "$main" key alt+F4
 await "the application ends" ended "$process"
 
-# comesUpWith DISTANCE REASON: whether the board has that distance of the grid after a start.
+[ "$("$settings" get 'Software\Tarvex\Common' Browser)" = "browse %1" ] || fail "the page before is stored as well"
+
+# comesUpWith DISTANCE REASON [OPTION...]: whether the board has that distance of the grid after a start. OK changes
+# nothing then.
 comesUpWith() {
-    begin "Tarvex Board" "$board" -nosplash
+    begin "Tarvex Board" "$board" -nosplash "${@:3}"
     preferences
     page "grid points"
     press alt+i ctrl+a ctrl+c
     await "$2" copied "$1"
-    press Escape
+    press Return
     gone
     xdotool windowactivate --sync "$main" key alt+F4
     await "the application ends" ended "$process"
 }
+comesUpWith 25 "the distance of this run" -grid 25
 comesUpWith 60 "the distance was kept"
-"$settings" set -t number 'Software\Tarvex\Board\Preferences' GridDistance 99999
-comesUpWith 10 "a distance that cannot be is the one that the board comes with"
 
 begin "Tarvex Notes" "$notes" -nosplash
 preferences
