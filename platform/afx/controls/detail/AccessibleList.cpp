@@ -1,10 +1,10 @@
 #include "platform/afx/controls/detail/AccessibleList.h"
 
+#include "platform/afx/controls/detail/AccessibleLine.h"
 #include "platform/afx/controls/detail/ListBoxWindow.h"
 #include "platform/afx/core/detail/Loop.h"
 
 #include <QAccessibleWidget>
-#include <QPointer>
 
 #include <unordered_map>
 
@@ -18,34 +18,13 @@ ListBoxWindow* listOf(const QWidget* widget) {
 }
 
 /// A line of a list, known by its number: what stands there changes with the list.
-class AccessibleRow : public QAccessibleInterface, public QAccessibleActionInterface {
+class AccessibleRow : public AccessibleLine {
 public:
-    AccessibleRow(QWidget& list, int index) : m_list(&list), m_index(index) {}
+    AccessibleRow(QWidget& list, int index) : AccessibleLine(list), m_index(index) {}
 
     bool isValid() const override {
         const ListBoxWindow* window = list();
         return window && m_index < window->items().count();
-    }
-    QObject* object() const override {
-        return nullptr;
-    }
-    QWindow* window() const override {
-        return m_list ? m_list->window()->windowHandle() : nullptr;
-    }
-    QAccessibleInterface* parent() const override {
-        return QAccessible::queryAccessibleInterface(m_list.data());
-    }
-    QAccessibleInterface* child(int) const override {
-        return nullptr;
-    }
-    QAccessibleInterface* childAt(int, int) const override {
-        return nullptr;
-    }
-    int childCount() const override {
-        return 0;
-    }
-    int indexOfChild(const QAccessibleInterface*) const override {
-        return -1;
     }
     QAccessible::Role role() const override {
         return QAccessible::ListItem;
@@ -57,14 +36,11 @@ public:
         }
         return text;
     }
-    void setText(QAccessible::Text, const QString&) override {}
     QRect rect() const override {
         if (!isValid()) {
             return {};
         }
-        const QWidget& area = *list()->clientWidget();
-        const QRect seen = list()->rowRect(m_index).intersected(area.rect());
-        return {area.mapToGlobal(seen.topLeft()), seen.size()};
+        return seenOf(*list()->clientWidget(), list()->rowRect(m_index));
     }
     QAccessible::State state() const override {
         QAccessible::State state;
@@ -76,17 +52,14 @@ public:
         state.selectable = state.focusable = true;
         state.multiSelectable = state.extSelectable = window->isMultiple();
         state.selected = window->isSelected(m_index);
-        state.focused = m_list->hasFocus() && window->caret() == m_index;
+        state.focused = control()->hasFocus() && window->caret() == m_index;
         state.active = window->caret() == m_index;
         state.disabled = !window->isEnabled();
-        state.invisible = !m_list->isVisible();
+        state.invisible = !control()->isVisible();
         state.offscreen = rect().isEmpty();
         return state;
     }
 
-    void* interface_cast(QAccessible::InterfaceType type) override {
-        return type == QAccessible::ActionInterface ? static_cast<QAccessibleActionInterface*>(this) : nullptr;
-    }
     QStringList actionNames() const override {
         return {pressAction()};
     }
@@ -95,19 +68,14 @@ public:
             storing([this] { list()->choose(m_index); });
         }
     }
-    QStringList keyBindingsForAction(const QString&) const override {
-        return {};
-    }
-
     int index() const {
         return m_index;
     }
 
 private:
     ListBoxWindow* list() const {
-        return listOf(m_list);
+        return listOf(control());
     }
-    QPointer<QWidget> m_list;
     int m_index;
 };
 

@@ -1,10 +1,10 @@
 #include "platform/afx/controls/detail/AccessibleTree.h"
 
+#include "platform/afx/controls/detail/AccessibleLine.h"
 #include "platform/afx/controls/detail/TreeWindow.h"
 #include "platform/afx/core/detail/Loop.h"
 
 #include <QAccessibleWidget>
-#include <QPointer>
 
 #include <unordered_map>
 
@@ -23,33 +23,12 @@ TreeWindow* treeOf(const QWidget* widget) {
 }
 
 /// An item, whatever line it is in.
-class AccessibleItem : public QAccessibleInterface, public QAccessibleActionInterface {
+class AccessibleItem : public AccessibleLine {
 public:
-    AccessibleItem(QWidget& tree, HTREEITEM item) : m_tree(&tree), m_item(item) {}
+    AccessibleItem(QWidget& tree, HTREEITEM item) : AccessibleLine(tree), m_item(item) {}
 
     bool isValid() const override {
         return node();
-    }
-    QObject* object() const override {
-        return nullptr;
-    }
-    QWindow* window() const override {
-        return m_tree ? m_tree->window()->windowHandle() : nullptr;
-    }
-    QAccessibleInterface* parent() const override {
-        return QAccessible::queryAccessibleInterface(m_tree.data());
-    }
-    QAccessibleInterface* child(int) const override {
-        return nullptr;
-    }
-    QAccessibleInterface* childAt(int, int) const override {
-        return nullptr;
-    }
-    int childCount() const override {
-        return 0;
-    }
-    int indexOfChild(const QAccessibleInterface*) const override {
-        return -1;
     }
     QAccessible::Role role() const override {
         return QAccessible::TreeItem;
@@ -61,15 +40,12 @@ public:
         }
         return text;
     }
-    void setText(QAccessible::Text, const QString&) override {}
     QRect rect() const override {
         const TreeNode* shown = node();
         if (!shown) {
             return {};
         }
-        const QWidget& area = *tree()->clientWidget();
-        const QRect seen = tree()->rowRect(*shown).intersected(area.rect());
-        return {area.mapToGlobal(seen.topLeft()), seen.size()};
+        return seenOf(*tree()->clientWidget(), tree()->rowRect(*shown));
     }
     QAccessible::State state() const override {
         QAccessible::State state;
@@ -84,19 +60,16 @@ public:
         state.multiSelectable = state.extSelectable = tree()->isMultiple();
         state.selected = shown->isSelected;
         state.active = tree()->caret() == m_item;
-        state.focused = state.active && m_tree->hasFocus();
+        state.focused = state.active && control()->hasFocus();
         state.expandable = hasButton;
         state.expanded = hasButton && shown->isExpanded;
         state.collapsed = hasButton && !shown->isExpanded;
         state.disabled = !tree()->isEnabled();
-        state.invisible = !m_tree->isVisible();
+        state.invisible = !control()->isVisible();
         state.offscreen = rect().isEmpty();
         return state;
     }
 
-    void* interface_cast(QAccessible::InterfaceType type) override {
-        return type == QAccessible::ActionInterface ? static_cast<QAccessibleActionInterface*>(this) : nullptr;
-    }
     QStringList actionNames() const override {
         return state().expandable ? QStringList{pressAction(), openAction()} : QStringList{pressAction()};
     }
@@ -110,10 +83,6 @@ public:
             storing([this] { tree()->toggle(m_item); });
         }
     }
-    QStringList keyBindingsForAction(const QString&) const override {
-        return {};
-    }
-
     /// -1 for an item that has gone.
     int row() const {
         const TreeNode* shown = node();
@@ -122,13 +91,12 @@ public:
 
 private:
     TreeWindow* tree() const {
-        return treeOf(m_tree);
+        return treeOf(control());
     }
     const TreeNode* node() const {
         const TreeWindow* window = tree();
         return window ? window->nodeOf(m_item) : nullptr;
     }
-    QPointer<QWidget> m_tree;
     HTREEITEM m_item;
 };
 
